@@ -1,0 +1,70 @@
+#include "app/Composition.h"
+
+#include <QApplication>
+#include <QIcon>
+#include <QLibraryInfo>
+#include <QLocale>
+
+#include "app/frmRx.h"
+#include "platform/ErrorReport.h"
+
+namespace {
+
+constexpr const char* LookSheet = R"(
+#Banner { background: #1b2233; }
+#Banner QLabel { color: #e8ecf4; font-weight: bold; }
+#Banner QComboBox { min-height: 30px; }
+#GetScores, #RemoteManageButton { min-height: 30px; padding: 2px 18px; border-radius: 5px; border: 1px solid #3c4a68;
+  background: #2a344c; color: #e8ecf4; font-weight: bold; }
+#GetScores { background: #2f6fd6; border-color: #5b92ea; color: white; }
+#GetScores:hover { background: #3d7de4; }
+#GetScores:pressed { background: #245bb4; }
+#GetScores:focus, #RemoteManageButton:focus { border: 2px solid white; }
+#RemoteManageButton:disabled { background: #222a3d; border-color: #2c3650; color: #7d879b; }
+#Label1, #Label2 { font-weight: bold; }
+ScoreListView { border: 1px solid #c3c9d6; selection-background-color: #2f6fd6; selection-color: white; }
+ScoreListView QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid #c3c9d6;
+  background: #e9edf4; color: #1b2233; }
+)";
+
+Language LanguageOfSystem() {
+  const QStringList languages = QLocale::system().uiLanguages();
+  return LanguageOf(languages.isEmpty() ? std::string() : languages.first().toStdString());
+}
+
+}  // namespace
+
+Composition::Composition() : strings_(LanguageOfSystem()) {
+  if (strings_.TextLanguage() == Language::SimplifiedChinese &&
+      dialogTexts_.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
+    QCoreApplication::installTranslator(&dialogTexts_);
+  }
+}
+
+::Services Composition::Services() {
+  return {strings_, clock_, databases_, events_, fileDialog_, files_, folders_, boxes_, devices_, port_};
+}
+
+void Composition::SetMainWindow(QWidget* window) {
+  boxes_.SetMainWindow(window);
+  fileDialog_.SetMainWindow(window);
+}
+
+void PrepareApplication() {
+  Q_INIT_RESOURCE(pictures);  // a static library's resources are not registered by themselves
+  QApplication::setDesktopFileName(QStringLiteral("tessarine"));
+  QApplication::setWindowIcon(QIcon(QStringLiteral(":/pictures/tessarine-256.png")));
+  qApp->setStyleSheet(QString::fromUtf8(LookSheet));
+}
+
+int RunProgram() {
+  PrepareApplication();
+  Composition composition;
+  frmRx window(composition.Services());
+  composition.SetMainWindow(&window);
+  if (!ReportErrors(composition.Boxes(), [&window] { window.FormLoad(); })) {
+    return 1;
+  }
+  window.show();
+  return QApplication::exec();
+}

@@ -1,0 +1,26 @@
+#pragma once
+
+#include "core/StringTable.h"
+#include "platform/Clock.h"
+#include "platform/Database.h"
+#include "platform/EventPump.h"
+#include "platform/FileDialog.h"
+#include "platform/Files.h"
+#include "platform/Folders.h"
+#include "platform/MessageBoxes.h"
+#include "platform/SerialDevices.h"
+#include "platform/SerialPort.h"
+
+/// The platform's parts that the main window works with; they outlive it.
+struct Services {
+  const StringTable& Strings;
+  const Clock& Time;
+  DatabaseEngine& Databases;
+  EventPump& Events;
+  FileDialog& CommonDialog1;
+  Files& Disk;
+  const Folders& Places;
+  MessageBoxes& Boxes;
+  const SerialDevices& Devices;
+  SerialPort& MSComm1;
+};

@@ -1,0 +1,8 @@
+#pragma once
+
+#include <QString>
+
+#include "core/StringTable.h"
+
+/// Text `number` of the string table for a control.
+inline QString Text(const StringTable& strings, int number) { return QString::fromStdString(strings.Text(number)); }

@@ -1,0 +1,269 @@
+#include "app/frmRx.h"
+
+#include <QCloseEvent>
+#include <QHeaderView>
+#include <QScreen>
+#include <QSignalBlocker>
+#include <utility>
+#include <vector>
+
+#include "app/About.h"
+#include "app/ScoreListModel.h"
+#include "app/Settings.h"
+#include "app/SoldieringCalc.h"
+#include "app/Text.h"
+#include "app/UploadProgress.h"
+#include "app/WaitCursor.h"
+#include "core/BaseUnitDownload.h"
+#include "core/FieldValue.h"
+#include "core/FirstRun.h"
+#include "core/ScreenFit.h"
+#include "platform/ErrorReport.h"
+#include "ui_frmRx.h"
+
+frmRx::frmRx(const Services& services)
+    : services_(services),
+      ui_(std::make_unique<Ui::frmRx>()),
+      game_(services.Strings),
+      gameFile_(services.CommonDialog1, services.Disk, services.Boxes) {
+  ui_->setupUi(this);
+}
+
+frmRx::~frmRx() = default;
+
+void frmRx::FormLoad() {
+  SetCaptions();
+  ClearPlayerData();
+  FitToScreenSize();
+  SetUpLists();
+  userDataFolder_ = PrepareUserDataFolder(services_.Places, services_.Disk, services_.Boxes);
+  ini_.emplace(services_.Disk, userDataFolder_ + "/tessarine.ini");
+  commPort_.emplace(services_.MSComm1, *ini_, services_.Devices, services_.Boxes, services_.Strings,
+                    [this] { ShowCommPortSettings(); });
+  OpenDatabases();
+  factors_ = ReadSoldieringFactors(*ini_);
+  ConnectCommands();
+}
+
+void frmRx::SetCaptions() {
+  const StringTable& strings = services_.Strings;
+  ui_->Label1->setText(Text(strings, 203));
+  ui_->Label2->setText(Text(strings, 201));
+  ui_->ActiveMissionLabel->setText(Text(strings, 202));
+  const std::pair<QAction*, int> captions[] = {
+      {ui_->mnuFile->menuAction(), 204}, {ui_->mnuLoadScores, 205},  {ui_->mnuSaveScores, 206},
+      {ui_->mnuClearScores, 207},        {ui_->mnuPrintScores, 208}, {ui_->mnuAdminData, 209},
+      {ui_->mnuExit, 210},               {ui_->mnuMissions->menuAction(), 211},
+      {ui_->mnuMissionResults, 212},     {ui_->mnuSetupMissions, 213},
+      {ui_->mnuSettings->menuAction(), 214}, {ui_->mnuCommPort, 215}, {ui_->mnuSoldieringCalc, 216},
+      {ui_->mnuHelp->menuAction(), 217}, {ui_->mnuAbout, 218},
+  };
+  for (const auto& [action, number] : captions) {
+    SetCaption(*action, number);
+  }
+}
+
+void frmRx::SetCaption(QAction& action, int textNumber) {
+  QString caption = Text(services_.Strings, textNumber);
+  // The letter for the Alt key stays that of the design where the new text has it.
+  const QString old = action.text();
+  const auto mark = old.indexOf(u'&');
+  const auto letter = mark < 0 ? -1 : caption.indexOf(old[mark + 1], 0, Qt::CaseInsensitive);
+  if (letter >= 0) {
+    caption.insert(letter, u'&');
+  }
+  action.setText(caption);
+}
+
+void frmRx::FitToScreenSize() {
+  const QSize pixels = screen()->size();
+  const ScreenFit fit = FitToScreen(pixels.width(), pixels.height());
+  if (fit.Warn) {
+    services_.Boxes.Show("This program works best with a screen resolution of at least 1024 x 768.",
+                         "Screen Resolution Warning", BoxIcon::Exclamation);
+  }
+  if (fit.Width) {
+    setGeometry(0, y(), *fit.Width, height());
+  }
+  if (fit.Height) {
+    setGeometry(x(), 0, width(), *fit.Height);
+  }
+  if (fit.Maximised) {
+    setWindowState(windowState() | Qt::WindowMaximized);
+  }
+}
+
+void frmRx::SetUpLists() {
+  const auto headers = [this](std::initializer_list<int> numbers) {
+    QStringList texts;
+    for (const int number : numbers) {
+      texts.append(Text(services_.Strings, number));
+    }
+    return texts;
+  };
+  constexpr double share = 1.0 / BoardColumnCount;
+  constexpr double fromRankToPlayer = 0.027;
+  std::vector<double> boardShares(BoardColumnCount, share);
+  boardShares[0] -= fromRankToPlayer;
+  boardShares[1] += fromRankToPlayer;
+  ui_->ScoreDisplay->setModel(
+      new ScoreListModel(scoreDisplay_, game_, headers({103, 104, 105, 106, 107, 108, 109, 110, 111}), 1, this));
+  ui_->ScoreDisplay->SetColumnShares(boardShares);
+  ui_->ScoreDisplay->horizontalHeader()->setSectionsClickable(true);
+  ui_->TeamScores->setModel(new ScoreListModel(teamScores_, game_, headers({112, 113, 105}), 1, this));
+  ui_->TeamScores->SetColumnShares(std::vector<double>(TeamColumnCount, 1.0 / TeamColumnCount));
+  ui_->TeamScores->setFixedHeight(ui_->TeamScores->HeightForRows(TeamCount));
+}
+
+void frmRx::OpenDatabases() {
+  dbScenarios_ = services_.Databases.OpenDatabase(userDataFolder_ + "/scenarios.mdb");
+  rsScenarios_ = dbScenarios_->OpenRecordset("Table1");
+  missions_.emplace(*rsScenarios_, services_.Strings, services_.Boxes);
+  FillMissionList();
+  rsScenarios_->MoveFirst();
+  dbMembers_ = services_.Databases.OpenDatabase(userDataFolder_ + "/members.mdb");
+  rsMembers_ = dbMembers_->OpenRecordset("Members");
+  members_.emplace(*rsMembers_, services_.Boxes);
+  analysis_.emplace(game_, factors_, *missions_, *members_, services_.Strings, scoreDisplay_, teamScores_);
+}
+
+void frmRx::ConnectCommands() {
+  const std::pair<QAction*, void (frmRx::*)()> commands[] = {
+      {ui_->mnuLoadScores, &frmRx::LoadGame},
+      {ui_->mnuSaveScores, &frmRx::SaveGame},
+      {ui_->mnuClearScores, &frmRx::ClearGame},
+      {ui_->mnuGetKeshData, &frmRx::GetScoreData},
+      {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},
+      {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
+      {ui_->mnuAbout, &frmRx::ShowAbout},
+  };
+  for (const auto& [action, command] : commands) {
+    connect(action, &QAction::triggered, this, [this, command] { Run([this, command] { (this->*command)(); }); });
+  }
+  connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
+  connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
+  connect(ui_->ActiveMission, &QComboBox::currentIndexChanged, this,
+          [this](int index) { Run([this, index] { SelectMission(index); }); });
+  connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this, [this](int section) {
+    Run([this, section] { SortByHeader(scoreDisplay_, section + 1, game_); });
+  });
+}
+
+void frmRx::Run(const std::function<void()>& command) {
+  ++runningCommands_;
+  ReportErrors(services_.Boxes, command);
+  --runningCommands_;
+  if (closeRequested_ && runningCommands_ == 0) {
+    close();
+  }
+}
+
+void frmRx::closeEvent(QCloseEvent* event) {
+  if (runningCommands_ > 0) {
+    closeRequested_ = true;
+    services_.Events.EndWaits();
+    event->ignore();
+    return;
+  }
+  if (commPort_ && !commPort_->CommDisabled()) {
+    commPort_->CloseIfOpen();
+  }
+  rsScenarios_.reset();
+  rsMembers_.reset();
+  dbScenarios_.reset();
+  dbMembers_.reset();
+  event->accept();
+}
+
+void frmRx::FillMissionList() {
+  missions_->FillMissionList();
+  const QSignalBlocker blocker(ui_->ActiveMission);
+  ui_->ActiveMission->clear();
+  for (const MissionList::Item& item : missions_->Items()) {
+    ui_->ActiveMission->addItem(QString::fromStdString(item.Text));
+  }
+  SelectMission(missions_->ListIndex());
+}
+
+void frmRx::SelectMission(int index) {
+  missions_->Select(index);
+  const QSignalBlocker blocker(ui_->ActiveMission);
+  ui_->ActiveMission->setCurrentIndex(index);
+  QString description;
+  if (missions_->ActivateCurrentMissionRecord()) {
+    description = QString::fromStdString(FirstLineOf(TextOf(missions_->Row().Fields("MissionDescription"))));
+  }
+  ui_->ActiveMissionLabel->setToolTip(description);
+  ui_->ActiveMission->setToolTip(description);
+  CalculateScoresWhenPresent();
+}
+
+void frmRx::ClearPlayerData() {
+  scoreDisplay_.Clear();
+  teamScores_.Clear();
+  game_.Clear();
+}
+
+void frmRx::CalculateScores() {
+  const ReadScope scope(*dbMembers_);
+  analysis_->CalculateScores();
+}
+
+void frmRx::CalculateScoresWhenPresent() {
+  if (game_.DataPresent) {
+    CalculateScores();
+  }
+}
+
+void frmRx::LoadGame() {
+  if (!gameFile_.AskForGame()) {
+    return;
+  }
+  const WaitCursor cursor;
+  ClearPlayerData();
+  const auto selectMission = [this](const std::string& name) {
+    for (int index = 0; index < ui_->ActiveMission->count(); ++index) {
+      if (missions_->Items()[static_cast<std::size_t>(index)].Text == name) {
+        SelectMission(index);
+      }
+    }
+  };
+  if (gameFile_.LoadGame(game_, selectMission)) {
+    game_.DataPresent = true;
+    CalculateScores();
+  }
+}
+
+void frmRx::SaveGame() {
+  gameFile_.SaveGame(game_, missions_->Text());
+}
+
+void frmRx::ClearGame() {
+  const BoxAnswer answer = services_.Boxes.Show(services_.Strings.Text(123), services_.Strings.Text(124),
+                                                BoxIcon::Question, BoxButtons::OkCancel);
+  if (answer == BoxAnswer::Ok) {
+    ClearPlayerData();
+  }
+}
+
+void frmRx::GetScoreData() {
+  if (uploadProgress_ == nullptr) {
+    uploadProgress_ = new UploadProgress(services_.Strings, this);
+  }
+  BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time, *uploadProgress_,
+                   game_)
+      .GetScores();
+  CalculateScores();
+}
+
+void frmRx::ShowCommPortSettings() {
+  Settings(*ini_, services_.Devices, services_.Boxes, services_.Strings, this).exec();
+}
+
+void frmRx::ShowSoldieringCalc() {
+  SoldieringCalc(factors_, services_.Strings, this).exec();
+  WriteSoldieringFactors(*ini_, factors_);
+  CalculateScoresWhenPresent();
+}
+
+void frmRx::ShowAbout() { About(this).exec(); }

@@ -1,0 +1,87 @@
+#pragma once
+
+#include <QMainWindow>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "app/Services.h"
+#include "core/CommPort.h"
+#include "core/Game.h"
+#include "core/GameFileDialog.h"
+#include "core/IniReader.h"
+#include "core/MemberLookup.h"
+#include "core/MissionList.h"
+#include "core/ScoreAnalysis.h"
+#include "core/ScoreList.h"
+#include "core/SoldieringFactors.h"
+
+namespace Ui {
+class frmRx;
+}
+class UploadProgress;
+
+/// The main window. Owns the game, both score lists and the open databases; every other window is opened from here.
+class frmRx : public QMainWindow {
+  Q_OBJECT
+
+ public:
+  explicit frmRx(const Services& services);
+  ~frmRx() override;
+
+  /// Finds the user's data, opens the databases and fills the window, in the order that the operator sees. Throws
+  /// RuntimeError when the program cannot go on.
+  void FormLoad();
+
+ protected:
+  void closeEvent(QCloseEvent* event) override;
+
+ private:
+  void SetCaptions();
+  void SetCaption(QAction& action, int textNumber);
+  void FitToScreenSize();
+  void SetUpLists();
+  void OpenDatabases();
+  void ConnectCommands();
+  /// Runs a command of the operator; a failure in it is reported and ends the command.
+  void Run(const std::function<void()>& command);
+
+  void FillMissionList();
+  void SelectMission(int index);
+
+  void ClearPlayerData();
+  void CalculateScores();
+  void CalculateScoresWhenPresent();
+
+  void LoadGame();
+  void SaveGame();
+  void ClearGame();
+  void GetScoreData();
+  void ShowCommPortSettings();
+  void ShowSoldieringCalc();
+  void ShowAbout();
+
+  const Services services_;
+  std::unique_ptr<Ui::frmRx> ui_;
+  Game game_;
+  SoldieringFactors factors_;
+  ScoreList scoreDisplay_;
+  ScoreList teamScores_;
+  GameFileDialog gameFile_;
+  std::string userDataFolder_;
+
+  // In the order in which start-up makes them.
+  std::optional<IniReader> ini_;
+  std::optional<CommPort> commPort_;
+  std::unique_ptr<Database> dbScenarios_;
+  std::unique_ptr<Recordset> rsScenarios_;
+  std::optional<MissionList> missions_;
+  std::unique_ptr<Database> dbMembers_;
+  std::unique_ptr<Recordset> rsMembers_;
+  std::optional<MemberLookup> members_;
+  std::optional<ScoreAnalysis> analysis_;
+  UploadProgress* uploadProgress_ = nullptr;  ///< made at first use, owned as child window
+  int runningCommands_ = 0;                   ///< commands on the stack; a wait in one can start another
+  bool closeRequested_ = false;               ///< close as soon as the last of them has unwound
+};

@@ -1,0 +1,34 @@
+# Warnings, strictness and include root that all of our own code shares.
+add_library(tessarine_options INTERFACE)
+target_include_directories(tessarine_options INTERFACE ${CMAKE_SOURCE_DIR})
+target_compile_options(tessarine_options INTERFACE
+  -Wall -Wextra -Wpedantic -Werror -Wshadow -Wconversion -Wno-sign-conversion -Wnon-virtual-dtor
+  -Woverloaded-virtual -Wold-style-cast -Wcast-align -Wnull-dereference -Wformat=2)
+target_compile_definitions(tessarine_options INTERFACE
+  QT_NO_CAST_FROM_ASCII QT_NO_CAST_TO_ASCII QT_NO_URL_CAST_FROM_STRING QT_NO_NARROWING_CONVERSIONS_IN_CONNECT
+  QT_NO_FOREACH QT_USE_QSTRINGBUILDER)
+if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+  # gcc 12 reports null dereferences inside the standard library's own string code when it inlines it.
+  target_compile_options(tessarine_options INTERFACE -Wno-null-dereference -Wno-restrict)
+endif()
+if(TESSARINE_SANITIZE)
+  target_compile_options(tessarine_options INTERFACE
+    -fsanitize=address,undefined -fno-sanitize-recover=undefined -fno-omit-frame-pointer)
+  target_link_options(tessarine_options INTERFACE -fsanitize=address,undefined)
+endif()
+
+# tessarine_library(<name> <sources>...): one folder's library.
+function(tessarine_library name)
+  add_library(${name} STATIC ${ARGN})
+  target_link_libraries(${name} PUBLIC tessarine_options)
+endfunction()
+
+# tessarine_test(<name> LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest knows one by one.
+function(tessarine_test name)
+  cmake_parse_arguments(ARG "" "" "LIBS;SOURCES" ${ARGN})
+  add_executable(${name} ${ARG_SOURCES})
+  target_link_libraries(${name} PRIVATE ${ARG_LIBS} tessarine_options GTest::gmock GTest::gtest_main)
+  include(GoogleTest)
+  gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 120
+    ENVIRONMENT "QT_QPA_PLATFORM=offscreen;LC_ALL=C.UTF-8")
+endfunction()

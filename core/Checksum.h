@@ -1,0 +1,23 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <span>
+
+/// Lookup table of the 1-Wire CRC-8: polynomial x^8 + x^5 + x^4 + 1, reflected form 0x8C.
+consteval std::array<std::uint8_t, 256> BuildCrcTable() {
+  std::array<std::uint8_t, 256> table{};
+  for (unsigned int entry = 0; entry < table.size(); ++entry) {
+    unsigned int crc = entry;
+    for (int bit = 0; bit < 8; ++bit)
+      crc = (crc & 1U) != 0 ? (crc >> 1U) ^ 0x8CU : crc >> 1U;
+    table[entry] = static_cast<std::uint8_t>(crc);
+  }
+  return table;
+}
+
+inline constexpr std::array<std::uint8_t, 256> CrcTable = BuildCrcTable();
+
+/// CRC-8 of `data` continued from `crc`; an empty `data` gives `crc` back. Over data with its own CRC behind
+/// it: 0.
+std::uint8_t Crc8(std::span<const std::uint8_t> data, std::uint8_t crc = 0);

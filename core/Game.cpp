@@ -1,0 +1,32 @@
+#include "core/Game.h"
+
+#include <utility>
+
+#include "core/NumberForms.h"
+
+void Player::Clear() {
+  Player cleared;
+  cleared.AbsoluteDamage = AbsoluteDamage;
+  cleared.Accuracy = Accuracy;
+  *this = std::move(cleared);
+}
+
+Game::Game(const StringTable& strings) {
+  for (int team = 1; team <= TeamCount; ++team) {
+    TeamNames(team) = strings.Text(113 + team);
+    ObjectiveTeams(team).Name = TeamNames(team);
+  }
+}
+
+void Game::Clear() {
+  for (Player& player : Players) {
+    player.Clear();
+  }
+  GameDate.clear();
+  DataPresent = false;
+}
+
+std::string Game::DisplayName(int index) const {
+  const std::uint8_t id = IdFromIndex(index);
+  return TeamNames(TeamFromId(id)) + " " + Str(std::int32_t{PlayerNumberFromId(id)});
+}

@@ -1,0 +1,155 @@
+#include <cstring>
+#include <pugixml.hpp>
+
+#include "core/GameFile.h"
+#include "core/NumberForms.h"
+#include "core/TextEncoding.h"
+
+namespace {
+
+/// All text below `node`, comments left out.
+std::string TextBelow(pugi::xml_node node) {
+  struct Collector : pugi::xml_tree_walker {
+    std::string Text;
+    bool for_each(pugi::xml_node& child) override {
+      if (child.type() == pugi::node_pcdata || child.type() == pugi::node_cdata) {
+        Text += child.value();
+      }
+      return true;
+    }
+  } collector;
+  node.traverse(collector);
+  return std::move(collector.Text);
+}
+
+/// Text of the first child element `name`, or `fallback` when there is none.
+std::string GetChildText(pugi::xml_node node, const char* name, const char* fallback) {
+  const pugi::xml_node child = node.child(name);
+  if (!child) {
+    return fallback;
+  }
+  const pugi::xml_node text = child.first_child();
+  if (text && text.type() == pugi::node_pcdata && !text.next_sibling()) {
+    return text.value();
+  }
+  return TextBelow(child);
+}
+
+std::int32_t GetNumber(pugi::xml_node node, const char* name) {
+  return ToInt32(GetChildText(node, name, "0"));
+}
+
+bool GetFlag(pugi::xml_node node, const char* name, const char* fallback) {
+  return ToDouble(GetChildText(node, name, fallback)) == 1;
+}
+
+/// True for a document of one element, with nothing but comments and the like around it.
+bool IsWellFormed(const pugi::xml_document& document) {
+  int elements = 0;
+  for (const pugi::xml_node node : document.children()) {
+    if (node.type() == pugi::node_element) {
+      ++elements;
+    } else if (node.type() == pugi::node_pcdata || node.type() == pugi::node_cdata) {
+      return false;
+    }
+  }
+  return elements == 1;
+}
+
+/// Parses in place. The document refers to `bytes` from then on.
+bool Parse(std::string& bytes, pugi::xml_document& document) {
+  constexpr unsigned int options = pugi::parse_default | pugi::parse_ws_pcdata_single | pugi::parse_fragment;
+  const bool isWide = bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF");
+  if (!isWide) {
+    if (std::memchr(bytes.data(), '\0', bytes.size()) != nullptr) {
+      return false;
+    }
+    if (!IsUtf8(bytes)) {
+      bytes = Windows1252ToUtf8(bytes);
+    }
+  }
+  const auto encoding = isWide ? pugi::encoding_auto : pugi::encoding_utf8;
+  return document.load_buffer_inplace(bytes.data(), bytes.size(), options, encoding) &&
+         IsWellFormed(document);
+}
+
+void ReadObjectiveTeams(pugi::xml_node header, Game& game) {
+  int set = 0;
+  for (const pugi::xml_node team : header.children("Team")) {
+    ObjectiveTeam& objective = game.ObjectiveTeams(++set);
+    objective.Name = GetChildText(team, "Name", "Error");
+    objective.PrimaryAchieved = GetFlag(team, "PrimaryObjectiveAchieved", "Error");
+    objective.SecondaryAchieved = GetFlag(team, "SecondryObjectiveAchieved", "Error");
+  }
+}
+
+void ReadFields(pugi::xml_node node, Player& player) {
+  player.ShotCount = GetNumber(node, "ShotCount");
+  player.TotalDamage = GetNumber(node, "TotalDamage");
+  player.AbsoluteDamage = GetNumber(node, "AbsoluteDamage");
+  player.Soldiering = GetNumber(node, "Soldiering");
+  player.HealCount = GetNumber(node, "HealCount");
+  player.AmmoAddCount = GetNumber(node, "AmmoAddCount");
+  player.AdminKillCount = GetNumber(node, "AdminKillCount");
+  player.RespawnCount = GetNumber(node, "RespawnCount");
+  player.DeathCount = GetNumber(node, "DeathCount");
+  player.RunCounter = GetNumber(node, "RunCounter");
+  player.Active = GetFlag(node, "Active", "0");
+  player.Committed = GetFlag(node, "Committed", "0");
+  player.RemainingHealth = GetNumber(node, "RemainingHealth");
+  player.RemainingClips = GetNumber(node, "RemainingClips");
+  player.RemainingAmmo = GetNumber(node, "RemainingAmmo");
+  player.SecondaryDamage = GetNumber(node, "SecondaryDamage");
+  player.PrimaryDamage = GetNumber(node, "PrimaryDamage");
+  player.Accuracy = ToSingle(GetChildText(node, "Accuracy", "0"));
+  player.Rank = ToInt16(GetChildText(node, "Rank", "0"));
+  player.MemberIndex = GetNumber(node, "MemberIndex");
+  player.DallasID = GetChildText(node, "DallasID", "0");
+  player.ExplosiveDamage = GetNumber(node, "ExplosiveDamage");
+  player.RadiationDamage = GetNumber(node, "RadiationDamage");
+  player.StunCount = GetNumber(node, "StunCount");
+  player.PowerCheatFlag = ToByte(GetChildText(node, "PowerCheatFlag", "0"));
+  player.BonusPoints = GetNumber(node, "BonusPoints");
+}
+
+/// Reads every hit of every "HitData" at any depth below a player.
+struct HitReader : pugi::xml_tree_walker {
+  explicit HitReader(Player& target) : Target(target) {}
+
+  bool for_each(pugi::xml_node& node) override {
+    if (node.type() == pugi::node_element && std::strcmp(node.name(), "HitByPlayer") == 0 &&
+        std::strcmp(node.parent().name(), "HitData") == 0) {
+      Target.HitByPlayer(GetNumber(node, "Index")) = GetNumber(node, "Amount");
+    }
+    return true;
+  }
+
+  Player& Target;
+};
+
+}  // namespace
+
+bool ReadGameFile(std::string bytes, Game& game,
+                  const std::function<void(const std::string&)>& selectMission) {
+  pugi::xml_document document;
+  if (!Parse(bytes, document)) {
+    return false;
+  }
+  const pugi::xml_node root = document.child("GameData");
+  if (!root) {
+    return false;
+  }
+  const pugi::xml_node header = root.child("GameHeader");
+  selectMission(GetChildText(header, "MissionName", "None"));
+  game.GameDate = GetChildText(header, "GameDate", "N/A");
+  ReadObjectiveTeams(header, game);
+  for (const pugi::xml_node playerData : root.children("PlayerData")) {
+    for (pugi::xml_node node : playerData.children("Player")) {
+      Player& player = game.Players(GetNumber(node, "Index"));
+      ReadFields(node, player);
+      HitReader hits(player);
+      node.traverse(hits);
+    }
+  }
+  return true;
+}

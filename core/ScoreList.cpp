@@ -1,0 +1,102 @@
+#include "core/ScoreList.h"
+
+#include <algorithm>
+#include <limits>
+#include <string_view>
+#include <utility>
+
+#include "core/NumberForms.h"
+
+namespace {
+
+/// What a cell sorts by: its number, or less than any number.
+double SortKey(std::string_view text, bool isRowText) {
+  constexpr double noNumber = -std::numeric_limits<double>::infinity();
+  if (IsNumeric(text)) {
+    return Val(text);
+  }
+  if (isRowText || text.empty()) {
+    return noNumber;
+  }
+  text.remove_suffix(1);
+  return IsNumeric(text) ? Val(text) : noNumber;
+}
+
+std::string_view Trimmed(std::string_view text) {
+  const auto first = text.find_first_not_of(' ');
+  if (first == std::string_view::npos) {
+    return {};
+  }
+  return text.substr(first, text.find_last_not_of(' ') - first + 1);
+}
+
+void StoreRank(std::string_view playerText, std::int16_t rank, Game& game) {
+  playerText = Trimmed(playerText);
+  const auto blank = playerText.find(' ');
+  if (blank == std::string_view::npos) {
+    return;
+  }
+  const std::string_view team = playerText.substr(0, blank);
+  const int number = RoundToInt32(Val(playerText.substr(blank)));
+  const int base = team == game.TeamNames(1) ? 1 : team == game.TeamNames(2) ? 33 : 65;
+  game.Players(base + number).Rank = rank;
+}
+
+}  // namespace
+
+void ScoreList::Clear() {
+  rows_.clear();
+  NotifyChanged();
+}
+
+void ScoreList::AddRow(std::vector<std::string> cells) {
+  rows_.push_back({std::move(cells), static_cast<int>(rows_.size())});
+}
+
+void ScoreList::Sort(int column) {
+  struct Entry {
+    double Key;
+    Row Contents;
+  };
+  std::vector<Entry> entries;
+  entries.reserve(rows_.size());
+  for (Row& row : rows_) {
+    const double key = SortKey(row.Cells[static_cast<std::size_t>(column)], column == 0);
+    entries.push_back({key, std::move(row)});
+  }
+  const bool ascending = SortOrder == ::SortOrder::Ascending;
+  std::sort(entries.begin(), entries.end(), [ascending](const Entry& left, const Entry& right) {
+    if (left.Key == right.Key) {
+      return left.Contents.Added < right.Contents.Added;
+    }
+    return (left.Key < right.Key) == ascending;
+  });
+  std::transform(entries.begin(), entries.end(), rows_.begin(),
+                 [](Entry& entry) { return std::move(entry.Contents); });
+}
+
+void ScoreList::NotifyChanged() const {
+  if (Changed) {
+    Changed();
+  }
+}
+
+void SortListNumeric(ScoreList& list, int column, bool assignRanks, Game& game) {
+  list.Sort(std::max(column, 0));
+  std::int16_t place = 0;
+  for (ScoreList::Row& row : list.rows_) {
+    ++place;
+    if (column < 1) {
+      game.Players(place).Rank = place;
+    } else if (assignRanks) {
+      row.Cells[0] = std::to_string(place);
+      StoreRank(row.Cells[1], place, game);
+    }
+  }
+  list.NotifyChanged();
+}
+
+void SortByHeader(ScoreList& scoreDisplay, int header, Game& game) {
+  scoreDisplay.SortOrder = header <= 2 ? SortOrder::Ascending : SortOrder::Descending;
+  SortListNumeric(scoreDisplay, header - 1, false, game);
+}

@@ -1,0 +1,16 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+/// ASCII letters only.
+constexpr char LowerAscii(char letter) {
+  return letter >= 'A' && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
+}
+
+/// True when `text` is well-formed UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
+bool IsUtf8(std::string_view text);
+
+/// `text` of code page 1252 as UTF-8. The five bytes that the code page leaves undefined become U+0081 and so
+/// on.
+std::string Windows1252ToUtf8(std::string_view text);

@@ -1,0 +1,75 @@
+#include "demo/DemoRun.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QLineEdit>
+#include <QMessageBox>
+#include <QPushButton>
+#include <QSaveFile>
+#include <QTableView>
+#include <QTest>
+#include <cstdio>
+
+#include "demo/BoardText.h"
+
+DemoRun::DemoRun(QMainWindow& window, const QDir& folder)
+    : window_(window), folder_(folder), gameFile_(folder.absoluteFilePath(QStringLiteral("game.xml"))) {
+  connect(&watch_, &QTimer::timeout, this, &DemoRun::AnswerDialogs);
+}
+
+QStringList DemoRun::Run() {
+  if (!QTest::qWaitForWindowExposed(&window_)) {
+    faults_.append(QStringLiteral("The main window did not appear."));
+    return faults_;
+  }
+  constexpr int watchMilliseconds = 50;
+  watch_.start(watchMilliseconds);
+  PullGame();
+  SaveGame();
+  watch_.stop();
+  WriteBoard();
+  return faults_;
+}
+
+void DemoRun::PullGame() {
+  // The click returns when the download has ended: its handler waits inside.
+  QTest::mouseClick(window_.findChild<QPushButton*>(QStringLiteral("GetScores")), Qt::LeftButton);
+}
+
+void DemoRun::SaveGame() {
+  window_.findChild<QAction*>(QStringLiteral("mnuSaveScores"))->trigger();
+  if (QFileInfo(gameFile_).size() == 0) {
+    faults_.append(QStringLiteral("The game was not saved."));
+  }
+}
+
+void DemoRun::WriteBoard() {
+  const auto* board = window_.findChild<QTableView*>(QStringLiteral("ScoreDisplay"))->model();
+  const auto* teams = window_.findChild<QTableView*>(QStringLiteral("TeamScores"))->model();
+  std::printf("%s\n%s", qUtf8Printable(Aligned(*board)), qUtf8Printable(Aligned(*teams)));
+  WriteFile(QStringLiteral("board.tsv"), TabSeparated(*board));
+  WriteFile(QStringLiteral("teams.tsv"), TabSeparated(*teams));
+  if (!window_.grab().save(folder_.absoluteFilePath(QStringLiteral("board.png")))) {
+    faults_.append(QStringLiteral("The picture of the board could not be written."));
+  }
+}
+
+void DemoRun::WriteFile(const QString& name, const QString& text) {
+  QSaveFile file(folder_.absoluteFilePath(name));
+  if (!file.open(QIODevice::WriteOnly) || file.write(text.toUtf8()) < 0 || !file.commit()) {
+    faults_.append(QStringLiteral("%1: %2").arg(name, file.errorString()));
+  }
+}
+
+void DemoRun::AnswerDialogs() {
+  QWidget* front = QApplication::activeModalWidget();
+  if (auto* dialog = qobject_cast<QFileDialog*>(front)) {
+    dialog->findChild<QLineEdit*>(QStringLiteral("fileNameEdit"))->setText(gameFile_);
+    QMetaObject::invokeMethod(dialog, "accept");
+  } else if (auto* box = qobject_cast<QMessageBox*>(front)) {
+    faults_.append(QStringLiteral("A box came up: %1").arg(box->text()));
+    box->defaultButton()->click();
+  }
+}

@@ -1,0 +1,33 @@
+#pragma once
+
+#include <QDir>
+#include <QMainWindow>
+#include <QStringList>
+#include <QTimer>
+
+/// Plays the operator for one game: presses the real button of the real window, waits for the end, saves the game through the menu
+/// and the file dialog, and leaves the board as text and picture.
+class DemoRun : public QObject {
+  Q_OBJECT
+
+ public:
+  DemoRun(QMainWindow& window, const QDir& folder);
+
+  /// Returns what went wrong, one line each; empty when all of it happened.
+  QStringList Run();
+
+ private:
+  void PullGame();
+  void SaveGame();
+  void WriteBoard();
+  void WriteFile(const QString& name, const QString& text);
+  /// Answers whatever is open in front of the main window: the file dialog with `gameFile_`, a box, which is a fault here, with its
+  /// default button.
+  void AnswerDialogs();
+
+  QMainWindow& window_;
+  QDir folder_;
+  QString gameFile_;
+  QTimer watch_;
+  QStringList faults_;
+};

@@ -1,0 +1,34 @@
+# For the scripts at the root: installs Debian packages when they are missing, and builds.
+
+BuildPackages=(g++ cmake ninja-build qt6-base-dev qt6-base-dev-tools qt6-serialport-dev libsqlite3-dev sqlite3
+  libpugixml-dev libgtest-dev libgmock-dev libbenchmark-dev)
+RunPackages=(qt6-translations-l10n fonts-dejavu-core fonts-noto-cjk)
+DisplayPackages=(xvfb xauth)
+CheckPackages=(clang clang-format clang-tidy libclang-rt-14-dev git)
+
+# RequirePackages NAME...: installs those that are not installed; as root, or with sudo.
+RequirePackages() {
+  local missing=() package
+  for package in "$@"; do
+    [ "$(dpkg-query -W -f='${Status}' "$package" 2>/dev/null)" = "install ok installed" ] || missing+=("$package")
+  done
+  [ ${#missing[@]} -eq 0 ] && return 0
+  local asRoot=()
+  if [ "$(id -u)" -ne 0 ]; then
+    command -v sudo > /dev/null || { echo "Missing packages: ${missing[*]} (install them, or run this as root)" >&2; return 1; }
+    asRoot=(sudo)
+  fi
+  echo "Installing ${missing[*]}"
+  "${asRoot[@]}" apt-get update -qq
+  "${asRoot[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}" > /dev/null
+}
+
+# Build PRESET [TARGET...]: configures and builds; all targets when none is named.
+Build() {
+  local preset=$1
+  shift
+  cmake --preset "$preset" > /dev/null
+  cmake --build --preset "$preset" ${1:+--target "$@"}
+}
+
+HasDisplay() { [ -n "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ]; }

@@ -1,0 +1,29 @@
+#pragma once
+
+#include <exception>
+#include <new>
+#include <string>
+
+#include "platform/MessageBoxes.h"
+#include "platform/RuntimeError.h"
+
+inline void ShowErrorReport(MessageBoxes& boxes, int number, const std::string& text) {
+  boxes.Show("Run-time error '" + std::to_string(number) + "': " + text, DefaultBoxTitle, BoxIcon::Critical);
+}
+
+/// Runs a command of the operator. A failure that nothing below has a behaviour for ends the command with a box; the
+/// program goes on. Returns false when the command failed.
+template <typename Command>
+bool ReportErrors(MessageBoxes& boxes, Command&& command) {
+  try {
+    command();
+    return true;
+  } catch (const RuntimeError& error) {
+    ShowErrorReport(boxes, error.Number(), error.what());
+  } catch (const std::bad_alloc&) {
+    ShowErrorReport(boxes, 7, "Out of memory");
+  } catch (const std::exception& error) {
+    ShowErrorReport(boxes, 51, std::string("Internal error: ") + error.what());
+  }
+  return false;
+}

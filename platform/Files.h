@@ -1,0 +1,22 @@
+#pragma once
+
+#include <string>
+
+/// Files and folders by path (UTF-8, the platform's separator).
+class Files {
+ public:
+  virtual ~Files() = default;
+
+  virtual bool FileExists(const std::string& path) const = 0;
+  virtual bool FolderExists(const std::string& path) const = 0;
+
+  /// Makes one folder; its parent must exist. Throws RuntimeError 75 or 76.
+  virtual void CreateFolder(const std::string& path) = 0;
+
+  /// The whole file. Throws RuntimeError 53 when it does not exist, 75 when it cannot be read.
+  virtual std::string Read(const std::string& path) const = 0;
+
+  /// Writes the whole file atomically: a failure or a crash leaves the old file (or none). Durable on return. A path that is a
+  /// symbolic link has its target replaced. Throws RuntimeError 61 (disk full), 70, 75 or 76; the text names the file.
+  virtual void Replace(const std::string& path, const std::string& bytes) = 0;
+};

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <string>
+
+/// One serial line. Bytes arrive while events are served (EventPump), into an unbounded input buffer.
+class SerialPort {
+ public:
+  virtual ~SerialPort() = default;
+
+  /// Opens `device` (a path such as "/dev/ttyUSB0") with `settings` "baud,parity,data bits,stop bits", for instance
+  /// "19200,N,8,1", without flow control, and empties the input. Throws RuntimeError 8005 when this object is already
+  /// open or another program holds the device, 8002 when the device is missing or refuses. A failed open leaves it closed.
+  virtual void Open(const std::string& device, const std::string& settings) = 0;
+
+  /// Sends what is still under way, then closes. Does nothing when closed.
+  virtual void Close() = 0;
+
+  virtual bool PortOpen() const = 0;
+
+  /// Bytes that Input() can return at once. Throws RuntimeError 8018 when closed, 8012 when the line was lost
+  /// (unplugged) and nothing is left to read.
+  virtual std::size_t InBufferCount() = 0;
+
+  /// Takes one byte. Throws as InBufferCount() does, and RuntimeError 62 when there is none.
+  virtual std::uint8_t Input() = 0;
+
+  /// Puts one byte on the line at once. Throws RuntimeError 8018 when closed, 8012 when the line was lost.
+  virtual void Output(std::uint8_t byte) = 0;
+
+  /// Drops all input received so far. Throws RuntimeError 8018 when closed.
+  virtual void ClearInput() = 0;
+};

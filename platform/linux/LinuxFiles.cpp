@@ -1,0 +1,179 @@
+#include "platform/linux/LinuxFiles.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#include <cerrno>
+#include <cstdio>
+
+#include <array>
+#include <filesystem>
+#include <random>
+#include <string_view>
+#include <utility>
+
+#include "platform/linux/FileError.h"
+
+namespace {
+
+class Descriptor {
+ public:
+  explicit Descriptor(int number) : number_(number) {}
+  ~Descriptor() {
+    if (number_ >= 0) {
+      close(number_);
+    }
+  }
+  Descriptor(const Descriptor&) = delete;
+  Descriptor& operator=(const Descriptor&) = delete;
+
+  int Number() const { return number_; }
+
+ private:
+  int number_;
+};
+
+// What `path` finally names, which need not exist.
+std::string FollowLinks(std::string path) {
+  constexpr int MostLinks = 40;
+  for (int links = 0; links < MostLinks; ++links) {
+    std::error_code error;
+    const std::filesystem::path target = std::filesystem::read_symlink(path, error);
+    if (error) {
+      return path;
+    }
+    path = std::filesystem::path(path).parent_path() / target;
+  }
+  throw FileError(ELOOP, path);
+}
+
+// A new, empty file of a name that nothing else has, which goes away unless it is renamed.
+class TemporaryFile {
+ public:
+  explicit TemporaryFile(const std::string& folder) : path_(NewName(folder)), file_(Create(path_)) {}
+  ~TemporaryFile() {
+    if (!renamed_) {
+      unlink(path_.c_str());
+    }
+  }
+  TemporaryFile(const TemporaryFile&) = delete;
+  TemporaryFile& operator=(const TemporaryFile&) = delete;
+
+  int Number() const { return file_.Number(); }
+
+  bool RenameTo(const std::string& path) {
+    renamed_ = rename(path_.c_str(), path.c_str()) == 0;
+    return renamed_;
+  }
+
+ private:
+  static std::string NewName(const std::string& folder) {
+    std::random_device random;
+    std::array<char, 32> name{};
+    std::snprintf(name.data(), name.size(), ".new-%08x%08x", random(), random());
+    return folder + "/" + name.data();
+  }
+  static int Create(const std::string& path) {
+    return open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0644);
+  }
+
+  std::string path_;
+  Descriptor file_;
+  bool renamed_ = false;
+};
+
+bool WriteAll(int file, std::string_view bytes) {
+  while (!bytes.empty()) {
+    const ssize_t written = write(file, bytes.data(), bytes.size());
+    if (written < 0 && errno != EINTR) {
+      return false;
+    }
+    bytes.remove_prefix(written < 0 ? 0 : static_cast<std::size_t>(written));
+  }
+  return true;
+}
+
+// Gives the new file the permissions of the old one.
+bool TakeOver(int file, const struct stat& old) {
+  struct stat own {};
+  if (fstat(file, &own) != 0) {
+    return false;
+  }
+  // Only an administrator may give a file away; for anyone else it becomes the writer's own.
+  if ((own.st_uid != old.st_uid || own.st_gid != old.st_gid) && fchown(file, old.st_uid, old.st_gid) != 0 &&
+      errno != EPERM) {
+    return false;
+  }
+  return fchmod(file, old.st_mode & 07777) == 0;
+}
+
+// Makes the folder's entries durable; some file systems have no such operation.
+bool SyncFolder(const std::string& folder) {
+  const Descriptor descriptor(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+  return descriptor.Number() >= 0 && (fsync(descriptor.Number()) == 0 || errno == EINVAL);
+}
+
+}  // namespace
+
+bool LinuxFiles::FileExists(const std::string& path) const {
+  struct stat info {};
+  return stat(path.c_str(), &info) == 0 && !S_ISDIR(info.st_mode);
+}
+
+bool LinuxFiles::FolderExists(const std::string& path) const {
+  struct stat info {};
+  return stat(path.c_str(), &info) == 0 && S_ISDIR(info.st_mode);
+}
+
+void LinuxFiles::CreateFolder(const std::string& path) {
+  if (mkdir(path.c_str(), 0777) != 0) {
+    if (errno == ENOENT || errno == ENOTDIR) {
+      throw RuntimeError(76, "Path not found: " + path);
+    }
+    throw RuntimeError(75, "Path/File access error: " + path);
+  }
+}
+
+std::string LinuxFiles::Read(const std::string& path) const {
+  const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+  if (file.Number() < 0 && (errno == ENOENT || errno == ENOTDIR)) {
+    throw RuntimeError(53, "File not found: " + path);
+  }
+  struct stat info {};
+  if (file.Number() < 0 || fstat(file.Number(), &info) != 0 || !S_ISREG(info.st_mode)) {
+    throw RuntimeError(75, "Path/File access error: " + path);
+  }
+  std::string bytes;
+  bytes.reserve(static_cast<std::size_t>(info.st_size));
+  std::array<char, 65536> buffer;
+  for (;;) {
+    const ssize_t count = read(file.Number(), buffer.data(), buffer.size());
+    if (count == 0) {
+      return bytes;
+    }
+    if (count < 0 && errno != EINTR) {
+      throw RuntimeError(75, "Path/File access error: " + path);
+    }
+    bytes.append(buffer.data(), count < 0 ? 0 : static_cast<std::size_t>(count));
+  }
+}
+
+void LinuxFiles::Replace(const std::string& path, const std::string& bytes) {
+  const std::string target = FollowLinks(path);
+  struct stat old {};
+  const bool exists = stat(target.c_str(), &old) == 0;
+  if (exists && !S_ISREG(old.st_mode)) {
+    throw FileError(EISDIR, path);
+  }
+  if (exists && faccessat(AT_FDCWD, target.c_str(), W_OK, AT_EACCESS) != 0) {
+    throw FileError(errno, path);
+  }
+  const std::string parent = std::filesystem::path(target).parent_path();
+  const std::string folder = parent.empty() ? "." : parent;
+
+  TemporaryFile file(folder);
+  if (file.Number() < 0 || (exists && !TakeOver(file.Number(), old)) || !WriteAll(file.Number(), bytes) ||
+      fsync(file.Number()) != 0 || !file.RenameTo(target) || !SyncFolder(folder)) {
+    throw FileError(errno, path);
+  }
+}

@@ -1,0 +1,20 @@
+#pragma once
+
+#include <string>
+
+#include "platform/Files.h"
+
+/// Files of the local file system. Only regular files are read and replaced, so that a pipe or a device
+/// cannot hold the program up.
+class LinuxFiles : public Files {
+ public:
+  bool FileExists(const std::string& path) const override;
+  bool FolderExists(const std::string& path) const override;
+  void CreateFolder(const std::string& path) override;
+  std::string Read(const std::string& path) const override;
+
+  /// Keeps the old file's permissions, and its owner where that is allowed; a new file gets 0644 less the
+  /// process's mask. A file that may not be written is refused (70) although its folder would allow to put
+  /// another in its place.
+  void Replace(const std::string& path, const std::string& bytes) override;
+};

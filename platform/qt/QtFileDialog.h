@@ -1,0 +1,28 @@
+#pragma once
+
+#include <QPointer>
+#include <QStringList>
+#include <QWidget>
+
+#include "platform/FileDialog.h"
+
+/// The toolkit's name filters for "description|pattern[|description|pattern...]", with patterns such as
+/// "*.bmp;*.jpg". A pattern list at the end of a description is replaced by the pattern's own.
+QStringList NameFilters(const std::string& filter);
+
+/// Opens in the folder of the file name handed in, else in the folder last chosen from, else in the user's
+/// documents.
+class QtFileDialog : public FileDialog {
+ public:
+  /// Window that dialogs belong to while no window of the program is active.
+  void SetMainWindow(QWidget* mainWindow) { mainWindow_ = mainWindow; }
+
+  std::string ShowOpen(const std::string& filter, const std::string& fileName) override;
+  std::string ShowSave(const std::string& filter, const std::string& fileName) override;
+
+ private:
+  std::string Ask(bool save, const std::string& filter, const std::string& fileName);
+
+  QPointer<QWidget> mainWindow_;
+  QString lastFolder_;
+};

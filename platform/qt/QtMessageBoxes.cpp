@@ -1,0 +1,71 @@
+#include "platform/qt/QtMessageBoxes.h"
+
+#include <QMessageBox>
+
+#include "platform/qt/DialogParent.h"
+
+namespace {
+
+QMessageBox::Icon IconOf(BoxIcon icon) {
+  switch (icon) {
+    case BoxIcon::Information:
+      return QMessageBox::Information;
+    case BoxIcon::Question:
+      return QMessageBox::Question;
+    case BoxIcon::Exclamation:
+      return QMessageBox::Warning;
+    case BoxIcon::Critical:
+      return QMessageBox::Critical;
+    case BoxIcon::None:
+      break;
+  }
+  return QMessageBox::NoIcon;
+}
+
+void SetButtons(QMessageBox& box, BoxButtons buttons) {
+  switch (buttons) {
+    case BoxButtons::Ok:
+      box.setStandardButtons(QMessageBox::Ok);
+      box.setDefaultButton(QMessageBox::Ok);
+      box.setEscapeButton(QMessageBox::Ok);
+      break;
+    case BoxButtons::OkCancel:
+      box.setStandardButtons(QMessageBox::Ok | QMessageBox::Cancel);
+      box.setDefaultButton(QMessageBox::Ok);
+      box.setEscapeButton(QMessageBox::Cancel);
+      break;
+    case BoxButtons::YesNo:
+      box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
+      box.setDefaultButton(QMessageBox::Yes);
+      box.setEscapeButton(QMessageBox::No);
+      break;
+  }
+}
+
+BoxAnswer AnswerOf(int pressed, BoxButtons buttons) {
+  switch (buttons) {
+    case BoxButtons::Ok:
+      break;
+    case BoxButtons::OkCancel:
+      return pressed == QMessageBox::Ok ? BoxAnswer::Ok : BoxAnswer::Cancel;
+    case BoxButtons::YesNo:
+      return pressed == QMessageBox::Yes ? BoxAnswer::Yes : BoxAnswer::No;
+  }
+  return BoxAnswer::Ok;
+}
+
+}  // namespace
+
+BoxAnswer QtMessageBoxes::Show(const std::string& text, const std::string& title, BoxIcon icon,
+                               BoxButtons buttons) {
+  // Not on the stack: its parent may be destroyed, and the box with it, while it is open.
+  const QPointer<QMessageBox> box = new QMessageBox(DialogParent(mainWindow_));
+  box->setTextFormat(Qt::PlainText);
+  box->setText(QString::fromStdString(text));
+  box->setWindowTitle(QString::fromStdString(title));
+  box->setIcon(IconOf(icon));
+  SetButtons(*box, buttons);
+  const int pressed = box->exec();
+  delete box;
+  return AnswerOf(pressed, buttons);
+}

@@ -1,0 +1,14 @@
+#pragma once
+
+#include "platform/SerialDevices.h"
+
+/// Order of names in which runs of digits count as numbers: "ttyS2" is before "ttyS10".
+bool NaturalLess(const std::string& left, const std::string& right);
+
+class QtSerialDevices : public SerialDevices {
+ public:
+  std::vector<std::string> Names() const override;
+
+  /// Follows links, such as those under /dev/serial/by-id.
+  bool Exists(const std::string& device) const override;
+};

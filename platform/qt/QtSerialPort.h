@@ -1,0 +1,37 @@
+#pragma once
+
+#include <QSerialPort>
+#include <deque>
+
+#include "platform/SerialPort.h"
+
+/// A serial line of this machine, or a pseudo terminal. Needs a running event loop to receive.
+///
+/// When the line is lost the device is closed at once, so that nothing spins on it, but the port counts as
+/// open until Close(): received bytes stay readable, then InBufferCount(), Input() and Output() throw
+/// RuntimeError 8012. A line that takes no byte for 3 s is lost too. Open() throws RuntimeError 380 for bad
+/// settings; parity is N, E or O in either case.
+class QtSerialPort : public SerialPort {
+ public:
+  QtSerialPort();
+  ~QtSerialPort() override;
+
+  void Open(const std::string& device, const std::string& settings) override;
+  void Close() override;
+  bool PortOpen() const override { return lost_ || port_.isOpen(); }
+  std::size_t InBufferCount() override;
+  std::uint8_t Input() override;
+  void Output(std::uint8_t byte) override;
+  void ClearInput() override;
+
+ private:
+  void ApplySettings(const std::string& settings);
+  void TakeExclusively();
+  void TakeReceived();
+  void OnError(QSerialPort::SerialPortError error);
+  void Lose();
+
+  QSerialPort port_;
+  std::deque<std::uint8_t> input_;
+  bool lost_ = false;
+};

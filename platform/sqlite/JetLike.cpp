@@ -1,0 +1,168 @@
+#include "platform/sqlite/JetLike.h"
+
+#include <locale.h>
+#include <clocale>
+#include <cstddef>
+#include <cwctype>
+
+#include <algorithm>
+#include <utility>
+
+#include "platform/RuntimeError.h"
+
+namespace {
+
+// Bytes that are no UTF-8 are moved to where no character lies, so that each equals only itself.
+constexpr char32_t StrayByte = 0x110000;
+
+std::size_t SequenceLength(unsigned char lead) {
+  if (lead >= 0xC2 && lead <= 0xDF) {
+    return 2;
+  }
+  if (lead >= 0xE0 && lead <= 0xEF) {
+    return 3;
+  }
+  return lead >= 0xF0 && lead <= 0xF4 ? 4 : 1;
+}
+
+char32_t TakeCharacter(std::string_view& text) {
+  const auto lead = static_cast<unsigned char>(text.front());
+  const std::size_t length = SequenceLength(lead);
+  if (length == 1 || length > text.size()) {
+    text.remove_prefix(1);
+    return lead < 0x80 ? lead : StrayByte + lead;
+  }
+  char32_t character = lead & (0x7Fu >> length);
+  for (std::size_t i = 1; i < length; ++i) {
+    const auto next = static_cast<unsigned char>(text[i]);
+    if ((next & 0xC0) != 0x80) {
+      text.remove_prefix(1);
+      return StrayByte + lead;
+    }
+    character = (character << 6) | (next & 0x3Fu);
+  }
+  text.remove_prefix(length);
+  return character;
+}
+
+char32_t Fold(char32_t character) {
+  if (character < 0x80) {
+    return character >= U'A' && character <= U'Z' ? character + (U'a' - U'A') : character;
+  }
+  // A locale of its own: the program's may be one that knows no letters beyond ASCII.
+  static const locale_t unicode = newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr);
+  if (unicode == nullptr || character >= StrayByte) {
+    return character;
+  }
+  return static_cast<char32_t>(towlower_l(static_cast<wint_t>(character), unicode));
+}
+
+char32_t TakeFolded(std::string_view& text) {
+  return Fold(TakeCharacter(text));
+}
+
+}  // namespace
+
+JetPattern::JetPattern(std::string_view pattern) {
+  while (!pattern.empty()) {
+    const char32_t character = TakeFolded(pattern);
+    switch (character) {
+      case U'*':
+        tokens_.push_back({Kind::AnyText, 0, false, {}});
+        break;
+      case U'?':
+        tokens_.push_back({Kind::AnyCharacter, 0, false, {}});
+        break;
+      case U'#':
+        tokens_.push_back({Kind::Digit, 0, false, {}});
+        break;
+      case U'[':
+        AddSet(pattern);
+        break;
+      default:
+        tokens_.push_back({Kind::Character, character, false, {}});
+        break;
+    }
+  }
+}
+
+void JetPattern::AddSet(std::string_view& rest) {
+  const std::size_t end = rest.find(']');
+  if (end == std::string_view::npos) {
+    throw RuntimeError(93, "Invalid pattern string");
+  }
+  std::string_view list = rest.substr(0, end);
+  rest.remove_prefix(end + 1);
+  if (list.empty()) {
+    return;
+  }
+  Token set{Kind::Set, 0, false, {}};
+  if (list.size() > 1 && list.front() == '!') {
+    set.Negated = true;
+    list.remove_prefix(1);
+  }
+  while (!list.empty()) {
+    const char32_t first = TakeFolded(list);
+    char32_t last = first;
+    if (list.size() > 1 && list.front() == '-') {
+      list.remove_prefix(1);
+      last = TakeFolded(list);
+    }
+    if (last < first) {
+      throw RuntimeError(93, "Invalid pattern string");
+    }
+    set.Ranges.push_back({first, last});
+  }
+  tokens_.push_back(std::move(set));
+}
+
+bool JetPattern::Fits(const Token& token, char32_t character) {
+  switch (token.What) {
+    case Kind::Character:
+      return character == token.Character;
+    case Kind::Digit:
+      return character >= U'0' && character <= U'9';
+    case Kind::Set:
+      return token.Negated != std::any_of(token.Ranges.begin(), token.Ranges.end(), [&](const Range& range) {
+               return character >= range.First && character <= range.Last;
+             });
+    default:
+      return true;
+  }
+}
+
+bool JetPattern::Matches(std::string_view text) const {
+  // Only the last `*` ever needs to take one character more: what stands before it has been matched as early
+  // as it could be, so giving an earlier `*` more would win nothing.
+  std::size_t token = 0;
+  std::size_t afterStar = tokens_.size() + 1;
+  std::string_view starText;
+  while (!text.empty()) {
+    if (token < tokens_.size() && tokens_[token].What == Kind::AnyText) {
+      afterStar = ++token;
+      starText = text;
+      if (afterStar == tokens_.size()) {
+        return true;
+      }
+      continue;
+    }
+    std::string_view rest = text;
+    if (token < tokens_.size() && Fits(tokens_[token], TakeFolded(rest))) {
+      ++token;
+      text = rest;
+      continue;
+    }
+    if (afterStar > tokens_.size()) {
+      return false;
+    }
+    TakeCharacter(starText);
+    token = afterStar;
+    text = starText;
+  }
+  return std::all_of(tokens_.begin() + static_cast<std::ptrdiff_t>(token), tokens_.end(),
+                     [](const Token& rest) { return rest.What == Kind::AnyText; });
+}
+
+bool JetLike(std::string_view text, std::string_view pattern) {
+  return JetPattern(pattern).Matches(text);
+}

@@ -1,0 +1,123 @@
+#include "platform/sqlite/PendingRow.h"
+
+#include <algorithm>
+#include <string>
+#include <utility>
+
+#include "platform/RuntimeError.h"
+
+PendingRow::PendingRow(SqliteConnection& connection, const SqliteTable& table)
+    : connection_(connection), table_(table), values_(table.Columns().size()) {}
+
+void PendingRow::Start(::EditMode mode) {
+  Drop();
+  if (mode == ::EditMode::Add) {
+    TakeDefaults();
+  }
+  mode_ = mode;
+}
+
+// Long columns are left to the database, since the first Append has to begin with nothing.
+void PendingRow::TakeDefaults() {
+  std::string defaults;
+  for (const SqliteColumn& column : table_.Columns()) {
+    defaults += (defaults.empty() ? "SELECT " : ", ") +
+                (column.Default.empty() ? "NULL" : "(" + column.Default + ")");
+  }
+  SqliteStatement row(connection_, defaults);
+  row.Step();
+  for (std::size_t i = 0; i < values_.size(); ++i) {
+    const SqliteColumn& column = table_.Columns()[i];
+    if (!column.Default.empty() && !column.IsLong) {
+      row.Read(static_cast<int>(i), values_[i].emplace());
+    }
+  }
+}
+
+void PendingRow::Drop() {
+  if (mode_ != ::EditMode::None) {
+    mode_ = ::EditMode::None;
+    std::fill(values_.begin(), values_.end(), std::nullopt);
+  }
+}
+
+void PendingRow::CheckStarted() const {
+  if (mode_ == ::EditMode::None) {
+    throw RuntimeError(3020);
+  }
+}
+
+void PendingRow::Set(std::size_t column, Value value) {
+  CheckStarted();
+  const SqliteColumn& target = table_.Columns()[column];
+  if (target.IsKey && mode_ == ::EditMode::InProgress) {
+    throw RuntimeError(3164, "Field cannot be updated: " + target.Name);
+  }
+  values_[column] = target.Accept(std::move(value));
+}
+
+void PendingRow::Append(std::size_t column, const Blob& bytes) {
+  CheckStarted();
+  std::optional<Value>& value = values_[column];
+  if (!value || !std::holds_alternative<Blob>(*value)) {
+    value = Blob();
+  }
+  auto& held = std::get<Blob>(*value);
+  held.insert(held.end(), bytes.begin(), bytes.end());
+}
+
+std::vector<std::size_t> PendingRow::ColumnsSet() const {
+  std::vector<std::size_t> columns;
+  for (std::size_t i = 0; i < values_.size(); ++i) {
+    if (values_[i]) {
+      columns.push_back(i);
+    }
+  }
+  return columns;
+}
+
+std::int64_t PendingRow::Insert() {
+  const std::vector<std::size_t> columns = ColumnsSet();
+  std::string names;
+  std::string marks;
+  for (const std::size_t i : columns) {
+    names += (names.empty() ? "[" : ", [") + table_.Columns()[i].Name + "]";
+    marks += marks.empty() ? "?" : ", ?";
+  }
+  WriteTransaction transaction(connection_);
+  SqliteStatement insertion(
+      connection_, "INSERT INTO [" + table_.Name() + "] " +
+                       (columns.empty() ? "DEFAULT VALUES" : "(" + names + ") VALUES (" + marks + ")"));
+  for (std::size_t i = 0; i < columns.size(); ++i) {
+    insertion.Bind(static_cast<int>(i + 1), *values_[columns[i]]);
+  }
+  insertion.Step();
+  const std::int64_t key = connection_.LastInsertedKey();
+  transaction.Commit();
+  return key;
+}
+
+bool PendingRow::Change(std::int64_t key) {
+  const std::vector<std::size_t> columns = ColumnsSet();
+  std::string assignments;
+  for (const std::size_t i : columns) {
+    assignments += (assignments.empty() ? "[" : ", [") + table_.Columns()[i].Name + "] = ?";
+  }
+  if (columns.empty()) {
+    connection_.PrepareRead();
+    SqliteStatement row(connection_, "SELECT 1 FROM [" + table_.Name() + "] WHERE rowid = ?");
+    row.Bind(1, key);
+    return row.Step();
+  }
+  WriteTransaction transaction(connection_);
+  SqliteStatement change(connection_,
+                         "UPDATE [" + table_.Name() + "] SET " + assignments + " WHERE rowid = ?");
+  for (std::size_t i = 0; i < columns.size(); ++i) {
+    change.Bind(static_cast<int>(i + 1), *values_[columns[i]]);
+  }
+  change.Bind(static_cast<int>(columns.size() + 1), key);
+  change.Step();
+  const bool changed = connection_.ChangedRows() != 0;
+  transaction.Commit();
+  return changed;
+}

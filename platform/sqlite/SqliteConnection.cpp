@@ -1,0 +1,171 @@
+#include "platform/sqlite/SqliteConnection.h"
+
+#include <cerrno>
+#include <memory>
+#include <new>
+#include <string_view>
+
+#include <sqlite3.h>
+#include <sys/stat.h>
+
+#include "platform/RuntimeError.h"
+#include "platform/sqlite/JetLike.h"
+#include "platform/sqlite/SqliteError.h"
+
+namespace {
+
+std::string_view TextOf(sqlite3_value* value) {
+  const auto* text = reinterpret_cast<const char*>(sqlite3_value_text(value));
+  return text == nullptr ? std::string_view() : std::string_view(text, sqlite3_value_bytes(value));
+}
+
+void DeletePattern(void* pattern) {
+  delete static_cast<JetPattern*>(pattern);
+}
+
+// "X LIKE Y" comes as like(Y, X).
+void Like(sqlite3_context* context, int, sqlite3_value** arguments) {
+  if (sqlite3_value_type(arguments[0]) == SQLITE_NULL || sqlite3_value_type(arguments[1]) == SQLITE_NULL) {
+    sqlite3_result_null(context);
+    return;
+  }
+  try {
+    // A pattern that is the same for all rows is compiled once.
+    const auto* kept = static_cast<const JetPattern*>(sqlite3_get_auxdata(context, 0));
+    if (kept != nullptr) {
+      sqlite3_result_int(context, kept->Matches(TextOf(arguments[1])));
+      return;
+    }
+    auto pattern = std::make_unique<JetPattern>(TextOf(arguments[0]));
+    sqlite3_result_int(context, pattern->Matches(TextOf(arguments[1])));
+    sqlite3_set_auxdata(context, 0, pattern.release(), DeletePattern);
+  } catch (const RuntimeError& error) {
+    sqlite3_result_error(context, error.what(), -1);
+    sqlite3_result_error_code(context, SqliteInvalidPattern);
+  } catch (const std::bad_alloc&) {
+    sqlite3_result_error_nomem(context);
+  }
+}
+
+// Asks the file system and does not open the file: closing any descriptor of a database file takes away the
+// locks that this process holds on it through other connections.
+void CheckFile(const std::string& path) {
+  constexpr off_t SmallestDatabase = 512;
+  struct stat info {};
+  if (stat(path.c_str(), &info) != 0) {
+    if (errno == ENOENT || errno == ENOTDIR) {
+      throw RuntimeError(3024, "Could not find file '" + path + "'.");
+    }
+    throw RuntimeError(3051, "Cannot open the file '" + path + "'. You may lack the permission for it.");
+  }
+  if (!S_ISREG(info.st_mode)) {
+    throw RuntimeError(3051, "Cannot open the file '" + path + "'. It is no file.");
+  }
+  // An empty file would pass for a database without tables.
+  if (info.st_size < SmallestDatabase) {
+    throw UnrecognizedFormat(path);
+  }
+}
+
+}  // namespace
+
+SqliteConnection::SqliteConnection(const std::string& path, std::chrono::milliseconds busyTimeout)
+    : path_(path) {
+  CheckFile(path);
+  constexpr int Flags =
+      SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOMUTEX | SQLITE_OPEN_PRIVATECACHE | SQLITE_OPEN_EXRESCODE;
+  try {
+    if (sqlite3_open_v2(path.c_str(), &handle_, Flags, nullptr) != SQLITE_OK) {
+      Fail();
+    }
+    Configure(busyTimeout);
+  } catch (...) {
+    sqlite3_close_v2(handle_);
+    throw;
+  }
+}
+
+void SqliteConnection::Configure(std::chrono::milliseconds busyTimeout) {
+  sqlite3_busy_timeout(handle_, static_cast<int>(busyTimeout.count()));
+  if (sqlite3_create_function_v2(handle_, "like", 2, SQLITE_UTF8 | SQLITE_DETERMINISTIC, nullptr, Like,
+                                 nullptr, nullptr, nullptr) != SQLITE_OK) {
+    Fail();
+  }
+  // The first read meets a file that is no database, is cut short or has a damaged schema.
+  Execute("SELECT count(*) FROM sqlite_master");
+  // EXTRA also makes the removal of the journal durable; without it a power failure just after a commit could
+  // bring the journal, and with it the old rows, back.
+  Execute("PRAGMA synchronous = EXTRA");
+}
+
+SqliteConnection::~SqliteConnection() {
+  sqlite3_close_v2(handle_);
+}
+
+SqliteStatement SqliteConnection::PrepareSearch(const std::string& table, const std::string& condition,
+                                                int syntaxError) {
+  // The line break ends a comment in the condition, which would otherwise hide the closing bracket.
+  const std::string sql = "SELECT rowid FROM [" + table + "] WHERE (" + condition + "\n) ORDER BY rowid";
+  sqlite3_stmt* prepared = nullptr;
+  const char* tail = nullptr;
+  const int result =
+      sqlite3_prepare_v2(handle_, sql.c_str(), static_cast<int>(sql.size() + 1), &prepared, &tail);
+  SqliteStatement statement(*this, prepared);
+  if (result != SQLITE_OK && (result & 0xFF) != SQLITE_ERROR) {
+    Fail();
+  }
+  // What follows a semicolon would be a second statement, and nobody gives values for parameters.
+  const bool whole = result == SQLITE_OK && tail == sql.c_str() + sql.size();
+  if (!whole || sqlite3_bind_parameter_count(prepared) != 0) {
+    Rollback();
+    throw RuntimeError(syntaxError, "Syntax error in query expression '" + condition + "'.");
+  }
+  return statement;
+}
+
+void SqliteConnection::EndRead() noexcept {
+  if (--readers_ == 0) {
+    Rollback();
+  }
+}
+
+void SqliteConnection::PrepareRead() {
+  if (readers_ > 0 && sqlite3_get_autocommit(handle_) != 0) {
+    Execute("BEGIN");
+  }
+}
+
+void SqliteConnection::Rollback() noexcept {
+  if (sqlite3_get_autocommit(handle_) == 0) {
+    sqlite3_exec(handle_, "ROLLBACK", nullptr, nullptr, nullptr);
+  }
+}
+
+void SqliteConnection::Execute(const char* sql) {
+  if (sqlite3_exec(handle_, sql, nullptr, nullptr, nullptr) != SQLITE_OK) {
+    Fail();
+  }
+}
+
+std::int64_t SqliteConnection::LastInsertedKey() const {
+  return sqlite3_last_insert_rowid(handle_);
+}
+
+std::int64_t SqliteConnection::ChangedRows() const {
+  return sqlite3_changes64(handle_);
+}
+
+void SqliteConnection::Fail() {
+  const RuntimeError error = SqliteError(handle_, path_);
+  Rollback();
+  throw error;
+}
+
+WriteTransaction::WriteTransaction(SqliteConnection& connection) : connection_(connection) {
+  connection.Rollback();
+  connection.Execute("BEGIN IMMEDIATE");
+}
+
+WriteTransaction::~WriteTransaction() {
+  connection_.Rollback();
+}

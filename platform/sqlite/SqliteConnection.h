@@ -1,0 +1,66 @@
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <string>
+
+#include "platform/sqlite/SqliteStatement.h"
+
+struct sqlite3;
+
+/// One connection to a database file, with Jet's LIKE.
+class SqliteConnection {
+ public:
+  /// Opens an existing file, read-only where it may not be written. Throws as DatabaseEngine::OpenDatabase
+  /// does.
+  SqliteConnection(const std::string& path, std::chrono::milliseconds busyTimeout);
+  ~SqliteConnection();
+  SqliteConnection(const SqliteConnection&) = delete;
+  SqliteConnection& operator=(const SqliteConnection&) = delete;
+
+  sqlite3* Handle() const { return handle_; }
+  const std::string& Path() const { return path_; }
+
+  /// The keys of the rows of `table` that `condition` holds for, in table order. Throws RuntimeError
+  /// `syntaxError` when the condition cannot be read.
+  SqliteStatement PrepareSearch(const std::string& table, const std::string& condition, int syntaxError);
+
+  /// See Database::BeginRead.
+  void BeginRead() { ++readers_; }
+  void EndRead() noexcept;
+
+  /// To be called before each read: inside a group of reads takes the lock where it is not held.
+  void PrepareRead();
+  /// Ends the open transaction, if any: what was written is undone, and a group of reads lets go of its lock
+  /// until its next read.
+  void Rollback() noexcept;
+
+  void Execute(const char* sql);
+  std::int64_t LastInsertedKey() const;
+  std::int64_t ChangedRows() const;
+
+  /// Throws what the last call of SQLite reported; the open transaction is rolled back.
+  [[noreturn]] void Fail();
+
+ private:
+  void Configure(std::chrono::milliseconds busyTimeout);
+
+  std::string path_;
+  sqlite3* handle_ = nullptr;
+  int readers_ = 0;
+};
+
+/// Writes that reach the file together when Commit returns, or not at all.
+class WriteTransaction {
+ public:
+  explicit WriteTransaction(SqliteConnection& connection);
+  ~WriteTransaction();
+  WriteTransaction(const WriteTransaction&) = delete;
+  WriteTransaction& operator=(const WriteTransaction&) = delete;
+
+  /// What was written is durable on return.
+  void Commit() { connection_.Execute("COMMIT"); }
+
+ private:
+  SqliteConnection& connection_;
+};

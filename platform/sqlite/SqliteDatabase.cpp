@@ -1,0 +1,63 @@
+#include "platform/sqlite/SqliteDatabase.h"
+
+#include <strings.h>
+
+#include <string_view>
+
+#include "platform/RuntimeError.h"
+#include "platform/sqlite/SqliteRecordset.h"
+
+namespace {
+
+constexpr std::string_view Blanks = " \t\r\n";
+
+void SkipBlanks(std::string_view& text) {
+  const std::size_t first = text.find_first_not_of(Blanks);
+  text.remove_prefix(first == std::string_view::npos ? text.size() : first);
+}
+
+// Takes the next word, or a name in brackets without these.
+std::string_view TakeWord(std::string_view& text) {
+  SkipBlanks(text);
+  if (text.starts_with('[')) {
+    const std::size_t end = text.find(']');
+    const std::string_view name =
+        end == std::string_view::npos ? std::string_view() : text.substr(1, end - 1);
+    text.remove_prefix(end == std::string_view::npos ? text.size() : end + 1);
+    return name;
+  }
+  const std::string_view word = text.substr(0, text.find_first_of(" \t\r\n([*", 1));
+  text.remove_prefix(word.size());
+  return word;
+}
+
+bool TakeKeyword(std::string_view& text, std::string_view keyword) {
+  std::string_view rest = text;
+  const std::string_view word = TakeWord(rest);
+  if (word.size() != keyword.size() || strncasecmp(word.data(), keyword.data(), word.size()) != 0) {
+    return false;
+  }
+  text = rest;
+  return true;
+}
+
+}  // namespace
+
+std::unique_ptr<Recordset> SqliteDatabase::OpenRecordset(const std::string& source) {
+  std::string_view rest = source;
+  if (!TakeKeyword(rest, "SELECT")) {
+    return std::make_unique<SqliteRecordset>(connection_, source, "");
+  }
+  const bool all = TakeKeyword(rest, "*") && TakeKeyword(rest, "FROM");
+  const std::string table(TakeWord(rest));
+  const bool limited = TakeKeyword(rest, "WHERE");
+  SkipBlanks(rest);
+  if (!all || table.empty() || limited == rest.empty()) {
+    throw RuntimeError(3075, "Syntax error in query '" + source + "'.");
+  }
+  return std::make_unique<SqliteRecordset>(connection_, table, std::string(rest));
+}
+
+std::unique_ptr<Database> SqliteEngine::OpenDatabase(const std::string& path) {
+  return std::make_unique<SqliteDatabase>(path, busyTimeout_);
+}

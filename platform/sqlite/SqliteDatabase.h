@@ -1,0 +1,34 @@
+#pragma once
+
+#include <chrono>
+#include <memory>
+#include <string>
+
+#include "platform/Database.h"
+#include "platform/sqlite/SqliteConnection.h"
+
+/// A database in an SQLite file. Tables need rowids; the keys of a dynaset are these.
+class SqliteDatabase : public Database {
+ public:
+  SqliteDatabase(const std::string& path, std::chrono::milliseconds busyTimeout)
+      : connection_(path, busyTimeout) {}
+
+  std::unique_ptr<Recordset> OpenRecordset(const std::string& source) override;
+  void BeginRead() override { connection_.BeginRead(); }
+  void EndRead() noexcept override { connection_.EndRead(); }
+
+ private:
+  SqliteConnection connection_;
+};
+
+class SqliteEngine : public DatabaseEngine {
+ public:
+  /// `busyTimeout` is how long an operation waits for a file that another program has locked.
+  explicit SqliteEngine(std::chrono::milliseconds busyTimeout = std::chrono::seconds(2))
+      : busyTimeout_(busyTimeout) {}
+
+  std::unique_ptr<Database> OpenDatabase(const std::string& path) override;
+
+ private:
+  std::chrono::milliseconds busyTimeout_;
+};

@@ -1,0 +1,73 @@
+#include "platform/sqlite/SqliteError.h"
+
+#include <cerrno>
+#include <new>
+
+#include <sqlite3.h>
+
+namespace {
+
+// SQLite reports a full disk by number only where the system said ENOSPC; a quota or a limit on the file's
+// size comes as an I/O error.
+bool NoSpaceLeft(int code, int systemError) {
+  return code == SQLITE_FULL ||
+         (code == SQLITE_IOERR && (systemError == ENOSPC || systemError == EDQUOT || systemError == EFBIG));
+}
+
+RuntimeError ConstraintError(int extendedCode, const std::string& message) {
+  switch (extendedCode) {
+    case SQLITE_CONSTRAINT_NOTNULL:
+      return {3314, "You must enter a value in this field (" + message + ")."};
+    case SQLITE_CONSTRAINT_UNIQUE:
+    case SQLITE_CONSTRAINT_PRIMARYKEY:
+    case SQLITE_CONSTRAINT_ROWID:
+      return {3022, "The change would create duplicate values (" + message + ")."};
+    case SQLITE_CONSTRAINT_DATATYPE:
+      return {3421, "Data type conversion error."};
+    default:
+      return {3317, "One or more values are prohibited by the validation rule (" + message + ")."};
+  }
+}
+
+}  // namespace
+
+RuntimeError UnrecognizedFormat(const std::string& path) {
+  return {3343, "Unrecognized database format '" + path + "'."};
+}
+
+RuntimeError SqliteError(sqlite3* database, const std::string& path) {
+  const int extendedCode = sqlite3_extended_errcode(database);
+  const int code = extendedCode & 0xFF;
+  const std::string message = sqlite3_errmsg(database);
+  if (extendedCode == SqliteInvalidPattern) {
+    return {93, message};
+  }
+  if (NoSpaceLeft(code, sqlite3_system_errno(database))) {
+    return {3026, "Not enough space on disk: " + path};
+  }
+  switch (code) {
+    case SQLITE_NOMEM:
+      throw std::bad_alloc();
+    case SQLITE_BUSY:
+    case SQLITE_LOCKED:
+      return {3050, "Could not lock file '" + path + "'."};
+    case SQLITE_READONLY:
+      return {3027, "Cannot update. Database or object is read-only: " + path};
+    case SQLITE_IOERR:
+      return {3043, "Disk error: " + path};
+    case SQLITE_CANTOPEN:
+    case SQLITE_PERM:
+    case SQLITE_AUTH:
+      return {3051, "Cannot open the file '" + path + "'. You may lack the permission for it."};
+    case SQLITE_CORRUPT:
+    case SQLITE_NOTADB:
+      return UnrecognizedFormat(path);
+    case SQLITE_CONSTRAINT:
+      return ConstraintError(extendedCode, message);
+    case SQLITE_MISMATCH:
+    case SQLITE_TOOBIG:
+      return {3421, "Data type conversion error."};
+    default:
+      return {3000, "Database error: " + message + " (" + path + ")"};
+  }
+}

@@ -1,0 +1,344 @@
+#include "platform/sqlite/SqliteRecordset.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "platform/RuntimeError.h"
+
+namespace {
+
+const Value Null;
+
+// Lets a search go before its last row.
+class ResetAtEnd {
+ public:
+  explicit ResetAtEnd(SqliteStatement& statement) : statement_(statement) {}
+  ~ResetAtEnd() { statement_.Reset(); }
+  ResetAtEnd(const ResetAtEnd&) = delete;
+  ResetAtEnd& operator=(const ResetAtEnd&) = delete;
+
+ private:
+  SqliteStatement& statement_;
+};
+
+}  // namespace
+
+SqliteRecordset::SqliteRecordset(SqliteConnection& connection, const std::string& table,
+                                 const std::string& condition)
+    : connection_(connection),
+      table_(connection, table),
+      walks_(table_.Columns().size()),
+      wanted_(table_.Columns().size()),
+      row_(table_.Columns().size()),
+      pending_(connection, table_) {
+  ReadKeys(condition);
+  MoveFirst();
+}
+
+// The keys of a whole table are taken in whatever order is cheapest: an index is a small part of the table,
+// and reading it instead makes a cold start several times faster.
+void SqliteRecordset::ReadKeys(const std::string& condition) {
+  connection_.PrepareRead();
+  SqliteStatement search = condition.empty()
+                               ? SqliteStatement(connection_, "SELECT rowid FROM [" + table_.Name() + "]")
+                               : connection_.PrepareSearch(table_.Name(), condition, 3075);
+  std::vector<std::int64_t> keys;
+  while (search.Step()) {
+    keys.push_back(search.Integer(0));
+  }
+  keys_ = KeySet(std::move(keys));
+}
+
+std::size_t SqliteRecordset::LongColumnAt(std::string_view name) const {
+  const std::size_t column = table_.ColumnAt(name);
+  if (!table_.Columns()[column].IsLong) {
+    throw RuntimeError(3259, "Invalid field data type: " + std::string(name));
+  }
+  return column;
+}
+
+void SqliteRecordset::GoTo(std::size_t position) {
+  place_ = Place::Row;
+  position_ = position;
+  ForgetRow();
+}
+
+void SqliteRecordset::GoToEnd() {
+  place_ = keys_.Size() == 0 ? Place::BothEnds : Place::End;
+  ForgetRow();
+}
+
+void SqliteRecordset::ForgetRow() {
+  rowRead_ = false;
+  longValues_.clear();
+}
+
+void SqliteRecordset::MoveFirst() {
+  pending_.Drop();
+  if (keys_.Size() == 0) {
+    GoToEnd();
+  } else {
+    GoTo(0);
+  }
+}
+
+void SqliteRecordset::MoveNext() {
+  pending_.Drop();
+  if (Eof()) {
+    throw RuntimeError(3021);
+  }
+  const std::size_t next = place_ == Place::Gap ? position_ : position_ + 1;
+  if (next < keys_.Size()) {
+    GoTo(next);
+  } else {
+    GoToEnd();
+  }
+}
+
+void SqliteRecordset::MoveLast() {
+  pending_.Drop();
+  if (keys_.Size() == 0) {
+    GoToEnd();
+  } else {
+    GoTo(keys_.Size() - 1);
+  }
+}
+
+std::optional<std::size_t> SqliteRecordset::FirstPosition(SqliteStatement& search) {
+  connection_.PrepareRead();
+  const ResetAtEnd reset(search);
+  std::optional<std::size_t> first;
+  while (search.Step()) {
+    const std::optional<std::size_t> position = keys_.PositionOf(search.Integer(0));
+    if (position && (!first || *position < *first)) {
+      first = position;
+      // The search yields keys in ascending order.
+      if (keys_.Ascending()) {
+        break;
+      }
+    }
+  }
+  return first;
+}
+
+void SqliteRecordset::FindFirst(const std::string& criterion) {
+  pending_.Drop();
+  // Scoring asks for the same mission once for each player.
+  if (!find_ || criterion != findCriterion_) {
+    connection_.PrepareRead();
+    find_ = connection_.PrepareSearch(table_.Name(), criterion, 3077);
+    findCriterion_ = criterion;
+  }
+  const std::optional<std::size_t> position = FirstPosition(find_);
+  noMatch_ = !position;
+  if (position) {
+    GoTo(*position);
+  } else {
+    connection_.Rollback();
+  }
+}
+
+bool SqliteRecordset::WalkTo(const std::string& column, const Value& value) {
+  pending_.Drop();
+  const std::size_t i = table_.ColumnAt(column);
+  const auto* key = table_.Columns()[i].IsKey ? std::get_if<std::int64_t>(&value) : nullptr;
+  if (key != nullptr ? WalkToKey(*key) : WalkToValue(i, value)) {
+    return true;
+  }
+  GoToEnd();
+  connection_.Rollback();
+  return false;
+}
+
+// The commonest search: finding the row and reading it are one.
+bool SqliteRecordset::WalkToKey(std::int64_t key) {
+  const std::optional<std::size_t> position = keys_.PositionOf(key);
+  if (!position) {
+    return false;
+  }
+  GoTo(*position);
+  return TryReadRow();
+}
+
+bool SqliteRecordset::WalkToValue(std::size_t column, const Value& value) {
+  SqliteStatement& walk = walks_[column];
+  if (!walk) {
+    connection_.PrepareRead();
+    walk = SqliteStatement(connection_, "SELECT rowid FROM [" + table_.Name() + "] WHERE [" +
+                                            table_.Columns()[column].Name +
+                                            "] = ?1 COLLATE BINARY ORDER BY rowid");
+  }
+  walk.Bind(1, value);
+  const std::optional<std::size_t> position = FirstPosition(walk);
+  if (position) {
+    GoTo(*position);
+  }
+  return position.has_value();
+}
+
+std::int64_t SqliteRecordset::CurrentKey() const {
+  if (place_ != Place::Row) {
+    throw RuntimeError(3021);
+  }
+  return keys_.At(position_);
+}
+
+bool SqliteRecordset::TryReadRow() {
+  const std::int64_t key = CurrentKey();
+  if (rowRead_) {
+    return true;
+  }
+  connection_.PrepareRead();
+  if (!read_) {
+    std::string list;
+    for (std::size_t i = 0; i < wanted_.size(); ++i) {
+      list += wanted_[i] ? ", [" + table_.Columns()[i].Name + "]" : "";
+    }
+    read_ = SqliteStatement(connection_,
+                            "SELECT rowid" + list + " FROM [" + table_.Name() + "] WHERE rowid = ?1");
+  }
+  read_.Bind(1, key);
+  const ResetAtEnd reset(read_);
+  if (!read_.Step()) {
+    return false;
+  }
+  int read = 1;
+  for (std::size_t i = 0; i < wanted_.size(); ++i) {
+    if (wanted_[i]) {
+      read_.Read(read++, row_[i]);
+    }
+  }
+  rowRead_ = true;
+  return true;
+}
+
+void SqliteRecordset::ReadRow() {
+  if (!TryReadRow()) {
+    FailDeleted();
+  }
+}
+
+const Value& SqliteRecordset::LongValue(std::size_t column) {
+  const std::int64_t key = CurrentKey();
+  const auto held = longValues_.find(column);
+  if (held != longValues_.end()) {
+    return held->second;
+  }
+  connection_.PrepareRead();
+  SqliteStatement read(connection_, "SELECT [" + table_.Columns()[column].Name + "] FROM [" + table_.Name() +
+                                        "] WHERE rowid = ?1");
+  read.Bind(1, key);
+  if (!read.Step()) {
+    FailDeleted();
+  }
+  Value& value = longValues_[column];
+  read.Read(0, value);
+  return value;
+}
+
+void SqliteRecordset::FailDeleted() {
+  connection_.Rollback();
+  throw RuntimeError(3167);
+}
+
+const Value& SqliteRecordset::Fields(std::string_view column) {
+  const std::size_t i = table_.ColumnAt(column);
+  if (const Value* value = pending_.Find(i)) {
+    return *value;
+  }
+  if (pending_.Mode() == ::EditMode::Add) {
+    return Null;
+  }
+  if (table_.Columns()[i].IsLong) {
+    return LongValue(i);
+  }
+  if (!wanted_[i]) {
+    wanted_[i] = true;
+    read_ = SqliteStatement();
+    rowRead_ = false;
+  }
+  ReadRow();
+  return row_[i];
+}
+
+void SqliteRecordset::AddNew() {
+  pending_.Start(::EditMode::Add);
+}
+
+void SqliteRecordset::Edit() {
+  pending_.Drop();
+  ForgetRow();
+  ReadRow();
+  pending_.Start(::EditMode::InProgress);
+}
+
+void SqliteRecordset::SetField(std::string_view column, Value value) {
+  pending_.Set(table_.ColumnAt(column), std::move(value));
+}
+
+void SqliteRecordset::Update() {
+  switch (pending_.Mode()) {
+    case ::EditMode::None:
+      throw RuntimeError(3020);
+    case ::EditMode::InProgress:
+      ForgetRow();
+      if (!pending_.Change(CurrentKey())) {
+        FailDeleted();
+      }
+      break;
+    case ::EditMode::Add:
+      JoinKey(pending_.Insert());
+      break;
+  }
+  pending_.Drop();
+}
+
+// A key that was already here belonged to a row that someone else deleted meanwhile.
+void SqliteRecordset::JoinKey(std::int64_t key) {
+  if (const std::optional<std::size_t> stale = keys_.PositionOf(key)) {
+    keys_.Erase(*stale);
+    if (place_ == Place::Row && position_ == *stale) {
+      place_ = Place::Gap;
+    } else if (position_ > *stale) {
+      --position_;
+    }
+  }
+  keys_.Append(key);
+}
+
+void SqliteRecordset::CancelUpdate() {
+  if (pending_.Mode() == ::EditMode::None) {
+    throw RuntimeError(3020);
+  }
+  pending_.Drop();
+}
+
+void SqliteRecordset::Delete() {
+  pending_.Drop();
+  const std::int64_t key = CurrentKey();
+  WriteTransaction transaction(connection_);
+  SqliteStatement deletion(connection_, "DELETE FROM [" + table_.Name() + "] WHERE rowid = ?1");
+  deletion.Bind(1, key);
+  deletion.Step();
+  if (connection_.ChangedRows() == 0) {
+    FailDeleted();
+  }
+  transaction.Commit();
+  keys_.Erase(position_);
+  place_ = Place::Gap;
+  ForgetRow();
+}
+
+Blob SqliteRecordset::GetChunk(std::string_view column, std::size_t offset, std::size_t count) {
+  LongColumnAt(column);
+  const auto* bytes = std::get_if<Blob>(&Fields(column));
+  if (bytes == nullptr || offset >= bytes->size()) {
+    return {};
+  }
+  const auto first = bytes->begin() + static_cast<std::ptrdiff_t>(offset);
+  return {first, first + static_cast<std::ptrdiff_t>(std::min(count, bytes->size() - offset))};
+}
+
+void SqliteRecordset::AppendChunk(std::string_view column, const Blob& bytes) {
+  pending_.Append(LongColumnAt(column), bytes);
+}

@@ -1,0 +1,92 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <map>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "platform/Database.h"
+#include "platform/sqlite/KeySet.h"
+#include "platform/sqlite/PendingRow.h"
+#include "platform/sqlite/SqliteConnection.h"
+#include "platform/sqlite/SqliteTable.h"
+
+/// A dynaset over one table. The current row is read at the first Fields after a move, and of it only the
+/// columns that this recordset has ever been asked for, which are few where many rows are looked up. A long
+/// binary column (declared type BLOB) is read whole when the row's is first asked for.
+class SqliteRecordset : public Recordset {
+ public:
+  /// The rows of `table` that `condition` holds for (all when it is empty), in table order. Throws as
+  /// Database::OpenRecordset does.
+  SqliteRecordset(SqliteConnection& connection, const std::string& table, const std::string& condition);
+
+  void MoveFirst() override;
+  void MoveNext() override;
+  void MoveLast() override;
+  bool Eof() const override { return place_ == Place::End || place_ == Place::BothEnds; }
+  bool Bof() const override { return place_ == Place::BothEnds; }
+  void FindFirst(const std::string& criterion) override;
+  bool NoMatch() const override { return noMatch_; }
+  bool WalkTo(const std::string& column, const Value& value) override;
+
+  const Value& Fields(std::string_view column) override;
+  void AddNew() override;
+  void Edit() override;
+  void SetField(std::string_view column, Value value) override;
+  void Update() override;
+  void CancelUpdate() override;
+  ::EditMode EditMode() const override { return pending_.Mode(); }
+  void Delete() override;
+  Blob GetChunk(std::string_view column, std::size_t offset, std::size_t count) override;
+  void AppendChunk(std::string_view column, const Blob& bytes) override;
+
+ private:
+  enum class Place {
+    Row,      ///< on the row at position_
+    Gap,      ///< before the row at position_, where a row was deleted
+    End,      ///< after the last row
+    BothEnds  ///< there were no rows
+  };
+
+  void ReadKeys(const std::string& condition);
+  std::size_t LongColumnAt(std::string_view name) const;
+
+  void GoTo(std::size_t position);
+  void GoToEnd();
+  void ForgetRow();
+  std::optional<std::size_t> FirstPosition(SqliteStatement& search);
+  bool WalkToKey(std::int64_t key);
+  bool WalkToValue(std::size_t column, const Value& value);
+
+  std::int64_t CurrentKey() const;
+  bool TryReadRow();
+  void ReadRow();
+  const Value& LongValue(std::size_t column);
+  [[noreturn]] void FailDeleted();
+
+  void JoinKey(std::int64_t key);
+
+  SqliteConnection& connection_;
+  SqliteTable table_;
+
+  KeySet keys_;
+  Place place_ = Place::BothEnds;
+  std::size_t position_ = 0;
+
+  std::string findCriterion_;
+  SqliteStatement find_;
+  bool noMatch_ = false;
+
+  // By column, as are the other vectors.
+  std::vector<SqliteStatement> walks_;
+  std::vector<bool> wanted_;
+  SqliteStatement read_;
+  std::vector<Value> row_;
+  bool rowRead_ = false;
+  std::map<std::size_t, Value> longValues_;
+
+  PendingRow pending_;
+};

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "sim/BaseUnitFailure.h"
+
+namespace sim {
+
+/// What the command line of the simulated venue asks for.
+struct VenueOptions {
+  int Players = 40;  ///< 0 to 224
+  std::uint32_t Seed = 1;
+  bool Fast = false;
+  BaseUnitFailure Failure = BaseUnitFailure::None;
+  std::size_t FailurePlace = 1;  ///< frame or byte, from 1
+  int Games = 0;                 ///< requests to serve; 0: any number
+  std::optional<std::string> LogFile;
+  std::optional<std::string> FramesFile;
+  std::optional<std::string> Link;
+  bool UntilEof = false;
+  bool Help = false;
+};
+
+/// Reads `arguments` (without the program's name). Throws std::invalid_argument with a text for the user.
+VenueOptions ParseVenueOptions(const std::vector<std::string>& arguments);
+
+/// The text of `--help`.
+std::string VenueUsage();
+
+}  // namespace sim

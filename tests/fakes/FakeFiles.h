@@ -1,0 +1,123 @@
+#pragma once
+
+#include <map>
+#include <set>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "platform/Files.h"
+#include "platform/RuntimeError.h"
+
+/// Files and folders in memory. The root always exists.
+class FakeFiles : public Files {
+ public:
+  struct ReplaceCall {
+    std::string Path;
+    std::string Bytes;
+
+    bool operator==(const ReplaceCall&) const = default;
+  };
+
+  /// All calls of Replace, also those that failed.
+  std::vector<ReplaceCall> Replaced;
+
+  /// All calls of CreateFolder, also those that failed.
+  std::vector<std::string> Created;
+
+  /// Adds a folder and those above it.
+  void AddFolder(const std::string& path) {
+    for (std::string folder = path; !FolderExists(folder); folder = ParentOf(folder)) {
+      folders_.insert(WithoutSeparator(folder));
+    }
+  }
+
+  /// Adds or changes a file, with its folders.
+  void Put(const std::string& path, const std::string& bytes) {
+    AddFolder(ParentOf(path));
+    contents_[path] = bytes;
+  }
+
+  void Remove(const std::string& path) { contents_.erase(path); }
+
+  const std::map<std::string, std::string>& Contents() const { return contents_; }
+
+  /// Every read, replacement or making of `path` fails from now on.
+  void FailRead(const std::string& path, const RuntimeError& error) {
+    readFailures_.insert_or_assign(path, error);
+  }
+  void FailReplace(const std::string& path, const RuntimeError& error) {
+    replaceFailures_.insert_or_assign(path, error);
+  }
+  void FailCreateFolder(const std::string& path, const RuntimeError& error) {
+    createFailures_.insert_or_assign(path, error);
+  }
+
+  bool FileExists(const std::string& path) const override { return contents_.count(path) != 0; }
+
+  bool FolderExists(const std::string& path) const override {
+    const std::string name = WithoutSeparator(path);
+    return name.empty() || folders_.count(name) != 0;
+  }
+
+  void CreateFolder(const std::string& path) override {
+    Created.push_back(path);
+    ThrowIfTold(createFailures_, path);
+    if (!FolderExists(ParentOf(path))) {
+      throw RuntimeError(76);
+    }
+    if (FolderExists(path) || FileExists(WithoutSeparator(path))) {
+      throw RuntimeError(75);
+    }
+    folders_.insert(WithoutSeparator(path));
+  }
+
+  std::string Read(const std::string& path) const override {
+    ThrowIfTold(readFailures_, path);
+    const auto file = contents_.find(path);
+    if (file == contents_.end()) {
+      throw RuntimeError(FolderExists(path) ? 75 : 53);
+    }
+    return file->second;
+  }
+
+  void Replace(const std::string& path, const std::string& bytes) override {
+    Replaced.push_back({path, bytes});
+    ThrowIfTold(replaceFailures_, path);
+    if (!FolderExists(ParentOf(path))) {
+      throw RuntimeError(76, "Path not found: " + path);
+    }
+    if (FolderExists(path)) {
+      throw RuntimeError(75, "Path/File access error: " + path);
+    }
+    contents_[path] = bytes;
+  }
+
+ private:
+  using Failures = std::map<std::string, RuntimeError>;
+
+  static void ThrowIfTold(const Failures& failures, const std::string& path) {
+    if (const auto failure = failures.find(path); failure != failures.end()) {
+      throw failure->second;
+    }
+  }
+
+  static std::string WithoutSeparator(std::string path) {
+    while (!path.empty() && path.back() == '/') {
+      path.pop_back();
+    }
+    return path;
+  }
+
+  static std::string ParentOf(const std::string& path) {
+    const std::string name = WithoutSeparator(path);
+    const auto separator = name.rfind('/');
+    return separator == std::string::npos ? std::string() : name.substr(0, separator);
+  }
+
+  std::map<std::string, std::string> contents_;
+  std::set<std::string> folders_;
+  Failures readFailures_;
+  Failures replaceFailures_;
+  Failures createFailures_;
+};

@@ -1,0 +1,62 @@
+#pragma once
+
+#include <deque>
+#include <functional>
+#include <ostream>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+#include "platform/MessageBoxes.h"
+
+/// Records every box and answers it from a script.
+class FakeMessageBoxes : public MessageBoxes {
+ public:
+  struct Box {
+    std::string Text;
+    std::string Title;
+    BoxIcon Icon = BoxIcon::None;
+    BoxButtons Buttons = BoxButtons::Ok;
+
+    bool operator==(const Box&) const = default;
+    friend std::ostream& operator<<(std::ostream& out, const Box& box) {
+      static constexpr const char* icons[] = {"no icon", "information", "question", "exclamation",
+                                              "critical"};
+      static constexpr const char* buttons[] = {"OK", "OK+Cancel", "Yes+No"};
+      return out << '"' << box.Text << "\" (title \"" << box.Title << "\", " << icons[int(box.Icon)] << ", "
+                 << buttons[int(box.Buttons)] << ')';
+    }
+  };
+
+  /// All boxes so far, in the order in which they opened.
+  std::vector<Box> Boxes;
+
+  /// Answers to the coming questions, first one first. When they run out, the default button (OK, Yes) is
+  /// pressed. A box with nothing but OK takes none of them.
+  std::deque<BoxAnswer> Answers;
+
+  /// Run while a box is open, with the box; may press buttons, open further boxes or add answers.
+  std::function<void(const Box&)> WhileOpen;
+
+  BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,
+                 BoxButtons buttons = BoxButtons::Ok) override {
+    const Box box{text, title, icon, buttons};
+    Boxes.push_back(box);
+    if (const auto whileOpen = WhileOpen) {
+      whileOpen(box);
+    }
+    if (buttons == BoxButtons::Ok) {
+      return BoxAnswer::Ok;
+    }
+    const bool yesNo = buttons == BoxButtons::YesNo;
+    if (Answers.empty()) {
+      return yesNo ? BoxAnswer::Yes : BoxAnswer::Ok;
+    }
+    const BoxAnswer answer = Answers.front();
+    Answers.pop_front();
+    if (yesNo != (answer == BoxAnswer::Yes || answer == BoxAnswer::No)) {
+      throw std::logic_error("The scripted answer is no button of the box \"" + text + "\"");
+    }
+    return answer;
+  }
+};

@@ -1,0 +1,113 @@
+#pragma once
+
+#include <deque>
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "platform/RuntimeError.h"
+#include "platform/SerialPort.h"
+
+/// A serial line whose far end is the test.
+class FakeSerialPort : public SerialPort {
+ public:
+  /// All operations that change something, in order: "Open /dev/x 19200,N,8,1", "Output 170", "ClearInput",
+  /// "Close"; a failed one ends with " failed 8002".
+  std::vector<std::string> Log;
+
+  /// All bytes put on the line.
+  std::vector<std::uint8_t> Sent;
+
+  /// Of the last successful open.
+  std::string Device;
+  std::string Settings;
+
+  /// Run with each byte put on the line, so that a test can answer.
+  std::function<void(std::uint8_t)> OnOutput;
+
+  /// Bytes arrive. As on a real line, those that came before the open are lost.
+  void Receive(const std::vector<std::uint8_t>& bytes) {
+    input_.insert(input_.end(), bytes.begin(), bytes.end());
+  }
+
+  /// The next open fails with this number.
+  void FailNextOpen(int number) { openFailure_ = number; }
+
+  /// Every output fails with this number, until 0 is given.
+  void FailOutput(int number) { outputFailure_ = number; }
+
+  /// The line is unplugged; bytes that came before stay readable. The object stays open until Close().
+  void Lose() { lost_ = true; }
+
+  void Open(const std::string& device, const std::string& settings) override {
+    const std::string entry = "Open " + device + ' ' + settings;
+    const int failure = open_ ? 8005 : openFailure_;
+    openFailure_ = 0;
+    FailIf(failure, entry);
+    Log.push_back(entry);
+    Device = device;
+    Settings = settings;
+    open_ = true;
+    lost_ = false;
+    input_.clear();
+  }
+
+  void Close() override {
+    if (open_) {
+      Log.push_back("Close");
+    }
+    open_ = false;
+    input_.clear();
+  }
+
+  bool PortOpen() const override { return open_; }
+
+  std::size_t InBufferCount() override {
+    if (!open_) {
+      throw RuntimeError(8018);
+    }
+    if (lost_ && input_.empty()) {
+      throw RuntimeError(8012);
+    }
+    return input_.size();
+  }
+
+  std::uint8_t Input() override {
+    if (InBufferCount() == 0) {
+      throw RuntimeError(62);
+    }
+    const std::uint8_t byte = input_.front();
+    input_.pop_front();
+    return byte;
+  }
+
+  void Output(std::uint8_t byte) override {
+    const std::string entry = "Output " + std::to_string(byte);
+    FailIf(!open_ ? 8018 : lost_ ? 8012 : outputFailure_, entry);
+    Log.push_back(entry);
+    Sent.push_back(byte);
+    if (const auto onOutput = OnOutput) {
+      onOutput(byte);
+    }
+  }
+
+  void ClearInput() override {
+    FailIf(open_ ? 0 : 8018, "ClearInput");
+    Log.push_back("ClearInput");
+    input_.clear();
+  }
+
+ private:
+  void FailIf(int number, const std::string& entry) {
+    if (number != 0) {
+      Log.push_back(entry + " failed " + std::to_string(number));
+      throw RuntimeError(number);
+    }
+  }
+
+  bool open_ = false;
+  bool lost_ = false;
+  int openFailure_ = 0;
+  int outputFailure_ = 0;
+  std::deque<std::uint8_t> input_;
+};

@@ -1,0 +1,14 @@
+#pragma once
+
+#include "platform/RuntimeError.h"
+
+/// Number of the RuntimeError that `command` throws, 0 when it throws none.
+template <typename Command>
+int FailureOf(Command&& command) {
+  try {
+    command();
+  } catch (const RuntimeError& error) {
+    return error.Number();
+  }
+  return 0;
+}

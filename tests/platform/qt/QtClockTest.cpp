@@ -1,0 +1,54 @@
+#include "platform/qt/QtClock.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+const QDate date(2013, 5, 9);
+const QTime afternoon(14, 30, 5);
+
+TEST(ShortDateText, IsTheLocalesFormWithAllDigitsOfTheYear) {
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::UnitedStates), date), "5/9/2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::German, QLocale::Germany), date), "09.05.2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::Australia), date), "9/5/2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::Chinese, QLocale::China), date), "2013/5/9");
+  EXPECT_EQ(ShortDateText(QLocale::c(), date), "9 May 2013");
+}
+
+TEST(ShortDateText, ShowsTheYearInEveryLocaleWithWesternDigits) {
+  int checked = 0;
+  for (const QLocale& locale :
+       QLocale::matchingLocales(QLocale::AnyLanguage, QLocale::AnyScript, QLocale::AnyTerritory)) {
+    if (locale.zeroDigit() == QStringLiteral("0")) {
+      const std::string text = ShortDateText(locale, date);
+      EXPECT_NE(text.find("2013"), std::string::npos) << locale.name().toStdString() << ": " << text;
+      EXPECT_EQ(text.find("20132013"), std::string::npos) << locale.name().toStdString() << ": " << text;
+      ++checked;
+    }
+  }
+  EXPECT_GT(checked, 100);
+}
+
+TEST(ShortTimeText, IsTheLocalesForm) {
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::English, QLocale::UnitedStates), afternoon), "2:30 PM");
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::German, QLocale::Germany), afternoon), "14:30");
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::Chinese, QLocale::China), afternoon), "14:30");
+  EXPECT_EQ(ShortTimeText(QLocale::c(), afternoon), "14:30:05");
+}
+
+TEST(QtClock, TellsThePresentLocalTimeInTheSystemsForm) {
+  const QtClock clock;
+  std::string before;
+  std::string told;
+  std::string after;
+  do {
+    before = ShortDateText(QLocale::system(), QDate::currentDate()) + ' ' +
+             ShortTimeText(QLocale::system(), QTime::currentTime());
+    told = clock.ShortDate() + ' ' + clock.ShortTime();
+    after = ShortDateText(QLocale::system(), QDate::currentDate()) + ' ' +
+            ShortTimeText(QLocale::system(), QTime::currentTime());
+  } while (before != after);
+  EXPECT_EQ(told, before);
+}
+
+}  // namespace

@@ -1,0 +1,175 @@
+#include "platform/qt/QtFileDialog.h"
+
+#include <gtest/gtest.h>
+
+#include <QDialogButtonBox>
+#include <QDir>
+#include <QFile>
+#include <QFileDialog>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QTemporaryDir>
+#include <QTest>
+
+#include "WhileModal.h"
+
+namespace {
+
+constexpr const char* gameFilter = "XML Files & (*.xml) |*.xml";
+
+TEST(NameFilters, AreMadeOfDescriptionAndPatterns) {
+  const auto filters = [](const char* text) {
+    return NameFilters(text).join(QLatin1Char('|')).toStdString();
+  };
+  EXPECT_EQ(filters(gameFilter), "XML Files & (*.xml)");
+  EXPECT_EQ(filters("Text documents (*.txt) |*.txt"), "Text documents (*.txt)");
+  EXPECT_EQ(filters("Playlist Files|*.txt|All Files|*.*"), "Playlist Files (*.txt)|All Files (*)");
+  EXPECT_EQ(filters("Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif"), "Photo Files (*.bmp *.jpg *.gif)");
+  EXPECT_EQ(filters("Wave Files|*.wav;|PCM Files|*.pcm;"), "Wave Files (*.wav)|PCM Files (*.pcm)");
+  EXPECT_EQ(filters("A Files (*.A;*.B)|*.A;*.B| All Files (*.*)|*.*"), "A Files (*.A *.B)|All Files (*)");
+  EXPECT_EQ(filters(""), "");
+}
+
+class QtFileDialogTest : public testing::Test {
+ protected:
+  using Act = std::function<void(QFileDialog&)>;
+
+  std::string Open(const std::string& fileName, const Act& act, const std::string& filter = gameFilter) {
+    const WhileModal<QFileDialog> operatorAtWork(act);
+    const std::string result = Dialog.ShowOpen(filter, fileName);
+    EXPECT_EQ(operatorAtWork.Runs(), 1);
+    return result;
+  }
+
+  std::string Save(const std::string& fileName, const Act& act, const std::string& filter = gameFilter) {
+    const WhileModal<QFileDialog> operatorAtWork(act);
+    const std::string result = Dialog.ShowSave(filter, fileName);
+    EXPECT_EQ(operatorAtWork.Runs(), 1);
+    return result;
+  }
+
+  std::string Path(const std::string& name) const {
+    return folder_.filePath(QString::fromStdString(name)).toStdString();
+  }
+
+  void MakeFile(const std::string& name) const {
+    QFile file(QString::fromStdString(Path(name)));
+    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+  }
+
+  static QLineEdit& Entry(QFileDialog& dialog) {
+    return *dialog.findChild<QLineEdit*>(QStringLiteral("fileNameEdit"));
+  }
+
+  static void Press(QFileDialog& dialog, QDialogButtonBox::StandardButton button) {
+    QTest::mouseClick(dialog.findChild<QDialogButtonBox*>()->button(button), Qt::LeftButton);
+  }
+
+  static Act Enter(const std::string& name, QDialogButtonBox::StandardButton button) {
+    return [name, button](QFileDialog& dialog) {
+      Entry(dialog).setText(QString::fromStdString(name));
+      Press(dialog, button);
+    };
+  }
+
+  QtFileDialog Dialog;
+
+ private:
+  QTemporaryDir folder_;
+};
+
+TEST_F(QtFileDialogTest, OpensTheFileChosen) {
+  MakeFile("得分 一.xml");
+  EXPECT_EQ(Open("",
+                 [&](QFileDialog& dialog) {
+                   EXPECT_EQ(dialog.objectName(), QStringLiteral("CommonDialog1"));
+                   EXPECT_EQ(dialog.acceptMode(), QFileDialog::AcceptOpen);
+                   EXPECT_EQ(dialog.fileMode(), QFileDialog::ExistingFile);
+                   EXPECT_EQ(dialog.nameFilters(), QStringList{QStringLiteral("XML Files & (*.xml)")});
+                   Enter(Path("得分 一.xml"), QDialogButtonBox::Open)(dialog);
+                 }),
+            Path("得分 一.xml"));
+}
+
+TEST_F(QtFileDialogTest, SavesUnderTheNameEntered) {
+  EXPECT_EQ(Save("",
+                 [&](QFileDialog& dialog) {
+                   EXPECT_EQ(dialog.objectName(), QStringLiteral("CommonDialog1"));
+                   EXPECT_EQ(dialog.acceptMode(), QFileDialog::AcceptSave);
+                   EXPECT_EQ(dialog.nameFilters(), QStringList{QStringLiteral("XML Files & (*.xml)")});
+                   Enter(Path("星期六.xml"), QDialogButtonBox::Save)(dialog);
+                 }),
+            Path("星期六.xml"));
+}
+
+TEST_F(QtFileDialogTest, SavesOverAnExistingFileWithoutAQuestion) {
+  MakeFile("old.xml");
+  EXPECT_EQ(Save("", Enter(Path("old.xml"), QDialogButtonBox::Save)), Path("old.xml"));
+}
+
+TEST_F(QtFileDialogTest, ANameSavedWithoutASuffixGetsThatOfTheFilter) {
+  EXPECT_EQ(Save("", Enter(Path("game"), QDialogButtonBox::Save)), Path("game.xml"));
+  EXPECT_EQ(Save("", Enter(Path("game.old"), QDialogButtonBox::Save)), Path("game.old"));
+  EXPECT_EQ(Save("", Enter(Path("list"), QDialogButtonBox::Save), "All Files|*.*"), Path("list"));
+}
+
+TEST_F(QtFileDialogTest, TheSuffixFollowsTheFilterThatIsPicked) {
+  const std::string filter = "Wave Files|*.wav;|Raw Files|*.raw;";
+  EXPECT_EQ(Save(
+                "",
+                [&](QFileDialog& dialog) {
+                  dialog.selectNameFilter(QStringLiteral("Raw Files (*.raw)"));
+                  emit dialog.filterSelected(QStringLiteral("Raw Files (*.raw)"));
+                  Enter(Path("shot"), QDialogButtonBox::Save)(dialog);
+                },
+                filter),
+            Path("shot.raw"));
+}
+
+TEST_F(QtFileDialogTest, CancelLeavesTheName) {
+  MakeFile("last.xml");
+  const auto cancel = [](QFileDialog& dialog) { Press(dialog, QDialogButtonBox::Cancel); };
+  const auto escape = [](QFileDialog& dialog) { QTest::keyClick(&dialog, Qt::Key_Escape); };
+  const auto close = [](QFileDialog& dialog) { dialog.close(); };
+  for (const auto& act : std::vector<Act>{cancel, escape, close}) {
+    EXPECT_EQ(Open("", act), "");
+    EXPECT_EQ(Save("", act), "");
+    EXPECT_EQ(Save(Path("last.xml"), act), Path("last.xml"));
+    EXPECT_EQ(Save("bare name", act), "bare name");
+  }
+}
+
+TEST_F(QtFileDialogTest, StartsWithTheNameHandedIn) {
+  MakeFile("last.xml");
+  const auto look = [&](QFileDialog& dialog) {
+    EXPECT_EQ(dialog.directory().filePath(QStringLiteral("last.xml")).toStdString(), Path("last.xml"));
+    EXPECT_EQ(Entry(dialog).text(), QStringLiteral("last.xml"));
+    dialog.reject();
+  };
+  Open(Path("last.xml"), look);
+  Save(Path("last.xml"), look);
+}
+
+TEST_F(QtFileDialogTest, StartsInTheFolderLastChosenFrom) {
+  MakeFile("one.xml");
+  Open("", Enter(Path("one.xml"), QDialogButtonBox::Open));
+  Open("", [&](QFileDialog& dialog) {
+    EXPECT_EQ(dialog.directory().filePath(QStringLiteral("one.xml")).toStdString(), Path("one.xml"));
+    EXPECT_EQ(Entry(dialog).text(), QString());
+    dialog.reject();
+  });
+}
+
+TEST_F(QtFileDialogTest, LeavesTheNameWhenItsWindowIsDestroyed) {
+  auto* window = new QDialog;
+  window->setModal(true);
+  window->show();
+  EXPECT_EQ(Open("name.xml",
+                 [&](QFileDialog& dialog) {
+                   EXPECT_EQ(dialog.parentWidget(), window);
+                   delete window;
+                 }),
+            "name.xml");
+}
+
+}  // namespace

@@ -1,0 +1,96 @@
+#include "sim/VenueOptions.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <stdexcept>
+
+namespace sim {
+namespace {
+
+using testing::HasSubstr;
+
+TEST(VenueOptions, StandForAFaultlessGameOfFortyWhenNoneIsGiven) {
+  const VenueOptions options = ParseVenueOptions({});
+  EXPECT_EQ(options.Players, 40);
+  EXPECT_EQ(options.Seed, 1U);
+  EXPECT_FALSE(options.Fast);
+  EXPECT_EQ(options.Failure, BaseUnitFailure::None);
+  EXPECT_EQ(options.FailurePlace, 1U);
+  EXPECT_EQ(options.Games, 0);
+  EXPECT_EQ(options.LogFile, std::nullopt);
+  EXPECT_EQ(options.FramesFile, std::nullopt);
+  EXPECT_EQ(options.Link, std::nullopt);
+  EXPECT_FALSE(options.UntilEof);
+  EXPECT_FALSE(options.Help);
+}
+
+TEST(VenueOptions, TakeEveryOption) {
+  const VenueOptions options = ParseVenueOptions(
+      {"--players", "224", "--seed", "4294967295", "--fast", "--failure", "wrong-crc", "--at", "7", "--log",
+       "wire.log", "--frames", "f.bin", "--link", "port", "--games", "3", "--until-eof", "--help"});
+  EXPECT_EQ(options.Players, 224);
+  EXPECT_EQ(options.Seed, 4294967295U);
+  EXPECT_TRUE(options.Fast);
+  EXPECT_EQ(options.Failure, BaseUnitFailure::WrongCrc);
+  EXPECT_EQ(options.FailurePlace, 7U);
+  EXPECT_EQ(options.Games, 3);
+  EXPECT_EQ(options.LogFile, "wire.log");
+  EXPECT_EQ(options.FramesFile, "f.bin");
+  EXPECT_EQ(options.Link, "port");
+  EXPECT_TRUE(options.UntilEof);
+  EXPECT_TRUE(options.Help);
+}
+
+TEST(VenueOptions, KnowEveryFailureByItsName) {
+  for (const BaseUnitFailureInfo& info : BaseUnitFailures) {
+    EXPECT_EQ(ParseVenueOptions({"--failure", std::string(info.Name)}).Failure, info.Failure);
+  }
+}
+
+TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
+  const std::vector<std::vector<std::string>> refused{{"--playrs", "4"},
+                                                      {"stray"},
+                                                      {""},
+                                                      {"--players"},
+                                                      {"--players", "225"},
+                                                      {"--players", "-1"},
+                                                      {"--players", ""},
+                                                      {"--players", "4x"},
+                                                      {"--players", " 4"},
+                                                      {"--seed", "4294967296"},
+                                                      {"--seed", "-1"},
+                                                      {"--at", "x"},
+                                                      {"--games", "-1"},
+                                                      {"--failure", "Silence"},
+                                                      {"--failure", ""},
+                                                      {"--log", ""},
+                                                      {"--frames"},
+                                                      {"--link", ""}};
+  for (const std::vector<std::string>& arguments : refused) {
+    EXPECT_THROW(ParseVenueOptions(arguments), std::invalid_argument) << testing::PrintToString(arguments);
+  }
+}
+
+TEST(VenueOptions, SayWhatIsWrong) {
+  try {
+    ParseVenueOptions({"--players", "300"});
+    FAIL();
+  } catch (const std::invalid_argument& failure) {
+    EXPECT_STREQ(failure.what(), "--players wants a number from 0 to 224, not \"300\"");
+  }
+}
+
+TEST(VenueOptions, AreAllToldByTheHelp) {
+  const std::string usage = VenueUsage();
+  for (const char* option : {"--players", "--seed", "--fast", "--failure", "--at", "--log", "--frames",
+                             "--link", "--games", "--until-eof", "--help"}) {
+    EXPECT_THAT(usage, HasSubstr(option));
+  }
+  for (const BaseUnitFailureInfo& info : BaseUnitFailures) {
+    EXPECT_THAT(usage, HasSubstr(std::string(info.Name) + " "));
+  }
+}
+
+}  // namespace
+}  // namespace sim

@@ -1,0 +1,163 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+#include <signal.h>
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+
+#include "sim/BaseUnitAnswer.h"
+#include "sim/GameMaker.h"
+#include "tests/sim/RawHost.h"
+#include "tests/sim/VenueProcess.h"
+
+namespace sim {
+namespace {
+
+namespace fs = std::filesystem;
+using testing::HasSubstr;
+
+class VenueProgram : public testing::Test {
+ protected:
+  VenueProgram() {
+    std::string pattern = (fs::temp_directory_path() / "tessarine-venue-XXXXXX").string();
+    folder_ = ::mkdtemp(pattern.data());
+  }
+  ~VenueProgram() override { fs::remove_all(folder_); }
+
+  std::string File(const std::string& name) const { return (folder_ / name).string(); }
+
+  static std::string Content(const std::string& path) {
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  }
+
+  // Every frame must be as `answer` has it.
+  static void Download(const std::string& device, const BaseUnitAnswer& answer) {
+    RawHost host(device);
+    host.Write({1, 0});
+    EXPECT_EQ(host.Read(1), Bytes{answer.Count});
+    for (const Bytes& frame : answer.Frames) {
+      EXPECT_EQ(host.Read(frame.size()), frame);
+      host.Write({170});
+    }
+  }
+
+  fs::path folder_;
+};
+
+TEST_F(VenueProgram, ServesTheGameOfItsSeedAndExitsAfterItsGames) {
+  const BaseUnitAnswer answer = MakeBaseUnitAnswer(MakeGame(12, 77));
+  VenueProcess venue({"--players", "12", "--seed", "77", "--fast", "--games", "2"});
+  const std::string device = venue.ReadDevice();
+  Download(device, answer);
+  Download(device, answer);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_EQ(venue.RestOfErrors(), "");
+}
+
+TEST_F(VenueProgram, ServesFortyPlayersAtTheSpeedOfTheLineUnlessTold) {
+  VenueProcess venue({});
+  RawHost host(venue.ReadDevice());
+  const auto start = std::chrono::steady_clock::now();
+  host.Write({1, 0});
+  EXPECT_EQ(host.Read(1), Bytes{40});
+  const Bytes frame = MakeBaseUnitAnswer(MakeGame(40, 1)).Frames[0];
+  EXPECT_EQ(host.Read(frame.size()), frame);
+  const double bytes = static_cast<double>(3 + frame.size());
+  EXPECT_GE(std::chrono::steady_clock::now() - start, std::chrono::duration<double>(bytes * 10.0 / 19200.0));
+}
+
+TEST_F(VenueProgram, CopiesFramesAndLogsTheLine) {
+  const BaseUnitAnswer answer = MakeBaseUnitAnswer(MakeGame(3, 1), BaseUnitFailure::WrongCrc, 2);
+  VenueProcess venue({"--players", "3", "--fast", "--games", "1", "--failure", "wrong-crc", "--at", "2",
+                      "--frames", File("frames"), "--log", File("log")});
+  Download(venue.ReadDevice(), answer);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  std::string expected;
+  for (const Bytes& frame : answer.Frames) {
+    expected.append(frame.begin(), frame.end());
+  }
+  EXPECT_EQ(Content(File("frames")), expected);
+  EXPECT_THAT(Content(File("log")), HasSubstr("base-unit <- 01\n"));
+  EXPECT_THAT(Content(File("log")), HasSubstr("base-unit -> 03\n"));
+  EXPECT_THAT(Content(File("log")), HasSubstr("base-unit <- AA accepted\n"));
+}
+
+TEST_F(VenueProgram, LinksTheDeviceUntilItsEnd) {
+  VenueProcess venue({"--fast", "--players", "0", "--link", File("port")});
+  const std::string device = venue.ReadDevice();
+  EXPECT_EQ(fs::read_symlink(File("port")), device);
+  Download(File("port"), MakeBaseUnitAnswer({}));
+  venue.Signal(SIGTERM);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_FALSE(fs::is_symlink(fs::symlink_status(File("port"))));
+}
+
+TEST_F(VenueProgram, ExitsCleanlyOnSignalsEvenInTheMiddleOfAnAnswer) {
+  for (const int signal : {SIGTERM, SIGINT, SIGHUP}) {
+    VenueProcess venue({"--players", "224"});
+    RawHost host(venue.ReadDevice());
+    host.Write({1, 0});
+    EXPECT_EQ(host.Read(2).size(), 2U);
+    venue.Signal(signal);
+    EXPECT_EQ(venue.WaitForExit(), 0) << "signal " << signal;
+  }
+}
+
+TEST_F(VenueProgram, ExitsAtTheEndOfItsInputWhenTold) {
+  VenueProcess venue({"--fast", "--until-eof"});
+  venue.ReadDevice();
+  EXPECT_TRUE(venue.IsRunning());
+  venue.CloseInput();
+  EXPECT_EQ(venue.WaitForExit(), 0);
+}
+
+TEST_F(VenueProgram, DoesNotCareForItsInputUnlessTold) {
+  VenueProcess venue({"--fast", "--players", "2"});
+  venue.CloseInput();
+  Download(venue.ReadDevice(), MakeBaseUnitAnswer(MakeGame(2, 1)));
+  EXPECT_TRUE(venue.IsRunning());
+}
+
+TEST_F(VenueProgram, ExitsWhenItsLineHasBeenPulledOut) {
+  VenueProcess venue({"--fast", "--failure", "hang-up", "--at", "1", "--link", File("port")});
+  RawHost host(venue.ReadDevice());
+  host.Write({1, 0});
+  host.ReadUntilHangUp();
+  EXPECT_TRUE(host.HungUp());
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_FALSE(fs::is_symlink(fs::symlink_status(File("port"))));
+}
+
+TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
+  const std::vector<std::vector<std::string>> refused{
+      {"--players", "225"},
+      {"--failure", "fire"},
+      {"--nonsense"},
+      {"--failure", "wrong-crc", "--at", "41"},
+      {"--failure", "wrong-crc", "--at", "0"},
+      {"--failure", "hang-up", "--players", "0"},
+      {"--failure", "silence", "--players", "0", "--at", "2"}};
+  for (const std::vector<std::string>& arguments : refused) {
+    VenueProcess venue(arguments);
+    EXPECT_EQ(venue.WaitForExit(), 2) << testing::PrintToString(arguments);
+    EXPECT_EQ(venue.RestOfOutput(), "");
+    EXPECT_THAT(venue.RestOfErrors(), testing::StartsWith("tessarine-venue: "));
+  }
+}
+
+TEST_F(VenueProgram, SaysWhenItCannotWriteAFile) {
+  VenueProcess venue({"--log", File("missing/log")});
+  EXPECT_EQ(venue.WaitForExit(), 1);
+  EXPECT_THAT(venue.RestOfErrors(), HasSubstr("missing/log"));
+}
+
+TEST_F(VenueProgram, ExplainsItself) {
+  VenueProcess venue({"--help"});
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_THAT(venue.RestOfOutput(), HasSubstr("--failure NAME"));
+}
+
+}  // namespace
+}  // namespace sim
