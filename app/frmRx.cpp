@@ -50,6 +50,8 @@ void frmRx::SetCaptions() {
   ui_->Label1->setText(Text(strings, 203));
   ui_->Label2->setText(Text(strings, 201));
   ui_->ActiveMissionLabel->setText(Text(strings, 202));
+  ui_->ScoreDisplay->setAccessibleName(ui_->Label1->text());
+  ui_->TeamScores->setAccessibleName(ui_->Label2->text());
   const std::pair<QAction*, int> captions[] = {
       {ui_->mnuFile->menuAction(), 204}, {ui_->mnuLoadScores, 205},  {ui_->mnuSaveScores, 206},
       {ui_->mnuClearScores, 207},        {ui_->mnuPrintScores, 208}, {ui_->mnuAdminData, 209},
@@ -247,12 +249,11 @@ void frmRx::ClearGame() {
 }
 
 void frmRx::GetScoreData() {
-  if (uploadProgress_ == nullptr) {
-    uploadProgress_ = new UploadProgress(services_.Strings, this);
+  {
+    UploadProgress progress(services_.Strings, this);
+    BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time, progress, game_)
+        .GetScores();
   }
-  BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time, *uploadProgress_,
-                   game_)
-      .GetScores();
   CalculateScores();
 }
 

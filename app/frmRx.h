@@ -20,7 +20,6 @@
 namespace Ui {
 class frmRx;
 }
-class UploadProgress;
 
 /// The main window. Owns the game, both score lists and the open databases; every other window is opened from here.
 class frmRx : public QMainWindow {
@@ -81,7 +80,6 @@ class frmRx : public QMainWindow {
   std::unique_ptr<Recordset> rsMembers_;
   std::optional<MemberLookup> members_;
   std::optional<ScoreAnalysis> analysis_;
-  UploadProgress* uploadProgress_ = nullptr;  ///< made at first use, owned as child window
-  int runningCommands_ = 0;                   ///< commands on the stack; a wait in one can start another
-  bool closeRequested_ = false;               ///< close as soon as the last of them has unwound
+  int runningCommands_ = 0;      ///< commands on the stack; a wait in one can start another
+  bool closeRequested_ = false;  ///< close as soon as the last of them has unwound
 };

@@ -17,6 +17,7 @@ constexpr std::size_t extraBytesOfAnOverlongFrame = 1000;
 std::vector<std::vector<std::uint8_t>> EncodeAll(const std::vector<GunScores>& game,
                                                  const FrameExtras& extras) {
   std::vector<std::vector<std::uint8_t>> frames;
+  frames.reserve(game.size());
   for (const GunScores& scores : game) {
     frames.push_back(EncodeScoreFrame(scores, extras));
   }

@@ -178,6 +178,7 @@ std::vector<GunScores> MakeGame(int players, std::uint32_t seed) {
   const std::vector<Gun> guns = DrawGuns(static_cast<std::size_t>(players), dice);
   const int gameMinutes = dice.Between(12, 35);
   std::vector<GunScores> game;
+  game.reserve(guns.size());
   for (const Gun& gun : guns) {
     game.push_back(DrawGun(gun, gameMinutes, dice));
   }

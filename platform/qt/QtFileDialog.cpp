@@ -75,12 +75,14 @@ std::string QtFileDialog::Ask(bool save, const std::string& filter, const std::s
     dialog->selectFile(QFileInfo(name).fileName());
   }
   if (save) {
-    const auto setSuffix = [dialog](const QString& chosen) { dialog->setDefaultSuffix(SuffixOf(chosen)); };
+    const auto setSuffix = [dialog = dialog.data()](const QString& chosen) {
+      dialog->setDefaultSuffix(SuffixOf(chosen));
+    };
     setSuffix(dialog->selectedNameFilter());
     QObject::connect(dialog, &QFileDialog::filterSelected, dialog, setSuffix);
   }
   const bool accepted = dialog->exec() == QDialog::Accepted;
-  const QStringList chosen = accepted && dialog ? dialog->selectedFiles() : QStringList();
+  const QStringList chosen = accepted ? dialog->selectedFiles() : QStringList();
   delete dialog;
   if (chosen.isEmpty()) {
     return fileName;

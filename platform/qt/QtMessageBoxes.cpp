@@ -27,17 +27,14 @@ void SetButtons(QMessageBox& box, BoxButtons buttons) {
     case BoxButtons::Ok:
       box.setStandardButtons(QMessageBox::Ok);
       box.setDefaultButton(QMessageBox::Ok);
-      box.setEscapeButton(QMessageBox::Ok);
       break;
     case BoxButtons::OkCancel:
       box.setStandardButtons(QMessageBox::Ok | QMessageBox::Cancel);
       box.setDefaultButton(QMessageBox::Ok);
-      box.setEscapeButton(QMessageBox::Cancel);
       break;
     case BoxButtons::YesNo:
       box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
       box.setDefaultButton(QMessageBox::Yes);
-      box.setEscapeButton(QMessageBox::No);
       break;
   }
 }

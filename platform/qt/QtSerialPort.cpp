@@ -99,7 +99,6 @@ void QtSerialPort::Close() {
     port_.close();
   }
   lost_ = false;
-  input_.clear();
 }
 
 std::size_t QtSerialPort::InBufferCount() {

@@ -11,7 +11,7 @@
 /// open until Close(): received bytes stay readable, then InBufferCount(), Input() and Output() throw
 /// RuntimeError 8012. A line that takes no byte for 3 s is lost too. Open() throws RuntimeError 380 for bad
 /// settings; parity is N, E or O in either case.
-class QtSerialPort : public SerialPort {
+class QtSerialPort final : public SerialPort {
  public:
   QtSerialPort();
   ~QtSerialPort() override;

@@ -93,9 +93,19 @@ void SqliteConnection::Configure(std::chrono::milliseconds busyTimeout) {
   }
   // The first read meets a file that is no database, is cut short or has a damaged schema.
   Execute("SELECT count(*) FROM sqlite_master");
+  CheckWholePages();
   // EXTRA also makes the removal of the journal durable; without it a power failure just after a commit could
   // bring the journal, and with it the old rows, back.
   Execute("PRAGMA synchronous = EXTRA");
+}
+
+// A file that was cut within its last page opens, and would show its fault only once that page is read.
+void SqliteConnection::CheckWholePages() {
+  SqliteStatement pageSize(*this, "PRAGMA page_size");
+  struct stat info {};
+  if (pageSize.Step() && stat(path_.c_str(), &info) == 0 && info.st_size % pageSize.Integer(0) != 0) {
+    throw UnrecognizedFormat(path_);
+  }
 }
 
 SqliteConnection::~SqliteConnection() {

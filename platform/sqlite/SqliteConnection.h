@@ -44,6 +44,7 @@ class SqliteConnection {
 
  private:
   void Configure(std::chrono::milliseconds busyTimeout);
+  void CheckWholePages();
 
   std::string path_;
   sqlite3* handle_ = nullptr;

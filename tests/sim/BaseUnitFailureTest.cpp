@@ -114,90 +114,85 @@ void ExpectLongerStatistics(const Bytes& frame, const Bytes& faultless) {
   EXPECT_EQ(Part(frame, 24 + extra, frame.size() - 1), Part(faultless, 24, faultless.size() - 1));
 }
 
+void ExpectWrongCrc(const std::vector<Bytes>& frames, const std::vector<Bytes>& faultless) {
+  ExpectOthersFaultless(frames, faultless);
+  const std::size_t length = faultless[index].size() - 1;
+  EXPECT_EQ(Part(frames.at(index), 0, length), Part(faultless[index], 0, length));
+  EXPECT_NE(frames.at(index).back(), faultless[index].back());
+}
+
+void ExpectSecondRun(const std::vector<Bytes>& frames, const std::vector<Bytes>& faultless) {
+  ASSERT_EQ(frames.size(), faultless.size() + 1);
+  EXPECT_EQ(frames.at(index), faultless[index]);
+  ExpectOthersFaultless(frames, faultless);
+  EXPECT_EQ(frames.back()[4], faultless[index][4]);
+  EXPECT_NE(Part(frames.back(), 6, 45), Part(faultless[index], 6, 45));
+}
+
+// A line that is pulled out takes bytes with it that the host had not read yet.
+void ExpectHalfAFrameAtMost(const std::vector<Bytes>& frames, const std::vector<Bytes>& faultless) {
+  ASSERT_EQ(frames.size(), faultyFrame);
+  EXPECT_EQ(frames[0], faultless[0]);
+  const Bytes& rest = frames.at(index);
+  EXPECT_LE(rest.size(), faultless[index].size() / 2);
+  EXPECT_TRUE(std::equal(rest.begin(), rest.end(), faultless[index].begin()));
+}
+
 TEST_P(FailureOfTheBaseUnit, ReachesTheHostAsItsNameSays) {
-  switch (GetParam().Failure) {
+  const BaseUnitFailure failure = GetParam().Failure;
+  const Conversation heard = Download(failure == BaseUnitFailure::NoiseBeforeCount ? 4 : 1);
+  switch (failure) {
     case BaseUnitFailure::None:
-    case BaseUnitFailure::TornWrites: {
-      const Conversation heard = Download(1);
+    case BaseUnitFailure::TornWrites:
       EXPECT_EQ(heard.Lead, countOfAll);
       EXPECT_EQ(heard.Frames, faultless_);
       EXPECT_EQ(Replies(), allAccepted);
       break;
-    }
-    case BaseUnitFailure::WrongCrc: {
-      const Conversation heard = Download(1);
-      ExpectOthersFaultless(heard.Frames, faultless_);
-      EXPECT_EQ(Part(heard.Frames[index], 0, faultless_[index].size() - 1),
-                Part(faultless_[index], 0, faultless_[index].size() - 1));
-      EXPECT_NE(heard.Frames[index].back(), faultless_[index].back());
+    case BaseUnitFailure::WrongCrc:
+      ExpectWrongCrc(heard.Frames, faultless_);
       EXPECT_EQ(Replies(), (Bytes{170, 0, 170, 170, 170}));
       break;
-    }
-    case BaseUnitFailure::Silence: {
-      const Conversation heard = Download(1);
-      ASSERT_EQ(heard.Frames.size(), faultyFrame);
-      EXPECT_EQ(heard.Frames[0], faultless_[0]);
-      EXPECT_EQ(heard.Frames[1], Part(faultless_[1], 0, bytesIntoFrame - 1));
+    case BaseUnitFailure::Silence:
+      EXPECT_EQ(heard.Frames,
+                (std::vector<Bytes>{faultless_[0], Part(faultless_[1], 0, bytesIntoFrame - 1)}));
       EXPECT_FALSE(host_.HungUp());
       break;
-    }
-    case BaseUnitFailure::CountZero: {
-      EXPECT_EQ(Download(1).Lead, Bytes{0});
+    case BaseUnitFailure::CountZero:
+      EXPECT_EQ(heard.Lead, Bytes{0});
       EXPECT_TRUE(host_.IsSilent());
       break;
-    }
-    case BaseUnitFailure::NoiseBeforeCount: {
-      const Conversation heard = Download(4);
+    case BaseUnitFailure::NoiseBeforeCount:
       EXPECT_EQ(heard.Lead, (Bytes{0xFE, 0xF0, 0x7F, players}));
       EXPECT_EQ(heard.Frames, faultless_);
       break;
-    }
-    case BaseUnitFailure::LongerStatisticsBlock: {
-      const Conversation heard = Download(1);
+    case BaseUnitFailure::LongerStatisticsBlock:
       ASSERT_EQ(heard.Frames.size(), faultless_.size());
       for (std::size_t i = 0; i < faultless_.size(); ++i) {
         ExpectLongerStatistics(heard.Frames[i], faultless_[i]);
       }
       EXPECT_EQ(Replies(), allAccepted);
       break;
-    }
-    case BaseUnitFailure::LengthAbove1001: {
-      const Conversation heard = Download(1);
+    case BaseUnitFailure::LengthAbove1001:
       ExpectOthersFaultless(heard.Frames, faultless_);
-      EXPECT_GT(heard.Frames[index].size(), 1001U + 1U);
-      EXPECT_EQ(Part(heard.Frames[index], 4, 45), Part(faultless_[index], 4, 45));
+      EXPECT_GT(heard.Frames.at(index).size(), 1001U + 1U);
+      EXPECT_EQ(Part(heard.Frames.at(index), 4, 45), Part(faultless_[index], 4, 45));
       EXPECT_EQ(Replies(), allAccepted);
       break;
-    }
-    case BaseUnitFailure::HighBitWords: {
-      const Conversation heard = Download(1);
+    case BaseUnitFailure::HighBitWords:
       ExpectOthersFaultless(heard.Frames, faultless_);
-      ExpectHighCounters(heard.Frames[index], faultless_[index]);
+      ExpectHighCounters(heard.Frames.at(index), faultless_[index]);
       EXPECT_EQ(Replies(), allAccepted);
       break;
-    }
-    case BaseUnitFailure::SameGunTwice: {
-      const Conversation heard = Download(1);
+    case BaseUnitFailure::SameGunTwice:
       EXPECT_EQ(heard.Lead, Bytes{players + 1});
-      ASSERT_EQ(heard.Frames.size(), faultless_.size() + 1);
-      EXPECT_EQ(Part(heard.Frames[index], 0, faultless_[index].size()), faultless_[index]);
-      ExpectOthersFaultless(heard.Frames, faultless_);
-      EXPECT_EQ(heard.Frames.back()[4], faultless_[index][4]);
-      EXPECT_NE(Part(heard.Frames.back(), 6, 45), Part(faultless_[index], 6, 45));
+      ExpectSecondRun(heard.Frames, faultless_);
       break;
-    }
-    case BaseUnitFailure::HangUp: {
-      const Conversation heard = Download(1);
+    case BaseUnitFailure::HangUp:
       EXPECT_TRUE(host_.HungUp());
-      ASSERT_EQ(heard.Frames.size(), faultyFrame);
-      EXPECT_EQ(heard.Frames[0], faultless_[0]);
-      // A line that is pulled out takes bytes with it that the host had not read yet.
-      const Bytes& rest = heard.Frames[1];
-      EXPECT_LE(rest.size(), faultless_[1].size() / 2);
-      EXPECT_TRUE(std::equal(rest.begin(), rest.end(), faultless_[1].begin()));
-      EXPECT_EQ(unit_.LatestExchange().Frames[1], Part(faultless_[1], 0, faultless_[1].size() / 2));
+      ExpectHalfAFrameAtMost(heard.Frames, faultless_);
+      EXPECT_EQ(unit_.LatestExchange().Frames.at(index),
+                Part(faultless_[index], 0, faultless_[index].size() / 2));
       break;
-    }
   }
 }
 

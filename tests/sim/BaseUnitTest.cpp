@@ -162,6 +162,19 @@ TEST(BaseUnit, SendsNoFasterThanItsBaudRate) {
   EXPECT_GE(Clock::now() - start, std::chrono::duration<double>(bytes * 10.0 / 19200.0));
 }
 
+TEST(BaseUnit, PausesBetweenThePiecesOfATornAnswer) {
+  BaseUnitSettings settings = TwoFrames();
+  settings.Answer.Torn = true;
+  BaseUnit unit(settings);
+  RawHost host(unit.DevicePath());
+  const Clock::time_point start = Clock::now();
+  host.Write(request);
+  EXPECT_EQ(host.Read(1), Bytes{2});
+  EXPECT_EQ(host.Read(blue2.size()), blue2);
+  // At most three bytes between two pauses of 3 ms.
+  EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(blue2.size() / 3 * 3));
+}
+
 TEST(BaseUnit, EndsTheLineAfterTheRequestsItWasToServe) {
   std::promise<void> finished;
   BaseUnitSettings settings = TwoFrames();

@@ -61,6 +61,7 @@ VenueProcess::VenueProcess(const std::vector<std::string>& arguments) {
   std::vector<std::string> words{TESSARINE_VENUE_PROGRAM};
   words.insert(words.end(), arguments.begin(), arguments.end());
   std::vector<char*> argv;
+  argv.reserve(words.size() + 1);
   for (std::string& word : words) {
     argv.push_back(word.data());
   }

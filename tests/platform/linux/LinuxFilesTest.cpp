@@ -15,7 +15,7 @@
 #include "tests/platform/linux/FileSizeLimit.h"
 #include "tests/platform/linux/OrdinaryUser.h"
 #include "tests/platform/linux/TemporaryFolder.h"
-#include "tests/platform/linux/ThrownNumber.h"
+#include "tests/platform/linux/Thrown.h"
 
 namespace {
 

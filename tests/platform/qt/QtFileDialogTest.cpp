@@ -36,14 +36,14 @@ class QtFileDialogTest : public testing::Test {
 
   std::string Open(const std::string& fileName, const Act& act, const std::string& filter = gameFilter) {
     const WhileModal<QFileDialog> operatorAtWork(act);
-    const std::string result = Dialog.ShowOpen(filter, fileName);
+    std::string result = Dialog.ShowOpen(filter, fileName);
     EXPECT_EQ(operatorAtWork.Runs(), 1);
     return result;
   }
 
   std::string Save(const std::string& fileName, const Act& act, const std::string& filter = gameFilter) {
     const WhileModal<QFileDialog> operatorAtWork(act);
-    const std::string result = Dialog.ShowSave(filter, fileName);
+    std::string result = Dialog.ShowSave(filter, fileName);
     EXPECT_EQ(operatorAtWork.Runs(), 1);
     return result;
   }

@@ -8,6 +8,8 @@
 #include <QTemporaryDir>
 #include <QTemporaryFile>
 #include <QTimer>
+#include <cerrno>
+#include <chrono>
 #include <thread>
 
 #include "FailureOf.h"
@@ -31,6 +33,16 @@ class SecondOpener {
   SecondOpener& operator=(const SecondOpener&) = delete;
 
   bool Lock() const { return ::flock(descriptor_, LOCK_EX | LOCK_NB) == 0; }
+  /// True once the line takes nothing more.
+  bool AwaitFull() const {
+    pollfd writable{descriptor_, POLLOUT, 0};
+    const auto limit = std::chrono::steady_clock::now() + 2s;
+    while (::poll(&writable, 1, 0) != 0 && std::chrono::steady_clock::now() < limit) {
+      std::this_thread::yield();
+    }
+    return ::poll(&writable, 1, 0) == 0;
+  }
+
   bool AwaitInput() const {
     pollfd readable{descriptor_, POLLIN, 0};
     return ::poll(&readable, 1, 2000) == 1;
@@ -87,10 +99,14 @@ TEST_F(QtSerialPortTest, SendsEveryByteValueAsItIs) {
 }
 
 TEST_F(QtSerialPortTest, SendsMoreThanTheSystemBuffers) {
-  Open();
   const Bytes all(100000, 85);
+  const SecondOpener probe(Line.Device());
+  Open();
   Bytes received;
-  std::thread farEnd([&] { received = Line.Read(all.size()); });
+  std::thread farEnd([&] {
+    EXPECT_TRUE(probe.AwaitFull());
+    received = Line.Read(all.size());
+  });
   for (const std::uint8_t byte : all) {
     Port.Output(byte);
   }
@@ -183,6 +199,7 @@ TEST_F(QtSerialPortTest, GoesOnReceivingWhenInputIsClearedAfterTheSystemAnnounce
     ++cleared;
     Port.ClearInput();
     early.setEnabled(false);
+    errno = EAGAIN;  // as any call before the read of nothing may leave it
   });
   Line.Write({1, 2, 3});
   ASSERT_TRUE(probe.AwaitInput());
