@@ -164,12 +164,10 @@ void QtSerialPort::OnError(QSerialPort::SerialPortError error) {
   }
   // Input that was announced and then cleared reads as an error, after which the toolkit does not listen
   // until it is read from.
-  port_.clearError();
   TakeReceived();
 }
 
 void QtSerialPort::Lose() {
-  TakeReceived();
   port_.close();
   lost_ = true;
 }

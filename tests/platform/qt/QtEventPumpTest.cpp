@@ -1,8 +1,10 @@
 #include "platform/qt/QtEventPump.h"
 
 #include <gtest/gtest.h>
+#include <unistd.h>
 
 #include <QEventLoop>
+#include <QSocketNotifier>
 #include <string>
 
 #include "FailureOf.h"
@@ -17,6 +19,41 @@ TEST(QtEventPump, AnIdleWaitBurnsNoProcessorTime) {
   const auto start = ProcessorTime();
   EXPECT_EQ(pump.WaitFor([] { return false; }, 1000ms), WaitResult::TimedOut);
   EXPECT_LT(ProcessorTime() - start, 20ms);
+}
+
+TEST(QtEventPump, DoEventsServesPendingEventsOfAllKinds) {
+  QtEventPump pump;
+  int ends[2] = {};
+  ASSERT_EQ(::pipe(ends), 0);
+  ASSERT_EQ(::write(ends[1], "x", 1), 1);
+  std::string served;
+  QSocketNotifier input(ends[0], QSocketNotifier::Read);
+  QObject::connect(&input, &QSocketNotifier::activated, &input, [&] {
+    served += "input ";
+    input.setEnabled(false);
+  });
+  QTimer idle;
+  idle.setSingleShot(true);
+  QObject::connect(&idle, &QTimer::timeout, &idle, [&] { served += "timer "; });
+  idle.start(0);
+  QMetaObject::invokeMethod(
+      &idle, [&] { served += "queued "; }, Qt::QueuedConnection);
+  pump.DoEvents();
+  EXPECT_NE(served.find("input"), std::string::npos) << served;
+  EXPECT_NE(served.find("timer"), std::string::npos) << served;
+  EXPECT_NE(served.find("queued"), std::string::npos) << served;
+  ::close(ends[0]);
+  ::close(ends[1]);
+}
+
+TEST(QtEventPump, DoEventsReturnsThoughEventsKeepMakingNewOnes) {
+  QtEventPump pump;
+  QTimer restless;
+  int ticks = 0;
+  QObject::connect(&restless, &QTimer::timeout, &restless, [&] { ++ticks; });
+  restless.start(0);
+  pump.DoEvents();
+  EXPECT_GT(ticks, 0);
 }
 
 TEST(QtEventPump, ALimitNeverPassesEarly) {

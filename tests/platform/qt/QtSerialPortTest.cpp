@@ -33,14 +33,17 @@ class SecondOpener {
   SecondOpener& operator=(const SecondOpener&) = delete;
 
   bool Lock() const { return ::flock(descriptor_, LOCK_EX | LOCK_NB) == 0; }
-  /// True once the line takes nothing more.
+  /// True once the line has taken nothing more for 100 ms.
   bool AwaitFull() const {
     pollfd writable{descriptor_, POLLOUT, 0};
     const auto limit = std::chrono::steady_clock::now() + 2s;
-    while (::poll(&writable, 1, 0) != 0 && std::chrono::steady_clock::now() < limit) {
+    while (::poll(&writable, 1, 100) != 0) {
+      if (std::chrono::steady_clock::now() > limit) {
+        return false;
+      }
       std::this_thread::yield();
     }
-    return ::poll(&writable, 1, 0) == 0;
+    return true;
   }
 
   bool AwaitInput() const {

@@ -1,0 +1,30 @@
+#include "core/FieldValue.h"
+
+#include <gtest/gtest.h>
+
+#include "tests/platform/linux/Thrown.h"
+
+namespace {
+
+TEST(TextOf, GivesTextsAndPlainNumbers) {
+  EXPECT_EQ(TextOf(std::string("Mole")), "Mole");
+  EXPECT_EQ(TextOf(Value()), "");
+  EXPECT_EQ(TextOf(std::int64_t{-7}), "-7");
+  EXPECT_EQ(TextOf(12.5), "12.5");
+  EXPECT_EQ(TextOf(-0.5), "-.5");
+}
+
+TEST(NumberOf, TakesNumbersTextsAndNull) {
+  EXPECT_EQ(NumberOf(std::int64_t{7}), 7);
+  EXPECT_EQ(NumberOf(-2.5), -2.5);
+  EXPECT_EQ(NumberOf(std::string(" 25 ")), 25);
+  EXPECT_EQ(NumberOf(Value()), 0);
+}
+
+TEST(NumberOf, RefusesOtherTextsAndBytesWith13) {
+  EXPECT_EQ(NumberThrownBy([] { NumberOf(std::string("abc")); }), 13);
+  EXPECT_EQ(NumberThrownBy([] { NumberOf(std::string()); }), 13);
+  EXPECT_EQ(NumberThrownBy([] { NumberOf(Blob{1}); }), 13);
+}
+
+}  // namespace

@@ -1,0 +1,102 @@
+#pragma once
+
+#include <sqlite3.h>
+
+#include <memory>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+#include "core/Game.h"
+#include "core/MemberLookup.h"
+#include "core/MissionList.h"
+#include "core/ScoreAnalysis.h"
+#include "core/ScoreList.h"
+#include "platform/sqlite/SqliteDatabase.h"
+#include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/platform/linux/TemporaryFolder.h"
+
+/// Runs SQL on the file at `path`, which is made when absent.
+inline void ExecuteSql(const std::string& path, const std::string& sql) {
+  sqlite3* handle = nullptr;
+  sqlite3_open(path.c_str(), &handle);
+  char* message = nullptr;
+  sqlite3_exec(handle, sql.c_str(), nullptr, nullptr, &message);
+  const std::string fault = message != nullptr ? message : "";
+  sqlite3_free(message);
+  sqlite3_close(handle);
+  if (!fault.empty()) {
+    throw std::runtime_error(fault);
+  }
+}
+
+/// A game with real databases: no mission and no member until a test adds them and calls Open.
+class ScoredGame {
+ public:
+  explicit ScoredGame(Language language = Language::English) : Strings(language), game(Strings) {
+    ExecuteSql(ScenariosFile(), ReadFile(std::string(TESSARINE_RESOURCES) + "/scenarios_default.sql"));
+    ExecuteSql(ScenariosFile(), "DELETE FROM Table1; DELETE FROM sqlite_sequence");
+    ExecuteSql(MembersFile(), ReadFile(std::string(TESSARINE_RESOURCES) + "/members_default.sql"));
+  }
+
+  std::string ScenariosFile() const { return Folder / "scenarios.mdb"; }
+  std::string MembersFile() const { return Folder / "members.mdb"; }
+
+  /// Opens both tables as start-up does.
+  void Open() {
+    dbScenarios_ = engine_.OpenDatabase(ScenariosFile());
+    RsScenarios = dbScenarios_->OpenRecordset("Table1");
+    dbMembers_ = engine_.OpenDatabase(MembersFile());
+    RsMembers = dbMembers_->OpenRecordset("Members");
+    Missions = std::make_unique<MissionList>(*RsScenarios, Strings, Boxes);
+    Missions->FillMissionList();
+    Members = std::make_unique<MemberLookup>(*RsMembers, Boxes);
+    analysis_ = std::make_unique<ScoreAnalysis>(game, Factors, *Missions, *Members, Strings, Board, Teams);
+  }
+
+  void CalculateScores() {
+    if (!analysis_) {
+      Open();
+    }
+    const ReadScope scope(*dbMembers_);
+    analysis_->CalculateScores();
+  }
+
+  Player& Activate(int index) {
+    game.Players(index).Active = true;
+    return game.Players(index);
+  }
+
+  /// Cells of one column of the board, in shown order.
+  std::vector<std::string> Column(BoardColumn column) const {
+    std::vector<std::string> cells;
+    for (const ScoreList::Row& row : Board.Rows()) {
+      cells.push_back(row.Cells[static_cast<std::size_t>(column)]);
+    }
+    return cells;
+  }
+
+  std::string Cell(std::size_t row, BoardColumn column) const {
+    return Board.Rows().at(row).Cells[static_cast<std::size_t>(column)];
+  }
+
+  TemporaryFolder Folder;
+
+ private:
+  SqliteEngine engine_;
+  std::unique_ptr<Database> dbScenarios_;
+  std::unique_ptr<Database> dbMembers_;
+  std::unique_ptr<ScoreAnalysis> analysis_;
+
+ public:
+  StringTable Strings;
+  FakeMessageBoxes Boxes;
+  Game game;
+  SoldieringFactors Factors;
+  ScoreList Board;
+  ScoreList Teams;
+  std::unique_ptr<Recordset> RsScenarios;
+  std::unique_ptr<Recordset> RsMembers;
+  std::unique_ptr<MissionList> Missions;
+  std::unique_ptr<MemberLookup> Members;
+};
