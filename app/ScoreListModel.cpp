@@ -8,8 +8,13 @@
 
 #include "app/TeamColours.h"
 
-ScoreListModel::ScoreListModel(ScoreList& list, const Game& game, QStringList headers, int teamColumn, QObject* parent)
-    : QAbstractTableModel(parent), list_(list), game_(game), headers_(std::move(headers)), teamColumn_(teamColumn) {
+ScoreListModel::ScoreListModel(ScoreList& list, const Game& game, QStringList headers, int teamColumn,
+                               QObject* parent)
+    : QAbstractTableModel(parent),
+      list_(list),
+      game_(game),
+      headers_(std::move(headers)),
+      teamColumn_(teamColumn) {
   list_.Changed = [this] {
     beginResetModel();
     shownRows_ = static_cast<int>(list_.Rows().size());
@@ -17,9 +22,13 @@ ScoreListModel::ScoreListModel(ScoreList& list, const Game& game, QStringList he
   };
 }
 
-ScoreListModel::~ScoreListModel() { list_.Changed = nullptr; }
+ScoreListModel::~ScoreListModel() {
+  list_.Changed = nullptr;
+}
 
-int ScoreListModel::rowCount(const QModelIndex& parent) const { return parent.isValid() ? 0 : shownRows_; }
+int ScoreListModel::rowCount(const QModelIndex& parent) const {
+  return parent.isValid() ? 0 : shownRows_;
+}
 
 int ScoreListModel::columnCount(const QModelIndex& parent) const {
   return parent.isValid() ? 0 : static_cast<int>(headers_.size());
@@ -33,9 +42,11 @@ QVariant ScoreListModel::data(const QModelIndex& index, int role) const {
   const ScoreList::Row& shown = list_.Rows()[row];
   const int column = index.column();
   switch (role) {
-    case Qt::DisplayRole: return QString::fromStdString(shown.Cells[static_cast<std::size_t>(column)]);
+    case Qt::DisplayRole:
+      return QString::fromStdString(shown.Cells[static_cast<std::size_t>(column)]);
     case Qt::ToolTipRole:
-      return column == teamColumn_ ? QString::fromStdString(shown.Cells[static_cast<std::size_t>(column)]) : QVariant();
+      return column == teamColumn_ ? QString::fromStdString(shown.Cells[static_cast<std::size_t>(column)])
+                                   : QVariant();
     case Qt::TextAlignmentRole:
       return AlignmentOf(column);
     case Qt::DecorationRole: {
@@ -46,7 +57,8 @@ QVariant ScoreListModel::data(const QModelIndex& index, int role) const {
       const int team = TeamOfRow(shown);
       return team > 0 ? QVariant(TeamTint(team, QGuiApplication::palette().base().color())) : QVariant();
     }
-    default: return {};
+    default:
+      return {};
   }
 }
 
@@ -64,7 +76,9 @@ QVariant ScoreListModel::headerData(int section, Qt::Orientation orientation, in
 }
 
 QVariant ScoreListModel::AlignmentOf(int column) const {
-  const auto horizontal = column == 0 ? Qt::AlignHCenter : column == teamColumn_ ? Qt::AlignLeft : Qt::AlignRight;
+  const auto horizontal = column == 0             ? Qt::AlignHCenter
+                          : column == teamColumn_ ? Qt::AlignLeft
+                                                  : Qt::AlignRight;
   return QVariant(Qt::AlignVCenter | horizontal);
 }
 

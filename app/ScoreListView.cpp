@@ -53,7 +53,8 @@ void ScoreListView::SetColumnShares(std::vector<double> shares) {
 }
 
 int ScoreListView::HeightForRows(int rows) const {
-  return horizontalHeader()->sizeHint().height() + rows * verticalHeader()->defaultSectionSize() + 2 * frameWidth();
+  return horizontalHeader()->sizeHint().height() + rows * verticalHeader()->defaultSectionSize() +
+         2 * frameWidth();
 }
 
 void ScoreListView::resizeEvent(QResizeEvent* event) {

@@ -13,8 +13,8 @@ namespace {
 constexpr std::int16_t HighestListedPort = 100;
 }
 
-Settings::Settings(IniReader& ini, const SerialDevices& devices, MessageBoxes& boxes, const StringTable& strings,
-                   QWidget* parent)
+Settings::Settings(IniReader& ini, const SerialDevices& devices, MessageBoxes& boxes,
+                   const StringTable& strings, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::Settings>()), ini_(ini), boxes_(boxes) {
   ui_->setupUi(this);
   setWindowTitle(Text(strings, 160));
@@ -25,7 +25,8 @@ Settings::Settings(IniReader& ini, const SerialDevices& devices, MessageBoxes& b
   ui_->CommPortNumber->selectAll();
   ui_->CommPortNumber->installEventFilter(this);
   ListAvailablePorts(devices);
-  connect(ui_->SaveExit, &QPushButton::clicked, this, [this] { ReportErrors(boxes_, [this] { SaveAndExit(); }); });
+  connect(ui_->SaveExit, &QPushButton::clicked, this,
+          [this] { ReportErrors(boxes_, [this] { SaveAndExit(); }); });
 }
 
 Settings::~Settings() = default;
@@ -46,7 +47,8 @@ bool Settings::eventFilter(QObject* watched, QEvent* event) {
   if (watched == ui_->CommPortNumber && event->type() == QEvent::FocusOut) {
     const auto reason = static_cast<QFocusEvent*>(event)->reason();
     const bool staysInWindow = reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
-    // Save checks by itself, Cancel never does; a box opened in the middle of a focus change would upset both.
+    // Save checks by itself, Cancel never does; a box opened in the middle of a focus change would upset
+    // both.
     const bool leavesForButton = ui_->SaveExit->hasFocus() || ui_->Cancel->hasFocus();
     if (isVisible() && staysInWindow && !leavesForButton) {
       QTimer::singleShot(0, this, [this] { ReportErrors(boxes_, [this] { ValidateCommPortNumber(); }); });

@@ -10,7 +10,8 @@ namespace Ui {
 class SoldieringCalc;
 }
 
-/// Edits the factors of the soldiering score. `SaveExit` stores them in `factors`; nothing is written to the ini file here.
+/// Edits the factors of the soldiering score. `SaveExit` stores them in `factors`; nothing is written to the
+/// ini file here.
 class SoldieringCalc : public QDialog {
   Q_OBJECT
 

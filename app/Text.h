@@ -5,4 +5,6 @@
 #include "core/StringTable.h"
 
 /// Text `number` of the string table for a control.
-inline QString Text(const StringTable& strings, int number) { return QString::fromStdString(strings.Text(number)); }
+inline QString Text(const StringTable& strings, int number) {
+  return QString::fromStdString(strings.Text(number));
+}

@@ -43,7 +43,7 @@ void TransferAnimation::paintEvent(QPaintEvent* /*event*/) {
   painter.drawLine(left, middle, right, middle);
   painter.setPen(Qt::NoPen);
   painter.setBrush(palette().dark());
-  painter.drawRoundedRect(8, middle - 12, 24, 12, 3, 3);         // a gun
+  painter.drawRoundedRect(8, middle - 12, 24, 12, 3, 3);  // a gun
   painter.drawRoundedRect(8, middle - 4, 9, 18, 3, 3);
   painter.drawRoundedRect(width() - 32, middle - 14, 26, 19, 3, 3);  // the desk
   painter.drawRoundedRect(width() - 26, middle + 8, 14, 4, 2, 2);

@@ -25,18 +25,26 @@ void UploadProgress::Close() {
   hide();
 }
 
-void UploadProgress::SetStatusText(const std::string& text) { ui_->StatusText->setText(QString::fromStdString(text)); }
+void UploadProgress::SetStatusText(const std::string& text) {
+  ui_->StatusText->setText(QString::fromStdString(text));
+}
 
-void UploadProgress::SetMaximum(int maximum) { ui_->Progress->setMaximum(maximum); }
+void UploadProgress::SetMaximum(int maximum) {
+  ui_->Progress->setMaximum(maximum);
+}
 
 void UploadProgress::SetProgress(int value) {
   ui_->Progress->setValue(value);
   ui_->UploadIndex->setText(QString::number(value));
 }
 
-void UploadProgress::StartTransferAnim() { ui_->Animation1->Start(); }
+void UploadProgress::StartTransferAnim() {
+  ui_->Animation1->Start();
+}
 
-void UploadProgress::StopTransferAnim() { ui_->Animation1->Stop(); }
+void UploadProgress::StopTransferAnim() {
+  ui_->Animation1->Stop();
+}
 
 void UploadProgress::reject() {
   closedByOperator_ = true;

@@ -53,12 +53,21 @@ void frmRx::SetCaptions() {
   ui_->ScoreDisplay->setAccessibleName(ui_->Label1->text());
   ui_->TeamScores->setAccessibleName(ui_->Label2->text());
   const std::pair<QAction*, int> captions[] = {
-      {ui_->mnuFile->menuAction(), 204}, {ui_->mnuLoadScores, 205},  {ui_->mnuSaveScores, 206},
-      {ui_->mnuClearScores, 207},        {ui_->mnuPrintScores, 208}, {ui_->mnuAdminData, 209},
-      {ui_->mnuExit, 210},               {ui_->mnuMissions->menuAction(), 211},
-      {ui_->mnuMissionResults, 212},     {ui_->mnuSetupMissions, 213},
-      {ui_->mnuSettings->menuAction(), 214}, {ui_->mnuCommPort, 215}, {ui_->mnuSoldieringCalc, 216},
-      {ui_->mnuHelp->menuAction(), 217}, {ui_->mnuAbout, 218},
+      {ui_->mnuFile->menuAction(), 204},
+      {ui_->mnuLoadScores, 205},
+      {ui_->mnuSaveScores, 206},
+      {ui_->mnuClearScores, 207},
+      {ui_->mnuPrintScores, 208},
+      {ui_->mnuAdminData, 209},
+      {ui_->mnuExit, 210},
+      {ui_->mnuMissions->menuAction(), 211},
+      {ui_->mnuMissionResults, 212},
+      {ui_->mnuSetupMissions, 213},
+      {ui_->mnuSettings->menuAction(), 214},
+      {ui_->mnuCommPort, 215},
+      {ui_->mnuSoldieringCalc, 216},
+      {ui_->mnuHelp->menuAction(), 217},
+      {ui_->mnuAbout, 218},
   };
   for (const auto& [action, number] : captions) {
     SetCaption(*action, number);
@@ -108,8 +117,8 @@ void frmRx::SetUpLists() {
   std::vector<double> boardShares(BoardColumnCount, share);
   boardShares[0] -= fromRankToPlayer;
   boardShares[1] += fromRankToPlayer;
-  ui_->ScoreDisplay->setModel(
-      new ScoreListModel(scoreDisplay_, game_, headers({103, 104, 105, 106, 107, 108, 109, 110, 111}), 1, this));
+  ui_->ScoreDisplay->setModel(new ScoreListModel(
+      scoreDisplay_, game_, headers({103, 104, 105, 106, 107, 108, 109, 110, 111}), 1, this));
   ui_->ScoreDisplay->SetColumnShares(boardShares);
   ui_->ScoreDisplay->horizontalHeader()->setSectionsClickable(true);
   ui_->TeamScores->setModel(new ScoreListModel(teamScores_, game_, headers({112, 113, 105}), 1, this));
@@ -140,15 +149,15 @@ void frmRx::ConnectCommands() {
       {ui_->mnuAbout, &frmRx::ShowAbout},
   };
   for (const auto& [action, command] : commands) {
-    connect(action, &QAction::triggered, this, [this, command] { Run([this, command] { (this->*command)(); }); });
+    connect(action, &QAction::triggered, this,
+            [this, command] { Run([this, command] { (this->*command)(); }); });
   }
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
   connect(ui_->ActiveMission, &QComboBox::currentIndexChanged, this,
           [this](int index) { Run([this, index] { SelectMission(index); }); });
-  connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this, [this](int section) {
-    Run([this, section] { SortByHeader(scoreDisplay_, section + 1, game_); });
-  });
+  connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this,
+          [this](int section) { Run([this, section] { SortByHeader(scoreDisplay_, section + 1, game_); }); });
 }
 
 void frmRx::Run(const std::function<void()>& command) {
@@ -251,7 +260,8 @@ void frmRx::ClearGame() {
 void frmRx::GetScoreData() {
   {
     UploadProgress progress(services_.Strings, this);
-    BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time, progress, game_)
+    BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time,
+                     progress, game_)
         .GetScores();
   }
   CalculateScores();
@@ -267,4 +277,6 @@ void frmRx::ShowSoldieringCalc() {
   CalculateScoresWhenPresent();
 }
 
-void frmRx::ShowAbout() { About(this).exec(); }
+void frmRx::ShowAbout() {
+  About(this).exec();
+}

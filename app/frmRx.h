@@ -21,7 +21,8 @@ namespace Ui {
 class frmRx;
 }
 
-/// The main window. Owns the game, both score lists and the open databases; every other window is opened from here.
+/// The main window. Owns the game, both score lists and the open databases; every other window is opened from
+/// here.
 class frmRx : public QMainWindow {
   Q_OBJECT
 
@@ -29,8 +30,8 @@ class frmRx : public QMainWindow {
   explicit frmRx(const Services& services);
   ~frmRx() override;
 
-  /// Finds the user's data, opens the databases and fills the window, in the order that the operator sees. Throws
-  /// RuntimeError when the program cannot go on.
+  /// Finds the user's data, opens the databases and fills the window, in the order that the operator sees.
+  /// Throws RuntimeError when the program cannot go on.
   void FormLoad();
 
  protected:

@@ -107,6 +107,9 @@ void BaseUnitDownload::AcceptFrame() {
 void BaseUnitDownload::RejectFrame() {
   events_.Sleep(ReplyPause);
   SendByte(FrameRejected);
+  if (lineLost_) {
+    return;
+  }
   boxes_.Show("Checksum failed", DefaultBoxTitle, BoxIcon::Critical);
   progress_.SetStatusText("Checksum failed!");
   events_.Sleep(RejectPause);

@@ -31,19 +31,20 @@ class TransferProgress {
   virtual void StartTransferAnim() = 0;
 };
 
-/// One download of a game from the base unit: single-byte commands out, one length-prefixed frame for each gun back.
+/// One download of a game from the base unit: single-byte commands out, one length-prefixed frame for each
+/// gun back.
 ///
-/// Host to unit: 1, 20 ms pause, 0 asks for scores; 170 accepts a frame; 0 rejects it. Unit to host: the number of
-/// frames, then each frame with its check byte, the next after the reply to the last.
+/// Host to unit: 1, 20 ms pause, 0 asks for scores; 170 accepts a frame; 0 rejects it. Unit to host: the
+/// number of frames, then each frame with its check byte, the next after the reply to the last.
 class BaseUnitDownload {
  public:
   static constexpr const char* LineSettings = "19200,N,8,1";
 
-  BaseUnitDownload(SerialPort& port, CommPort& commPort, EventPump& events, MessageBoxes& boxes, const Clock& clock,
-                   TransferProgress& progress, Game& game);
+  BaseUnitDownload(SerialPort& port, CommPort& commPort, EventPump& events, MessageBoxes& boxes,
+                   const Clock& clock, TransferProgress& progress, Game& game);
 
-  /// Runs the download with its boxes and leaves the line closed. Frames that came through are in the game, however it
-  /// ended.
+  /// Runs the download with its boxes and leaves the line closed. Frames that came through are in the game,
+  /// however it ended.
   void GetScores();
 
  private:

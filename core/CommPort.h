@@ -16,8 +16,8 @@ class CommPort {
   CommPort(SerialPort& port, const IniReader& ini, const SerialDevices& devices, MessageBoxes& boxes,
            const StringTable& strings, std::function<void()> showSettings);
 
-  /// Opens the line with `settings` ("19200,N,8,1"). While that fails the operator is asked: OK leads to the settings and another try. Returns
-  /// false once Cancel was pressed.
+  /// Opens the line with `settings` ("19200,N,8,1"). While that fails the operator is asked: OK leads to the
+  /// settings and another try. Returns false once Cancel was pressed.
   bool OpenCommPort(const std::string& settings);
 
   void CloseIfOpen();

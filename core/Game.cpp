@@ -28,5 +28,8 @@ void Game::Clear() {
 
 std::string Game::DisplayName(int index) const {
   const std::uint8_t id = IdFromIndex(index);
-  return TeamNames(TeamFromId(id)) + " " + Str(std::int32_t{PlayerNumberFromId(id)});
+  std::string name = TeamNames(TeamFromId(id));
+  name += ' ';
+  name += Str(std::int32_t{PlayerNumberFromId(id)});
+  return name;
 }

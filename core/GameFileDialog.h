@@ -14,15 +14,15 @@ class GameFileDialog {
   GameFileDialog(FileDialog& dialog, Files& files, MessageBoxes& boxes)
       : dialog_(dialog), files_(files), boxes_(boxes) {}
 
-  /// Asks for a name and saves there, replacing the file. Cancel saves under the name of the last load or save, and does nothing
-  /// when there is none. A failure throws RuntimeError and leaves the old file.
+  /// Asks for a name and saves there, replacing the file. Cancel saves under the name of the last load or
+  /// save, and does nothing when there is none. A failure throws RuntimeError and leaves the old file.
   void SaveGame(const Game& game, const std::string& missionName);
 
   /// Asks for a game to load. False when the operator cancels.
   bool AskForGame();
 
-  /// Reads the chosen file into the cleared `game`. Returns false after a box when it is no game file; otherwise as
-  /// ReadGameFile does.
+  /// Reads the chosen file into the cleared `game`. Returns false after a box when it is no game file;
+  /// otherwise as ReadGameFile does.
   bool LoadGame(Game& game, const std::function<void(const std::string&)>& selectMission);
 
  private:

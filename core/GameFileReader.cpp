@@ -7,32 +7,21 @@
 
 namespace {
 
-/// All text below `node`, comments left out.
-std::string TextBelow(pugi::xml_node node) {
-  struct Collector : pugi::xml_tree_walker {
-    std::string Text;
-    bool for_each(pugi::xml_node& child) override {
-      if (child.type() == pugi::node_pcdata || child.type() == pugi::node_cdata) {
-        Text += child.value();
-      }
-      return true;
-    }
-  } collector;
-  node.traverse(collector);
-  return std::move(collector.Text);
-}
-
-/// Text of the first child element `name`, or `fallback` when there is none.
+/// Text of the first child element `name`, comments left out, or `fallback` when there is none.
 std::string GetChildText(pugi::xml_node node, const char* name, const char* fallback) {
   const pugi::xml_node child = node.child(name);
   if (!child) {
     return fallback;
   }
-  const pugi::xml_node text = child.first_child();
-  if (text && text.type() == pugi::node_pcdata && !text.next_sibling()) {
-    return text.value();
+  std::string text = child.value();
+  for (const pugi::xml_node part : child.children()) {
+    if (part.type() == pugi::node_pcdata || part.type() == pugi::node_cdata) {
+      text += part.value();
+    }
   }
-  return TextBelow(child);
+  // A reference such as "&#xD800;" names no character. Kept as it is, it would make the next saved file no
+  // UTF-8.
+  return IsUtf8(text) ? text : Windows1252ToUtf8(text);
 }
 
 std::int32_t GetNumber(pugi::xml_node node, const char* name) {
@@ -58,7 +47,9 @@ bool IsWellFormed(const pugi::xml_document& document) {
 
 /// Parses in place. The document refers to `bytes` from then on.
 bool Parse(std::string& bytes, pugi::xml_document& document) {
-  constexpr unsigned int options = pugi::parse_default | pugi::parse_ws_pcdata_single | pugi::parse_fragment;
+  // A leaf's text lies in its element: a hit is then 4 nodes instead of 7, of up to 50,176 hits.
+  constexpr unsigned int options =
+      pugi::parse_default | pugi::parse_ws_pcdata_single | pugi::parse_fragment | pugi::parse_embed_pcdata;
   const bool isWide = bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF");
   if (!isWide) {
     if (std::memchr(bytes.data(), '\0', bytes.size()) != nullptr) {

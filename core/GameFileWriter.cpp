@@ -1,91 +1,118 @@
-#include <pugixml.hpp>
+#include <string_view>
 
 #include "core/GameFile.h"
 #include "core/NumberForms.h"
 
 namespace {
 
-constexpr const char* LeafIndent = "    ";
+/// Builds the text of a file whose tree is always the same: leaves indented on lines of their own, containers
+/// without any white space around them.
+class TreeWriter {
+ public:
+  std::string Bytes;
 
-void AddText(pugi::xml_node parent, const char* text) {
-  parent.append_child(pugi::node_pcdata).set_value(text);
-}
+  void Open(std::string_view container) { Append({"<", container, ">"}); }
+  void Close(std::string_view container) { Append({"</", container, ">"}); }
 
-/// Appends a leaf, indented, on a line of its own.
-void AddElement(pugi::xml_node parent, const char* name, const std::string& value) {
-  AddText(parent, LeafIndent);
-  AddText(parent.append_child(name), value.c_str());
-  AddText(parent, "\r\n");
-}
-
-void AddElement(pugi::xml_node parent, const char* name, std::int32_t value) {
-  AddElement(parent, name, Str(value));
-}
-
-void AddElement(pugi::xml_node parent, const char* name, bool value) {
-  AddElement(parent, name, std::string(value ? "1" : "0"));
-}
-
-void AddHeader(pugi::xml_node root, const Game& game, const std::string& missionName) {
-  pugi::xml_node header = root.append_child("GameHeader");
-  AddElement(header, "MissionName", missionName);
-  for (const ObjectiveTeam& objective : game.ObjectiveTeams) {
-    pugi::xml_node team = header.append_child("Team");
-    AddElement(team, "PrimaryObjectiveAchieved", objective.PrimaryAchieved);
-    AddElement(team, "SecondryObjectiveAchieved", objective.SecondaryAchieved);
-    AddElement(team, "Name", objective.Name);
+  void AddElement(std::string_view name, std::string_view value) {
+    Append({"    <", name, ">"});
+    AppendEscaped(value);
+    Append({"</", name, ">\r\n"});
   }
-  AddElement(header, "GameDate", game.GameDate);
+  void AddElement(std::string_view name, std::int32_t value) { AddElement(name, Str(value)); }
+  void AddFlag(std::string_view name, bool value) { AddElement(name, value ? "1" : "0"); }
+
+ private:
+  void Append(std::initializer_list<std::string_view> parts) {
+    for (const std::string_view part : parts) {
+      Bytes += part;
+    }
+  }
+
+  void AppendEscaped(std::string_view text) {
+    constexpr std::string_view reserved = "<>&\r";
+    for (;;) {
+      const std::size_t plain = text.find_first_of(reserved);
+      Bytes += text.substr(0, plain);
+      if (plain == std::string_view::npos) {
+        return;
+      }
+      switch (text[plain]) {
+        case '<':
+          Bytes += "&lt;";
+          break;
+        case '>':
+          Bytes += "&gt;";
+          break;
+        case '&':
+          Bytes += "&amp;";
+          break;
+        default:
+          Bytes += "&#13;";
+          break;  // a reader would make a plain line feed of it
+      }
+      text.remove_prefix(plain + 1);
+    }
+  }
+};
+
+void AddHeader(TreeWriter& tree, const Game& game, const std::string& missionName) {
+  tree.Open("GameHeader");
+  tree.AddElement("MissionName", missionName);
+  for (const ObjectiveTeam& objective : game.ObjectiveTeams) {
+    tree.Open("Team");
+    tree.AddFlag("PrimaryObjectiveAchieved", objective.PrimaryAchieved);
+    tree.AddFlag("SecondryObjectiveAchieved", objective.SecondaryAchieved);
+    tree.AddElement("Name", objective.Name);
+    tree.Close("Team");
+  }
+  tree.AddElement("GameDate", game.GameDate);
+  tree.Close("GameHeader");
 }
 
-void AddHits(pugi::xml_node parent, const Player& player, const OneBased<std::string, PlayerCount>& names) {
-  pugi::xml_node hits = parent.append_child("HitData");
+void AddHits(TreeWriter& tree, const Player& player, const OneBased<std::string, PlayerCount>& names) {
+  tree.Open("HitData");
   for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
     const std::int32_t amount = player.HitByPlayer(shooter);
     if (amount > 0) {
-      pugi::xml_node hit = hits.append_child("HitByPlayer");
-      AddElement(hit, "Index", std::int32_t{shooter});
-      AddElement(hit, "PlayerID", names(shooter));
-      AddElement(hit, "Amount", amount);
+      tree.Open("HitByPlayer");
+      tree.AddElement("Index", std::int32_t{shooter});
+      tree.AddElement("PlayerID", names(shooter));
+      tree.AddElement("Amount", amount);
+      tree.Close("HitByPlayer");
     }
   }
+  tree.Close("HitData");
 }
 
-void AddFields(pugi::xml_node parent, const Player& player) {
-  AddElement(parent, "ShotCount", player.ShotCount);
-  AddElement(parent, "TotalDamage", player.TotalDamage);
-  AddElement(parent, "TotalDamage", player.TotalDamage);
-  AddElement(parent, "Soldiering", player.Soldiering);
-  AddElement(parent, "HealCount", player.HealCount);
-  AddElement(parent, "AmmoAddCount", player.AmmoAddCount);
-  AddElement(parent, "AdminKillCount", player.AdminKillCount);
-  AddElement(parent, "RespawnCount", player.RespawnCount);
-  AddElement(parent, "DeathCount", player.DeathCount);
-  AddElement(parent, "RunCounter", player.RunCounter);
-  AddElement(parent, "Active", player.Active);
-  AddElement(parent, "Committed", player.Committed);
-  AddElement(parent, "RemainingHealth", player.RemainingHealth);
-  AddElement(parent, "RemainingClips", player.RemainingClips);
-  AddElement(parent, "RemainingAmmo", player.RemainingAmmo);
-  AddElement(parent, "SecondaryDamage", player.SecondaryDamage);
-  AddElement(parent, "PrimaryDamage", player.PrimaryDamage);
-  AddElement(parent, "Accuracy", Str(player.Accuracy));
-  AddElement(parent, "Rank", std::int32_t{player.Rank});
-  AddElement(parent, "MemberIndex", player.MemberIndex);
-  AddElement(parent, "DallasID", player.DallasID);
-  AddElement(parent, "ExplosiveDamage", player.ExplosiveDamage);
-  AddElement(parent, "RadiationDamage", player.RadiationDamage);
-  AddElement(parent, "StunCount", player.StunCount);
-  AddElement(parent, "PowerCheatFlag", std::int32_t{player.PowerCheatFlag});
-  AddElement(parent, "BonusPoints", player.BonusPoints);
+void AddFields(TreeWriter& tree, const Player& player) {
+  tree.AddElement("ShotCount", player.ShotCount);
+  tree.AddElement("TotalDamage", player.TotalDamage);
+  tree.AddElement("TotalDamage", player.TotalDamage);
+  tree.AddElement("Soldiering", player.Soldiering);
+  tree.AddElement("HealCount", player.HealCount);
+  tree.AddElement("AmmoAddCount", player.AmmoAddCount);
+  tree.AddElement("AdminKillCount", player.AdminKillCount);
+  tree.AddElement("RespawnCount", player.RespawnCount);
+  tree.AddElement("DeathCount", player.DeathCount);
+  tree.AddElement("RunCounter", player.RunCounter);
+  tree.AddFlag("Active", player.Active);
+  tree.AddFlag("Committed", player.Committed);
+  tree.AddElement("RemainingHealth", player.RemainingHealth);
+  tree.AddElement("RemainingClips", player.RemainingClips);
+  tree.AddElement("RemainingAmmo", player.RemainingAmmo);
+  tree.AddElement("SecondaryDamage", player.SecondaryDamage);
+  tree.AddElement("PrimaryDamage", player.PrimaryDamage);
+  tree.AddElement("Accuracy", Str(player.Accuracy));
+  tree.AddElement("Rank", std::int32_t{player.Rank});
+  tree.AddElement("MemberIndex", player.MemberIndex);
+  tree.AddElement("DallasID", player.DallasID);
+  tree.AddElement("ExplosiveDamage", player.ExplosiveDamage);
+  tree.AddElement("RadiationDamage", player.RadiationDamage);
+  tree.AddElement("StunCount", player.StunCount);
+  tree.AddElement("PowerCheatFlag", std::int32_t{player.PowerCheatFlag});
+  tree.AddElement("BonusPoints", player.BonusPoints);
 }
-
-struct StringWriter : pugi::xml_writer {
-  std::string Bytes;
-  void write(const void* data, std::size_t size) override {
-    Bytes.append(static_cast<const char*>(data), size);
-  }
-};
 
 }  // namespace
 
@@ -94,21 +121,22 @@ std::string WriteGameFile(const Game& game, const std::string& missionName) {
   for (int index = 1; index <= PlayerCount; ++index) {
     names(index) = game.DisplayName(index);
   }
-  pugi::xml_document document;
-  pugi::xml_node root = document.append_child("GameData");
-  AddHeader(root, game, missionName);
-  pugi::xml_node players = root.append_child("PlayerData");
+  TreeWriter tree;
+  tree.Open("GameData");
+  AddHeader(tree, game, missionName);
+  tree.Open("PlayerData");
   for (int index = 1; index <= PlayerCount; ++index) {
     const Player& player = game.Players(index);
     if (player.Active) {
-      pugi::xml_node node = players.append_child("Player");
-      AddElement(node, "Index", std::int32_t{index});
-      AddElement(node, "PlayerID", names(index));
-      AddHits(node, player, names);
-      AddFields(node, player);
+      tree.Open("Player");
+      tree.AddElement("Index", std::int32_t{index});
+      tree.AddElement("PlayerID", names(index));
+      AddHits(tree, player, names);
+      AddFields(tree, player);
+      tree.Close("Player");
     }
   }
-  StringWriter writer;
-  document.save(writer, "", pugi::format_raw | pugi::format_no_declaration, pugi::encoding_utf8);
-  return std::move(writer.Bytes);
+  tree.Close("PlayerData");
+  tree.Close("GameData");
+  return std::move(tree.Bytes);
 }

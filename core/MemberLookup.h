@@ -6,7 +6,8 @@
 #include "platform/Database.h"
 #include "platform/MessageBoxes.h"
 
-/// How the board gets at the members: through one cursor that is opened at start-up and never asked again for new rows.
+/// How the board gets at the members: through one cursor that is opened at start-up and never asked again for
+/// new rows.
 class MemberLookup {
  public:
   MemberLookup(Recordset& rsMembers, MessageBoxes& boxes) : rsMembers_(rsMembers), boxes_(boxes) {}

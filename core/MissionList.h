@@ -8,7 +8,8 @@
 #include "platform/Database.h"
 #include "platform/MessageBoxes.h"
 
-/// The missions to play: "None", "Free For All", then the rows of the mission table; and which of them is active.
+/// The missions to play: "None", "Free For All", then the rows of the mission table; and which of them is
+/// active.
 class MissionList {
  public:
   struct Item {
@@ -33,8 +34,8 @@ class MissionList {
   /// Makes entry `index` (0 to the number of entries - 1, else RuntimeError 9) the active one.
   void Select(int index);
 
-  /// Moves the mission cursor to the active mission's row. False when the active entry is a fixed one, or when the row
-  /// is gone, which is said in a box.
+  /// Moves the mission cursor to the active mission's row. False when the active entry is a fixed one, or
+  /// when the row is gone, which is said in a box.
   bool ActivateCurrentMissionRecord();
 
   Recordset& Row() { return rsScenarios_; }

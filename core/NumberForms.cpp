@@ -125,6 +125,22 @@ void AddOneToLastDigit(std::string& number) {
   number.insert(number.starts_with('-') ? 1 : 0, "1");
 }
 
+/// "-12.34%" for -1234.
+std::string HundredthsAsPercent(long long hundredths) {
+  std::array<char, 24> buffer{};
+  char* digits = buffer.data();
+  const long long size = std::abs(hundredths);
+  if (hundredths < 0) {
+    *digits++ = '-';
+  }
+  char* end = std::to_chars(digits, buffer.data() + buffer.size(), size / 100).ptr;
+  *end++ = '.';
+  *end++ = static_cast<char>('0' + size / 10 % 10);
+  *end++ = static_cast<char>('0' + size % 10);
+  *end++ = '%';
+  return {buffer.data(), end};
+}
+
 template <typename Float>
 std::string NumberForm(Float value) {
   constexpr int MostDigits = std::is_same_v<Float, float> ? 7 : 15;
@@ -171,7 +187,9 @@ Integer ToInteger(std::string_view text) {
 }  // namespace
 
 std::string Str(std::int32_t value) {
-  return (value < 0 ? "" : " ") + std::to_string(value);
+  std::array<char, 12> buffer{' '};
+  char* const first = buffer.data() + (value < 0 ? 0 : 1);
+  return {buffer.data(), std::to_chars(first, buffer.data() + buffer.size(), value).ptr};
 }
 
 std::string Str(float value) {
@@ -191,18 +209,25 @@ double Val(std::string_view text) {
   return std::clamp(value, -LargestReadable, LargestReadable);
 }
 
-bool IsNumeric(std::string_view text) {
+std::optional<double> NumberIn(std::string_view text) {
   const std::string_view number = Trimmed(text);
-  return !number.empty() && LengthOfNumber(number) == number.size();
+  if (number.empty() || LengthOfNumber(number) != number.size()) {
+    return std::nullopt;
+  }
+  return ValueOfNumber(number);
+}
+
+bool IsNumeric(std::string_view text) {
+  return NumberIn(text).has_value();
 }
 
 double ToDouble(std::string_view text) {
-  if (!IsNumeric(text)) {
+  const std::optional<double> value = NumberIn(text);
+  if (!value) {
     throw RuntimeError(13);
   }
-  const double value = ValueOfNumber(Trimmed(text));
-  RequireFinite(value);
-  return value;
+  RequireFinite(*value);
+  return *value;
 }
 
 float ToSingle(std::string_view text) {
@@ -239,6 +264,11 @@ double Round2(double value) {
 }
 
 std::string FormatPercent(double value) {
+  constexpr double mostPercent = 1e9;
+  if (std::abs(value) < mostPercent && static_cast<float>(value) == value) {
+    // Ten thousand times a float is exact in a double, and so is the tie.
+    return HundredthsAsPercent(std::llround(value * 10'000));
+  }
   std::string text = FormatFixed(value, 4);
   const std::size_t point = text.find('.');
   text.erase(point, 1).insert(point + 2, ".");

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -17,6 +18,10 @@ std::string Str(double value);
 /// line breaks count nowhere: "1 2" is 12. Never throws; a value too large for a double becomes the largest
 /// one whose number form can still be read back.
 double Val(std::string_view text);
+
+/// The number that `text` is as a whole (see IsNumeric), an infinity when it is too large; nothing for any
+/// other text.
+std::optional<double> NumberIn(std::string_view text);
 
 /// True for an optional sign, digits with at most one point, and an optional exponent, with any white space
 /// around it.

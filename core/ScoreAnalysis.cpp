@@ -15,32 +15,48 @@ void AddTo(std::int32_t& sum, std::int32_t amount) {
   }
 }
 
-/// Adds own-team hits, weighted, each rounded by itself: half a point twice is nothing.
-class FriendlyFire {
- public:
-  explicit FriendlyFire(double factor)
-      : factor_(factor),
-        isWhole_(std::abs(factor) <= std::numeric_limits<std::int32_t>::max() &&
-                 std::trunc(factor) == factor),
-        wholeFactor_(isWhole_ ? static_cast<std::int64_t>(factor) : 0) {}
+/// Shooters stand in blocks of 32 that belong to one team each.
+constexpr int BlockSize = 32;
+constexpr int BlockCount = PlayerCount / BlockSize;
 
-  void AddTo(std::int32_t& sum, std::int32_t amount) const {
-    if (isWhole_) {  // the usual case: exact in integers, and many times faster
-      const std::int64_t exact = amount * wholeFactor_ + sum;
-      sum = static_cast<std::int32_t>(exact);
-      if (sum != exact) {
-        throw RuntimeError(6);
-      }
-    } else {
-      sum = RoundToInt32(amount * static_cast<long double>(factor_) + sum);
-    }
+using BlockSums = std::array<std::int32_t, BlockSize>;
+
+/// Written so that the compiler adds several shooters at a time: overflows are gathered, and looked at once a
+/// block.
+void AddHits(BlockSums& sums, const std::int32_t* hits) {
+  std::uint32_t overflows = 0;
+  for (int i = 0; i < BlockSize; ++i) {
+    const auto before = static_cast<std::uint32_t>(sums[i]);
+    const auto hit = static_cast<std::uint32_t>(hits[i]);
+    const std::uint32_t after = before + hit;
+    overflows |= (after ^ before) & (after ^ hit);
+    sums[i] = static_cast<std::int32_t>(after);
   }
+  if (overflows >= 0x80000000U) {
+    throw RuntimeError(6);
+  }
+}
 
- private:
-  double factor_;
-  bool isWhole_;
-  std::int64_t wholeFactor_;
-};
+/// Own-team hits are weighted and rounded each by itself: half a point twice is nothing.
+void AddOwnTeamHits(BlockSums& sums, const std::int32_t* hits, double factor) {
+  if (std::abs(factor) <= std::numeric_limits<std::int32_t>::max() && std::trunc(factor) == factor) {
+    // The usual case: exact in integers, and many times faster.
+    const auto wholeFactor = static_cast<std::int64_t>(factor);
+    bool overflow = false;
+    for (int i = 0; i < BlockSize; ++i) {
+      const std::int64_t sum = hits[i] * wholeFactor + sums[i];
+      sums[i] = static_cast<std::int32_t>(sum);
+      overflow |= sums[i] != sum;
+    }
+    if (overflow) {
+      throw RuntimeError(6);
+    }
+    return;
+  }
+  for (int i = 0; i < BlockSize; ++i) {
+    sums[i] = RoundToInt32(hits[i] * static_cast<long double>(factor) + sums[i]);
+  }
+}
 
 }  // namespace
 
@@ -63,43 +79,49 @@ void ScoreAnalysis::CalculateScores() {
 }
 
 void ScoreAnalysis::AddUpDamage() {
-  const FriendlyFire friendlyFire(factors_.FriendlyFire);
   const bool everyoneIsAFoe = missions_.ListIndex() == MissionList::FreeForAll;
-  std::array<std::int32_t, PlayerCount> total{};
-  std::array<std::int32_t, PlayerCount> absolute{};
-  std::array<std::int16_t, PlayerCount> team{};
-  for (int shooter = 0; shooter < PlayerCount; ++shooter) {
-    team[shooter] = TeamFromId(IdFromIndex(shooter + 1));
+  std::array<std::int16_t, BlockCount> teamOfBlock{};
+  for (int block = 0; block < BlockCount; ++block) {
+    teamOfBlock[block] = TeamFromId(IdFromIndex(block * BlockSize + 1));
   }
-  // Each shooter's sums must grow in the order of the victims; the matrix lies in memory victim by victim.
+  std::array<BlockSums, BlockCount> total{};
+  std::array<BlockSums, BlockCount> absolute{};
+  // Each shooter's sums grow in the order of the victims, which is how the matrix lies in memory.
   for (int victim = 0; victim < PlayerCount; ++victim) {
-    const auto hits = game_.Players(victim + 1).HitByPlayer.begin();
-    for (int shooter = 0; shooter < PlayerCount; ++shooter) {
-      const std::int32_t hit = hits[shooter];
-      if (!everyoneIsAFoe && team[shooter] == team[victim]) {
-        friendlyFire.AddTo(total[shooter], hit);
+    const std::int32_t* hits = &*game_.Players(victim + 1).HitByPlayer.begin();
+    const int victimsTeam = teamOfBlock[victim / BlockSize];
+    for (int block = 0; block < BlockCount; ++block, hits += BlockSize) {
+      if (!everyoneIsAFoe && teamOfBlock[block] == victimsTeam) {
+        AddOwnTeamHits(total[block], hits, factors_.FriendlyFire);
       } else {
-        AddTo(total[shooter], hit);
+        AddHits(total[block], hits);
       }
-      AddTo(absolute[shooter], hit);
+      AddHits(absolute[block], hits);
     }
   }
   for (int shooter = 0; shooter < PlayerCount; ++shooter) {
-    game_.Players(shooter + 1).TotalDamage = total[shooter];
-    game_.Players(shooter + 1).AbsoluteDamage = absolute[shooter];
+    Player& player = game_.Players(shooter + 1);
+    player.TotalDamage = total[shooter / BlockSize][shooter % BlockSize];
+    player.AbsoluteDamage = absolute[shooter / BlockSize][shooter % BlockSize];
   }
 }
 
 void ScoreAnalysis::ScorePlayer(int index) {
   Player& player = game_.Players(index);
   const int team = TeamFromId(IdFromIndex(index));
-  std::string playerText = PlayerText(index);
+  ScoreList::Row& row = scoreDisplay_.AddRow();
+  row.Cells[1] = PlayerText(index);
   CalculateAccuracy(player);
   CalculateSoldiering(player);
   AddMissionPoints(player, game_.TeamNames(team));
-  scoreDisplay_.AddRow({Str(std::int32_t{player.Rank}), std::move(playerText), Str(player.Soldiering),
-                        AccuracyText(player), Str(player.TotalDamage), Str(player.ShotCount),
-                        Str(player.HealCount), Str(player.DeathCount), Str(player.AmmoAddCount)});
+  row.Cells[0] = Str(std::int32_t{player.Rank});
+  row.Cells[2] = Str(player.Soldiering);
+  row.Cells[3] = AccuracyText(player);
+  row.Cells[4] = Str(player.TotalDamage);
+  row.Cells[5] = Str(player.ShotCount);
+  row.Cells[6] = Str(player.HealCount);
+  row.Cells[7] = Str(player.DeathCount);
+  row.Cells[8] = Str(player.AmmoAddCount);
   AddTo(game_.TeamTotals(team), player.Soldiering);
 }
 
@@ -183,6 +205,9 @@ std::string ScoreAnalysis::AccuracyText(const Player& player) const {
 
 void ScoreAnalysis::ListTeams() {
   for (int team = 1; team <= TeamCount; ++team) {
-    teamScores_.AddRow({Str(0), game_.TeamNames(team), Str(game_.TeamTotals(team))});
+    ScoreList::Row& row = teamScores_.AddRow();
+    row.Cells[0] = Str(0);
+    row.Cells[1] = game_.TeamNames(team);
+    row.Cells[2] = Str(game_.TeamTotals(team));
   }
 }

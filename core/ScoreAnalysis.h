@@ -11,11 +11,10 @@
 
 /// Columns of the score board; those behind `Player` hold numbers.
 enum class BoardColumn { Rank, Player, Soldiering, Accuracy, Damage, ShotsFired, Wia, Kia, AmmoAdds };
-inline constexpr int BoardColumnCount = 9;
 inline constexpr int TeamColumnCount = 3;
 
-/// Turns the raw counters and the hit matrix into damage, accuracy, soldiering, team totals and ranks, and rebuilds both
-/// lists. Reads only raw figures and inputs, so that running it again changes nothing.
+/// Turns the raw counters and the hit matrix into damage, accuracy, soldiering, team totals and ranks, and
+/// rebuilds both lists. Reads only raw figures and inputs, so that running it again changes nothing.
 class ScoreAnalysis {
  public:
   ScoreAnalysis(Game& game, const SoldieringFactors& factors, MissionList& missions, MemberLookup& members,

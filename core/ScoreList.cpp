@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <limits>
+#include <optional>
 #include <string_view>
 #include <utility>
 
@@ -11,15 +12,12 @@ namespace {
 
 /// What a cell sorts by: its number, or less than any number.
 double SortKey(std::string_view text, bool isRowText) {
-  constexpr double noNumber = -std::numeric_limits<double>::infinity();
-  if (IsNumeric(text)) {
-    return Val(text);
+  std::optional<double> number = NumberIn(text);
+  if (!number && !isRowText && !text.empty()) {
+    text.remove_suffix(1);
+    number = NumberIn(text);
   }
-  if (isRowText || text.empty()) {
-    return noNumber;
-  }
-  text.remove_suffix(1);
-  return IsNumeric(text) ? Val(text) : noNumber;
+  return number.value_or(-std::numeric_limits<double>::infinity());
 }
 
 std::string_view Trimmed(std::string_view text) {
@@ -46,33 +44,39 @@ void StoreRank(std::string_view playerText, std::int16_t rank, Game& game) {
 
 void ScoreList::Clear() {
   rows_.clear();
+  rows_.reserve(PlayerCount);
   NotifyChanged();
 }
 
-void ScoreList::AddRow(std::vector<std::string> cells) {
-  rows_.push_back({std::move(cells), static_cast<int>(rows_.size())});
+ScoreList::Row& ScoreList::AddRow() {
+  Row& row = rows_.emplace_back();
+  row.Added = static_cast<int>(rows_.size());
+  return row;
 }
 
 void ScoreList::Sort(int column) {
   struct Entry {
     double Key;
-    Row Contents;
+    Row* Contents;
   };
   std::vector<Entry> entries;
   entries.reserve(rows_.size());
   for (Row& row : rows_) {
-    const double key = SortKey(row.Cells[static_cast<std::size_t>(column)], column == 0);
-    entries.push_back({key, std::move(row)});
+    entries.push_back({SortKey(row.Cells[static_cast<std::size_t>(column)], column == 0), &row});
   }
   const bool ascending = SortOrder == ::SortOrder::Ascending;
   std::sort(entries.begin(), entries.end(), [ascending](const Entry& left, const Entry& right) {
     if (left.Key == right.Key) {
-      return left.Contents.Added < right.Contents.Added;
+      return left.Contents->Added < right.Contents->Added;
     }
     return (left.Key < right.Key) == ascending;
   });
-  std::transform(entries.begin(), entries.end(), rows_.begin(),
-                 [](Entry& entry) { return std::move(entry.Contents); });
+  std::vector<Row> sorted;
+  sorted.reserve(rows_.size());
+  for (const Entry& entry : entries) {
+    sorted.push_back(std::move(*entry.Contents));
+  }
+  rows_ = std::move(sorted);
 }
 
 void ScoreList::NotifyChanged() const {

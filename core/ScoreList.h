@@ -1,19 +1,24 @@
 #pragma once
 
+#include <array>
 #include <functional>
 #include <string>
 #include <vector>
 
 #include "core/Game.h"
 
+inline constexpr int BoardColumnCount = 9;
+
 enum class SortOrder { Ascending, Descending };
 
-/// The contents of a score list as the operator sees it: rows of texts, the first being the row text, in shown order.
+/// The contents of a score list as the operator sees it: rows of texts, the first being the row text, in
+/// shown order.
 class ScoreList {
  public:
   struct Row {
-    std::vector<std::string> Cells;
-    int Added;  ///< place in the order of adding
+    std::array<std::string, BoardColumnCount>
+        Cells;      ///< a list with fewer columns leaves the last ones empty
+    int Added = 0;  ///< place in the order of adding
   };
 
   ::SortOrder SortOrder = ::SortOrder::Descending;
@@ -22,7 +27,8 @@ class ScoreList {
   const std::vector<Row>& Rows() const { return rows_; }
 
   void Clear();
-  void AddRow(std::vector<std::string> cells);
+  /// Adds a row of empty cells. The reference holds until the next change of the list.
+  Row& AddRow();
 
  private:
   friend void SortListNumeric(ScoreList& list, int column, bool assignRanks, Game& game);
@@ -33,13 +39,14 @@ class ScoreList {
   std::vector<Row> rows_;
 };
 
-/// Sorts by the numbers in `column` (0 = row text) in the list's present direction. A cell that is a number with one more
-/// character behind it (a percentage) sorts by that number; any other text sorts below all numbers, and equal
-/// cells keep the order in which their rows were added.
+/// Sorts by the numbers in `column` (0 = row text) in the list's present direction. A cell that is a number
+/// with one more character behind it (a percentage) sorts by that number; any other text sorts below all
+/// numbers, and equal cells keep the order in which their rows were added.
 ///
-/// Column 0 writes each place into the record of the same number, whichever player stands there. For other columns,
-/// `assignRanks` numbers the row texts from 1 and stores the places in the players' records. The record is found from
-/// the team word and number alone, 32 to a team, so the place of a player numbered 32 or above goes into another record.
+/// Column 0 writes each place into the record of the same number, whichever player stands there. For other
+/// columns, `assignRanks` numbers the row texts from 1 and stores the places in the players' records. The
+/// record is found from the team word and number alone, 32 to a team, so the place of a player numbered 32 or
+/// above goes into another record.
 void SortListNumeric(ScoreList& list, int column, bool assignRanks, Game& game);
 
 /// The board's answer to a click on column header `header` (counted from 1).

@@ -4,7 +4,7 @@
 
 /// How the main window answers to the screen at start-up. Sizes are pixels.
 struct ScreenFit {
-  bool Warn = false;      ///< tell that the screen is small
+  bool Warn = false;  ///< tell that the screen is small
   bool Maximised = false;
   std::optional<int> Width;   ///< limit, with the window at the left edge
   std::optional<int> Height;  ///< limit, with the window at the top edge

@@ -44,7 +44,8 @@ QString Aligned(const QAbstractItemModel& list) {
   for (const QStringList& line : lines) {
     for (qsizetype column = 0; column < line.size(); ++column) {
       const bool isName = column == 1;
-      text += isName ? line[column].leftJustified(widths[column]) : line[column].rightJustified(widths[column]);
+      text +=
+          isName ? line[column].leftJustified(widths[column]) : line[column].rightJustified(widths[column]);
       text += column + 1 < line.size() ? QStringLiteral("  ") : QStringLiteral("\n");
     }
   }

@@ -5,8 +5,8 @@
 #include <QStringList>
 #include <QTimer>
 
-/// Plays the operator for one game: presses the real button of the real window, waits for the end, saves the game through the menu
-/// and the file dialog, and leaves the board as text and picture.
+/// Plays the operator for one game: presses the real button of the real window, waits for the end, saves the
+/// game through the menu and the file dialog, and leaves the board as text and picture.
 class DemoRun : public QObject {
   Q_OBJECT
 
@@ -21,8 +21,8 @@ class DemoRun : public QObject {
   void SaveGame();
   void WriteBoard();
   void WriteFile(const QString& name, const QString& text);
-  /// Answers whatever is open in front of the main window: the file dialog with `gameFile_`, a box, which is a fault here, with its
-  /// default button.
+  /// Answers whatever is open in front of the main window: the file dialog with `gameFile_`, a box, which is
+  /// a fault here, with its default button.
   void AnswerDialogs();
 
   QMainWindow& window_;

@@ -32,3 +32,13 @@ Build() {
 }
 
 HasDisplay() { [ -n "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ]; }
+
+# MakeData BIN FOLDER: the data of a program that has run before, below FOLDER (for XDG_DATA_HOME).
+MakeData() {
+  local data=$2/Orvalin/Tessarine
+  mkdir -p "$data"
+  cp "$1/scenarios_default.mdb" "$data/scenarios.mdb"
+  cp "$1/members_default.mdb" "$data/members.mdb"
+  cp "$1/score_card_default.doc" "$data/score_card.doc"
+  cp "$1/tessarine.ini" "$data/tessarine.ini"
+}

@@ -11,8 +11,8 @@ inline void ShowErrorReport(MessageBoxes& boxes, int number, const std::string& 
   boxes.Show("Run-time error '" + std::to_string(number) + "': " + text, DefaultBoxTitle, BoxIcon::Critical);
 }
 
-/// Runs a command of the operator. A failure that nothing below has a behaviour for ends the command with a box; the
-/// program goes on. Returns false when the command failed.
+/// Runs a command of the operator. A failure that nothing below has a behaviour for ends the command with a
+/// box; the program goes on. Returns false when the command failed.
 template <typename Command>
 bool ReportErrors(MessageBoxes& boxes, Command&& command) {
   try {

@@ -16,7 +16,8 @@ class Files {
   /// The whole file. Throws RuntimeError 53 when it does not exist, 75 when it cannot be read.
   virtual std::string Read(const std::string& path) const = 0;
 
-  /// Writes the whole file atomically: a failure or a crash leaves the old file (or none). Durable on return. A path that is a
-  /// symbolic link has its target replaced. Throws RuntimeError 61 (disk full), 70, 75 or 76; the text names the file.
+  /// Writes the whole file atomically: a failure or a crash leaves the old file (or none). Durable on return.
+  /// A path that is a symbolic link has its target replaced. Throws RuntimeError 61 (disk full), 70, 75 or
+  /// 76; the text names the file.
   virtual void Replace(const std::string& path, const std::string& bytes) = 0;
 };

@@ -12,7 +12,8 @@ class Folders {
   static constexpr std::uint32_t DoesNotExist = 1;
   static constexpr std::uint32_t InvalidFolderId = 0x80070057;
 
-  /// The per-user application data folder, created when absent. Returns Found and sets `path`, or says why not.
+  /// The per-user application data folder, created when absent. Returns Found and sets `path`, or says why
+  /// not.
   virtual std::uint32_t LocalAppData(std::string& path) const = 0;
 
   /// The folder that holds the default data files.

@@ -14,7 +14,8 @@ class MessageBoxes {
  public:
   virtual ~MessageBoxes() = default;
 
-  /// Shows a box and returns the button that closed it. The close box answers Cancel (OkCancel), No (YesNo) or Ok.
+  /// Shows a box and returns the button that closed it. The close box answers Cancel (OkCancel), No (YesNo)
+  /// or Ok.
   virtual BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,
                          BoxButtons buttons = BoxButtons::Ok) = 0;
 };

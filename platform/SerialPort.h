@@ -9,9 +9,10 @@ class SerialPort {
  public:
   virtual ~SerialPort() = default;
 
-  /// Opens `device` (a path such as "/dev/ttyUSB0") with `settings` "baud,parity,data bits,stop bits", for instance
-  /// "19200,N,8,1", without flow control, and empties the input. Throws RuntimeError 8005 when this object is already
-  /// open or another program holds the device, 8002 when the device is missing or refuses. A failed open leaves it closed.
+  /// Opens `device` (a path such as "/dev/ttyUSB0") with `settings` "baud,parity,data bits,stop bits", for
+  /// instance "19200,N,8,1", without flow control, and empties the input. Throws RuntimeError 8005 when this
+  /// object is already open or another program holds the device, 8002 when the device is missing or refuses.
+  /// A failed open leaves it closed.
   virtual void Open(const std::string& device, const std::string& settings) = 0;
 
   /// Sends what is still under way, then closes. Does nothing when closed.

@@ -34,11 +34,8 @@ QtEventPump::QtEventPump() {
 }
 
 void QtEventPump::DoEvents() {
-  // One pass of the loop may serve nothing but the most urgent kind of event, so it goes on until none is
-  // pending; the limit is for events that keep making new ones.
-  constexpr int mostMilliseconds = 20;
   const OnStack onStack(*this);
-  QCoreApplication::processEvents(QEventLoop::AllEvents, mostMilliseconds);
+  QCoreApplication::processEvents();
 }
 
 WaitResult QtEventPump::WaitFor(const std::function<bool()>& condition, milliseconds limit) {

@@ -67,7 +67,8 @@ std::string QtFileDialog::Ask(bool save, const std::string& filter, const std::s
   const QPointer<QFileDialog> dialog = new QFileDialog(DialogParent(mainWindow_));
   dialog->setObjectName(QStringLiteral("CommonDialog1"));
   dialog->setAcceptMode(save ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
-  dialog->setFileMode(save ? QFileDialog::AnyFile : QFileDialog::ExistingFile);
+  // A name without a file is for the caller to judge, also when opening.
+  dialog->setFileMode(QFileDialog::AnyFile);
   dialog->setOption(QFileDialog::DontConfirmOverwrite, save);
   dialog->setNameFilters(NameFilters(filter));
   dialog->setDirectory(StartFolder(name, lastFolder_));

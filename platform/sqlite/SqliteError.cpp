@@ -7,11 +7,19 @@
 
 namespace {
 
+bool IsNoSpace(int systemError) {
+  return systemError == ENOSPC || systemError == EDQUOT || systemError == EFBIG;
+}
+
 // SQLite reports a full disk by number only where the system said ENOSPC; a quota or a limit on the file's
-// size comes as an I/O error.
-bool NoSpaceLeft(int code, int systemError) {
-  return code == SQLITE_FULL ||
-         (code == SQLITE_IOERR && (systemError == ENOSPC || systemError == EDQUOT || systemError == EFBIG));
+// size comes as an I/O error, whose cause is kept with the file, or in errno when it met the journal.
+bool NoSpaceLeft(sqlite3* database, int code) {
+  if (code != SQLITE_IOERR) {
+    return code == SQLITE_FULL;
+  }
+  int fileError = 0;
+  sqlite3_file_control(database, "main", SQLITE_FCNTL_LAST_ERRNO, &fileError);
+  return IsNoSpace(fileError) || IsNoSpace(sqlite3_system_errno(database));
 }
 
 RuntimeError ConstraintError(int extendedCode, const std::string& message) {
@@ -42,7 +50,7 @@ RuntimeError SqliteError(sqlite3* database, const std::string& path) {
   if (extendedCode == SqliteInvalidPattern) {
     return {93, message};
   }
-  if (NoSpaceLeft(code, sqlite3_system_errno(database))) {
+  if (NoSpaceLeft(database, code)) {
     return {3026, "Not enough space on disk: " + path};
   }
   switch (code) {

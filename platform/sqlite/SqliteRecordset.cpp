@@ -32,7 +32,9 @@ SqliteRecordset::SqliteRecordset(SqliteConnection& connection, const std::string
       row_(table_.Columns().size()),
       pending_(connection, table_) {
   ReadKeys(condition);
-  MoveFirst();
+  if (keys_.Size() != 0) {
+    GoTo(0);
+  }
 }
 
 // The keys of a whole table are taken in whatever order is cheapest: an index is a small part of the table,

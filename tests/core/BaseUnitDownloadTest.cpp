@@ -3,314 +3,404 @@
 #include <gmock/gmock.h>
 
 #include <algorithm>
-#include <memory>
+#include <string>
 
-#include "tests/core/Frames.h"
-#include "tests/fakes/FakeClock.h"
-#include "tests/fakes/FakeEventPump.h"
-#include "tests/fakes/FakeFiles.h"
-#include "tests/fakes/FakeMessageBoxes.h"
-#include "tests/fakes/FakeSerialDevices.h"
-#include "tests/fakes/FakeSerialPort.h"
-#include "tests/fakes/FakeTransferProgress.h"
+#include "tests/core/DownloadStage.h"
 
 namespace {
 
 using std::chrono::milliseconds;
-using testing::Contains;
+using testing::Each;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-const FakeMessageBoxes::Box TimedOutBox{"Timed out waiting for Data. Please try again.", "Tessarine", BoxIcon::Exclamation,
-                                        BoxButtons::Ok};
-const FakeMessageBoxes::Box ReceiveErrorBox{"Error occured receiving data. Please try again.", "Tessarine",
-                                            BoxIcon::Exclamation, BoxButtons::Ok};
-const FakeMessageBoxes::Box SendErrorBox{"Error occured sending data. Please try again.", "Tessarine",
-                                         BoxIcon::Exclamation, BoxButtons::Ok};
-
-class Download : public testing::Test {
+class Download : public testing::Test, protected DownloadStage {
  protected:
-  Download() {
-    devices.Ports = {"/dev/ttyS0"};
-    port.OnOutput = [this](std::uint8_t byte) { Answer(byte); };
-  }
-
-  /// Plays the unit: the request brings the count and the first frame, each reply the next frame.
-  void Answer(std::uint8_t byte) {
-    const bool isRequest = port.Sent.size() == 1 && byte == 1;
-    if (isRequest) {
-      return;
-    }
-    if (port.Sent.size() == 2) {
-      Send({Count.value_or(static_cast<std::uint8_t>(Frames.size()))});
-    }
-    if (next_ < Frames.size()) {
-      Send(Frames[next_++]);
-    }
-  }
-
-  /// Bytes arrive, up to the limit after which the unit falls silent.
-  void Send(const Bytes& bytes) {
-    for (const std::uint8_t byte : bytes) {
-      if (sent_++ < SilentFrom) {
-        port.Receive({byte});
-      }
-    }
-  }
-
-  void GetScores() {
-    BaseUnitDownload(port, commPort, events, boxes, clock, progress, game).GetScores();
-  }
-
-  std::vector<Bytes> Frames;
-  std::optional<std::uint8_t> Count;  ///< when it is to differ from the number of frames
-  std::size_t SilentFrom = 1'000'000;
-
-  FakeFiles files;
-  IniReader ini{files, "/tessarine.ini"};
-  FakeSerialDevices devices;
-  FakeSerialPort port;
-  FakeMessageBoxes boxes;
-  FakeEventPump events;
-  FakeClock clock;
-  FakeTransferProgress progress;
-  StringTable strings{Language::English};
-  Game game{strings};
-  int settingsShown = 0;
-  CommPort commPort{port, ini, devices, boxes, strings, [this] { ++settingsShown; }};
-
- private:
-  std::size_t next_ = 0;
-  std::size_t sent_ = 0;
+  const Player& Red1() const { return Scores.Players(2); }
+  const Player& Blue0() const { return Scores.Players(33); }
 };
 
-TEST_F(Download, OfTwoGunsSpeaksByteByByteAsTheUnitExpects) {
+TEST_F(Download, SpeaksByteByByteAsTheUnitExpects) {
   Frames = {FrameOfRed1(), FrameOfBlue0()};
   GetScores();
-  EXPECT_THAT(port.Log, ElementsAre("Open /dev/ttyS0 19200,N,8,1", "Output 1", "Output 0", "Output 170", "Output 170",
-                                    "Close"));
-  EXPECT_THAT(events.Sleeps, ElementsAre(milliseconds(20), milliseconds(50), milliseconds(50)));
-  EXPECT_THAT(boxes.Boxes, IsEmpty());
-  EXPECT_TRUE(game.Players(2).Active);
-  EXPECT_TRUE(game.Players(33).Active);
+  EXPECT_THAT(Port.Log, ElementsAre("Open /dev/ttyS0 19200,N,8,1", "Output 1", "Output 0", "Output 170",
+                                    "Output 170", "Close"));
+  EXPECT_THAT(Events.Sleeps, ElementsAre(milliseconds(20), milliseconds(50), milliseconds(50)));
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  EXPECT_TRUE(Red1().Active);
+  EXPECT_TRUE(Blue0().Active);
 }
 
-TEST_F(Download, ShowsItsProgress) {
-  Frames = {FrameOfRed1(), FrameOfBlue0()};
+TEST_F(Download, KeepsItsOrderOfBytesPausesAndTexts) {
+  Frames = {FrameOfRed1(), WithWrongCheckByte(FrameOfBlue0()), FrameOfRed1()};
+  LogAll();
   GetScores();
-  EXPECT_THAT(progress.Log,
-              ElementsAre("Open", "Status Requesting Data...", "Maximum 2", "Status Accepting Score Data...", "Animate",
-                          "Progress 1", "Status Accepting Score Data...", "Animate", "Progress 2", "Close"));
+  EXPECT_THAT(Progress.Log,
+              ElementsAre("Open", "Status Requesting Data...", "Output 1", "Sleep 20", "Output 0",
+                          "Maximum 3", "Status Accepting Score Data...", "Animate", "Progress 1", "Sleep 50",
+                          "Output 170", "Status Accepting Score Data...", "Animate", "Progress 2", "Sleep 50",
+                          "Output 0", "Box Checksum failed", "Status Checksum failed!", "Sleep 2000",
+                          "Status Accepting Score Data...", "Animate", "Progress 3", "Sleep 50", "Output 170",
+                          "Close"));
 }
 
 TEST_F(Download, WithoutScoresSaysSoOnceTheProgressIsHidden) {
   Count = 0;
-  boxes.WhileOpen = [this](const auto&) { EXPECT_EQ(progress.Log.back(), "Close"); };
+  Scores.GameDate = "before";
+  LogAll();
   GetScores();
-  EXPECT_THAT(boxes.Boxes, ElementsAre(FakeMessageBoxes::Box{"Kesh has no score data.", "Tessarine",
-                                                             BoxIcon::Information, BoxButtons::Ok}));
-  EXPECT_FALSE(port.PortOpen());
-  EXPECT_FALSE(game.DataPresent);
+  ASSERT_GE(Progress.Log.size(), 7U);
+  Progress.Log.resize(7);
+  EXPECT_THAT(Progress.Log, ElementsAre("Open", "Status Requesting Data...", "Output 1", "Sleep 20",
+                                        "Output 0", "Close", "Box Kesh has no score data."));
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(NoScoresBox));
+  EXPECT_FALSE(Port.PortOpen());
+  EXPECT_FALSE(Scores.DataPresent);
+  EXPECT_EQ(Scores.GameDate, "before");
+}
+
+TEST_F(Download, OfOneFrameFillsTheBarWithIt) {
+  Frames = {FrameOfBlue0()};
+  GetScores();
+  EXPECT_THAT(Progress.Log, ElementsAre("Open", "Status Requesting Data...", "Maximum 1",
+                                        "Status Accepting Score Data...", "Animate", "Progress 1", "Close"));
+  EXPECT_THAT(Port.Sent, ElementsAre(1, 0, 170));
 }
 
 TEST_F(Download, TakesUpTo255Frames) {
   Frames.assign(255, FrameOfBlue0());
   GetScores();
-  EXPECT_EQ(game.Players(33).ShotCount, 255);
-  EXPECT_THAT(progress.Log, Contains("Progress 255"));
+  EXPECT_EQ(Blue0().ShotCount, 255);
+  EXPECT_EQ(Port.Sent.size(), 257U);
+  EXPECT_EQ(std::count(Port.Sent.begin(), Port.Sent.end(), 170), 255);
+  EXPECT_THAT(Progress.Log, testing::Contains("Maximum 255"));
+  for (int frame = 1; frame <= 255; ++frame) {
+    EXPECT_THAT(Progress.Log, testing::Contains("Progress " + std::to_string(frame)).Times(1));
+  }
 }
 
-TEST_F(Download, AddsUpAGunThatReportsTwice) {
-  Frames = {FrameOfRed1(), FrameOfRed1()};
+TEST_F(Download, DecodesAFrameBeforeItAcceptsIt) {
+  Frames = {FrameOfRed1()};
+  bool decoded = false;
+  Events.OnSleep = [this, &decoded](milliseconds time) {
+    decoded = time == milliseconds(50) && Red1().Active && Port.Sent.size() == 2;
+  };
   GetScores();
-  EXPECT_EQ(game.Players(2).ShotCount, 516);
-  EXPECT_EQ(game.Players(2).RemainingHealth, 100);
+  EXPECT_TRUE(decoded);
+}
+
+TEST_F(Download, AddsUpAGunThatReportsTwiceAndReplacesTheRest) {
+  Frames = {FrameOfRed1(), SecondFrameOfRed1()};
+  GetScores();
+  EXPECT_EQ(Red1().ShotCount, 516);
+  EXPECT_EQ(Red1().HitByPlayer(33), 520);
+  EXPECT_EQ(Red1().RemainingHealth, 7);
+  EXPECT_EQ(Red1().DallasID, "08070605040302AB");
+  EXPECT_EQ(Red1().PowerCheatFlag, 3);
+}
+
+TEST_F(Download, AddsToWhatIsOnTheBoard) {
+  Frames = {FrameOfRed1()};
+  GetScores();
+  GetScores();
+  EXPECT_EQ(Red1().ShotCount, 516);
+  EXPECT_EQ(Red1().HitByPlayer(2), 10);
+}
+
+TEST_F(Download, DatesTheGameByItsLastFrame) {
+  Frames = {FrameOfRed1(), FrameOfBlue0()};
+  Events.OnSleep = [this](milliseconds) { Time.Time = Port.Sent.size() < 3 ? "14:31" : "14:32"; };
+  GetScores();
+  EXPECT_EQ(Scores.GameDate, "21/05/2013 14:31");
 }
 
 TEST_F(Download, LeavesOutAFrameWithAWrongChecksumAndGoesOn) {
-  Frames = {FrameOfRed1(), FrameOfBlue0(), FrameOfRed1()};
-  Frames[1].back() ^= 1;
-  boxes.WhileOpen = [this](const auto&) {
-    EXPECT_EQ(port.Log.back(), "Output 0");
-    EXPECT_EQ(progress.Log.back(), "Progress 2");
-  };
+  Frames = {FrameOfRed1(), WithWrongCheckByte(FrameOfBlue0()), FrameOfRed1()};
   GetScores();
-  EXPECT_THAT(boxes.Boxes,
-              ElementsAre(FakeMessageBoxes::Box{"Checksum failed", "Tessarine", BoxIcon::Critical, BoxButtons::Ok}));
-  EXPECT_THAT(port.Sent, ElementsAre(1, 0, 170, 0, 170));
-  EXPECT_THAT(events.Sleeps, ElementsAre(milliseconds(20), milliseconds(50), milliseconds(50), milliseconds(2000),
-                                         milliseconds(50)));
-  EXPECT_THAT(progress.Log, Contains("Status Checksum failed!"));
-  EXPECT_EQ(game.Players(2).ShotCount, 516);
-  EXPECT_FALSE(game.Players(33).Active);
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(ChecksumBox));
+  EXPECT_THAT(Port.Sent, ElementsAre(1, 0, 170, 0, 170));
+  EXPECT_EQ(Red1().ShotCount, 516);
+  EXPECT_FALSE(Blue0().Active);
+}
+
+TEST_F(Download, TakesTheFirstByteForTheCount) {
+  Count = 0;
+  Frames = {{1}, FrameOfRed1()};  // a stray 0 came before the true count
+  GetScores();
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(NoScoresBox));
+}
+
+TEST_F(Download, ClosesALineThatIsOpenAndDropsWhatItReceived) {
+  Frames = {FrameOfRed1()};
+  Port.Open("/dev/ttyUSB0", "57600,N,8,1");
+  Port.Receive({7, 7, 7});
+  GetScores();
+  EXPECT_THAT(Port.Log, ElementsAre("Open /dev/ttyUSB0 57600,N,8,1", "Close", "Open /dev/ttyS0 19200,N,8,1",
+                                    "Output 1", "Output 0", "Output 170", "Close"));
+  EXPECT_TRUE(Red1().Active);
+}
+
+TEST_F(Download, TakesTheLongestFrameThatFits) {
+  Frames = {LongestFrameOfRed1()};
+  ASSERT_EQ(Frames[0].size(), 1002U);
+  GetScores();
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  EXPECT_EQ(Red1().HitByPlayer(33), 260);
+  EXPECT_EQ(Red1().HitByPlayer(2), 517);
+}
+
+TEST_F(Download, FailsAFrameThatIsTooLongWhateverItsCheckByte) {
+  Frames.assign(255, Bytes(1003, 0));
+  for (std::size_t i = 0; i < Frames.size(); ++i) {
+    Frames[i][0] = 0xEA;
+    Frames[i][1] = 0x03;
+    Frames[i].back() = static_cast<std::uint8_t>(i);
+  }
+  GetScores();
+  EXPECT_EQ(Boxes.Boxes.size(), 255U);
+  EXPECT_THAT(Boxes.Boxes, Each(ChecksumBox));
+  EXPECT_FALSE(Scores.DataPresent);
+}
+
+TEST_F(Download, ReadsAFrameThatIsTooLongToItsEnd) {
+  Bytes tooLong(32768, 0);
+  tooLong[0] = 0xFF;
+  tooLong[1] = 0x7F;
+  tooLong.back() = 74;  // the right one
+  Frames = {tooLong, FrameOfRed1()};
+  GetScores();
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(ChecksumBox));
+  EXPECT_THAT(Port.Sent, ElementsAre(1, 0, 0, 170));
+  EXPECT_EQ(Red1().ShotCount, 258);
+}
+
+TEST_F(Download, TakesALengthWithTheHighBitForNothing) {
+  // The check byte follows at once, and that of no bytes is 0.
+  Frames = {FrameOfRed1(), {0, 0x80, 0}, {0xFF, 0xFF, 1}, FrameOfBlue0()};
+  GetScores();
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(ChecksumBox));
+  EXPECT_THAT(Port.Sent, ElementsAre(1, 0, 170, 170, 0, 170));
+  EXPECT_EQ(Red1().ShotCount, 258);
+  EXPECT_TRUE(Blue0().Active);
+}
+
+TEST_F(Download, ChecksFramesOfLength0And1LikeAnyOther) {
+  Frames = {{0, 0, 0}, {1, 0, 94}, {0, 0, 1}, {1, 0, 93}};
+  GetScores();
+  EXPECT_THAT(Port.Sent, ElementsAre(1, 0, 170, 170, 0, 0));
+  EXPECT_TRUE(Scores.DataPresent);
+  EXPECT_TRUE(
+      std::none_of(Scores.Players.begin(), Scores.Players.end(), [](const Player& p) { return p.Active; }));
+}
+
+TEST_F(Download, OfAnEmptyFrameDecodesWhatARejectedOneLeft) {
+  Frames = {WithWrongCheckByte(FrameOfRed1()), {0, 0x80, 0}};
+  GetScores();
+  EXPECT_THAT(Port.Sent, ElementsAre(1, 0, 0, 170));
+  EXPECT_EQ(Red1().ShotCount, 258);
 }
 
 TEST_F(Download, EndsWithOneBoxWhereverTheUnitFallsSilent) {
-  const std::size_t whole = 1 + FrameOfRed1().size() + FrameOfBlue0().size();
+  constexpr std::size_t behindRed1 = 1 + 53;
+  constexpr std::size_t whole = behindRed1 + 47;
   for (std::size_t silentFrom = 0; silentFrom < whole; ++silentFrom) {
-    boxes.Boxes.clear();
-    FakeSerialPort line;
-    FakeEventPump pump;
-    Game scores(strings);
-    std::size_t sent = 0;
-    const auto send = [&](const Bytes& bytes) {
-      for (const std::uint8_t byte : bytes) {
-        if (sent++ < silentFrom) {
-          line.Receive({byte});
-        }
-      }
-    };
-    line.OnOutput = [&](std::uint8_t byte) {
-      if (byte == 0) {
-        send({2});
-        send(FrameOfRed1());
-      } else if (byte == 170 && sent < whole) {
-        send(FrameOfBlue0());
-      }
-    };
-    CommPort lineOwner(line, ini, devices, boxes, strings, [] {});
-    BaseUnitDownload(line, lineOwner, pump, boxes, clock, progress, scores).GetScores();
-    EXPECT_THAT(boxes.Boxes, ElementsAre(TimedOutBox)) << silentFrom;
-    EXPECT_FALSE(line.PortOpen());
-    EXPECT_EQ(scores.Players(2).Active, silentFrom > FrameOfRed1().size()) << silentFrom;
-    EXPECT_FALSE(scores.Players(33).Active);
-    EXPECT_GE(pump.Now(), milliseconds(5000));
+    SCOPED_TRACE(silentFrom);
+    DownloadStage stage;
+    stage.Frames = {FrameOfRed1(), FrameOfBlue0()};
+    stage.SilentFrom = silentFrom;
+    stage.GetScores();
+    const bool redCameThrough = silentFrom >= behindRed1;
+    EXPECT_THAT(stage.Boxes.Boxes, ElementsAre(TimedOutBox));
+    EXPECT_EQ(stage.Events.Now(), milliseconds(redCameThrough ? 5070 : 5020));
+    EXPECT_EQ(stage.Port.Sent.size(), redCameThrough ? 3U : 2U);
+    EXPECT_EQ(stage.Scores.Players(2).ShotCount, redCameThrough ? 258 : 0);
+    EXPECT_EQ(stage.Scores.DataPresent, redCameThrough);
+    EXPECT_FALSE(stage.Scores.Players(33).Active);
+    EXPECT_EQ(stage.Progress.Log.back(), "Close");
+    EXPECT_FALSE(stage.Port.PortOpen());
   }
 }
 
 TEST_F(Download, WaitsFiveSecondsForEachByteByItself) {
-  Frames = {FrameOfBlue0()};
-  port.OnOutput = [this](std::uint8_t byte) {
-    if (byte != 0) {
-      return;
-    }
-    Bytes bytes = {1};
-    bytes.insert(bytes.end(), Frames[0].begin(), Frames[0].end());
-    milliseconds arrival{0};
-    for (const std::uint8_t next : bytes) {
-      arrival += milliseconds(4999);
-      events.At(arrival, [this, next] { port.Receive({next}); });
-    }
-  };
-  GetScores();
-  EXPECT_THAT(boxes.Boxes, IsEmpty());
-  EXPECT_TRUE(game.Players(33).Active);
-}
-
-TEST_F(Download, FailsTheChecksumOfAFrameThatIsTooLong) {
-  for (const int length : {1002, 32767}) {
-    port.Log.clear();
-    port.Sent.clear();
-    boxes.Boxes.clear();
-    Bytes frame(static_cast<std::size_t>(length) + 1, 0);
-    frame[0] = static_cast<std::uint8_t>(length & 255);
-    frame[1] = static_cast<std::uint8_t>(length >> 8);
-    port.OnOutput = [this, &frame](std::uint8_t byte) {
-      if (byte == 0 && port.Sent.size() == 2) {
-        port.Receive({1});
-        port.Receive(frame);
+  const Bytes answer = {1, 46, 0, 41, 0, 64, 18, 0, 1, 0, 0,  0, 0, 0, 0, 0, 2, 0, 0,  0, 0, 0, 0, 0,
+                        0, 0,  0, 0,  0, 0,  0,  0, 0, 0, 50, 0, 0, 0, 0, 0, 0, 0, 20, 0, 1, 0, 0, 215};
+  for (const int wait : {4999, 5001}) {
+    DownloadStage stage;
+    stage.Port.OnOutput = [&stage, &answer, wait](std::uint8_t byte) {
+      milliseconds arrival{0};
+      for (const std::uint8_t next : byte == 0 ? answer : Bytes()) {
+        arrival += milliseconds(wait);
+        stage.Events.At(arrival, [&stage, next] { stage.Port.Receive({next}); });
       }
     };
-    GetScores();
-    ASSERT_EQ(boxes.Boxes.size(), 1u) << length;
-    EXPECT_EQ(boxes.Boxes[0].Text, "Checksum failed");
-    EXPECT_FALSE(game.DataPresent);
+    stage.GetScores();
+    EXPECT_EQ(stage.Boxes.Boxes.size(), wait < 5000 ? 0U : 1U);
+    EXPECT_EQ(stage.Scores.Players(33).Active, wait < 5000);
   }
 }
 
-TEST_F(Download, TakesALengthWithTheHighBitForNothing) {
-  Frames = {{0, 0x80, 0}};  // no bytes of a frame, and the check byte of no bytes
-  GetScores();
-  EXPECT_THAT(boxes.Boxes, IsEmpty());
-  EXPECT_THAT(port.Sent, ElementsAre(1, 0, 170));
-  EXPECT_TRUE(game.DataPresent);
-}
-
-TEST_F(Download, ChecksFramesOfLength0And1LikeAnyOther) {
-  Frames = {{0, 0, 0}, {1, 0, 94}, {1, 0, 93}};
-  GetScores();
-  EXPECT_THAT(port.Sent, ElementsAre(1, 0, 170, 170, 0));
-  EXPECT_EQ(boxes.Boxes.size(), 1u);
-}
-
-TEST_F(Download, EndsWithOneBoxWhenTheLineIsLostInMidFrame) {
+TEST_F(Download, EndsWithOneBoxWhenTheRequestCannotBeSent) {
   Frames = {FrameOfRed1()};
-  SilentFrom = 20;
-  events.At(milliseconds(100), [this] { port.Lose(); });
+  Port.FailOutput(8012);
   GetScores();
-  EXPECT_THAT(boxes.Boxes, ElementsAre(ReceiveErrorBox));
-  EXPECT_FALSE(port.PortOpen());
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(SendErrorBox));
+  EXPECT_EQ(Progress.Log.back(), "Close");
+  EXPECT_FALSE(Port.PortOpen());
 }
 
-TEST_F(Download, EndsWithOneBoxWhenNothingCanBeSent) {
-  port.FailOutput(8012);
+TEST_F(Download, EndsWithOneBoxWhenTheLineIsLostWithinTheRequest) {
+  Frames = {FrameOfRed1()};
+  Events.OnSleep = [this](milliseconds) { Port.Lose(); };
   GetScores();
-  EXPECT_THAT(boxes.Boxes, ElementsAre(SendErrorBox));
-  EXPECT_FALSE(port.PortOpen());
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(SendErrorBox));
+  EXPECT_THAT(Port.Sent, ElementsAre(1));
+  EXPECT_FALSE(Port.PortOpen());
 }
 
-TEST_F(Download, KeepsTheFrameWhoseReplyCouldNotBeSent) {
-  Frames = {FrameOfRed1(), FrameOfBlue0()};
-  events.OnSleep = [this](milliseconds time) {
-    if (time == milliseconds(50)) {
-      port.FailOutput(8012);
-    }
-  };
+TEST_F(Download, EndsWithOneBoxWhereverTheLineIsLost) {
+  for (const std::size_t bytes : {0, 1, 2, 3, 30, 53, 54, 60}) {
+    SCOPED_TRACE(bytes);
+    DownloadStage stage;
+    stage.Frames = {FrameOfRed1(), FrameOfBlue0()};
+    stage.SilentFrom = bytes;
+    stage.Events.At(milliseconds(1000), [&stage] { stage.Port.Lose(); });
+    stage.GetScores();
+    EXPECT_THAT(stage.Boxes.Boxes, ElementsAre(ReceiveErrorBox));
+    EXPECT_EQ(stage.Scores.Players(2).Active, bytes >= 54);
+    EXPECT_EQ(stage.Events.Now(), milliseconds(1000));
+    EXPECT_EQ(stage.Progress.Log.back(), "Close");
+    EXPECT_FALSE(stage.Port.PortOpen());
+  }
+}
+
+TEST_F(Download, EndsWithOneBoxWhenTheReplyCannotBeSent) {
+  for (const bool accepted : {true, false}) {
+    DownloadStage stage;
+    stage.Frames = {accepted ? FrameOfRed1() : WithWrongCheckByte(FrameOfRed1()), FrameOfBlue0()};
+    stage.Events.OnSleep = [&stage](milliseconds time) {
+      stage.Port.FailOutput(time == milliseconds(50) ? 8012 : 0);
+    };
+    stage.GetScores();
+    EXPECT_THAT(stage.Boxes.Boxes, ElementsAre(SendErrorBox));
+    EXPECT_THAT(stage.Events.Sleeps, ElementsAre(milliseconds(20), milliseconds(50)));
+    EXPECT_EQ(stage.Scores.Players(2).Active, accepted);
+    EXPECT_FALSE(stage.Port.PortOpen());
+  }
+}
+
+TEST_F(Download, GoesOnWithTheNumberThatWasSavedAtThePortQuestion) {
+  Frames = {FrameOfRed1()};
+  Port.FailNextOpen(8005);
+  ShowSettings = [this] { Store.Put("/tessarine.ini", "[comm]\ncommport=2\n"); };
   GetScores();
-  EXPECT_THAT(boxes.Boxes, ElementsAre(SendErrorBox));
-  EXPECT_TRUE(game.Players(2).Active);
+  EXPECT_EQ(Boxes.Boxes.size(), 1U);
+  EXPECT_EQ(Port.Device, "/dev/ttyUSB0");
+  EXPECT_TRUE(Red1().Active);
+  EXPECT_FALSE(Line.CommDisabled());
 }
 
 TEST_F(Download, EndsWithoutAFurtherBoxAfterCancelAtThePortQuestion) {
-  port.FailNextOpen(8002);
-  boxes.Answers = {BoxAnswer::Cancel};
+  Port.FailNextOpen(8002);
+  Boxes.Answers = {BoxAnswer::Cancel};
   GetScores();
-  EXPECT_EQ(boxes.Boxes.size(), 1u);
-  EXPECT_TRUE(commPort.CommDisabled());
-  EXPECT_THAT(progress.Log, ElementsAre("Open", "Status Requesting Data...", "Close"));
-  EXPECT_THAT(port.Sent, IsEmpty());
+  EXPECT_EQ(Boxes.Boxes.size(), 1U);
+  EXPECT_TRUE(Line.CommDisabled());
+  EXPECT_THAT(Progress.Log, ElementsAre("Open", "Status Requesting Data...", "Close"));
+  EXPECT_THAT(Port.Sent, IsEmpty());
 }
 
-TEST_F(Download, EndsWithoutABoxWhenTheProgramCloses) {
-  SilentFrom = 0;
-  events.At(milliseconds(500), [this] { events.EndWaits(); });
-  GetScores();
-  EXPECT_THAT(boxes.Boxes, IsEmpty());
-  EXPECT_FALSE(port.PortOpen());
-  EXPECT_LT(events.Now(), milliseconds(5000));
+/// Both end a download without a word.
+constexpr void (*SilentEnds[])(DownloadStage&) = {
+    [](DownloadStage& stage) { stage.Events.EndWaits(); },
+    [](DownloadStage& stage) { stage.Progress.Closed = true; },
+};
+
+TEST_F(Download, EndsWithoutABoxWhenTheProgramOrItsWindowIsClosedInAWait) {
+  for (const auto end : SilentEnds) {
+    for (const std::size_t bytes : {0, 1, 2, 20, 53, 60}) {
+      SCOPED_TRACE(bytes);
+      DownloadStage stage;
+      stage.Frames = {FrameOfRed1(), FrameOfBlue0()};
+      stage.SilentFrom = bytes;
+      stage.Events.At(milliseconds(500), [&stage, end] { end(stage); });
+      stage.GetScores();
+      EXPECT_THAT(stage.Boxes.Boxes, IsEmpty());
+      EXPECT_EQ(stage.Scores.Players(2).Active, bytes == 60);
+      EXPECT_EQ(stage.Progress.Log.back(), "Close");
+      EXPECT_FALSE(stage.Port.PortOpen());
+      EXPECT_EQ(stage.Events.Now(), milliseconds(500));
+    }
+  }
 }
 
-TEST_F(Download, EndsWithoutABoxWhenItsWindowIsClosed) {
-  Frames = {FrameOfRed1()};
-  SilentFrom = 20;
-  events.At(milliseconds(500), [this] { progress.Closed = true; });
-  GetScores();
-  EXPECT_THAT(boxes.Boxes, IsEmpty());
-  EXPECT_FALSE(port.PortOpen());
+TEST_F(Download, EndsWithoutAFurtherBoxWhenTheProgramOrItsWindowIsClosedBehindABadFrame) {
+  for (const auto end : SilentEnds) {
+    DownloadStage stage;
+    stage.Frames = {WithWrongCheckByte(FrameOfRed1()), FrameOfBlue0()};
+    stage.SilentFrom = 60;
+    stage.Events.At(milliseconds(500), [&stage, end] { end(stage); });
+    stage.GetScores();
+    EXPECT_THAT(stage.Boxes.Boxes, ElementsAre(ChecksumBox));
+    EXPECT_FALSE(stage.Scores.DataPresent);
+    EXPECT_FALSE(stage.Port.PortOpen());
+    EXPECT_LE(stage.Events.Now(), milliseconds(2100));
+  }
 }
 
-TEST_F(Download, OfASecondPressInMidWaitTakesTheLineFromTheFirst) {
-  Frames = {FrameOfRed1()};
+TEST_F(Download, ReadsNoFurtherFrameOnceItsWindowIsClosed) {
+  Frames = {WithWrongCheckByte(FrameOfRed1()), FrameOfBlue0()};
+  Events.At(milliseconds(500), [this] { Progress.Closed = true; });
+  GetScores();
+  EXPECT_THAT(Port.Sent, ElementsAre(1, 0, 0));
+  EXPECT_FALSE(Blue0().Active);
+}
+
+TEST_F(Download, LosesItsLineToASecondOneStartedInAWait) {
+  for (const std::size_t bytes : {0, 1, 20, 53, 60}) {
+    SCOPED_TRACE(bytes);
+    DownloadStage stage;
+    FakeTransferProgress second;
+    stage.Frames = {FrameOfRed1(), FrameOfBlue0()};
+    stage.SilentFrom = bytes;
+    stage.Events.At(milliseconds(500), [&] {
+      stage.SilentFrom = DownloadStage::Never;
+      stage.GetScores(second);
+      EXPECT_FALSE(stage.Port.PortOpen());
+    });
+    stage.GetScores();
+    EXPECT_THAT(stage.Boxes.Boxes, ElementsAre(ReceiveErrorBox));
+    EXPECT_EQ(stage.Scores.Players(2).ShotCount, bytes == 60 ? 516 : 258);
+    EXPECT_EQ(stage.Scores.Players(33).ShotCount, 1);
+    EXPECT_THAT(second.Log, testing::Contains("Progress 2"));
+    EXPECT_EQ(second.Log.back(), "Close");
+    EXPECT_EQ(stage.Progress.Log.back(), "Close");
+    EXPECT_FALSE(stage.Port.PortOpen());
+  }
+}
+
+TEST_F(Download, LosesItsLineToASecondOneStartedInThePauseBehindABadFrame) {
   FakeTransferProgress second;
-  SilentFrom = 20;
-  events.At(milliseconds(500), [&] {
-    BaseUnitDownload(port, commPort, events, boxes, clock, second, game).GetScores();
+  Frames = {WithWrongCheckByte(FrameOfRed1()), FrameOfBlue0()};
+  Events.At(milliseconds(500), [&] {
+    Frames = {FrameOfRed1()};
+    GetScores(second);
   });
   GetScores();
-  EXPECT_FALSE(port.PortOpen());
-  EXPECT_THAT(boxes.Boxes, ElementsAre(TimedOutBox, ReceiveErrorBox));
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(ChecksumBox, ReceiveErrorBox));
+  EXPECT_EQ(Red1().ShotCount, 258);
+  EXPECT_FALSE(Port.PortOpen());
 }
 
-TEST_F(Download, TakesNoiseForTheCount) {
-  port.OnOutput = [this](std::uint8_t byte) {
-    if (byte == 0 && port.Sent.size() == 2) {
-      port.Receive({0, 1});
-      port.Receive(FrameOfRed1());
-    }
-  };
+TEST_F(Download, EndsTogetherWithASecondOneWhenTheProgramCloses) {
+  FakeTransferProgress second;
+  SilentFrom = 0;
+  Events.At(milliseconds(500), [&] { GetScores(second); });
+  Events.At(milliseconds(1000), [this] { Events.EndWaits(); });
   GetScores();
-  ASSERT_EQ(boxes.Boxes.size(), 1u);
-  EXPECT_EQ(boxes.Boxes[0].Text, "Kesh has no score data.");
+  EXPECT_EQ(Events.Now(), milliseconds(1000));
+  EXPECT_EQ(second.Log.back(), "Close");
+  EXPECT_EQ(Progress.Log.back(), "Close");
+  EXPECT_FALSE(Port.PortOpen());
 }
 
 }  // namespace

@@ -57,13 +57,30 @@ TEST_F(OpeningThePort, AsksAndGoesOnWithTheNumberSavedThen) {
   port.FailNextOpen(8005);
   settings = [this] { PutIni("[comm]\ncommport=2\n"); };
   EXPECT_TRUE(commPort.OpenCommPort(Line));
-  EXPECT_THAT(boxes.Boxes,
-              ElementsAre(FakeMessageBoxes::Box{
-                  "Communications port could not be opened. Please select a valid port and press OK, or press Cancel to "
-                  "proceed with communications disabled.",
-                  "Comm Port Error", BoxIcon::Exclamation, BoxButtons::OkCancel}));
+  EXPECT_THAT(boxes.Boxes, ElementsAre(FakeMessageBoxes::Box{
+                               "Communications port could not be opened. Please select a valid port and "
+                               "press OK, or press Cancel to "
+                               "proceed with communications disabled.",
+                               "Comm Port Error", BoxIcon::Exclamation, BoxButtons::OkCancel}));
   EXPECT_EQ(port.Device, "/dev/ttyUSB0");
   EXPECT_FALSE(commPort.CommDisabled());
+}
+
+TEST_F(OpeningThePort, ClosesItAgainWhenTheSettingsLeaveItOpen) {
+  port.FailNextOpen(8005);
+  settings = [this] { port.Open("/dev/ttyUSB0", Line); };
+  EXPECT_TRUE(commPort.OpenCommPort(Line));
+  EXPECT_THAT(port.Log, ElementsAre("Open /dev/ttyS0 19200,N,8,1 failed 8005",
+                                    "Open /dev/ttyUSB0 19200,N,8,1", "Close", "Open /dev/ttyS0 19200,N,8,1"));
+}
+
+TEST_F(OpeningThePort, AsksInTheLanguageOfTheTable) {
+  const StringTable chinese(Language::SimplifiedChinese);
+  port.FailNextOpen(8002);
+  CommPort(port, ini, devices, boxes, chinese, [] {}).OpenCommPort(Line);
+  ASSERT_EQ(boxes.Boxes.size(), 1U);
+  EXPECT_EQ(boxes.Boxes[0].Text, chinese.Text(121));
+  EXPECT_EQ(boxes.Boxes[0].Title, chinese.Text(122));
 }
 
 TEST_F(OpeningThePort, AsksAgainUntilCancel) {
@@ -74,11 +91,13 @@ TEST_F(OpeningThePort, AsksAgainUntilCancel) {
   EXPECT_FALSE(commPort.OpenCommPort(Line));
   EXPECT_EQ(boxes.Boxes.size(), 3u);
   EXPECT_EQ(shown, 2);
+  EXPECT_FALSE(port.PortOpen());
   EXPECT_TRUE(commPort.CommDisabled());
 }
 
 TEST_F(OpeningThePort, AsksForANumberThatIsNone) {
-  for (const char* number : {"abc", "", "0", "-3", "99999", "1e99"}) {
+  for (const char* number :
+       {"abc", "2abc", "", "0", "-3", "3", "32767", "32768", "-32769", "65538", "99999", "1e99"}) {
     PutIni(std::string("[comm]\ncommport=") + number + "\n");
     boxes.Boxes.clear();
     boxes.Answers = {BoxAnswer::Cancel};
@@ -88,11 +107,28 @@ TEST_F(OpeningThePort, AsksForANumberThatIsNone) {
   EXPECT_THAT(port.Log, IsEmpty());
 }
 
+TEST_F(OpeningThePort, TakesTheFirstWhenTheSettingsLackTheNumber) {
+  for (const char* text : {"", "[comm]\n", "[other]\ncommport=2\n"}) {
+    PutIni(text);
+    EXPECT_TRUE(commPort.OpenCommPort(Line));
+    EXPECT_EQ(port.Device, "/dev/ttyS0") << text;
+  }
+}
+
 TEST_F(OpeningThePort, WorksAgainAfterAnEarlierCancel) {
   port.FailNextOpen(8002);
   boxes.Answers = {BoxAnswer::Cancel};
   ASSERT_FALSE(commPort.OpenCommPort(Line));
   EXPECT_TRUE(commPort.OpenCommPort(Line));
+  EXPECT_TRUE(port.PortOpen());
+}
+
+TEST_F(OpeningThePort, ClosesItOnlyWhenItIsOpen) {
+  commPort.CloseIfOpen();
+  EXPECT_THAT(port.Log, IsEmpty());
+  commPort.OpenCommPort(Line);
+  commPort.CloseIfOpen();
+  EXPECT_FALSE(port.PortOpen());
 }
 
 }  // namespace

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
+
 #include "tests/platform/linux/Thrown.h"
 
 namespace {
@@ -12,6 +14,13 @@ TEST(TextOf, GivesTextsAndPlainNumbers) {
   EXPECT_EQ(TextOf(std::int64_t{-7}), "-7");
   EXPECT_EQ(TextOf(12.5), "12.5");
   EXPECT_EQ(TextOf(-0.5), "-.5");
+  EXPECT_EQ(TextOf(0.0), "0");
+  EXPECT_EQ(TextOf(std::numeric_limits<std::int64_t>::min()), "-9223372036854775808");
+  EXPECT_EQ(TextOf(std::string()), "");
+}
+
+TEST(TextOf, RefusesBytesWith13) {
+  EXPECT_EQ(NumberThrownBy([] { TextOf(Blob{1}); }), 13);
 }
 
 TEST(NumberOf, TakesNumbersTextsAndNull) {

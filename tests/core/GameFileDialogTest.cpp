@@ -68,6 +68,56 @@ TEST_F(GameFiles, ForgetTheirNameWhenLoadingIsCancelled) {
   EXPECT_THAT(files.Replaced, IsEmpty());
 }
 
+TEST_F(GameFiles, OfferTheLastNameWhenSavingAgainAndNoneWhenLoading) {
+  dialog.Answers = {"/a.xml", "/b.xml"};
+  gameFile.SaveGame(game, "None");
+  gameFile.SaveGame(game, "None");
+  gameFile.AskForGame();
+  EXPECT_THAT(dialog.Calls, ElementsAre(FakeFileDialog::Call{true, Filter, ""},
+                                        FakeFileDialog::Call{true, Filter, "/a.xml"},
+                                        FakeFileDialog::Call{false, Filter, ""}));
+  EXPECT_TRUE(files.FileExists("/a.xml") && files.FileExists("/b.xml"));
+}
+
+TEST_F(GameFiles, ReplaceAnExistingOneWithoutAQuestion) {
+  files.Put("/a.xml", "old and much longer than before");
+  dialog.Answers = {"/a.xml"};
+  gameFile.SaveGame(game, "None");
+  EXPECT_EQ(files.Read("/a.xml"), WriteGameFile(game, "None"));
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+}
+
+TEST_F(GameFiles, GiveTheirMissionAndContentsWhenLoaded) {
+  files.Put(
+      "/b.xml",
+      "<GameData><GameHeader><MissionName>Keep</MissionName></GameHeader><PlayerData><Player><Index>5</Index>"
+      "<Committed>1</Committed></Player></PlayerData></GameData>");
+  dialog.Answers = {"/b.xml"};
+  ASSERT_TRUE(gameFile.AskForGame());
+  std::vector<std::string> missions;
+  EXPECT_TRUE(gameFile.LoadGame(game, [&](const std::string& mission) { missions.push_back(mission); }));
+  EXPECT_THAT(missions, ElementsAre("Keep"));
+  EXPECT_TRUE(game.Players(5).Committed);
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+}
+
+TEST_F(GameFiles, KeepTheNameOfABadOneForTheNextSave) {
+  files.Put("/bad.xml", "bad");
+  dialog.Answers = {"/bad.xml", std::nullopt};
+  ASSERT_TRUE(gameFile.AskForGame());
+  EXPECT_FALSE(Load());
+  gameFile.SaveGame(game, "None");
+  EXPECT_EQ(files.Read("/bad.xml"), WriteGameFile(game, "None"));
+}
+
+TEST_F(GameFiles, WithAFaultInsideReportItWithoutTheBox) {
+  files.Put("/b.xml", "<GameData><PlayerData><Player><Index>x</Index></Player></PlayerData></GameData>");
+  dialog.Answers = {"/b.xml"};
+  ASSERT_TRUE(gameFile.AskForGame());
+  EXPECT_EQ(NumberThrownBy([this] { Load(); }), 13);
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+}
+
 TEST_F(GameFiles, ThatCannotBeWrittenLeaveTheOldOne) {
   files.Put("/a.xml", "old");
   files.FailReplace("/a.xml", RuntimeError(61));
@@ -77,14 +127,21 @@ TEST_F(GameFiles, ThatCannotBeWrittenLeaveTheOldOne) {
 }
 
 TEST_F(GameFiles, ThatCannotBeReadGiveTheBox) {
-  const FakeMessageBoxes::Box box{"Unable to open Game file.", "Game File Error", BoxIcon::Exclamation, BoxButtons::Ok};
+  const FakeMessageBoxes::Box box{"Unable to open Game file.", "Game File Error", BoxIcon::Exclamation,
+                                  BoxButtons::Ok};
   files.Put("/bad.xml", "<Other/>");
-  dialog.Answers = {"/missing.xml", "/bad.xml"};
-  ASSERT_TRUE(gameFile.AskForGame());
-  EXPECT_FALSE(Load());
-  ASSERT_TRUE(gameFile.AskForGame());
-  EXPECT_FALSE(Load());
-  EXPECT_THAT(boxes.Boxes, ElementsAre(box, box));
+  files.Put("/locked.xml", "<GameData/>");
+  files.FailRead("/locked.xml", RuntimeError(75));
+  files.AddFolder("/folder");
+  const std::vector<std::string> paths = {"/missing.xml", "/bad.xml", "/locked.xml", "/folder"};
+  game.GameDate = "before";
+  for (const std::string& path : paths) {
+    dialog.Answers = {path};
+    ASSERT_TRUE(gameFile.AskForGame());
+    EXPECT_FALSE(Load()) << path;
+  }
+  EXPECT_THAT(boxes.Boxes, ElementsAre(box, box, box, box));
+  EXPECT_EQ(game.GameDate, "before");
 }
 
 }  // namespace

@@ -1,8 +1,10 @@
 #include <gmock/gmock.h>
 
-#include <random>
+#include <memory>
 
 #include "core/GameFile.h"
+#include "tests/core/Described.h"
+#include "tests/core/RandomGame.h"
 #include "tests/platform/linux/Thrown.h"
 
 namespace {
@@ -10,19 +12,53 @@ namespace {
 using testing::ElementsAre;
 using testing::IsEmpty;
 
+std::string Repeated(const std::string& text, int times) {
+  std::string repeated;
+  for (int i = 0; i < times; ++i) {
+    repeated += text;
+  }
+  return repeated;
+}
+
+/// `text` as UTF-16 behind its mark.
+std::string InUtf16(const std::u16string& text, bool lowByteFirst) {
+  std::string bytes;
+  for (const char16_t unit : u'\uFEFF' + text) {
+    const char high = static_cast<char>(unit >> 8);
+    const char low = static_cast<char>(unit & 0xFF);
+    bytes += lowByteFirst ? low : high;
+    bytes += lowByteFirst ? high : low;
+  }
+  return bytes;
+}
+
 class Reading : public testing::Test {
  protected:
   bool Read(const std::string& bytes) {
     return ReadGameFile(bytes, game, [this](const std::string& mission) { missions.push_back(mission); });
   }
 
-  /// A game with this text within its only player.
-  bool ReadPlayer(const std::string& contents) {
-    return Read("<GameData><PlayerData><Player>" + contents + "</Player></PlayerData></GameData>");
+  int FaultIn(const std::string& bytes) {
+    return NumberThrownBy([&] { Read(bytes); });
   }
 
-  int FaultOf(const std::string& contents) {
-    return NumberThrownBy([&] { ReadPlayer(contents); });
+  static std::string WithHeader(const std::string& contents) {
+    return "<GameData><GameHeader>" + contents + "</GameHeader></GameData>";
+  }
+
+  /// A game with this text within its only player.
+  static std::string WithPlayer(const std::string& contents) {
+    return "<GameData><PlayerData><Player>" + contents + "</Player></PlayerData></GameData>";
+  }
+
+  static std::string WithHit(const std::string& contents) {
+    return WithPlayer("<Index>1</Index><HitData><HitByPlayer>" + contents + "</HitByPlayer></HitData>");
+  }
+
+  /// Expects the fault with player 1 whose leaf `name` has `text`.
+  void ExpectFault(int number, const std::string& name, const std::string& text) {
+    EXPECT_EQ(FaultIn(WithPlayer("<Index>1</Index><" + name + ">" + text + "</" + name + ">")), number)
+        << name << " is " << text;
   }
 
   StringTable strings{Language::English};
@@ -30,25 +66,85 @@ class Reading : public testing::Test {
   std::vector<std::string> missions;
 };
 
-TEST_F(Reading, GivesDefaultsForAllThatIsMissing) {
+TEST_F(Reading, GivesTheHeaderItsDefaults) {
+  game.ObjectiveTeams(2) = {"Yellow", true, true};
   ASSERT_TRUE(Read("<GameData/>"));
   EXPECT_THAT(missions, ElementsAre("None"));
   EXPECT_EQ(game.GameDate, "N/A");
-  EXPECT_EQ(game.ObjectiveTeams(1).Name, "Red");
-  ASSERT_TRUE(ReadPlayer("<Index>7</Index>"));
-  EXPECT_FALSE(game.Players(7).Active);
-  EXPECT_EQ(game.Players(7).BonusPoints, 0);
-  EXPECT_EQ(game.Players(7).DallasID, "0");
+  EXPECT_EQ(game.ObjectiveTeams(2).Name, "Yellow");
+  EXPECT_TRUE(game.ObjectiveTeams(2).PrimaryAchieved && game.ObjectiveTeams(2).SecondaryAchieved);
+  ASSERT_TRUE(Read(WithHeader("")));
+  EXPECT_THAT(missions, ElementsAre("None", "None"));
+}
+
+TEST_F(Reading, GivesEveryFieldOfAPlayerItsDefault) {
+  FillRandomly(game, PlayerCount, 1);
+  Player& player = game.Players(7);
+  player.AbsoluteDamage = player.TotalDamage = player.Soldiering = player.MemberIndex = 9;
+  player.Rank = 9;
+  Player expected;
+  expected.HitByPlayer = player.HitByPlayer;
+  expected.DallasID = "0";
+  ASSERT_TRUE(Read(WithPlayer("<Index>7</Index>")));
+  EXPECT_EQ(Described(player), Described(expected));
+}
+
+TEST_F(Reading, TakesEveryFieldFromItsLeafInAnyOrder) {
+  ASSERT_TRUE(Read(WithPlayer(
+      "<BonusPoints>-26</BonusPoints><PowerCheatFlag>25</PowerCheatFlag><StunCount>24</StunCount>"
+      "<RadiationDamage>23</RadiationDamage><ExplosiveDamage>22</ExplosiveDamage>"
+      "<DallasID>EFCDAB8967452301</DallasID><MemberIndex>20</MemberIndex><Rank>-19</Rank>"
+      "<Accuracy> .5</Accuracy><PrimaryDamage>17</PrimaryDamage><SecondaryDamage>16</SecondaryDamage>"
+      "<RemainingAmmo>15</RemainingAmmo><RemainingClips>14</RemainingClips>"
+      "<RemainingHealth>13</RemainingHealth><Committed>1</Committed><Active>1</Active>"
+      "<RunCounter>10</RunCounter><DeathCount>9</DeathCount><RespawnCount>8</RespawnCount>"
+      "<AdminKillCount>7</AdminKillCount><AmmoAddCount>6</AmmoAddCount><HealCount>5</HealCount>"
+      "<Soldiering>4</Soldiering><AbsoluteDamage>3</AbsoluteDamage><TotalDamage>-2</TotalDamage>"
+      "<TotalDamage>77</TotalDamage><ShotCount>2147483647</ShotCount>"
+      "<HitData><HitByPlayer><Amount>-5</Amount><PlayerID>x</PlayerID><Index>224</Index></HitByPlayer>"
+      "<HitByPlayer><Index>1</Index><Amount>8</Amount></HitByPlayer>"
+      "<HitByPlayer><Index>1</Index><Amount>6</Amount></HitByPlayer></HitData>"
+      "<PlayerID>Red  0</PlayerID><Index> 40</Index>")));
+  Player expected;
+  expected.ShotCount = 2147483647;
+  expected.TotalDamage = -2;
+  expected.AbsoluteDamage = 3;
+  expected.Soldiering = 4;
+  expected.HealCount = 5;
+  expected.AmmoAddCount = 6;
+  expected.AdminKillCount = 7;
+  expected.RespawnCount = 8;
+  expected.DeathCount = 9;
+  expected.RunCounter = 10;
+  expected.Active = true;
+  expected.Committed = true;
+  expected.RemainingHealth = 13;
+  expected.RemainingClips = 14;
+  expected.RemainingAmmo = 15;
+  expected.SecondaryDamage = 16;
+  expected.PrimaryDamage = 17;
+  expected.Accuracy = 0.5F;
+  expected.Rank = -19;
+  expected.MemberIndex = 20;
+  expected.DallasID = "EFCDAB8967452301";
+  expected.ExplosiveDamage = 22;
+  expected.RadiationDamage = 23;
+  expected.StunCount = 24;
+  expected.PowerCheatFlag = 25;
+  expected.BonusPoints = -26;
+  expected.HitByPlayer(224) = -5;
+  expected.HitByPlayer(1) = 6;
+  EXPECT_EQ(Described(game.Players(40)), Described(expected));
 }
 
 TEST_F(Reading, TakesTheHeader) {
-  ASSERT_TRUE(
-      Read("<GameData><GameHeader><MissionName>Keep</MissionName>"
-           "<Team><Index>x</Index><Name>Blue</Name><PrimaryObjectiveAchieved> 1 </PrimaryObjectiveAchieved>"
-           "<SecondryObjectiveAchieved>0</SecondryObjectiveAchieved></Team>"
-           "<Team><PrimaryObjectiveAchieved>-1</PrimaryObjectiveAchieved>"
-           "<SecondryObjectiveAchieved>1.0</SecondryObjectiveAchieved></Team>"
-           "<GameDate>1/2/2003 4:05</GameDate></GameHeader></GameData>"));
+  ASSERT_TRUE(Read(WithHeader(
+      "<MissionName>Keep</MissionName>"
+      "<Team><Index>x</Index><Name>Blue</Name><PrimaryObjectiveAchieved> 1 </PrimaryObjectiveAchieved>"
+      "<SecondryObjectiveAchieved>0</SecondryObjectiveAchieved></Team>"
+      "<Team><PrimaryObjectiveAchieved>-1</PrimaryObjectiveAchieved>"
+      "<SecondryObjectiveAchieved>1.0</SecondryObjectiveAchieved></Team>"
+      "<GameDate>1/2/2003 4:05</GameDate>")));
   EXPECT_THAT(missions, ElementsAre("Keep"));
   EXPECT_EQ(game.GameDate, "1/2/2003 4:05");
   EXPECT_EQ(game.ObjectiveTeams(1).Name, "Blue");
@@ -57,168 +153,275 @@ TEST_F(Reading, TakesTheHeader) {
   EXPECT_EQ(game.ObjectiveTeams(2).Name, "Error");
   EXPECT_FALSE(game.ObjectiveTeams(2).PrimaryAchieved);
   EXPECT_TRUE(game.ObjectiveTeams(2).SecondaryAchieved);
+  EXPECT_EQ(game.ObjectiveTeams(3).Name, "Yellow");
+}
+
+TEST_F(Reading, CallsForTheMissionBeforeItReadsAnythingElse) {
+  game.GameDate = "before";
+  std::string dateAtTheCall;
+  ASSERT_TRUE(ReadGameFile(WithHeader("<GameDate>after</GameDate><MissionName>Keep</MissionName>"), game,
+                           [&](const std::string&) { dateAtTheCall = game.GameDate; }));
+  EXPECT_EQ(dateAtTheCall, "before");
+}
+
+TEST_F(Reading, TakesTheFirstOfTwoHeadersAndThePlayersOfAllPlayerDatas) {
+  ASSERT_TRUE(
+      Read("<GameData><PlayerData><Player><Index>1</Index><Active>1</Active></Player></PlayerData>"
+           "<GameHeader><MissionName>Keep</MissionName></GameHeader>"
+           "<GameHeader><MissionName>Other</MissionName><GameDate>x</GameDate></GameHeader>"
+           "<PlayerData><Player><Index>2</Index><Active>1</Active></Player></PlayerData></GameData>"));
+  EXPECT_THAT(missions, ElementsAre("Keep"));
+  EXPECT_EQ(game.GameDate, "N/A");
+  EXPECT_TRUE(game.Players(1).Active && game.Players(2).Active);
 }
 
 TEST_F(Reading, FailsWithoutAnObjectiveFlag) {
-  EXPECT_EQ(NumberThrownBy([this] { Read("<GameData><GameHeader><Team/></GameHeader></GameData>"); }), 13);
+  const std::string primary = "<PrimaryObjectiveAchieved>1</PrimaryObjectiveAchieved>";
+  const std::string secondary = "<SecondryObjectiveAchieved>1</SecondryObjectiveAchieved>";
+  EXPECT_EQ(FaultIn(WithHeader("<Team>" + primary + "</Team>")), 13);
+  EXPECT_EQ(FaultIn(WithHeader("<Team>" + secondary + "</Team>")), 13);
+  EXPECT_EQ(FaultIn(WithHeader("<Team>" + primary + "<SecondaryObjectiveAchieved/></Team>")), 13);
+  EXPECT_EQ(FaultIn(WithHeader("<Team>" + primary + secondary + "</Team>")), 0);
 }
 
-TEST_F(Reading, FailsAtAFourthTeam) {
-  const std::string team =
-      "<Team><PrimaryObjectiveAchieved>0</PrimaryObjectiveAchieved>"
-      "<SecondryObjectiveAchieved>0</SecondryObjectiveAchieved></Team>";
-  EXPECT_TRUE(Read("<GameData><GameHeader>" + team + team + team + "</GameHeader></GameData>"));
-  EXPECT_EQ(NumberThrownBy([&] {
-              Read("<GameData><GameHeader>" + team + team + team + team + "</GameHeader></GameData>");
-            }),
-            9);
+TEST_F(Reading, FailsAtAFourthTeamAfterTheFirstThree) {
+  const auto team = [](const std::string& name) {
+    return "<Team><Name>" + name +
+           "</Name><PrimaryObjectiveAchieved>0</PrimaryObjectiveAchieved>"
+           "<SecondryObjectiveAchieved>0</SecondryObjectiveAchieved></Team>";
+  };
+  EXPECT_EQ(FaultIn(WithHeader(team("A") + team("B") + team("C"))), 0);
+  EXPECT_EQ(FaultIn(WithHeader(team("D") + team("E") + team("F") + team("G"))), 9);
+  EXPECT_EQ(game.ObjectiveTeams(3).Name, "F");
 }
 
 TEST_F(Reading, FailsAtAnIndexOutsideTheTable) {
-  EXPECT_EQ(FaultOf(""), 9);
-  EXPECT_EQ(FaultOf("<Index>0</Index>"), 9);
-  EXPECT_EQ(FaultOf("<Index>225</Index>"), 9);
-  EXPECT_EQ(FaultOf("<Index>-1</Index>"), 9);
-  EXPECT_EQ(FaultOf("<Index>seven</Index>"), 13);
-  EXPECT_EQ(FaultOf("<Index>99999999999</Index>"), 6);
-  EXPECT_EQ(FaultOf("<Index>\n 224 </Index>"), 0);
+  EXPECT_EQ(FaultIn(WithPlayer("")), 9);
+  EXPECT_EQ(FaultIn(WithPlayer("<Index>0</Index>")), 9);
+  EXPECT_EQ(FaultIn(WithPlayer("<Index>225</Index>")), 9);
+  EXPECT_EQ(FaultIn(WithPlayer("<Index>-1</Index>")), 9);
+  EXPECT_EQ(FaultIn(WithPlayer("<Index>seven</Index>")), 13);
+  EXPECT_EQ(FaultIn(WithPlayer("<Index></Index>")), 13);
+  EXPECT_EQ(FaultIn(WithPlayer("<Index>1 2</Index>")), 13);
+  EXPECT_EQ(FaultIn(WithPlayer("<Index>99999999999</Index>")), 6);
+  EXPECT_EQ(FaultIn(WithPlayer("<Index>\n 224\t</Index>")), 0);
+}
+
+TEST_F(Reading, FailsAtAHitOutsideTheTable) {
+  EXPECT_EQ(FaultIn(WithHit("")), 9);
+  EXPECT_EQ(FaultIn(WithHit("<Index>225</Index><Amount>1</Amount>")), 9);
+  EXPECT_EQ(FaultIn(WithHit("<Index>x</Index>")), 13);
+  EXPECT_EQ(FaultIn(WithHit("<Index>2</Index><Amount>x</Amount>")), 13);
+  EXPECT_EQ(FaultIn(WithHit("<Index>2</Index><Amount>2147483648</Amount>")), 6);
+}
+
+TEST_F(Reading, FailsAtAFieldThatIsNoNumber) {
+  for (const char* field :
+       {"ShotCount",       "TotalDamage",     "AbsoluteDamage",  "Soldiering",     "HealCount",
+        "AmmoAddCount",    "AdminKillCount",  "RespawnCount",    "DeathCount",     "RunCounter",
+        "Active",          "Committed",       "RemainingHealth", "RemainingClips", "RemainingAmmo",
+        "SecondaryDamage", "PrimaryDamage",   "Accuracy",        "Rank",           "MemberIndex",
+        "ExplosiveDamage", "RadiationDamage", "StunCount",       "PowerCheatFlag", "BonusPoints"}) {
+    ExpectFault(13, field, "many");
+    ExpectFault(13, field, "");
+    ExpectFault(6, field, "1E999");
+  }
 }
 
 TEST_F(Reading, FailsAtAFieldThatDoesNotFit) {
-  EXPECT_EQ(FaultOf("<Index>1</Index><ShotCount>many</ShotCount>"), 13);
-  EXPECT_EQ(FaultOf("<Index>1</Index><ShotCount>2147483648</ShotCount>"), 6);
-  EXPECT_EQ(FaultOf("<Index>1</Index><Rank>32768</Rank>"), 6);
-  EXPECT_EQ(FaultOf("<Index>1</Index><PowerCheatFlag>256</PowerCheatFlag>"), 6);
-  EXPECT_EQ(FaultOf("<Index>1</Index><Accuracy>1E99</Accuracy>"), 6);
-  EXPECT_EQ(FaultOf("<Index>1</Index><Active/>"), 13);
-  EXPECT_EQ(FaultOf("<Index>1</Index><HitData><HitByPlayer/></HitData>"), 9);
-  EXPECT_EQ(FaultOf("<Index>1</Index><HitData><HitByPlayer><Index>2</Index><Amount>x</Amount></HitByPlayer></HitData>"),
-            13);
+  ExpectFault(6, "ShotCount", "2147483648");
+  ExpectFault(0, "ShotCount", "-2147483648");
+  ExpectFault(6, "Rank", "32768");
+  ExpectFault(0, "Rank", "-32768");
+  ExpectFault(6, "PowerCheatFlag", "256");
+  ExpectFault(6, "PowerCheatFlag", "-1");
+  ExpectFault(6, "Accuracy", "1E39");
+  ExpectFault(0, "Accuracy", "3E38");
+}
+
+TEST_F(Reading, RoundsFractionsToTheEvenNumber) {
+  ASSERT_TRUE(
+      Read(WithPlayer("<Index>1.5</Index><ShotCount>2.5</ShotCount><HealCount>3.5</HealCount>"
+                      "<DeathCount>-2.5</DeathCount>")));
+  EXPECT_EQ(game.Players(2).ShotCount, 2);
+  EXPECT_EQ(game.Players(2).HealCount, 4);
+  EXPECT_EQ(game.Players(2).DeathCount, -2);
 }
 
 TEST_F(Reading, KeepsWhatWasReadBeforeAFault) {
-  EXPECT_EQ(NumberThrownBy([this] {
-              Read("<GameData><PlayerData><Player><Index>1</Index><ShotCount>5</ShotCount></Player>"
-                   "<Player><Index>0</Index></Player></PlayerData></GameData>");
-            }),
-            9);
+  EXPECT_EQ(FaultIn("<GameData><GameHeader><GameDate>x</GameDate></GameHeader><PlayerData>"
+                    "<Player><Index>1</Index><ShotCount>5</ShotCount></Player>"
+                    "<Player><Index>2</Index><ShotCount>6</ShotCount><HealCount>y</HealCount></Player>"
+                    "<Player><Index>3</Index><ShotCount>7</ShotCount></Player></PlayerData></GameData>"),
+            13);
+  EXPECT_EQ(game.GameDate, "x");
   EXPECT_EQ(game.Players(1).ShotCount, 5);
+  EXPECT_EQ(game.Players(2).ShotCount, 6);
+  EXPECT_EQ(game.Players(3).ShotCount, 0);
 }
 
 TEST_F(Reading, TakesFlagsForTrueOnlyWhenTheyAreOne) {
-  ASSERT_TRUE(ReadPlayer("<Index>1</Index><Active>1</Active><Committed>2</Committed>"));
-  EXPECT_TRUE(game.Players(1).Active);
-  EXPECT_FALSE(game.Players(1).Committed);
-}
-
-TEST_F(Reading, TakesTheFirstOfTwoLeaves) {
-  ASSERT_TRUE(ReadPlayer("<Index>1</Index><ShotCount>1</ShotCount><ShotCount>2</ShotCount>"));
-  EXPECT_EQ(game.Players(1).ShotCount, 1);
+  const std::pair<const char*, bool> cases[] = {{"1", true},    {" 1 ", true}, {"1.0", true}, {"+1", true},
+                                                {"2", false},   {"-1", false}, {"0", false},  {"1.2", false},
+                                                {"0.6", false}, {"10", false}};
+  for (const auto& [text, expected] : cases) {
+    const std::string value = text;
+    ASSERT_TRUE(Read(
+        WithPlayer("<Index>1</Index><Active>" + value + "</Active><Committed>" + value + "</Committed>")));
+    EXPECT_EQ(game.Players(1).Active, expected) << text;
+    EXPECT_EQ(game.Players(1).Committed, expected) << text;
+  }
+  ExpectFault(13, "Active", "True");
 }
 
 TEST_F(Reading, FindsHitDataAtAnyDepth) {
-  ASSERT_TRUE(
-      ReadPlayer("<Index>1</Index><HitData><HitByPlayer><Index> 3</Index><Amount> 9</Amount></HitByPlayer></HitData>"
-                 "<Deeper><HitData><HitByPlayer><Index>4</Index></HitByPlayer></HitData></Deeper>"
-                 "<HitByPlayer><Index>5</Index><Amount>8</Amount></HitByPlayer>"));
+  ASSERT_TRUE(Read(WithPlayer(
+      "<Index>1</Index><HitData><HitByPlayer><Index> 3</Index><Amount> 9</Amount></HitByPlayer></HitData>"
+      "<Deeper><HitData><Index>9</Index><HitByPlayer><Index>4</Index><Amount>2</Amount></HitByPlayer></"
+      "HitData></Deeper>"
+      "<HitData><HitByPlayer><Index>6</Index></HitByPlayer></HitData>"
+      "<HitByPlayer><Index>5</Index><Amount>8</Amount></HitByPlayer>"
+      "<HitData><Other><HitByPlayer><Index>7</Index><Amount>8</Amount></HitByPlayer></Other></HitData>")));
   EXPECT_EQ(game.Players(1).HitByPlayer(3), 9);
-  EXPECT_EQ(game.Players(1).HitByPlayer(4), 0);
-  EXPECT_EQ(game.Players(1).HitByPlayer(5), 0);
+  EXPECT_EQ(game.Players(1).HitByPlayer(4), 2);
+  for (const int none : {5, 6, 7, 9}) {
+    EXPECT_EQ(game.Players(1).HitByPlayer(none), 0) << none;
+  }
 }
 
 TEST_F(Reading, JoinsTextAroundCommentsAndSections) {
-  ASSERT_TRUE(ReadPlayer("<Index>1<!-- one -->2</Index><DallasID><![CDATA[AB]]>CD</DallasID>"));
-  EXPECT_EQ(game.Players(12).DallasID, "ABCD");
+  ASSERT_TRUE(
+      Read(WithPlayer("<Index>1<!-- one -->2</Index><DallasID><![CDATA[<AB>]]>C<?pi x?>D</DallasID>")));
+  EXPECT_EQ(game.Players(12).DallasID, "<AB>CD");
 }
 
-TEST_F(Reading, RefusesWhatIsNoGameFile) {
+TEST_F(Reading, KeepsBlanksWithinTexts) {
+  ASSERT_TRUE(Read(WithHeader("<MissionName> a  b </MissionName><GameDate>  </GameDate>")));
+  EXPECT_THAT(missions, ElementsAre(" a  b "));
+  EXPECT_EQ(game.GameDate, "  ");
+}
+
+TEST_F(Reading, TakesCharactersByReference) {
+  ASSERT_TRUE(Read(WithHeader("<MissionName>&lt;&amp;&gt;&quot;&apos;&#x4EFB;&#20219;</MissionName>")));
+  EXPECT_THAT(missions, ElementsAre("<&>\"'任任"));
+}
+
+TEST_F(Reading, OfAReferenceToNoCharacterDoesNotSpoilTheNextSavedFile) {
+  ASSERT_TRUE(Read(WithHeader("<MissionName>任</MissionName><GameDate>&#xD800;</GameDate>")));
+  ASSERT_TRUE(Read(WriteGameFile(game, missions[0])));
+  EXPECT_THAT(missions, ElementsAre("任", "任"));
+}
+
+TEST_F(Reading, RefusesWhatIsNoGameFileAndChangesNothing) {
+  FillRandomly(game, 20, 2);
+  game.GameDate = "before";
+  const std::string before = Described(game);
   const std::string bad[] = {"",
                              "   ",
                              "no XML",
                              "<GameData>",
+                             "<GameData",
                              "<GameData><PlayerData></GameData></PlayerData>",
+                             "<GameData></gamedata>",
                              "<Playlist/>",
+                             "<Playlist><GameData/></Playlist>",
                              "<gamedata/>",
+                             "<!-- only --><?xml version=\"1.0\"?>",
                              "<GameData/><GameData/>",
+                             "<Other/><GameData/>",
                              "text <GameData/>",
                              "<GameData/> text",
+                             "<![CDATA[x]]><GameData/>",
                              std::string("<GameData/>\0", 12),
+                             std::string("<GameData>\0</GameData>", 22),
                              std::string(1000, '\0'),
+                             "\xFF\xFE",
+                             "\xFE\xFF\x3C",
+                             "\xEF\xBB\xBF",
                              "\x89PNG\r\n\x1a\n"};
   for (const std::string& bytes : bad) {
     EXPECT_FALSE(Read(bytes)) << bytes;
   }
   EXPECT_THAT(missions, IsEmpty());
+  EXPECT_EQ(Described(game), before);
 }
 
 TEST_F(Reading, RefusesAGameCutShortAnywhere) {
   game.Players(1).Active = true;
-  const std::string whole = WriteGameFile(game, "None");
-  Game other(strings);
+  game.Players(1).HitByPlayer(2) = 5;
+  const std::string whole = WriteGameFile(game, "任务");
+  const std::string before = Described(game);
   for (std::size_t size = 0; size < whole.size(); ++size) {
-    ASSERT_FALSE(ReadGameFile(whole.substr(0, size), other, [](const std::string&) {})) << size;
+    ASSERT_FALSE(Read(whole.substr(0, size))) << size;
   }
+  EXPECT_EQ(Described(game), before);
+  EXPECT_TRUE(Read(whole));
 }
 
 TEST_F(Reading, TakesDeclarationsCommentsAndMarks) {
-  EXPECT_TRUE(Read("\xEF\xBB\xBF<?xml version=\"1.0\"?><!-- game --><GameData/>\r\n"));
+  EXPECT_TRUE(Read(
+      "\xEF\xBB\xBF<?xml version=\"1.0\"?>\r\n<!-- game -->\r\n<!DOCTYPE GameData><GameData a=\"1\"/>\r\n"));
+  EXPECT_TRUE(Read("\n  <GameData></GameData>  \n<!-- end -->"));
 }
 
 TEST_F(Reading, TakesWindows1252AndUtf16) {
-  ASSERT_TRUE(Read("<GameData><GameHeader><MissionName>Caf\xE9</MissionName></GameHeader></GameData>"));
-  const std::u16string wide = u"<GameData><GameHeader><MissionName>任务</MissionName></GameHeader></GameData>";
-  std::string bytes = "\xFF\xFE";
-  for (const char16_t unit : wide) {
-    bytes += {static_cast<char>(unit & 255), static_cast<char>(unit >> 8)};
-  }
-  ASSERT_TRUE(Read(bytes));
-  EXPECT_THAT(missions, ElementsAre("Café", "任务"));
+  ASSERT_TRUE(Read(WithHeader("<MissionName>Caf\xE9 \x80</MissionName>")));
+  const std::u16string wide =
+      u"<GameData><GameHeader><MissionName>任务𝄞</MissionName></GameHeader></GameData>";
+  ASSERT_TRUE(Read(InUtf16(wide, true)));
+  ASSERT_TRUE(Read(InUtf16(wide, false)));
+  EXPECT_THAT(missions, ElementsAre("Café €", "任务𝄞", "任务𝄞"));
 }
 
-TEST_F(Reading, SurvivesDeepNesting) {
-  constexpr int depth = 300'000;
-  std::string open;
-  std::string close;
-  for (int i = 0; i < depth; ++i) {
-    open += "<a>";
-    close += "</a>";
-  }
-  EXPECT_TRUE(ReadPlayer("<Index>1</Index>" + open + close));
+TEST_F(Reading, SurvivesAMillionLevels) {
+  constexpr int depth = 1'000'000;
+  const std::string open = Repeated("<a>", depth);
+  const std::string close = Repeated("</a>", depth);
+  EXPECT_TRUE(Read(WithPlayer("<Index>1</Index>" + open + close)));
   EXPECT_FALSE(Read("<GameData>" + open));
+  EXPECT_FALSE(Read(open + close));
+  const std::string hits = Repeated("<HitData><HitByPlayer><Amount>2</Amount><Index>1", depth / 3);
+  const std::string ends = Repeated("</Index></HitByPlayer></HitData>", depth / 3);
+  EXPECT_TRUE(Read(WithPlayer("<Index>1</Index>" + hits + ends)));
+  EXPECT_EQ(game.Players(1).HitByPlayer(1), 2);
+  EXPECT_EQ(FaultIn(WithHeader("<Team><Name>" + open + close + "</Name></Team>")), 13);
 }
 
 TEST_F(Reading, GivesBackEveryFieldOfASavedGame) {
-  std::mt19937 random(5);
-  const auto any = [&random](int most) { return static_cast<std::int32_t>(random() % (most + 1u)); };
-  for (int index = 1; index <= PlayerCount; index += 3) {
-    Player& player = game.Players(index);
-    player.Active = true;
-    for (std::int32_t* field :
-         {&player.ShotCount, &player.TotalDamage, &player.Soldiering, &player.HealCount, &player.AmmoAddCount,
-          &player.AdminKillCount, &player.RespawnCount, &player.RemainingHealth, &player.RemainingClips,
-          &player.RemainingAmmo, &player.DeathCount, &player.SecondaryDamage, &player.PrimaryDamage, &player.RunCounter,
-          &player.MemberIndex, &player.BonusPoints, &player.ExplosiveDamage, &player.RadiationDamage,
-          &player.StunCount}) {
-      *field = any(100'000) - 50'000;
+  for (const int count : {0, 1, 75, PlayerCount}) {
+    const auto saved = std::make_unique<Game>(strings);
+    FillRandomly(*saved, count, static_cast<unsigned>(count));
+    saved->GameDate = "2026/11/21 下午 3:05";
+    saved->ObjectiveTeams(1) = {"红队", true, false};
+    saved->ObjectiveTeams(3) = {"Blue", false, true};
+    int number = 0;
+    for (Player& player : saved->Players) {
+      ++number;
+      player.TotalDamage = player.Soldiering = -number;
+      player.MemberIndex = player.Rank = static_cast<std::int16_t>(number);
+      player.DallasID = "EFCDAB89674523" + std::to_string(10 + number % 90);
     }
-    player.Accuracy = static_cast<float>(any(64)) / 64;
-    player.Rank = static_cast<std::int16_t>(any(224));
-    player.Committed = any(1) == 1;
-    player.DallasID = "EFCDAB8967452301";
-    player.PowerCheatFlag = static_cast<std::uint8_t>(any(255));
-    for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
-      player.HitByPlayer(shooter) = any(9);
+    const auto loaded = std::make_unique<Game>(strings);
+    ASSERT_TRUE(ReadGameFile(WriteGameFile(*saved, "城堡 & <夜>"), *loaded,
+                             [this](const std::string& mission) { missions.push_back(mission); }));
+    EXPECT_EQ(missions.back(), "城堡 & <夜>");
+    for (Player& player : saved->Players) {
+      if (!player.Active) {
+        player = Player();
+      }
     }
+    EXPECT_EQ(Described(*loaded), Described(*saved));
   }
+}
+
+TEST_F(Reading, LosesNegativeHitsOfASavedGame) {
+  game.Players(1).Active = true;
   game.Players(1).HitByPlayer(9) = -4;
-  game.ObjectiveTeams(1).Name = "红队";
-  game.GameDate = "2026/11/21 下午 3:05";
-  const std::string saved = WriteGameFile(game, "城堡 & <夜>");
+  game.Players(1).HitByPlayer(10) = 4;
   Game loaded(strings);
-  ASSERT_TRUE(ReadGameFile(saved, loaded, [this](const std::string& mission) { missions.push_back(mission); }));
-  EXPECT_THAT(missions, ElementsAre("城堡 & <夜>"));
+  ASSERT_TRUE(ReadGameFile(WriteGameFile(game, "None"), loaded, [](const std::string&) {}));
   EXPECT_EQ(loaded.Players(1).HitByPlayer(9), 0);
-  EXPECT_EQ(WriteGameFile(loaded, "城堡 & <夜>"), saved);
+  EXPECT_EQ(loaded.Players(1).HitByPlayer(10), 4);
 }
 
 }  // namespace

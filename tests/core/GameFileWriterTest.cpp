@@ -1,39 +1,50 @@
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
+
+#include <utility>
 
 #include "core/GameFile.h"
 
 namespace {
 
-/// One leaf as it stands in the file.
-std::string Leaf(const std::string& name, const std::string& text) {
-  return "    <" + name + ">" + text + "</" + name + ">\r\n";
-}
+using testing::HasSubstr;
+using testing::Not;
+using testing::StartsWith;
 
 class Writing : public testing::Test {
  protected:
+  /// The file as it is to be, line by line: a line ends in CR LF behind each leaf and nowhere else.
+  static std::string WithFileBreaks(const std::string& lines) {
+    std::string bytes;
+    for (const char letter : lines) {
+      bytes += letter == '\n' ? "\r\n" : std::string(1, letter);
+    }
+    return bytes;
+  }
+
+  std::string Written() const { return WriteGameFile(game, "None"); }
+
   StringTable strings{Language::English};
   Game game{strings};
 };
 
 TEST_F(Writing, OfAGameWithoutPlayersLeavesPlayerDataEmpty) {
   game.GameDate = "21/05/2013 14:30";
+  game.Players(3).ShotCount = 5;  // not active
   game.ObjectiveTeams(2).Name = "Red";
   game.ObjectiveTeams(2).PrimaryAchieved = true;
   game.ObjectiveTeams(3).SecondaryAchieved = true;
-  const std::string expected =
-      "<GameData><GameHeader>" + Leaf("MissionName", "None") +                                                      //
-      "<Team>" + Leaf("PrimaryObjectiveAchieved", "0") + Leaf("SecondryObjectiveAchieved", "0") +                   //
-      Leaf("Name", "Red") + "</Team>" +                                                                             //
-      "<Team>" + Leaf("PrimaryObjectiveAchieved", "1") + Leaf("SecondryObjectiveAchieved", "0") +                   //
-      Leaf("Name", "Red") + "</Team>" +                                                                             //
-      "<Team>" + Leaf("PrimaryObjectiveAchieved", "0") + Leaf("SecondryObjectiveAchieved", "1") +                   //
-      Leaf("Name", "Yellow") + "</Team>" + Leaf("GameDate", "21/05/2013 14:30") + "</GameHeader><PlayerData/>" +  //
-      "</GameData>";
-  std::string written = WriteGameFile(game, "None");
-  if (const auto at = written.find("<PlayerData />"); at != std::string::npos) {
-    written.erase(at + 11, 1);
-  }
-  EXPECT_EQ(written, expected);
+  EXPECT_EQ(Written(), WithFileBreaks(R"(<GameData><GameHeader>    <MissionName>None</MissionName>
+<Team>    <PrimaryObjectiveAchieved>0</PrimaryObjectiveAchieved>
+    <SecondryObjectiveAchieved>0</SecondryObjectiveAchieved>
+    <Name>Red</Name>
+</Team><Team>    <PrimaryObjectiveAchieved>1</PrimaryObjectiveAchieved>
+    <SecondryObjectiveAchieved>0</SecondryObjectiveAchieved>
+    <Name>Red</Name>
+</Team><Team>    <PrimaryObjectiveAchieved>0</PrimaryObjectiveAchieved>
+    <SecondryObjectiveAchieved>1</SecondryObjectiveAchieved>
+    <Name>Yellow</Name>
+</Team>    <GameDate>21/05/2013 14:30</GameDate>
+</GameHeader><PlayerData></PlayerData></GameData>)"));
 }
 
 TEST_F(Writing, PutsEveryFieldOfAPlayerInItsPlace) {
@@ -41,6 +52,7 @@ TEST_F(Writing, PutsEveryFieldOfAPlayerInItsPlace) {
   player.Active = true;
   player.HitByPlayer(1) = 25;
   player.HitByPlayer(2) = -3;
+  player.HitByPlayer(40) = 1;
   player.HitByPlayer(224) = 7;
   player.ShotCount = 42;
   player.TotalDamage = -60;
@@ -67,29 +79,101 @@ TEST_F(Writing, PutsEveryFieldOfAPlayerInItsPlace) {
   player.StunCount = 19;
   player.PowerCheatFlag = 200;
   player.BonusPoints = -20;
-  game.Players(41).ShotCount = 5;  // not active
-  const std::string expected =
-      "<PlayerData><Player>" + Leaf("Index", " 40") + Leaf("PlayerID", "Blue  7") + "<HitData>" +             //
-      "<HitByPlayer>" + Leaf("Index", " 1") + Leaf("PlayerID", "Red  0") + Leaf("Amount", " 25") +            //
-      "</HitByPlayer>" +                                                                                      //
-      "<HitByPlayer>" + Leaf("Index", " 224") + Leaf("PlayerID", "Blue  95") + Leaf("Amount", " 7") +         //
-      "</HitByPlayer></HitData>" +                                                                            //
-      Leaf("ShotCount", " 42") + Leaf("TotalDamage", "-60") + Leaf("TotalDamage", "-60") +                    //
-      Leaf("Soldiering", " 3") + Leaf("HealCount", " 4") + Leaf("AmmoAddCount", " 5") +                       //
-      Leaf("AdminKillCount", " 6") + Leaf("RespawnCount", " 7") + Leaf("DeathCount", " 8") +                  //
-      Leaf("RunCounter", " 9") + Leaf("Active", "1") + Leaf("Committed", "1") + Leaf("RemainingHealth", " 10") +  //
-      Leaf("RemainingClips", " 11") + Leaf("RemainingAmmo", " 12") + Leaf("SecondaryDamage", " 13") +         //
-      Leaf("PrimaryDamage", " 14") + Leaf("Accuracy", " .5") + Leaf("Rank", " 15") +                          //
-      Leaf("MemberIndex", " 16") + Leaf("DallasID", "EFCDAB8967452301") + Leaf("ExplosiveDamage", " 17") +    //
-      Leaf("RadiationDamage", " 18") + Leaf("StunCount", " 19") + Leaf("PowerCheatFlag", " 200") +            //
-      Leaf("BonusPoints", "-20") + "</Player></PlayerData></GameData>";
-  const std::string written = WriteGameFile(game, "None");
-  EXPECT_EQ(written.substr(written.find("<PlayerData>")), expected);
+  const std::string written = Written();
+  EXPECT_EQ(written.substr(written.find("<PlayerData>")),
+            WithFileBreaks(R"(<PlayerData><Player>    <Index> 40</Index>
+    <PlayerID>Blue  7</PlayerID>
+<HitData><HitByPlayer>    <Index> 1</Index>
+    <PlayerID>Red  0</PlayerID>
+    <Amount> 25</Amount>
+</HitByPlayer><HitByPlayer>    <Index> 40</Index>
+    <PlayerID>Blue  7</PlayerID>
+    <Amount> 1</Amount>
+</HitByPlayer><HitByPlayer>    <Index> 224</Index>
+    <PlayerID>Blue  95</PlayerID>
+    <Amount> 7</Amount>
+</HitByPlayer></HitData>    <ShotCount> 42</ShotCount>
+    <TotalDamage>-60</TotalDamage>
+    <TotalDamage>-60</TotalDamage>
+    <Soldiering> 3</Soldiering>
+    <HealCount> 4</HealCount>
+    <AmmoAddCount> 5</AmmoAddCount>
+    <AdminKillCount> 6</AdminKillCount>
+    <RespawnCount> 7</RespawnCount>
+    <DeathCount> 8</DeathCount>
+    <RunCounter> 9</RunCounter>
+    <Active>1</Active>
+    <Committed>1</Committed>
+    <RemainingHealth> 10</RemainingHealth>
+    <RemainingClips> 11</RemainingClips>
+    <RemainingAmmo> 12</RemainingAmmo>
+    <SecondaryDamage> 13</SecondaryDamage>
+    <PrimaryDamage> 14</PrimaryDamage>
+    <Accuracy> .5</Accuracy>
+    <Rank> 15</Rank>
+    <MemberIndex> 16</MemberIndex>
+    <DallasID>EFCDAB8967452301</DallasID>
+    <ExplosiveDamage> 17</ExplosiveDamage>
+    <RadiationDamage> 18</RadiationDamage>
+    <StunCount> 19</StunCount>
+    <PowerCheatFlag> 200</PowerCheatFlag>
+    <BonusPoints>-20</BonusPoints>
+</Player></PlayerData></GameData>)"));
+}
+
+TEST_F(Writing, ListsPlayersByIndexWithOrWithoutHits) {
+  game.Players(105).Active = true;
+  game.Players(2).Active = true;
+  const std::string written = Written();
+  const std::size_t red1 =
+      written.find("<Player>    <Index> 2</Index>\r\n    <PlayerID>Red  1</PlayerID>\r\n");
+  const std::size_t red40 =
+      written.find("<Player>    <Index> 105</Index>\r\n    <PlayerID>Red  40</PlayerID>\r\n");
+  ASSERT_NE(red40, std::string::npos);
+  EXPECT_LT(red1, red40);
+  EXPECT_THAT(written.substr(red40),
+              HasSubstr("</PlayerID>\r\n<HitData></HitData>    <ShotCount> 0</ShotCount>"));
+  EXPECT_THAT(written.substr(red40), HasSubstr("    <Committed>0</Committed>\r\n"));
+  EXPECT_THAT(written.substr(red40), HasSubstr("    <DallasID>0000000000000000</DallasID>\r\n"));
+}
+
+TEST_F(Writing, LeavesOutDeclarationAndAbsoluteDamage) {
+  game.Players(1).Active = true;
+  EXPECT_THAT(Written(), StartsWith("<GameData>"));
+  EXPECT_THAT(Written(), Not(HasSubstr("AbsoluteDamage")));
+}
+
+TEST_F(Writing, GivesAnAccuracyAtMostSevenDigitsAndNoZeroBeforeThePoint) {
+  const std::pair<float, const char*> cases[] = {
+      {0, " 0"},       {1, " 1"},         {1.0F / 3, " .3333333"},
+      {0.25F, " .25"}, {-0.5F, "-.5"},    {1234567.25F, " 1234567"},
+      {2.5F, " 2.5"},  {1E-5F, " 1E-05"}, {0.0264496896F, " .02644969"}};
+  for (const auto& [accuracy, text] : cases) {
+    game.Players(1).Active = true;
+    game.Players(1).Accuracy = accuracy;
+    EXPECT_THAT(Written(), HasSubstr("<Accuracy>" + std::string(text) + "</Accuracy>"));
+  }
 }
 
 TEST_F(Writing, EscapesWhatXmlReserves) {
-  EXPECT_NE(WriteGameFile(game, "Cat & <Mouse>").find("<MissionName>Cat &amp; &lt;Mouse&gt;</MissionName>"),
-            std::string::npos);
+  game.ObjectiveTeams(1).Name = "<]]>";
+  game.GameDate = "a & \"b\" 'c'\rd";
+  const std::string written = WriteGameFile(game, "Cat & <Mouse>");
+  EXPECT_THAT(written, HasSubstr("<MissionName>Cat &amp; &lt;Mouse&gt;</MissionName>"));
+  EXPECT_THAT(written, HasSubstr("<Name>&lt;]]&gt;</Name>"));
+  EXPECT_THAT(written, HasSubstr("<GameDate>a &amp; \"b\" 'c'&#13;d</GameDate>"));
+}
+
+TEST_F(Writing, IsInUtf8) {
+  const StringTable chinese(Language::SimplifiedChinese);
+  Game chineseGame(chinese);
+  chineseGame.Players(40).Active = true;
+  chineseGame.Players(40).HitByPlayer(1) = 5;
+  const std::string written = WriteGameFile(chineseGame, "城堡");
+  EXPECT_THAT(written, HasSubstr("<MissionName>城堡</MissionName>"));
+  EXPECT_THAT(written, HasSubstr("<Name>红队</Name>"));
+  EXPECT_THAT(written, HasSubstr("<PlayerID>蓝队  7</PlayerID>"));
+  EXPECT_THAT(written, HasSubstr("<PlayerID>红队  0</PlayerID>"));
 }
 
 }  // namespace

@@ -2,8 +2,8 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
-
+#include "tests/core/Described.h"
+#include "tests/core/RandomGame.h"
 #include "tests/platform/linux/Thrown.h"
 
 namespace {
@@ -29,26 +29,44 @@ TEST(Game, NamesAPlayerWithTwoBlanksBeforeTheNumber) {
   EXPECT_EQ(game.DisplayName(224), "Blue  95");
 }
 
+TEST(Game, CarriesTheTeamsInTheLanguageOfItsTexts) {
+  const StringTable strings(Language::SimplifiedChinese);
+  const Game game(strings);
+  EXPECT_EQ(game.TeamNames(3), "黄队");
+  EXPECT_EQ(game.ObjectiveTeams(1).Name, "红队");
+  EXPECT_EQ(game.DisplayName(65), "黄队  0");
+}
+
+TEST(Game, HasAnEmptyRecordForEachGunAtFirst) {
+  const StringTable strings(Language::English);
+  const Game game(strings);
+  EXPECT_EQ(game.Players.end() - game.Players.begin(), 224);
+  for (const Player& player : game.Players) {
+    EXPECT_EQ(Described(player), Described(Player()));
+  }
+  EXPECT_EQ(Player().DallasID, "0000000000000000");
+}
+
 TEST(ClearedGame, KeepsOnlyAbsoluteDamageAndAccuracyOfAPlayer) {
   const StringTable strings(Language::English);
   Game game(strings);
-  Player& player = game.Players(5);
-  player.HitByPlayer(7) = 3;
-  player.ShotCount = player.Soldiering = player.BonusPoints = player.MemberIndex = 9;
-  player.AbsoluteDamage = 11;
-  player.Accuracy = 0.5F;
-  player.Active = player.Committed = true;
-  player.Rank = 4;
-  player.DallasID = "AA00000000000001";
+  FillRandomly(game, PlayerCount, 4);
+  for (Player& player : game.Players) {
+    player.TotalDamage = player.Soldiering = player.MemberIndex = 9;
+    player.AbsoluteDamage = 11;
+    player.Rank = 4;
+    player.DallasID = "AA00000000000001";
+    player.Accuracy = 0.5F;
+  }
   game.GameDate = "today";
   game.DataPresent = true;
   game.Clear();
-  EXPECT_EQ(player.HitByPlayer(7) + player.ShotCount + player.Soldiering + player.BonusPoints + player.MemberIndex, 0);
-  EXPECT_FALSE(player.Active || player.Committed);
-  EXPECT_EQ(player.Rank, 0);
-  EXPECT_EQ(player.DallasID, "0000000000000000");
-  EXPECT_EQ(player.AbsoluteDamage, 11);
-  EXPECT_EQ(player.Accuracy, 0.5F);
+  Player expected;
+  expected.AbsoluteDamage = 11;
+  expected.Accuracy = 0.5F;
+  for (const Player& player : game.Players) {
+    ASSERT_EQ(Described(player), Described(expected));
+  }
   EXPECT_TRUE(game.GameDate.empty());
   EXPECT_FALSE(game.DataPresent);
 }
@@ -68,7 +86,10 @@ TEST(OneBased, RefusesIndexesOutsideWith9) {
   table(1) = 10;
   table(3) = 30;
   EXPECT_EQ(*table.begin(), 10);
+  EXPECT_EQ(*(table.end() - 1), 30);
+  EXPECT_EQ(table(2), 0);
   EXPECT_EQ(NumberThrownBy([&table] { table(0) = 1; }), 9);
+  EXPECT_EQ(NumberThrownBy([&table] { table(-1) = 1; }), 9);
   EXPECT_EQ(NumberThrownBy([&table] { table(4) = 1; }), 9);
 }
 

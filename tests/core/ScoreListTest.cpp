@@ -10,7 +10,10 @@ class Sorting : public testing::Test {
  protected:
   /// Rows of rank text, player and one figure.
   void Add(const std::string& rank, const std::string& player, const std::string& figure) {
-    list.AddRow({rank, player, figure});
+    ScoreList::Row& row = list.AddRow();
+    row.Cells[0] = rank;
+    row.Cells[1] = player;
+    row.Cells[2] = figure;
   }
 
   std::vector<std::string> Column(int column) const {
@@ -26,7 +29,9 @@ class Sorting : public testing::Test {
   ScoreList list;
 };
 
-TEST_F(Sorting, IsDescendingAtFirst) { EXPECT_EQ(list.SortOrder, SortOrder::Descending); }
+TEST_F(Sorting, IsDescendingAtFirst) {
+  EXPECT_EQ(list.SortOrder, SortOrder::Descending);
+}
 
 TEST_F(Sorting, GoesByNumberAndNotByText) {
   for (const char* figure : {" 9", " 10", "-1", "-20", " 0"}) {
@@ -85,6 +90,65 @@ TEST_F(Sorting, ByRankWritesEachPlaceIntoTheRecordOfThatNumber) {
   EXPECT_EQ(game.Players(1).Rank, 1);
   EXPECT_EQ(game.Players(2).Rank, 2);
   EXPECT_EQ(game.Players(37).Rank, 0);
+}
+
+TEST_F(Sorting, PutsEmptyCellsAndBrokenNumbersBelowAllNumbers) {
+  for (const char* figure : {"", "-2000000000", "5%%", "%", "7x"}) {
+    Add(" 0", "Red  1", figure);
+  }
+  SortListNumeric(list, 2, false, game);
+  EXPECT_THAT(Column(2), ElementsAre("7x", "-2000000000", "", "5%%", "%"));
+}
+
+TEST_F(Sorting, TakesNoPercentageInTheRowText) {
+  for (const char* rank : {"9%", "3", "12"}) {
+    Add(rank, "Red  1", " 0");
+  }
+  SortListNumeric(list, 0, false, game);
+  EXPECT_THAT(Column(0), ElementsAre("12", "3", "9%"));
+}
+
+TEST_F(Sorting, TellsNearPercentagesApart) {
+  for (const char* figure : {"9.99%", "10.00%", "9.98%", ".50%"}) {
+    Add(" 0", "Red  1", figure);
+  }
+  SortListNumeric(list, 2, false, game);
+  EXPECT_THAT(Column(2), ElementsAre("10.00%", "9.99%", "9.98%", ".50%"));
+}
+
+TEST_F(Sorting, WithRanksNumbersTheRowsAndFindsTheRecordsByTeamAndNumber) {
+  Add(" 0", "Red  31", " 1");
+  Add(" 0", "  Blue  0: 12 ", " 2");
+  Add(" 0", "Yellow  5", " 3");
+  Add(" 0", "Green  6", " 4");
+  Add(" 0", "Red  40: Bo", " 5");
+  Add(" 0", "Blue", " 6");
+  SortListNumeric(list, 2, true, game);
+  EXPECT_THAT(Column(0), ElementsAre("1", "2", "3", "4", "5", "6"));
+  const std::pair<int, int> ranks[] = {{41, 2}, {71, 3}, {70, 4}, {33, 5}, {32, 6}};
+  int written = 0;
+  for (const auto& [record, rank] : ranks) {
+    EXPECT_EQ(game.Players(record).Rank, rank) << record;
+  }
+  for (const Player& player : game.Players) {
+    written += player.Rank != 0 ? 1 : 0;
+  }
+  EXPECT_EQ(written, 5);
+}
+
+TEST_F(Sorting, ByRankGoesUpwardByNumber) {
+  for (const char* rank : {"10", "9", "1"}) {
+    Add(rank, "Red  " + std::string(rank), " 5");
+  }
+  SortByHeader(list, 1, game);
+  EXPECT_THAT(Column(1), ElementsAre("Red  1", "Red  9", "Red  10"));
+}
+
+TEST_F(Sorting, OfAnEmptyListIsNoFault) {
+  for (int header = 1; header <= 9; ++header) {
+    SortByHeader(list, header, game);
+  }
+  EXPECT_TRUE(list.Rows().empty());
 }
 
 TEST_F(Sorting, SetsTheDirectionByHeader) {

@@ -39,6 +39,16 @@ class ScoredGame {
     ExecuteSql(MembersFile(), ReadFile(std::string(TESSARINE_RESOURCES) + "/members_default.sql"));
   }
 
+  /// Adds a mission: its quoted name, then the points of the sets A, B, C (primary, secondary), respawn and
+  /// heal penalty.
+  void AddMission(const std::string& values) {
+    ExecuteSql(ScenariosFile(),
+               "INSERT INTO Table1 (MissionName, PrimaryObjectivePointsA, SecondaryObjectivePointsA, "
+               "PrimaryObjectivePointsB, SecondaryObjectivePointsB, PrimaryObjectivePointsC, "
+               "SecondaryObjectivePointsC, RespawnPenalty, HealPenalty) VALUES (" +
+                   values + ")");
+  }
+
   std::string ScenariosFile() const { return Folder / "scenarios.mdb"; }
   std::string MembersFile() const { return Folder / "members.mdb"; }
 
@@ -76,6 +86,9 @@ class ScoredGame {
     return cells;
   }
 
+  std::vector<std::vector<std::string>> BoardCells() const { return CellsOf(Board, BoardColumnCount); }
+  std::vector<std::vector<std::string>> TeamCells() const { return CellsOf(Teams, TeamColumnCount); }
+
   std::string Cell(std::size_t row, BoardColumn column) const {
     return Board.Rows().at(row).Cells[static_cast<std::size_t>(column)];
   }
@@ -83,6 +96,14 @@ class ScoredGame {
   TemporaryFolder Folder;
 
  private:
+  static std::vector<std::vector<std::string>> CellsOf(const ScoreList& list, int columns) {
+    std::vector<std::vector<std::string>> cells;
+    for (const ScoreList::Row& row : list.Rows()) {
+      cells.emplace_back(row.Cells.begin(), row.Cells.begin() + columns);
+    }
+    return cells;
+  }
+
   SqliteEngine engine_;
   std::unique_ptr<Database> dbScenarios_;
   std::unique_ptr<Database> dbMembers_;

@@ -2,6 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include <tuple>
+#include <utility>
+
 namespace {
 
 TEST(FitToScreen, MaximisesWithoutAWarningOnExactlyTheRecommendedSize) {
@@ -12,26 +15,36 @@ TEST(FitToScreen, MaximisesWithoutAWarningOnExactlyTheRecommendedSize) {
 }
 
 TEST(FitToScreen, LeavesTheWindowAloneOnALargerScreen) {
-  const ScreenFit fit = FitToScreen(1280, 1024);
-  EXPECT_FALSE(fit.Warn || fit.Maximised || fit.Width || fit.Height);
+  for (const auto& [width, height] : {std::pair{1280, 1024}, {1025, 768}, {1024, 769}, {3840, 2160}}) {
+    const ScreenFit fit = FitToScreen(width, height);
+    EXPECT_FALSE(fit.Warn || fit.Maximised || fit.Width || fit.Height) << width << " x " << height;
+  }
 }
 
 TEST(FitToScreen, WarnsAndLimitsBothOnASmallScreen) {
   const ScreenFit fit = FitToScreen(800, 600);
   EXPECT_TRUE(fit.Warn);
   EXPECT_EQ(fit.Width, 800);
-  EXPECT_LT(fit.Height, 600);
+  EXPECT_EQ(fit.Height, 567);  // less 500 twips at 15 to the pixel
   EXPECT_TRUE(fit.Maximised);
 }
 
-TEST(FitToScreen, LimitsOnlyWhatIsTooSmall) {
-  const ScreenFit narrow = FitToScreen(800, 1200);
-  EXPECT_TRUE(narrow.Warn);
-  EXPECT_EQ(narrow.Width, 800);
-  EXPECT_FALSE(narrow.Height || narrow.Maximised);
-  const ScreenFit low = FitToScreen(1920, 700);
-  EXPECT_TRUE(low.Warn && low.Height && low.Maximised);
-  EXPECT_FALSE(low.Width);
+TEST(FitToScreen, LimitsTheWidthAloneOnANarrowScreen) {
+  for (const auto& [width, height] : {std::pair{800, 1200}, {1023, 768}}) {
+    const ScreenFit fit = FitToScreen(width, height);
+    EXPECT_TRUE(fit.Warn);
+    EXPECT_EQ(fit.Width, width);
+    EXPECT_FALSE(fit.Height || fit.Maximised);
+  }
+}
+
+TEST(FitToScreen, LimitsTheHeightAloneOnALowScreen) {
+  for (const auto& [width, height, limit] : {std::tuple{1920, 700, 667}, {1024, 767, 734}}) {
+    const ScreenFit fit = FitToScreen(width, height);
+    EXPECT_TRUE(fit.Warn && fit.Maximised);
+    EXPECT_EQ(fit.Height, limit);
+    EXPECT_FALSE(fit.Width);
+  }
 }
 
 }  // namespace

@@ -5,7 +5,8 @@
 
 #include "core/BaseUnitDownload.h"
 
-/// Records what a download shows, in order: "Open", "Status Requesting Data...", "Maximum 3", "Progress 1", "Animate", "Close".
+/// Records what a download shows, in order: "Open", "Status Requesting Data...", "Maximum 3", "Progress 1",
+/// "Animate", "Close".
 class FakeTransferProgress : public TransferProgress {
  public:
   std::vector<std::string> Log;

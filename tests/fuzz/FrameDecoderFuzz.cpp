@@ -2,6 +2,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
+#include <string>
 
 #include "core/FrameDecoder.h"
 #include "tests/fakes/FakeClock.h"
@@ -14,8 +15,33 @@ void Require(bool condition) {
   }
 }
 
+bool HasNoScores(const Player& player) {
+  const bool noHits = std::all_of(player.HitByPlayer.begin(), player.HitByPlayer.end(),
+                                  [](std::int32_t amount) { return amount == 0; });
+  return noHits && !player.Active && player.ShotCount == 0 && player.HealCount == 0 &&
+         player.AmmoAddCount == 0 && player.AdminKillCount == 0 && player.DeathCount == 0 &&
+         player.RespawnCount == 0 && player.ExplosiveDamage == 0 && player.RadiationDamage == 0 &&
+         player.StunCount == 0 && player.RemainingHealth == 0 && player.RemainingClips == 0 &&
+         player.RemainingAmmo == 0 && player.SecondaryDamage == 0 && player.PrimaryDamage == 0 &&
+         player.RunCounter == 0 && player.PowerCheatFlag == 0 && player.DallasID == NoDallasId;
+}
+
+bool IsWord(std::int32_t value) {
+  return value >= 0 && value <= 32767;
+}
+
+bool IsInRange(const Player& player) {
+  constexpr std::int32_t most = 255 * 32767;
+  return std::all_of(player.HitByPlayer.begin(), player.HitByPlayer.end(),
+                     [](std::int32_t amount) { return amount >= 0 && amount <= most; }) &&
+         IsWord(player.ShotCount) && IsWord(player.StunCount) && IsWord(player.RemainingHealth) &&
+         IsWord(player.RunCounter) && player.DallasID.size() == 16 &&
+         player.DallasID.find_first_not_of("0123456789ABCDEF") == std::string::npos;
+}
+
 }  // namespace
 
+/// The bytes are the receive buffer's, with zeros behind them.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   static const StringTable strings(Language::English);
   static Game game(strings);
@@ -28,9 +54,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   Require(std::all_of(buffer.begin(), buffer.end(), [](std::uint8_t byte) { return byte == 0; }));
   for (int i = 1; i <= PlayerCount; ++i) {
     const Player& player = game.Players(i);
-    Require(player.Active == (i == index));
-    Require(player.DallasID.size() == 16);
-    Require(player.ShotCount >= 0 && player.ShotCount <= 32767);
+    Require(i == index ? player.Active && IsInRange(player) : HasNoScores(player));
   }
   return 0;
 }

@@ -15,7 +15,8 @@ struct LikeCase {
 
 void ExpectAll(const std::vector<LikeCase>& cases) {
   for (const LikeCase& one : cases) {
-    EXPECT_EQ(JetLike(one.Text, one.Pattern), one.Fits) << "'" << one.Text << "' LIKE '" << one.Pattern << "'";
+    EXPECT_EQ(JetLike(one.Text, one.Pattern), one.Fits)
+        << "'" << one.Text << "' LIKE '" << one.Pattern << "'";
   }
 }
 
@@ -47,12 +48,18 @@ TEST(JetLike, StarStandsForAnyText) {
 }
 
 TEST(JetLike, QuestionMarkStandsForOneCharacter) {
-  ExpectAll({{"cat", "c?t", true}, {"ct", "c?t", false}, {"coat", "c?t", false}, {"cat", "???", true},
-             {"cat", "??", false}, {"é", "?", true},     {"马库斯", "???", true}});
+  ExpectAll({{"cat", "c?t", true},
+             {"ct", "c?t", false},
+             {"coat", "c?t", false},
+             {"cat", "???", true},
+             {"cat", "??", false},
+             {"é", "?", true},
+             {"马库斯", "???", true}});
 }
 
 TEST(JetLike, HashStandsForOneDigit) {
-  ExpectAll({{"A5", "a#", true}, {"A", "a#", false}, {"AB", "a#", false}, {"A55", "a#", false}, {"#", "#", false}});
+  ExpectAll(
+      {{"A5", "a#", true}, {"A", "a#", false}, {"AB", "a#", false}, {"A55", "a#", false}, {"#", "#", false}});
 }
 
 TEST(JetLike, SetStandsForOneOfItsCharacters) {
@@ -104,7 +111,10 @@ TEST(JetLike, CaseDoesNotCountInAnyScript) {
 }
 
 TEST(JetLike, MatchesChinese) {
-  ExpectAll({{"马库斯", "马*", true}, {"马库斯", "*斯", true}, {"马库斯", "库*", false}, {"马库斯", "马[库裤]斯", true}});
+  ExpectAll({{"马库斯", "马*", true},
+             {"马库斯", "*斯", true},
+             {"马库斯", "库*", false},
+             {"马库斯", "马[库裤]斯", true}});
 }
 
 TEST(JetLike, SignsOfOtherPatternsAreOrdinary) {

@@ -86,7 +86,8 @@ TEST(OpenDatabase, DamagedSchemaIs3343) {
 TEST(OpenRecordset, DamagedRowsAre3343) {
   const TestDatabase file;
   file.Execute(
-      "DROP INDEX MembersDallasID; WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 5000) "
+      "DROP INDEX MembersDallasID; WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < "
+      "5000) "
       "INSERT INTO Members (ContactID, FirstName, LastName) SELECT i, 'First' || i, 'Last' || i FROM n");
   std::string bytes = ReadFile(file.Path());
   ASSERT_GT(bytes.size(), 60'000u);
@@ -119,8 +120,9 @@ TEST(OpenRecordset, QueryFindsNamesByTheirBeginning) {
   const auto database = file.Open();
   const auto search = [&](const std::string& text) {
     const std::string pattern = text + "*";
-    return NumbersOf(*database, "SELECT * FROM Members WHERE ([FirstName] LIKE '" + pattern + "' OR [LastName] LIKE '" +
-                                    pattern + "' OR [NickName] LIKE '" + pattern + "')");
+    return NumbersOf(*database, "SELECT * FROM Members WHERE ([FirstName] LIKE '" + pattern +
+                                    "' OR [LastName] LIKE '" + pattern + "' OR [NickName] LIKE '" + pattern +
+                                    "')");
   };
   EXPECT_EQ(search("mo"), "2 5 ");
   EXPECT_EQ(search("BELM"), "2 ");
@@ -131,7 +133,9 @@ TEST(OpenRecordset, QueryFindsNamesByTheirBeginning) {
 TEST(OpenRecordset, QueryGivesTableOrderAlsoThroughAnIndex) {
   const TestDatabase file;
   file.AddMembers();
-  file.Execute("CREATE INDEX ByName ON Members (LastName, FirstName); UPDATE Members SET DallasID = 'CC' WHERE ContactID = 1");
+  file.Execute(
+      "CREATE INDEX ByName ON Members (LastName, FirstName); UPDATE Members SET DallasID = 'CC' WHERE "
+      "ContactID = 1");
   const auto database = file.Open();
   EXPECT_EQ(NumbersOf(*database, "SELECT * FROM Members WHERE ([LastName] > 'A')"), "1 2 5 9 ");
   EXPECT_EQ(NumbersOf(*database, "SELECT * FROM Members WHERE DallasID IN ('CC', 'BB')"), "1 2 9 ");
@@ -141,7 +145,9 @@ TEST(OpenRecordset, EqualNamesAreComparedToTheLetter) {
   const TestDatabase file;
   file.AddMembers();
   const auto database = file.Open();
-  EXPECT_EQ(NumbersOf(*database, "SELECT * FROM Members WHERE ([FirstName] = 'Sean' AND [LastName] = 'O''Brien')"), "1 ");
+  EXPECT_EQ(
+      NumbersOf(*database, "SELECT * FROM Members WHERE ([FirstName] = 'Sean' AND [LastName] = 'O''Brien')"),
+      "1 ");
   EXPECT_EQ(NumbersOf(*database, "SELECT * FROM Members WHERE ([FirstName] = 'sean')"), "");
 }
 
@@ -198,10 +204,12 @@ TEST(OpenRecordset, SearchTextCannotSmuggleInASecondStatement) {
   file.AddMembers();
   const auto database = file.Open();
   EXPECT_EQ(NumberThrownBy([&] {
-              database->OpenRecordset("SELECT * FROM Members WHERE ([FirstName] LIKE 'x'); DELETE FROM Members; --*')");
+              database->OpenRecordset(
+                  "SELECT * FROM Members WHERE ([FirstName] LIKE 'x'); DELETE FROM Members; --*')");
             }),
             3075);
-  EXPECT_EQ(NumberThrownBy([&] { database->OpenRecordset("SELECT * FROM Members WHERE 1); DELETE FROM Members; --"); }),
+  EXPECT_EQ(NumberThrownBy(
+                [&] { database->OpenRecordset("SELECT * FROM Members WHERE 1); DELETE FROM Members; --"); }),
             3075);
   EXPECT_EQ(file.Query("SELECT count(*) FROM Members"), "4");
 }
@@ -210,7 +218,8 @@ TEST(OpenRecordset, BrokenPatternIs93) {
   const TestDatabase file;
   file.AddMembers();
   const auto database = file.Open();
-  const Thrown thrown = ThrownBy([&] { database->OpenRecordset("SELECT * FROM Members WHERE FirstName LIKE '[*'"); });
+  const Thrown thrown =
+      ThrownBy([&] { database->OpenRecordset("SELECT * FROM Members WHERE FirstName LIKE '[*'"); });
   EXPECT_EQ(thrown.Number, 93);
   EXPECT_EQ(thrown.Text, "Invalid pattern string");
 }

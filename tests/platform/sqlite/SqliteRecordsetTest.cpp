@@ -30,7 +30,9 @@ TEST_F(Dynaset, StandsOnTheFirstRowWhenOpened) {
   EXPECT_EQ(IntegerOf(*rows, "ContactID"), 1);
 }
 
-TEST_F(Dynaset, MovesThroughItsRowsInTableOrder) { EXPECT_EQ(AllNumbers(*rows), "1 2 5 9 "); }
+TEST_F(Dynaset, MovesThroughItsRowsInTableOrder) {
+  EXPECT_EQ(AllNumbers(*rows), "1 2 5 9 ");
+}
 
 TEST_F(Dynaset, MoveLastStandsOnTheLastRow) {
   rows->MoveLast();
@@ -82,7 +84,8 @@ TEST(EmptyDynaset, HoldsTheFirstRowAddedToIt) {
 }
 
 TEST_F(Dynaset, GivesEachKindOfValue) {
-  file.Execute("UPDATE Members SET Photograph = X'00FF', TotalDamage = 12.5, NickName = '马库斯' WHERE ContactID = 1");
+  file.Execute(
+      "UPDATE Members SET Photograph = X'00FF', TotalDamage = 12.5, NickName = '马库斯' WHERE ContactID = 1");
   EXPECT_EQ(rows->Fields("ContactID"), Value(std::int64_t{1}));
   EXPECT_EQ(rows->Fields("TotalDamage"), Value(12.5));
   EXPECT_EQ(rows->Fields("NickName"), Value("马库斯"));
@@ -100,7 +103,9 @@ TEST_F(Dynaset, KeepsNullAndEmptyTextApart) {
   EXPECT_EQ(rows->Fields("NickName"), Value(""));
 }
 
-TEST_F(Dynaset, ColumnNamesHaveNoCase) { EXPECT_EQ(TextOf(*rows, "fIRSTnAME"), "Sean"); }
+TEST_F(Dynaset, ColumnNamesHaveNoCase) {
+  EXPECT_EQ(TextOf(*rows, "fIRSTnAME"), "Sean");
+}
 
 TEST_F(Dynaset, UnknownColumnIs3265) {
   EXPECT_EQ(NumberThrownBy([&] { rows->Fields("Rank"); }), 3265);
@@ -231,14 +236,15 @@ TEST_F(Dynaset, WalkToComparesTextsToTheLetter) {
 
 TEST_F(Dynaset, WalkToComparesToTheLetterInAColumnWithoutCase) {
   file.Execute("CREATE TABLE Guns (Name TEXT COLLATE NOCASE); INSERT INTO Guns VALUES ('red'), ('RED')");
-  const auto guns = file.Open()->OpenRecordset("Members");
   const auto other = file.Open();
   const auto names = other->OpenRecordset("Guns");
   ASSERT_TRUE(names->WalkTo("Name", "RED"));
   EXPECT_EQ(TextOf(*names, "Name"), "RED");
 }
 
-TEST_F(Dynaset, WalkToNeverFindsNull) { EXPECT_FALSE(rows->WalkTo("DallasID", Value())); }
+TEST_F(Dynaset, WalkToNeverFindsNull) {
+  EXPECT_FALSE(rows->WalkTo("DallasID", Value()));
+}
 
 TEST_F(Dynaset, WalkToFindsOnlyRowsThatExist) {
   file.Execute("DELETE FROM Members WHERE ContactID IN (2, 5)");
@@ -267,7 +273,8 @@ TEST(LargeDynaset, FindsItsPositionAmong100000Rows) {
   const TestDatabase file;
   file.Execute(
       "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 100000) "
-      "INSERT INTO Members (ContactID, DallasID, FirstName) SELECT i * 2, 'D' || (i % 50000), 'F' || i FROM n");
+      "INSERT INTO Members (ContactID, DallasID, FirstName) SELECT i * 2, 'D' || (i % 50000), 'F' || i FROM "
+      "n");
   const auto database = file.Open();
   const auto rows = database->OpenRecordset("Members");
   const ReadScope reads(*database);

@@ -72,7 +72,9 @@ class TestDatabase {
         "(5, NULL, 'Rhys', 'Morgan', NULL), (9, 'BB', 'Zoe', 'Adams', '')");
   }
 
-  std::unique_ptr<Database> Open() const { return SqliteEngine(std::chrono::milliseconds(30)).OpenDatabase(Path()); }
+  std::unique_ptr<Database> Open() const {
+    return SqliteEngine(std::chrono::milliseconds(30)).OpenDatabase(Path());
+  }
 
  private:
   TemporaryFolder folder_;

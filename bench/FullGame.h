@@ -1,0 +1,50 @@
+#pragma once
+
+#include <filesystem>
+#include <memory>
+#include <string>
+
+#include "core/Game.h"
+#include "core/MemberLookup.h"
+#include "core/MissionList.h"
+#include "core/ScoreAnalysis.h"
+#include "core/ScoreList.h"
+#include "platform/sqlite/SqliteDatabase.h"
+
+/// The fullest game: all 224 players active, all 50,176 hits above 0.
+void FillCompletely(Game& game);
+
+/// Scores the fullest game with databases of its own. A box shown is a fault and ends the program.
+class FullGame {
+ public:
+  /// `members`: how many members the database has; every player is then one of them.
+  explicit FullGame(int members);
+  ~FullGame();
+  FullGame(const FullGame&) = delete;
+  FullGame& operator=(const FullGame&) = delete;
+
+  void CalculateScores();
+
+  /// Makes the next calculation look all players up by their buttons.
+  void Unassign();
+
+  StringTable Strings{Language::English};
+  Game game{Strings};
+  std::unique_ptr<MissionList> Missions;
+
+ private:
+  class NoBoxes;
+
+  std::filesystem::path folder_;
+  std::unique_ptr<NoBoxes> boxes_;
+  SqliteEngine engine_;
+  std::unique_ptr<Database> dbScenarios_;
+  std::unique_ptr<Database> dbMembers_;
+  std::unique_ptr<Recordset> rsScenarios_;
+  std::unique_ptr<Recordset> rsMembers_;
+  std::unique_ptr<MemberLookup> members_;
+  SoldieringFactors factors_;
+  ScoreList board_;
+  ScoreList teams_;
+  std::unique_ptr<ScoreAnalysis> analysis_;
+};

@@ -1,0 +1,99 @@
+#include <sys/resource.h>
+
+#include <QApplication>
+#include <chrono>
+#include <cstdio>
+
+#include "app/Composition.h"
+#include "app/UploadProgress.h"
+#include "bench/Goals.h"
+#include "core/BaseUnitDownload.h"
+#include "sim/BaseUnit.h"
+#include "sim/GameMaker.h"
+
+namespace {
+
+using Seconds = std::chrono::duration<double>;
+
+constexpr double Baud = 19200;
+constexpr double BitsPerByte = 10;
+
+double ProcessorSeconds() {
+  rusage usage{};
+  getrusage(RUSAGE_SELF, &usage);
+  return static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
+         static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
+}
+
+/// Boxes are answered at once.
+class SilentBoxes : public MessageBoxes {
+ public:
+  BoxAnswer Show(const std::string&, const std::string&, BoxIcon, BoxButtons) override {
+    return BoxAnswer::Cancel;
+  }
+};
+
+class OneDevice : public SerialDevices {
+ public:
+  explicit OneDevice(std::string device) : device_(std::move(device)) {}
+  std::vector<std::string> Names() const override { return {device_}; }
+  bool Exists(const std::string& device) const override { return device == device_; }
+
+ private:
+  std::string device_;
+};
+
+struct Spent {
+  double Wall;
+  double Processor;
+};
+
+/// One download with the real line, event loop and progress window.
+Spent Download(const sim::BaseUnit& unit) {
+  const StringTable strings(Language::English);
+  Game game(strings);
+  SilentBoxes boxes;
+  LinuxFiles files;
+  const IniReader ini(files, "/nowhere/tessarine.ini");
+  const OneDevice device(unit.DevicePath());
+  QtSerialPort port;
+  QtEventPump events;
+  const QtClock clock;
+  CommPort commPort(port, ini, device, boxes, strings, [] {});
+  UploadProgress progress(strings, nullptr);
+  const double processor = ProcessorSeconds();
+  const auto start = std::chrono::steady_clock::now();
+  BaseUnitDownload(port, commPort, events, boxes, clock, progress, game).GetScores();
+  return {Seconds(std::chrono::steady_clock::now() - start).count(), ProcessorSeconds() - processor};
+}
+
+bool MeasureDownload() {
+  constexpr int players = 40;
+  const sim::BaseUnit unit({.Answer = sim::MakeBaseUnitAnswer(sim::MakeGame(players, 1))});
+  const Spent spent = Download(unit);
+  const auto exchange = unit.LatestExchange();
+  const double bytes = 2.0 + static_cast<double>(exchange.Sent.size() + exchange.Replies.size());
+  const double told = bytes * BitsPerByte / Baud + 0.020 + players * 0.050;
+  char detail[64];
+  std::snprintf(detail, sizeof detail, "%.3f s to %.3f s", spent.Wall, told);
+  return ReportGoal("download of 40 players / wire and pauses", spent.Wall / told, 1.02, detail);
+}
+
+bool MeasureTimeOut(const char* name, std::size_t silentFrom) {
+  const sim::BaseUnit unit(
+      {.Answer = sim::MakeBaseUnitAnswer(sim::MakeGame(2, 1), sim::BaseUnitFailure::Silence, silentFrom)});
+  const Spent spent = Download(unit);
+  char detail[64];
+  std::snprintf(detail, sizeof detail, "%.1f ms in %.2f s", spent.Processor * 1000, spent.Wall);
+  return ReportGoal(name, spent.Processor / spent.Wall, 0.01, detail);
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  QApplication application(argc, argv);
+  bool met = MeasureDownload();
+  met &= MeasureTimeOut("processor time of a time-out before the count", 1);
+  met &= MeasureTimeOut("processor time of a time-out in mid-frame", 20);
+  return met ? 0 : 1;
+}

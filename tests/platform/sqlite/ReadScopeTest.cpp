@@ -1,0 +1,132 @@
+#include <sqlite3.h>
+
+#include <cstdint>
+#include <stdexcept>
+#include <string>
+
+#include "gtest/gtest.h"
+#include "tests/platform/linux/Thrown.h"
+#include "tests/platform/sqlite/TestDatabase.h"
+
+namespace {
+
+class Reading : public testing::Test {
+ protected:
+  Reading() {
+    file.AddMembers();
+    database = file.Open();
+    rows = database->OpenRecordset("Members");
+  }
+
+  bool OthersCanWrite() const {
+    OtherConnection other(file.Path());
+    return other.Try("UPDATE Members SET Clan = Clan || 'x' WHERE ContactID = 9") == SQLITE_OK;
+  }
+
+  TestDatabase file;
+  std::unique_ptr<Database> database;
+  std::unique_ptr<Recordset> rows;
+};
+
+TEST_F(Reading, HoldsTheLockFromItsFirstReadToItsEnd) {
+  {
+    const ReadScope scope(*database);
+    EXPECT_TRUE(OthersCanWrite());
+    EXPECT_TRUE(rows->WalkTo("ContactID", std::int64_t{5}));
+    EXPECT_FALSE(OthersCanWrite());
+  }
+  EXPECT_TRUE(OthersCanWrite());
+}
+
+TEST_F(Reading, WithoutAScopeHoldsNoLock) {
+  EXPECT_TRUE(rows->WalkTo("DallasID", "BB"));
+  EXPECT_EQ(IntegerOf(*rows, "ContactID"), 2);
+  rows->FindFirst("ContactID > 1");
+  EXPECT_TRUE(OthersCanWrite());
+}
+
+TEST_F(Reading, NestedScopesEndWithTheOutermost) {
+  {
+    const ReadScope outer(*database);
+    {
+      const ReadScope inner(*database);
+      rows->WalkTo("ContactID", std::int64_t{5});
+    }
+    EXPECT_FALSE(OthersCanWrite());
+  }
+  EXPECT_TRUE(OthersCanWrite());
+}
+
+TEST_F(Reading, EndsAlsoByAnException) {
+  try {
+    const ReadScope scope(*database);
+    rows->WalkTo("ContactID", std::int64_t{5});
+    throw std::runtime_error("a failure of the caller");
+  } catch (const std::runtime_error&) {
+  }
+  EXPECT_TRUE(OthersCanWrite());
+}
+
+TEST_F(Reading, SearchThatFindsNothingLetsGoOfTheLock) {
+  const ReadScope scope(*database);
+  const auto hold = [&] {
+    rows->WalkTo("ContactID", std::int64_t{5});
+    rows->Fields("FirstName");
+    return !OthersCanWrite();
+  };
+  EXPECT_TRUE(hold());
+  EXPECT_FALSE(rows->WalkTo("ContactID", std::int64_t{77}));
+  EXPECT_TRUE(OthersCanWrite());
+  EXPECT_TRUE(hold());
+  EXPECT_FALSE(rows->WalkTo("DallasID", "XX"));
+  EXPECT_TRUE(OthersCanWrite());
+  EXPECT_TRUE(hold());
+  rows->FindFirst("ContactID= 77");
+  EXPECT_TRUE(OthersCanWrite());
+  EXPECT_TRUE(hold());
+}
+
+TEST_F(Reading, FailureLetsGoOfTheLock) {
+  file.Execute("DELETE FROM Members WHERE ContactID = 2");
+  const ReadScope scope(*database);
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "Sean");
+  rows->MoveNext();
+  EXPECT_EQ(NumberThrownBy([&] { rows->Fields("FirstName"); }), 3167);
+  EXPECT_TRUE(OthersCanWrite());
+  EXPECT_TRUE(rows->WalkTo("ContactID", std::int64_t{5}));
+  EXPECT_EQ(NumberThrownBy([&] { rows->FindFirst("?"); }), 3077);
+  EXPECT_TRUE(OthersCanWrite());
+}
+
+TEST_F(Reading, SeesWhatOthersChangedBeforeItTookTheLockAgain) {
+  const ReadScope scope(*database);
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "Sean");
+  EXPECT_FALSE(rows->WalkTo("DallasID", "XX"));
+  file.Execute("UPDATE Members SET FirstName = 'Changed' WHERE ContactID = 1");
+  rows->MoveFirst();
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "Changed");
+}
+
+TEST_F(Reading, WriteInsideIsDurableAtOnceAndTheReadsGoOn) {
+  const ReadScope scope(*database);
+  EXPECT_TRUE(rows->WalkTo("ContactID", std::int64_t{5}));
+  rows->Edit();
+  rows->SetField("FirstName", "John");
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT FirstName FROM Members WHERE ContactID = 5"), "John");
+  EXPECT_TRUE(OthersCanWrite());
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "John");
+  EXPECT_FALSE(OthersCanWrite());
+  rows->AddNew();
+  rows->Update();
+  rows->MoveLast();
+  rows->Delete();
+  EXPECT_EQ(file.Query("SELECT count(*) FROM Members"), "4");
+}
+
+TEST_F(Reading, RecordsetMayBeOpenedInside) {
+  const ReadScope scope(*database);
+  EXPECT_EQ(AllNumbers(*database->OpenRecordset("SELECT * FROM Members WHERE DallasID = 'BB'")), "2 9 ");
+}
+
+}  // namespace

@@ -1,0 +1,403 @@
+#include <cstddef>
+#include <cstdint>
+#include <string>
+
+#include "gmock/gmock.h"
+#include "gtest/gtest.h"
+#include "tests/platform/linux/Thrown.h"
+#include "tests/platform/sqlite/TestDatabase.h"
+
+namespace {
+
+using testing::HasSubstr;
+
+class Editing : public testing::Test {
+ protected:
+  Editing() {
+    file.AddMembers();
+    database = file.Open();
+    rows = database->OpenRecordset("Members");
+  }
+
+  std::string Count() const { return file.Query("SELECT count(*) FROM Members"); }
+
+  TestDatabase file;
+  std::unique_ptr<Database> database;
+  std::unique_ptr<Recordset> rows;
+};
+
+Blob Bytes(std::size_t count, std::uint8_t first) {
+  Blob bytes(count);
+  for (std::size_t i = 0; i < count; ++i) {
+    bytes[i] = static_cast<std::uint8_t>(first + i * 31 % 251);
+  }
+  return bytes;
+}
+
+TEST_F(Editing, UpdateWritesTheChangedRowForOthersToSee) {
+  rows->MoveNext();
+  rows->Edit();
+  EXPECT_EQ(rows->EditMode(), EditMode::InProgress);
+  rows->SetField("FirstName", "Alicia");
+  rows->SetField("TotalDamage", 12.5);
+  rows->SetField("TotalGamesPlayed", std::int64_t{7});
+  rows->SetField("NickName", Value());
+  rows->Update();
+  EXPECT_EQ(rows->EditMode(), EditMode::None);
+  EXPECT_EQ(
+      file.Query("SELECT FirstName || TotalDamage || TotalGamesPlayed FROM Members WHERE ContactID = 2"),
+      "Alicia12.57");
+  EXPECT_EQ(file.Query("SELECT NickName FROM Members WHERE ContactID = 2"), "NULL");
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "Alicia");
+  EXPECT_EQ(IntegerOf(*rows, "ContactID"), 2);
+}
+
+TEST_F(Editing, FieldsShowThePendingValuesAndTheOthersOfTheRow) {
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "Sean");
+  rows->Edit();
+  rows->SetField("firstname", "John");
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "John");
+  EXPECT_EQ(TextOf(*rows, "LastName"), "O'Brien");
+  EXPECT_EQ(file.Query("SELECT FirstName FROM Members WHERE ContactID = 1"), "Sean");
+}
+
+TEST_F(Editing, UpdateLeavesColumnsThatOthersChangedMeanwhile) {
+  rows->Edit();
+  rows->SetField("FirstName", "John");
+  file.Execute("UPDATE Members SET LastName = 'Changed' WHERE ContactID = 1");
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT FirstName || LastName FROM Members WHERE ContactID = 1"), "JohnChanged");
+}
+
+TEST_F(Editing, EditReadsTheRowAnew) {
+  EXPECT_EQ(IntegerOf(*rows, "TotalGamesPlayed"), 0);
+  file.Execute("UPDATE Members SET TotalGamesPlayed = 4");
+  rows->Edit();
+  rows->SetField("TotalGamesPlayed", IntegerOf(*rows, "TotalGamesPlayed") + 1);
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT TotalGamesPlayed FROM Members WHERE ContactID = 1"), "5");
+}
+
+TEST_F(Editing, UpdateWithoutAnyChangeLeavesTheRow) {
+  rows->Edit();
+  rows->Update();
+  EXPECT_EQ(rows->EditMode(), EditMode::None);
+  EXPECT_EQ(file.Query("SELECT FirstName FROM Members WHERE ContactID = 1"), "Sean");
+}
+
+TEST_F(Editing, CancelUpdateDropsTheChanges) {
+  rows->Edit();
+  rows->SetField("FirstName", "John");
+  rows->CancelUpdate();
+  EXPECT_EQ(rows->EditMode(), EditMode::None);
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "Sean");
+  rows->Edit();
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT FirstName FROM Members WHERE ContactID = 1"), "Sean");
+}
+
+TEST_F(Editing, EveryMoveDropsTheChanges) {
+  const std::function<void()> moves[] = {
+      [&] { rows->MoveFirst(); },
+      [&] { rows->MoveNext(); },
+      [&] { rows->MoveLast(); },
+      [&] { rows->FindFirst("ContactID= 1"); },
+      [&] { rows->FindFirst("ContactID= 77"); },
+      [&] { rows->WalkTo("ContactID", std::int64_t{1}); },
+      [&] { rows->Edit(); },
+      [&] { rows->AddNew(); },
+  };
+  int number = 0;
+  for (const auto& move : moves) {
+    rows->MoveFirst();
+    rows->Edit();
+    rows->SetField("FirstName", "John");
+    move();
+    if (rows->EditMode() == EditMode::None) {
+      EXPECT_EQ(NumberThrownBy([&] { rows->Update(); }), 3020) << number;
+    } else {
+      rows->Update();
+    }
+    EXPECT_EQ(file.Query("SELECT FirstName FROM Members WHERE ContactID = 1"), "Sean") << number;
+    ++number;
+  }
+}
+
+TEST_F(Editing, WritesWithoutEditOrAddNewAre3020) {
+  EXPECT_EQ(NumberThrownBy([&] { rows->SetField("FirstName", "x"); }), 3020);
+  EXPECT_EQ(NumberThrownBy([&] { rows->AppendChunk("Photograph", {1}); }), 3020);
+  EXPECT_EQ(NumberThrownBy([&] { rows->Update(); }), 3020);
+  EXPECT_EQ(NumberThrownBy([&] { rows->CancelUpdate(); }), 3020);
+}
+
+TEST_F(Editing, UpdateOfARowThatWasDeletedMeanwhileIs3167) {
+  rows->Edit();
+  rows->SetField("FirstName", "John");
+  file.Execute("DELETE FROM Members WHERE ContactID = 1");
+  EXPECT_EQ(NumberThrownBy([&] { rows->Update(); }), 3167);
+  EXPECT_EQ(rows->EditMode(), EditMode::InProgress);
+  rows->MoveNext();
+  rows->Edit();
+  file.Execute("DELETE FROM Members WHERE ContactID = 2");
+  EXPECT_EQ(NumberThrownBy([&] { rows->Update(); }), 3167);
+  EXPECT_EQ(Count(), "2");
+}
+
+TEST_F(Editing, NumbersMayBeGivenAsText) {
+  rows->Edit();
+  rows->SetField("PhotographLength", "  15 ");
+  rows->SetField("TotalDamage", "+2.5");
+  rows->Update();
+  EXPECT_EQ(rows->Fields("PhotographLength"), Value(std::int64_t{15}));
+  EXPECT_EQ(rows->Fields("TotalDamage"), Value(2.5));
+  rows->Edit();
+  rows->SetField("TotalDamage", "-1e3");
+  rows->SetField("PhotographLength", ".5");
+  rows->Update();
+  EXPECT_EQ(rows->Fields("TotalDamage"), Value(-1000.0));
+  EXPECT_EQ(rows->Fields("PhotographLength"), Value(0.5));
+}
+
+TEST_F(Editing, TextThatIsNoNumberIs3421InANumberColumn) {
+  rows->Edit();
+  for (const char* text : {"", " ", "abc", "1a", "1 2", "inf", "nan", "1e999", "--1", "0x10"}) {
+    EXPECT_EQ(NumberThrownBy([&] { rows->SetField("TotalDamage", text); }), 3421) << text;
+  }
+  EXPECT_EQ(rows->EditMode(), EditMode::InProgress);
+  rows->SetField("FirstName", "abc");
+  rows->Update();
+  EXPECT_EQ(rows->Fields("TotalDamage"), Value(0.0));
+  EXPECT_EQ(rows->Fields("FirstName"), Value("abc"));
+}
+
+TEST_F(Editing, StrictTableRefusesWhatIsNotOfItsTypeWith3421) {
+  file.Execute(
+      "CREATE TABLE Guns (ID INTEGER PRIMARY KEY, Serial BLOB) STRICT; INSERT INTO Guns VALUES (1, X'01')");
+  const auto guns = database->OpenRecordset("Guns");
+  guns->Edit();
+  guns->SetField("Serial", "text");
+  EXPECT_EQ(NumberThrownBy([&] { guns->Update(); }), 3421);
+  EXPECT_EQ(file.Query("SELECT hex(Serial) FROM Guns"), "01");
+}
+
+TEST_F(Editing, RefusedValueLeavesTheOldRowAndTheEditPending) {
+  rows->Edit();
+  rows->SetField("FirstName", "John");
+  rows->SetField("Clan", "refused");
+  EXPECT_EQ(NumberThrownBy([&] { rows->Update(); }), 3317);
+  EXPECT_EQ(rows->EditMode(), EditMode::InProgress);
+  EXPECT_EQ(file.Query("SELECT FirstName || Clan FROM Members WHERE ContactID = 1"), "Seannone");
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "John");
+  rows->SetField("Clan", "allowed");
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT FirstName || Clan FROM Members WHERE ContactID = 1"), "Johnallowed");
+}
+
+TEST_F(Editing, NullWhereAValueIsNeededIs3314AndNamesTheColumn) {
+  rows->Edit();
+  rows->SetField("TotalGamesPlayed", Value());
+  const Thrown thrown = ThrownBy([&] { rows->Update(); });
+  EXPECT_EQ(thrown.Number, 3314);
+  EXPECT_THAT(thrown.Text, HasSubstr("TotalGamesPlayed"));
+}
+
+TEST_F(Editing, KeyOfARowCannotBeChanged) {
+  rows->Edit();
+  EXPECT_EQ(NumberThrownBy([&] { rows->SetField("ContactID", std::int64_t{3}); }), 3164);
+}
+
+TEST_F(Editing, SecondRowOfAKeyIs3022) {
+  rows->AddNew();
+  rows->SetField("ContactID", std::int64_t{5});
+  EXPECT_EQ(NumberThrownBy([&] { rows->Update(); }), 3022);
+  EXPECT_EQ(rows->EditMode(), EditMode::Add);
+  EXPECT_EQ(file.Query("SELECT FirstName FROM Members WHERE ContactID = 5"), "Rhys");
+}
+
+TEST_F(Editing, NewRowJoinsAtTheEndWithTheTablesDefaults) {
+  rows->AddNew();
+  EXPECT_EQ(rows->EditMode(), EditMode::Add);
+  rows->SetField("FirstName", "Enter Name");
+  rows->Update();
+  EXPECT_EQ(AllNumbers(*rows), "1 2 5 9 10 ");
+  rows->MoveLast();
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "Enter Name");
+  EXPECT_EQ(TextOf(*rows, "Clan"), "none");
+  EXPECT_EQ(IntegerOf(*rows, "PhotographLength"), 0);
+  EXPECT_EQ(file.Query("SELECT FirstName FROM Members WHERE ContactID = 10"), "Enter Name");
+}
+
+TEST_F(Editing, NewRowMayBeMadeOfDefaultsAlone) {
+  rows->AddNew();
+  rows->Update();
+  EXPECT_EQ(Count(), "5");
+}
+
+TEST_F(Editing, PendingNewRowShowsDefaultsAndNulls) {
+  rows->AddNew();
+  EXPECT_EQ(rows->Fields("Clan"), Value("none"));
+  EXPECT_EQ(rows->Fields("TotalGamesPlayed"), Value(std::int64_t{0}));
+  EXPECT_EQ(rows->Fields("FirstName"), Value());
+  EXPECT_EQ(rows->Fields("ContactID"), Value());
+  rows->SetField("FirstName", "New");
+  EXPECT_EQ(rows->Fields("FirstName"), Value("New"));
+}
+
+TEST_F(Editing, CursorStaysWhereItWasAfterANewRow) {
+  rows->MoveNext();
+  rows->AddNew();
+  rows->SetField("FirstName", "New");
+  rows->Update();
+  EXPECT_EQ(IntegerOf(*rows, "ContactID"), 2);
+  while (!rows->Eof()) {
+    rows->MoveNext();
+  }
+  rows->AddNew();
+  rows->Update();
+  EXPECT_TRUE(rows->Eof());
+}
+
+TEST_F(Editing, CancelledNewRowIsNotThere) {
+  rows->AddNew();
+  rows->SetField("FirstName", "New");
+  rows->CancelUpdate();
+  EXPECT_EQ(AllNumbers(*rows), "1 2 5 9 ");
+  EXPECT_EQ(Count(), "4");
+}
+
+TEST_F(Editing, NewRowIsFoundByEveryMeans) {
+  rows->AddNew();
+  rows->SetField("DallasID", "NEW");
+  rows->Update();
+  EXPECT_TRUE(rows->WalkTo("DallasID", "NEW"));
+  EXPECT_TRUE(rows->WalkTo("ContactID", std::int64_t{10}));
+  rows->FindFirst("DallasID = 'NEW'");
+  EXPECT_FALSE(rows->NoMatch());
+}
+
+TEST_F(Editing, NewRowThatGetsTheNumberOfADeletedOneStandsOnceAndLast) {
+  rows->MoveLast();
+  file.Execute("DELETE FROM Members WHERE ContactID = 2");
+  rows->AddNew();
+  rows->SetField("ContactID", std::int64_t{2});
+  rows->SetField("FirstName", "New");
+  rows->Update();
+  EXPECT_EQ(IntegerOf(*rows, "ContactID"), 9);
+  EXPECT_EQ(AllNumbers(*rows), "1 5 9 2 ");
+}
+
+TEST_F(Editing, DeleteTakesTheRowAwayAndStandsOnNone) {
+  rows->MoveNext();
+  rows->Delete();
+  EXPECT_EQ(file.Query("SELECT count(*) FROM Members WHERE ContactID = 2"), "0");
+  EXPECT_FALSE(rows->Eof());
+  EXPECT_EQ(NumberThrownBy([&] { rows->Fields("ContactID"); }), 3021);
+  EXPECT_EQ(NumberThrownBy([&] { rows->Edit(); }), 3021);
+  EXPECT_EQ(NumberThrownBy([&] { rows->Delete(); }), 3021);
+  rows->MoveNext();
+  EXPECT_EQ(IntegerOf(*rows, "ContactID"), 5);
+  EXPECT_EQ(AllNumbers(*rows), "1 5 9 ");
+}
+
+TEST_F(Editing, DeletingTheLastRowsLeavesAnEmptySet) {
+  for (int i = 0; i < 4; ++i) {
+    rows->MoveLast();
+    rows->Delete();
+  }
+  EXPECT_EQ(Count(), "0");
+  rows->MoveFirst();
+  EXPECT_TRUE(rows->Eof());
+  EXPECT_TRUE(rows->Bof());
+}
+
+TEST_F(Editing, MoveNextAfterDeletingTheLastRowReachesTheEnd) {
+  rows->MoveLast();
+  rows->Delete();
+  rows->MoveNext();
+  EXPECT_TRUE(rows->Eof());
+  EXPECT_FALSE(rows->Bof());
+}
+
+TEST_F(Editing, ChunksOfALongColumnAreReadFromAnyOffset) {
+  const Blob photo = Bytes(25'000, 3);
+  rows->Edit();
+  rows->SetField("Photograph", photo);
+  rows->Update();
+  EXPECT_EQ(rows->GetChunk("Photograph", 0, 10'000), Blob(photo.begin(), photo.begin() + 10'000));
+  EXPECT_EQ(rows->GetChunk("photograph", 20'000, 10'000), Blob(photo.begin() + 20'000, photo.end()));
+  EXPECT_EQ(rows->GetChunk("Photograph", 24'999, 1), Blob(photo.end() - 1, photo.end()));
+  EXPECT_EQ(rows->GetChunk("Photograph", 25'000, 1), Blob());
+  EXPECT_EQ(rows->GetChunk("Photograph", 90'000, 1), Blob());
+  EXPECT_EQ(rows->GetChunk("Photograph", 1, static_cast<std::size_t>(-1)),
+            Blob(photo.begin() + 1, photo.end()));
+}
+
+TEST_F(Editing, ChunkOfNullIsEmpty) {
+  EXPECT_EQ(rows->GetChunk("Photograph", 0, 10), Blob());
+}
+
+TEST_F(Editing, ChunksBelongToTheRowUnderTheCursor) {
+  file.Execute("UPDATE Members SET Photograph = X'0102' WHERE ContactID = 1");
+  EXPECT_EQ(rows->GetChunk("Photograph", 0, 10), (Blob{1, 2}));
+  rows->MoveNext();
+  EXPECT_EQ(rows->GetChunk("Photograph", 0, 10), Blob());
+}
+
+TEST_F(Editing, FirstAppendedChunkReplacesAndTheOthersAdd) {
+  file.Execute("UPDATE Members SET Photograph = X'FFFFFF' WHERE ContactID = 1");
+  rows->Edit();
+  rows->AppendChunk("Photograph", {1, 2});
+  rows->AppendChunk("Photograph", {3});
+  EXPECT_EQ(rows->GetChunk("Photograph", 1, 10), (Blob{2, 3}));
+  EXPECT_EQ(file.Query("SELECT hex(Photograph) FROM Members WHERE ContactID = 1"), "FFFFFF");
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT hex(Photograph) FROM Members WHERE ContactID = 1"), "010203");
+  rows->Edit();
+  rows->AppendChunk("Photograph", {4});
+  rows->Update();
+  EXPECT_EQ(rows->GetChunk("Photograph", 0, 10), Blob{4});
+}
+
+TEST_F(Editing, ChunksCanBeAppendedToANewRow) {
+  rows->AddNew();
+  rows->AppendChunk("Photograph", {1});
+  rows->AppendChunk("Photograph", {2});
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT hex(Photograph) FROM Members WHERE ContactID = 10"), "0102");
+}
+
+TEST_F(Editing, EmptyChunkMakesAnEmptyColumnAndNotNull) {
+  rows->Edit();
+  rows->AppendChunk("Photograph", {});
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT typeof(Photograph) FROM Members WHERE ContactID = 1"), "blob");
+}
+
+TEST_F(Editing, OtherUpdatesLeaveTheLongColumnAlone) {
+  file.Execute("UPDATE Members SET Photograph = X'FF' WHERE ContactID = 1");
+  rows->Edit();
+  rows->SetField("FirstName", "John");
+  rows->Update();
+  EXPECT_EQ(file.Query("SELECT hex(Photograph) FROM Members WHERE ContactID = 1"), "FF");
+}
+
+TEST_F(Editing, ChunksOfAnotherKindOfColumnAre3259) {
+  EXPECT_EQ(NumberThrownBy([&] { rows->GetChunk("FirstName", 0, 1); }), 3259);
+  rows->Edit();
+  EXPECT_EQ(NumberThrownBy([&] { rows->AppendChunk("FirstName", {1}); }), 3259);
+  EXPECT_EQ(NumberThrownBy([&] { rows->AppendChunk("Nothing", {1}); }), 3265);
+}
+
+TEST_F(Editing, TwoRecordsetsOfOneDatabaseSeeEachOthersChanges) {
+  const auto other = database->OpenRecordset("SELECT * FROM Members WHERE ContactID = 1");
+  other->Edit();
+  other->SetField("FirstName", "John");
+  other->Update();
+  rows->MoveFirst();
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "John");
+  other->Delete();
+  rows->MoveFirst();
+  EXPECT_EQ(NumberThrownBy([&] { rows->Fields("FirstName"); }), 3167);
+}
+
+}  // namespace
