@@ -148,8 +148,9 @@ void frmRx::ConnectCommands() {
       {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
       {ui_->mnuAbout, &frmRx::ShowAbout},
   };
-  for (const auto& [action, command] : commands) {
-    connect(action, &QAction::triggered, this,
+  for (const auto& entry : commands) {
+    const auto command = entry.second;
+    connect(entry.first, &QAction::triggered, this,
             [this, command] { Run([this, command] { (this->*command)(); }); });
   }
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);

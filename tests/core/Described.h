@@ -1,5 +1,7 @@
 #pragma once
 
+#include <gtest/gtest.h>
+
 #include <iomanip>
 #include <sstream>
 #include <string>
@@ -30,8 +32,8 @@ inline std::string Described(const Player& player) {
   return out.str();
 }
 
-/// The whole game: header, team tables and all 224 records.
-inline std::string Described(const Game& game) {
+/// The header and the team tables.
+inline std::string DescribedHeader(const Game& game) {
   std::ostringstream out;
   out << "GameDate " << game.GameDate << "\nDataPresent " << game.DataPresent << '\n';
   for (int team = 1; team <= TeamCount; ++team) {
@@ -39,8 +41,13 @@ inline std::string Described(const Game& game) {
     out << "Team " << game.TeamNames(team) << ' ' << game.TeamTotals(team) << "\nObjectiveTeam "
         << objective.Name << ' ' << objective.PrimaryAchieved << ' ' << objective.SecondaryAchieved << '\n';
   }
-  for (int index = 1; index <= PlayerCount; ++index) {
-    out << "Player " << index << '\n' << Described(game.Players(index));
-  }
   return out.str();
+}
+
+/// Expects two games to be the same in all 224 records; tells the first difference only.
+inline void ExpectSameGame(const Game& game, const Game& expected) {
+  EXPECT_EQ(DescribedHeader(game), DescribedHeader(expected));
+  for (int index = 1; index <= PlayerCount; ++index) {
+    ASSERT_EQ(Described(game.Players(index)), Described(expected.Players(index))) << "player " << index;
+  }
 }

@@ -315,7 +315,7 @@ TEST_F(Reading, OfAReferenceToNoCharacterDoesNotSpoilTheNextSavedFile) {
 TEST_F(Reading, RefusesWhatIsNoGameFileAndChangesNothing) {
   FillRandomly(game, 20, 2);
   game.GameDate = "before";
-  const std::string before = Described(game);
+  const auto before = std::make_unique<Game>(game);
   const std::string bad[] = {"",
                              "   ",
                              "no XML",
@@ -343,18 +343,18 @@ TEST_F(Reading, RefusesWhatIsNoGameFileAndChangesNothing) {
     EXPECT_FALSE(Read(bytes)) << bytes;
   }
   EXPECT_THAT(missions, IsEmpty());
-  EXPECT_EQ(Described(game), before);
+  ExpectSameGame(game, *before);
 }
 
 TEST_F(Reading, RefusesAGameCutShortAnywhere) {
   game.Players(1).Active = true;
   game.Players(1).HitByPlayer(2) = 5;
   const std::string whole = WriteGameFile(game, "任务");
-  const std::string before = Described(game);
+  const auto before = std::make_unique<Game>(game);
   for (std::size_t size = 0; size < whole.size(); ++size) {
     ASSERT_FALSE(Read(whole.substr(0, size))) << size;
   }
-  EXPECT_EQ(Described(game), before);
+  ExpectSameGame(game, *before);
   EXPECT_TRUE(Read(whole));
 }
 
@@ -410,7 +410,7 @@ TEST_F(Reading, GivesBackEveryFieldOfASavedGame) {
         player = Player();
       }
     }
-    EXPECT_EQ(Described(*loaded), Described(*saved));
+    ExpectSameGame(*loaded, *saved);
   }
 }
 

@@ -66,7 +66,7 @@ void ExpectReckonedScores(ScoredGame& venue, const Reckoning& reckoning) {
   const auto reckoned = std::make_unique<Game>(venue.game);
   const std::vector<int> board = reckoning.Score(*reckoned);
   venue.CalculateScores();
-  EXPECT_EQ(Described(venue.game), Described(*reckoned));
+  ExpectSameGame(venue.game, *reckoned);
   ASSERT_EQ(venue.Board.Rows().size(), board.size());
   for (std::size_t row = 0; row < board.size(); ++row) {
     const Player& player = reckoned->Players(board[row]);
@@ -129,11 +129,11 @@ TEST(CalculateScores, ChangesNothingWhenRepeated) {
   venue.Open();
   venue.Missions->Select(2);
   venue.CalculateScores();
-  const std::string game = Described(venue.game);
+  const auto game = std::make_unique<Game>(venue.game);
   const auto board = venue.BoardCells();
   const auto teams = venue.TeamCells();
   venue.CalculateScores();
-  EXPECT_EQ(Described(venue.game), game);
+  ExpectSameGame(venue.game, *game);
   EXPECT_EQ(venue.BoardCells(), board);
   EXPECT_EQ(venue.TeamCells(), teams);
 }

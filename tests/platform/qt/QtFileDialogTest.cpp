@@ -84,11 +84,14 @@ TEST_F(QtFileDialogTest, OpensTheFileChosen) {
                  [&](QFileDialog& dialog) {
                    EXPECT_EQ(dialog.objectName(), QStringLiteral("CommonDialog1"));
                    EXPECT_EQ(dialog.acceptMode(), QFileDialog::AcceptOpen);
-                   EXPECT_EQ(dialog.fileMode(), QFileDialog::ExistingFile);
                    EXPECT_EQ(dialog.nameFilters(), QStringList{QStringLiteral("XML Files & (*.xml)")});
                    Enter(Path("得分 一.xml"), QDialogButtonBox::Open)(dialog);
                  }),
             Path("得分 一.xml"));
+}
+
+TEST_F(QtFileDialogTest, OpensANameWithoutAFileForTheCallerToJudge) {
+  EXPECT_EQ(Open("", Enter(Path("missing.xml"), QDialogButtonBox::Open)), Path("missing.xml"));
 }
 
 TEST_F(QtFileDialogTest, SavesUnderTheNameEntered) {
