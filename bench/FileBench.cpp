@@ -18,7 +18,7 @@ const std::string& FullFile() {
 }
 
 void BareParse(benchmark::State& state) {
-  for (auto _ : state) {
+  while (state.KeepRunning()) {
     pugi::xml_document document;
     benchmark::DoNotOptimize(document.load_buffer(FullFile().data(), FullFile().size()).status);
   }
@@ -27,7 +27,7 @@ BENCHMARK(BareParse);
 
 void Load(benchmark::State& state) {
   FullGame full(0);
-  for (auto _ : state) {
+  while (state.KeepRunning()) {
     full.game.Clear();
     ReadGameFile(FullFile(), full.game, [](const std::string&) {});
     full.CalculateScores();
@@ -45,7 +45,7 @@ struct StringWriter : pugi::xml_writer {
 void BareSave(benchmark::State& state) {
   pugi::xml_document document;
   document.load_buffer(FullFile().data(), FullFile().size(), pugi::parse_full | pugi::parse_ws_pcdata);
-  for (auto _ : state) {
+  while (state.KeepRunning()) {
     StringWriter writer;
     document.save(writer, "", pugi::format_raw | pugi::format_no_declaration, pugi::encoding_utf8);
     benchmark::DoNotOptimize(writer.Bytes.data());
@@ -56,7 +56,7 @@ BENCHMARK(BareSave);
 void Save(benchmark::State& state) {
   FullGame full(0);
   full.CalculateScores();
-  for (auto _ : state) {
+  while (state.KeepRunning()) {
     benchmark::DoNotOptimize(WriteGameFile(full.game, "None").size());
   }
 }

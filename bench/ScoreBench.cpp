@@ -12,7 +12,7 @@ constexpr int ManyMembers = 100'000;
 /// What no calculation can do without: one pass over the hits, and the board's numbers as text.
 void Limit(benchmark::State& state) {
   FullGame full(0);
-  for (auto _ : state) {
+  while (state.KeepRunning()) {
     std::int64_t sum = 0;
     for (const Player& player : full.game.Players) {
       for (const std::int32_t hit : player.HitByPlayer) {
@@ -36,7 +36,7 @@ BENCHMARK(Limit);
 void Score(benchmark::State& state, int members, int mode, bool byButton) {
   FullGame full(members);
   full.Missions->Select(mode);
-  for (auto _ : state) {
+  while (state.KeepRunning()) {
     if (byButton) {
       full.Unassign();
     }

@@ -83,10 +83,15 @@ class Pair {
 
 /// bench-start: needs XDG_DATA_HOME to name a folder with the program's data.
 int main(int /*argc*/, char** argv) {
+  const char* const data = std::getenv("XDG_DATA_HOME");
+  if (data == nullptr) {
+    std::fprintf(stderr, "XDG_DATA_HOME names no folder\n");
+    return 2;
+  }
   const std::filesystem::path bin = std::filesystem::canonical(argv[0]).parent_path();
   const std::string empty = bin / "bench-empty-window";
   const std::string program = bin / "bench-main-window";
-  const std::string file = std::string(std::getenv("XDG_DATA_HOME")) + "/full.xml";
+  const std::string file = std::string(data) + "/full.xml";
   FullGame full(0);
   full.CalculateScores();
   LinuxFiles().Replace(file, WriteGameFile(full.game, "None"));

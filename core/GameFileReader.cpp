@@ -19,8 +19,7 @@ std::string GetChildText(pugi::xml_node node, const char* name, const char* fall
       text += part.value();
     }
   }
-  // A reference such as "&#xD800;" names no character. Kept as it is, it would make the next saved file no
-  // UTF-8.
+  // Also for the sake of the next save: a reference such as "&#xD800;" gives bytes that are no character.
   return IsUtf8(text) ? text : Windows1252ToUtf8(text);
 }
 
@@ -51,13 +50,8 @@ bool Parse(std::string& bytes, pugi::xml_document& document) {
   constexpr unsigned int options =
       pugi::parse_default | pugi::parse_ws_pcdata_single | pugi::parse_fragment | pugi::parse_embed_pcdata;
   const bool isWide = bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF");
-  if (!isWide) {
-    if (std::memchr(bytes.data(), '\0', bytes.size()) != nullptr) {
-      return false;
-    }
-    if (!IsUtf8(bytes)) {
-      bytes = Windows1252ToUtf8(bytes);
-    }
+  if (!isWide && std::memchr(bytes.data(), '\0', bytes.size()) != nullptr) {
+    return false;
   }
   const auto encoding = isWide ? pugi::encoding_auto : pugi::encoding_utf8;
   return document.load_buffer_inplace(bytes.data(), bytes.size(), options, encoding) &&

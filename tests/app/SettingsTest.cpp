@@ -58,6 +58,7 @@ TEST_F(SettingsWindow, ShowsTheNumberInForceAndThePorts) {
   EXPECT_EQ(Entry().toolTip(), QStringLiteral("Enter a Comm Port number. Must be a number greater than 0."));
   const auto* list = window->findChild<QListWidget*>(QStringLiteral("AvailablePorts"));
   std::vector<std::string> lines;
+  lines.reserve(static_cast<std::size_t>(list->count()));
   for (int row = 0; row < list->count(); ++row) {
     lines.push_back(list->item(row)->text().toStdString());
   }

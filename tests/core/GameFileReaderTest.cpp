@@ -373,6 +373,12 @@ TEST_F(Reading, TakesWindows1252AndUtf16) {
   EXPECT_THAT(missions, ElementsAre("Café €", "任务𝄞", "任务𝄞"));
 }
 
+TEST_F(Reading, OfOneTextInWindows1252KeepsTheOthers) {
+  ASSERT_TRUE(Read(WithHeader("<MissionName>任务</MissionName><GameDate>Caf\xE9</GameDate>")));
+  EXPECT_THAT(missions, ElementsAre("任务"));
+  EXPECT_EQ(game.GameDate, "Café");
+}
+
 TEST_F(Reading, SurvivesAMillionLevels) {
   constexpr int depth = 1'000'000;
   const std::string open = Repeated("<a>", depth);

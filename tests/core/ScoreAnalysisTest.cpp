@@ -254,14 +254,28 @@ TEST(Damage, MayReachBothEndsOfTheRange) {
 }
 
 TEST(Damage, OutsideTheRangeIsAnOverflowEvenOfInactivePlayers) {
-  const std::pair<int, double> cases[] = {{Blue7, -1}, {Red1, -1},    {Red1, 1},
-                                          {Red1, 0.5}, {Red1, 1e300}, {Red1, -1e300}};
-  for (const auto& [second, factor] : cases) {
+  struct Case {
+    const char* What;
+    std::int32_t OnRed1;
+    double FriendlyFire;
+    std::int32_t OnBlue0;
+  };
+  const Case cases[] = {{"own team, whole factor", Most, 2, 0},
+                        {"own team, negative factor", Most, -2, 0},
+                        {"own team, broken factor", Most, 1.5, 0},
+                        {"own team, huge factor", 1, 1e300, 0},
+                        {"own team, huge negative", 1, -1e300, 0},
+                        {"own team, lowest by -1", Least, -1, 0},
+                        {"foes upward", -Most, -1, 1},
+                        {"foes downward", Most, -1, -2},
+                        {"unweighted upward", Most, 0, 1},
+                        {"unweighted downward", Least, 0, -1}};
+  for (const Case& one : cases) {
     ScoredGame venue;
-    venue.Factors.FriendlyFire = factor;
-    venue.game.Players(second).HitByPlayer(Red0) = Most;
-    venue.game.Players(Yellow0).HitByPlayer(Red0) = Most;
-    EXPECT_EQ(NumberThrownBy([&venue] { venue.CalculateScores(); }), 6) << second << ", " << factor;
+    venue.Factors.FriendlyFire = one.FriendlyFire;
+    venue.game.Players(Red1).HitByPlayer(Red0) = one.OnRed1;
+    venue.game.Players(Blue0).HitByPlayer(Red0) = one.OnBlue0;
+    EXPECT_EQ(NumberThrownBy([&venue] { venue.CalculateScores(); }), 6) << one.What;
   }
 }
 

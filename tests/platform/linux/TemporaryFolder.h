@@ -20,6 +20,7 @@ class TemporaryFolder {
   }
   ~TemporaryFolder() {
     std::error_code ignored;
+    std::filesystem::permissions(path_, std::filesystem::perms(0755), ignored);
     std::filesystem::remove_all(path_, ignored);
   }
   TemporaryFolder(const TemporaryFolder&) = delete;
