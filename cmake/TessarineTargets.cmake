@@ -13,8 +13,8 @@ if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
 endif()
 if(TESSARINE_SANITIZE)
   target_compile_options(tessarine_options INTERFACE
-    -fsanitize=address,undefined -fno-sanitize-recover=undefined -fno-omit-frame-pointer)
-  target_link_options(tessarine_options INTERFACE -fsanitize=address,undefined)
+    -fsanitize=address,undefined,fuzzer-no-link -fno-sanitize-recover=undefined -fno-omit-frame-pointer)
+  target_link_options(tessarine_options INTERFACE -fsanitize=address,undefined,fuzzer-no-link)
 endif()
 
 # tessarine_library(<name> <sources>...): one folder's library.
