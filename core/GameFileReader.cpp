@@ -50,7 +50,7 @@ bool Parse(std::string& bytes, pugi::xml_document& document) {
   constexpr unsigned int options =
       pugi::parse_default | pugi::parse_ws_pcdata_single | pugi::parse_fragment | pugi::parse_embed_pcdata;
   const bool isWide = bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF");
-  if (!isWide && std::memchr(bytes.data(), '\0', bytes.size()) != nullptr) {
+  if (!isWide && bytes.find('\0') != std::string::npos) {
     return false;
   }
   const auto encoding = isWide ? pugi::encoding_auto : pugi::encoding_utf8;
