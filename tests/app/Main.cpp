@@ -1,14 +1,20 @@
 #include <gtest/gtest.h>
 
 #include <QApplication>
+#include <QTemporaryDir>
 
 #include "app/Composition.h"
 
+/// Main program of the window tests: a display in memory with the screens of Screens.json, and no settings of
+/// this machine's user.
 int main(int argc, char** argv) {
-  if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM")) {
-    qputenv("QT_QPA_PLATFORM", "offscreen");
-  }
   testing::InitGoogleTest(&argc, argv);
+  const QTemporaryDir settings;
+  qputenv("XDG_CONFIG_HOME", settings.path().toLocal8Bit());
+  const QByteArray platform = qgetenv("QT_QPA_PLATFORM");
+  if (platform.isEmpty() || platform == "offscreen") {
+    qputenv("QT_QPA_PLATFORM", "offscreen:configfile=" TESSARINE_TEST_SCREENS);
+  }
   QApplication application(argc, argv);
   PrepareApplication();
   return RUN_ALL_TESTS();

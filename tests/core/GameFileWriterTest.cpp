@@ -1,8 +1,11 @@
 #include <gmock/gmock.h>
 
+#include <memory>
 #include <utility>
 
 #include "core/GameFile.h"
+#include "tests/core/Described.h"
+#include "tests/core/RandomGame.h"
 
 namespace {
 
@@ -174,6 +177,65 @@ TEST_F(Writing, IsInUtf8) {
   EXPECT_THAT(written, HasSubstr("<Name>红队</Name>"));
   EXPECT_THAT(written, HasSubstr("<PlayerID>蓝队  7</PlayerID>"));
   EXPECT_THAT(written, HasSubstr("<PlayerID>红队  0</PlayerID>"));
+}
+
+class SavedGame : public testing::Test {
+ protected:
+  /// Saves `saved`, loads it into `loaded` and returns the name of its mission.
+  std::string Reload(const Game& saved, const std::string& missionName) {
+    std::string mission;
+    EXPECT_TRUE(ReadGameFile(WriteGameFile(saved, missionName), *loaded,
+                             [&mission](const std::string& name) { mission = name; }));
+    return mission;
+  }
+
+  StringTable strings{Language::English};
+  std::unique_ptr<Game> loaded = std::make_unique<Game>(strings);
+};
+
+TEST_F(SavedGame, GivesBackEveryField) {
+  for (const int count : {0, 1, 75, PlayerCount}) {
+    const auto saved = std::make_unique<Game>(strings);
+    FillRandomly(*saved, count, static_cast<unsigned>(count));
+    saved->GameDate = "2026/11/21 下午 3:05";
+    saved->ObjectiveTeams(1) = {"红队", true, false};
+    saved->ObjectiveTeams(3) = {"Blue", false, true};
+    int number = 0;
+    for (Player& player : saved->Players) {
+      ++number;
+      player.TotalDamage = player.Soldiering = -number;
+      player.MemberIndex = player.Rank = static_cast<std::int16_t>(number);
+      player.DallasID = "EFCDAB89674523" + std::to_string(10 + number % 90);
+    }
+    loaded = std::make_unique<Game>(strings);
+    EXPECT_EQ(Reload(*saved, "城堡 & <夜>"), "城堡 & <夜>");
+    for (Player& player : saved->Players) {
+      if (!player.Active) {
+        player = Player();
+      }
+    }
+    ExpectSameGame(*loaded, *saved);
+  }
+}
+
+TEST_F(SavedGame, LosesNegativeHits) {
+  Game saved(strings);
+  saved.Players(1).Active = true;
+  saved.Players(1).HitByPlayer(9) = -4;
+  saved.Players(1).HitByPlayer(10) = 4;
+  Reload(saved, "None");
+  EXPECT_EQ(loaded->Players(1).HitByPlayer(9), 0);
+  EXPECT_EQ(loaded->Players(1).HitByPlayer(10), 4);
+}
+
+TEST_F(SavedGame, IsNotSpoiltByBytesThatAreNoCharacter) {
+  Game saved(strings);
+  ASSERT_TRUE(
+      ReadGameFile("<GameData><GameHeader><MissionName>任</MissionName><GameDate>&#xD800;</GameDate></"
+                   "GameHeader></GameData>",
+                   saved, [](const std::string&) {}));
+  EXPECT_EQ(Reload(saved, "任"), "任");
+  EXPECT_EQ(loaded->GameDate, saved.GameDate);
 }
 
 }  // namespace

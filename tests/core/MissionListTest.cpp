@@ -3,6 +3,8 @@
 #include <gmock/gmock.h>
 
 #include "core/FieldValue.h"
+#include "tests/core/RandomGame.h"
+#include "tests/core/Reckoning.h"
 #include "tests/core/ScoredGame.h"
 #include "tests/platform/linux/Thrown.h"
 
@@ -297,6 +299,27 @@ TEST_F(MissionScores, OfAVanishedMissionAreMissingWithABoxForEachPlayer) {
                                   "Mission Database Error", BoxIcon::Exclamation, BoxButtons::Ok};
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(box, box, box));
   EXPECT_EQ(venue.Board.Rows().size(), 3U);
+}
+
+TEST(RandomMissions, AgreeWithALongHandReckoning) {
+  const MissionPay pay{.Primary = {100.5, 0.5, -30.25},
+                       .Secondary = {10.5, 7, 2.5},
+                       .RespawnPenalty = 0.5,
+                       .HealPenalty = -1.25};
+  for (unsigned seed = 0; seed < 16; ++seed) {
+    SCOPED_TRACE(seed);
+    ScoredGame venue;
+    venue.AddMission("'Keep', 100.5, 10.5, 0.5, 7, -30.25, 2.5, 0.5, -1.25");
+    FillRandomly(venue.game, 60, seed);
+    for (int set = 1; set <= TeamCount; ++set) {
+      const unsigned bits = (seed * 37 + static_cast<unsigned>(set) * 11) % 13;
+      venue.game.ObjectiveTeams(set) = {venue.game.TeamNames(1 + static_cast<int>(bits % 3)), bits % 2 == 0,
+                                        bits % 5 != 0};
+    }
+    venue.Open();
+    venue.Missions->Select(2);
+    ExpectReckonedScores(venue, {.Factors = venue.Factors, .Mission = &pay});
+  }
 }
 
 }  // namespace

@@ -2,11 +2,15 @@
 
 #include <array>
 #include <cmath>
+#include <memory>
 #include <vector>
 
 #include "core/Game.h"
+#include "core/NumberForms.h"
 #include "core/ScoreList.h"
 #include "core/SoldieringFactors.h"
+#include "tests/core/Described.h"
+#include "tests/core/ScoredGame.h"
 
 // The scores of a game the long way: plain loops, every rounding written out, nothing shared with the
 // analysis.
@@ -139,3 +143,19 @@ struct Reckoning {
     return board;
   }
 };
+
+/// Scores a random game both ways and compares every field, the teams' sums and the order of the board.
+inline void ExpectReckonedScores(ScoredGame& venue, const Reckoning& reckoning) {
+  const auto reckoned = std::make_unique<Game>(venue.game);
+  const std::vector<int> board = reckoning.Score(*reckoned);
+  venue.CalculateScores();
+  ExpectSameGame(venue.game, *reckoned);
+  ASSERT_EQ(venue.Board.Rows().size(), board.size());
+  for (std::size_t row = 0; row < board.size(); ++row) {
+    const Player& player = reckoned->Players(board[row]);
+    ASSERT_EQ(venue.Cell(row, BoardColumn::Rank), std::to_string(row + 1));
+    ASSERT_EQ(venue.Cell(row, BoardColumn::Player), reckoned->DisplayName(board[row]));
+    ASSERT_EQ(venue.Cell(row, BoardColumn::Soldiering), Str(player.Soldiering));
+    ASSERT_EQ(venue.Cell(row, BoardColumn::Damage), Str(player.TotalDamage));
+  }
+}

@@ -2,6 +2,8 @@
 
 #include <gmock/gmock.h>
 
+#include "tests/core/ScoredGame.h"
+
 namespace {
 
 using testing::ElementsAre;
@@ -172,6 +174,78 @@ TEST_F(Sorting, TellsTheViewOnce) {
   list.Clear();
   EXPECT_EQ(changes, 2);
   EXPECT_TRUE(list.Rows().empty());
+}
+
+constexpr int Red0 = 1;
+constexpr int Blue0 = 33;
+constexpr int Yellow0 = 65;
+constexpr int Red32 = 97;
+constexpr int Blue95 = 224;
+
+TEST(Ranks, PutNegativeScoresLast) {
+  ScoredGame venue;
+  venue.Activate(Red0);
+  venue.Activate(Blue0);
+  venue.Activate(Yellow0).BonusPoints = -7;
+  venue.game.Players(2).HitByPlayer(Red0) = 50;
+  venue.CalculateScores();
+  EXPECT_EQ(venue.game.Players(Red0).TotalDamage, -50);
+  EXPECT_THAT(venue.Column(BoardColumn::Soldiering), ElementsAre(" 0", "-7", "-50"));
+  EXPECT_THAT(venue.Column(BoardColumn::Player), ElementsAre("Blue  0", "Yellow  0", "Red  0"));
+}
+
+TEST(Ranks, GoIntoThePlayersOwnRecordsUpToNumber31) {
+  ScoredGame venue;
+  venue.Activate(32).BonusPoints = 1;       // red 31
+  venue.Activate(64).BonusPoints = 3;       // blue 31
+  venue.Activate(Yellow0).BonusPoints = 2;  // yellow 0
+  venue.CalculateScores();
+  EXPECT_EQ(venue.game.Players(64).Rank, 1);
+  EXPECT_EQ(venue.game.Players(Yellow0).Rank, 2);
+  EXPECT_EQ(venue.game.Players(32).Rank, 3);
+}
+
+TEST(Ranks, OfNumbersFrom32UpGoIntoAnotherRecord) {
+  ScoredGame venue;
+  venue.Activate(Red32);                   // 1 + 32
+  venue.Activate(161).BonusPoints = 9;     // blue 32: 33 + 32
+  venue.Activate(Blue95).BonusPoints = 5;  // 33 + 95
+  venue.CalculateScores();
+  EXPECT_EQ(venue.game.Players(65).Rank, 1);
+  EXPECT_EQ(venue.game.Players(128).Rank, 2);
+  EXPECT_EQ(venue.game.Players(33).Rank, 3);
+  for (const int own : {Red32, 161, Blue95}) {
+    EXPECT_EQ(venue.game.Players(own).Rank, 0);
+  }
+  EXPECT_THAT(venue.Column(BoardColumn::Rank), ElementsAre("1", "2", "3"));
+}
+
+TEST(Ranks, AreConsecutiveAlsoForEqualScores) {
+  ScoredGame venue;
+  for (const int index : {3, 1, 2}) {
+    venue.Activate(index);
+  }
+  venue.CalculateScores();
+  EXPECT_THAT(venue.Column(BoardColumn::Player), ElementsAre("Red  0", "Red  1", "Red  2"));
+  EXPECT_THAT(venue.Column(BoardColumn::Rank), ElementsAre("1", "2", "3"));
+}
+
+TEST(Ranks, RunUpwardAfterAClickOnOneOfTheFirstTwoColumns) {
+  for (const int header : {1, 2}) {
+    ScoredGame venue;
+    venue.Activate(Red0).BonusPoints = 5;
+    venue.Activate(Blue0).BonusPoints = 9;
+    venue.CalculateScores();
+    SortByHeader(venue.Board, header, venue.game);
+    venue.CalculateScores();
+    EXPECT_EQ(venue.Board.SortOrder, SortOrder::Ascending);
+    EXPECT_THAT(venue.Column(BoardColumn::Soldiering), ElementsAre(" 5", " 9"));
+    EXPECT_EQ(venue.game.Players(Red0).Rank, 1);
+    SortByHeader(venue.Board, 5, venue.game);
+    venue.CalculateScores();
+    EXPECT_THAT(venue.Column(BoardColumn::Soldiering), ElementsAre(" 9", " 5"));
+    EXPECT_EQ(venue.game.Players(Blue0).Rank, 1);
+  }
 }
 
 }  // namespace
