@@ -113,7 +113,6 @@ void BaseUnitDownload::RejectFrame() {
   boxes_.Show("Checksum failed", DefaultBoxTitle, BoxIcon::Critical);
   progress_.SetStatusText("Checksum failed!");
   events_.Sleep(RejectPause);
-  buffer_[0] = 0;
 }
 
 void BaseUnitDownload::SendByte(std::uint8_t byte) {

@@ -109,11 +109,13 @@ void ScoreAnalysis::AddUpDamage() {
 void ScoreAnalysis::ScorePlayer(int index) {
   Player& player = game_.Players(index);
   const int team = TeamFromId(IdFromIndex(index));
-  ScoreList::Row& row = scoreDisplay_.AddRow();
-  row.Cells[1] = PlayerText(index);
+  // What may show a box comes before the row: a command given meanwhile can rebuild the lists.
+  std::string playerText = PlayerText(index);
   CalculateAccuracy(player);
   CalculateSoldiering(player);
   AddMissionPoints(player, game_.TeamNames(team));
+  ScoreList::Row& row = scoreDisplay_.AddRow();
+  row.Cells[1] = std::move(playerText);
   row.Cells[0] = Str(std::int32_t{player.Rank});
   row.Cells[2] = Str(player.Soldiering);
   row.Cells[3] = AccuracyText(player);

@@ -27,6 +27,6 @@ class EventPump {
   /// closes.
   virtual void Sleep(std::chrono::milliseconds time) = 0;
 
-  /// The program closes: all present and later waits return Ended, unless their condition holds.
+  /// The program closes: all present and later waits return Ended, whatever their condition.
   virtual void EndWaits() = 0;
 };

@@ -2,47 +2,18 @@
 
 #include <QCoreApplication>
 #include <QEventLoop>
+#include <QTimer>
 #include <algorithm>
 #include <limits>
 #include <thread>
 
 using std::chrono::milliseconds;
 
-class QtEventPump::OnStack {
- public:
-  explicit OnStack(QtEventPump& pump) : pump_(pump) { ++pump_.depth_; }
-  ~OnStack() {
-    if (--pump_.depth_ == 0 && pump_.OnIdle) {
-      pump_.idle_.start();
-    }
-  }
-  OnStack(const OnStack&) = delete;
-  OnStack& operator=(const OnStack&) = delete;
-
- private:
-  QtEventPump& pump_;
-};
-
-QtEventPump::QtEventPump() {
-  idle_.setSingleShot(true);
-  idle_.setInterval(0);
-  QObject::connect(&idle_, &QTimer::timeout, &idle_, [this] {
-    if (depth_ == 0 && OnIdle) {
-      OnIdle();
-    }
-  });
-}
-
 void QtEventPump::DoEvents() {
-  const OnStack onStack(*this);
   QCoreApplication::processEvents();
 }
 
 WaitResult QtEventPump::WaitFor(const std::function<bool()>& condition, milliseconds limit) {
-  if (condition()) {
-    return WaitResult::Met;
-  }
-  const OnStack onStack(*this);
   const bool endless = limit > milliseconds(std::numeric_limits<int>::max());
   QTimer timer;
   timer.setTimerType(Qt::PreciseTimer);
@@ -50,18 +21,16 @@ WaitResult QtEventPump::WaitFor(const std::function<bool()>& condition, millisec
   if (!endless) {
     timer.start(std::max(limit, milliseconds(0)));
   }
-  while (true) {
-    if (ended_) {
-      return WaitResult::Ended;
+  while (!ended_) {
+    if (condition()) {
+      return WaitResult::Met;
     }
     if (!endless && !timer.isActive()) {
       return WaitResult::TimedOut;
     }
     QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents);
-    if (condition()) {
-      return WaitResult::Met;
-    }
   }
+  return WaitResult::Ended;
 }
 
 void QtEventPump::Sleep(milliseconds time) {

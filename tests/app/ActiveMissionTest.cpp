@@ -7,8 +7,8 @@
 namespace {
 
 using testing::AllOf;
-using testing::ElementsAre;
 using testing::Each;
+using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::SizeIs;
 

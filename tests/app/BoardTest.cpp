@@ -26,8 +26,10 @@ std::string GameOfFour() {
                "<ShotCount>60</ShotCount><HealCount>1</HealCount><AmmoAddCount>2</AmmoAddCount>"
                "<DeathCount>3</DeathCount><PrimaryDamage>10</PrimaryDamage><BonusPoints>5</BonusPoints>") +
       PlayerOf(6, "<DeathCount>4</DeathCount>" + HitBy(2, 30)) +
-      PlayerOf(72, "<PrimaryDamage>5</PrimaryDamage><BonusPoints>12</BonusPoints><MemberIndex>3</MemberIndex>") +
-      PlayerOf(169, "<PrimaryDamage>20</PrimaryDamage><DallasID>AB00000000000001</DallasID>" + HitBy(2, 270)));
+      PlayerOf(72,
+               "<PrimaryDamage>5</PrimaryDamage><BonusPoints>12</BonusPoints><MemberIndex>3</MemberIndex>") +
+      PlayerOf(169,
+               "<PrimaryDamage>20</PrimaryDamage><DallasID>AB00000000000001</DallasID>" + HitBy(2, 270)));
 }
 
 class Board : public testing::Test {

@@ -119,8 +119,9 @@ TEST_F(Download, ShowsItsProgress) {
   frames = {FrameOfRed1(), FrameOfBlue0()};
   venue.Press("GetScores");
   const Shown requesting{true, "Requesting Data...", 0, 224, ""};
-  EXPECT_THAT(sawAtOutput, ElementsAre(requesting, requesting, Shown{true, "Accepting Score Data...", 1, 2, "1"},
-                                       Shown{true, "Accepting Score Data...", 2, 2, "2"}));
+  EXPECT_THAT(sawAtOutput,
+              ElementsAre(requesting, requesting, Shown{true, "Accepting Score Data...", 1, 2, "1"},
+                          Shown{true, "Accepting Score Data...", 2, 2, "2"}));
 }
 
 TEST_F(Download, LeavesTheMainWindowInTheOperatorsHands) {
@@ -139,9 +140,8 @@ TEST_F(Download, SaysWhenThereAreNoScores) {
   bool hidden = false;
   venue.Boxes.WhileOpen = [&](const auto& /*box*/) { hidden = !Progress().Visible; };
   venue.Press("GetScores");
-  EXPECT_THAT(venue.Boxes.Boxes,
-              ElementsAre(FakeMessageBoxes::Box{"Kesh has no score data.", "Tessarine", BoxIcon::Information,
-                                                BoxButtons::Ok}));
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(FakeMessageBoxes::Box{"Kesh has no score data.", "Tessarine",
+                                                                   BoxIcon::Information, BoxButtons::Ok}));
   EXPECT_TRUE(hidden);
   EXPECT_EQ(venue.RowCount("ScoreDisplay"), 0);
   ExpectUnwound();

@@ -11,8 +11,8 @@
 #include "tests/core/Frames.h"
 #include "tests/platform/qt/WhileModal.h"
 
-// A download waits on the toolkit's own event loop, as in the program; what the operator does meanwhile are events
-// in it.
+// A download waits on the toolkit's own event loop, as in the program; what the operator does meanwhile are
+// events in it.
 
 namespace {
 
@@ -26,13 +26,7 @@ class DownloadWait : public testing::Test {
   /// Presses GetScores and runs each step in a pass of its own of the wait for the first byte.
   void PressAndMeanwhile(std::vector<std::function<void()>> steps) {
     steps_ = std::move(steps);
-    QTimer timer;
-    QObject::connect(&timer, &QTimer::timeout, &timer, [this] {
-      if (stepsTaken_ < steps_.size() && venue.Port.PortOpen()) {
-        steps_[stepsTaken_++]();
-      }
-    });
-    timer.start(0);
+    TakeNextStep();
     venue.Press("GetScores");
     EXPECT_EQ(stepsTaken_, steps_.size());
   }
@@ -61,6 +55,18 @@ class DownloadWait : public testing::Test {
   Venue venue{Language::English, Waits::Real};
 
  private:
+  // Each step comes from a timer of its own: one that waits inside its step does not hold up the next.
+  void TakeNextStep() {
+    QTimer::singleShot(0, venue.Window.get(), [this] {
+      if (!venue.Port.PortOpen()) {
+        TakeNextStep();
+      } else if (stepsTaken_ < steps_.size()) {
+        TakeNextStep();
+        steps_[stepsTaken_++]();
+      }
+    });
+  }
+
   std::vector<std::function<void()>> steps_;
   std::size_t stepsTaken_ = 0;
 };

@@ -42,8 +42,8 @@ class GameFileCommands : public testing::Test {
 TEST_F(GameFileCommands, AskWithTheirFilter) {
   venue.Trigger("mnuLoadScores");
   venue.Trigger("mnuSaveScores");
-  EXPECT_THAT(venue.Dialog.Calls, ElementsAre(FakeFileDialog::Call{false, Filter, ""},
-                                              FakeFileDialog::Call{true, Filter, ""}));
+  EXPECT_THAT(venue.Dialog.Calls,
+              ElementsAre(FakeFileDialog::Call{false, Filter, ""}, FakeFileDialog::Call{true, Filter, ""}));
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
@@ -64,11 +64,12 @@ TEST_F(GameFileCommands, ReplaceTheGameOnTheBoardByTheLoadedOne) {
 }
 
 TEST_F(GameFileCommands, LoadWhatTheySaved) {
-  venue.LoadGame(GameFile("<Player><Index>2</Index><Active>1</Active><ShotCount>9</ShotCount>"
-                          "<HitData><HitByPlayer><Index>33</Index><Amount>70</Amount></HitByPlayer></HitData>"
-                          "<Committed>1</Committed><PrimaryDamage>7</PrimaryDamage></Player>" +
-                              PlayerOf(33, "<ShotCount>4</ShotCount><PrimaryDamage>10</PrimaryDamage>"),
-                          "Signal Fires"));
+  venue.LoadGame(
+      GameFile("<Player><Index>2</Index><Active>1</Active><ShotCount>9</ShotCount>"
+               "<HitData><HitByPlayer><Index>33</Index><Amount>70</Amount></HitByPlayer></HitData>"
+               "<Committed>1</Committed><PrimaryDamage>7</PrimaryDamage></Player>" +
+                   PlayerOf(33, "<ShotCount>4</ShotCount><PrimaryDamage>10</PrimaryDamage>"),
+               "Signal Fires"));
   const auto blue = venue.Row("ScoreDisplay", 0);
   const auto red = venue.Row("ScoreDisplay", 1);
   ASSERT_EQ(blue[4], " 70");

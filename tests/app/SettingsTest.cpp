@@ -103,8 +103,7 @@ TEST_F(SettingsWindow, ShowsTheTwoFixedLinesWithoutAnyPort) {
 
 TEST_F(SettingsWindow, LetsNobodyChooseInTheList) {
   Open();
-  QTest::mouseClick(Ports().viewport(), Qt::LeftButton, {},
-                    Ports().visualItemRect(Ports().item(3)).center());
+  QTest::mouseClick(Ports().viewport(), Qt::LeftButton, {}, Ports().visualItemRect(Ports().item(3)).center());
   EXPECT_THAT(Ports().selectedItems(), IsEmpty());
   EXPECT_EQ(Entry().text(), QStringLiteral("1"));
 }

@@ -67,14 +67,14 @@ TEST_F(SoldieringCalcWindow, ExplainsItselfInFull) {
     }
   }
   EXPECT_THAT(
-      texts,
-      ElementsAre("These values determine how the value of Soldiering is calculated.  For every point of each "
-                  "quantity listed on the left, the number inside the corresponding box will be multiplied by "
-                  "the count of that quantity and then added to the soldiering value. ",
-                  "For example, if you put a value of 5 in for Total damage, and the player got 100 points of "
-                  "Total Damage, then the Soldiering value will be increased by a value of 500 (which is 5 X "
-                  "100.)",
-                  "Use positive values for rewards, and negative values for penalties."));
+      texts, ElementsAre(
+                 "These values determine how the value of Soldiering is calculated.  For every point of each "
+                 "quantity listed on the left, the number inside the corresponding box will be multiplied by "
+                 "the count of that quantity and then added to the soldiering value. ",
+                 "For example, if you put a value of 5 in for Total damage, and the player got 100 points of "
+                 "Total Damage, then the Soldiering value will be increased by a value of 500 (which is 5 X "
+                 "100.)",
+                 "Use positive values for rewards, and negative values for penalties."));
 }
 
 TEST_F(SoldieringCalcWindow, ShowsTheFactorsWithoutTheLeadingBlank) {
@@ -136,7 +136,8 @@ class SoldieringCalcCommand : public testing::Test {
  protected:
   SoldieringCalcCommand() {
     venue.PutDefaultFiles();
-    WriteFile(venue.DataFile("tessarine.ini"), "[soldiering_calc]\nfriendly_fire_factor=-.5\n[other]\nkey=1\n");
+    WriteFile(venue.DataFile("tessarine.ini"),
+              "[soldiering_calc]\nfriendly_fire_factor=-.5\n[other]\nkey=1\n");
     venue.Start();
   }
 

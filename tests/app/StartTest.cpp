@@ -2,6 +2,8 @@
 
 #include <QGuiApplication>
 #include <QScreen>
+#include <algorithm>
+#include <stdexcept>
 
 #include "tests/app/Venue.h"
 #include "tests/platform/linux/Thrown.h"
@@ -22,10 +24,16 @@ class Start : public testing::Test {
     return {start + venue.DataFolder() + ".", "Database status", BoxIcon::Information, BoxButtons::Ok};
   }
 
-  /// Starts with the window on the screen of Screens.json at this place; returns the window's geometry then.
-  QRect StartOnScreen(qsizetype screen) {
+  /// Starts with the window on the screen of this name in Screens.json; returns the window's geometry then.
+  QRect StartOnScreen(const QString& name) {
     venue.PutDefaultFiles();
-    venue.MakeWindow().setScreen(QGuiApplication::screens().at(screen));
+    const QList<QScreen*> screens = QGuiApplication::screens();
+    const auto screen = std::find_if(screens.begin(), screens.end(),
+                                     [&](const QScreen* each) { return each->name() == name; });
+    if (screen == screens.end()) {
+      throw std::logic_error("No such screen: " + name.toStdString());
+    }
+    venue.MakeWindow().setScreen(*screen);
     venue.Window->move(100, 90);
     before = venue.Window->geometry();
     venue.Window->FormLoad();
@@ -68,20 +76,20 @@ TEST_F(Start, ReplacesOnlyWhatIsMissing) {
 }
 
 TEST_F(Start, OnALargeScreenWarnsOfNothingAndKeepsItsSize) {
-  const QRect after = StartOnScreen(0);
+  const QRect after = StartOnScreen(QStringLiteral("recommended or better"));
   EXPECT_EQ(after, before);
   EXPECT_FALSE(Maximised());
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
 TEST_F(Start, OnTheRecommendedScreenIsMaximisedWithoutAWarning) {
-  StartOnScreen(1);
+  StartOnScreen(QStringLiteral("as recommended"));
   EXPECT_TRUE(Maximised());
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
 TEST_F(Start, OnATooSmallScreenWarnsAndLimitsWidthAndHeight) {
-  const QRect after = StartOnScreen(2);
+  const QRect after = StartOnScreen(QStringLiteral("too small"));
   EXPECT_EQ(after.topLeft(), QPoint(0, 0));
   EXPECT_EQ(after.width(), 800);
   EXPECT_LT(after.height(), 600);
@@ -91,7 +99,7 @@ TEST_F(Start, OnATooSmallScreenWarnsAndLimitsWidthAndHeight) {
 }
 
 TEST_F(Start, OnATooLowScreenLimitsTheHeightOnly) {
-  const QRect after = StartOnScreen(3);
+  const QRect after = StartOnScreen(QStringLiteral("too low"));
   EXPECT_EQ(after.left(), before.left());
   EXPECT_EQ(after.width(), before.width());
   EXPECT_EQ(after.top(), 0);
@@ -101,7 +109,7 @@ TEST_F(Start, OnATooLowScreenLimitsTheHeightOnly) {
 }
 
 TEST_F(Start, OnATooNarrowScreenLimitsTheWidthOnly) {
-  const QRect after = StartOnScreen(4);
+  const QRect after = StartOnScreen(QStringLiteral("too narrow"));
   EXPECT_EQ(after.left(), 0);
   EXPECT_EQ(after.width(), 900);
   EXPECT_EQ(after.top(), before.top());

@@ -152,6 +152,5 @@ inline std::string PlayerOf(int index, const std::string& fields = {}) {
 
 /// Red 0 with 5 points and Blue 7 with 9.
 inline std::string SmallGame() {
-  return GameFile(PlayerOf(1, "<BonusPoints>5</BonusPoints>") +
-                  PlayerOf(40, "<BonusPoints>9</BonusPoints>"));
+  return GameFile(PlayerOf(1, "<BonusPoints>5</BonusPoints>") + PlayerOf(40, "<BonusPoints>9</BonusPoints>"));
 }

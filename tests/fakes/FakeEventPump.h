@@ -32,7 +32,6 @@ class FakeEventPump : public EventPump {
   /// Number of waits and long pauses that are on the stack.
   int Depth() const { return depth_; }
 
-  /// The program closes: all present and later waits return Ended, unless their condition holds.
   void EndWaits() override { ended_ = true; }
 
   void DoEvents() override {
@@ -50,11 +49,11 @@ class FakeEventPump : public EventPump {
     const Time deadline = limit > Time::max() - now_ ? Time::max() : now_ + limit;
     const OnStack onStack(depth_);
     while (true) {
-      if (condition()) {
-        return WaitResult::Met;
-      }
       if (ended_) {
         return WaitResult::Ended;
+      }
+      if (condition()) {
+        return WaitResult::Met;
       }
       if (events_.empty() || events_.begin()->first > deadline) {
         if (deadline == Time::max()) {

@@ -110,7 +110,7 @@ TYPED_TEST(EventPumpTest, EndsAllWaitsWhenTheProgramCloses) {
   EXPECT_EQ(this->Pump_.WaitFor([] { return false; }, 60s), WaitResult::Ended);
   EXPECT_EQ(inner, WaitResult::Ended);
   EXPECT_EQ(this->Pump_.WaitFor([] { return false; }, 60s), WaitResult::Ended);
-  EXPECT_EQ(this->Pump_.WaitFor([] { return true; }, 60s), WaitResult::Met);
+  EXPECT_EQ(this->Pump_.WaitFor([] { return true; }, 60s), WaitResult::Ended);
 }
 
 TYPED_TEST(EventPumpTest, ALongPauseServesEventsAndAShortOneDoesNot) {
