@@ -17,7 +17,7 @@ ScoreListModel::ScoreListModel(ScoreList& list, const Game& game, QStringList he
       teamColumn_(teamColumn) {
   list_.Changed = [this] {
     beginResetModel();
-    shownRows_ = static_cast<int>(list_.Rows().size());
+    shownRows_ = list_.RowCount();
     endResetModel();
   };
 }
@@ -35,11 +35,10 @@ int ScoreListModel::columnCount(const QModelIndex& parent) const {
 }
 
 QVariant ScoreListModel::data(const QModelIndex& index, int role) const {
-  const auto row = static_cast<std::size_t>(index.row());
-  if (!index.isValid() || row >= list_.Rows().size()) {
+  if (!index.isValid() || index.row() >= list_.RowCount()) {
     return {};
   }
-  const ScoreList::Row& shown = list_.Rows()[row];
+  const ScoreList::Row& shown = list_.RowAt(index.row());
   const int column = index.column();
   switch (role) {
     case Qt::DisplayRole:

@@ -17,45 +17,23 @@ void AddTo(std::int32_t& sum, std::int32_t amount) {
 
 /// Shooters stand in blocks of 32 that belong to one team each.
 constexpr int BlockSize = 32;
-constexpr int BlockCount = PlayerCount / BlockSize;
 
-using BlockSums = std::array<std::int32_t, BlockSize>;
+/// Damage that each player dealt to foes and to the own team, by record index less 1.
+struct DealtDamage {
+  std::array<std::int32_t, PlayerCount> ToFoes{};
+  std::array<std::int32_t, PlayerCount> ToOwnTeam{};
+};
 
-/// Written so that the compiler adds several shooters at a time: overflows are gathered, and looked at once a
-/// block.
-void AddHits(BlockSums& sums, const std::int32_t* hits) {
-  std::uint32_t overflows = 0;
+/// Adds one victim's hits. Returns false when one is negative or a sum has left the 32-bit range. Written so
+/// that the compiler adds several at a time.
+bool AddHits(std::int32_t* sums, const std::int32_t* hits) {
+  std::uint32_t signs = 0;
   for (int i = 0; i < BlockSize; ++i) {
-    const auto before = static_cast<std::uint32_t>(sums[i]);
-    const auto hit = static_cast<std::uint32_t>(hits[i]);
-    const std::uint32_t after = before + hit;
-    overflows |= (after ^ before) & (after ^ hit);
-    sums[i] = static_cast<std::int32_t>(after);
+    const std::uint32_t sum = static_cast<std::uint32_t>(sums[i]) + static_cast<std::uint32_t>(hits[i]);
+    signs |= sum | static_cast<std::uint32_t>(hits[i]);
+    sums[i] = static_cast<std::int32_t>(sum);
   }
-  if (overflows >= 0x80000000U) {
-    throw RuntimeError(6);
-  }
-}
-
-/// Own-team hits are weighted and rounded each by itself: half a point twice is nothing.
-void AddOwnTeamHits(BlockSums& sums, const std::int32_t* hits, double factor) {
-  if (std::abs(factor) <= std::numeric_limits<std::int32_t>::max() && std::trunc(factor) == factor) {
-    // The usual case: exact in integers, and many times faster.
-    const auto wholeFactor = static_cast<std::int64_t>(factor);
-    bool overflow = false;
-    for (int i = 0; i < BlockSize; ++i) {
-      const std::int64_t sum = hits[i] * wholeFactor + sums[i];
-      sums[i] = static_cast<std::int32_t>(sum);
-      overflow |= sums[i] != sum;
-    }
-    if (overflow) {
-      throw RuntimeError(6);
-    }
-    return;
-  }
-  for (int i = 0; i < BlockSize; ++i) {
-    sums[i] = RoundToInt32(hits[i] * static_cast<long double>(factor) + sums[i]);
-  }
+  return signs <= std::numeric_limits<std::int32_t>::max();
 }
 
 }  // namespace
@@ -79,31 +57,61 @@ void ScoreAnalysis::CalculateScores() {
 }
 
 void ScoreAnalysis::AddUpDamage() {
-  const bool everyoneIsAFoe = missions_.ListIndex() == MissionList::FreeForAll;
-  std::array<std::int16_t, BlockCount> teamOfBlock{};
-  for (int block = 0; block < BlockCount; ++block) {
-    teamOfBlock[block] = TeamFromId(IdFromIndex(block * BlockSize + 1));
+  if (!AddUpDamageAtOnce()) {
+    AddUpDamageHitByHit();
   }
-  std::array<BlockSums, BlockCount> total{};
-  std::array<BlockSums, BlockCount> absolute{};
-  // Each shooter's sums grow in the order of the victims, which is how the matrix lies in memory.
-  for (int victim = 0; victim < PlayerCount; ++victim) {
+}
+
+bool ScoreAnalysis::AddUpDamageAtOnce() {
+  // Whole factors need no rounding, so the order of the hits does not matter unless a sum on the way could
+  // leave the range.
+  const bool isWhole = std::trunc(factors_.FriendlyFire) == factors_.FriendlyFire;
+  DealtDamage dealt;
+  bool inRange = isWhole && std::abs(factors_.FriendlyFire) <= std::numeric_limits<std::int32_t>::max();
+  for (int victim = 0; victim < PlayerCount && inRange; ++victim) {
     const std::int32_t* hits = &*game_.Players(victim + 1).HitByPlayer.begin();
-    const int victimsTeam = teamOfBlock[victim / BlockSize];
-    for (int block = 0; block < BlockCount; ++block, hits += BlockSize) {
-      if (!everyoneIsAFoe && teamOfBlock[block] == victimsTeam) {
-        AddOwnTeamHits(total[block], hits, factors_.FriendlyFire);
-      } else {
-        AddHits(total[block], hits);
-      }
-      AddHits(absolute[block], hits);
+    for (int first = 0; first < PlayerCount; first += BlockSize) {
+      auto& sums = IsOwnTeamHit(victim + 1, first + 1) ? dealt.ToOwnTeam : dealt.ToFoes;
+      inRange &= AddHits(&sums[first], hits + first);
     }
   }
-  for (int shooter = 0; shooter < PlayerCount; ++shooter) {
+  const auto factor = inRange ? static_cast<std::int64_t>(factors_.FriendlyFire) : 0;
+  for (int shooter = 0; shooter < PlayerCount && inRange; ++shooter) {
+    const std::int64_t toFoes = dealt.ToFoes[shooter];
+    const std::int64_t toOwnTeam = dealt.ToOwnTeam[shooter];
+    inRange = std::abs(toOwnTeam * factor) + toFoes + toOwnTeam <= std::numeric_limits<std::int32_t>::max();
     Player& player = game_.Players(shooter + 1);
-    player.TotalDamage = total[shooter / BlockSize][shooter % BlockSize];
-    player.AbsoluteDamage = absolute[shooter / BlockSize][shooter % BlockSize];
+    player.TotalDamage = static_cast<std::int32_t>(toFoes + toOwnTeam * factor);
+    player.AbsoluteDamage = static_cast<std::int32_t>(toFoes + toOwnTeam);
   }
+  return inRange;
+}
+
+void ScoreAnalysis::AddUpDamageHitByHit() {
+  for (Player& player : game_.Players) {
+    player.TotalDamage = 0;
+    player.AbsoluteDamage = 0;
+  }
+  // Each shooter's sums grow in the order of the victims, which is how the matrix lies in memory.
+  for (int victim = 1; victim <= PlayerCount; ++victim) {
+    for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
+      const std::int32_t hit = game_.Players(victim).HitByPlayer(shooter);
+      Player& player = game_.Players(shooter);
+      if (IsOwnTeamHit(victim, shooter)) {
+        // Rounded each by itself: half a point twice is nothing.
+        player.TotalDamage =
+            RoundToInt32(hit * static_cast<long double>(factors_.FriendlyFire) + player.TotalDamage);
+      } else {
+        AddTo(player.TotalDamage, hit);
+      }
+      AddTo(player.AbsoluteDamage, hit);
+    }
+  }
+}
+
+bool ScoreAnalysis::IsOwnTeamHit(int victim, int shooter) const {
+  return missions_.ListIndex() != MissionList::FreeForAll &&
+         TeamFromId(IdFromIndex(victim)) == TeamFromId(IdFromIndex(shooter));
 }
 
 void ScoreAnalysis::ScorePlayer(int index) {

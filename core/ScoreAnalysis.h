@@ -40,6 +40,12 @@ class ScoreAnalysis {
   };
 
   void AddUpDamage();
+  /// The fast way for the usual game. Returns false, with nothing worth keeping, where only the other way
+  /// gives the right figures or the right failure.
+  bool AddUpDamageAtOnce();
+  void AddUpDamageHitByHit();
+  /// True when friendly fire counts: the mode is not a free-for-all, and both are of one team.
+  bool IsOwnTeamHit(int victim, int shooter) const;
   void ScorePlayer(int index);
   std::string PlayerText(int index);
   void CalculateAccuracy(Player& player) const;

@@ -45,38 +45,30 @@ void StoreRank(std::string_view playerText, std::int16_t rank, Game& game) {
 void ScoreList::Clear() {
   rows_.clear();
   rows_.reserve(PlayerCount);
+  order_.clear();
   NotifyChanged();
 }
 
 ScoreList::Row& ScoreList::AddRow() {
-  Row& row = rows_.emplace_back();
-  row.Added = static_cast<int>(rows_.size());
-  return row;
+  order_.push_back(rows_.size());
+  return rows_.emplace_back();
 }
 
 void ScoreList::Sort(int column) {
   struct Entry {
     double Key;
-    Row* Contents;
+    std::size_t Index;
   };
-  std::vector<Entry> entries;
-  entries.reserve(rows_.size());
-  for (Row& row : rows_) {
-    entries.push_back({SortKey(row.Cells[static_cast<std::size_t>(column)], column == 0), &row});
+  std::vector<Entry> entries(rows_.size());
+  for (std::size_t index = 0; index < rows_.size(); ++index) {
+    entries[index] = {SortKey(rows_[index].Cells[static_cast<std::size_t>(column)], column == 0), index};
   }
   const bool ascending = SortOrder == ::SortOrder::Ascending;
   std::sort(entries.begin(), entries.end(), [ascending](const Entry& left, const Entry& right) {
-    if (left.Key == right.Key) {
-      return left.Contents->Added < right.Contents->Added;
-    }
-    return (left.Key < right.Key) == ascending;
+    return left.Key == right.Key ? left.Index < right.Index : (left.Key < right.Key) == ascending;
   });
-  std::vector<Row> sorted;
-  sorted.reserve(rows_.size());
-  for (const Entry& entry : entries) {
-    sorted.push_back(std::move(*entry.Contents));
-  }
-  rows_ = std::move(sorted);
+  std::transform(entries.begin(), entries.end(), order_.begin(),
+                 [](const Entry& entry) { return entry.Index; });
 }
 
 void ScoreList::NotifyChanged() const {
@@ -88,7 +80,8 @@ void ScoreList::NotifyChanged() const {
 void SortListNumeric(ScoreList& list, int column, bool assignRanks, Game& game) {
   list.Sort(std::max(column, 0));
   std::int16_t place = 0;
-  for (ScoreList::Row& row : list.rows_) {
+  for (const std::size_t index : list.order_) {
+    ScoreList::Row& row = list.rows_[index];
     ++place;
     if (column < 1) {
       game.Players(place).Rank = place;

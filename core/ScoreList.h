@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <cstddef>
 #include <functional>
 #include <string>
 #include <vector>
@@ -11,23 +12,24 @@ inline constexpr int BoardColumnCount = 9;
 
 enum class SortOrder { Ascending, Descending };
 
-/// The contents of a score list as the operator sees it: rows of texts, the first being the row text, in
-/// shown order.
+/// The contents of a score list as the operator sees it: rows of texts, the first being the row text.
 class ScoreList {
  public:
   struct Row {
     std::array<std::string, BoardColumnCount>
-        Cells;      ///< a list with fewer columns leaves the last ones empty
-    int Added = 0;  ///< place in the order of adding
+        Cells;  ///< a list with fewer columns leaves the last ones empty
   };
 
   ::SortOrder SortOrder = ::SortOrder::Descending;
   std::function<void()> Changed;  ///< called when the rows have new contents or a new order; may be empty
 
-  const std::vector<Row>& Rows() const { return rows_; }
+  int RowCount() const { return static_cast<int>(order_.size()); }
+
+  /// The row at a place from the top, counted from 0.
+  const Row& RowAt(int place) const { return rows_[order_.at(static_cast<std::size_t>(place))]; }
 
   void Clear();
-  /// Adds a row of empty cells. The reference holds until the next change of the list.
+  /// Adds a row of empty cells at the end. The reference holds until the next change of the list.
   Row& AddRow();
 
  private:
@@ -36,7 +38,8 @@ class ScoreList {
   void Sort(int column);
   void NotifyChanged() const;
 
-  std::vector<Row> rows_;
+  std::vector<Row> rows_;           ///< in the order of adding
+  std::vector<std::size_t> order_;  ///< indexes into `rows_` as shown
 };
 
 /// Sorts by the numbers in `column` (0 = row text) in the list's present direction. A cell that is a number

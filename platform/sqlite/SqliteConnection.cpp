@@ -109,6 +109,7 @@ void SqliteConnection::CheckWholePages() {
 }
 
 SqliteConnection::~SqliteConnection() {
+  dataVersion_ = SqliteStatement();
   sqlite3_close_v2(handle_);
 }
 
@@ -142,6 +143,16 @@ void SqliteConnection::EndRead() noexcept {
 void SqliteConnection::PrepareRead() {
   if (readers_ > 0 && sqlite3_get_autocommit(handle_) != 0) {
     Execute("BEGIN");
+    if (!dataVersion_) {
+      dataVersion_ = SqliteStatement(*this, "PRAGMA data_version");
+    }
+    dataVersion_.Step();
+    const std::int64_t version = dataVersion_.Integer(0);
+    dataVersion_.Reset();
+    if (version != versionRead_) {
+      versionRead_ = version;
+      LeaveState();
+    }
   }
 }
 
@@ -173,6 +184,7 @@ void SqliteConnection::Fail() {
 
 WriteTransaction::WriteTransaction(SqliteConnection& connection) : connection_(connection) {
   connection.Rollback();
+  connection.LeaveState();
   connection.Execute("BEGIN IMMEDIATE");
 }
 

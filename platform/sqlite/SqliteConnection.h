@@ -31,6 +31,13 @@ class SqliteConnection {
 
   /// To be called before each read: inside a group of reads takes the lock where it is not held.
   void PrepareRead();
+  /// True inside a group of reads: then nobody but this connection can change the file after PrepareRead.
+  bool InGroup() const { return readers_ > 0; }
+  /// A number for the state of the file that a group of reads sees; another one whenever a row may have
+  /// changed.
+  std::uint64_t State() const { return state_; }
+  /// To be called before each write.
+  void LeaveState() { ++state_; }
   /// Ends the open transaction, if any: what was written is undone, and a group of reads lets go of its lock
   /// until its next read.
   void Rollback() noexcept;
@@ -49,6 +56,9 @@ class SqliteConnection {
   std::string path_;
   sqlite3* handle_ = nullptr;
   int readers_ = 0;
+  SqliteStatement dataVersion_;
+  std::int64_t versionRead_ = 0;  ///< counts the changes by others
+  std::uint64_t state_ = 1;
 };
 
 /// Writes that reach the file together when Commit returns, or not at all.

@@ -29,7 +29,7 @@ SqliteRecordset::SqliteRecordset(SqliteConnection& connection, const std::string
       table_(connection, table),
       walks_(table_.Columns().size()),
       wanted_(table_.Columns().size()),
-      row_(table_.Columns().size()),
+      ownRow_(table_.Columns().size()),
       pending_(connection, table_) {
   ReadKeys(condition);
   if (keys_.Size() != 0) {
@@ -71,7 +71,7 @@ void SqliteRecordset::GoToEnd() {
 }
 
 void SqliteRecordset::ForgetRow() {
-  rowRead_ = false;
+  row_ = nullptr;
   longValues_.clear();
 }
 
@@ -163,6 +163,28 @@ bool SqliteRecordset::WalkToKey(std::int64_t key) {
 }
 
 bool SqliteRecordset::WalkToValue(std::size_t column, const Value& value) {
+  const auto* text = std::get_if<std::string>(&value);
+  if (text == nullptr || !connection_.InGroup()) {
+    return WalkToPosition(FirstWith(column, value));
+  }
+  connection_.PrepareRead();
+  cache_.Enter(connection_.State());
+  if (const auto* found = cache_.Found(column, *text)) {
+    return WalkToPosition(*found);
+  }
+  const std::optional<std::size_t> position = FirstWith(column, value);
+  cache_.AddFound(column, *text, position);
+  return WalkToPosition(position);
+}
+
+bool SqliteRecordset::WalkToPosition(std::optional<std::size_t> position) {
+  if (position) {
+    GoTo(*position);
+  }
+  return position.has_value();
+}
+
+std::optional<std::size_t> SqliteRecordset::FirstWith(std::size_t column, const Value& value) {
   SqliteStatement& walk = walks_[column];
   if (!walk) {
     connection_.PrepareRead();
@@ -171,11 +193,7 @@ bool SqliteRecordset::WalkToValue(std::size_t column, const Value& value) {
                                             "] = ?1 COLLATE BINARY ORDER BY rowid");
   }
   walk.Bind(1, value);
-  const std::optional<std::size_t> position = FirstPosition(walk);
-  if (position) {
-    GoTo(*position);
-  }
-  return position.has_value();
+  return FirstPosition(walk);
 }
 
 std::int64_t SqliteRecordset::CurrentKey() const {
@@ -187,10 +205,23 @@ std::int64_t SqliteRecordset::CurrentKey() const {
 
 bool SqliteRecordset::TryReadRow() {
   const std::int64_t key = CurrentKey();
-  if (rowRead_) {
+  if (row_ != nullptr) {
     return true;
   }
   connection_.PrepareRead();
+  if (!connection_.InGroup()) {
+    row_ = ReadInto(ownRow_, key) ? &ownRow_ : nullptr;
+    return row_ != nullptr;
+  }
+  cache_.Enter(connection_.State());
+  row_ = cache_.Row(key);
+  if (row_ == nullptr && ReadInto(ownRow_, key)) {
+    row_ = &(cache_.AddRow(key) = ownRow_);
+  }
+  return row_ != nullptr;
+}
+
+bool SqliteRecordset::ReadInto(std::vector<Value>& row, std::int64_t key) {
   if (!read_) {
     std::string list;
     for (std::size_t i = 0; i < wanted_.size(); ++i) {
@@ -207,10 +238,9 @@ bool SqliteRecordset::TryReadRow() {
   int read = 1;
   for (std::size_t i = 0; i < wanted_.size(); ++i) {
     if (wanted_[i]) {
-      read_.Read(read++, row_[i]);
+      read_.Read(read++, row[i]);
     }
   }
-  rowRead_ = true;
   return true;
 }
 
@@ -257,10 +287,11 @@ const Value& SqliteRecordset::Fields(std::string_view column) {
   if (!wanted_[i]) {
     wanted_[i] = true;
     read_ = SqliteStatement();
-    rowRead_ = false;
+    row_ = nullptr;
+    cache_.Clear();
   }
   ReadRow();
-  return row_[i];
+  return (*row_)[i];
 }
 
 void SqliteRecordset::AddNew() {

@@ -11,6 +11,7 @@
 #include "platform/Database.h"
 #include "platform/sqlite/KeySet.h"
 #include "platform/sqlite/PendingRow.h"
+#include "platform/sqlite/RowCache.h"
 #include "platform/sqlite/SqliteConnection.h"
 #include "platform/sqlite/SqliteTable.h"
 
@@ -60,9 +61,12 @@ class SqliteRecordset : public Recordset {
   std::optional<std::size_t> FirstPosition(SqliteStatement& search);
   bool WalkToKey(std::int64_t key);
   bool WalkToValue(std::size_t column, const Value& value);
+  bool WalkToPosition(std::optional<std::size_t> position);
+  std::optional<std::size_t> FirstWith(std::size_t column, const Value& value);
 
   std::int64_t CurrentKey() const;
   bool TryReadRow();
+  bool ReadInto(std::vector<Value>& row, std::int64_t key);
   void ReadRow();
   const Value& LongValue(std::size_t column);
   [[noreturn]] void FailDeleted();
@@ -84,8 +88,9 @@ class SqliteRecordset : public Recordset {
   std::vector<SqliteStatement> walks_;
   std::vector<bool> wanted_;
   SqliteStatement read_;
-  std::vector<Value> row_;
-  bool rowRead_ = false;
+  std::vector<Value> ownRow_;                ///< a row that was read outside of a group of reads
+  const std::vector<Value>* row_ = nullptr;  ///< the current row once it is read
+  RowCache cache_;
   std::map<std::size_t, Value> longValues_;
 
   PendingRow pending_;

@@ -71,6 +71,11 @@ SqliteTable::SqliteTable(SqliteConnection& connection, const std::string& name) 
 }
 
 std::size_t SqliteTable::ColumnAt(std::string_view name) const {
+  for (std::size_t i = 0; i < columns_.size(); ++i) {  // as it is usually written
+    if (columns_[i].Name == name) {
+      return i;
+    }
+  }
   for (std::size_t i = 0; i < columns_.size(); ++i) {
     const std::string& own = columns_[i].Name;
     if (own.size() == name.size() && strncasecmp(own.data(), name.data(), name.size()) == 0) {

@@ -298,7 +298,7 @@ TEST_F(MissionScores, OfAVanishedMissionAreMissingWithABoxForEachPlayer) {
   const FakeMessageBoxes::Box box{"Could not locate selected Mission in Mission Database",
                                   "Mission Database Error", BoxIcon::Exclamation, BoxButtons::Ok};
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(box, box, box));
-  EXPECT_EQ(venue.Board.Rows().size(), 3U);
+  EXPECT_EQ(venue.Board.RowCount(), 3);
 }
 
 TEST(RandomMissions, AgreeWithALongHandReckoning) {

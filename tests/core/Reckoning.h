@@ -150,7 +150,7 @@ inline void ExpectReckonedScores(ScoredGame& venue, const Reckoning& reckoning) 
   const std::vector<int> board = reckoning.Score(*reckoned);
   venue.CalculateScores();
   ExpectSameGame(venue.game, *reckoned);
-  ASSERT_EQ(venue.Board.Rows().size(), board.size());
+  ASSERT_EQ(venue.Board.RowCount(), static_cast<int>(board.size()));
   for (std::size_t row = 0; row < board.size(); ++row) {
     const Player& player = reckoned->Players(board[row]);
     ASSERT_EQ(venue.Cell(row, BoardColumn::Rank), std::to_string(row + 1));

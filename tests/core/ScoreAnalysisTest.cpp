@@ -52,7 +52,7 @@ TEST(CalculateScores, WithoutPlayersShowsThreeTeamsWithNothing) {
   for (const Language language : {Language::English, Language::SimplifiedChinese}) {
     ScoredGame venue(language);
     venue.CalculateScores();
-    EXPECT_THAT(venue.Board.Rows(), IsEmpty());
+    EXPECT_EQ(venue.Board.RowCount(), 0);
     const bool english = language == Language::English;
     EXPECT_THAT(venue.TeamCells(), ElementsAre(ElementsAre("1", english ? "Red" : "红队", " 0"),
                                                ElementsAre("2", english ? "Blue" : "蓝队", " 0"),
@@ -103,10 +103,10 @@ TEST(CalculateScores, ChangesNothingWhenRepeated) {
 TEST(CalculateScores, TellsTheViewsOfBothListsInTheEnd) {
   ScoredGame venue;
   venue.Activate(Red0);
-  std::size_t boardRows = 99;
-  std::size_t teamRows = 99;
-  venue.Board.Changed = [&] { boardRows = venue.Board.Rows().size(); };
-  venue.Teams.Changed = [&] { teamRows = venue.Teams.Rows().size(); };
+  int boardRows = 99;
+  int teamRows = 99;
+  venue.Board.Changed = [&] { boardRows = venue.Board.RowCount(); };
+  venue.Teams.Changed = [&] { teamRows = venue.Teams.RowCount(); };
   venue.CalculateScores();
   EXPECT_EQ(boardRows, 1U);
   EXPECT_EQ(teamRows, 3U);
@@ -200,7 +200,7 @@ TEST(Damage, OfInactivePlayersIsRewrittenToo) {
   EXPECT_EQ(venue.game.Players(Red0).TotalDamage, 0);
   EXPECT_EQ(venue.game.Players(Red0).AbsoluteDamage, 0);
   EXPECT_EQ(venue.game.Players(Red1).TotalDamage, 4);
-  EXPECT_THAT(venue.Board.Rows(), IsEmpty());
+  EXPECT_EQ(venue.Board.RowCount(), 0);
 }
 
 TEST(Damage, MayReachBothEndsOfTheRange) {

@@ -20,8 +20,8 @@ class Sorting : public testing::Test {
 
   std::vector<std::string> Column(int column) const {
     std::vector<std::string> cells;
-    for (const ScoreList::Row& row : list.Rows()) {
-      cells.push_back(row.Cells[static_cast<std::size_t>(column)]);
+    for (int place = 0; place < list.RowCount(); ++place) {
+      cells.push_back(list.RowAt(place).Cells[static_cast<std::size_t>(column)]);
     }
     return cells;
   }
@@ -150,7 +150,7 @@ TEST_F(Sorting, OfAnEmptyListIsNoFault) {
   for (int header = 1; header <= 9; ++header) {
     SortByHeader(list, header, game);
   }
-  EXPECT_TRUE(list.Rows().empty());
+  EXPECT_EQ(list.RowCount(), 0);
 }
 
 TEST_F(Sorting, SetsTheDirectionByHeader) {
@@ -173,7 +173,7 @@ TEST_F(Sorting, TellsTheViewOnce) {
   EXPECT_EQ(changes, 1);
   list.Clear();
   EXPECT_EQ(changes, 2);
-  EXPECT_TRUE(list.Rows().empty());
+  EXPECT_EQ(list.RowCount(), 0);
 }
 
 constexpr int Red0 = 1;

@@ -80,8 +80,8 @@ class ScoredGame {
   /// Cells of one column of the board, in shown order.
   std::vector<std::string> Column(BoardColumn column) const {
     std::vector<std::string> cells;
-    for (const ScoreList::Row& row : Board.Rows()) {
-      cells.push_back(row.Cells[static_cast<std::size_t>(column)]);
+    for (int place = 0; place < Board.RowCount(); ++place) {
+      cells.push_back(Board.RowAt(place).Cells[static_cast<std::size_t>(column)]);
     }
     return cells;
   }
@@ -90,7 +90,7 @@ class ScoredGame {
   std::vector<std::vector<std::string>> TeamCells() const { return CellsOf(Teams, TeamColumnCount); }
 
   std::string Cell(std::size_t row, BoardColumn column) const {
-    return Board.Rows().at(row).Cells[static_cast<std::size_t>(column)];
+    return Board.RowAt(static_cast<int>(row)).Cells[static_cast<std::size_t>(column)];
   }
 
   TemporaryFolder Folder;
@@ -98,8 +98,9 @@ class ScoredGame {
  private:
   static std::vector<std::vector<std::string>> CellsOf(const ScoreList& list, int columns) {
     std::vector<std::vector<std::string>> cells;
-    for (const ScoreList::Row& row : list.Rows()) {
-      cells.emplace_back(row.Cells.begin(), row.Cells.begin() + columns);
+    for (int place = 0; place < list.RowCount(); ++place) {
+      const auto& row = list.RowAt(place).Cells;
+      cells.emplace_back(row.begin(), row.begin() + columns);
     }
     return cells;
   }

@@ -124,6 +124,71 @@ TEST_F(Reading, WriteInsideIsDurableAtOnceAndTheReadsGoOn) {
   EXPECT_EQ(file.Query("SELECT count(*) FROM Members"), "4");
 }
 
+TEST_F(Reading, TheNextScopeSeesWhatOthersChangedInRowsReadBefore) {
+  const auto nameOfFive = [&] {
+    const ReadScope scope(*database);
+    rows->WalkTo("ContactID", std::int64_t{5});
+    return TextOf(*rows, "FirstName");
+  };
+  const std::string before = nameOfFive();
+  EXPECT_EQ(nameOfFive(), before);
+  file.Execute("UPDATE Members SET FirstName = 'Changed' WHERE ContactID = 5");
+  EXPECT_EQ(nameOfFive(), "Changed");
+}
+
+TEST_F(Reading, TheNextScopeSeesWhatOthersChangedInTextsSearchedBefore) {
+  const auto search = [&](const char* dallasId) {
+    const ReadScope scope(*database);
+    return rows->WalkTo("DallasID", dallasId) ? IntegerOf(*rows, "ContactID") : 0;
+  };
+  EXPECT_EQ(search("BB"), 2);
+  EXPECT_EQ(search("BB"), 2);
+  EXPECT_EQ(search("NEW"), 0);
+  file.Execute("UPDATE Members SET DallasID = 'NEW' WHERE ContactID = 2");
+  EXPECT_EQ(search("BB"), 9);
+  EXPECT_EQ(search("NEW"), 2);
+  file.Execute("DELETE FROM Members WHERE ContactID = 2");
+  EXPECT_EQ(search("NEW"), 0);
+}
+
+TEST_F(Reading, SeesWhatAnotherRecordsetOfTheDatabaseChanged) {
+  const auto others = database->OpenRecordset("Members");
+  const ReadScope scope(*database);
+  EXPECT_TRUE(rows->WalkTo("DallasID", "BB"));
+  EXPECT_EQ(IntegerOf(*rows, "ContactID"), 2);
+  others->WalkTo("ContactID", std::int64_t{2});
+  others->Edit();
+  others->SetField("FirstName", "Changed");
+  others->SetField("DallasID", "CC");
+  others->Update();
+  EXPECT_FALSE(rows->WalkTo("DallasID", "BB") && IntegerOf(*rows, "ContactID") == 2);
+  EXPECT_TRUE(rows->WalkTo("ContactID", std::int64_t{2}));
+  EXPECT_EQ(TextOf(*rows, "FirstName"), "Changed");
+}
+
+TEST_F(Reading, ReadsAColumnThatNobodyHadAskedForYetOfARowReadBefore) {
+  const ReadScope scope(*database);
+  rows->WalkTo("ContactID", std::int64_t{2});
+  EXPECT_EQ(TextOf(*rows, "DallasID"), "BB");
+  rows->WalkTo("ContactID", std::int64_t{9});
+  rows->WalkTo("ContactID", std::int64_t{2});
+  EXPECT_EQ(TextOf(*rows, "FirstName"), file.Query("SELECT FirstName FROM Members WHERE ContactID = 2"));
+}
+
+TEST_F(Reading, GoesThroughMoreRowsThanAGameHasPlayers) {
+  file.Execute(
+      "WITH RECURSIVE n(i) AS (SELECT 100 UNION ALL SELECT i + 1 FROM n WHERE i < 3100) "
+      "INSERT INTO Members (ContactID, DallasID, FirstName) SELECT i, 'D' || i, 'F' || i FROM n");
+  rows = database->OpenRecordset("Members");
+  const ReadScope scope(*database);
+  for (int round = 0; round < 2; ++round) {
+    for (int key = 100; key <= 3100; ++key) {
+      ASSERT_TRUE(rows->WalkTo("DallasID", "D" + std::to_string(key)));
+      ASSERT_EQ(TextOf(*rows, "FirstName"), "F" + std::to_string(key));
+    }
+  }
+}
+
 TEST_F(Reading, RecordsetMayBeOpenedInside) {
   const ReadScope scope(*database);
   EXPECT_EQ(AllNumbers(*database->OpenRecordset("SELECT * FROM Members WHERE DallasID = 'BB'")), "2 9 ");
