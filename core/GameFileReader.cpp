@@ -1,5 +1,8 @@
+#include <algorithm>
 #include <cstring>
 #include <pugixml.hpp>
+#include <string_view>
+#include <vector>
 
 #include "core/GameFile.h"
 #include "core/NumberForms.h"
@@ -58,6 +61,57 @@ bool Parse(std::string& bytes, pugi::xml_document& document) {
          IsWellFormed(document);
 }
 
+/// The "Player" elements of a file as far as its text tells. The tree of a full game takes several times the
+/// memory of its text, so players are parsed one by one where that gives the same.
+std::vector<std::string_view> CutPlayers(std::string_view bytes) {
+  constexpr std::string_view start = "<Player>";
+  constexpr std::string_view end = "</Player>";
+  std::vector<std::string_view> players;
+  const std::size_t last = bytes.rfind(end);
+  if (last == std::string_view::npos) {
+    return players;
+  }
+  bytes = bytes.substr(0, last + end.size());
+  for (std::size_t at = bytes.find(start); at != std::string_view::npos;) {
+    const std::size_t next = bytes.find(start, at + 1);
+    players.push_back(bytes.substr(at, next - at));
+    at = next;
+  }
+  return players;
+}
+
+/// Parses one of CutPlayers. `text` is its work space.
+bool ParsePlayer(std::string_view player, std::string& text, pugi::xml_document& document) {
+  text = player;
+  return Parse(text, document) && document.child("Player");
+}
+
+/// Parses what is around the players. Returns false unless they are, one by one, what the whole tree would
+/// hold.
+bool ParseAround(std::string_view bytes, const std::vector<std::string_view>& players, std::string& text,
+                 pugi::xml_document& document) {
+  if (players.empty()) {
+    return false;
+  }
+  const auto hole = static_cast<std::size_t>(players.front().data() - bytes.data());
+  const auto end = static_cast<std::size_t>(players.back().data() - bytes.data()) + players.back().size();
+  text.assign(bytes.substr(0, hole)).append("<Player/>").append(bytes.substr(end));
+  if (!Parse(text, document)) {
+    return false;
+  }
+  const pugi::xml_node root = document.child("GameData");
+  const pugi::xml_node playerData = root.child("PlayerData");
+  const pugi::xml_node standIn = playerData.child("Player");
+  if (playerData.next_sibling("PlayerData") || standIn.next_sibling("Player") ||
+      standIn.offset_debug() != static_cast<std::ptrdiff_t>(hole) + 1) {
+    return false;
+  }
+  std::string work;
+  pugi::xml_document player;
+  return std::all_of(players.begin(), players.end(),
+                     [&](std::string_view piece) { return ParsePlayer(piece, work, player); });
+}
+
 void ReadObjectiveTeams(pugi::xml_node header, Game& game) {
   int set = 0;
   for (const pugi::xml_node team : header.children("Team")) {
@@ -112,13 +166,25 @@ struct HitReader : pugi::xml_tree_walker {
   Player& Target;
 };
 
+void ReadPlayer(pugi::xml_node node, Game& game) {
+  Player& player = game.Players(GetNumber(node, "Index"));
+  ReadFields(node, player);
+  HitReader hits(player);
+  node.traverse(hits);
+}
+
 }  // namespace
 
 bool ReadGameFile(std::string bytes, Game& game,
                   const std::function<void(const std::string&)>& selectMission) {
   pugi::xml_document document;
-  if (!Parse(bytes, document)) {
-    return false;
+  std::vector<std::string_view> players = CutPlayers(bytes);
+  std::string around;
+  if (!ParseAround(bytes, players, around, document)) {
+    players.clear();
+    if (!Parse(bytes, document)) {
+      return false;
+    }
   }
   const pugi::xml_node root = document.child("GameData");
   if (!root) {
@@ -128,12 +194,17 @@ bool ReadGameFile(std::string bytes, Game& game,
   selectMission(GetChildText(header, "MissionName", "None"));
   game.GameDate = GetChildText(header, "GameDate", "N/A");
   ReadObjectiveTeams(header, game);
-  for (const pugi::xml_node playerData : root.children("PlayerData")) {
-    for (pugi::xml_node node : playerData.children("Player")) {
-      Player& player = game.Players(GetNumber(node, "Index"));
-      ReadFields(node, player);
-      HitReader hits(player);
-      node.traverse(hits);
+  std::string text;
+  pugi::xml_document piece;
+  for (const std::string_view player : players) {
+    ParsePlayer(player, text, piece);
+    ReadPlayer(piece.child("Player"), game);
+  }
+  if (players.empty()) {
+    for (const pugi::xml_node playerData : root.children("PlayerData")) {
+      for (const pugi::xml_node player : playerData.children("Player")) {
+        ReadPlayer(player, game);
+      }
     }
   }
   return true;
