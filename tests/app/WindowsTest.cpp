@@ -1,0 +1,56 @@
+#include "app/About.h"
+#include "app/Settings.h"
+#include "app/SoldieringCalc.h"
+#include "app/UploadProgress.h"
+#include "tests/app/CaredFor.h"
+#include "tests/app/Venue.h"
+#include "tests/platform/qt/WhileModal.h"
+
+namespace {
+
+class Windows : public testing::TestWithParam<Language> {
+ protected:
+  Windows() { venue.Start(); }
+
+  /// Opens a modal window by its menu item and looks at it.
+  template <typename Window>
+  void LookAt(const char* menuItem) {
+    const WhileModal<Window> look([](Window& window) {
+      ExpectCaredFor(window);
+      window.close();
+    });
+    venue.Trigger(menuItem);
+    EXPECT_EQ(look.Runs(), 1);
+  }
+
+  Venue venue{GetParam()};
+};
+
+TEST_P(Windows, AreCaredFor) {
+  LookAt<About>("mnuAbout");
+  LookAt<Settings>("mnuCommPort");
+  LookAt<SoldieringCalc>("mnuSoldieringCalc");
+}
+
+TEST_P(Windows, OfTheDownloadIsCaredFor) {
+  UploadProgress progress(venue.Strings, venue.Window.get());
+  progress.Open();
+  progress.SetStatusText("Accepting Score Data...");
+  progress.SetProgress(224);
+  Show(progress);
+  ExpectCaredFor(progress);
+}
+
+TEST_P(Windows, TheMainOneIsCaredForAtTheSmallestSize) {
+  venue.Window->resize(1024, 700);
+  venue.LoadGame(SmallGame());
+  ExpectCaredFor(*venue.Window);
+  EXPECT_EQ(venue.Window->width(), 1024);
+}
+
+INSTANTIATE_TEST_SUITE_P(Languages, Windows, testing::Values(Language::English, Language::SimplifiedChinese),
+                         [](const auto& language) {
+                           return language.param == Language::English ? "English" : "SimplifiedChinese";
+                         });
+
+}  // namespace
