@@ -21,7 +21,7 @@ constexpr const char* LookSheet = R"(
 #GetScores:pressed { background: #245bb4; }
 #GetScores:focus, #RemoteManageButton:focus { border: 2px solid white; }
 #RemoteManageButton:disabled { background: #222a3d; border-color: #2c3650; color: #7d879b; }
-#Label1, #Label2 { font-weight: bold; }
+#centralwidget > #Label1, #centralwidget > #Label2 { font-weight: bold; }
 ScoreListView { border: 1px solid #c3c9d6; selection-background-color: #2f6fd6; selection-color: white; }
 ScoreListView QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid #c3c9d6;
   background: #e9edf4; color: #1b2233; }

@@ -4,10 +4,15 @@
 #include <QHeaderView>
 #include <QScreen>
 #include <QSignalBlocker>
+#include <algorithm>
 #include <utility>
 #include <vector>
 
 #include "app/About.h"
+#include "app/AdminData.h"
+#include "app/BonusPoints.h"
+#include "app/MissionResultEntry.h"
+#include "app/PlayerDetails.h"
 #include "app/ScoreListModel.h"
 #include "app/Settings.h"
 #include "app/SoldieringCalc.h"
@@ -17,7 +22,9 @@
 #include "core/BaseUnitDownload.h"
 #include "core/FieldValue.h"
 #include "core/FirstRun.h"
+#include "core/PlayerId.h"
 #include "core/ScreenFit.h"
+#include "missions/Scenarios.h"
 #include "platform/ErrorReport.h"
 #include "ui_frmRx.h"
 
@@ -147,6 +154,12 @@ void frmRx::ConnectCommands() {
       {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},
       {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
       {ui_->mnuAbout, &frmRx::ShowAbout},
+      {ui_->mnuAdminData, &frmRx::ShowAdminData},
+      {ui_->mnuMissionResults, &frmRx::EnterMissionResults},
+      {ui_->mnuSetupMissions, &frmRx::SetUpMissions},
+      {ui_->mnuUnassignMember, &frmRx::UnassignMember},
+      {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
+      {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
   };
   for (const auto& entry : commands) {
     const auto command = entry.second;
@@ -159,6 +172,8 @@ void frmRx::ConnectCommands() {
           [this](int index) { Run([this, index] { SelectMission(index); }); });
   connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this,
           [this](int section) { Run([this, section] { SortByHeader(scoreDisplay_, section + 1, game_); }); });
+  connect(ui_->ScoreDisplay, &QWidget::customContextMenuRequested, this,
+          [this](const QPoint& position) { Run([this, position] { ShowPopup(position); }); });
 }
 
 void frmRx::Run(const std::function<void()>& command) {
@@ -188,7 +203,10 @@ void frmRx::closeEvent(QCloseEvent* event) {
 }
 
 void frmRx::FillMissionList() {
-  missions_->FillMissionList();
+  {
+    const ReadScope scope(*dbScenarios_);
+    missions_->FillMissionList();
+  }
   const QSignalBlocker blocker(ui_->ActiveMission);
   ui_->ActiveMission->clear();
   for (const MissionList::Item& item : missions_->Items()) {
@@ -202,7 +220,9 @@ void frmRx::SelectMission(int index) {
   const QSignalBlocker blocker(ui_->ActiveMission);
   ui_->ActiveMission->setCurrentIndex(index);
   QString description;
-  if (missions_->ActivateCurrentMissionRecord()) {
+  const bool active = missions_->ActivateCurrentMissionRecord();
+  ui_->mnuMissionResults->setEnabled(active);
+  if (active) {
     description = QString::fromStdString(FirstLineOf(TextOf(missions_->Row().Fields("MissionDescription"))));
   }
   ui_->ActiveMissionLabel->setToolTip(description);
@@ -280,4 +300,46 @@ void frmRx::ShowSoldieringCalc() {
 
 void frmRx::ShowAbout() {
   About(this).exec();
+}
+
+void frmRx::ShowAdminData() {
+  AdminData(game_, services_.Strings, this).exec();
+}
+
+void frmRx::EnterMissionResults() {
+  MissionResultEntry(game_, *missions_, services_.Strings, this).exec();
+  CalculateScoresWhenPresent();
+}
+
+void frmRx::SetUpMissions() {
+  Scenarios(*dbScenarios_, *rsScenarios_, services_.Boxes, services_.Strings, this).exec();
+  rsScenarios_->MoveFirst();
+  FillMissionList();
+}
+
+void frmRx::ShowPopup(const QPoint& position) {
+  const QModelIndexList selected = ui_->ScoreDisplay->selectionModel()->selectedRows();
+  if (selected.isEmpty()) {
+    return;
+  }
+  const int last = std::max_element(selected.begin(), selected.end())->row();
+  selectedPlayer_ = IndexFromPlayerText(services_.Strings, scoreDisplay_.RowAt(last).Cells[1]);
+  ui_->mnuPopup->exec(ui_->ScoreDisplay->viewport()->mapToGlobal(position));
+  CalculateScores();
+  services_.Events.DoEvents();
+}
+
+void frmRx::UnassignMember() {
+  game_.Players(selectedPlayer_).MemberIndex = 0;
+}
+
+void frmRx::ShowDetailed() {
+  PlayerDetails(selectedPlayer_, game_, *members_, this).exec();
+}
+
+void frmRx::EnterBonusPoints() {
+  Player& player = game_.Players(selectedPlayer_);
+  BonusPoints window(player.BonusPoints, services_.Boxes, this);
+  window.exec();
+  player.BonusPoints = window.Value();
 }

@@ -61,6 +61,15 @@ class frmRx : public QMainWindow {
   void ShowCommPortSettings();
   void ShowSoldieringCalc();
   void ShowAbout();
+  void ShowAdminData();
+  void EnterMissionResults();
+  void SetUpMissions();
+
+  /// The context menu of the board, for the last of the selected rows.
+  void ShowPopup(const QPoint& position);
+  void UnassignMember();
+  void ShowDetailed();
+  void EnterBonusPoints();
 
   const Services services_;
   std::unique_ptr<Ui::frmRx> ui_;
@@ -81,6 +90,7 @@ class frmRx : public QMainWindow {
   std::unique_ptr<Recordset> rsMembers_;
   std::optional<MemberLookup> members_;
   std::optional<ScoreAnalysis> analysis_;
+  int selectedPlayer_ = 0;       ///< record index of the player under the context menu
   int runningCommands_ = 0;      ///< commands on the stack; a wait in one can start another
   bool closeRequested_ = false;  ///< close as soon as the last of them has unwound
 };

@@ -2,15 +2,16 @@
 
 #include "core/FieldValue.h"
 #include "core/NumberForms.h"
+#include "core/Rows.h"
 #include "platform/RuntimeError.h"
 
 void MissionList::FillMissionList() {
   items_ = {{strings_.Text(119), 0}, {strings_.Text(120), 0}};
   listIndex_ = None;
-  for (rsScenarios_.MoveFirst(); !rsScenarios_.Eof(); rsScenarios_.MoveNext()) {
+  ForEachRow(rsScenarios_, [this] {
     items_.push_back(
         {TextOf(rsScenarios_.Fields("MissionName")), RoundToInt32(NumberOf(rsScenarios_.Fields("ID")))});
-  }
+  });
 }
 
 const std::string& MissionList::Text() const {

@@ -197,7 +197,8 @@ std::string Str(std::int32_t value) {
   constexpr std::size_t mostLetters = 11;
   std::string text(mostLetters, ' ');
   char* const first = text.data() + (value < 0 ? 0 : 1);
-  text.resize(static_cast<std::size_t>(std::to_chars(first, text.data() + mostLetters, value).ptr - text.data()));
+  text.resize(
+      static_cast<std::size_t>(std::to_chars(first, text.data() + mostLetters, value).ptr - text.data()));
   return text;
 }
 

@@ -1,7 +1,7 @@
 #include "core/TextEncoding.h"
 
+#include <algorithm>
 #include <array>
-#include <cstddef>
 #include <cstdint>
 #include <cstring>
 
@@ -12,6 +12,10 @@ constexpr std::array<std::uint16_t, 32> Windows1252High = {
     0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
     0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
     0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178};
+
+bool StartsCharacter(char letter) {
+  return (static_cast<unsigned char>(letter) & 0xC0U) != 0x80U;
+}
 
 std::size_t LengthOfAsciiRun(std::string_view text, std::size_t from) {
   constexpr std::uint64_t HighBits = 0x8080808080808080U;
@@ -88,4 +92,20 @@ std::string Windows1252ToUtf8(std::string_view text) {
     }
   }
   return utf8;
+}
+
+std::size_t CharacterCount(std::string_view text) {
+  return static_cast<std::size_t>(std::count_if(text.begin(), text.end(), StartsCharacter));
+}
+
+std::string Characters(std::string_view text, std::size_t first, std::size_t count) {
+  std::string characters;
+  std::size_t seen = 0;
+  for (const char letter : text) {
+    seen += StartsCharacter(letter) ? 1 : 0;
+    if (seen > first && seen - first <= count) {
+      characters += letter;
+    }
+  }
+  return characters;
 }

@@ -1,12 +1,15 @@
 #pragma once
 
-#include <sqlite3.h>
-
 #include <QAbstractItemModel>
 #include <QAction>
+#include <QApplication>
 #include <QComboBox>
+#include <QContextMenuEvent>
+#include <QMenu>
 #include <QTableView>
+#include <QTimer>
 #include <filesystem>
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -24,6 +27,7 @@
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
 #include "tests/platform/linux/TemporaryFolder.h"
+#include "tests/platform/sqlite/TestDatabase.h"
 
 /// What passes the time in a wait: a script, or the toolkit's events as in the program itself.
 enum class Waits { Scripted, Real };
@@ -55,14 +59,12 @@ class Venue {
 
   /// Another program changes one of the databases.
   void ChangeDatabase(const std::string& file, const std::string& sql) const {
-    sqlite3* database = nullptr;
-    sqlite3_open(DataFile(file).c_str(), &database);
-    const bool done = sqlite3_exec(database, sql.c_str(), nullptr, nullptr, nullptr) == SQLITE_OK;
-    const std::string fault = sqlite3_errmsg(database);
-    sqlite3_close(database);
-    if (!done) {
-      throw std::logic_error(fault);
-    }
+    OtherConnection(DataFile(file)).Execute(sql);
+  }
+
+  /// What another program reads of one of the databases: the first column of the first row, "NULL" or "none".
+  std::string QueryDatabase(const std::string& file, const std::string& sql) const {
+    return OtherConnection(DataFile(file)).Query(sql);
   }
 
   frmRx& MakeWindow() {
@@ -120,10 +122,39 @@ class Venue {
 
   int RowCount(const std::string& list) const { return Find<QTableView>(list).model()->rowCount(); }
 
+  /// Selects a row of the board and opens the context menu there by the keyboard; `choose` is done with the
+  /// menu open.
+  void OpenPopup(int row, const std::function<void(QMenu&)>& choose) const {
+    QTableView& board = Find<QTableView>("ScoreDisplay");
+    if (row >= 0) {
+      board.selectRow(row);
+    }
+    auto& menu = Find<QMenu>("mnuPopup");
+    QTimer timer;
+    QObject::connect(&timer, &QTimer::timeout, &timer, [&] {
+      if (menu.isVisible()) {
+        timer.stop();
+        choose(menu);
+        menu.close();
+      }
+    });
+    timer.start(0);
+    QContextMenuEvent event(QContextMenuEvent::Keyboard, QPoint(20, 20), board.mapToGlobal(QPoint(20, 20)));
+    QApplication::sendEvent(&board, &event);
+  }
+
+  /// Chooses an item of the context menu of a row as the operator does: by keys.
+  void ChooseInPopup(int row, const std::string& item) const {
+    OpenPopup(row, [&](QMenu& menu) {
+      menu.setActiveAction(&Find<QAction>(item));
+      QTest::keyClick(&menu, Qt::Key_Return);
+    });
+  }
+
   TemporaryFolder Folder;
   StringTable Strings;
   FakeClock Time;
-  SqliteEngine Databases;
+  SqliteEngine Databases{std::chrono::milliseconds(50)};
   FakeEventPump Events;
   QtEventPump RealEvents;
   FakeFileDialog Dialog;
@@ -153,4 +184,21 @@ inline std::string PlayerOf(int index, const std::string& fields = {}) {
 /// Red 0 with 5 points and Blue 7 with 9.
 inline std::string SmallGame() {
   return GameFile(PlayerOf(1, "<BonusPoints>5</BonusPoints>") + PlayerOf(40, "<BonusPoints>9</BonusPoints>"));
+}
+
+/// Red 0 and eight others who hit each other, with members' names missing.
+inline std::string GameOfManyHits() {
+  std::string players;
+  for (int index = 1; index <= 9; ++index) {
+    std::string hits;
+    for (int shooter = 1; shooter <= 9; ++shooter) {
+      hits += "<HitByPlayer><Index>" + std::to_string(shooter * 20) + "</Index><Amount>" +
+              std::to_string(7 + index * shooter * 13 % 90) + "</Amount></HitByPlayer>";
+    }
+    players +=
+        PlayerOf(index * 20, "<HitData>" + hits +
+                                 "</HitData><ShotCount>250</ShotCount><PrimaryDamage>10</PrimaryDamage>"
+                                 "<RunCounter>125</RunCounter><ExplosiveDamage>12</ExplosiveDamage>");
+  }
+  return GameFile(players);
 }

@@ -1,7 +1,13 @@
 #include "app/About.h"
+#include "app/AdminData.h"
+#include "app/BonusPoints.h"
+#include "app/MissionResultEntry.h"
+#include "app/PlayerDetails.h"
 #include "app/Settings.h"
 #include "app/SoldieringCalc.h"
 #include "app/UploadProgress.h"
+#include "missions/MissionNameEntry.h"
+#include "missions/Scenarios.h"
 #include "tests/app/CaredFor.h"
 #include "tests/app/Venue.h"
 #include "tests/platform/qt/WhileModal.h"
@@ -30,6 +36,39 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<About>("mnuAbout");
   LookAt<Settings>("mnuCommPort");
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
+  LookAt<AdminData>("mnuAdminData");
+  LookAt<Scenarios>("mnuSetupMissions");
+  venue.ActiveMission().setCurrentIndex(3);
+  LookAt<MissionResultEntry>("mnuMissionResults");
+}
+
+TEST_P(Windows, OfAPlayerAreCaredFor) {
+  venue.LoadGame(GameOfManyHits());
+  const WhileModal<PlayerDetails> details([](PlayerDetails& window) {
+    ExpectCaredFor(window);
+    window.close();
+  });
+  venue.ChooseInPopup(0, "mnuShowDetailed");
+  EXPECT_EQ(details.Runs(), 1);
+  const WhileModal<BonusPoints> bonus([](BonusPoints& window) {
+    ExpectCaredFor(window);
+    window.close();
+  });
+  venue.ChooseInPopup(0, "mnuBonusPoints");
+  EXPECT_EQ(bonus.Runs(), 1);
+}
+
+TEST_P(Windows, OfANewMissionIsCaredFor) {
+  const WhileModal<Scenarios> editor([](Scenarios& window) {
+    const WhileModal<MissionNameEntry> name([](MissionNameEntry& entry) {
+      ExpectCaredFor(entry);
+      entry.close();
+    });
+    ::Press(window, "NewButton");
+    EXPECT_EQ(name.Runs(), 1);
+    window.close();
+  });
+  venue.Trigger("mnuSetupMissions");
 }
 
 TEST_P(Windows, OfTheDownloadIsCaredFor) {

@@ -1,0 +1,28 @@
+#pragma once
+
+#include <QDialog>
+#include <cstdint>
+#include <memory>
+
+#include "platform/MessageBoxes.h"
+
+namespace Ui {
+class BonusPoints;
+}
+
+/// Asks for a player's extra soldiering points.
+class BonusPoints : public QDialog {
+  Q_OBJECT
+
+ public:
+  BonusPoints(std::int32_t value, MessageBoxes& boxes, QWidget* parent);
+  ~BonusPoints() override;
+
+  /// The value handed over, or what was entered with OK: the leading number of the text, 0 when there is
+  /// none.
+  std::int32_t Value() const { return value_; }
+
+ private:
+  std::unique_ptr<Ui::BonusPoints> ui_;
+  std::int32_t value_;
+};

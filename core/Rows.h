@@ -1,0 +1,20 @@
+#pragma once
+
+#include "platform/Database.h"
+#include "platform/RuntimeError.h"
+
+/// Walks from the first row to the end and does `act` on each, but for rows that another program has deleted
+/// since the recordset was opened.
+template <typename Act>
+void ForEachRow(Recordset& rows, const Act& act) {
+  constexpr int recordIsDeleted = 3167;
+  for (rows.MoveFirst(); !rows.Eof(); rows.MoveNext()) {
+    try {
+      act();
+    } catch (const RuntimeError& error) {
+      if (error.Number() != recordIsDeleted) {
+        throw;
+      }
+    }
+  }
+}

@@ -1,0 +1,242 @@
+#include "tests/missions/Editor.h"
+
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+TEST_F(Editor, OpensLockedOnTheFirstMission) {
+  Open([this] {
+    EXPECT_THAT(Entries(), ElementsAre("One", "Two", "Three"));
+    EXPECT_EQ(List().currentRow(), 0);
+    EXPECT_EQ(ShownName(), "One");
+    EXPECT_EQ(ShownDescription(), "First text");
+    EXPECT_EQ(Line("RespawnPenalty").text(), QStringLiteral("2.5"));
+    EXPECT_EQ(Line("HealPenalty").text(), QStringLiteral("0"));
+    EXPECT_EQ(Line("GameDuration").text(), QStringLiteral("10 minutes"));
+    EXPECT_EQ(Line("PrimaryPoints1").text(), QStringLiteral("7"));
+    EXPECT_EQ(EditCaption(), "Edit");
+    EXPECT_TRUE(Locked());
+    for (const char* name : {"RespawnPenalty", "HealPenalty", "GameDuration", "TeamRatio", "PrimaryPoints0",
+                             "SecondaryPoints1", "PrimaryPoints2"}) {
+      EXPECT_TRUE(Line(name).isReadOnly()) << name;
+    }
+    for (const char* name : {"PrimaryObjectiveDescription0", "SecondaryObjectiveDescription2"}) {
+      EXPECT_TRUE(Memo(name).isReadOnly()) << name;
+    }
+  });
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(Editor, ShowsTheMissionThatIsClicked) {
+  Open([this] {
+    QTest::mouseClick(List().viewport(), Qt::LeftButton, {}, List().visualItemRect(List().item(1)).center());
+    EXPECT_EQ(ShownName(), "Two");
+    EXPECT_EQ(ShownDescription(), "Second text");
+    QTest::keyClick(&List(), Qt::Key_Down);
+    EXPECT_EQ(ShownName(), "Three");
+  });
+}
+
+TEST_F(Editor, ShowsNothingOfAMissionThatIsGone) {
+  Open([this] {
+    venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1 WHERE ID = 5");
+    List().setCurrentRow(1);
+    EXPECT_EQ(ShownName(), "");
+    EXPECT_EQ(ShownDescription(), "");
+    EXPECT_EQ(Line("RespawnPenalty").text(), QStringLiteral("0"));
+    EXPECT_EQ(Line("SecondaryPoints2").text(), QStringLiteral("0"));
+    EXPECT_EQ(Line("GameDuration").text(), QString());
+  });
+}
+
+TEST_F(Editor, UnlocksForEditingAndStaysSoOnTheNextMission) {
+  Open([this] {
+    Press("Edit");
+    EXPECT_EQ(EditCaption(), "Editing");
+    EXPECT_FALSE(Locked());
+    EXPECT_FALSE(Line("PrimaryPoints2").isReadOnly());
+    Press("Edit");
+    EXPECT_EQ(EditCaption(), "Editing");
+    Describe("typed and not saved");
+    List().setCurrentRow(1);
+    EXPECT_EQ(ShownDescription(), "Second text");
+    EXPECT_FALSE(Locked());
+  });
+  EXPECT_EQ(Stored("MissionDescription", "One"), "First text");
+}
+
+TEST_F(Editor, BringsTheTabsObjectivesToTheFront) {
+  Open([this] {
+    auto& tabs = ::Find<QTabBar>(*window, "ObjectivesTab");
+    const auto front = [this] {
+      std::string sets;
+      for (const char* set : {"0", "1", "2"}) {
+        const bool visible = Memo(std::string("PrimaryObjectiveDescription") + set).isVisible();
+        EXPECT_EQ(Memo(std::string("SecondaryObjectiveDescription") + set).isVisible(), visible);
+        EXPECT_EQ(Line(std::string("PrimaryPoints") + set).isVisible(), visible);
+        EXPECT_EQ(Line(std::string("SecondaryPoints") + set).isVisible(), visible);
+        sets += visible ? set : "";
+      }
+      return sets;
+    };
+    EXPECT_EQ(front(), "0");
+    EXPECT_EQ(tabs.tabText(1), QStringLiteral("Team B"));
+    for (int tab = 2; tab >= 0; --tab) {
+      QTest::mouseClick(&tabs, Qt::LeftButton, {}, tabs.tabRect(tab).center());
+      EXPECT_EQ(front(), std::to_string(tab));
+      const auto* label = window->findChild<QLabel*>(QStringLiteral("Label3"));
+      EXPECT_EQ(label->buddy(), &Line("SecondaryPoints" + std::to_string(tab)));
+    }
+  });
+}
+
+TEST_F(Editor, DeletesTheSelectedMission) {
+  Open([this] {
+    List().setCurrentRow(1);
+    Press("Delete");
+    EXPECT_THAT(Entries(), ElementsAre("One", "Three"));
+    EXPECT_EQ(List().currentRow(), 0);
+    EXPECT_EQ(ShownName(), "One");
+  });
+  EXPECT_THAT(venue.Boxes.Boxes,
+              ElementsAre(FakeMessageBoxes::Box{"This will delete the current Mission. Are you sure?",
+                                                "Confirm Delete", BoxIcon::Question, BoxButtons::OkCancel}));
+  EXPECT_THAT(Names(), ElementsAre("One", "Three"));
+}
+
+TEST_F(Editor, DeletesNothingOnCancel) {
+  venue.Boxes.Answers = {BoxAnswer::Cancel};
+  Open([this] { Press("Delete"); });
+  EXPECT_THAT(Names(), ElementsAre("One", "Two", "Three"));
+}
+
+TEST_F(Editor, DeletingDoesNotUnlockOrLock) {
+  Open([this] {
+    Press("Delete");
+    EXPECT_TRUE(Locked());
+    Press("Edit");
+    Press("Delete");
+    EXPECT_FALSE(Locked());
+  });
+}
+
+TEST_F(Editor, DeletesNoOtherMissionInPlaceOfOneThatIsGone) {
+  Open([this] {
+    venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1 WHERE ID = 5");
+    List().setCurrentRow(1);
+    Press("Delete");
+    EXPECT_THAT(Entries(), ElementsAre("One", "Three"));
+  });
+  EXPECT_THAT(Names(), ElementsAre("One", "Three"));
+}
+
+TEST_F(Editor, StaysUsableWithoutAnyMission) {
+  Open([this] {
+    for (int mission = 0; mission < 3; ++mission) {
+      Press("Delete");
+    }
+    EXPECT_THAT(Entries(), IsEmpty());
+    EXPECT_EQ(ShownName(), "");
+    EXPECT_EQ(ShownDescription(), "");
+    Press("Delete");
+    venue.Boxes.Boxes.clear();
+    Press("Save");
+    EXPECT_THAT(venue.Boxes.Boxes,
+                ElementsAre(EntryError("Mission Description cannot be empty. Save aborted.")));
+    NewMission("First again");
+    EXPECT_THAT(Entries(), ElementsAre("First again"));
+    EXPECT_EQ(ShownDescription(), "Enter Mission Details");
+  });
+  EXPECT_THAT(Names(), ElementsAre("First again"));
+  EXPECT_EQ(venue.ActiveMission().count(), 3);
+}
+
+TEST_F(Editor, OpensWithoutAnyMission) {
+  venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1");
+  Open([this] {
+    EXPECT_THAT(Entries(), IsEmpty());
+    Press("Edit");
+    Press("Delete");
+  });
+  EXPECT_EQ(venue.ActiveMission().count(), 2);
+}
+
+TEST_F(Editor, LeavesTheActiveMissionOnNone) {
+  venue.ActiveMission().setCurrentIndex(3);
+  Open([this] { Press("SelectExit"); });
+  EXPECT_EQ(venue.ActiveMission().currentIndex(), 0);
+  EXPECT_FALSE(venue.Find<QAction>("mnuMissionResults").isEnabled());
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(Editor, AsksBeforeItLeavesWhileEditing) {
+  venue.Boxes.Answers = {BoxAnswer::No};
+  Open([this] {
+    Press("Edit");
+    Describe("never saved");
+    Press("SelectExit");
+    EXPECT_FALSE(window->isVisible());
+  });
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(NotSaved()));
+  EXPECT_EQ(Stored("MissionDescription", "One"), "First text");
+}
+
+TEST_F(Editor, SavesOnTheWayOutWhenToldTo) {
+  Open([this] {
+    Press("Edit");
+    Describe("saved at last");
+    Press("SelectExit");
+    EXPECT_FALSE(window->isVisible());
+  });
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(NotSaved(), Saved()));
+  EXPECT_EQ(Stored("MissionDescription", "One"), "saved at last");
+}
+
+TEST_F(Editor, ClosedByItsCloseBoxAsksNothingInAnyState) {
+  Open([] {});
+  Open([this] {
+    Press("Edit");
+    Describe("never saved");
+  });
+  Open([this] {
+    Press("Edit");
+    QTest::keyClick(window, Qt::Key_Escape);
+    EXPECT_FALSE(window->isVisible());
+  });
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+  EXPECT_EQ(Stored("MissionDescription", "One"), "First text");
+  Open([this] { NewMission("Four"); });
+  EXPECT_THAT(Names(), ElementsAre("One", "Two", "Three", "Four"));
+  EXPECT_EQ(venue.ActiveMission().count(), 6);
+}
+
+class ChineseEditor : public testing::Test {};
+
+TEST_F(ChineseEditor, TakesItsCaptionsFromTheStringTable) {
+  Venue venue(Language::SimplifiedChinese);
+  venue.Start();
+  const WhileModal<Scenarios> open([&venue](Scenarios& window) {
+    const auto text = [&venue](int number) { return QString::fromStdString(venue.Strings.Text(number)); };
+    EXPECT_EQ(window.windowTitle(), text(180));
+    for (const auto& [label, number] : {std::pair{"Label2", 190},
+                                        {"Label6", 191},
+                                        {"Label4", 192},
+                                        {"Label1", 193},
+                                        {"Label3", 193},
+                                        {"Label5", 194},
+                                        {"Label7", 196},
+                                        {"Label8", 197}}) {
+      EXPECT_EQ(::Find<QLabel>(window, label).text(), text(number)) << label;
+    }
+    for (const auto& [button, number] :
+         {std::pair{"NewButton", 185}, {"Save", 187}, {"Delete", 188}, {"SelectExit", 140}}) {
+      EXPECT_EQ(::Find<QPushButton>(window, button).text(), text(number)) << button;
+    }
+    window.close();
+  });
+  venue.Trigger("mnuSetupMissions");
+  EXPECT_EQ(open.Runs(), 1);
+}
+
+}  // namespace
