@@ -4,6 +4,7 @@
 #include <QClipboard>
 #include <QGuiApplication>
 #include <QHeaderView>
+#include <QKeyEvent>
 
 #include "app/Text.h"
 #include "core/HitLines.h"
@@ -21,6 +22,7 @@ AdminData::AdminData(const Game& game, const StringTable& strings, QWidget* pare
   ui_->PlayerList->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
   ui_->PlayerList->verticalHeader()->hide();
   ui_->PlayerList->addAction(ui_->Copy);
+  ui_->PlayerList->installEventFilter(this);
   connect(ui_->Copy, &QAction::triggered, this, &AdminData::Copy);
   connect(ui_->CopyButton, &QPushButton::clicked, ui_->Copy, &QAction::trigger);
   ShowPlayers(game);
@@ -40,6 +42,15 @@ void AdminData::ShowPlayers(const Game& game) {
       ui_->PlayerList->setItem(index - 1, column, item);
     }
   }
+}
+
+// A list answers to the key itself, with the text of one cell.
+bool AdminData::eventFilter(QObject* watched, QEvent* event) {
+  if (event->type() == QEvent::KeyPress && static_cast<QKeyEvent*>(event)->matches(QKeySequence::Copy)) {
+    Copy();
+    return true;
+  }
+  return QDialog::eventFilter(watched, event);
 }
 
 void AdminData::Copy() const {

@@ -18,6 +18,9 @@ class AdminData : public QDialog {
   AdminData(const Game& game, const StringTable& strings, QWidget* parent);
   ~AdminData() override;
 
+ protected:
+  bool eventFilter(QObject* watched, QEvent* event) override;
+
  private:
   void ShowPlayers(const Game& game);
   /// Puts the selected rows, or all when none is, on the clipboard as text with tabs, the headers first.

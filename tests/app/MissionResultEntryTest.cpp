@@ -129,6 +129,7 @@ TEST_F(Results, ShowTheFirstLineOfEachObjective) {
     EXPECT_EQ(Box("SecondaryCompleted3").toolTip(), QStringLiteral("Run"));
     EXPECT_EQ(Box("PrimaryCompleted2").toolTip(), QString());
     Show(*window);
+    QApplication::setActiveWindow(window);
     auto& text = ::Find<QLabel>(*window, "ObjectiveText");
     Box("PrimaryCompleted1").setFocus();
     EXPECT_EQ(text.text(), QStringLiteral("Hold the well"));
