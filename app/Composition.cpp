@@ -42,7 +42,8 @@ Composition::Composition() : strings_(LanguageOfSystem()) {
 }
 
 ::Services Composition::Services() {
-  return {strings_, clock_, databases_, events_, fileDialog_, files_, folders_, boxes_, devices_, port_};
+  return {strings_, clock_,   databases_, old_,     events_, fileDialog_,
+          files_,   folders_, boxes_,     devices_, port_};
 }
 
 void Composition::SetMainWindow(QWidget* window) {
@@ -62,7 +63,8 @@ int RunProgram() {
   Composition composition;
   frmRx window(composition.Services());
   composition.SetMainWindow(&window);
-  if (!ReportErrors(composition.Boxes(), [&window] { window.FormLoad(); })) {
+  bool loaded = false;
+  if (!ReportErrors(composition.Boxes(), [&] { loaded = window.FormLoad(); }) || !loaded) {
     return 1;
   }
   window.show();

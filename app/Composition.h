@@ -4,6 +4,7 @@
 
 #include "app/Services.h"
 #include "core/StringTable.h"
+#include "platform/jet/JetConverter.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/qt/QtClock.h"
 #include "platform/qt/QtEventPump.h"
@@ -31,6 +32,7 @@ class Composition {
   QTranslator dialogTexts_;  ///< the toolkit's own texts ("OK", "File name:") in the program's language
   QtClock clock_;
   SqliteEngine databases_;
+  JetConverter old_{JetReaderPath()};
   QtEventPump events_;
   QtFileDialog fileDialog_;
   LinuxFiles files_;

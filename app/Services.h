@@ -8,6 +8,7 @@
 #include "platform/Files.h"
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
+#include "platform/OldDatabases.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
 
@@ -16,6 +17,7 @@ struct Services {
   const StringTable& Strings;
   const Clock& Time;
   DatabaseEngine& Databases;
+  OldDatabases& Old;
   EventPump& Events;
   FileDialog& CommonDialog1;
   Files& Disk;

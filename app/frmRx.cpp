@@ -24,6 +24,7 @@
 #include "core/FirstRun.h"
 #include "core/PlayerId.h"
 #include "core/ScreenFit.h"
+#include "core/UserDatabase.h"
 #include "missions/Scenarios.h"
 #include "platform/ErrorReport.h"
 #include "ui_frmRx.h"
@@ -38,7 +39,7 @@ frmRx::frmRx(const Services& services)
 
 frmRx::~frmRx() = default;
 
-void frmRx::FormLoad() {
+bool frmRx::FormLoad() {
   SetCaptions();
   ClearPlayerData();
   FitToScreenSize();
@@ -47,9 +48,12 @@ void frmRx::FormLoad() {
   ini_.emplace(services_.Disk, userDataFolder_ + "/tessarine.ini");
   commPort_.emplace(services_.MSComm1, *ini_, services_.Devices, services_.Boxes, services_.Strings,
                     [this] { ShowCommPortSettings(); });
-  OpenDatabases();
+  if (!OpenDatabases()) {
+    return false;
+  }
   factors_ = ReadSoldieringFactors(*ini_);
   ConnectCommands();
+  return true;
 }
 
 void frmRx::SetCaptions() {
@@ -133,16 +137,29 @@ void frmRx::SetUpLists() {
   ui_->TeamScores->setFixedHeight(ui_->TeamScores->HeightForRows(TeamCount));
 }
 
-void frmRx::OpenDatabases() {
-  dbScenarios_ = services_.Databases.OpenDatabase(userDataFolder_ + "/scenarios.mdb");
+bool frmRx::OpenDatabases() {
+  const auto open = [this](const std::string& name, const std::string& table) {
+    const std::string program = services_.Places.Program();
+    return OpenUserDatabase(
+        {userDataFolder_ + "/" + name + ".mdb", table, program + "/" + name + "_default.mdb"},
+        {services_.Databases, services_.Old, services_.Disk, services_.Boxes});
+  };
+  dbScenarios_ = open("scenarios", "Table1");
+  if (!dbScenarios_) {
+    return false;
+  }
   rsScenarios_ = dbScenarios_->OpenRecordset("Table1");
   missions_.emplace(*rsScenarios_, services_.Strings, services_.Boxes);
   FillMissionList();
   rsScenarios_->MoveFirst();
-  dbMembers_ = services_.Databases.OpenDatabase(userDataFolder_ + "/members.mdb");
+  dbMembers_ = open("members", "Members");
+  if (!dbMembers_) {
+    return false;
+  }
   rsMembers_ = dbMembers_->OpenRecordset("Members");
   members_.emplace(*rsMembers_, services_.Boxes);
   analysis_.emplace(game_, factors_, *missions_, *members_, services_.Strings, scoreDisplay_, teamScores_);
+  return true;
 }
 
 void frmRx::ConnectCommands() {

@@ -31,8 +31,8 @@ class frmRx : public QMainWindow {
   ~frmRx() override;
 
   /// Finds the user's data, opens the databases and fills the window, in the order that the operator sees.
-  /// Throws RuntimeError when the program cannot go on.
-  void FormLoad();
+  /// Throws RuntimeError when the program cannot go on; returns false when the operator chose to end it.
+  bool FormLoad();
 
  protected:
   void closeEvent(QCloseEvent* event) override;
@@ -42,7 +42,7 @@ class frmRx : public QMainWindow {
   void SetCaption(QAction& action, int textNumber);
   void FitToScreenSize();
   void SetUpLists();
-  void OpenDatabases();
+  bool OpenDatabases();
   void ConnectCommands();
   /// Runs a command of the operator; a failure in it is reported and ends the command.
   void Run(const std::function<void()>& command);

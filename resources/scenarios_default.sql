@@ -4,16 +4,17 @@ PRAGMA user_version = 1;
 
 BEGIN;
 
--- Texts are held to the 255 characters of the database format that these files once had. NUMERIC columns turn a text
+-- Short texts are held to the 255 characters of the database format that these files once had; descriptions were memos
+-- in some of them. NUMERIC columns turn a text
 -- that is a number into that number and leave any other text as it is. Texts compare above all numbers, so the ranges
 -- refuse them as well as infinities.
 CREATE TABLE Table1 (
   ID INTEGER PRIMARY KEY AUTOINCREMENT,
   MissionName TEXT NOT NULL DEFAULT '' CHECK (length(MissionName) <= 255),
-  MissionDescription TEXT NOT NULL DEFAULT '' CHECK (length(MissionDescription) <= 255),
-  MissionDescription2 TEXT CHECK (length(MissionDescription2) <= 255),
-  MissionDescription3 TEXT CHECK (length(MissionDescription3) <= 255),
-  MissionDescription4 TEXT CHECK (length(MissionDescription4) <= 255),
+  MissionDescription TEXT NOT NULL DEFAULT '',
+  MissionDescription2 TEXT,
+  MissionDescription3 TEXT,
+  MissionDescription4 TEXT,
   RespawnPenalty REAL NOT NULL DEFAULT 0 CHECK (typeof(RespawnPenalty) = 'real'),
   HealPenalty REAL NOT NULL DEFAULT 0 CHECK (typeof(HealPenalty) = 'real'),
   GameDuration TEXT NOT NULL DEFAULT '' CHECK (length(GameDuration) <= 255),

@@ -133,18 +133,43 @@ TEST_F(Start, ShowsEmptyListsAndOpensNoPort) {
   EXPECT_THAT(venue.Port.Log, IsEmpty());
 }
 
-TEST_F(Start, EndsWhenTheMissionsAreDamaged) {
+TEST_F(Start, GoesOnWithFreshMissionsWhereTheFileIsDamaged) {
   venue.PutDefaultFiles();
-  WriteFile(venue.DataFile("scenarios.mdb"), std::string(5000, 'x'));
-  EXPECT_EQ(NumberThrownBy([this] { venue.MakeWindow().FormLoad(); }), 3343);
-  EXPECT_EQ(ReadFile(venue.DataFile("scenarios.mdb")), std::string(5000, 'x'));
+  const std::string garbage(5000, 'x');
+  WriteFile(venue.DataFile("scenarios.mdb"), garbage);
+  EXPECT_TRUE(venue.MakeWindow().FormLoad());
+  ASSERT_EQ(venue.Boxes.Boxes.size(), 1U);
+  EXPECT_EQ(venue.Boxes.Boxes[0].Buttons, BoxButtons::OkCancel);
+  EXPECT_EQ(ReadFile(venue.DataFile("scenarios.mdb")), garbage);
+  EXPECT_GT(venue.ActiveMission().count(), 2);
 }
 
-TEST_F(Start, EndsWhenTheMembersAreDamaged) {
+TEST_F(Start, EndsWithoutAnotherWordWhenTheOperatorWantsNoFreshFile) {
+  for (const char* name : {"scenarios.mdb", "members.mdb"}) {
+    venue.Boxes.Boxes.clear();
+    venue.PutDefaultFiles();
+    WriteFile(venue.DataFile(name), std::string(5000, '\0'));
+    venue.Boxes.Answers = {BoxAnswer::Cancel};
+    EXPECT_FALSE(venue.MakeWindow().FormLoad());
+    EXPECT_EQ(venue.Boxes.Boxes.size(), 1U);
+    EXPECT_EQ(ReadFile(venue.DataFile(name)), std::string(5000, '\0'));
+    std::filesystem::remove(venue.DataFile(name));
+  }
+}
+
+TEST_F(Start, TakesTheFilesOfAnOldInstallationOver) {
+  if (!std::filesystem::exists(TESSARINE_OLD_FILES "/members.mdb")) {
+    GTEST_SKIP() << "needs the files of an old installation in " TESSARINE_OLD_FILES;
+  }
   venue.PutDefaultFiles();
-  WriteFile(venue.DataFile("members.mdb"), std::string(5000, 'x'));
-  EXPECT_EQ(NumberThrownBy([this] { venue.MakeWindow().FormLoad(); }), 3343);
-  EXPECT_EQ(ReadFile(venue.DataFile("members.mdb")), std::string(5000, 'x'));
+  for (const char* name : {"scenarios.mdb", "members.mdb"}) {
+    WriteFile(venue.DataFile(name), ReadFile(std::string(TESSARINE_OLD_FILES "/") + name));
+  }
+  EXPECT_TRUE(venue.MakeWindow().FormLoad());
+  EXPECT_EQ(venue.Boxes.Boxes.size(), 2U);
+  EXPECT_EQ(venue.ActiveMission().count(), 8);
+  EXPECT_EQ(venue.QueryDatabase("members.mdb", "SELECT count(*) FROM Members"), "40");
+  EXPECT_TRUE(std::filesystem::exists(venue.DataFile("members.mdb.jet")));
 }
 
 TEST_F(Start, EndsWhenATableIsMissing) {

@@ -15,6 +15,7 @@
 #include <vector>
 
 #include "app/frmRx.h"
+#include "platform/jet/JetConverter.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/qt/QtEventPump.h"
 #include "platform/sqlite/SqliteDatabase.h"
@@ -73,7 +74,7 @@ class Venue {
       events = &RealEvents;
     }
     Window = std::make_unique<frmRx>(
-        ::Services{Strings, Time, Databases, *events, Dialog, Disk, Places, Boxes, Devices, Port});
+        ::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places, Boxes, Devices, Port});
     return *Window;
   }
 
@@ -156,6 +157,7 @@ class Venue {
   FakeClock Time;
   SqliteEngine Databases{std::chrono::milliseconds(50)};
   FakeEventPump Events;
+  JetConverter Old{JetReaderPath(), std::chrono::milliseconds(5000)};
   QtEventPump RealEvents;
   FakeFileDialog Dialog;
   LinuxFiles Disk;

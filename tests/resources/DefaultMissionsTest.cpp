@@ -176,8 +176,11 @@ TEST_F(DefaultMissions, PenaltiesRefuseATextThatIsNoNumber) {
   }
 }
 
-TEST_F(DefaultMissions, TextsHold255CharactersAndNoMore) {
+TEST_F(DefaultMissions, ShortTextsHold255CharactersAndNoMore) {
   for (const std::string& column : Columns) {
+    if (column.starts_with("MissionDescription")) {
+      continue;  // memos of an old installation may be longer
+    }
     if (database.Single("SELECT type FROM pragma_table_info('Table1') WHERE name = '" + column + "'") !=
         "TEXT") {
       continue;

@@ -1,0 +1,70 @@
+#include "platform/jet/ChildProgram.h"
+
+#include <gtest/gtest.h>
+
+#include "platform/RuntimeError.h"
+#include "tests/platform/linux/Thrown.h"
+
+namespace {
+
+using namespace std::chrono_literals;
+
+struct Ran {
+  ChildEnd End;
+  std::string Output;
+};
+
+Ran RunShell(const std::string& script, std::chrono::milliseconds silence = 10s) {
+  Ran ran;
+  ran.End =
+      RunChild("/bin/sh", {"-c", script}, silence, [&ran](std::string_view bytes) { ran.Output += bytes; });
+  return ran;
+}
+
+TEST(ChildProgram, HandsItsOutputOver) {
+  const Ran ran = RunShell("printf 'one\\ntwo'");
+  EXPECT_TRUE(ran.End.Succeeded);
+  EXPECT_EQ(ran.Output, "one\ntwo");
+  EXPECT_EQ(ran.End.Error, "");
+}
+
+TEST(ChildProgram, HandsMoreOverThanAPipeHolds) {
+  const Ran ran = RunShell("head -c 3000000 /dev/zero; head -c 200000 /dev/zero >&2");
+  EXPECT_TRUE(ran.End.Succeeded);
+  EXPECT_EQ(ran.Output.size(), 3000000U);
+}
+
+TEST(ChildProgram, TellsAFailureWithTheFirstLineOfItsError) {
+  const Ran ran = RunShell("echo first >&2; echo second >&2; exit 3");
+  EXPECT_FALSE(ran.End.Succeeded);
+  EXPECT_FALSE(ran.End.TimedOut);
+  EXPECT_EQ(ran.End.Error, "first");
+}
+
+TEST(ChildProgram, TellsACrash) {
+  EXPECT_FALSE(RunShell("kill -SEGV $$").End.Succeeded);
+}
+
+TEST(ChildProgram, IsEndedWhenItIsSilentForTooLong) {
+  const Ran ran = RunShell("echo start; exec sleep 60", 100ms);
+  EXPECT_TRUE(ran.End.TimedOut);
+  EXPECT_FALSE(ran.End.Succeeded);
+  EXPECT_EQ(ran.Output, "start\n");
+}
+
+TEST(ChildProgram, IsEndedWhenItWritesErrorsWithoutEnd) {
+  const Ran ran = RunShell("exec yes >&2", 100ms);
+  EXPECT_TRUE(ran.End.TimedOut);
+  EXPECT_EQ(ran.End.Error, "y");
+}
+
+TEST(ChildProgram, IsEndedWhenItsOutputIsRefused) {
+  const auto refuse = [](std::string_view) { throw RuntimeError(3343); };
+  EXPECT_EQ(NumberThrownBy([&] { RunChild("/bin/sh", {"-c", "echo x; exec sleep 60"}, 10s, refuse); }), 3343);
+}
+
+TEST(ChildProgram, ThatIsMissingIsTold) {
+  EXPECT_EQ(NumberThrownBy([] { RunChild("/nowhere/program", {}, 1s, [](std::string_view) {}); }), 53);
+}
+
+}  // namespace
