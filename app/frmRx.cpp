@@ -254,7 +254,8 @@ void frmRx::ClearPlayerData() {
 }
 
 void frmRx::CalculateScores() {
-  const ReadScope scope(*dbMembers_);
+  const ReadScope members(*dbMembers_);
+  const ReadScope missions(*dbScenarios_);
   analysis_->CalculateScores();
 }
 

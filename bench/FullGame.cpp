@@ -51,6 +51,16 @@ void FillCompletely(Game& game) {
   game.DataPresent = true;
 }
 
+void MakeMissions(const std::string& path, int missions) {
+  std::filesystem::remove(path);
+  MakeDatabase(
+      path, "scenarios_default.sql",
+      "DELETE FROM Table1; WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < " +
+          std::to_string(missions) +
+          ") INSERT INTO Table1 (MissionName, MissionDescription) SELECT 'Mission ' || i, 'What to do' FROM "
+          "n;");
+}
+
 class FullGame::NoBoxes : public MessageBoxes {
  public:
   BoxAnswer Show(const std::string& text, const std::string&, BoxIcon, BoxButtons) override {
@@ -95,7 +105,8 @@ FullGame::~FullGame() {
 }
 
 void FullGame::CalculateScores() {
-  const ReadScope scope(*dbMembers_);
+  const ReadScope members(*dbMembers_);
+  const ReadScope missions(*dbScenarios_);
   analysis_->CalculateScores();
 }
 

@@ -14,6 +14,9 @@
 /// The fullest game: all 224 players active, all 50,176 hits above 0.
 void FillCompletely(Game& game);
 
+/// Makes a mission file at `path` with that many missions.
+void MakeMissions(const std::string& path, int missions);
+
 /// Scores the fullest game with databases of its own. A box shown is a fault and ends the program.
 class FullGame {
  public:

@@ -114,8 +114,9 @@ void Scenarios::LoadMissionList() {
   ForEachRow(rsScenarios_, [this] {
     const QString name = QString::fromStdString(TextOf(rsScenarios_.Fields("MissionName")));
     const std::int32_t id = RoundToInt32(NumberOf(rsScenarios_.Fields("ID")));
-    auto* entry = new QListWidgetItem(name, ui_->MissionSelection1);
+    auto entry = std::make_unique<QListWidgetItem>(name);  // a list that holds it already would search it
     entry->setData(Qt::UserRole, id);
+    ui_->MissionSelection1->addItem(entry.release());
   });
 }
 

@@ -77,6 +77,11 @@ void SqliteRecordset::ForgetRow() {
 
 void SqliteRecordset::MoveFirst() {
   pending_.Drop();
+  lookedUp_ = false;
+  // A walk begins, which may well ask for other columns than what came before it.
+  wanted_.assign(wanted_.size(), false);
+  read_ = SqliteStatement();
+  cache_.Clear();
   if (keys_.Size() == 0) {
     GoToEnd();
   } else {
@@ -86,6 +91,7 @@ void SqliteRecordset::MoveFirst() {
 
 void SqliteRecordset::MoveNext() {
   pending_.Drop();
+  lookedUp_ = false;
   if (Eof()) {
     throw RuntimeError(3021);
   }
@@ -99,6 +105,7 @@ void SqliteRecordset::MoveNext() {
 
 void SqliteRecordset::MoveLast() {
   pending_.Drop();
+  lookedUp_ = false;
   if (keys_.Size() == 0) {
     GoToEnd();
   } else {
@@ -142,6 +149,7 @@ void SqliteRecordset::FindFirst(const std::string& criterion) {
 
 bool SqliteRecordset::WalkTo(const std::string& column, const Value& value) {
   pending_.Drop();
+  lookedUp_ = true;
   const std::size_t i = table_.ColumnAt(column);
   const auto* key = table_.Columns()[i].IsKey ? std::get_if<std::int64_t>(&value) : nullptr;
   if (key != nullptr ? WalkToKey(*key) : WalkToValue(i, value)) {
@@ -209,7 +217,7 @@ bool SqliteRecordset::TryReadRow() {
     return true;
   }
   connection_.PrepareRead();
-  if (!connection_.InGroup()) {
+  if (!connection_.InGroup() || !lookedUp_) {
     row_ = ReadInto(ownRow_, key) ? &ownRow_ : nullptr;
     return row_ != nullptr;
   }

@@ -16,7 +16,7 @@
 #include "platform/sqlite/SqliteTable.h"
 
 /// A dynaset over one table. The current row is read at the first Fields after a move, and of it only the
-/// columns that this recordset has ever been asked for, which are few where many rows are looked up. A long
+/// columns that were asked for since the last MoveFirst, which are few where many rows are looked up. A long
 /// binary column (declared type BLOB) is read whole when the row's is first asked for.
 class SqliteRecordset : public Recordset {
  public:
@@ -91,6 +91,8 @@ class SqliteRecordset : public Recordset {
   std::vector<Value> ownRow_;                ///< a row that was read outside of a group of reads
   const std::vector<Value>* row_ = nullptr;  ///< the current row once it is read
   RowCache cache_;
+  bool lookedUp_ =
+      false;  ///< the current row was searched by a value, as will be again; a walk reads each row once
   std::map<std::size_t, Value> longValues_;
 
   PendingRow pending_;
