@@ -19,8 +19,8 @@ bool Contains(const std::string& type, std::string_view part) {
 
 // SQLite's own rule for a declared type; dates are not among the numbers.
 bool TakesNumbers(const std::string& type) {
-  return Contains(type, "INT") || Contains(type, "REAL") || Contains(type, "FLOA") || Contains(type, "DOUB") ||
-         Contains(type, "NUMERIC");
+  return Contains(type, "INT") || Contains(type, "REAL") || Contains(type, "FLOA") ||
+         Contains(type, "DOUB") || Contains(type, "NUMERIC");
 }
 
 Value NumberFrom(std::string_view text) {
