@@ -20,4 +20,14 @@ class Files {
   /// A path that is a symbolic link has its target replaced. Throws RuntimeError 61 (disk full), 70, 75 or
   /// 76; the text names the file.
   virtual void Replace(const std::string& path, const std::string& bytes) = 0;
+
+  /// Makes a new empty file in the system's temporary folder, its name beginning with "per", and returns its
+  /// path. Throws as Replace does.
+  virtual std::string MakeTempFileName() = 0;
+
+  /// Writes the whole file in place, neither atomic nor durable: for temporary files. Throws as Replace does.
+  virtual void Write(const std::string& path, const std::string& bytes) = 0;
+
+  /// Deletes a file. Throws RuntimeError 53 when it does not exist, 70, 75 or 76.
+  virtual void Delete(const std::string& path) = 0;
 };

@@ -177,3 +177,26 @@ void LinuxFiles::Replace(const std::string& path, const std::string& bytes) {
     throw FileError(errno, path);
   }
 }
+
+std::string LinuxFiles::MakeTempFileName() {
+  std::error_code none;
+  std::string path = std::filesystem::temp_directory_path(none) / "perXXXXXX";
+  const Descriptor file(mkostemp(path.data(), O_CLOEXEC));
+  if (file.Number() < 0) {
+    throw FileError(errno, path);
+  }
+  return path;
+}
+
+void LinuxFiles::Write(const std::string& path, const std::string& bytes) {
+  const Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC | O_NONBLOCK, 0644));
+  if (file.Number() < 0 || !WriteAll(file.Number(), bytes)) {
+    throw FileError(errno, path);
+  }
+}
+
+void LinuxFiles::Delete(const std::string& path) {
+  if (unlink(path.c_str()) != 0) {
+    throw errno == ENOENT ? RuntimeError(53, "File not found: " + path) : FileError(errno, path);
+  }
+}

@@ -17,4 +17,7 @@ class LinuxFiles : public Files {
   /// process's mask. A file that may not be written is refused (70) although its folder would allow to put
   /// another in its place.
   void Replace(const std::string& path, const std::string& bytes) override;
+  std::string MakeTempFileName() override;
+  void Write(const std::string& path, const std::string& bytes) override;
+  void Delete(const std::string& path) override;
 };

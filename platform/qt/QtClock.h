@@ -12,8 +12,15 @@ std::string ShortDateText(const QLocale& locale, QDate date);
 /// `time` in the short form of `locale`.
 std::string ShortTimeText(const QLocale& locale, QTime time);
 
+/// The date at the start of `text`, in the long form of `locale`; `text` as it stands when there is none.
+/// Dates are read in the locale's short form, with two or four digits of the year, and as year-month-day.
+std::string LongDateText(const QLocale& locale, const QString& text);
+
 class QtClock : public Clock {
  public:
   std::string ShortDate() const override { return ShortDateText(QLocale::system(), QDate::currentDate()); }
   std::string ShortTime() const override { return ShortTimeText(QLocale::system(), QTime::currentTime()); }
+  std::string LongDate(const std::string& text) const override {
+    return LongDateText(QLocale::system(), QString::fromStdString(text));
+  }
 };

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <map>
 #include <string>
 
 #include "platform/Clock.h"
@@ -12,4 +13,12 @@ class FakeClock : public Clock {
 
   std::string ShortDate() const override { return Date; }
   std::string ShortTime() const override { return Time; }
+
+  /// Long forms by the texts they are asked for; other texts stand for no date.
+  std::map<std::string, std::string> LongDates = {{"21/05/2013 14:30", "Tuesday, 21 May 2013"}};
+
+  std::string LongDate(const std::string& text) const override {
+    const auto found = LongDates.find(text);
+    return found == LongDates.end() ? text : found->second;
+  }
 };

@@ -53,6 +53,13 @@ class FakeFiles : public Files {
     createFailures_.insert_or_assign(path, error);
   }
 
+  void FailDelete(const std::string& path, const RuntimeError& error) {
+    deleteFailures_.insert_or_assign(path, error);
+  }
+
+  /// Where MakeTempFileName makes "per1", "per2", ...; fails when making that folder is told to fail.
+  static constexpr const char* TempFolder = "/tmp";
+
   bool FileExists(const std::string& path) const override { return contents_.count(path) != 0; }
 
   bool FolderExists(const std::string& path) const override {
@@ -93,6 +100,25 @@ class FakeFiles : public Files {
     contents_[path] = bytes;
   }
 
+  std::string MakeTempFileName() override {
+    ThrowIfTold(createFailures_, TempFolder);
+    const std::string path = std::string(TempFolder) + "/per" + std::to_string(++tempFiles_);
+    Put(path, "");
+    return path;
+  }
+
+  void Write(const std::string& path, const std::string& bytes) override {
+    ThrowIfTold(replaceFailures_, path);
+    contents_[path] = bytes;
+  }
+
+  void Delete(const std::string& path) override {
+    ThrowIfTold(deleteFailures_, path);
+    if (contents_.erase(path) == 0) {
+      throw RuntimeError(53);
+    }
+  }
+
  private:
   using Failures = std::map<std::string, RuntimeError>;
 
@@ -120,4 +146,6 @@ class FakeFiles : public Files {
   Failures readFailures_;
   Failures replaceFailures_;
   Failures createFailures_;
+  Failures deleteFailures_;
+  int tempFiles_ = 0;
 };

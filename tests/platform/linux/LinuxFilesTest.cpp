@@ -285,6 +285,37 @@ TEST(LinuxFilesReplace, TakesAPathRelativeToTheWorkingFolder) {
   EXPECT_EQ(ReadFile(folder / "here"), "x");
 }
 
+TEST(LinuxFilesTemporary, MakesANewEmptyFileEachTime) {
+  LinuxFiles files;
+  const std::string first = files.MakeTempFileName();
+  const std::string second = files.MakeTempFileName();
+  EXPECT_NE(first, second);
+  for (const std::string& path : {first, second}) {
+    EXPECT_EQ(std::filesystem::path(path).parent_path(), std::filesystem::temp_directory_path());
+    EXPECT_EQ(std::filesystem::path(path).filename().string().substr(0, 3), "per");
+    EXPECT_EQ(std::filesystem::file_size(path), 0u);
+    files.Delete(path);
+    EXPECT_FALSE(files.FileExists(path));
+  }
+}
+
+TEST(LinuxFilesWrite, ReplacesTheContentsInPlace) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  files.Write(folder / "file", "a longer text");
+  files.Write(folder / "file", "short");
+  EXPECT_EQ(ReadFile(folder / "file"), "short");
+  EXPECT_EQ(NumberThrownBy([&] { files.Write(folder / "nowhere/file", "x"); }), 76);
+  EXPECT_EQ(NumberThrownBy([&] { files.Write("/dev/full", "x"); }), 61);
+}
+
+TEST(LinuxFilesDelete, ReportsAFileThatIsNotThere) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  EXPECT_EQ(NumberThrownBy([&] { files.Delete(folder / "file"); }), 53);
+  EXPECT_EQ(NumberThrownBy([&] { files.Delete(folder.Path()); }), 75);
+}
+
 TEST(FileError, GivesEachSystemErrorItsNumberAndText) {
   const struct {
     int SystemError;

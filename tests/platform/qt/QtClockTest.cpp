@@ -36,6 +36,39 @@ TEST(ShortTimeText, IsTheLocalesForm) {
   EXPECT_EQ(ShortTimeText(QLocale::c(), afternoon), "14:30:05");
 }
 
+TEST(LongDateText, IsTheLocalesFormOfAShortDateWithOrWithoutATime) {
+  const QLocale american(QLocale::English, QLocale::UnitedStates);
+  EXPECT_EQ(LongDateText(american, QStringLiteral("5/9/2013 2:30 PM")), "Thursday, May 9, 2013");
+  EXPECT_EQ(LongDateText(american, QStringLiteral(" 5/9/2013")), "Thursday, May 9, 2013");
+  EXPECT_EQ(LongDateText(american, QStringLiteral("2013-05-09 14:30")), "Thursday, May 9, 2013");
+  EXPECT_EQ(LongDateText(QLocale(QLocale::German, QLocale::Germany), QStringLiteral("09.05.2013 14:30")),
+            "Donnerstag, 9. Mai 2013");
+  EXPECT_EQ(LongDateText(QLocale(QLocale::Chinese, QLocale::China), QStringLiteral("2013/5/9 14:30")),
+            "2013年5月9日星期四");
+  EXPECT_EQ(LongDateText(QLocale::c(), QStringLiteral("9 May 2013 14:30:05")), "Thursday, 9 May 2013");
+}
+
+TEST(LongDateText, IsTheTextItselfWhenItIsNoDate) {
+  for (const char* text : {"", "N/A", "today", "31/31/2013 14:30", " 14:30 "}) {
+    EXPECT_EQ(LongDateText(QLocale(QLocale::English, QLocale::UnitedStates), QString::fromUtf8(text)), text);
+  }
+}
+
+TEST(LongDateText, ReadsWhatTheClockWritesInEveryLocaleWithWesternDigits) {
+  int checked = 0;
+  for (const QLocale& locale :
+       QLocale::matchingLocales(QLocale::AnyLanguage, QLocale::AnyScript, QLocale::AnyTerritory)) {
+    if (locale.zeroDigit() == QStringLiteral("0")) {
+      const std::string text = ShortDateText(locale, date) + ' ' + ShortTimeText(locale, afternoon);
+      EXPECT_EQ(LongDateText(locale, QString::fromStdString(text)),
+                locale.toString(date, QLocale::LongFormat).toStdString())
+          << locale.name().toStdString() << ": " << text;
+      ++checked;
+    }
+  }
+  EXPECT_GT(checked, 100);
+}
+
 TEST(QtClock, TellsThePresentLocalTimeInTheSystemsForm) {
   const QtClock clock;
   std::string before;
