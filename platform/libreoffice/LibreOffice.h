@@ -1,0 +1,40 @@
+#pragma once
+
+#include <sys/types.h>
+
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "platform/WordProcessor.h"
+
+class OfficeClient;
+
+/// LibreOffice Writer as the word processor, with a profile of its own, so that it never disturbs the
+/// operator's. Its libraries are loaded at the first start only. The process runs under a small host program,
+/// which ends it and clears up when this program ends, however that happens.
+class LibreOffice : public WordProcessor {
+ public:
+  /// `folder`: where the module and the host program lie.
+  explicit LibreOffice(std::string folder);
+  ~LibreOffice() override;
+
+  void Start() override;
+  WordState State() override;
+  std::unique_ptr<WordDocument> Add(const std::string& path) override;
+  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) override;
+  void Quit() noexcept override;
+
+ private:
+  void LoadModule();
+  void StartHost();
+  /// True while the host runs; forgets it when it has ended.
+  bool HostRuns();
+
+  std::string folder_;
+  std::unique_ptr<OfficeClient> client_;
+  std::string pipe_;  ///< name on which LibreOffice listens
+  pid_t host_ = 0;    ///< 0 when none was started
+  int leash_ = -1;    ///< the host ends when this is closed
+  bool ready_ = false;
+};

@@ -1,0 +1,250 @@
+#include "platform/libreoffice/OfficeDocument.h"
+
+#include <algorithm>
+#include <com/sun/star/awt/Size.hpp>
+#include <com/sun/star/beans/XPropertySet.hpp>
+#include <com/sun/star/container/NoSuchElementException.hpp>
+#include <com/sun/star/container/XEnumerationAccess.hpp>
+#include <com/sun/star/container/XNamed.hpp>
+#include <com/sun/star/frame/XStorable.hpp>
+#include <com/sun/star/lang/XMultiServiceFactory.hpp>
+#include <com/sun/star/sheet/XCellRangeData.hpp>
+#include <com/sun/star/table/XCellRange.hpp>
+#include <com/sun/star/text/TableColumnSeparator.hpp>
+#include <com/sun/star/text/TextContentAnchorType.hpp>
+#include <com/sun/star/text/XBookmarksSupplier.hpp>
+#include <com/sun/star/text/XTextContent.hpp>
+#include <com/sun/star/text/XTextTablesSupplier.hpp>
+#include <com/sun/star/util/XCloseable.hpp>
+#include <com/sun/star/view/XPrintable.hpp>
+#include <filesystem>
+#include <utility>
+
+namespace container = com::sun::star::container;
+namespace table = com::sun::star::table;
+namespace text = com::sun::star::text;
+using com::sun::star::awt::Size;
+using com::sun::star::beans::XPropertySet;
+using com::sun::star::uno::UNO_QUERY;
+using com::sun::star::uno::UNO_QUERY_THROW;
+using Uno::Any;
+using Uno::OUString;
+using Uno::Reference;
+using Uno::Sequence;
+
+namespace {
+
+/// The bookmark of this name; Word minds no case.
+Any FindBookmark(container::XNameAccess& bookmarks, const OUString& name) {
+  try {
+    return bookmarks.getByName(name);
+  } catch (const container::NoSuchElementException&) {
+    for (const OUString& other : bookmarks.getElementNames()) {
+      if (other.equalsIgnoreAsciiCase(name)) {
+        return bookmarks.getByName(other);
+      }
+    }
+    throw;
+  }
+}
+
+/// A block of cells, its texts down each column.
+struct Block {
+  int FirstColumn;  ///< counted from 0, as the row
+  int FirstRow;
+  int Columns;
+  int Rows;
+  const std::string* Texts;
+};
+
+void WriteAtOnce(table::XCellRange& range, const Block& block) {
+  Sequence<Sequence<Any>> rows(block.Rows);
+  for (int row = 0; row < block.Rows; ++row) {
+    Sequence<Any> cells(block.Columns);
+    for (int column = 0; column < block.Columns; ++column) {
+      cells.getArray()[column] <<= Uno::ToOffice(block.Texts[column * block.Rows + row]);
+    }
+    rows.getArray()[row] = cells;
+  }
+  const Reference<com::sun::star::sheet::XCellRangeData> cells(
+      range.getCellRangeByPosition(block.FirstColumn, block.FirstRow, block.FirstColumn + block.Columns - 1,
+                                   block.FirstRow + block.Rows - 1),
+      UNO_QUERY_THROW);
+  cells->setDataArray(rows);
+}
+
+/// Tables with merged cells have no ranges, and their cells are known by name: "B3" is the second in row 3.
+Reference<text::XText> CellByName(text::XTextTable& table, int row, int column) {
+  constexpr int letters = 26;
+  OUString name;
+  for (int rest = column + 1; rest > 0; rest = (rest - 1) / letters) {
+    name = OUString(static_cast<sal_Unicode>('A' + (rest - 1) % letters)) + name;
+  }
+  return {table.getCellByName(name + OUString::number(row + 1)), UNO_QUERY_THROW};
+}
+
+void WriteOneByOne(text::XTextTable& table, const Block& block) {
+  for (int column = 0; column < block.Columns; ++column) {
+    for (int row = 0; row < block.Rows; ++row) {
+      CellByName(table, block.FirstRow + row, block.FirstColumn + column)
+          ->setString(Uno::ToOffice(block.Texts[column * block.Rows + row]));
+    }
+  }
+}
+
+/// False for a table with merged or split cells.
+bool IsRegular(table::XCellRange& range) {
+  try {
+    range.getCellRangeByPosition(0, 0, 0, 0);
+    return true;
+  } catch (const com::sun::star::uno::RuntimeException&) {
+    return false;
+  }
+}
+
+/// Room for a picture in a cell of a table's first row, in 1/100 mm: as wide as the cell inside, and a
+/// portrait.
+Size PictureBox(text::XTextTable& table, int column, const Reference<text::XText>& cell) {
+  const Reference<XPropertySet> whole(&table, UNO_QUERY_THROW);
+  const Reference<XPropertySet> inside(cell, UNO_QUERY_THROW);
+  const Reference<XPropertySet> row(table.getRows()->getByIndex(0), UNO_QUERY_THROW);
+  const auto number = [](const Reference<XPropertySet>& properties, const char* name) {
+    sal_Int32 value = 0;
+    properties->getPropertyValue(OUString::createFromAscii(name)) >>= value;
+    return value;
+  };
+  Sequence<text::TableColumnSeparator> separators;
+  row->getPropertyValue("TableColumnSeparators") >>= separators;
+  sal_Int16 sum = 0;
+  whole->getPropertyValue("TableColumnRelativeSum") >>= sum;
+  const int left = column == 0 || column > separators.getLength() ? 0 : separators[column - 1].Position;
+  const int right = column < separators.getLength() ? separators[column].Position : sum;
+  const int width = number(whole, "Width") * (right - left) / std::max<int>(sum, 1) -
+                    number(inside, "LeftBorderDistance") - number(inside, "RightBorderDistance");
+  constexpr int least = 500;
+  const int usable = std::max(width, least);
+  return {usable, usable * 4 / 3};
+}
+
+/// The largest size with the proportions of `picture` inside `box`.
+Size Fit(const Size& picture, const Size& box) {
+  if (picture.Width <= 0 || picture.Height <= 0) {
+    return box;
+  }
+  const double scale = std::min(static_cast<double>(box.Width) / picture.Width,
+                                static_cast<double>(box.Height) / picture.Height);
+  return {std::max(1, static_cast<int>(picture.Width * scale)),
+          std::max(1, static_cast<int>(picture.Height * scale))};
+}
+
+}  // namespace
+
+OfficeDocument::OfficeDocument(Reference<text::XTextDocument> document,
+                               Reference<com::sun::star::graphic::XGraphicProvider> graphics,
+                               std::shared_ptr<BodyTables> bodyTables)
+    : document_(std::move(document)), graphics_(std::move(graphics)), bodyTables_(std::move(bodyTables)) {}
+
+void OfficeDocument::SetBookmark(const std::string& name, const std::string& words) {
+  Uno::Call([&] {
+    if (!bookmarks_.is()) {
+      bookmarks_ = Reference<text::XBookmarksSupplier>(document_, UNO_QUERY_THROW)->getBookmarks();
+    }
+    const Reference<text::XTextContent> bookmark(FindBookmark(*bookmarks_, Uno::ToOffice(name)),
+                                                 UNO_QUERY_THROW);
+    bookmark->getAnchor()->setString(Uno::ToOffice(words));
+  });
+}
+
+void OfficeDocument::WriteCells(int number, int firstRow, int rows, const std::vector<std::string>& texts) {
+  Uno::Call([&] {
+    const Reference<text::XTextTable> whole = Table(number);
+    const int count = static_cast<int>(texts.size());
+    const int full = count / rows;
+    const Block blocks[] = {{0, firstRow - 1, full, rows, texts.data()},
+                            {full, firstRow - 1, 1, count % rows, texts.data() + full * rows}};
+    const Reference<table::XCellRange> range(whole, UNO_QUERY_THROW);
+    const bool atOnce = count > 0 && IsRegular(*range);
+    for (const Block& block : blocks) {
+      if (block.Columns > 0 && block.Rows > 0) {
+        atOnce ? WriteAtOnce(*range, block) : WriteOneByOne(*whole, block);
+      }
+    }
+  });
+}
+
+void OfficeDocument::AddPicture(int number, int row, int column, const std::string& file) {
+  Uno::Call([&] {
+    const Reference<text::XTextTable> whole = Table(number);
+    const Reference<text::XText> cell = CellByName(*whole, row - 1, column - 1);
+    const Reference<XPropertySet> graphic(
+        graphics_->queryGraphic(Uno::Properties({{"URL", Any(Uno::UrlOf(file))}})), UNO_QUERY_THROW);
+    Size own;
+    graphic->getPropertyValue("SizePixel") >>= own;
+    const Reference<com::sun::star::lang::XMultiServiceFactory> factory(document_, UNO_QUERY_THROW);
+    const Reference<text::XTextContent> picture(
+        factory->createInstance("com.sun.star.text.TextGraphicObject"), UNO_QUERY_THROW);
+    const Reference<XPropertySet> properties(picture, UNO_QUERY_THROW);
+    properties->setPropertyValue("Graphic", Any(graphic));
+    properties->setPropertyValue("AnchorType", Any(text::TextContentAnchorType_AS_CHARACTER));
+    properties->setPropertyValue("Size", Any(Fit(own, PictureBox(*whole, column - 1, cell))));
+    cell->insertTextContent(cell->getStart(), picture, false);
+  });
+}
+
+void OfficeDocument::SaveAs(const std::string& path) {
+  Store(path, "MS Word 97");
+}
+
+void OfficeDocument::ExportPdf(const std::string& path) {
+  Store(path, "writer_pdf_Export");
+}
+
+void OfficeDocument::Store(const std::string& path, const char* filter) {
+  try {
+    Uno::Call([&] {
+      const Reference<com::sun::star::frame::XStorable> storable(document_, UNO_QUERY_THROW);
+      storable->storeToURL(Uno::UrlOf(path),
+                           Uno::Properties({{"FilterName", Any(OUString::createFromAscii(filter))}}));
+    });
+  } catch (const RuntimeError&) {
+    std::error_code ignored;
+    std::filesystem::remove(path, ignored);
+    throw;
+  }
+}
+
+void OfficeDocument::PrintOut() {
+  Uno::Call([&] {
+    const Reference<com::sun::star::view::XPrintable> printable(document_, UNO_QUERY_THROW);
+    printable->print(Uno::Properties({{"Wait", Any(true)}}));
+  });
+}
+
+void OfficeDocument::Close() {
+  Uno::Call([&] { Reference<com::sun::star::util::XCloseable>(document_, UNO_QUERY_THROW)->close(true); });
+}
+
+Reference<text::XTextTable> OfficeDocument::Table(int number) {
+  if (!tables_.is()) {
+    tables_ = Reference<text::XTextTablesSupplier>(document_, UNO_QUERY_THROW)->getTextTables();
+  }
+  if (bodyTables_->empty()) {
+    FindBodyTables();
+  }
+  if (number > static_cast<int>(bodyTables_->size())) {
+    throw RuntimeError(9);
+  }
+  return {tables_->getByName((*bodyTables_)[static_cast<std::size_t>(number) - 1]), UNO_QUERY_THROW};
+}
+
+void OfficeDocument::FindBodyTables() {
+  // The collection of tables is in no told order, and holds those in cells and frames too.
+  const Reference<container::XEnumerationAccess> body(document_->getText(), UNO_QUERY_THROW);
+  const Reference<container::XEnumeration> parts = body->createEnumeration();
+  while (parts->hasMoreElements()) {
+    const Reference<text::XTextTable> found(parts->nextElement(), UNO_QUERY);
+    if (found.is()) {
+      bodyTables_->push_back(Reference<container::XNamed>(found, UNO_QUERY_THROW)->getName());
+    }
+  }
+}

@@ -1,0 +1,44 @@
+#pragma once
+
+#include <com/sun/star/container/XNameAccess.hpp>
+#include <com/sun/star/graphic/XGraphicProvider.hpp>
+#include <com/sun/star/lang/XComponent.hpp>
+#include <com/sun/star/text/XTextDocument.hpp>
+#include <com/sun/star/text/XTextTable.hpp>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "platform/WordProcessor.h"
+#include "platform/libreoffice/Uno.h"
+
+/// Names of the body's tables of a template, in the body's order. Finding them takes many calls, and they are
+/// the same in every document made from it; empty until the first has asked.
+using BodyTables = std::vector<Uno::OUString>;
+
+/// A text document that is open in LibreOffice.
+class OfficeDocument : public WordDocument {
+ public:
+  OfficeDocument(Uno::Reference<com::sun::star::text::XTextDocument> document,
+                 Uno::Reference<com::sun::star::graphic::XGraphicProvider> graphics,
+                 std::shared_ptr<BodyTables> bodyTables);
+
+  void SetBookmark(const std::string& name, const std::string& text) override;
+  void WriteCells(int table, int firstRow, int rows, const std::vector<std::string>& texts) override;
+  void AddPicture(int table, int row, int column, const std::string& file) override;
+  void SaveAs(const std::string& path) override;
+  void ExportPdf(const std::string& path) override;
+  void PrintOut() override;
+  void Close() override;
+
+ private:
+  Uno::Reference<com::sun::star::text::XTextTable> Table(int number);
+  void FindBodyTables();
+  void Store(const std::string& path, const char* filter);
+
+  Uno::Reference<com::sun::star::text::XTextDocument> document_;
+  Uno::Reference<com::sun::star::graphic::XGraphicProvider> graphics_;
+  std::shared_ptr<BodyTables> bodyTables_;
+  Uno::Reference<com::sun::star::container::XNameAccess> bookmarks_;
+  Uno::Reference<com::sun::star::container::XNameAccess> tables_;
+};

@@ -1,0 +1,8 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+/// Joins the PDF files `parts` into one at `target`, in their order. Throws RuntimeError 75 when one cannot
+/// be read or the target cannot be written; no half file is left.
+void JoinPdfs(const std::vector<std::string>& parts, const std::string& target);

@@ -1,0 +1,146 @@
+#include <dlfcn.h>
+#include <osl/pipe.h>
+#include <stdlib.h>
+#include <com/sun/star/bridge/XUnoUrlResolver.hpp>
+#include <com/sun/star/connection/NoConnectException.hpp>
+#include <com/sun/star/frame/XComponentLoader.hpp>
+#include <com/sun/star/frame/XDesktop.hpp>
+#include <com/sun/star/frame/XModel.hpp>
+#include <com/sun/star/graphic/XGraphicProvider.hpp>
+#include <com/sun/star/lang/XMultiComponentFactory.hpp>
+#include <com/sun/star/uno/XComponentContext.hpp>
+#include <com/sun/star/util/XCloseable.hpp>
+#include <cppuhelper/bootstrap.hxx>
+
+#include <filesystem>
+#include <map>
+#include <utility>
+
+#include "platform/libreoffice/OfficeClient.h"
+#include "platform/libreoffice/OfficeDocument.h"
+#include "platform/libreoffice/PdfJoin.h"
+#include "platform/libreoffice/Uno.h"
+
+using com::sun::star::uno::UNO_QUERY;
+using com::sun::star::uno::UNO_QUERY_THROW;
+using com::sun::star::uno::XComponentContext;
+using Uno::Any;
+using Uno::OUString;
+using Uno::Reference;
+
+namespace {
+
+/// Template files are told apart by path and time of change.
+using TemplateKey = std::pair<std::string, std::filesystem::file_time_type>;
+
+class UnoClient : public OfficeClient {
+ public:
+  std::string ProgramFolder() const override {
+    Dl_info info{};
+    dladdr(reinterpret_cast<const void*>(&osl_createPipe), &info);
+    return std::filesystem::path(info.dli_fname).parent_path();
+  }
+
+  bool Connect(const std::string& name) override;
+  std::unique_ptr<WordDocument> Add(const std::string& path) override;
+
+  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) override {
+    ::JoinPdfs(parts, target);
+  }
+
+  void Terminate() noexcept override;
+
+ private:
+  void CreateLocalContext();
+
+  template <typename Interface>
+  Reference<Interface> Create(const Reference<XComponentContext>& context, const char* service) {
+    return {
+        context->getServiceManager()->createInstanceWithContext(OUString::createFromAscii(service), context),
+        UNO_QUERY_THROW};
+  }
+
+  Reference<XComponentContext> local_;
+  Reference<com::sun::star::bridge::XUnoUrlResolver> resolver_;
+  Reference<com::sun::star::frame::XDesktop> desktop_;
+  Reference<com::sun::star::graphic::XGraphicProvider> graphics_;
+  std::map<TemplateKey, std::shared_ptr<BodyTables>> bodyTables_;
+};
+
+void UnoClient::CreateLocalContext() {
+  // Without this the client's own start-up finds neither its services nor its types, and crashes.
+  const std::string bootstrap = "vnd.sun.star.pathname:" + ProgramFolder() + "/fundamentalrc";
+  setenv("URE_BOOTSTRAP", bootstrap.c_str(), 1);
+  local_ = cppu::defaultBootstrap_InitialComponentContext();
+  resolver_ = Create<com::sun::star::bridge::XUnoUrlResolver>(local_, "com.sun.star.bridge.UnoUrlResolver");
+}
+
+bool UnoClient::Connect(const std::string& name) {
+  return Uno::Call([&] {
+    if (!resolver_.is()) {
+      CreateLocalContext();
+    }
+    try {
+      const Reference<XComponentContext> remote(
+          resolver_->resolve(Uno::ToOffice("uno:pipe,name=" + name + ";urp;StarOffice.ComponentContext")),
+          UNO_QUERY_THROW);
+      desktop_ = Create<com::sun::star::frame::XDesktop>(remote, "com.sun.star.frame.Desktop");
+      graphics_ =
+          Create<com::sun::star::graphic::XGraphicProvider>(remote, "com.sun.star.graphic.GraphicProvider");
+      return true;
+    } catch (const com::sun::star::connection::NoConnectException&) {
+      return false;
+    }
+  });
+}
+
+std::unique_ptr<WordDocument> UnoClient::Add(const std::string& path) {
+  std::error_code failure;
+  const auto changed = std::filesystem::last_write_time(path, failure);
+  if (failure) {
+    throw RuntimeError(53, "File not found: " + path);
+  }
+  return Uno::Call([&]() -> std::unique_ptr<WordDocument> {
+    const Reference<com::sun::star::frame::XComponentLoader> loader(desktop_, UNO_QUERY_THROW);
+    const Reference<com::sun::star::lang::XComponent> component = loader->loadComponentFromURL(
+        Uno::UrlOf(path), "_blank", 0, Uno::Properties({{"Hidden", Any(true)}, {"AsTemplate", Any(true)}}));
+    const Reference<com::sun::star::text::XTextDocument> document(component, UNO_QUERY);
+    OUString filter;
+    if (document.is()) {
+      for (const auto& argument : document->getArgs()) {
+        if (argument.Name == "FilterName") {
+          argument.Value >>= filter;
+        }
+      }
+    }
+    // What is of no known format is taken for a plain text.
+    if (!document.is() || filter == "Text" || filter == "Text (encoded)") {
+      if (const Reference<com::sun::star::util::XCloseable> open(component, UNO_QUERY); open.is()) {
+        open->close(true);
+      }
+      throw RuntimeError(321, "Invalid file format: " + path);
+    }
+    std::shared_ptr<BodyTables>& tables = bodyTables_[{path, changed}];
+    if (!tables) {
+      tables = std::make_shared<BodyTables>();
+    }
+    return std::make_unique<OfficeDocument>(document, graphics_, tables);
+  });
+}
+
+void UnoClient::Terminate() noexcept {
+  try {
+    desktop_->terminate();
+  } catch (const com::sun::star::uno::Exception&) {
+    // Whoever is gone already has ended too.
+    graphics_.clear();
+  }
+  graphics_.clear();
+  desktop_.clear();
+}
+
+}  // namespace
+
+extern "C" __attribute__((visibility("default"))) OfficeClient* NewOfficeClient() {
+  return new UnoClient;
+}
