@@ -1,6 +1,7 @@
 #include "app/Composition.h"
 
 #include <QApplication>
+#include <QDir>
 #include <QIcon>
 #include <QLibraryInfo>
 #include <QLocale>
@@ -32,9 +33,18 @@ Language LanguageOfSystem() {
   return LanguageOf(languages.isEmpty() ? std::string() : languages.first().toStdString());
 }
 
+/// Where the word processor's module lies: beside the program, or where it is installed.
+std::string ModuleFolder() {
+  const QDir program(QCoreApplication::applicationDirPath());
+  const bool isBuildTree = program.exists(QStringLiteral("tessarine-office-host"));
+  return (isBuildTree ? program.absolutePath()
+                      : QDir::cleanPath(program.absoluteFilePath(QStringLiteral(TESSARINE_MODULE_PATH))))
+      .toStdString();
+}
+
 }  // namespace
 
-Composition::Composition() : strings_(LanguageOfSystem()) {
+Composition::Composition() : strings_(LanguageOfSystem()), wordProcessor_(ModuleFolder()) {
   if (strings_.TextLanguage() == Language::SimplifiedChinese &&
       dialogTexts_.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
     QCoreApplication::installTranslator(&dialogTexts_);
@@ -44,6 +54,8 @@ Composition::Composition() : strings_(LanguageOfSystem()) {
 ::Services Composition::Services() {
   return {strings_, clock_,   databases_, old_,     events_, fileDialog_,
           files_,   folders_, boxes_,     devices_, port_};
+  return {strings_, clock_, databases_, events_, fileDialog_,   files_,
+          folders_, boxes_, devices_,   port_,   wordProcessor_};
 }
 
 void Composition::SetMainWindow(QWidget* window) {

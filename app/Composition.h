@@ -5,6 +5,7 @@
 #include "app/Services.h"
 #include "core/StringTable.h"
 #include "platform/jet/JetConverter.h"
+#include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/qt/QtClock.h"
 #include "platform/qt/QtEventPump.h"
@@ -40,6 +41,7 @@ class Composition {
   QtMessageBoxes boxes_;
   QtSerialDevices devices_;
   QtSerialPort port_;
+  LibreOffice wordProcessor_;
 };
 
 /// Name, icon and look of the application; call once before the first window.

@@ -11,6 +11,7 @@
 #include "platform/OldDatabases.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
+#include "platform/WordProcessor.h"
 
 /// The platform's parts that the main window works with; they outlive it.
 struct Services {
@@ -25,4 +26,5 @@ struct Services {
   MessageBoxes& Boxes;
   const SerialDevices& Devices;
   SerialPort& MSComm1;
+  ::WordProcessor& WordProcessor;
 };

@@ -27,6 +27,8 @@
 #include "core/UserDatabase.h"
 #include "missions/Scenarios.h"
 #include "platform/ErrorReport.h"
+#include "sheets/ScoreSheets.h"
+#include "sheets/SheetProgressWindow.h"
 #include "ui_frmRx.h"
 
 frmRx::frmRx(const Services& services)
@@ -54,6 +56,10 @@ bool frmRx::FormLoad() {
   factors_ = ReadSoldieringFactors(*ini_);
   ConnectCommands();
   return true;
+  // Not before the window has come up.
+  constexpr int followMilliseconds = 100;
+  connect(&wordProcessorTimer_, &QTimer::timeout, this, [this] { Run([this] { FollowWordProcessor(); }); });
+  wordProcessorTimer_.start(followMilliseconds);
 }
 
 void frmRx::SetCaptions() {
@@ -168,6 +174,7 @@ void frmRx::ConnectCommands() {
       {ui_->mnuSaveScores, &frmRx::SaveGame},
       {ui_->mnuClearScores, &frmRx::ClearGame},
       {ui_->mnuGetKeshData, &frmRx::GetScoreData},
+      {ui_->mnuPrintScores, &frmRx::PrintScores},
       {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},
       {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
       {ui_->mnuAbout, &frmRx::ShowAbout},
@@ -216,6 +223,8 @@ void frmRx::closeEvent(QCloseEvent* event) {
   rsMembers_.reset();
   dbScenarios_.reset();
   dbMembers_.reset();
+  wordProcessorTimer_.stop();
+  services_.WordProcessor.Quit();
   event->accept();
 }
 
@@ -304,6 +313,53 @@ void frmRx::GetScoreData() {
         .GetScores();
   }
   CalculateScores();
+}
+
+void frmRx::FollowWordProcessor() {
+  try {
+    if (!std::exchange(wordProcessorStarted_, true)) {
+      services_.WordProcessor.Start();
+    }
+    switch (services_.WordProcessor.State()) {
+      case WordState::Starting:
+        return;
+      case WordState::Ready:
+        wordProcessorTimer_.stop();
+        return;
+      case WordState::Ended:
+        break;
+    }
+  } catch (const RuntimeError&) {
+    // Told below, like a word processor that ends while it starts.
+  }
+  wordProcessorTimer_.stop();
+  ui_->mnuPrintScores->setEnabled(false);
+  services_.Boxes.Show(services_.Strings.Text(117), services_.Strings.Text(118), BoxIcon::Exclamation);
+}
+
+void frmRx::PrintScores() {
+  if (!printOptions_) {
+    printOptions_ = std::make_unique<PrintOptions>(services_.Strings, services_.Boxes, this);
+  }
+  printOptions_->exec();
+  if (printOptions_->Choice().SheetSelection == SheetSelection::Nothing) {
+    return;
+  }
+  const WaitCursor cursor;
+  SheetProgressWindow progress(services_.Strings, this);
+  const SheetSources sources{game_,
+                             *rsMembers_,
+                             *members_,
+                             services_.Strings,
+                             services_.Time,
+                             services_.Events,
+                             services_.Disk,
+                             services_.Boxes,
+                             services_.WordProcessor,
+                             progress,
+                             userDataFolder_,
+                             missions_->Text()};
+  ScoreSheets(sources, printOptions_->Choice()).GenerateScoreSheets();
 }
 
 void frmRx::ShowCommPortSettings() {

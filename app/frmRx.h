@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QMainWindow>
+#include <QTimer>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -16,6 +17,7 @@
 #include "core/ScoreAnalysis.h"
 #include "core/ScoreList.h"
 #include "core/SoldieringFactors.h"
+#include "sheets/PrintOptions.h"
 
 namespace Ui {
 class frmRx;
@@ -58,6 +60,10 @@ class frmRx : public QMainWindow {
   void SaveGame();
   void ClearGame();
   void GetScoreData();
+  /// Starts the word processor and follows it until it is ready. Where it is missing, says so once and goes
+  /// on without printing.
+  void FollowWordProcessor();
+  void PrintScores();
   void ShowCommPortSettings();
   void ShowSoldieringCalc();
   void ShowAbout();
@@ -91,6 +97,9 @@ class frmRx : public QMainWindow {
   std::optional<MemberLookup> members_;
   std::optional<ScoreAnalysis> analysis_;
   int selectedPlayer_ = 0;       ///< record index of the player under the context menu
+  std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again
+  QTimer wordProcessorTimer_;
+  bool wordProcessorStarted_ = false;
   int runningCommands_ = 0;      ///< commands on the stack; a wait in one can start another
   bool closeRequested_ = false;  ///< close as soon as the last of them has unwound
 };

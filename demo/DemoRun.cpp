@@ -7,12 +7,14 @@
 #include <QLineEdit>
 #include <QMessageBox>
 #include <QPushButton>
+#include <QRadioButton>
 #include <QSaveFile>
 #include <QTableView>
 #include <QTest>
 #include <cstdio>
 
 #include "demo/BoardText.h"
+#include "sheets/PrintOptions.h"
 
 DemoRun::DemoRun(QMainWindow& window, const QDir& folder)
     : window_(window), folder_(folder), gameFile_(folder.absoluteFilePath(QStringLiteral("game.xml"))) {
@@ -28,6 +30,7 @@ QStringList DemoRun::Run() {
   watch_.start(watchMilliseconds);
   PullGame();
   SaveGame();
+  PrintSheets();
   watch_.stop();
   WriteBoard();
   return faults_;
@@ -42,6 +45,14 @@ void DemoRun::SaveGame() {
   window_.findChild<QAction*>(QStringLiteral("mnuSaveScores"))->trigger();
   if (QFileInfo(gameFile_).size() == 0) {
     faults_.append(QStringLiteral("The game was not saved."));
+  }
+}
+
+void DemoRun::PrintSheets() {
+  sheetsPrinted_ = false;
+  window_.findChild<QAction*>(QStringLiteral("mnuPrintScores"))->trigger();
+  if (!sheetsPrinted_) {
+    faults_.append(QStringLiteral("The score sheets were not made."));
   }
 }
 
@@ -68,8 +79,15 @@ void DemoRun::AnswerDialogs() {
   if (auto* dialog = qobject_cast<QFileDialog*>(front)) {
     dialog->findChild<QLineEdit*>(QStringLiteral("fileNameEdit"))->setText(gameFile_);
     QMetaObject::invokeMethod(dialog, "accept");
+  } else if (auto* options = qobject_cast<PrintOptions*>(front)) {
+    options->findChild<QRadioButton*>(QStringLiteral("PrintFile"))->setChecked(true);
+    options->accept();
   } else if (auto* box = qobject_cast<QMessageBox*>(front)) {
-    faults_.append(QStringLiteral("A box came up: %1").arg(box->text()));
+    if (box->icon() == QMessageBox::Information) {
+      sheetsPrinted_ = true;
+    } else {
+      faults_.append(QStringLiteral("A box came up: %1").arg(box->text()));
+    }
     box->defaultButton()->click();
   }
 }

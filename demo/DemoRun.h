@@ -6,7 +6,8 @@
 #include <QTimer>
 
 /// Plays the operator for one game: presses the real button of the real window, waits for the end, saves the
-/// game through the menu and the file dialog, and leaves the board as text and picture.
+/// game through the menu and the file dialog, prints the score sheets of the active players to files, and
+/// leaves the board as text and picture.
 class DemoRun : public QObject {
   Q_OBJECT
 
@@ -19,10 +20,12 @@ class DemoRun : public QObject {
  private:
   void PullGame();
   void SaveGame();
+  void PrintSheets();
   void WriteBoard();
   void WriteFile(const QString& name, const QString& text);
-  /// Answers whatever is open in front of the main window: the file dialog with `gameFile_`, a box, which is
-  /// a fault here, with its default button.
+  /// Answers whatever is open in front of the main window: the file dialog with `gameFile_`, the print
+  /// options with files as output, a box, which is a fault here unless it tells the end of printing, with its
+  /// default button.
   void AnswerDialogs();
 
   QMainWindow& window_;
@@ -30,4 +33,5 @@ class DemoRun : public QObject {
   QString gameFile_;
   QTimer watch_;
   QStringList faults_;
+  bool sheetsPrinted_ = false;  ///< the box that tells the end of printing came
 };

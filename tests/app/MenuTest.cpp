@@ -31,7 +31,7 @@ const std::vector<Menu> Menus = {
       {"mnuClearScores", 207, "&Clear Game", true},
       {"mnuGetKeshData", 0, "Get Score Data", true},
       {"mnuCommitGame", 0, "C&ommit Game to Database", false},
-      {"mnuPrintScores", 208, "&Print Score Sheets", false},
+      {"mnuPrintScores", 208, "&Print Score Sheets", true},
       {"mnuAdminData", 209, "&Admin Data", true},
       {"mnuExit", 210, "E&xit", true}}},
     {{"mnuMissions", 211, "&Missions", true},

@@ -27,6 +27,7 @@
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
+#include "tests/fakes/FakeWordProcessor.h"
 #include "tests/platform/linux/TemporaryFolder.h"
 #include "tests/platform/sqlite/TestDatabase.h"
 
@@ -75,6 +76,7 @@ class Venue {
     }
     Window = std::make_unique<frmRx>(
         ::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places, Boxes, Devices, Port});
+        ::Services{Strings, Time, Databases, *events, Dialog, Disk, Places, Boxes, Devices, Port, Word});
     return *Window;
   }
 
@@ -165,6 +167,7 @@ class Venue {
   FakeMessageBoxes Boxes;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
+  FakeWordProcessor Word;
   std::unique_ptr<frmRx> Window;
 
  private:
