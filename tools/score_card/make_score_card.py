@@ -41,10 +41,10 @@ STRIPE = 0xF3F5F8
 WHITE = 0xFFFFFF
 RED, BLUE, YELLOW = 0xD8343C, 0x2468D2, 0xF2B61C
 
-# A sheet lists 20 opponents in a column. Few games reach the fourth column, so the first three are wide enough for a
-# nickname and the rest share what is left, in smaller print.
-HIT_COLUMNS = [3600, 3600, 2700] + [1000] * 7 + [1050] * 2
-WIDE_HIT_COLUMNS = 3
+# A sheet lists 20 opponents in a column. Up to 40 are usual: the first two columns are wide enough for a full name on
+# one line, so that the sheet stays one page; the rest share what is left, in smaller print.
+HIT_COLUMNS = [4900, 4900, 1560] + [848] * 8 + [856]
+WIDE_HIT_COLUMNS = 2
 HIT_ROWS = 21
 
 # The height of a line is fixed where a Chinese line would be higher than a Latin one and push the sheet onto a second
@@ -62,8 +62,8 @@ STYLES = {
     "Card Figure": (16, True, INK, CENTER, 40, 0, 0),
     "Card Record": (11, True, INK, CENTER, 40, 0, 0),
     "Card Hits Heading": (8, True, WHITE, LEFT, 40, 40, 380),
-    "Card Hits": (7.5, False, INK, LEFT, 0, 0, 360),
-    "Card Hits Small": (5, False, INK, LEFT, 0, 0, 220),
+    "Card Hits": (7.5, False, INK, LEFT, 0, 0, 390),
+    "Card Hits Small": (5, False, INK, LEFT, 0, 0, 200),
 }
 
 BOOKMARKS = {
