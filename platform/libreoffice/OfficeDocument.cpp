@@ -139,10 +139,9 @@ Size Fit(const Size& picture, const Size& box) {
 
 }  // namespace
 
-OfficeDocument::OfficeDocument(Reference<text::XTextDocument> document,
-                               Reference<com::sun::star::graphic::XGraphicProvider> graphics,
+OfficeDocument::OfficeDocument(Reference<text::XTextDocument> document, OfficeServices services,
                                std::shared_ptr<BodyTables> bodyTables)
-    : document_(std::move(document)), graphics_(std::move(graphics)), bodyTables_(std::move(bodyTables)) {}
+    : document_(std::move(document)), services_(std::move(services)), bodyTables_(std::move(bodyTables)) {}
 
 void OfficeDocument::SetBookmark(const std::string& name, const std::string& words) {
   Uno::Call([&] {
@@ -177,7 +176,7 @@ void OfficeDocument::AddPicture(int number, int row, int column, const std::stri
     const Reference<text::XTextTable> whole = Table(number);
     const Reference<text::XText> cell = CellByName(*whole, row - 1, column - 1);
     const Reference<XPropertySet> graphic(
-        graphics_->queryGraphic(Uno::Properties({{"URL", Any(Uno::UrlOf(file))}})), UNO_QUERY_THROW);
+        services_.Graphics->queryGraphic(Uno::Properties({{"URL", Any(Uno::UrlOf(file))}})), UNO_QUERY_THROW);
     Size own;
     graphic->getPropertyValue("SizePixel") >>= own;
     const Reference<com::sun::star::lang::XMultiServiceFactory> factory(document_, UNO_QUERY_THROW);
@@ -215,6 +214,11 @@ void OfficeDocument::Store(const std::string& path, const char* filter) {
 
 void OfficeDocument::PrintOut() {
   Uno::Call([&] {
+    // Where the system has no printer, this one stands for it and swallows what it is given.
+    const OUString printer = services_.Printers->getDefaultPrinterName();
+    if (printer.isEmpty() || printer == "Generic Printer") {
+      throw RuntimeError(482, "Printer error");
+    }
     const Reference<com::sun::star::view::XPrintable> printable(document_, UNO_QUERY_THROW);
     printable->print(Uno::Properties({{"Wait", Any(true)}}));
   });

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <com/sun/star/awt/XPrinterServer2.hpp>
 #include <com/sun/star/container/XNameAccess.hpp>
 #include <com/sun/star/graphic/XGraphicProvider.hpp>
 #include <com/sun/star/lang/XComponent.hpp>
@@ -16,11 +17,16 @@
 /// the same in every document made from it; empty until the first has asked.
 using BodyTables = std::vector<Uno::OUString>;
 
+/// What documents need of the LibreOffice they are open in.
+struct OfficeServices {
+  Uno::Reference<com::sun::star::graphic::XGraphicProvider> Graphics;
+  Uno::Reference<com::sun::star::awt::XPrinterServer2> Printers;
+};
+
 /// A text document that is open in LibreOffice.
 class OfficeDocument : public WordDocument {
  public:
-  OfficeDocument(Uno::Reference<com::sun::star::text::XTextDocument> document,
-                 Uno::Reference<com::sun::star::graphic::XGraphicProvider> graphics,
+  OfficeDocument(Uno::Reference<com::sun::star::text::XTextDocument> document, OfficeServices services,
                  std::shared_ptr<BodyTables> bodyTables);
 
   void SetBookmark(const std::string& name, const std::string& text) override;
@@ -37,7 +43,7 @@ class OfficeDocument : public WordDocument {
   void Store(const std::string& path, const char* filter);
 
   Uno::Reference<com::sun::star::text::XTextDocument> document_;
-  Uno::Reference<com::sun::star::graphic::XGraphicProvider> graphics_;
+  OfficeServices services_;
   std::shared_ptr<BodyTables> bodyTables_;
   Uno::Reference<com::sun::star::container::XNameAccess> bookmarks_;
   Uno::Reference<com::sun::star::container::XNameAccess> tables_;

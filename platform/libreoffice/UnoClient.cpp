@@ -63,7 +63,7 @@ class UnoClient : public OfficeClient {
   Reference<XComponentContext> local_;
   Reference<com::sun::star::bridge::XUnoUrlResolver> resolver_;
   Reference<com::sun::star::frame::XDesktop> desktop_;
-  Reference<com::sun::star::graphic::XGraphicProvider> graphics_;
+  OfficeServices services_;
   std::map<TemplateKey, std::shared_ptr<BodyTables>> bodyTables_;
 };
 
@@ -85,8 +85,9 @@ bool UnoClient::Connect(const std::string& name) {
           resolver_->resolve(Uno::ToOffice("uno:pipe,name=" + name + ";urp;StarOffice.ComponentContext")),
           UNO_QUERY_THROW);
       desktop_ = Create<com::sun::star::frame::XDesktop>(remote, "com.sun.star.frame.Desktop");
-      graphics_ =
-          Create<com::sun::star::graphic::XGraphicProvider>(remote, "com.sun.star.graphic.GraphicProvider");
+      services_ = {
+          Create<com::sun::star::graphic::XGraphicProvider>(remote, "com.sun.star.graphic.GraphicProvider"),
+          Create<com::sun::star::awt::XPrinterServer2>(remote, "com.sun.star.awt.PrinterServer")};
       return true;
     } catch (const com::sun::star::connection::NoConnectException&) {
       return false;
@@ -124,19 +125,17 @@ std::unique_ptr<WordDocument> UnoClient::Add(const std::string& path) {
     if (!tables) {
       tables = std::make_shared<BodyTables>();
     }
-    return std::make_unique<OfficeDocument>(document, graphics_, tables);
+    return std::make_unique<OfficeDocument>(document, services_, tables);
   });
 }
 
 void UnoClient::Terminate() noexcept {
+  services_ = {};
   try {
-    desktop_->terminate();
+    std::exchange(desktop_, {})->terminate();
   } catch (const com::sun::star::uno::Exception&) {
-    // Whoever is gone already has ended too.
-    graphics_.clear();
+    return;  // It has ended already.
   }
-  graphics_.clear();
-  desktop_.clear();
 }
 
 }  // namespace
