@@ -92,13 +92,11 @@ void WriteOneByOne(text::XTextTable& table, const Block& block) {
   }
 }
 
-/// False for a table with merged or split cells.
-bool IsRegular(table::XCellRange& range) {
+void WriteBlock(text::XTextTable& table, table::XCellRange& range, const Block& block) {
   try {
-    range.getCellRangeByPosition(0, 0, 0, 0);
-    return true;
-  } catch (const com::sun::star::uno::RuntimeException&) {
-    return false;
+    WriteAtOnce(range, block);
+  } catch (const com::sun::star::uno::Exception&) {
+    WriteOneByOne(table, block);  // tells what is missing, if anything is
   }
 }
 
@@ -162,10 +160,9 @@ void OfficeDocument::WriteCells(int number, int firstRow, int rows, const std::v
     const Block blocks[] = {{0, firstRow - 1, full, rows, texts.data()},
                             {full, firstRow - 1, 1, count % rows, texts.data() + full * rows}};
     const Reference<table::XCellRange> range(whole, UNO_QUERY_THROW);
-    const bool atOnce = count > 0 && IsRegular(*range);
     for (const Block& block : blocks) {
       if (block.Columns > 0 && block.Rows > 0) {
-        atOnce ? WriteAtOnce(*range, block) : WriteOneByOne(*whole, block);
+        WriteBlock(*whole, *range, block);
       }
     }
   });

@@ -1,0 +1,85 @@
+#include <gmock/gmock.h>
+
+#include <QRadioButton>
+
+#include "sheets/PrintOptions.h"
+#include "tests/app/Venue.h"
+#include "tests/platform/qt/WhileModal.h"
+
+namespace {
+
+using testing::Contains;
+using testing::ElementsAre;
+using testing::IsEmpty;
+using testing::SizeIs;
+using Box = FakeMessageBoxes::Box;
+
+const Box WordMissing = {"Could not start Microsoft Word - score printing is disabled.",
+                         "Microsoft Word Error", BoxIcon::Exclamation, BoxButtons::Ok};
+
+class PrintScores : public testing::Test {
+ protected:
+  bool Offered() const { return venue.Find<QAction>("mnuPrintScores").isEnabled(); }
+
+  /// Waits for the word processor's start to be noticed.
+  bool Follow(const std::function<bool()>& condition) const { return QTest::qWaitFor(condition, 10000); }
+
+  Venue venue;
+};
+
+TEST_F(PrintScores, WordProcessorIsStartedOnceTheWindowIsUp) {
+  venue.Word.AfterStart = WordState::Starting;
+  venue.PutDefaultFiles();
+  venue.MakeWindow().FormLoad();
+  EXPECT_THAT(venue.Word.Log, IsEmpty());
+  venue.Window->show();
+  ASSERT_TRUE(Follow([this] { return !venue.Word.Log.empty(); }));
+  EXPECT_THAT(venue.Word.Log, ElementsAre("Start"));
+  EXPECT_TRUE(Offered());
+}
+
+TEST_F(PrintScores, IsDisabledWithABoxWhenTheWordProcessorIsMissing) {
+  venue.Word.FailAt = "Start";
+  venue.Start();
+  ASSERT_TRUE(Follow([this] { return !Offered(); }));
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(WordMissing));
+  EXPECT_TRUE(venue.Find<QAction>("mnuLoadScores").isEnabled());
+}
+
+TEST_F(PrintScores, IsDisabledWithABoxWhenTheWordProcessorEndsWhileItStarts) {
+  venue.Word.AfterStart = WordState::Starting;
+  venue.Start();
+  ASSERT_TRUE(Follow([this] { return !venue.Word.Log.empty(); }));
+  venue.Word.Now = WordState::Ended;
+  ASSERT_TRUE(Follow([this] { return !Offered(); }));
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(WordMissing));
+}
+
+TEST_F(PrintScores, WordProcessorIsQuitWhenTheWindowCloses) {
+  venue.Start().close();
+  EXPECT_THAT(venue.Word.Log, Contains("Quit"));
+}
+
+TEST_F(PrintScores, MakesTheSheetsThatWereChosenAndKeepsTheChoice) {
+  venue.Start();
+  venue.LoadGame(SmallGame());
+  const WhileModal<PrintOptions> choose([](PrintOptions& window) {
+    Find<QRadioButton>(window, "PrintFile").setChecked(true);
+    window.accept();
+  });
+  venue.Trigger("mnuPrintScores");
+  EXPECT_THAT(venue.Word.Documents, SizeIs(2));
+  EXPECT_EQ(venue.Word.Documents[0]->SavedAs, venue.DataFile("scores/Red 0-Guest-today-None.doc"));
+  EXPECT_THAT(venue.Boxes.Boxes,
+              ElementsAre(Box{"Printing completed. Files saved to " + venue.DataFolder() + "/Scores.",
+                              "Print Status", BoxIcon::Information, BoxButtons::Ok}));
+  EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
+  const WhileModal<PrintOptions> again([](PrintOptions& window) {
+    EXPECT_TRUE(Find<QRadioButton>(window, "PrintFile").isChecked());
+    window.reject();
+  });
+  venue.Trigger("mnuPrintScores");
+  EXPECT_THAT(venue.Word.Documents, SizeIs(2));
+}
+
+}  // namespace

@@ -1,0 +1,256 @@
+#include "platform/libreoffice/LibreOffice.h"
+
+#include <gmock/gmock.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <chrono>
+#include <csignal>
+#include <cstdlib>
+#include <filesystem>
+#include <functional>
+#include <thread>
+
+#include "platform/RuntimeError.h"
+#include "tests/platform/libreoffice/OfficeProcesses.h"
+#include "tests/platform/linux/TemporaryFolder.h"
+#include "tests/platform/linux/Thrown.h"
+
+namespace {
+
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::Not;
+using testing::SizeIs;
+
+const std::string Template = TESSARINE_PROGRAM_FOLDER "/score_card_default.doc";
+
+/// Asks again and again until `condition` holds; false when a minute was not enough.
+bool WaitUntil(const std::function<bool()>& condition) {
+  const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(60);
+  while (!condition()) {
+    if (std::chrono::steady_clock::now() > end) {
+      return false;
+    }
+    std::this_thread::sleep_for(std::chrono::milliseconds(10));
+  }
+  return true;
+}
+
+bool StartAndWait(LibreOffice& office) {
+  office.Start();
+  return WaitUntil([&] { return office.State() != WordState::Starting; }) &&
+         office.State() == WordState::Ready;
+}
+
+std::vector<pid_t> Hosts(pid_t parent = getpid()) {
+  return ChildrenOf(parent, "tessarine-office-host");
+}
+
+/// Names in the temporary folder that profiles have.
+std::size_t Profiles() {
+  std::size_t count = 0;
+  for (const auto& entry : std::filesystem::directory_iterator(std::filesystem::temp_directory_path())) {
+    count += entry.path().filename().string().rfind("tessarine-office-", 0) == 0 ? 1 : 0;
+  }
+  return count;
+}
+
+/// A running LibreOffice, with a temporary folder of its own, that all tests share: its start takes a second.
+class Writer : public testing::Test {
+ protected:
+  static void SetUpTestSuite() {
+    temporary_ = new TemporaryFolder;
+    setenv("TMPDIR", temporary_->Path().c_str(), 1);
+    office_ = new LibreOffice(TESSARINE_PROGRAM_FOLDER);
+    ASSERT_TRUE(StartAndWait(*office_));
+  }
+  static void TearDownTestSuite() {
+    delete office_;
+    EXPECT_THAT(Hosts(), IsEmpty());
+    EXPECT_EQ(Profiles(), 0u);
+    unsetenv("TMPDIR");
+    delete temporary_;
+  }
+
+  /// A saved sheet, or a template, as another LibreOffice reads it: all of its text.
+  std::string TextOf(const std::string& document) const {
+    const std::string command = "soffice -env:UserInstallation=file://" + (folder / "profile") +
+                                " --headless --convert-to txt:Text --outdir '" + folder.Path() + "' '" +
+                                document + "' > /dev/null 2>&1";
+    EXPECT_EQ(std::system(command.c_str()), 0);
+    return ReadFile(std::filesystem::path(document).replace_extension(".txt"));
+  }
+
+  static LibreOffice& Office() { return *office_; }
+
+  TemporaryFolder folder;
+
+ private:
+  static TemporaryFolder* temporary_;
+  static LibreOffice* office_;
+};
+
+TemporaryFolder* Writer::temporary_ = nullptr;
+LibreOffice* Writer::office_ = nullptr;
+
+TEST_F(Writer, FillsATemplateAndSavesItForWord) {
+  const auto document = Office().Add(Template);
+  document->SetBookmark("PlayerName", "Zoë 李雷");
+  document->SetBookmark("rank", " 7");
+  std::vector<std::string> hits;
+  for (int i = 1; i <= 224; ++i) {
+    hits.push_back("Hit " + std::to_string(i) + ".");
+  }
+  document->WriteCells(4, 2, 20, hits);
+  document->WriteCells(5, 2, 20, {"Taken 1.", "Taken 2."});
+  document->SaveAs(folder / "a sheet %41.doc");
+  document->Close();
+  EXPECT_EQ(ReadFile(folder / "a sheet %41.doc").substr(0, 8), "\xD0\xCF\x11\xE0\xA1\xB1\x1A\xE1");
+  const std::string text = TextOf(folder / "a sheet %41.doc");
+  for (const char* part : {"Zoë 李雷", " 7", "Hit 1.", "Hit 224.", "Taken 2."}) {
+    EXPECT_THAT(text, HasSubstr(part));
+  }
+  // A column is filled before the next begins: beside the first entry of column 1 stands that of column 2.
+  EXPECT_LT(text.find("Hit 1."), text.find("Hit 21."));
+  EXPECT_LT(text.find("Hit 21."), text.find("Hit 2."));
+}
+
+TEST_F(Writer, WantsEveryBookmarkTableAndCell) {
+  const auto document = Office().Add(Template);
+  EXPECT_EQ(NumberThrownBy([&] { document->SetBookmark("Nowhere", "x"); }), 440);
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(6, 2, 20, {}); }), 9);
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(4, 2, 20, std::vector<std::string>(241, "x")); }), 440);
+  document->WriteCells(4, 2, 20, {});
+  document->Close();
+}
+
+TEST_F(Writer, WritesTablesWithMergedCells) {
+  WriteFile(folder / "merged.html",
+            "<html><body><table><tr><td colspan=3>Heading</td></tr>"
+            "<tr><td>a</td><td>b</td><td rowspan=2><table><tr><td>inner</td></tr></table></td></tr>"
+            "<tr><td>d</td><td>e</td></tr></table><table><tr><td>second</td></tr></table></body></html>");
+  const auto document = Office().Add(folder / "merged.html");
+  document->WriteCells(1, 2, 2, {"One.", "Two.", "Three."});
+  document->WriteCells(2, 1, 20, {"Four."});
+  document->SaveAs(folder / "merged.doc");
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 2, 2, std::vector<std::string>(9, "x")); }), 440);
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(3, 1, 20, {}); }), 9);
+  document->Close();
+  const std::string text = TextOf(folder / "merged.doc");
+  for (const char* part : {"Heading", "One.", "Two.", "Three.", "Four."}) {
+    EXPECT_THAT(text, HasSubstr(part));
+  }
+  EXPECT_THAT(text, Not(HasSubstr("second")));
+}
+
+TEST_F(Writer, TakesNothingButPicturesAsPictures) {
+  const auto document = Office().Add(Template);
+  WriteFile(folder / "no-picture", "bytes");
+  EXPECT_EQ(NumberThrownBy([&] { document->AddPicture(1, 1, 1, folder / "no-picture"); }), 440);
+  const std::size_t padding = 10000;
+  WriteFile(folder / "photo",
+            ReadFile(TESSARINE_RESOURCES "/pictures/tessarine-128.png") + std::string(padding, 0));
+  document->SaveAs(folder / "without.doc");
+  document->AddPicture(1, 1, 1, folder / "photo");
+  document->SaveAs(folder / "with.doc");
+  document->Close();
+  EXPECT_GT(std::filesystem::file_size(folder / "with.doc"),
+            std::filesystem::file_size(folder / "without.doc") + 5000);
+}
+
+TEST_F(Writer, WantsADocumentAsTemplate) {
+  EXPECT_EQ(NumberThrownBy([&] { Office().Add(folder / "missing.doc"); }), 53);
+  WriteFile(folder / "garbage.doc", std::string("\x01\x02garbage\xFF\xFE", 11));
+  EXPECT_EQ(NumberThrownBy([&] { Office().Add(folder / "garbage.doc"); }), 321);
+  WriteFile(folder / "picture.doc", ReadFile(TESSARINE_RESOURCES "/pictures/tessarine-16.png"));
+  EXPECT_EQ(NumberThrownBy([&] { Office().Add(folder / "picture.doc"); }), 321);
+  WriteFile(folder / "cut.doc", ReadFile(Template).substr(0, 20000));
+  EXPECT_NE(NumberThrownBy([&] { Office().Add(folder / "cut.doc"); }), 0);
+}
+
+TEST_F(Writer, LeavesNoHalfFileWhereItCannotSave) {
+  const auto document = Office().Add(Template);
+  EXPECT_EQ(NumberThrownBy([&] { document->SaveAs("/proc/sheet.doc"); }), 440);
+  std::filesystem::create_directory(folder / "sheet.doc");
+  EXPECT_EQ(NumberThrownBy([&] { document->SaveAs(folder / "sheet.doc"); }), 440);
+  document->Close();
+}
+
+TEST_F(Writer, JoinsPdfs) {
+  const auto document = Office().Add(Template);
+  document->SetBookmark("PlayerName", "First");
+  document->ExportPdf(folder / "1.pdf");
+  document->ExportPdf(folder / "2.pdf");
+  document->Close();
+  Office().JoinPdfs({folder / "1.pdf", folder / "2.pdf"}, folder / "all.pdf");
+  const std::string all = ReadFile(folder / "all.pdf");
+  EXPECT_EQ(all.substr(0, 5), "%PDF-");
+  EXPECT_THAT(all, HasSubstr("/Count 2"));
+  EXPECT_EQ(NumberThrownBy([&] { Office().JoinPdfs({folder / "missing.pdf"}, folder / "none.pdf"); }), 75);
+  EXPECT_FALSE(std::filesystem::exists(folder / "none.pdf"));
+}
+
+TEST_F(Writer, IsStartedAfreshWhenItWasKilled) {
+  const std::vector<pid_t> hosts = Hosts();
+  ASSERT_THAT(hosts, SizeIs(1));
+  const std::vector<pid_t> offices = ChildrenOf(hosts[0], "soffice.bin");
+  ASSERT_THAT(offices, SizeIs(1));
+  const auto document = Office().Add(Template);
+  kill(offices[0], SIGKILL);
+  EXPECT_TRUE(WaitUntil([] { return Office().State() == WordState::Ended; }));
+  EXPECT_EQ(NumberThrownBy([&] { document->SetBookmark("PlayerName", "x"); }), 440);
+  EXPECT_EQ(NumberThrownBy([&] { Office().Add(Template); }), 429);
+  ASSERT_TRUE(StartAndWait(Office()));
+  EXPECT_THAT(Hosts(), SizeIs(1));
+  EXPECT_EQ(Profiles(), 1u);
+  Office().Add(Template)->Close();
+}
+
+TEST_F(Writer, IsStartedOnce) {
+  Office().Start();
+  Office().Start();
+  EXPECT_THAT(Hosts(), SizeIs(1));
+}
+
+TEST_F(Writer, EndsWithAProgramThatCrashes) {
+  const std::size_t profiles = Profiles();
+  int ready[2];
+  ASSERT_EQ(pipe(ready), 0);
+  const pid_t program = fork();
+  if (program == 0) {
+    execl(TESSARINE_PROGRAM_FOLDER "/office-runner", "office-runner", TESSARINE_PROGRAM_FOLDER,
+          std::to_string(ready[1]).c_str(), nullptr);
+    _exit(1);
+  }
+  close(ready[1]);
+  char byte = 0;
+  ASSERT_EQ(read(ready[0], &byte, 1), 1);
+  close(ready[0]);
+  const std::vector<pid_t> hosts = Hosts(program);
+  ASSERT_THAT(hosts, SizeIs(1));
+  const std::vector<pid_t> offices = ChildrenOf(hosts[0], "soffice.bin");
+  ASSERT_THAT(offices, SizeIs(1));
+  kill(program, SIGKILL);
+  waitpid(program, nullptr, 0);
+  const auto runs = [](pid_t id) {
+    for (const ProcessInfo& process : Processes()) {
+      if (process.Id == id) {
+        return true;
+      }
+    }
+    return false;
+  };
+  EXPECT_TRUE(WaitUntil([&] { return !runs(hosts[0]) && !runs(offices[0]); }));
+  EXPECT_EQ(Profiles(), profiles);
+}
+
+TEST(LibreOfficeThatIsNotThere, IsAFailureOfTheStart) {
+  const TemporaryFolder folder;
+  LibreOffice office(folder.Path());
+  EXPECT_EQ(NumberThrownBy([&] { office.Start(); }), 429);
+  EXPECT_EQ(office.State(), WordState::Ended);
+  office.Quit();
+}
+
+}  // namespace

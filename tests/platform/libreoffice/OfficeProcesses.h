@@ -1,0 +1,47 @@
+#pragma once
+
+#include <sys/types.h>
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <string>
+#include <vector>
+
+/// A process of this machine.
+struct ProcessInfo {
+  pid_t Id;
+  pid_t Parent;
+  std::string Command;  ///< its arguments, separated by NUL
+};
+
+inline std::vector<ProcessInfo> Processes() {
+  std::vector<ProcessInfo> processes;
+  for (const auto& entry : std::filesystem::directory_iterator("/proc")) {
+    const std::string name = entry.path().filename();
+    if (name.find_first_not_of("0123456789") != std::string::npos) {
+      continue;
+    }
+    std::ifstream stat(entry.path() / "stat");
+    const std::string line{std::istreambuf_iterator<char>(stat), {}};
+    const auto end = line.rfind(')');
+    if (end == std::string::npos || line.substr(end + 2, 1) == "Z") {
+      continue;
+    }
+    std::ifstream command(entry.path() / "cmdline");
+    processes.push_back({std::stoi(name), std::stoi(line.substr(end + 4)),
+                         std::string{std::istreambuf_iterator<char>(command), {}}});
+  }
+  return processes;
+}
+
+/// Children of `parent` whose command has `part` in it.
+inline std::vector<pid_t> ChildrenOf(pid_t parent, const std::string& part) {
+  std::vector<pid_t> children;
+  for (const ProcessInfo& process : Processes()) {
+    if (process.Parent == parent && process.Command.find(part) != std::string::npos) {
+      children.push_back(process.Id);
+    }
+  }
+  return children;
+}

@@ -1,0 +1,160 @@
+#include "sheets/PrintOptions.h"
+
+#include <gmock/gmock.h>
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <QLabel>
+#include <QProgressBar>
+#include <QRadioButton>
+
+#include "sheets/SheetProgressWindow.h"
+#include "tests/app/CaredFor.h"
+#include "tests/app/Controls.h"
+#include "tests/fakes/FakeMessageBoxes.h"
+
+namespace {
+
+using testing::ElementsAre;
+
+class PrintOptionsWindow : public testing::TestWithParam<Language> {
+ protected:
+  void Choose(const char* option) { Find<QRadioButton>(window, option).click(); }
+  void SetIndex(const char* list, int index) { Find<QComboBox>(window, list).setCurrentIndex(index); }
+  std::vector<bool> Enabled() const {
+    std::vector<bool> enabled;
+    for (const char* list : {"TeamID", "PlayerID", "TeamID2"}) {
+      enabled.push_back(Find<QComboBox>(window, list).isEnabled());
+    }
+    return enabled;
+  }
+
+  StringTable strings{GetParam()};
+  FakeMessageBoxes boxes;
+  PrintOptions window{strings, boxes, nullptr};
+};
+
+TEST_P(PrintOptionsWindow, IsCaredFor) {
+  Show(window);
+  ExpectCaredFor(window);
+  EXPECT_EQ(window.windowTitle().toStdString(), strings.Text(159));
+  EXPECT_EQ(Find<QRadioButton>(window, "PrintOne").text().toStdString(), strings.Text(155));
+  EXPECT_EQ(Find<QRadioButton>(window, "PrintFile").text().toStdString(), strings.Text(157));
+  EXPECT_EQ(Find<QCheckBox>(window, "HideRank").text().toStdString(), strings.Text(158));
+}
+
+TEST_P(PrintOptionsWindow, OfferTeamsAndNumbers) {
+  for (const char* list : {"TeamID", "TeamID2"}) {
+    const auto& teams = Find<QComboBox>(window, list);
+    ASSERT_EQ(teams.count(), 3);
+    EXPECT_EQ(teams.itemText(2).toStdString(), strings.Text(116));
+    EXPECT_EQ(teams.currentIndex(), 0);
+  }
+  const auto& numbers = Find<QComboBox>(window, "PlayerID");
+  ASSERT_EQ(numbers.count(), 96);
+  EXPECT_EQ(numbers.itemText(95), QStringLiteral(" 95"));
+}
+
+TEST_P(PrintOptionsWindow, EnableTheListsOfTheChosenOption) {
+  EXPECT_TRUE(Find<QRadioButton>(window, "PrintActive").isChecked());
+  EXPECT_TRUE(Find<QRadioButton>(window, "PrintPrinter").isChecked());
+  EXPECT_THAT(Enabled(), ElementsAre(false, false, false));
+  Choose("PrintOne");
+  EXPECT_THAT(Enabled(), ElementsAre(true, true, false));
+  Choose("PrintTeam");
+  EXPECT_THAT(Enabled(), ElementsAre(false, false, true));
+  Choose("PrintAll");
+  EXPECT_THAT(Enabled(), ElementsAre(false, false, false));
+}
+
+TEST_P(PrintOptionsWindow, HandsBackWhatWasChosen) {
+  window.show();
+  Choose("PrintOne");
+  SetIndex("TeamID", 1);
+  SetIndex("PlayerID", 40);
+  Choose("PrintFile");
+  Find<QCheckBox>(window, "HideRank").click();
+  Press(window, "OK");
+  EXPECT_FALSE(window.isVisible());
+  EXPECT_EQ(window.Choice().SheetSelection, 1);
+  EXPECT_EQ(window.Choice().SelectedTeam, 2);
+  EXPECT_EQ(window.Choice().SelectedNumber, 40);
+  EXPECT_EQ(window.Choice().OutputTarget, 2);
+  EXPECT_TRUE(window.Choice().RankHidden);
+  Choose("PrintTeam");
+  SetIndex("TeamID2", 0);
+  Press(window, "OK");
+  EXPECT_EQ(window.Choice().SheetSelection, 500);
+  EXPECT_EQ(window.Choice().SelectedTeam, 1);
+  Choose("PrintAll");
+  Press(window, "OK");
+  EXPECT_EQ(window.Choice().SheetSelection, 1000);
+  Choose("PrintActive");
+  Press(window, "OK");
+  EXPECT_EQ(window.Choice().SheetSelection, 1001);
+}
+
+TEST_P(PrintOptionsWindow, WarnsOfANumberThatTheTeamDoesNotHaveAndCloses) {
+  window.show();
+  Choose("PrintOne");
+  SetIndex("TeamID", 2);
+  SetIndex("PlayerID", 40);
+  Press(window, "OK");
+  EXPECT_THAT(boxes.Boxes,
+              ElementsAre(FakeMessageBoxes::Box{"Invalid player ID selected for this Team", "Tessarine",
+                                                BoxIcon::Exclamation, BoxButtons::OkCancel}));
+  EXPECT_FALSE(window.isVisible());
+  EXPECT_EQ(window.Choice().SheetSelection, 1);
+  EXPECT_EQ(window.Choice().OutputTarget, 0);
+}
+
+TEST_P(PrintOptionsWindow, WantsNothingAfterCancelOrEscape) {
+  for (const bool byKey : {false, true}) {
+    window.show();
+    Press(window, "OK");
+    ASSERT_EQ(window.Choice().SheetSelection, 1001);
+    window.show();
+    byKey ? QTest::keyClick(&window, Qt::Key_Escape) : Press(window, "Cancel");
+    EXPECT_EQ(window.Choice().SheetSelection, 0);
+    EXPECT_FALSE(window.isVisible());
+  }
+}
+
+TEST_P(PrintOptionsWindow, OfTheProgressShowsSheetAndName) {
+  SheetProgressWindow progress(strings, nullptr);
+  progress.Open();
+  EXPECT_TRUE(progress.isModal());
+  EXPECT_EQ(progress.windowTitle().toStdString(), strings.Text(131));
+  progress.ShowSheet(7, 224, "Red 6-Ann Lee");
+  EXPECT_EQ(Find<QLabel>(progress, "PlayerLabel").text(), QStringLiteral("Red 6-Ann Lee"));
+  EXPECT_EQ(Find<QProgressBar>(progress, "Progress").maximum(), 224);
+  EXPECT_EQ(Find<QProgressBar>(progress, "Progress").value(), 6);
+  const QString label = Find<QLabel>(progress, "SheetLabel").text();
+  EXPECT_EQ(label, GetParam() == Language::English ? QStringLiteral("Sheet 7 of 224")
+                                                   : QStringLiteral("第 7 张，共 224 张"));
+  Show(progress);
+  ExpectCaredFor(progress);
+  progress.Close();
+  EXPECT_FALSE(progress.isVisible());
+}
+
+TEST_P(PrintOptionsWindow, OfTheProgressStaysUntilTheSheetIsDone) {
+  SheetProgressWindow progress(strings, nullptr);
+  progress.Open();
+  EXPECT_FALSE(progress.Stopped());
+  Press(progress, "Stop");
+  EXPECT_TRUE(progress.Stopped());
+  EXPECT_TRUE(progress.isVisible());
+  EXPECT_FALSE(Find<QPushButton>(progress, "Stop").isEnabled());
+  progress.Close();
+  progress.Open();
+  EXPECT_FALSE(progress.Stopped());
+  progress.close();
+  EXPECT_TRUE(progress.Stopped());
+  EXPECT_TRUE(progress.isVisible());
+}
+
+INSTANTIATE_TEST_SUITE_P(InBoth, PrintOptionsWindow,
+                         testing::Values(Language::English, Language::SimplifiedChinese));
+
+}  // namespace
