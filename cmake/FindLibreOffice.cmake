@@ -28,7 +28,7 @@ if(LibreOffice_FOUND AND NOT TARGET LibreOffice::Uno)
     COMMENT "C++ headers of LibreOffice's types"
     VERBATIM)
   add_custom_target(libreoffice_headers DEPENDS ${headers}/made)
-  add_library(LibreOffice::Uno INTERFACE IMPORTED)
+  add_library(LibreOffice::Uno INTERFACE IMPORTED GLOBAL)
   add_dependencies(LibreOffice::Uno libreoffice_headers)
   target_include_directories(LibreOffice::Uno SYSTEM INTERFACE ${LibreOffice_include} ${headers})
   target_compile_definitions(LibreOffice::Uno INTERFACE CPPU_ENV=gcc3 LINUX UNX)

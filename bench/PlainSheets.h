@@ -1,0 +1,29 @@
+#pragma once
+
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
+
+/// Fills documents as a script would: one call for each bookmark and for each cell.
+class PlainSheets {
+ public:
+  /// Connects to the LibreOffice that listens on `pipe`; waits for it.
+  explicit PlainSheets(const std::string& pipe);
+  ~PlainSheets();
+
+  struct Sheet {
+    std::vector<std::pair<const char*, std::string>> Bookmarks;
+    std::string Photo;  ///< its path
+    std::vector<std::string> Scored;
+    std::vector<std::string> Taken;
+    std::string Target;
+  };
+  void Make(const std::string& templatePath, const Sheet& sheet);
+
+  void Quit();
+
+ private:
+  struct Office;
+  std::unique_ptr<Office> office_;
+};

@@ -1,0 +1,326 @@
+#include <fcntl.h>
+#include <spawn.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <QApplication>
+#include <QBuffer>
+#include <QImage>
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+#include <filesystem>
+#include <map>
+
+#include "bench/FullGame.h"
+#include "bench/Goals.h"
+#include "bench/PlainSheets.h"
+#include "core/Photo.h"
+#include "platform/libreoffice/LibreOffice.h"
+#include "platform/linux/LinuxFiles.h"
+#include "platform/qt/QtClock.h"
+#include "platform/qt/QtEventPump.h"
+#include "sheets/ScoreSheets.h"
+#include "sheets/SheetProgressWindow.h"
+#include "sheets/SheetTexts.h"
+
+namespace {
+
+using Steady = std::chrono::steady_clock;
+
+constexpr int Members = 40;
+constexpr int HitsPerPlayer = 40;
+
+double MillisecondsSince(Steady::time_point start) {
+  return std::chrono::duration<double, std::milli>(Steady::now() - start).count();
+}
+
+/// Where a run's time goes, and how long the event loop had to wait in between, single calls of the word
+/// processor apart.
+struct Times {
+  std::map<std::string, double> ByKind;  ///< milliseconds
+  double InCalls = 0;                    ///< since events were served last
+  double LongestGap = 0;
+  Steady::time_point Served = Steady::now();
+
+  template <typename Operation>
+  auto Measure(const char* kind, bool isOneCall, Operation&& operation) {
+    struct Adder {
+      Times& All;
+      const char* Kind;
+      bool IsOneCall;
+      Steady::time_point Start = Steady::now();
+      ~Adder() {
+        const double time = MillisecondsSince(Start);
+        All.ByKind[Kind] += time;
+        All.InCalls += IsOneCall ? time : 0;
+      }
+    } adder{*this, kind, isOneCall};
+    return operation();
+  }
+};
+
+class TimedPump : public QtEventPump {
+ public:
+  explicit TimedPump(Times& times) : times_(times) {}
+  WaitResult WaitFor(const std::function<bool()>& condition, std::chrono::milliseconds limit) override {
+    times_.LongestGap = std::max(times_.LongestGap, MillisecondsSince(times_.Served) - times_.InCalls);
+    const WaitResult result = QtEventPump::WaitFor(condition, limit);
+    times_.Served = Steady::now();
+    times_.InCalls = 0;
+    return result;
+  }
+
+ private:
+  Times& times_;
+};
+
+class TimedDocument : public WordDocument {
+ public:
+  TimedDocument(std::unique_ptr<WordDocument> document, Times& times)
+      : document_(std::move(document)), times_(times) {}
+  void SetBookmark(const std::string& name, const std::string& text) override {
+    times_.Measure("bookmarks", false, [&] { document_->SetBookmark(name, text); });
+  }
+  void WriteCells(int table, int firstRow, int rows, const std::vector<std::string>& texts) override {
+    times_.Measure("tables", false, [&] { document_->WriteCells(table, firstRow, rows, texts); });
+  }
+  void AddPicture(int table, int row, int column, const std::string& file) override {
+    times_.Measure("photographs", false, [&] { document_->AddPicture(table, row, column, file); });
+  }
+  void SaveAs(const std::string& path) override {
+    times_.Measure("saving", true, [&] { document_->SaveAs(path); });
+  }
+  void ExportPdf(const std::string& path) override {
+    times_.Measure("PDF", true, [&] { document_->ExportPdf(path); });
+  }
+  void PrintOut() override { document_->PrintOut(); }
+  void Close() override {
+    times_.Measure("closing", true, [&] { document_->Close(); });
+  }
+
+ private:
+  std::unique_ptr<WordDocument> document_;
+  Times& times_;
+};
+
+class TimedWord : public WordProcessor {
+ public:
+  TimedWord(WordProcessor& word, Times& times) : word_(word), times_(times) {}
+  void Start() override { word_.Start(); }
+  WordState State() override { return word_.State(); }
+  std::unique_ptr<WordDocument> Add(const std::string& path) override {
+    return std::make_unique<TimedDocument>(times_.Measure("template", true, [&] { return word_.Add(path); }),
+                                           times_);
+  }
+  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) override {
+    times_.Measure("joining PDFs", false, [&] { word_.JoinPdfs(parts, target); });
+  }
+  void Quit() noexcept override { word_.Quit(); }
+
+ private:
+  WordProcessor& word_;
+  Times& times_;
+};
+
+class SilentBoxes : public MessageBoxes {
+ public:
+  BoxAnswer Show(const std::string& text, const std::string&, BoxIcon icon, BoxButtons) override {
+    Failed = Failed || icon == BoxIcon::Exclamation;
+    if (icon == BoxIcon::Exclamation) {
+      std::fprintf(stderr, "%s\n", text.c_str());
+    }
+    return BoxAnswer::Ok;
+  }
+  bool Failed = false;
+};
+
+/// A photograph as a camera makes it: 480 x 640, some 60 kB.
+Blob Photograph(int member) {
+  QImage image(480, 640, QImage::Format_RGB32);
+  unsigned noise = static_cast<unsigned>(member);
+  for (int y = 0; y < image.height(); ++y) {
+    for (int x = 0; x < image.width(); ++x) {
+      noise = noise * 1664525 + 1013904223;
+      image.setPixel(x, y,
+                     qRgb((x / 2 + static_cast<int>(noise >> 28)) % 256, (y / 3) % 256, (member * 6) % 256));
+    }
+  }
+  QByteArray bytes;
+  QBuffer buffer(&bytes);
+  image.save(&buffer, "JPG", 90);
+  return {bytes.begin(), bytes.end()};
+}
+
+/// The venue's folder with the template and forty members, and a game in which everyone hit forty others.
+struct Evening {
+  explicit Evening(const std::filesystem::path& bin) {
+    std::string pattern = (std::filesystem::temp_directory_path() / "tessarine-bench-XXXXXX").string();
+    Folder = mkdtemp(pattern.data());
+    std::filesystem::copy_file(std::string(TESSARINE_RESOURCES) + "/score_card_default.doc",
+                               Folder + "/score_card.doc");
+    std::filesystem::create_directory(Folder + "/scores");
+    std::filesystem::copy_file(bin / "members_default.mdb", Folder + "/members.mdb");
+    AddMembers();
+    for (int index = 1; index <= PlayerCount; ++index) {
+      Player& player = Board.Players(index);
+      player.Active = true;
+      player.MemberIndex = 1 + index % Members;
+      player.ShotCount = 1000 + index;
+      for (int hit = 1; hit <= HitsPerPlayer; ++hit) {
+        Board.Players(1 + (index + hit * 5) % PlayerCount).HitByPlayer(index) = 10 * hit;
+      }
+    }
+    Board.GameDate = "15 November 2026";
+  }
+  ~Evening() { std::filesystem::remove_all(Folder); }
+  Evening(const Evening&) = delete;
+  Evening& operator=(const Evening&) = delete;
+
+  StringTable Strings{Language::English};
+  Game Board{Strings};
+  std::string Folder;
+  SilentBoxes Boxes;
+  std::unique_ptr<Database> DbMembers;
+  std::unique_ptr<Recordset> RsMembers;
+
+ private:
+  void AddMembers() {
+    DbMembers = engine_.OpenDatabase(Folder + "/members.mdb");
+    RsMembers = DbMembers->OpenRecordset("Members");
+    for (int member = 1; member <= Members; ++member) {
+      const Blob photo = Photograph(member);
+      RsMembers->AddNew();
+      RsMembers->SetField("FirstName", "First" + std::to_string(member));
+      RsMembers->SetField("LastName", "Last" + std::to_string(member));
+      RsMembers->SetField("NickName", "Nick" + std::to_string(member));
+      RsMembers->SetField("PhotographLength", static_cast<std::int64_t>(photo.size()));
+      RsMembers->AppendChunk("Photograph", photo);
+      RsMembers->Update();
+    }
+  }
+
+  SqliteEngine engine_;
+};
+
+/// All 224 sheets in the program's way; milliseconds.
+double OwnRun(Evening& evening, LibreOffice& office, std::int16_t target, Times& times) {
+  MemberLookup members(*evening.RsMembers, evening.Boxes);
+  const QtClock clock;
+  TimedPump pump(times);
+  LinuxFiles files;
+  TimedWord word(office, times);
+  SheetProgressWindow progress(evening.Strings, nullptr);
+  const SheetSources sources{
+      evening.Board, *evening.RsMembers, members, evening.Strings, clock,          pump,
+      files,         evening.Boxes,      word,    progress,        evening.Folder, "Bench"};
+  const PrintChoice choice{SheetSelection::All, false, target, 0, 0};
+  const auto start = Steady::now();
+  times.Served = start;
+  ScoreSheets(sources, choice).GenerateScoreSheets();
+  return MillisecondsSince(start);
+}
+
+/// A LibreOffice of its own for the plain way.
+class PlainOffice {
+ public:
+  explicit PlainOffice(const std::string& host) {
+    int leash[2];
+    if (pipe2(leash, O_CLOEXEC) != 0) {
+      std::abort();
+    }
+    posix_spawn_file_actions_t actions;
+    posix_spawn_file_actions_init(&actions);
+    posix_spawn_file_actions_adddup2(&actions, leash[0], STDIN_FILENO);
+    std::string office = LIBREOFFICE_PROGRAM "/soffice.bin";
+    char* const arguments[] = {const_cast<char*>(host.c_str()), office.data(), Pipe.data(), nullptr};
+    if (posix_spawn(&process_, host.c_str(), &actions, nullptr, arguments, environ) != 0) {
+      std::abort();
+    }
+    posix_spawn_file_actions_destroy(&actions);
+    close(leash[0]);
+    leash_ = leash[1];
+  }
+  ~PlainOffice() {
+    close(leash_);
+    waitpid(process_, nullptr, 0);
+  }
+  PlainOffice(const PlainOffice&) = delete;
+  PlainOffice& operator=(const PlainOffice&) = delete;
+
+  std::string Pipe = "tessarine-plain-" + std::to_string(getpid());
+
+ private:
+  pid_t process_ = 0;
+  int leash_ = -1;
+};
+
+/// All 224 sheets in the plain way; milliseconds.
+double PlainRun(Evening& evening, const std::string& host) {
+  const PlainOffice office(host);
+  PlainSheets plain(office.Pipe);
+  MemberLookup members(*evening.RsMembers, evening.Boxes);
+  LinuxFiles files;
+  const auto start = Steady::now();
+  for (int index = 1; index <= PlayerCount; ++index) {
+    PlainSheets::Sheet sheet;
+    const auto add = [&sheet](const BookmarkTexts& texts) {
+      sheet.Bookmarks.insert(sheet.Bookmarks.end(), texts.begin(), texts.end());
+    };
+    add(ResultTexts(evening.Board, index, WinningTeam(evening.Board)));
+    members.LoadMember(evening.Board.Players(index).MemberIndex);
+    add(MemberTexts(*evening.RsMembers, members));
+    sheet.Photo = files.MakeTempFileName();
+    ExportPhoto(*evening.RsMembers, "Photograph", "PhotographLength", sheet.Photo, files);
+    add(GameTexts(evening.Board.Players(index), "Bench", "15 November 2026", " 1"));
+    sheet.Scored = HitsScored(evening.Board, index, members);
+    sheet.Taken = HitsTaken(evening.Board, index, members);
+    sheet.Target = evening.Folder + "/scores/plain " + std::to_string(index) + ".doc";
+    plain.Make(evening.Folder + "/score_card.doc", sheet);
+    files.Delete(sheet.Photo);
+  }
+  const double time = MillisecondsSince(start);
+  plain.Quit();
+  return time;
+}
+
+}  // namespace
+
+/// bench-sheets: needs LibreOffice.
+int main(int argc, char** argv) {
+  QApplication application(argc, argv);
+  const std::filesystem::path bin = std::filesystem::canonical(argv[0]).parent_path();
+  Evening evening(bin);
+  LibreOffice office(bin);
+  const auto start = Steady::now();
+  double longestStep = 0;
+  QtEventPump pump;
+  for (bool ready = false; !ready;) {
+    const auto step = Steady::now();
+    office.Start();
+    ready = office.State() == WordState::Ready;
+    longestStep = std::max(longestStep, MillisecondsSince(step));
+    pump.WaitFor([] { return false; }, std::chrono::milliseconds(50));
+  }
+  std::printf("The word processor is ready after %.1f s.\n", MillisecondsSince(start) / 1000);
+
+  Times times;
+  constexpr std::int16_t neither = 0;
+  const double own = OwnRun(evening, office, neither, times);
+  const double plain = PlainRun(evening, bin / "tessarine-office-host");
+  Times withPdf;
+  const double toFiles = OwnRun(evening, office, OutputTarget::Files, withPdf);
+  for (const auto& [kind, time] : withPdf.ByKind) {
+    std::printf("  %-14s %6.1f ms a sheet\n", kind.c_str(), time / PlayerCount);
+  }
+  std::printf("  %-14s %6.1f ms a sheet, %.1f ms without the PDF\n", "all", toFiles / PlayerCount,
+              own / PlayerCount);
+  constexpr double longestAllowed = 100;
+  const double gap = std::max({longestStep, times.LongestGap, withPdf.LongestGap});
+  bool met = !evening.Boxes.Failed;
+  met &= ReportGoal("224 sheets with photographs / one call per cell", own / plain, 0.5,
+                    TimesText(own * 1000, plain * 1000));
+  met &= ReportGoal("longest gap of the event loop / 100 ms", gap / longestAllowed, 1,
+                    TimesText(gap * 1000, longestAllowed * 1000));
+  return met ? 0 : 1;
+}
