@@ -29,7 +29,6 @@ namespace {
 using Steady = std::chrono::steady_clock;
 
 constexpr int Members = 40;
-constexpr int HitsPerPlayer = 40;
 
 double MillisecondsSince(Steady::time_point start) {
   return std::chrono::duration<double, std::milli>(Steady::now() - start).count();
@@ -113,8 +112,9 @@ class TimedWord : public WordProcessor {
     return std::make_unique<TimedDocument>(times_.Measure("template", true, [&] { return word_.Add(path); }),
                                            times_);
   }
-  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) override {
-    times_.Measure("joining PDFs", false, [&] { word_.JoinPdfs(parts, target); });
+  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+                const std::function<void()>& onProgress) override {
+    times_.Measure("joining PDFs", false, [&] { word_.JoinPdfs(parts, target, onProgress); });
   }
   void Quit() noexcept override { word_.Quit(); }
 
@@ -152,9 +152,9 @@ Blob Photograph(int member) {
   return {bytes.begin(), bytes.end()};
 }
 
-/// The venue's folder with the template and forty members, and a game in which everyone hit forty others.
+/// The venue's folder with the template and forty members, and a game of 224 of whom each hit so many others.
 struct Evening {
-  explicit Evening(const std::filesystem::path& bin) {
+  Evening(const std::filesystem::path& bin, int hitsPerPlayer) {
     std::string pattern = (std::filesystem::temp_directory_path() / "tessarine-bench-XXXXXX").string();
     Folder = mkdtemp(pattern.data());
     std::filesystem::copy_file(std::string(TESSARINE_RESOURCES) + "/score_card_default.doc",
@@ -167,7 +167,7 @@ struct Evening {
       player.Active = true;
       player.MemberIndex = 1 + index % Members;
       player.ShotCount = 1000 + index;
-      for (int hit = 1; hit <= HitsPerPlayer; ++hit) {
+      for (int hit = 1; hit <= hitsPerPlayer; ++hit) {
         Board.Players(1 + (index + hit * 5) % PlayerCount).HitByPlayer(index) = 10 * hit;
       }
     }
@@ -255,14 +255,15 @@ class PlainOffice {
   int leash_ = -1;
 };
 
-/// All 224 sheets in the plain way; milliseconds.
+/// Some of the 224 sheets in the plain way; milliseconds for all.
 double PlainRun(Evening& evening, const std::string& host) {
   const PlainOffice office(host);
   PlainSheets plain(office.Pipe);
   MemberLookup members(*evening.RsMembers, evening.Boxes);
   LinuxFiles files;
   const auto start = Steady::now();
-  for (int index = 1; index <= PlayerCount; ++index) {
+  constexpr int step = 4;
+  for (int index = 1; index <= PlayerCount; index += step) {
     PlainSheets::Sheet sheet;
     const auto add = [&sheet](const BookmarkTexts& texts) {
       sheet.Bookmarks.insert(sheet.Bookmarks.end(), texts.begin(), texts.end());
@@ -279,9 +280,26 @@ double PlainRun(Evening& evening, const std::string& host) {
     plain.Make(evening.Folder + "/score_card.doc", sheet);
     files.Delete(sheet.Photo);
   }
-  const double time = MillisecondsSince(start);
+  const double time = MillisecondsSince(start) * step;
   plain.Quit();
   return time;
+}
+
+/// Starts the word processor with events served; returns the longest time that they were not, in
+/// milliseconds.
+double StartOffice(LibreOffice& office) {
+  const auto start = Steady::now();
+  double longest = 0;
+  QtEventPump pump;
+  for (bool ready = false; !ready;) {
+    const auto step = Steady::now();
+    office.Start();
+    ready = office.State() == WordState::Ready;
+    longest = std::max(longest, MillisecondsSince(step));
+    pump.WaitFor([] { return false; }, std::chrono::milliseconds(50));
+  }
+  std::printf("The word processor is ready after %.1f s.\n", MillisecondsSince(start) / 1000);
+  return longest;
 }
 
 }  // namespace
@@ -290,37 +308,34 @@ double PlainRun(Evening& evening, const std::string& host) {
 int main(int argc, char** argv) {
   QApplication application(argc, argv);
   const std::filesystem::path bin = std::filesystem::canonical(argv[0]).parent_path();
-  Evening evening(bin);
   LibreOffice office(bin);
-  const auto start = Steady::now();
-  double longestStep = 0;
-  QtEventPump pump;
-  for (bool ready = false; !ready;) {
-    const auto step = Steady::now();
-    office.Start();
-    ready = office.State() == WordState::Ready;
-    longestStep = std::max(longestStep, MillisecondsSince(step));
-    pump.WaitFor([] { return false; }, std::chrono::milliseconds(50));
-  }
-  std::printf("The word processor is ready after %.1f s.\n", MillisecondsSince(start) / 1000);
-
   Times times;
-  constexpr std::int16_t neither = 0;
-  const double own = OwnRun(evening, office, neither, times);
-  const double plain = PlainRun(evening, bin / "tessarine-office-host");
-  Times withPdf;
-  const double toFiles = OwnRun(evening, office, OutputTarget::Files, withPdf);
-  for (const auto& [kind, time] : withPdf.ByKind) {
-    std::printf("  %-14s %6.1f ms a sheet\n", kind.c_str(), time / PlayerCount);
+  times.LongestGap = StartOffice(office);
+  bool met = true;
+  double own = 0;
+  double plain = 0;
+  constexpr int usual = 40;
+  for (const int hits : {usual, PlayerCount}) {
+    Evening evening(bin, hits);
+    times.ByKind.clear();
+    constexpr std::int16_t neitherPrinterNorPdf = 0;
+    own = OwnRun(evening, office, neitherPrinterNorPdf, times);
+    plain = PlainRun(evening, bin / "tessarine-office-host");
+    std::printf("%d hits dealt and taken: %.1f ms a sheet, in the plain way %.1f ms (ratio %.3f)\n", hits,
+                own / PlayerCount, plain / PlayerCount, own / plain);
+    for (const auto& [kind, time] : times.ByKind) {
+      std::printf("  %-12s %6.1f ms a sheet\n", kind.c_str(), time / PlayerCount);
+    }
+    met &= !evening.Boxes.Failed;
   }
-  std::printf("  %-14s %6.1f ms a sheet, %.1f ms without the PDF\n", "all", toFiles / PlayerCount,
-              own / PlayerCount);
+  Evening evening(bin, usual);
+  const double toFiles = OwnRun(evening, office, OutputTarget::Files, times);
+  std::printf("With a PDF of all: %.1f ms a sheet\n", toFiles / PlayerCount);
   constexpr double longestAllowed = 100;
-  const double gap = std::max({longestStep, times.LongestGap, withPdf.LongestGap});
-  bool met = !evening.Boxes.Failed;
-  met &= ReportGoal("224 sheets with photographs / one call per cell", own / plain, 0.5,
-                    TimesText(own * 1000, plain * 1000));
-  met &= ReportGoal("longest gap of the event loop / 100 ms", gap / longestAllowed, 1,
-                    TimesText(gap * 1000, longestAllowed * 1000));
+  constexpr double thousand = 1000;
+  met &= ReportGoal("224 sheets of the fullest game / a call per cell", own / plain, 0.5,
+                    TimesText(own * thousand, plain * thousand));
+  met &= ReportGoal("longest gap of the event loop / 100 ms", times.LongestGap / longestAllowed, 1,
+                    TimesText(times.LongestGap * thousand, longestAllowed * thousand));
   return met ? 0 : 1;
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -54,9 +55,11 @@ class WordProcessor {
   /// when it is no document, 429 when the word processor is not ready.
   virtual std::unique_ptr<WordDocument> Add(const std::string& path) = 0;
 
-  /// Joins the PDF files `parts` into one at `target`, in their order. Works without a running word
+  /// Joins the PDF files `parts` into one at `target`, in their order, and calls `onProgress` now and
+  /// then. Works without a running word
   /// processor.
-  virtual void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) = 0;
+  virtual void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+                        const std::function<void()>& onProgress) = 0;
 
   /// Ends it without saving anything; failures are of no interest.
   virtual void Quit() noexcept = 0;

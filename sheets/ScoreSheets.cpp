@@ -239,7 +239,8 @@ std::string ScoreSheets::FreeName(const std::string& base, const std::string& ex
 }
 
 void ScoreSheets::JoinSheets() {
-  in_.WordApp.JoinPdfs(pages_, FreeName("Score sheets-" + sheetDate_ + "-" + in_.MissionName, ".pdf"));
+  in_.WordApp.JoinPdfs(pages_, FreeName("Score sheets-" + sheetDate_ + "-" + in_.MissionName, ".pdf"),
+                       [this] { ServeEvents(); });
 }
 
 void ScoreSheets::ServeEvents() {

@@ -107,9 +107,10 @@ std::unique_ptr<WordDocument> LibreOffice::Add(const std::string& path) {
   return client_->Add(path);
 }
 
-void LibreOffice::JoinPdfs(const std::vector<std::string>& parts, const std::string& target) {
+void LibreOffice::JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+                           const std::function<void()>& onProgress) {
   LoadModule();
-  client_->JoinPdfs(parts, target);
+  client_->JoinPdfs(parts, target, onProgress);
 }
 
 void LibreOffice::Quit() noexcept {

@@ -2,6 +2,7 @@
 
 #include <sys/types.h>
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -22,7 +23,8 @@ class LibreOffice : public WordProcessor {
   void Start() override;
   WordState State() override;
   std::unique_ptr<WordDocument> Add(const std::string& path) override;
-  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) override;
+  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+                const std::function<void()>& onProgress) override;
   void Quit() noexcept override;
 
  private:

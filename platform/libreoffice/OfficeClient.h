@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -21,7 +22,8 @@ class OfficeClient {
   /// As in WordProcessor; needs the connection.
   virtual std::unique_ptr<WordDocument> Add(const std::string& path) = 0;
 
-  virtual void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) = 0;
+  virtual void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+                        const std::function<void()>& onProgress) = 0;
 
   /// Asks the connected LibreOffice to end, and forgets it.
   virtual void Terminate() noexcept = 0;

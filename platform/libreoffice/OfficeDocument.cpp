@@ -139,7 +139,9 @@ Size Fit(const Size& picture, const Size& box) {
 
 OfficeDocument::OfficeDocument(Reference<text::XTextDocument> document, OfficeServices services,
                                std::shared_ptr<BodyTables> bodyTables)
-    : document_(std::move(document)), services_(std::move(services)), bodyTables_(std::move(bodyTables)) {}
+    : document_(std::move(document)), services_(std::move(services)), bodyTables_(std::move(bodyTables)) {
+  document_->lockControllers();  // no page is laid out anew after each change
+}
 
 void OfficeDocument::SetBookmark(const std::string& name, const std::string& words) {
   Uno::Call([&] {
@@ -198,6 +200,9 @@ void OfficeDocument::ExportPdf(const std::string& path) {
 void OfficeDocument::Store(const std::string& path, const char* filter) {
   try {
     Uno::Call([&] {
+      if (document_->hasControllersLocked()) {
+        document_->unlockControllers();
+      }
       const Reference<com::sun::star::frame::XStorable> storable(document_, UNO_QUERY_THROW);
       storable->storeToURL(Uno::UrlOf(path),
                            Uno::Properties({{"FilterName", Any(OUString::createFromAscii(filter))}}));

@@ -1,6 +1,7 @@
 #include "platform/libreoffice/PdfJoin.h"
 
 #include <filesystem>
+#include <functional>
 #include <memory>
 #include <qpdf/QPDF.hh>
 #include <qpdf/QPDFPageDocumentHelper.hh>
@@ -8,7 +9,26 @@
 
 #include "platform/RuntimeError.h"
 
-void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) {
+namespace {
+
+class Reporter : public QPDFWriter::ProgressReporter {
+ public:
+  explicit Reporter(const std::function<void()>& onProgress) : onProgress_(onProgress) {}
+  void reportProgress(int /*percent*/) override { onProgress_(); }
+
+ private:
+  const std::function<void()>& onProgress_;
+};
+
+void Remove(const std::string& path) {
+  std::error_code ignored;
+  std::filesystem::remove(path, ignored);
+}
+
+}  // namespace
+
+void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+              const std::function<void()>& onProgress) {
   try {
     QPDF whole;
     whole.emptyPDF();
@@ -20,11 +40,16 @@ void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) 
       for (auto& page : QPDFPageDocumentHelper(*sources.back()).getAllPages()) {
         pages.addPage(page, false);
       }
+      onProgress();
     }
-    QPDFWriter(whole, target.c_str()).write();
+    QPDFWriter writer(whole, target.c_str());
+    writer.registerProgressReporter(std::make_shared<Reporter>(onProgress));
+    writer.write();
   } catch (const std::exception& failure) {
-    std::error_code ignored;
-    std::filesystem::remove(target, ignored);
+    Remove(target);
     throw RuntimeError(75, failure.what());
+  } catch (...) {
+    Remove(target);  // `onProgress` wants it no more
+    throw;
   }
 }

@@ -1,8 +1,10 @@
 #pragma once
 
+#include <functional>
 #include <string>
 #include <vector>
 
-/// Joins the PDF files `parts` into one at `target`, in their order. Throws RuntimeError 75 when one cannot
-/// be read or the target cannot be written; no half file is left.
-void JoinPdfs(const std::vector<std::string>& parts, const std::string& target);
+/// Joins the PDF files `parts` into one at `target`, in their order, and calls `onProgress` now and then.
+/// Throws RuntimeError 75 when one cannot be read or the target cannot be written; no half file is left.
+void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+              const std::function<void()>& onProgress);

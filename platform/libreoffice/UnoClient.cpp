@@ -33,6 +33,31 @@ namespace {
 /// Template files are told apart by path and time of change.
 using TemplateKey = std::pair<std::string, std::filesystem::file_time_type>;
 
+/// What was found out about a template, so that the next document made from it takes fewer calls.
+struct Template {
+  OUString Filter;  ///< by which it is read; empty until it was
+  std::shared_ptr<BodyTables> Tables = std::make_shared<BodyTables>();
+};
+
+/// Whether a text document was read from something better than a file of no known format, which is taken for
+/// a plain text; sets the filter that read it.
+bool IsTemplate(const Reference<com::sun::star::text::XTextDocument>& document, OUString& filter) {
+  if (!document.is()) {
+    return false;
+  }
+  OUString used;
+  for (const auto& argument : document->getArgs()) {
+    if (argument.Name == "FilterName") {
+      argument.Value >>= used;
+    }
+  }
+  if (used == "Text" || used == "Text (encoded)") {
+    return false;
+  }
+  filter = used;
+  return true;
+}
+
 class UnoClient : public OfficeClient {
  public:
   std::string ProgramFolder() const override {
@@ -44,8 +69,9 @@ class UnoClient : public OfficeClient {
   bool Connect(const std::string& name) override;
   std::unique_ptr<WordDocument> Add(const std::string& path) override;
 
-  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) override {
-    ::JoinPdfs(parts, target);
+  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+                const std::function<void()>& onProgress) override {
+    ::JoinPdfs(parts, target, onProgress);
   }
 
   void Terminate() noexcept override;
@@ -64,7 +90,7 @@ class UnoClient : public OfficeClient {
   Reference<com::sun::star::bridge::XUnoUrlResolver> resolver_;
   Reference<com::sun::star::frame::XDesktop> desktop_;
   OfficeServices services_;
-  std::map<TemplateKey, std::shared_ptr<BodyTables>> bodyTables_;
+  std::map<TemplateKey, Template> templates_;
 };
 
 void UnoClient::CreateLocalContext() {
@@ -101,31 +127,21 @@ std::unique_ptr<WordDocument> UnoClient::Add(const std::string& path) {
   if (failure) {
     throw RuntimeError(53, "File not found: " + path);
   }
-  return Uno::Call([&]() -> std::unique_ptr<WordDocument> {
+  return Uno::Call([&] {
+    Template& known = templates_[{path, changed}];
     const Reference<com::sun::star::frame::XComponentLoader> loader(desktop_, UNO_QUERY_THROW);
     const Reference<com::sun::star::lang::XComponent> component = loader->loadComponentFromURL(
-        Uno::UrlOf(path), "_blank", 0, Uno::Properties({{"Hidden", Any(true)}, {"AsTemplate", Any(true)}}));
+        Uno::UrlOf(path), "_blank", 0,
+        Uno::Properties(
+            {{"Hidden", Any(true)}, {"AsTemplate", Any(true)}, {"FilterName", Any(known.Filter)}}));
     const Reference<com::sun::star::text::XTextDocument> document(component, UNO_QUERY);
-    OUString filter;
-    if (document.is()) {
-      for (const auto& argument : document->getArgs()) {
-        if (argument.Name == "FilterName") {
-          argument.Value >>= filter;
-        }
-      }
-    }
-    // What is of no known format is taken for a plain text.
-    if (!document.is() || filter == "Text" || filter == "Text (encoded)") {
+    if (known.Filter.isEmpty() && !IsTemplate(document, known.Filter)) {
       if (const Reference<com::sun::star::util::XCloseable> open(component, UNO_QUERY); open.is()) {
         open->close(true);
       }
       throw RuntimeError(321, "Invalid file format: " + path);
     }
-    std::shared_ptr<BodyTables>& tables = bodyTables_[{path, changed}];
-    if (!tables) {
-      tables = std::make_shared<BodyTables>();
-    }
-    return std::make_unique<OfficeDocument>(document, services_, tables);
+    return std::make_unique<OfficeDocument>(document, services_, known.Tables);
   });
 }
 

@@ -59,8 +59,10 @@ class FakeWordProcessor : public WordProcessor {
     return std::make_unique<OpenDocument>(*this, *Documents.back());
   }
 
-  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target) override {
+  void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
+                const std::function<void()>& onProgress) override {
     Note("JoinPdfs " + std::to_string(parts.size()) + " " + target);
+    onProgress();
   }
 
   void Quit() noexcept override {

@@ -183,11 +183,14 @@ TEST_F(Writer, JoinsPdfs) {
   document->ExportPdf(folder / "1.pdf");
   document->ExportPdf(folder / "2.pdf");
   document->Close();
-  Office().JoinPdfs({folder / "1.pdf", folder / "2.pdf"}, folder / "all.pdf");
+  int calls = 0;
+  Office().JoinPdfs({folder / "1.pdf", folder / "2.pdf"}, folder / "all.pdf", [&calls] { ++calls; });
+  EXPECT_GT(calls, 2);
   const std::string all = ReadFile(folder / "all.pdf");
   EXPECT_EQ(all.substr(0, 5), "%PDF-");
   EXPECT_THAT(all, HasSubstr("/Count 2"));
-  EXPECT_EQ(NumberThrownBy([&] { Office().JoinPdfs({folder / "missing.pdf"}, folder / "none.pdf"); }), 75);
+  EXPECT_EQ(NumberThrownBy([&] { Office().JoinPdfs({folder / "missing.pdf"}, folder / "none.pdf", [] {}); }),
+            75);
   EXPECT_FALSE(std::filesystem::exists(folder / "none.pdf"));
 }
 
