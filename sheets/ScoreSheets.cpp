@@ -230,12 +230,16 @@ void ScoreSheets::Save(WordDocument& document) {
 }
 
 std::string ScoreSheets::FreeName(const std::string& base, const std::string& extension) const {
-  std::string candidate = base;
-  for (std::int32_t n = 1; in_.Disk.FileExists(folder_ + "/" + candidate + extension); ++n) {
-    candidate = base + Str(n);
+  const std::string folder = folder_ + "/";
+  std::string name = base + extension;
+  std::int32_t n = 0;
+  while (in_.Disk.FileExists(folder + name)) {
+    name = base;
+    name += Str(++n);
+    name += extension;
   }
-  CheckFileName(candidate + extension);
-  return folder_ + "/" + candidate + extension;
+  CheckFileName(name);
+  return folder + name;
 }
 
 void ScoreSheets::JoinSheets() {

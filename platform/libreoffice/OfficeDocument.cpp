@@ -137,9 +137,9 @@ Size Fit(const Size& picture, const Size& box) {
 
 }  // namespace
 
-OfficeDocument::OfficeDocument(Reference<text::XTextDocument> document, OfficeServices services,
+OfficeDocument::OfficeDocument(const Reference<text::XTextDocument>& document, const OfficeServices& services,
                                std::shared_ptr<BodyTables> bodyTables)
-    : document_(std::move(document)), services_(std::move(services)), bodyTables_(std::move(bodyTables)) {
+    : document_(document), services_(services), bodyTables_(std::move(bodyTables)) {
   document_->lockControllers();  // no page is laid out anew after each change
 }
 
@@ -159,8 +159,9 @@ void OfficeDocument::WriteCells(int number, int firstRow, int rows, const std::v
     const Reference<text::XTextTable> whole = Table(number);
     const int count = static_cast<int>(texts.size());
     const int full = count / rows;
+    const int rest = count % rows;
     const Block blocks[] = {{0, firstRow - 1, full, rows, texts.data()},
-                            {full, firstRow - 1, 1, count % rows, texts.data() + full * rows}};
+                            {full, firstRow - 1, 1, rest, texts.data() + (count - rest)}};
     const Reference<table::XCellRange> range(whole, UNO_QUERY_THROW);
     for (const Block& block : blocks) {
       if (block.Columns > 0 && block.Rows > 0) {

@@ -26,8 +26,8 @@ struct OfficeServices {
 /// A text document that is open in LibreOffice.
 class OfficeDocument : public WordDocument {
  public:
-  OfficeDocument(Uno::Reference<com::sun::star::text::XTextDocument> document, OfficeServices services,
-                 std::shared_ptr<BodyTables> bodyTables);
+  OfficeDocument(const Uno::Reference<com::sun::star::text::XTextDocument>& document,
+                 const OfficeServices& services, std::shared_ptr<BodyTables> bodyTables);
 
   void SetBookmark(const std::string& name, const std::string& text) override;
   void WriteCells(int table, int firstRow, int rows, const std::vector<std::string>& texts) override;
