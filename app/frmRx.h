@@ -96,7 +96,7 @@ class frmRx : public QMainWindow {
   std::unique_ptr<Recordset> rsMembers_;
   std::optional<MemberLookup> members_;
   std::optional<ScoreAnalysis> analysis_;
-  int selectedPlayer_ = 0;       ///< record index of the player under the context menu
+  int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again
   QTimer wordProcessorTimer_;
   bool wordProcessorStarted_ = false;
