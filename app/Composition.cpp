@@ -53,9 +53,7 @@ Composition::Composition() : strings_(LanguageOfSystem()), wordProcessor_(Module
 
 ::Services Composition::Services() {
   return {strings_, clock_,   databases_, old_,     events_, fileDialog_,
-          files_,   folders_, boxes_,     devices_, port_};
-  return {strings_, clock_, databases_, events_, fileDialog_,   files_,
-          folders_, boxes_, devices_,   port_,   wordProcessor_};
+          files_,   folders_, boxes_,     devices_, port_,   wordProcessor_};
 }
 
 void Composition::SetMainWindow(QWidget* window) {

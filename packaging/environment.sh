@@ -1,9 +1,7 @@
 # For the scripts at the root: installs Debian packages when they are missing, and builds.
 
 BuildPackages=(g++ cmake ninja-build qt6-base-dev qt6-base-dev-tools qt6-serialport-dev libsqlite3-dev sqlite3
-  libpugixml-dev mdbtools-dev pkg-config libgtest-dev libgmock-dev libbenchmark-dev)
-RunPackages=(qt6-translations-l10n fonts-dejavu-core fonts-noto-cjk)
-  libpugixml-dev libreoffice-dev libqpdf-dev libgtest-dev libgmock-dev libbenchmark-dev)
+  libpugixml-dev mdbtools-dev pkg-config libreoffice-dev libqpdf-dev libgtest-dev libgmock-dev libbenchmark-dev)
 RunPackages=(libreoffice-writer qt6-translations-l10n fonts-dejavu-core fonts-noto-cjk)
 DisplayPackages=(xvfb xauth)
 CheckPackages=(clang clang-format clang-tidy libclang-rt-14-dev git)

@@ -75,8 +75,7 @@ class Venue {
       events = &RealEvents;
     }
     Window = std::make_unique<frmRx>(
-        ::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places, Boxes, Devices, Port});
-        ::Services{Strings, Time, Databases, *events, Dialog, Disk, Places, Boxes, Devices, Port, Word});
+        ::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places, Boxes, Devices, Port, Word});
     return *Window;
   }
 
