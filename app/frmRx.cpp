@@ -55,11 +55,11 @@ bool frmRx::FormLoad() {
   }
   factors_ = ReadSoldieringFactors(*ini_);
   ConnectCommands();
-  return true;
   // Not before the window has come up.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this, [this] { Run([this] { FollowWordProcessor(); }); });
   wordProcessorTimer_.start(followMilliseconds);
+  return true;
 }
 
 void frmRx::SetCaptions() {
