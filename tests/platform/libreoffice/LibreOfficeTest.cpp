@@ -13,6 +13,7 @@
 
 #include "platform/RuntimeError.h"
 #include "tests/platform/libreoffice/OfficeProcesses.h"
+#include "tests/platform/libreoffice/OfficeStart.h"
 #include "tests/platform/linux/TemporaryFolder.h"
 #include "tests/platform/linux/Thrown.h"
 
@@ -24,24 +25,6 @@ using testing::Not;
 using testing::SizeIs;
 
 const std::string Template = TESSARINE_PROGRAM_FOLDER "/score_card_default.doc";
-
-/// Asks again and again until `condition` holds; false when a minute was not enough.
-bool WaitUntil(const std::function<bool()>& condition) {
-  const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(60);
-  while (!condition()) {
-    if (std::chrono::steady_clock::now() > end) {
-      return false;
-    }
-    std::this_thread::sleep_for(std::chrono::milliseconds(10));
-  }
-  return true;
-}
-
-bool StartAndWait(LibreOffice& office) {
-  office.Start();
-  return WaitUntil([&] { return office.State() != WordState::Starting; }) &&
-         office.State() == WordState::Ready;
-}
 
 std::vector<pid_t> Hosts(pid_t parent = getpid()) {
   return ChildrenOf(parent, "tessarine-office-host");
