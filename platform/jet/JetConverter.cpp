@@ -52,7 +52,7 @@ void SyncFolderOf(const std::string& path) {
 /// Gives the old file a second name that nothing has, so that it is there under one of them at every instant.
 std::string KeepOld(const std::string& path) {
   for (int number = 1;; ++number) {
-    const std::string kept = path + ".jet" + (number == 1 ? "" : std::to_string(number));
+    std::string kept = path + ".jet" + (number == 1 ? "" : std::to_string(number));
     std::error_code error;
     if (std::filesystem::exists(kept)) {
       if (std::filesystem::equivalent(kept, path, error)) {

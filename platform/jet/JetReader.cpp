@@ -227,16 +227,28 @@ void WriteTable(MdbTableDef* table) {
   }
 }
 
+#ifdef __has_feature
+#define HAS_FEATURE(name) __has_feature(name)
+#else
+#define HAS_FEATURE(name) 0
+#endif
+
+/// A damaged file can make the library ask for more and more memory.
+void LimitMemory() {
+#if !HAS_FEATURE(address_sanitizer)  // which takes terabytes of addresses for itself
+  constexpr rlim_t mostMemory = rlim_t{2} << 30U;
+  const rlimit limit{mostMemory, mostMemory};
+  setrlimit(RLIMIT_AS, &limit);
+#endif
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
   if (argc != 3) {
     Fail("usage: tessarine-jet-reader FILE TABLE");
   }
-  // A damaged file can make the library ask for more and more memory.
-  constexpr rlim_t mostMemory = rlim_t{2} << 30U;
-  const rlimit limit{mostMemory, mostMemory};
-  setrlimit(RLIMIT_AS, &limit);
+  LimitMemory();
   MdbHandle* const mdb = mdb_open(argv[1], MDB_NOFLAGS);
   if (mdb == nullptr || mdb_read_catalog(mdb, MDB_TABLE) == nullptr) {
     Fail("Its list of tables cannot be read.");

@@ -31,7 +31,7 @@ std::string NewPipeName() {
 LibreOffice::LibreOffice(std::string folder) : folder_(std::move(folder)) {}
 
 LibreOffice::~LibreOffice() {
-  Quit();
+  LibreOffice::Quit();
 }
 
 void LibreOffice::LoadModule() {
