@@ -2,9 +2,9 @@
 
 #include <QTranslator>
 
+#include "app/ConversionWithProgress.h"
 #include "app/Services.h"
 #include "core/StringTable.h"
-#include "platform/jet/JetConverter.h"
 #include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/qt/QtClock.h"
@@ -33,7 +33,7 @@ class Composition {
   QTranslator dialogTexts_;  ///< the toolkit's own texts ("OK", "File name:") in the program's language
   QtClock clock_;
   SqliteEngine databases_;
-  JetConverter old_{JetReaderPath()};
+  ConversionWithProgress old_{strings_};
   QtEventPump events_;
   QtFileDialog fileDialog_;
   LinuxFiles files_;

@@ -111,8 +111,10 @@ OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const std::
                     },
                     [&import](const std::vector<std::string>& columns) { import.SetColumns(columns); },
                     [&import](const std::vector<Value>& row) { import.AddRow(row); }});
-  const ChildEnd end =
-      RunChild(reader_, {path, table}, silence_, [&stream](std::string_view bytes) { stream.Take(bytes); });
+  const ChildEnd end = RunChild(reader_, {path, table}, silence_, [&](std::string_view bytes) {
+    stream.Take(bytes);
+    onRows_(import.Rows());
+  });
   if (end.TimedOut) {
     throw RuntimeError(UnrecognizedFormat, "It is damaged: reading it did not come to an end.");
   }

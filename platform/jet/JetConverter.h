@@ -1,16 +1,24 @@
 #pragma once
 
 #include <chrono>
+#include <cstdint>
+#include <functional>
 #include <string>
+#include <utility>
 
 #include "platform/OldDatabases.h"
 
 /// Turns Jet files into the databases that this program uses now. A program beside the main one reads them.
 class JetConverter : public OldDatabases {
  public:
-  /// `reader` is the path of tessarine-jet-reader. A reader that is silent for `silence` has hung.
-  explicit JetConverter(std::string reader, std::chrono::milliseconds silence = std::chrono::seconds(20))
-      : reader_(std::move(reader)), silence_(silence) {}
+  static constexpr std::chrono::milliseconds LongestSilence = std::chrono::seconds(20);
+
+  /// `reader` is the path of tessarine-jet-reader. A reader that is silent for `silence` has hung. `onRows`
+  /// is told again and again how many rows have come.
+  explicit JetConverter(
+      std::string reader, std::chrono::milliseconds silence = LongestSilence,
+      std::function<void(std::int64_t rows)> onRows = [](std::int64_t) {})
+      : reader_(std::move(reader)), silence_(silence), onRows_(std::move(onRows)) {}
 
   bool IsOld(const std::string& path) const override;
   OldDatabaseReport Convert(const std::string& path, const std::string& table,
@@ -22,6 +30,7 @@ class JetConverter : public OldDatabases {
 
   std::string reader_;
   std::chrono::milliseconds silence_;
+  std::function<void(std::int64_t rows)> onRows_;
 };
 
 /// Path of tessarine-jet-reader beside the running program.

@@ -1,0 +1,42 @@
+#include "app/ConversionWithProgress.h"
+
+#include <QCoreApplication>
+#include <QFileInfo>
+
+ConversionWithProgress::ConversionWithProgress(const StringTable& strings, std::chrono::milliseconds moment)
+    : strings_(strings),
+      converter_(JetReaderPath(), JetConverter::LongestSilence,
+                 [this](std::int64_t rows) { ShowRows(rows); }),
+      moment_(moment) {}
+
+OldDatabaseReport ConversionWithProgress::Convert(const std::string& path, const std::string& table,
+                                                  const std::string& emptyDatabase) {
+  file_ = QFileInfo(QString::fromStdString(path)).fileName();
+  sinceShown_.start();
+  const struct Closing {
+    std::unique_ptr<QProgressDialog>& Window;
+    ~Closing() { Window.reset(); }
+  } closing{window_};
+  return converter_.Convert(path, table, emptyDatabase);
+}
+
+void ConversionWithProgress::ShowRows(std::int64_t rows) {
+  if (sinceShown_.elapsed() < moment_.count()) {
+    return;
+  }
+  sinceShown_.start();
+  const bool chinese = strings_.TextLanguage() == Language::SimplifiedChinese;
+  if (!window_) {
+    window_ = std::make_unique<QProgressDialog>();
+    window_->setWindowTitle(QStringLiteral("Tessarine"));
+    window_->setCancelButton(nullptr);
+    window_->setRange(0, 0);
+    window_->setMinimumWidth(window_->fontMetrics().averageCharWidth() * 60);
+    window_->show();
+  }
+  window_->setLabelText(QString::fromUtf8(chinese ? "正在转换旧安装的数据库 %1：%2 行"
+                                                  : "Converting %1 of an old installation: %2 rows")
+                            .arg(file_)
+                            .arg(rows));
+  QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
+}
