@@ -185,6 +185,14 @@ TEST_F(Ds2480bTest, ForgetsAFailedSearchWhenTheAcceleratorIsSwitchedOff) {
   EXPECT_EQ(Search(lowestFirst), buttonPath);
 }
 
+TEST_F(Ds2480bTest, RemembersAFailedSearchWhileTheAcceleratorIsOn) {
+  Answers({0xE1, 0xF0, 0xE3, 0xB1, 0xE1, 0x00, 0xE3});
+  bus_.Touch(button);
+  // Reset and search command past the accelerator, as single bits.
+  Answers({0xC1, 0x81, 0x81, 0x81, 0x81, 0x91, 0x91, 0x91, 0x91, 0xE1});
+  EXPECT_EQ(Answers(lowestFirst), Bytes(16, 0xFF));
+}
+
 TEST_F(Ds2480bTest, TellsAButtonThatLeavesInTheMiddleOfASearch) {
   bus_.Touch(button);
   EXPECT_EQ(Answers({0xC1, 0xE1, 0xF0, 0xE3, 0xB1, 0xE1, 0x00, 0x00, 0x00}),
