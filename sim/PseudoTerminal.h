@@ -25,6 +25,9 @@ class PseudoTerminal {
 
   const std::string& SlavePath() const { return slavePath_; }
 
+  /// Bytes pass at `baud` from now on.
+  void SetBaud(int baud) { baud_ = baud; }
+
   /// The next byte from the client, once its last bit is through; none after `timeout` (for ever without
   /// one), an interruption or the end of the line.
   std::optional<std::uint8_t> ReadByte(std::optional<std::chrono::milliseconds> timeout = std::nullopt);

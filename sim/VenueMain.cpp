@@ -9,6 +9,7 @@
 #include <cstdint>
 #include <exception>
 #include <fstream>
+#include <functional>
 #include <iostream>
 #include <optional>
 #include <stdexcept>
@@ -18,9 +19,12 @@
 #include <vector>
 
 #include "sim/BaseUnit.h"
+#include "sim/ButtonCommands.h"
 #include "sim/DeviceLink.h"
 #include "sim/FileDescriptor.h"
 #include "sim/GameMaker.h"
+#include "sim/LineInput.h"
+#include "sim/OneWireAdapter.h"
 #include "sim/VenueOptions.h"
 
 namespace {
@@ -51,14 +55,17 @@ sim::FileDescriptor CatchEndSignals() {
   return sim::FileDescriptor(::signalfd(-1, &signals, SFD_CLOEXEC));
 }
 
-bool InputHasEnded() {
-  std::array<char, 256> ignored{};
-  return ::read(STDIN_FILENO, ignored.data(), ignored.size()) <= 0;
+void Complain(const std::exception& failure) {
+  std::cerr << "tessarine-venue: " << failure.what() << '\n';
 }
 
-void WaitForEnd(const sim::FileDescriptor& endSignals, const sim::FileDescriptor& finished, bool untilEof) {
+// Returns on a signal, when `finished` is raised, or at the input's end if `untilEof`. Lines of the input go
+// to `obey`; without it the input is only watched for its end.
+void WaitForEnd(const sim::FileDescriptor& endSignals, const sim::FileDescriptor& finished, bool untilEof,
+                const std::function<void(const std::string&)>& obey) {
   std::array<pollfd, 3> watched{pollfd{endSignals.Get(), POLLIN, 0}, pollfd{finished.Get(), POLLIN, 0},
-                                pollfd{untilEof ? STDIN_FILENO : -1, POLLIN, 0}};
+                                pollfd{untilEof || obey ? STDIN_FILENO : -1, POLLIN, 0}};
+  sim::LineInput input(STDIN_FILENO);
   for (;;) {
     if (::poll(watched.data(), watched.size(), -1) < 0) {
       if (errno != EINTR) {
@@ -69,9 +76,30 @@ void WaitForEnd(const sim::FileDescriptor& endSignals, const sim::FileDescriptor
     if (watched[0].revents != 0 || watched[1].revents != 0) {
       return;
     }
-    if (watched[2].revents != 0 && InputHasEnded()) {
-      return;
+    if (watched[2].revents != 0) {
+      for (const std::string& line : input.Read()) {
+        if (obey) {
+          obey(line);
+        }
+      }
+      if (input.HasEnded() && untilEof) {
+        return;
+      }
+      if (input.HasEnded()) {
+        watched[2].fd = -1;
+      }
     }
+  }
+}
+
+void ObeyAndTell(sim::OneWireAdapter& adapter, const std::string& line) {
+  try {
+    const std::string done = sim::ObeyButtonCommand(adapter, line);
+    if (!done.empty()) {
+      std::cout << done << std::endl;
+    }
+  } catch (const std::invalid_argument& failure) {
+    Complain(failure);
   }
 }
 
@@ -83,8 +111,9 @@ void Serve(const sim::VenueOptions& options, sim::BaseUnitAnswer answer) {
   }
   std::optional<std::ofstream> log = OpenOutput(options.LogFile);
   std::optional<std::ofstream> frames = OpenOutput(options.FramesFile);
+  const sim::Pace pace = options.Fast ? sim::Pace::Fast : sim::Pace::AsWired;
   sim::BaseUnit baseUnit({.Answer = std::move(answer),
-                          .LinePace = options.Fast ? sim::Pace::Fast : sim::Pace::AsWired,
+                          .LinePace = pace,
                           .Requests = options.Games,
                           .Log = log ? &*log : nullptr,
                           .Frames = frames ? &*frames : nullptr,
@@ -93,12 +122,24 @@ void Serve(const sim::VenueOptions& options, sim::BaseUnitAnswer answer) {
   if (options.Link) {
     link.emplace(*options.Link, baseUnit.DevicePath());
   }
+  std::optional<sim::OneWireAdapter> oneWire;
+  std::optional<sim::DeviceLink> oneWireLink;
+  std::function<void(const std::string&)> obey;
+  if (options.OneWire) {
+    oneWire.emplace(sim::OneWireAdapterSettings{.Failure = options.AdapterFailure,
+                                                .FailurePlace = options.AdapterFailurePlace,
+                                                .LinePace = pace,
+                                                .Log = log ? &*log : nullptr});
+    if (options.AdapterLink) {
+      oneWireLink.emplace(*options.AdapterLink, oneWire->DevicePath());
+    }
+    obey = [&adapter = *oneWire](const std::string& line) { ObeyAndTell(adapter, line); };
+  }
   std::cout << "base unit: " << baseUnit.DevicePath() << std::endl;
-  WaitForEnd(endSignals, finished, options.UntilEof);
-}
-
-void Complain(const std::exception& failure) {
-  std::cerr << "tessarine-venue: " << failure.what() << '\n';
+  if (oneWire) {
+    std::cout << "1-wire adapter: " << oneWire->DevicePath() << std::endl;
+  }
+  WaitForEnd(endSignals, finished, options.UntilEof, obey);
 }
 
 }  // namespace

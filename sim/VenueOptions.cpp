@@ -34,6 +34,16 @@ BaseUnitFailure ParseFailure(const std::string& name) {
   return info->Failure;
 }
 
+OneWireFailure ParseOneWireFailure(const std::string& name) {
+  const auto* info =
+      std::find_if(OneWireFailures.begin(), OneWireFailures.end(),
+                   [&](const OneWireFailureInfo& candidate) { return candidate.Name == name; });
+  if (info == OneWireFailures.end()) {
+    throw std::invalid_argument("The 1-wire adapter has no failure \"" + name + "\"");
+  }
+  return info->Failure;
+}
+
 std::string ParseFile(const std::string& option, const std::string& text) {
   if (text.empty()) {
     throw std::invalid_argument(option + " wants a file name");
@@ -46,7 +56,7 @@ struct ValueOption {
   void (*Take)(VenueOptions& options, const std::string& name, const std::string& value);
 };
 
-constexpr std::array<ValueOption, 8> valueOptions{{
+constexpr std::array<ValueOption, 11> valueOptions{{
     {"--players", [](VenueOptions& options, const std::string& name,
                      const std::string& value) { options.Players = ParseNumber(name, value, 224); }},
     {"--seed",
@@ -67,6 +77,16 @@ constexpr std::array<ValueOption, 8> valueOptions{{
                     const std::string& value) { options.FramesFile = ParseFile(name, value); }},
     {"--link", [](VenueOptions& options, const std::string& name,
                   const std::string& value) { options.Link = ParseFile(name, value); }},
+    {"--onewire-failure",
+     [](VenueOptions& options, const std::string&, const std::string& value) {
+       options.AdapterFailure = ParseOneWireFailure(value);
+     }},
+    {"--onewire-at",
+     [](VenueOptions& options, const std::string& name, const std::string& value) {
+       options.AdapterFailurePlace = ParseNumber(name, value, std::size_t{1'000'000});
+     }},
+    {"--onewire-link", [](VenueOptions& options, const std::string& name,
+                          const std::string& value) { options.AdapterLink = ParseFile(name, value); }},
 }};
 
 }  // namespace
@@ -80,6 +100,8 @@ VenueOptions ParseVenueOptions(const std::vector<std::string>& arguments) {
                      [&](const ValueOption& candidate) { return candidate.Name == name; });
     if (name == "--fast") {
       options.Fast = true;
+    } else if (name == "--onewire") {
+      options.OneWire = true;
     } else if (name == "--until-eof") {
       options.UntilEof = true;
     } else if (name == "--help") {
@@ -110,12 +132,27 @@ std::string VenueUsage() {
           "  --frames FILE   the frames exactly as put on the line, one after the other\n"
           "  --link PATH     a symbolic link to the base unit's device, removed at the end\n"
           "  --games N       end after N requests; 0: never (0)\n"
+          "  --onewire       serve the reader of membership buttons too; prints \"1-wire adapter: DEVICE\" "
+          "and "
+          "obeys\n"
+          "                  the commands below on the standard input\n"
+          "  --onewire-link PATH     as --link, to the reader's device\n"
+          "  --onewire-failure NAME  what goes wrong at the reader, see below (none)\n"
+          "  --onewire-at K          the byte or bit that its failure concerns, from 1 (1)\n"
           "  --until-eof     end when the standard input ends\n"
           "  --help          this text\n\n"
           "Failures:\n";
   for (const BaseUnitFailureInfo& info : BaseUnitFailures) {
     text << "  " << std::left << std::setw(25) << info.Name << info.Meaning << '\n';
   }
+  text << "\nFailures at the reader of membership buttons:\n";
+  for (const OneWireFailureInfo& info : OneWireFailures) {
+    text << "  " << std::left << std::setw(25) << info.Name << info.Meaning << '\n';
+  }
+  text << "\nCommands:\n"
+          "  touch ID   hold a button to the reader: 16 hexadecimal digits, CRC first, family code last\n"
+          "  leave ID   take it away\n"
+          "  leave      take all buttons away\n";
   return text.str();
 }
 

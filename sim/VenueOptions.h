@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "sim/BaseUnitFailure.h"
+#include "sim/OneWireFailure.h"
 
 namespace sim {
 
@@ -21,6 +22,10 @@ struct VenueOptions {
   std::optional<std::string> LogFile;
   std::optional<std::string> FramesFile;
   std::optional<std::string> Link;
+  bool OneWire = false;  ///< serve the reader of membership buttons too
+  OneWireFailure AdapterFailure = OneWireFailure::None;
+  std::size_t AdapterFailurePlace = 1;  ///< byte or bit, from 1
+  std::optional<std::string> AdapterLink;
   bool UntilEof = false;
   bool Help = false;
 };

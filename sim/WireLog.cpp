@@ -2,6 +2,7 @@
 
 #include <iomanip>
 #include <sstream>
+#include <syncstream>
 #include <utility>
 
 namespace sim {
@@ -37,7 +38,8 @@ void WireLog::Row(std::string_view direction, std::span<const std::uint8_t> byte
     row << ' ' << note;
   }
   row << '\n';
-  *out_ << row.str() << std::flush;
+  // Devices on threads of their own may share the stream.
+  std::osyncstream(*out_) << row.str() << std::flush;
 }
 
 }  // namespace sim

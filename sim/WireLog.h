@@ -15,7 +15,7 @@ namespace sim {
 /// last byte.
 class WireLog {
  public:
-  /// Without a stream nothing is written. `out` must outlive the log.
+  /// Without a stream nothing is written. `out` must outlive the log; logs of several devices may share it.
   WireLog(std::ostream* out, std::string device);
 
   void ToHost(std::span<const std::uint8_t> bytes);

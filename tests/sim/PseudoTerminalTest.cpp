@@ -74,6 +74,20 @@ TEST(PseudoTerminal, NeverSendsAByteBeforeItsLastBitIsThrough) {
   }
 }
 
+TEST(PseudoTerminal, KeepsToANewSpeedFromItsChangeOn) {
+  PseudoTerminal line(115200, Pace::AsWired);
+  RawHost host(line.SlavePath());
+  line.SetBaud(1200);
+  const Clock::time_point start = Clock::now();
+  line.Write(Bytes(6, 0x55));
+  EXPECT_GE(Clock::now() - start, WireTime(6, 1200));
+  host.Write(Bytes(6, 0x55));
+  for (std::size_t i = 7; i <= 12; ++i) {
+    EXPECT_EQ(line.ReadByte(limit), 0x55);
+    EXPECT_GE(Clock::now() - start, WireTime(i, 1200)) << "byte " << i;
+  }
+}
+
 TEST(PseudoTerminal, ReceivesNoFasterThanTheLineCarries) {
   PseudoTerminal line(19200, Pace::AsWired);
   RawHost host(line.SlavePath());

@@ -21,6 +21,10 @@ TEST(VenueOptions, StandForAFaultlessGameOfFortyWhenNoneIsGiven) {
   EXPECT_EQ(options.LogFile, std::nullopt);
   EXPECT_EQ(options.FramesFile, std::nullopt);
   EXPECT_EQ(options.Link, std::nullopt);
+  EXPECT_FALSE(options.OneWire);
+  EXPECT_EQ(options.AdapterFailure, OneWireFailure::None);
+  EXPECT_EQ(options.AdapterFailurePlace, 1U);
+  EXPECT_EQ(options.AdapterLink, std::nullopt);
   EXPECT_FALSE(options.UntilEof);
   EXPECT_FALSE(options.Help);
 }
@@ -42,9 +46,21 @@ TEST(VenueOptions, TakeEveryOption) {
   EXPECT_TRUE(options.Help);
 }
 
+TEST(VenueOptions, TakeEveryOptionOfTheOneWireAdapter) {
+  const VenueOptions options = ParseVenueOptions(
+      {"--onewire", "--onewire-failure", "contact-lost", "--onewire-at", "12", "--onewire-link", "reader"});
+  EXPECT_TRUE(options.OneWire);
+  EXPECT_EQ(options.AdapterFailure, OneWireFailure::ContactLost);
+  EXPECT_EQ(options.AdapterFailurePlace, 12U);
+  EXPECT_EQ(options.AdapterLink, "reader");
+}
+
 TEST(VenueOptions, KnowEveryFailureByItsName) {
   for (const BaseUnitFailureInfo& info : BaseUnitFailures) {
     EXPECT_EQ(ParseVenueOptions({"--failure", std::string(info.Name)}).Failure, info.Failure);
+  }
+  for (const OneWireFailureInfo& info : OneWireFailures) {
+    EXPECT_EQ(ParseVenueOptions({"--onewire-failure", std::string(info.Name)}).AdapterFailure, info.Failure);
   }
 }
 
@@ -66,6 +82,10 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--failure", ""},
                                                       {"--log", ""},
                                                       {"--frames"},
+                                                      {"--onewire-failure", "wrong_crc"},
+                                                      {"--onewire-failure", "count-zero"},
+                                                      {"--onewire-at", "-1"},
+                                                      {"--onewire-link", ""},
                                                       {"--link", ""}};
   for (const std::vector<std::string>& arguments : refused) {
     EXPECT_THROW(ParseVenueOptions(arguments), std::invalid_argument) << testing::PrintToString(arguments);
@@ -84,10 +104,14 @@ TEST(VenueOptions, SayWhatIsWrong) {
 TEST(VenueOptions, AreAllToldByTheHelp) {
   const std::string usage = VenueUsage();
   for (const char* option : {"--players", "--seed", "--fast", "--failure", "--at", "--log", "--frames",
-                             "--link", "--games", "--until-eof", "--help"}) {
+                             "--link", "--games", "--onewire ", "--onewire-link", "--onewire-failure",
+                             "--onewire-at", "--until-eof", "--help", "touch ID", "leave ID"}) {
     EXPECT_THAT(usage, HasSubstr(option));
   }
   for (const BaseUnitFailureInfo& info : BaseUnitFailures) {
+    EXPECT_THAT(usage, HasSubstr(std::string(info.Name) + " "));
+  }
+  for (const OneWireFailureInfo& info : OneWireFailures) {
     EXPECT_THAT(usage, HasSubstr(std::string(info.Name) + " "));
   }
 }

@@ -82,14 +82,23 @@ VenueProcess::~VenueProcess() {
   }
 }
 
-std::string VenueProcess::ReadDevice() {
-  const std::string title = "base unit: ";
+std::string VenueProcess::ReadDevice(const std::string& title) {
+  const std::string begin = title + ": ";
+  const std::string line = ReadLine();
+  EXPECT_EQ(line.substr(0, begin.size()), begin) << (line.empty() ? RestOfErrors() : "");
+  return line.size() < begin.size() ? "" : line.substr(begin.size());
+}
+
+std::string VenueProcess::ReadLine() {
   std::string line = ReadTo(output_, '\n');
-  EXPECT_EQ(line.substr(0, title.size()), title) << RestOfErrors();
-  if (line.size() < title.size() + 1) {
-    return {};
+  if (!line.empty()) {
+    line.pop_back();
   }
-  return line.substr(title.size(), line.size() - title.size() - 1);
+  return line;
+}
+
+void VenueProcess::WriteInput(const std::string& text) {
+  EXPECT_EQ(::write(input_.Get(), text.data(), text.size()), static_cast<ssize_t>(text.size()));
 }
 
 void VenueProcess::Signal(int signal) {

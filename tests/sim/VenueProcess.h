@@ -17,8 +17,11 @@ class VenueProcess {
   VenueProcess(const VenueProcess&) = delete;
   VenueProcess& operator=(const VenueProcess&) = delete;
 
-  /// The device of the line "base unit: DEVICE"; fails the running test when another line or none comes.
-  std::string ReadDevice();
+  /// The device of the line "TITLE: DEVICE"; fails the running test when another line or none comes.
+  std::string ReadDevice(const std::string& title = "base unit");
+  /// The next line of the output, without its end.
+  std::string ReadLine();
+  void WriteInput(const std::string& text);
   void Signal(int signal);
   void CloseInput() { input_.Close(); }
   bool IsRunning();

@@ -8,6 +8,7 @@
 
 #include "sim/BaseUnitAnswer.h"
 #include "sim/GameMaker.h"
+#include "tests/sim/AdapterHost.h"
 #include "tests/sim/RawHost.h"
 #include "tests/sim/VenueProcess.h"
 
@@ -130,6 +131,73 @@ TEST_F(VenueProgram, ExitsWhenItsLineHasBeenPulledOut) {
   EXPECT_FALSE(fs::is_symlink(fs::symlink_status(File("port"))));
 }
 
+const Bytes readRom{0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3};
+
+TEST_F(VenueProgram, HoldsButtonsToTheReaderAndTakesThemAwayOnCommand) {
+  VenueProcess venue({"--fast", "--onewire", "--onewire-failure", "no-own-device"});
+  venue.ReadDevice();
+  AdapterHost host(venue.ReadDevice("1-wire adapter"));
+  EXPECT_EQ(host.Ask({0xC1}, 1), Bytes{0xCF});
+  venue.WriteInput("touch EFCDAB8967452301\n");
+  EXPECT_EQ(venue.ReadLine(), "touched EFCDAB8967452301");
+  EXPECT_EQ(host.Ask(readRom, 10), (Bytes{0xCD, 0x33, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF}));
+  venue.WriteInput("nonsense\n\nleave\n");
+  EXPECT_EQ(venue.ReadLine(), "left");
+  EXPECT_EQ(host.Ask({0xC1}, 1), Bytes{0xCF});
+  venue.Signal(SIGTERM);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_EQ(venue.RestOfErrors(), "tessarine-venue: There is no command \"nonsense\"\n");
+}
+
+TEST_F(VenueProgram, KeepsItsButtonsWhenItsInputEnds) {
+  VenueProcess venue({"--fast", "--onewire", "--players", "2"});
+  const std::string baseUnit = venue.ReadDevice();
+  AdapterHost host(venue.ReadDevice("1-wire adapter"));
+  venue.WriteInput("touch A200000001B81C02");
+  venue.CloseInput();
+  EXPECT_EQ(venue.ReadLine(), "touched A200000001B81C02");
+  EXPECT_EQ(host.Search(Bytes(16, 0x00)).at(2), 0x09);
+  Download(baseUnit, MakeBaseUnitAnswer(MakeGame(2, 1)));
+  EXPECT_TRUE(venue.IsRunning());
+}
+
+TEST_F(VenueProgram, EndsWithItsInputWhenToldAlsoWithButtons) {
+  VenueProcess venue({"--fast", "--onewire", "--until-eof"});
+  venue.ReadDevice();
+  venue.ReadDevice("1-wire adapter");
+  venue.WriteInput("touch A200000001B81C02\n");
+  EXPECT_EQ(venue.ReadLine(), "touched A200000001B81C02");
+  EXPECT_TRUE(venue.IsRunning());
+  venue.CloseInput();
+  EXPECT_EQ(venue.WaitForExit(), 0);
+}
+
+TEST_F(VenueProgram, LinksTheReaderAndLogsItBesideTheBaseUnit) {
+  VenueProcess venue(
+      {"--fast", "--players", "0", "--onewire", "--onewire-link", File("reader"), "--log", File("log")});
+  const std::string baseUnit = venue.ReadDevice();
+  EXPECT_EQ(fs::read_symlink(File("reader")), venue.ReadDevice("1-wire adapter"));
+  AdapterHost host(File("reader"));
+  EXPECT_EQ(host.Ask({0x17}, 1), Bytes{0x16});
+  Download(baseUnit, MakeBaseUnitAnswer({}));
+  venue.Signal(SIGTERM);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_FALSE(fs::is_symlink(fs::symlink_status(File("reader"))));
+  EXPECT_THAT(Content(File("log")), HasSubstr("1-wire -> 16\n"));
+  EXPECT_THAT(Content(File("log")), HasSubstr("base-unit -> 00\n"));
+}
+
+TEST_F(VenueProgram, ServesTheBaseUnitOnWhenTheReaderHasBeenPulledOut) {
+  VenueProcess venue({"--fast", "--players", "2", "--onewire", "--onewire-failure", "hang-up"});
+  const std::string baseUnit = venue.ReadDevice();
+  AdapterHost host(venue.ReadDevice("1-wire adapter"));
+  host.Write({0x17});
+  host.ReadUntilHangUp();
+  EXPECT_TRUE(host.HungUp());
+  Download(baseUnit, MakeBaseUnitAnswer(MakeGame(2, 1)));
+  EXPECT_TRUE(venue.IsRunning());
+}
+
 TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
   const std::vector<std::vector<std::string>> refused{
       {"--players", "225"},
@@ -137,6 +205,7 @@ TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
       {"--nonsense"},
       {"--failure", "wrong-crc", "--at", "41"},
       {"--failure", "wrong-crc", "--at", "0"},
+      {"--onewire", "--onewire-failure", "contact-lost", "--onewire-at", "65"},
       {"--failure", "hang-up", "--players", "0"},
       {"--failure", "silence", "--players", "0", "--at", "2"}};
   for (const std::vector<std::string>& arguments : refused) {
