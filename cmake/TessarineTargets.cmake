@@ -9,8 +9,9 @@ target_compile_definitions(tessarine_options INTERFACE
   QT_NO_CAST_FROM_ASCII QT_NO_CAST_TO_ASCII QT_NO_URL_CAST_FROM_STRING QT_NO_NARROWING_CONVERSIONS_IN_CONNECT
   QT_NO_FOREACH QT_USE_QSTRINGBUILDER)
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
-  # gcc 12 reports null dereferences inside the standard library's own string code when it inlines it.
-  target_compile_options(tessarine_options INTERFACE -Wno-null-dereference -Wno-restrict)
+  # gcc 12 reports faults inside the standard library's own code when it inlines strings and vectors.
+  target_compile_options(tessarine_options INTERFACE
+    -Wno-null-dereference -Wno-restrict -Wno-array-bounds -Wno-stringop-overflow)
 endif()
 if(TESSARINE_SANITIZE)
   target_compile_options(tessarine_options INTERFACE
