@@ -11,7 +11,7 @@ target_compile_definitions(tessarine_options INTERFACE
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
   # gcc 12 reports faults inside the standard library's own code when it inlines strings and vectors.
   target_compile_options(tessarine_options INTERFACE
-    -Wno-null-dereference -Wno-restrict -Wno-array-bounds -Wno-stringop-overflow)
+    -Wno-null-dereference -Wno-restrict -Wno-array-bounds -Wno-stringop-overflow -Wno-stringop-overread)
 endif()
 if(TESSARINE_SANITIZE)
   target_compile_options(tessarine_options INTERFACE
