@@ -217,6 +217,8 @@ void OfficeDocument::Store(const std::string& path, const char* filter) {
 
 void OfficeDocument::PrintOut() {
   Uno::Call([&] {
+    // LibreOffice looks for printers in the background; asking for the list makes it wait until it has them.
+    services_.Printers->getPrinterNames();
     // Where the system has no printer, this one stands for it and swallows what it is given.
     const OUString printer = services_.Printers->getDefaultPrinterName();
     if (printer.isEmpty() || printer == "Generic Printer") {
