@@ -43,9 +43,6 @@ void RadioModem::Run() {
     }
     sender_.SendDue();
   }
-  if (settings_.OnFinished) {
-    settings_.OnFinished();
-  }
 }
 
 void RadioModem::Take(std::uint8_t byte) {
@@ -116,6 +113,9 @@ void RadioModem::CopyScores(const RadioGun& gun) {
 
 void RadioModem::NoteSent(const LinePiece& piece) {
   log_.ToHost(piece.Bytes);
+  if (piece.LineEndsBehind) {
+    log_.Note("line pulled out");
+  }
   const std::scoped_lock lock(mutex_);
   traffic_.BytesToHost += piece.Bytes.size();
 }

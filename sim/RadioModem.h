@@ -4,7 +4,6 @@
 #include <condition_variable>
 #include <cstddef>
 #include <cstdint>
-#include <functional>
 #include <mutex>
 #include <ostream>
 #include <set>
@@ -26,9 +25,8 @@ struct RadioModemSettings {
   std::vector<RadioGun> Guns{};  ///< those in range; distinct player ids and addresses
   RadioTroubleSettings Trouble{};
   Pace LinePace = Pace::AsWired;
-  std::ostream* Log = nullptr;            ///< gets both directions of the line
-  std::ostream* Frames = nullptr;         ///< gets a gun's scores, CRC included, when they are first closed
-  std::function<void()> OnFinished = {};  ///< called on the modem's thread when it serves no more
+  std::ostream* Log = nullptr;     ///< gets both directions of the line
+  std::ostream* Frames = nullptr;  ///< gets a gun's scores, CRC included, when they are first closed
 };
 
 /// What has passed the line.
