@@ -24,7 +24,7 @@ std::vector<RadioGun> MakeRadioGuns(const std::vector<GunScores>& game,
     const unsigned id = scores.PlayerId;
     RadioGun gun;
     gun.PlayerId = scores.PlayerId;
-    gun.Address = addressBase + (id * 151U % 256U) * 256U + id;
+    gun.Address = addressBase + std::uint64_t{id} * 151U % 256U * 256U + id;
     gun.FirmwareMajor = id % 16 == 0 ? 1 : 2;
     gun.FirmwareMinor = static_cast<std::uint8_t>(id % 3 + 9);
     gun.Battery = static_cast<std::uint8_t>(100 - id * 37U % 91U);
