@@ -60,16 +60,32 @@ PseudoTerminal::PseudoTerminal(int baud, Pace pace)
   wakeWriter_ = FileDescriptor(wake[1]);
 }
 
-std::optional<std::uint8_t> PseudoTerminal::ReadByte(std::optional<std::chrono::milliseconds> timeout) {
-  std::uint8_t byte = 0;
-  if (!WaitFor(POLLIN, timeout) || ::read(master_.Get(), &byte, 1) != 1) {
-    return std::nullopt;
+std::optional<std::uint8_t> PseudoTerminal::ReadByte(std::optional<std::chrono::nanoseconds> timeout) {
+  std::optional<Clock::time_point> deadline;
+  if (timeout) {
+    deadline = Clock::now() + *timeout;
   }
-  if (IsPaced()) {
-    inputFree_ = std::max(inputFree_, Clock::now()) + DurationOf(1);
-    std::this_thread::sleep_until(inputFree_);
+  while (IsUp() && TakeArrivals()) {
+    const Clock::time_point now = Clock::now();
+    std::optional<Clock::time_point> wake = deadline;
+    if (!arrivals_.empty()) {
+      const Arrival next = arrivals_.front();
+      if (next.Through <= now) {
+        arrivals_.pop_front();
+        return next.Byte;
+      }
+      wake = deadline ? std::min(*deadline, next.Through) : next.Through;
+    }
+    if (deadline && *deadline <= now) {
+      break;
+    }
+    if (wake) {
+      WaitFor(POLLIN, *wake - now);
+    } else {
+      WaitFor(POLLIN, std::nullopt);
+    }
   }
-  return byte;
+  return std::nullopt;
 }
 
 std::size_t PseudoTerminal::Write(std::span<const std::uint8_t> bytes) {
@@ -84,6 +100,11 @@ std::size_t PseudoTerminal::Write(std::span<const std::uint8_t> bytes) {
     }
   }
   return bytes.size();
+}
+
+std::size_t PseudoTerminal::Put(std::span<const std::uint8_t> bytes) {
+  const ssize_t written = IsUp() ? ::write(master_.Get(), bytes.data(), bytes.size()) : 0;
+  return written > 0 ? static_cast<std::size_t>(written) : 0;
 }
 
 std::size_t PseudoTerminal::WriteTorn(std::span<const std::uint8_t> bytes) {
@@ -118,23 +139,43 @@ void PseudoTerminal::Interrupt() {
 }
 
 std::chrono::nanoseconds PseudoTerminal::DurationOf(std::size_t bytes) const {
+  if (!IsPaced()) {
+    return std::chrono::nanoseconds(0);
+  }
   constexpr std::int64_t nanosecondsOfTenBits = 10'000'000'000;
   // Rounded up once for the whole run of bytes: rounding each byte's share would let the error add up.
   return std::chrono::nanoseconds((static_cast<std::int64_t>(bytes) * nanosecondsOfTenBits + baud_ - 1) /
                                   baud_);
 }
 
+// Notes when the bytes that have come will be through. False when the line has ended.
+bool PseudoTerminal::TakeArrivals() {
+  std::array<std::uint8_t, 256> bytes{};
+  for (;;) {
+    const ssize_t count = ::read(master_.Get(), bytes.data(), bytes.size());
+    if (count <= 0) {
+      return count < 0 && (errno == EAGAIN || errno == EINTR);
+    }
+    for (const std::uint8_t byte : std::span(bytes).first(static_cast<std::size_t>(count))) {
+      inputFree_ = std::max(inputFree_, Clock::now()) + DurationOf(1);
+      arrivals_.push_back({byte, inputFree_});
+    }
+  }
+}
+
 // True when one of `events`, or the client's closing, came before the time-out and no interruption did.
-bool PseudoTerminal::WaitFor(short events, std::optional<std::chrono::milliseconds> timeout) {
-  const Clock::time_point deadline = Clock::now() + timeout.value_or(std::chrono::milliseconds(0));
-  while (!interrupted_ && master_.IsOpen()) {
-    int wait = -1;
+bool PseudoTerminal::WaitFor(short events, std::optional<std::chrono::nanoseconds> timeout) {
+  const Clock::time_point deadline = Clock::now() + timeout.value_or(std::chrono::nanoseconds(0));
+  while (IsUp()) {
+    timespec left{};
     if (timeout) {
-      const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - Clock::now());
-      wait = static_cast<int>(std::max<std::int64_t>(left.count(), 0));
+      const std::int64_t nanoseconds =
+          std::max<std::int64_t>(std::chrono::nanoseconds(deadline - Clock::now()).count(), 0);
+      left.tv_sec = nanoseconds / std::nano::den;
+      left.tv_nsec = nanoseconds % std::nano::den;
     }
     std::array<pollfd, 2> watched{pollfd{master_.Get(), events, 0}, pollfd{wakeReader_.Get(), POLLIN, 0}};
-    const int ready = ::poll(watched.data(), watched.size(), wait);
+    const int ready = ::ppoll(watched.data(), watched.size(), timeout ? &left : nullptr, nullptr);
     if (ready > 0) {
       return watched[1].revents == 0;
     }

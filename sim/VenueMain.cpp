@@ -25,6 +25,8 @@
 #include "sim/GameMaker.h"
 #include "sim/LineInput.h"
 #include "sim/OneWireAdapter.h"
+#include "sim/RadioGun.h"
+#include "sim/RadioModem.h"
 #include "sim/VenueOptions.h"
 
 namespace {
@@ -103,6 +105,38 @@ void ObeyAndTell(sim::OneWireAdapter& adapter, const std::string& line) {
   }
 }
 
+// The radio modem with its link and the copy of its guns' frames.
+class ServedModem {
+ public:
+  ServedModem(const sim::VenueOptions& options, sim::Pace pace, std::ostream* log)
+      : frames_(OpenOutput(options.RadioFramesFile)),
+        modem_({.Guns =
+                    sim::MakeRadioGuns(sim::MakeGame(options.Players, options.Seed), options.RadioAnswerTime),
+                .Trouble = options.RadioTrouble,
+                .LinePace = pace,
+                .Log = log,
+                .Frames = frames_ ? &*frames_ : nullptr}) {
+    if (options.RadioLink) {
+      link_.emplace(*options.RadioLink, modem_.DevicePath());
+    }
+  }
+
+  const std::string& DevicePath() const { return modem_.DevicePath(); }
+
+  void TellFaults() const {
+    const std::vector<std::string> faults = modem_.Traffic().Faults;
+    for (const std::string& fault : faults) {
+      std::cerr << "radio modem: the host sent " << fault << '\n';
+    }
+    std::cerr << "radio modem: faults of the host: " << faults.size() << '\n';
+  }
+
+ private:
+  std::optional<std::ofstream> frames_;
+  sim::RadioModem modem_;
+  std::optional<sim::DeviceLink> link_;
+};
+
 void Serve(const sim::VenueOptions& options, sim::BaseUnitAnswer answer) {
   const sim::FileDescriptor endSignals = CatchEndSignals();
   const sim::FileDescriptor finished(::eventfd(0, EFD_CLOEXEC));
@@ -135,11 +169,21 @@ void Serve(const sim::VenueOptions& options, sim::BaseUnitAnswer answer) {
     }
     obey = [&adapter = *oneWire](const std::string& line) { ObeyAndTell(adapter, line); };
   }
+  std::optional<ServedModem> modem;
+  if (options.Radio) {
+    modem.emplace(options, pace, log ? &*log : nullptr);
+  }
   std::cout << "base unit: " << baseUnit.DevicePath() << std::endl;
   if (oneWire) {
     std::cout << "1-wire adapter: " << oneWire->DevicePath() << std::endl;
   }
+  if (modem) {
+    std::cout << "radio modem: " << modem->DevicePath() << std::endl;
+  }
   WaitForEnd(endSignals, finished, options.UntilEof, obey);
+  if (modem) {
+    modem->TellFaults();
+  }
 }
 
 }  // namespace

@@ -44,6 +44,15 @@ OneWireFailure ParseOneWireFailure(const std::string& name) {
   return info->Failure;
 }
 
+RadioFailure ParseRadioFailure(const std::string& name) {
+  const auto* info = std::find_if(RadioFailures.begin(), RadioFailures.end(),
+                                  [&](const RadioFailureInfo& candidate) { return candidate.Name == name; });
+  if (info == RadioFailures.end()) {
+    throw std::invalid_argument("The radio has no failure \"" + name + "\"");
+  }
+  return info->Failure;
+}
+
 std::string ParseFile(const std::string& option, const std::string& text) {
   if (text.empty()) {
     throw std::invalid_argument(option + " wants a file name");
@@ -56,7 +65,7 @@ struct ValueOption {
   void (*Take)(VenueOptions& options, const std::string& name, const std::string& value);
 };
 
-constexpr std::array<ValueOption, 11> valueOptions{{
+constexpr std::array<ValueOption, 17> valueOptions{{
     {"--players", [](VenueOptions& options, const std::string& name,
                      const std::string& value) { options.Players = ParseNumber(name, value, 224); }},
     {"--seed",
@@ -87,6 +96,26 @@ constexpr std::array<ValueOption, 11> valueOptions{{
      }},
     {"--onewire-link", [](VenueOptions& options, const std::string& name,
                           const std::string& value) { options.AdapterLink = ParseFile(name, value); }},
+    {"--radio-failure",
+     [](VenueOptions& options, const std::string&, const std::string& value) {
+       options.RadioTrouble.Failure = ParseRadioFailure(value);
+     }},
+    {"--radio-at",
+     [](VenueOptions& options, const std::string& name, const std::string& value) {
+       options.RadioTrouble.Gun = ParseNumber(name, value, std::size_t{224});
+     }},
+    {"--radio-times",
+     [](VenueOptions& options, const std::string& name, const std::string& value) {
+       options.RadioTrouble.Times = ParseNumber(name, value, 1'000'000);
+     }},
+    {"--radio-answer-time",
+     [](VenueOptions& options, const std::string& name, const std::string& value) {
+       options.RadioAnswerTime = std::chrono::milliseconds(ParseNumber(name, value, 10'000));
+     }},
+    {"--radio-frames", [](VenueOptions& options, const std::string& name,
+                          const std::string& value) { options.RadioFramesFile = ParseFile(name, value); }},
+    {"--radio-link", [](VenueOptions& options, const std::string& name,
+                        const std::string& value) { options.RadioLink = ParseFile(name, value); }},
 }};
 
 }  // namespace
@@ -102,6 +131,8 @@ VenueOptions ParseVenueOptions(const std::vector<std::string>& arguments) {
       options.Fast = true;
     } else if (name == "--onewire") {
       options.OneWire = true;
+    } else if (name == "--radio") {
+      options.Radio = true;
     } else if (name == "--until-eof") {
       options.UntilEof = true;
     } else if (name == "--help") {
@@ -139,6 +170,15 @@ std::string VenueUsage() {
           "  --onewire-link PATH     as --link, to the reader's device\n"
           "  --onewire-failure NAME  what goes wrong at the reader, see below (none)\n"
           "  --onewire-at K          the byte or bit that its failure concerns, from 1 (1)\n"
+          "  --radio         serve the radio modem and the guns too; prints \"radio modem: DEVICE\"; tells "
+          "at\n"
+          "                  the end on the standard error what the host must not have sent\n"
+          "  --radio-link PATH       as --link, to the radio modem's device\n"
+          "  --radio-frames FILE     as --frames, a gun's frame when the host first closes its transfer\n"
+          "  --radio-failure NAME    what goes wrong by radio, see below (none)\n"
+          "  --radio-at K            the gun that it strikes, from 1 by player ids; 0: every gun (1)\n"
+          "  --radio-times N         how many of a gun's answers it strikes; 0: all (0)\n"
+          "  --radio-answer-time MS  milliseconds in which a gun answers (5)\n"
           "  --until-eof     end when the standard input ends\n"
           "  --help          this text\n\n"
           "Failures:\n";
@@ -147,6 +187,10 @@ std::string VenueUsage() {
   }
   text << "\nFailures at the reader of membership buttons:\n";
   for (const OneWireFailureInfo& info : OneWireFailures) {
+    text << "  " << std::left << std::setw(25) << info.Name << info.Meaning << '\n';
+  }
+  text << "\nFailures by radio:\n";
+  for (const RadioFailureInfo& info : RadioFailures) {
     text << "  " << std::left << std::setw(25) << info.Name << info.Meaning << '\n';
   }
   text << "\nCommands:\n"

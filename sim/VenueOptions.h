@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <cstddef>
 #include <cstdint>
 #include <optional>
@@ -8,6 +9,7 @@
 
 #include "sim/BaseUnitFailure.h"
 #include "sim/OneWireFailure.h"
+#include "sim/RadioTrouble.h"
 
 namespace sim {
 
@@ -26,6 +28,11 @@ struct VenueOptions {
   OneWireFailure AdapterFailure = OneWireFailure::None;
   std::size_t AdapterFailurePlace = 1;  ///< byte or bit, from 1
   std::optional<std::string> AdapterLink;
+  bool Radio = false;  ///< serve the radio modem and its guns too
+  RadioTroubleSettings RadioTrouble;
+  std::chrono::milliseconds RadioAnswerTime{5};  ///< of each gun
+  std::optional<std::string> RadioFramesFile;
+  std::optional<std::string> RadioLink;
   bool UntilEof = false;
   bool Help = false;
 };

@@ -18,6 +18,10 @@ void WireLog::FromHost(std::uint8_t byte, std::string_view note) {
   Row("<-", {&byte, 1}, note);
 }
 
+void WireLog::FromHost(std::span<const std::uint8_t> bytes, std::string_view note) {
+  Row("<-", bytes, note);
+}
+
 void WireLog::Note(std::string_view note) {
   Row("--", {}, note);
 }

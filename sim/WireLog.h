@@ -20,6 +20,7 @@ class WireLog {
 
   void ToHost(std::span<const std::uint8_t> bytes);
   void FromHost(std::uint8_t byte, std::string_view note = {});
+  void FromHost(std::span<const std::uint8_t> bytes, std::string_view note);
   /// A row without bytes, for what the device does to the line itself.
   void Note(std::string_view note);
 

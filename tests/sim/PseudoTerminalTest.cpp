@@ -99,6 +99,50 @@ TEST(PseudoTerminal, ReceivesNoFasterThanTheLineCarries) {
   }
 }
 
+TEST(PseudoTerminal, HoldsAByteBackUntilItsLastBitIsThroughHoweverOftenAsked) {
+  PseudoTerminal line(300, Pace::AsWired);
+  RawHost host(line.SlavePath());
+  const Clock::time_point start = Clock::now();
+  host.Write({1});
+  std::optional<std::uint8_t> byte;
+  while (!byte && Clock::now() - start < limit) {
+    byte = line.ReadByte(std::chrono::microseconds(100));
+  }
+  EXPECT_EQ(byte, 1);
+  EXPECT_GE(Clock::now() - start, WireTime(1, 300));
+}
+
+TEST(PseudoTerminal, LetsBytesOfOneWriteFollowWithoutGapsHoweverLateTheyAreAskedFor) {
+  PseudoTerminal line(19200, Pace::AsWired);
+  RawHost host(line.SlavePath());
+  host.Write(AllByteValues());
+  EXPECT_EQ(line.ReadByte(limit), 0);
+  std::this_thread::sleep_for(WireTime(256, 19200));
+  for (std::size_t i = 1; i < 256; ++i) {
+    EXPECT_EQ(line.ReadByte(std::chrono::nanoseconds(0)), static_cast<std::uint8_t>(i));
+  }
+}
+
+TEST(PseudoTerminal, LosesWhatAClientThatDoesNotReadHasNoRoomFor) {
+  PseudoTerminal line(19200, Pace::Fast);
+  RawHost host(line.SlavePath());
+  std::size_t taken = 0;
+  std::size_t given = 0;
+  while (taken == given && given < 10'000'000) {
+    taken += line.Put(AllByteValues());
+    given += 256;
+  }
+  EXPECT_LT(taken, given);
+  EXPECT_EQ(host.Read(taken).size(), taken);
+  EXPECT_EQ(line.Put(Bytes{7}), 1U);
+  EXPECT_EQ(host.Read(1), Bytes{7});
+}
+
+TEST(PseudoTerminal, NeedsNoTimeForBytesOfALineThatIsNotPaced) {
+  EXPECT_EQ(PseudoTerminal(19200, Pace::Fast).DurationOf(5), std::chrono::nanoseconds(0));
+  EXPECT_EQ(PseudoTerminal(57600, Pace::AsWired).DurationOf(144), std::chrono::milliseconds(25));
+}
+
 TEST(PseudoTerminal, WaitsForAClientThatReadsSlowerThanItSends) {
   PseudoTerminal line(19200, Pace::Fast);
   RawHost host(line.SlavePath());
@@ -129,6 +173,8 @@ TEST(PseudoTerminal, HangsUpOnTheClient) {
   EXPECT_TRUE(host.HungUp());
   EXPECT_EQ(line.ReadByte(), std::nullopt);
   EXPECT_EQ(line.Write(Bytes{1}), 0U);
+  EXPECT_EQ(line.Put(Bytes{1}), 0U);
+  EXPECT_FALSE(line.IsUp());
 }
 
 TEST(PseudoTerminal, LetsTheClientCloseFirst) {

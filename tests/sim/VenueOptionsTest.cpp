@@ -25,6 +25,13 @@ TEST(VenueOptions, StandForAFaultlessGameOfFortyWhenNoneIsGiven) {
   EXPECT_EQ(options.AdapterFailure, OneWireFailure::None);
   EXPECT_EQ(options.AdapterFailurePlace, 1U);
   EXPECT_EQ(options.AdapterLink, std::nullopt);
+  EXPECT_FALSE(options.Radio);
+  EXPECT_EQ(options.RadioTrouble.Failure, RadioFailure::None);
+  EXPECT_EQ(options.RadioTrouble.Gun, 1U);
+  EXPECT_EQ(options.RadioTrouble.Times, 0);
+  EXPECT_EQ(options.RadioAnswerTime, std::chrono::milliseconds(5));
+  EXPECT_EQ(options.RadioFramesFile, std::nullopt);
+  EXPECT_EQ(options.RadioLink, std::nullopt);
   EXPECT_FALSE(options.UntilEof);
   EXPECT_FALSE(options.Help);
 }
@@ -55,7 +62,25 @@ TEST(VenueOptions, TakeEveryOptionOfTheOneWireAdapter) {
   EXPECT_EQ(options.AdapterLink, "reader");
 }
 
+TEST(VenueOptions, TakeEveryOptionOfTheRadioModem) {
+  const VenueOptions options =
+      ParseVenueOptions({"--radio", "--radio-failure", "wrong-crc", "--radio-at", "0", "--radio-times", "2",
+                         "--radio-answer-time", "8", "--radio-frames", "guns.bin", "--radio-link", "modem"});
+  EXPECT_TRUE(options.Radio);
+  EXPECT_EQ(options.RadioTrouble.Failure, RadioFailure::WrongCrc);
+  EXPECT_EQ(options.RadioTrouble.Gun, 0U);
+  EXPECT_EQ(options.RadioTrouble.Times, 2);
+  EXPECT_EQ(options.RadioAnswerTime, std::chrono::milliseconds(8));
+  EXPECT_EQ(options.RadioFramesFile, "guns.bin");
+  EXPECT_EQ(options.RadioLink, "modem");
+  EXPECT_EQ(options.Failure, BaseUnitFailure::None);
+}
+
 TEST(VenueOptions, KnowEveryFailureByItsName) {
+  for (const RadioFailureInfo& info : RadioFailures) {
+    EXPECT_EQ(ParseVenueOptions({"--radio-failure", std::string(info.Name)}).RadioTrouble.Failure,
+              info.Failure);
+  }
   for (const BaseUnitFailureInfo& info : BaseUnitFailures) {
     EXPECT_EQ(ParseVenueOptions({"--failure", std::string(info.Name)}).Failure, info.Failure);
   }
@@ -86,6 +111,12 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--onewire-failure", "count-zero"},
                                                       {"--onewire-at", "-1"},
                                                       {"--onewire-link", ""},
+                                                      {"--radio-failure", "count-zero"},
+                                                      {"--radio-at", "225"},
+                                                      {"--radio-times", "-1"},
+                                                      {"--radio-answer-time", "10001"},
+                                                      {"--radio-frames", ""},
+                                                      {"--radio-link", ""},
                                                       {"--link", ""}};
   for (const std::vector<std::string>& arguments : refused) {
     EXPECT_THROW(ParseVenueOptions(arguments), std::invalid_argument) << testing::PrintToString(arguments);
@@ -103,12 +134,36 @@ TEST(VenueOptions, SayWhatIsWrong) {
 
 TEST(VenueOptions, AreAllToldByTheHelp) {
   const std::string usage = VenueUsage();
-  for (const char* option : {"--players", "--seed", "--fast", "--failure", "--at", "--log", "--frames",
-                             "--link", "--games", "--onewire ", "--onewire-link", "--onewire-failure",
-                             "--onewire-at", "--until-eof", "--help", "touch ID", "leave ID"}) {
+  for (const char* option : {"--players",
+                             "--seed",
+                             "--fast",
+                             "--failure",
+                             "--at",
+                             "--log",
+                             "--frames",
+                             "--link",
+                             "--games",
+                             "--onewire ",
+                             "--onewire-link",
+                             "--onewire-failure",
+                             "--onewire-at",
+                             "--radio ",
+                             "--radio-link",
+                             "--radio-frames",
+                             "--radio-failure",
+                             "--radio-at",
+                             "--radio-times",
+                             "--radio-answer-time",
+                             "--until-eof",
+                             "--help",
+                             "touch ID",
+                             "leave ID"}) {
     EXPECT_THAT(usage, HasSubstr(option));
   }
   for (const BaseUnitFailureInfo& info : BaseUnitFailures) {
+    EXPECT_THAT(usage, HasSubstr(std::string(info.Name) + " "));
+  }
+  for (const RadioFailureInfo& info : RadioFailures) {
     EXPECT_THAT(usage, HasSubstr(std::string(info.Name) + " "));
   }
   for (const OneWireFailureInfo& info : OneWireFailures) {

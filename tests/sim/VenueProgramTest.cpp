@@ -8,7 +8,9 @@
 
 #include "sim/BaseUnitAnswer.h"
 #include "sim/GameMaker.h"
+#include "sim/RadioAnswer.h"
 #include "tests/sim/AdapterHost.h"
+#include "tests/sim/RadioLiterals.h"
 #include "tests/sim/RawHost.h"
 #include "tests/sim/VenueProcess.h"
 
@@ -198,6 +200,76 @@ TEST_F(VenueProgram, ServesTheBaseUnitOnWhenTheReaderHasBeenPulledOut) {
   EXPECT_TRUE(venue.IsRunning());
 }
 
+class VenueByRadio : public VenueProgram {
+ protected:
+  static RadioGun FirstGun(int players) { return MakeRadioGuns(MakeGame(players, 1)).at(0); }
+
+  // The first gun of the game of `players` is searched and answers.
+  static void ExpectFound(RawHost& host, int players) {
+    const RadioGun gun = FirstGun(players);
+    host.Write(wire::MadeGood(wire::With(wire::SearchRed2, 15, gun.PlayerId)));
+    const Bytes answer = EncodeReceivedFrame(
+        gun.Address, AnswerPacket(gun, {.Command = GunCommand::Search, .PlayerId = gun.PlayerId}));
+    EXPECT_EQ(host.Read(answer.size()), answer);
+  }
+};
+
+TEST_F(VenueByRadio, ServesTheGunsOfItsGameBesideTheBaseUnit) {
+  VenueProcess venue({"--radio", "--players", "12", "--radio-link", File("port"), "--log", File("log")});
+  const std::string baseUnit = venue.ReadDevice();
+  const std::string modem = venue.ReadDevice("radio modem");
+  EXPECT_EQ(fs::read_symlink(File("port")), modem);
+  {
+    RawHost host(modem);
+    ExpectFound(host, 12);
+  }
+  Download(baseUnit, MakeBaseUnitAnswer(MakeGame(12, 1)));
+  venue.Signal(SIGTERM);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_EQ(venue.RestOfErrors(), "radio modem: faults of the host: 0\n");
+  EXPECT_FALSE(fs::is_symlink(fs::symlink_status(File("port"))));
+  EXPECT_THAT(Content(File("log")), HasSubstr("radio-modem -> 7E 00 14 80"));
+}
+
+TEST_F(VenueByRadio, TellsTheFaultsOfTheHost) {
+  VenueProcess venue({"--radio", "--players", "3", "--fast"});
+  venue.ReadDevice();
+  RawHost host(venue.ReadDevice("radio modem"));
+  host.Write(wire::With(wire::SearchRed2, 19, 0));
+  ExpectFound(host, 3);
+  venue.Signal(SIGINT);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_EQ(venue.RestOfErrors(),
+            "radio modem: the host sent a wrong checksum\nradio modem: faults of the host: 1\n");
+}
+
+TEST_F(VenueByRadio, CopiesTheFramesOfGunsThatWereClosed) {
+  VenueProcess venue({"--radio", "--players", "3", "--fast", "--radio-frames", File("frames")});
+  venue.ReadDevice();
+  RawHost host(venue.ReadDevice("radio modem"));
+  const RadioGun gun = FirstGun(3);
+  Bytes close = wire::CloseRed2;
+  close[11] = static_cast<std::uint8_t>(gun.Address >> 8 & 0xFF);
+  close[12] = gun.PlayerId;
+  close[15] = gun.PlayerId;
+  host.Write(wire::MadeGood(close));
+  EXPECT_EQ(host.Read(21).size(), 21U);
+  venue.Signal(SIGTERM);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_EQ(Content(File("frames")), std::string(gun.Frame.begin(), gun.Frame.end()));
+}
+
+TEST_F(VenueByRadio, GoesOnWithItsOtherDevicesWhenTheModemHasBeenPulledOut) {
+  VenueProcess venue({"--radio", "--players", "3", "--fast", "--radio-failure", "hang-up-in-search"});
+  const std::string baseUnit = venue.ReadDevice();
+  RawHost host(venue.ReadDevice("radio modem"));
+  host.Write(wire::MadeGood(wire::With(wire::SearchRed2, 15, FirstGun(3).PlayerId)));
+  host.ReadUntilHangUp();
+  EXPECT_TRUE(host.HungUp());
+  Download(baseUnit, MakeBaseUnitAnswer(MakeGame(3, 1)));
+  EXPECT_TRUE(venue.IsRunning());
+}
+
 TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
   const std::vector<std::vector<std::string>> refused{
       {"--players", "225"},
@@ -207,7 +279,8 @@ TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
       {"--failure", "wrong-crc", "--at", "0"},
       {"--onewire", "--onewire-failure", "contact-lost", "--onewire-at", "65"},
       {"--failure", "hang-up", "--players", "0"},
-      {"--failure", "silence", "--players", "0", "--at", "2"}};
+      {"--failure", "silence", "--players", "0", "--at", "2"},
+      {"--radio", "--radio-failure", "silent-gun", "--radio-at", "41"}};
   for (const std::vector<std::string>& arguments : refused) {
     VenueProcess venue(arguments);
     EXPECT_EQ(venue.WaitForExit(), 2) << testing::PrintToString(arguments);
