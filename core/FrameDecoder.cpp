@@ -2,6 +2,8 @@
 
 #include <string>
 
+#include "core/DallasId.h"
+
 namespace {
 
 /// Adds unless the sum leaves the 32-bit range.
@@ -63,13 +65,11 @@ void ReadCounters(FrameReader& frame, Player& player) {
 }
 
 std::string ReadDallasId(FrameReader& frame) {
-  constexpr const char* digits = "0123456789ABCDEF";
-  std::string text;
-  for (int i = 0; i < 8; ++i) {
-    const std::uint8_t byte = frame.Byte().value_or(0);
-    text.insert(0, {digits[byte >> 4], digits[byte & 15]});
+  std::array<std::uint8_t, 8> rom{};
+  for (std::uint8_t& byte : rom) {
+    byte = frame.Byte().value_or(0);
   }
-  return text;
+  return DallasIdOf(rom);
 }
 
 void ReadState(FrameReader& frame, Player& player) {

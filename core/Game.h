@@ -3,12 +3,10 @@
 #include <cstdint>
 #include <string>
 
+#include "core/DallasId.h"
 #include "core/OneBased.h"
 #include "core/PlayerId.h"
 #include "core/StringTable.h"
-
-/// `DallasID` of a player without a membership button.
-inline constexpr const char* NoDallasId = "0000000000000000";
 
 /// One gun's game. "Calculated" fields are written by the score analysis alone.
 struct Player {

@@ -1,0 +1,123 @@
+#pragma once
+
+#include <algorithm>
+#include <functional>
+#include <optional>
+#include <string>
+#include <tuple>
+#include <utility>
+#include <vector>
+
+#include "platform/OneWire.h"
+#include "platform/RuntimeError.h"
+
+/// A bus whose devices the test touches and takes away.
+class FakeOneWire : public OneWire {
+ public:
+  using Rom = std::array<std::uint8_t, 8>;
+
+  /// All operations in order, with what they were given: "TMExtendedStartSession 1 5", "TMNext", ...
+  std::vector<std::string> Log;
+
+  /// Port and kind of the settings.
+  std::optional<std::pair<std::int16_t, std::int16_t>> DefaultPort;
+
+  /// What a session gets as its handle.
+  std::int32_t Handle = 7;
+
+  /// Devices on the bus in the order in which a walk meets them.
+  std::vector<Rom> Devices;
+
+  /// This operation throws.
+  std::string Broken;
+
+  /// Run at the start of each operation, with its name; may touch a button.
+  std::function<void(const std::string&)> OnCall;
+
+  /// What the bus answers to a byte; by default the same.
+  std::function<std::uint8_t(std::uint8_t)> OnByte = [](std::uint8_t byte) { return byte; };
+
+  bool SessionOpen() const { return open_; }
+
+  std::int16_t TMReadDefaultPort(std::int16_t& port, std::int16_t& type) override {
+    Begin("TMReadDefaultPort");
+    if (!DefaultPort) {
+      return 0;
+    }
+    std::tie(port, type) = *DefaultPort;
+    return 1;
+  }
+
+  std::int32_t TMExtendedStartSession(std::int16_t port, std::int16_t type, std::int32_t reserved) override {
+    Begin("TMExtendedStartSession",
+          ' ' + std::to_string(port) + ' ' + std::to_string(type) + (reserved == 0 ? "" : " reserved"));
+    open_ = Handle > 0;
+    return Handle;
+  }
+
+  std::int16_t TMSetup(std::int32_t handle) override {
+    Begin("TMSetup");
+    return IsOpen(handle);
+  }
+
+  /// The walk counts in `Branch`.
+  std::int16_t TMNext(std::int32_t handle, OneWireState& state) override {
+    Begin("TMNext");
+    const auto next = static_cast<std::size_t>(state.Branch - OneWireState::None);
+    if (!open_ || handle != Handle || next >= Devices.size()) {
+      state = {};
+      return 0;
+    }
+    state.Found = true;
+    state.Rom = Devices[next];
+    ++state.Branch;
+    return 1;
+  }
+
+  std::int16_t TMRom(std::int32_t handle, OneWireState& state, OneWireRom& rom) override {
+    Begin("TMRom", rom[0] == 0 ? "" : " write");
+    std::copy(state.Rom.begin(), state.Rom.end(), rom.begin());
+    return IsOpen(handle);
+  }
+
+  std::int16_t TMAccess(std::int32_t handle, OneWireState& state) override {
+    Begin("TMAccess");
+    const bool there = std::find(Devices.begin(), Devices.end(), state.Rom) != Devices.end();
+    return there ? IsOpen(handle) : std::int16_t{0};
+  }
+
+  std::int16_t TMTouchByte(std::int32_t handle, std::uint8_t byte) override {
+    Begin("TMTouchByte", ' ' + std::to_string(byte));
+    return IsOpen(handle) == 1 ? OnByte(byte) : std::int16_t{255};
+  }
+
+  std::int16_t TMBlockStream(std::int32_t handle, std::span<std::uint8_t> bytes) override {
+    Begin("TMBlockStream", ' ' + std::to_string(bytes.size()));
+    for (std::uint8_t& byte : bytes) {
+      byte = OnByte(byte);
+    }
+    return IsOpen(handle);
+  }
+
+  std::int16_t TMEndSession(std::int32_t handle) override {
+    Begin("TMEndSession");
+    const std::int16_t result = IsOpen(handle);
+    open_ = false;
+    return result;
+  }
+
+ private:
+  void Begin(const std::string& operation, const std::string& details = {}) {
+    Log.push_back(operation + details);
+    if (const auto onCall = OnCall) {
+      onCall(operation);
+    }
+    if (operation == Broken) {
+      throw RuntimeError(53);
+    }
+  }
+
+  std::int16_t IsOpen(std::int32_t handle) const { return open_ && handle == Handle ? 1 : 0; }
+
+  bool open_ = false;
+};
