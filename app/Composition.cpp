@@ -7,6 +7,7 @@
 #include <QLocale>
 
 #include "app/frmRx.h"
+#include "core/FirstRun.h"
 #include "platform/ErrorReport.h"
 
 namespace {
@@ -42,9 +43,18 @@ std::string ModuleFolder() {
       .toStdString();
 }
 
+std::string SettingsFile(const Folders& folders) {
+  std::string folder;
+  folders.LocalAppData(folder);
+  return folder + UserDataSubfolder + "/tessarine.ini";
+}
+
 }  // namespace
 
-Composition::Composition() : strings_(LanguageOfSystem()), wordProcessor_(ModuleFolder()) {
+Composition::Composition()
+    : strings_(LanguageOfSystem()),
+      readerSettings_(files_, SettingsFile(folders_)),
+      wordProcessor_(ModuleFolder()) {
   if (strings_.TextLanguage() == Language::SimplifiedChinese &&
       dialogTexts_.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
     QCoreApplication::installTranslator(&dialogTexts_);
@@ -52,8 +62,8 @@ Composition::Composition() : strings_(LanguageOfSystem()), wordProcessor_(Module
 }
 
 ::Services Composition::Services() {
-  return {strings_, clock_,   databases_, old_,     events_, fileDialog_,
-          files_,   folders_, boxes_,     devices_, port_,   wordProcessor_};
+  return {strings_, clock_, databases_, old_,  events_, fileDialog_,   files_,
+          folders_, boxes_, devices_,   port_, wire_,   wordProcessor_};
 }
 
 void Composition::SetMainWindow(QWidget* window) {

@@ -5,6 +5,7 @@
 #include "app/ConversionWithProgress.h"
 #include "app/Services.h"
 #include "core/StringTable.h"
+#include "devices/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/qt/QtClock.h"
@@ -41,6 +42,9 @@ class Composition {
   QtMessageBoxes boxes_;
   QtSerialDevices devices_;
   QtSerialPort port_;
+  QtSerialPort readerPort_;
+  IniReader readerSettings_;
+  SerialOneWire wire_{readerPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
 };
 

@@ -9,6 +9,7 @@
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
 #include "platform/OldDatabases.h"
+#include "platform/OneWire.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
 #include "platform/WordProcessor.h"
@@ -26,5 +27,6 @@ struct Services {
   MessageBoxes& Boxes;
   const SerialDevices& Devices;
   SerialPort& MSComm1;
+  OneWire& Wire;
   ::WordProcessor& WordProcessor;
 };

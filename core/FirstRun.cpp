@@ -38,7 +38,7 @@ std::string PrepareUserDataFolder(const Folders& folders, Files& files, MessageB
       break;
   }
   CreateIfMissing(files, folder + "/Orvalin");
-  folder += "/Orvalin/Tessarine";
+  folder += UserDataSubfolder;
   CreateIfMissing(files, folder);
   for (const DefaultFile& file : DefaultFiles) {
     if (files.FileExists(folder + file.UserFile)) {

@@ -25,6 +25,7 @@
 #include "tests/fakes/FakeFileDialog.h"
 #include "tests/fakes/FakeFolders.h"
 #include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/fakes/FakeOneWire.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
 #include "tests/fakes/FakeWordProcessor.h"
@@ -74,8 +75,8 @@ class Venue {
     if (waits_ == Waits::Real) {
       events = &RealEvents;
     }
-    Window = std::make_unique<frmRx>(
-        ::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places, Boxes, Devices, Port, Word});
+    Window = std::make_unique<frmRx>(::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places,
+                                                Boxes, Devices, Port, Wire, Word});
     return *Window;
   }
 
@@ -166,6 +167,7 @@ class Venue {
   FakeMessageBoxes Boxes;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
+  FakeOneWire Wire;
   FakeWordProcessor Word;
   std::unique_ptr<frmRx> Window;
 
