@@ -3,8 +3,8 @@
 std::string DallasIdOf(const std::array<std::uint8_t, 8>& rom) {
   constexpr const char* digits = "0123456789ABCDEF";
   std::string text;
-  for (auto byte = rom.rbegin(); byte != rom.rend(); ++byte) {
-    text += {digits[*byte >> 4], digits[*byte & 15]};
+  for (const std::uint8_t byte : rom) {
+    text.insert(0, {digits[byte >> 4], digits[byte & 15]});
   }
   return text;
 }

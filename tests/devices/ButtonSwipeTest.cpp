@@ -172,7 +172,6 @@ TEST_P(ButtonSwipeLook, IsCaredFor) {
   ButtonSwipe window(wire, boxes, strings, nullptr);
   Show(window);
   ExpectCaredFor(window);
-    window.grab().save(folder + QString::number(int(GetParam())) + QStringLiteral(".png"));
 }
 
 INSTANTIATE_TEST_SUITE_P(Languages, ButtonSwipeLook,
