@@ -8,7 +8,9 @@
 
 #include "app/frmRx.h"
 #include "core/FirstRun.h"
+#include "devices/ButtonSwipe.h"
 #include "platform/ErrorReport.h"
+#include "platform/qt/DialogParent.h"
 
 namespace {
 
@@ -62,11 +64,29 @@ Composition::Composition()
 }
 
 ::Services Composition::Services() {
-  return {strings_, clock_, databases_, old_,  events_, fileDialog_,   files_,
-          folders_, boxes_, devices_,   port_, wire_,   wordProcessor_};
+  return {strings_,
+          clock_,
+          databases_,
+          old_,
+          events_,
+          fileDialog_,
+          files_,
+          folders_,
+          boxes_,
+          devices_,
+          port_,
+          wordProcessor_,
+          [this] { return SwipeButton(); }};
+}
+
+std::string Composition::SwipeButton() {
+  ButtonSwipe window(wire_, boxes_, strings_, DialogParent(mainWindow_));
+  window.exec();
+  return window.DallasID();
 }
 
 void Composition::SetMainWindow(QWidget* window) {
+  mainWindow_ = window;
   boxes_.SetMainWindow(window);
   fileDialog_.SetMainWindow(window);
 }

@@ -30,6 +30,8 @@ class Composition {
   MessageBoxes& Boxes() { return boxes_; }
 
  private:
+  std::string SwipeButton();
+
   StringTable strings_;
   QTranslator dialogTexts_;  ///< the toolkit's own texts ("OK", "File name:") in the program's language
   QtClock clock_;
@@ -46,6 +48,7 @@ class Composition {
   IniReader readerSettings_;
   SerialOneWire wire_{readerPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
+  QWidget* mainWindow_ = nullptr;
 };
 
 /// Name, icon and look of the application; call once before the first window.

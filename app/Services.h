@@ -1,5 +1,8 @@
 #pragma once
 
+#include <functional>
+#include <string>
+
 #include "core/StringTable.h"
 #include "platform/Clock.h"
 #include "platform/Database.h"
@@ -9,7 +12,6 @@
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
 #include "platform/OldDatabases.h"
-#include "platform/OneWire.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
 #include "platform/WordProcessor.h"
@@ -27,6 +29,7 @@ struct Services {
   MessageBoxes& Boxes;
   const SerialDevices& Devices;
   SerialPort& MSComm1;
-  OneWire& Wire;
   ::WordProcessor& WordProcessor;
+  /// Waits for a membership button; its number, or NoDallasId. Empty where there is no reader.
+  std::function<std::string()> ButtonSwipe = {};
 };

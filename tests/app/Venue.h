@@ -25,7 +25,6 @@
 #include "tests/fakes/FakeFileDialog.h"
 #include "tests/fakes/FakeFolders.h"
 #include "tests/fakes/FakeMessageBoxes.h"
-#include "tests/fakes/FakeOneWire.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
 #include "tests/fakes/FakeWordProcessor.h"
@@ -75,8 +74,8 @@ class Venue {
     if (waits_ == Waits::Real) {
       events = &RealEvents;
     }
-    Window = std::make_unique<frmRx>(::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places,
-                                                Boxes, Devices, Port, Wire, Word});
+    Window = std::make_unique<frmRx>(
+        ::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places, Boxes, Devices, Port, Word});
     return *Window;
   }
 
@@ -167,7 +166,6 @@ class Venue {
   FakeMessageBoxes Boxes;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
-  FakeOneWire Wire;
   FakeWordProcessor Word;
   std::unique_ptr<frmRx> Window;
 
