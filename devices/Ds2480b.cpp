@@ -32,10 +32,12 @@ Presence PresenceOf(std::uint8_t resetAnswer) {
 // may have left data mode or the accelerator on; both take the reset for data and answer it with something
 // else.
 bool Ds2480b::Detect() {
-  constexpr int attempts = 3;
-  for (int attempt = 0; attempt < attempts && !ended_; ++attempt) {
+  for (const std::chrono::milliseconds limit : {AnswerLimit, AnswerLimit, LastLimit}) {
     port_.Output(ResetBus);
-    if (!Await(1, 1)) {
+    if (!Await(1, 1, limit)) {
+      if (ended_) {
+        return true;
+      }
       continue;
     }
     if (TakeResetAnswer()) {
@@ -46,7 +48,7 @@ bool Ds2480b::Detect() {
     port_.Output(AcceleratorOff);
     port_.ClearInput();
   }
-  return ended_;
+  return false;
 }
 
 Presence Ds2480b::Reset() {
@@ -124,11 +126,10 @@ void Ds2480b::SendData(std::uint8_t byte) {
   busIsReset_ = false;
 }
 
-bool Ds2480b::Await(std::size_t answers, std::size_t bytesOnLine) {
+bool Ds2480b::Await(std::size_t answers, std::size_t bytesOnLine, std::chrono::milliseconds limit) {
   constexpr std::size_t microsecondsPerByte = 1042;  // ten bits at 9600 baud
   const auto onLine = std::chrono::milliseconds((bytesOnLine * microsecondsPerByte + 999) / 1000);
-  const WaitResult result =
-      events_.WaitFor([&] { return port_.InBufferCount() >= answers; }, AnswerLimit + onLine);
+  const WaitResult result = events_.WaitFor([&] { return port_.InBufferCount() >= answers; }, limit + onLine);
   ended_ = ended_ || result == WaitResult::Ended;
   return result == WaitResult::Met;
 }

@@ -16,9 +16,13 @@ enum class Presence { None, Devices, Shorted };
 /// strong pull-up stays off. Waits serve events. All operations throw what the line throws (8012, 8018).
 class Ds2480b {
  public:
-  /// How long the chip may keep one answer from us beyond the time on the line. A reset takes 3 ms by itself;
-  /// adapters on USB hold bytes back for up to 16 ms.
+  /// How long an answer may take beyond its time on the line. A reset takes 3 ms by itself, and adapters on
+  /// USB hold bytes back for up to 16 ms.
   static constexpr std::chrono::milliseconds AnswerLimit{30};
+
+  /// The same where nothing but the answer can be right, so that a busy machine is not taken for a missing
+  /// chip.
+  static constexpr std::chrono::milliseconds LastLimit{200};
 
   /// Both must outlive this object.
   Ds2480b(SerialPort& port, EventPump& events) : port_(port), events_(events) {}
@@ -44,7 +48,7 @@ class Ds2480b {
  private:
   void SendCommand(std::uint8_t command);
   void SendData(std::uint8_t byte);
-  bool Await(std::size_t answers, std::size_t bytesOnLine);
+  bool Await(std::size_t answers, std::size_t bytesOnLine, std::chrono::milliseconds limit = LastLimit);
   bool TakeResetAnswer();
 
   SerialPort& port_;

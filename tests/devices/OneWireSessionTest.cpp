@@ -73,7 +73,21 @@ TEST_F(OneWireSession, GivesAnAdapterTimeToChargeFromTheLine) {
 TEST_F(OneWireSession, DoesNotStartOnASilentLine) {
   adapter.Expect({0xC1, 0xC1, 0xC1}, {});
   ExpectNoSession();
-  EXPECT_THAT(events.Now(), Le(100ms));
+  EXPECT_THAT(events.Now(), Le(270ms));
+}
+
+TEST_F(OneWireSession, ServesEventsWhileItWaits) {
+  int served = 0;
+  for (const auto time : {10ms, 50ms, 90ms, 200ms}) {
+    events.At(time, [&served] { ++served; });
+  }
+  EXPECT_EQ(wire.TMExtendedStartSession(1, 5, 0), 0);
+  EXPECT_EQ(served, 4);
+}
+
+TEST_F(OneWireSession, DoesNotTakeABusyMachineForAMissingAdapter) {
+  port.OnOutput = [this](std::uint8_t) { events.At(150ms, [this] { port.Receive({0xCD}); }); };
+  EXPECT_GT(wire.TMExtendedStartSession(1, 5, 0), 0);
 }
 
 TEST_F(OneWireSession, WaitsForAnAnswerThatTheLineHoldsBack) {
@@ -184,6 +198,7 @@ TEST_F(OneWireSession, StartsOnAnEmptyBusWhenTheProgramCloses) {
   events.EndWaits();
   const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
   EXPECT_GT(handle, 0);
+  EXPECT_THAT(port.Sent, ElementsAre(0xC1));
   EXPECT_EQ(wire.TMNext(handle, state), 0);
   EXPECT_EQ(wire.TMEndSession(handle), 1);
   EXPECT_FALSE(port.PortOpen());

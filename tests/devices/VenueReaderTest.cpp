@@ -1,3 +1,4 @@
+#include <fcntl.h>
 #include <gmock/gmock.h>
 
 #include <algorithm>
@@ -23,8 +24,9 @@ class VenueReader {
  public:
   explicit VenueReader(std::vector<std::string> options = {}) : venue_(Arguments(std::move(options))) {
     venue_.ReadDevice("base unit");
-    files_.Put("/tessarine.ini",
-               "[onewire]\nport=2\n[ports]\ncom2=" + venue_.ReadDevice("1-wire adapter") + "\n");
+    const std::string device = venue_.ReadDevice("1-wire adapter");
+    held_ = sim::FileDescriptor(::open(device.c_str(), O_RDWR | O_NOCTTY | O_CLOEXEC));
+    files_.Put("/tessarine.ini", "[onewire]\nport=2\n[ports]\ncom2=" + device + "\n");
     Reader.Activate();
   }
 
@@ -56,6 +58,8 @@ class VenueReader {
   }
 
   sim::VenueProcess venue_;
+  /// Keeps the terminal's name from being given to another test while this one still knows it.
+  sim::FileDescriptor held_;
   FakeFiles files_;
   IniReader ini_{files_, "/tessarine.ini"};
   FakeSerialDevices devices_;
