@@ -102,7 +102,7 @@ class FakeFiles : public Files {
 
   std::string MakeTempFileName() override {
     ThrowIfTold(createFailures_, TempFolder);
-    const std::string path = std::string(TempFolder) + "/per" + std::to_string(++tempFiles_);
+    std::string path = std::string(TempFolder) + "/per" + std::to_string(++tempFiles_);
     Put(path, "");
     return path;
   }
