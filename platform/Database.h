@@ -29,12 +29,17 @@ class Recordset {
   virtual ~Recordset() = default;
 
   /// MoveFirst and MoveLast on an empty set go to its ends without a fault. MoveNext past the last row
-  /// reaches Eof; from Eof it throws 3021.
+  /// reaches Eof, MovePrevious before the first one Bof; from there they throw 3021.
   virtual void MoveFirst() = 0;
   virtual void MoveNext() = 0;
+  virtual void MovePrevious() = 0;
   virtual void MoveLast() = 0;
   virtual bool Eof() const = 0;
   virtual bool Bof() const = 0;
+
+  /// Rows in the set, and the place of the current one, counted from 0; -1 without a current row.
+  virtual int RecordCount() const = 0;
+  virtual int AbsolutePosition() const = 0;
 
   /// Moves to the first row that `criterion` (the text of an SQL condition) holds for; else sets NoMatch and
   /// stays. Throws RuntimeError 3077 for a criterion that cannot be read.
@@ -86,6 +91,13 @@ class Database {
   /// read; groups nest. Use ReadScope.
   virtual void BeginRead() {}
   virtual void EndRead() noexcept {}
+
+  /// All writes from BeginTrans to CommitTrans reach the file together, with one wait for the disk. Reads
+  /// through this database see them at once. CommitTrans makes them durable; when it or a write among them
+  /// throws, or Rollback comes first, the file keeps the old rows of all of them. Use WriteScope.
+  virtual void BeginTrans() = 0;
+  virtual void CommitTrans() = 0;
+  virtual void Rollback() noexcept = 0;
 };
 
 /// Makes many reads of a database cheap as long as it lives. While it holds the lock no other program, and no
@@ -99,6 +111,21 @@ class ReadScope {
   ~ReadScope() { database_.EndRead(); }
   ReadScope(const ReadScope&) = delete;
   ReadScope& operator=(const ReadScope&) = delete;
+
+ private:
+  Database& database_;
+};
+
+/// Writes that reach the file together when Commit returns, or not at all. Others can neither read nor write
+/// the file when it comes to Commit, so do not wait for the operator inside.
+class WriteScope {
+ public:
+  explicit WriteScope(Database& database) : database_(database) { database_.BeginTrans(); }
+  ~WriteScope() { database_.Rollback(); }
+  WriteScope(const WriteScope&) = delete;
+  WriteScope& operator=(const WriteScope&) = delete;
+
+  void Commit() { database_.CommitTrans(); }
 
  private:
   Database& database_;

@@ -43,6 +43,8 @@ class RuntimeError : public std::runtime_error {
         return "Update or CancelUpdate without AddNew or Edit.";
       case 3021:
         return "No current record.";
+      case 3034:
+        return "You tried to commit or rollback a transaction without first beginning a transaction.";
       case 3167:
         return "Record is deleted.";
       case 3265:

@@ -54,7 +54,16 @@ char32_t Fold(char32_t character) {
   if (unicode == nullptr || character >= StrayByte) {
     return character;
   }
-  return static_cast<char32_t>(towlower_l(static_cast<wint_t>(character), unicode));
+  // The Kelvin sign and the capital I with a dot have an ASCII letter as their small form. An index that
+  // knows the case of ASCII letters only could not find them by it.
+  const auto small = static_cast<char32_t>(towlower_l(static_cast<wint_t>(character), unicode));
+  return small < 0x80 ? character : small;
+}
+
+// Scripts without case: Hebrew and Arabic to Tibetan, the Chinese, Japanese and Korean ones.
+bool HasOneForm(char32_t character) {
+  return (character >= 0x0590 && character < 0x1000) || (character >= 0x2E80 && character < 0xA000) ||
+         (character >= 0xAC00 && character < 0xD7A4);
 }
 
 char32_t TakeFolded(std::string_view& text) {
@@ -161,6 +170,17 @@ bool JetPattern::Matches(std::string_view text) const {
   }
   return std::all_of(tokens_.begin() + static_cast<std::ptrdiff_t>(token), tokens_.end(),
                      [](const Token& rest) { return rest.What == Kind::AnyText; });
+}
+
+std::u32string JetPattern::FixedStart() const {
+  std::u32string start;
+  for (const Token& token : tokens_) {
+    if (token.What != Kind::Character || (token.Character >= 0x80 && !HasOneForm(token.Character))) {
+      break;
+    }
+    start += token.Character;
+  }
+  return start;
 }
 
 bool JetLike(std::string_view text, std::string_view pattern) {

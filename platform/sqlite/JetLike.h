@@ -1,5 +1,6 @@
 #pragma once
 
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -9,8 +10,8 @@
 /// for one character of the set, `[!a-z]` for one outside it. Within brackets `*`, `?`, `#` and `[` are
 /// themselves, and so is
 /// `-` at either end; `[]` stands for nothing, `[!]` for an exclamation mark, and `]` outside brackets for
-/// itself. Case does not count, in any script that has one. Texts are UTF-8; a byte that is none is a
-/// character of its own.
+/// itself. Case does not count, in any script that has one; no letter counts as an ASCII letter but these.
+/// Texts are UTF-8; a byte that is none is a character of its own.
 class JetPattern {
  public:
   /// Throws RuntimeError 93 for a bracket that is not closed or a range that runs downwards.
@@ -18,6 +19,10 @@ class JetPattern {
 
   /// True when the whole of `text` fits. Takes at most time proportional to the product of both lengths.
   bool Matches(std::string_view text) const;
+
+  /// What every text that fits begins with when the case of ASCII letters does not count: the characters
+  /// before the first that has other forms. Empty when nothing can be said.
+  std::u32string FixedStart() const;
 
  private:
   struct Range {

@@ -10,7 +10,9 @@
 
 #include "platform/RuntimeError.h"
 #include "platform/sqlite/JetLike.h"
+#include "platform/sqlite/LikeRange.h"
 #include "platform/sqlite/SqliteError.h"
+#include "platform/sqlite/SqliteTable.h"
 
 namespace {
 
@@ -113,10 +115,11 @@ SqliteConnection::~SqliteConnection() {
   sqlite3_close_v2(handle_);
 }
 
-SqliteStatement SqliteConnection::PrepareSearch(const std::string& table, const std::string& condition,
+SqliteStatement SqliteConnection::PrepareSearch(const SqliteTable& table, const std::string& condition,
                                                 int syntaxError) {
   // The line break ends a comment in the condition, which would otherwise hide the closing bracket.
-  const std::string sql = "SELECT rowid FROM [" + table + "] WHERE (" + condition + "\n) ORDER BY rowid";
+  const std::string sql = "SELECT rowid FROM [" + table.Name() + "] WHERE (" +
+                          WithLikeRanges(table, condition) + "\n) ORDER BY rowid";
   sqlite3_stmt* prepared = nullptr;
   const char* tail = nullptr;
   const int result =
@@ -157,6 +160,12 @@ void SqliteConnection::PrepareRead() {
 }
 
 void SqliteConnection::Rollback() noexcept {
+  if (!writing_) {
+    Undo();
+  }
+}
+
+void SqliteConnection::Undo() noexcept {
   if (sqlite3_get_autocommit(handle_) == 0) {
     sqlite3_exec(handle_, "ROLLBACK", nullptr, nullptr, nullptr);
   }
@@ -178,16 +187,32 @@ std::int64_t SqliteConnection::ChangedRows() const {
 
 void SqliteConnection::Fail() {
   const RuntimeError error = SqliteError(handle_, path_);
-  Rollback();
+  Undo();
   throw error;
 }
 
-WriteTransaction::WriteTransaction(SqliteConnection& connection) : connection_(connection) {
-  connection.Rollback();
+WriteTransaction::WriteTransaction(SqliteConnection& connection)
+    : connection_(connection), isPart_(connection.writing_) {
   connection.LeaveState();
-  connection.Execute("BEGIN IMMEDIATE");
+  if (!isPart_) {
+    connection.Rollback();
+    connection.Execute("BEGIN IMMEDIATE");
+    connection.writing_ = true;
+  } else if (sqlite3_get_autocommit(connection.Handle()) != 0) {
+    throw RuntimeError(3034);
+  }
 }
 
 WriteTransaction::~WriteTransaction() {
-  connection_.Rollback();
+  if (!isPart_) {
+    connection_.writing_ = false;
+    connection_.Rollback();
+    connection_.LeaveState();
+  }
+}
+
+void WriteTransaction::Commit() {
+  if (!isPart_) {
+    connection_.Execute("COMMIT");
+  }
 }

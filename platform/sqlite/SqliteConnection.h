@@ -6,6 +6,7 @@
 
 #include "platform/sqlite/SqliteStatement.h"
 
+class SqliteTable;
 struct sqlite3;
 
 /// One connection to a database file, with Jet's LIKE.
@@ -23,7 +24,7 @@ class SqliteConnection {
 
   /// The keys of the rows of `table` that `condition` holds for, in table order. Throws RuntimeError
   /// `syntaxError` when the condition cannot be read.
-  SqliteStatement PrepareSearch(const std::string& table, const std::string& condition, int syntaxError);
+  SqliteStatement PrepareSearch(const SqliteTable& table, const std::string& condition, int syntaxError);
 
   /// See Database::BeginRead.
   void BeginRead() { ++readers_; }
@@ -38,8 +39,8 @@ class SqliteConnection {
   std::uint64_t State() const { return state_; }
   /// To be called before each write.
   void LeaveState() { ++state_; }
-  /// Ends the open transaction, if any: what was written is undone, and a group of reads lets go of its lock
-  /// until its next read.
+  /// A group of reads lets go of its lock until its next read. Does nothing between the writes of a
+  /// transaction.
   void Rollback() noexcept;
 
   void Execute(const char* sql);
@@ -50,28 +51,35 @@ class SqliteConnection {
   [[noreturn]] void Fail();
 
  private:
+  friend class WriteTransaction;
+
+  void Undo() noexcept;
   void Configure(std::chrono::milliseconds busyTimeout);
   void CheckWholePages();
 
   std::string path_;
   sqlite3* handle_ = nullptr;
   int readers_ = 0;
+  bool writing_ = false;  ///< a WriteTransaction is open
   SqliteStatement dataVersion_;
   std::int64_t versionRead_ = 0;  ///< counts the changes by others
   std::uint64_t state_ = 1;
 };
 
-/// Writes that reach the file together when Commit returns, or not at all.
+/// Writes that reach the file together when Commit returns, or not at all. One inside another is a part of
+/// it; a fault in the part undoes the whole.
 class WriteTransaction {
  public:
+  /// Throws RuntimeError 3034 inside one that was undone.
   explicit WriteTransaction(SqliteConnection& connection);
   ~WriteTransaction();
   WriteTransaction(const WriteTransaction&) = delete;
   WriteTransaction& operator=(const WriteTransaction&) = delete;
 
-  /// What was written is durable on return.
-  void Commit() { connection_.Execute("COMMIT"); }
+  /// What was written is durable on return, unless this is part of another.
+  void Commit();
 
  private:
   SqliteConnection& connection_;
+  const bool isPart_;
 };

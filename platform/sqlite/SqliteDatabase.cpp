@@ -58,6 +58,14 @@ std::unique_ptr<Recordset> SqliteDatabase::OpenRecordset(const std::string& sour
   return std::make_unique<SqliteRecordset>(connection_, table, std::string(rest));
 }
 
+void SqliteDatabase::CommitTrans() {
+  if (!group_) {
+    throw RuntimeError(3034);
+  }
+  group_->Commit();
+  group_.reset();
+}
+
 std::unique_ptr<Database> SqliteEngine::OpenDatabase(const std::string& path) {
   return std::make_unique<SqliteDatabase>(path, busyTimeout_);
 }

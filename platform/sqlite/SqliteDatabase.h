@@ -2,6 +2,7 @@
 
 #include <chrono>
 #include <memory>
+#include <optional>
 #include <string>
 
 #include "platform/Database.h"
@@ -16,9 +17,13 @@ class SqliteDatabase : public Database {
   std::unique_ptr<Recordset> OpenRecordset(const std::string& source) override;
   void BeginRead() override { connection_.BeginRead(); }
   void EndRead() noexcept override { connection_.EndRead(); }
+  void BeginTrans() override { group_.emplace(connection_); }
+  void CommitTrans() override;
+  void Rollback() noexcept override { group_.reset(); }
 
  private:
   SqliteConnection connection_;
+  std::optional<WriteTransaction> group_;
 };
 
 class SqliteEngine : public DatabaseEngine {

@@ -43,7 +43,7 @@ void SqliteRecordset::ReadKeys(const std::string& condition) {
   connection_.PrepareRead();
   SqliteStatement search = condition.empty()
                                ? SqliteStatement(connection_, "SELECT rowid FROM [" + table_.Name() + "]")
-                               : connection_.PrepareSearch(table_.Name(), condition, 3075);
+                               : connection_.PrepareSearch(table_, condition, 3075);
   std::vector<std::int64_t> keys;
   while (search.Step()) {
     keys.push_back(search.Integer(0));
@@ -95,11 +95,25 @@ void SqliteRecordset::MoveNext() {
   if (Eof()) {
     throw RuntimeError(3021);
   }
-  const std::size_t next = place_ == Place::Gap ? position_ : position_ + 1;
+  const std::size_t next = place_ == Place::Gap ? position_ : place_ == Place::Beginning ? 0 : position_ + 1;
   if (next < keys_.Size()) {
     GoTo(next);
   } else {
     GoToEnd();
+  }
+}
+
+void SqliteRecordset::MovePrevious() {
+  pending_.Drop();
+  if (Bof()) {
+    throw RuntimeError(3021);
+  }
+  const std::size_t behind = place_ == Place::End ? keys_.Size() : position_;
+  if (behind > 0) {
+    GoTo(behind - 1);
+  } else {
+    place_ = keys_.Size() == 0 ? Place::BothEnds : Place::Beginning;
+    ForgetRow();
   }
 }
 
@@ -135,7 +149,7 @@ void SqliteRecordset::FindFirst(const std::string& criterion) {
   // Scoring asks for the same mission once for each player.
   if (!find_ || criterion != findCriterion_) {
     connection_.PrepareRead();
-    find_ = connection_.PrepareSearch(table_.Name(), criterion, 3077);
+    find_ = connection_.PrepareSearch(table_, criterion, 3077);
     findCriterion_ = criterion;
   }
   const std::optional<std::size_t> position = FirstPosition(find_);

@@ -26,9 +26,12 @@ class SqliteRecordset : public Recordset {
 
   void MoveFirst() override;
   void MoveNext() override;
+  void MovePrevious() override;
   void MoveLast() override;
   bool Eof() const override { return place_ == Place::End || place_ == Place::BothEnds; }
-  bool Bof() const override { return place_ == Place::BothEnds; }
+  bool Bof() const override { return place_ == Place::Beginning || place_ == Place::BothEnds; }
+  int RecordCount() const override { return static_cast<int>(keys_.Size()); }
+  int AbsolutePosition() const override { return place_ == Place::Row ? static_cast<int>(position_) : -1; }
   void FindFirst(const std::string& criterion) override;
   bool NoMatch() const override { return noMatch_; }
   bool WalkTo(const std::string& column, const Value& value) override;
@@ -46,10 +49,11 @@ class SqliteRecordset : public Recordset {
 
  private:
   enum class Place {
-    Row,      ///< on the row at position_
-    Gap,      ///< before the row at position_, where a row was deleted
-    End,      ///< after the last row
-    BothEnds  ///< there were no rows
+    Row,        ///< on the row at position_
+    Gap,        ///< before the row at position_, where a row was deleted
+    Beginning,  ///< before the first row
+    End,        ///< after the last row
+    BothEnds    ///< there were no rows
   };
 
   void ReadKeys(const std::string& condition);

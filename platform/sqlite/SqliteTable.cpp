@@ -23,6 +23,10 @@ bool TakesNumbers(const std::string& type) {
          Contains(type, "DOUB") || Contains(type, "NUMERIC");
 }
 
+bool IsTextType(const std::string& type) {
+  return !Contains(type, "INT") && (Contains(type, "TEXT") || Contains(type, "CHAR"));
+}
+
 Value NumberFrom(std::string_view text) {
   const std::size_t first = text.find_first_not_of(" \t");
   if (first == std::string_view::npos) {
@@ -64,7 +68,7 @@ SqliteTable::SqliteTable(SqliteConnection& connection, const std::string& name) 
   while (columns.Step()) {
     const std::string type = columns.Text(1);
     columns_.push_back({columns.Text(0), columns.Text(2), Contains(type, "BLOB"), TakesNumbers(type),
-                        columns.Integer(3) != 0});
+                        columns.Integer(3) != 0, IsTextType(type)});
   }
   if (columns_.empty()) {
     throw RuntimeError(3078, "Could not find the input table or query '" + name + "'.");

@@ -14,6 +14,7 @@ struct SqliteColumn {
   bool IsLong = false;    ///< long binary
   bool IsNumber = false;  ///< takes numbers only
   bool IsKey = false;     ///< given by the database on insertion
+  bool IsText = false;    ///< keeps texts as texts
 
   /// `value` as this column keeps it: a text that goes into a number column becomes the number that it says,
   /// blanks around it being no fault. Throws RuntimeError 3421 when it says none.
