@@ -27,6 +27,26 @@ Blob Piece(Recordset& recordset, const std::string& blobColumn, std::size_t offs
   }
 }
 
+constexpr std::uint64_t LargePhoto = 100'000;
+
+bool WantsLargePhoto(MessageBoxes& boxes) {
+  return boxes.Show("This photo is large. Large photo's will reduce performance. Do you wish to proceed?",
+                    "Photo Warning", BoxIcon::Question, BoxButtons::OkCancel) == BoxAnswer::Ok;
+}
+
+/// The photo file's bytes; empty when they are not to be stored.
+std::string BytesToStore(const std::string& path, const Files& files, MessageBoxes& boxes) {
+  try {
+    if (files.FileLen(path) > LargePhoto && !WantsLargePhoto(boxes)) {
+      return {};
+    }
+    return files.Read(path);
+  } catch (const RuntimeError& error) {
+    boxes.Show(error.what(), DefaultBoxTitle, BoxIcon::None);
+    return {};
+  }
+}
+
 }  // namespace
 
 PhotoBlocks BlocksOf(std::size_t size) {
@@ -47,6 +67,26 @@ std::string StoredPhoto(Recordset& recordset, const std::string& blobColumn,
     bytes.append(piece.begin(), piece.end());
   }
   return bytes;
+}
+
+void StorePhoto(const std::string& path, Recordset& recordset, const std::string& blobColumn,
+                const std::string& lengthColumn, const Files& files, MessageBoxes& boxes) {
+  const std::string bytes = BytesToStore(path, files, boxes);
+  if (bytes.empty()) {
+    return;
+  }
+  const PhotoBlocks cut = BlocksOf(bytes.size());
+  recordset.SetField(lengthColumn, static_cast<std::int64_t>(bytes.size()));
+  const std::size_t end = cut.Blocks * PhotoBlockSize + cut.Rest;
+  for (std::size_t offset = 0; offset < end;) {
+    const std::size_t count = std::min(PhotoBlockSize, end - offset);
+    const auto first = bytes.begin() + static_cast<std::ptrdiff_t>(std::min(offset, bytes.size()));
+    const auto left = static_cast<std::size_t>(bytes.end() - first);
+    Blob piece(first, first + static_cast<std::ptrdiff_t>(std::min(count, left)));
+    piece.resize(count);  // the padding
+    recordset.AppendChunk(blobColumn, piece);
+    offset += count;
+  }
 }
 
 bool ExportPhoto(Recordset& recordset, const std::string& blobColumn, const std::string& lengthColumn,

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 
 /// Files and folders by path (UTF-8, the platform's separator).
@@ -12,6 +13,9 @@ class Files {
 
   /// Makes one folder; its parent must exist. Throws RuntimeError 75 or 76.
   virtual void CreateFolder(const std::string& path) = 0;
+
+  /// Bytes in a file. Throws RuntimeError 53 when it does not exist, 75 when it is none that can be read.
+  virtual std::uint64_t FileLen(const std::string& path) const = 0;
 
   /// The whole file. Throws RuntimeError 53 when it does not exist, 75 when it cannot be read.
   virtual std::string Read(const std::string& path) const = 0;

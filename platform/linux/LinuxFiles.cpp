@@ -134,6 +134,17 @@ void LinuxFiles::CreateFolder(const std::string& path) {
   }
 }
 
+std::uint64_t LinuxFiles::FileLen(const std::string& path) const {
+  struct stat info {};
+  if (stat(path.c_str(), &info) != 0 && (errno == ENOENT || errno == ENOTDIR)) {
+    throw RuntimeError(53, "File not found: " + path);
+  }
+  if (!S_ISREG(info.st_mode) || faccessat(AT_FDCWD, path.c_str(), R_OK, AT_EACCESS) != 0) {
+    throw RuntimeError(75, "Path/File access error: " + path);
+  }
+  return static_cast<std::uint64_t>(info.st_size);
+}
+
 std::string LinuxFiles::Read(const std::string& path) const {
   const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
   if (file.Number() < 0 && (errno == ENOENT || errno == ENOTDIR)) {

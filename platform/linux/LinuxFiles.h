@@ -11,6 +11,7 @@ class LinuxFiles : public Files {
   bool FileExists(const std::string& path) const override;
   bool FolderExists(const std::string& path) const override;
   void CreateFolder(const std::string& path) override;
+  std::uint64_t FileLen(const std::string& path) const override;
   std::string Read(const std::string& path) const override;
 
   /// Keeps the old file's permissions, and its owner where that is allowed; a new file gets 0644 less the

@@ -1,6 +1,6 @@
 #pragma once
 
-#include <QDate>
+#include <QDateTime>
 #include <QLocale>
 #include <QTime>
 
@@ -20,6 +20,9 @@ class QtClock : public Clock {
  public:
   std::string ShortDate() const override { return ShortDateText(QLocale::system(), QDate::currentDate()); }
   std::string ShortTime() const override { return ShortTimeText(QLocale::system(), QTime::currentTime()); }
+  std::string Now() const override {
+    return QDateTime::currentDateTime().toString(QStringLiteral("yyyy-MM-dd HH:mm:ss")).toStdString();
+  }
   std::string LongDate(const std::string& text) const override {
     return LongDateText(QLocale::system(), QString::fromStdString(text));
   }

@@ -64,6 +64,8 @@ class ScoredGame {
     analysis_ = std::make_unique<ScoreAnalysis>(game, Factors, *Missions, *Members, Strings, Board, Teams);
   }
 
+  Database& DbMembers() { return *dbMembers_; }
+
   void CalculateScores() {
     if (!analysis_) {
       Open();

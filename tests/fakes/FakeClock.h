@@ -10,9 +10,11 @@ class FakeClock : public Clock {
  public:
   std::string Date = "21/05/2013";
   std::string Time = "14:30";
+  std::string DateAndTime = "2013-05-21 14:30:05";
 
   std::string ShortDate() const override { return Date; }
   std::string ShortTime() const override { return Time; }
+  std::string Now() const override { return DateAndTime; }
 
   /// Long forms by the texts they are asked for; other texts stand for no date.
   std::map<std::string, std::string> LongDates = {{"21/05/2013 14:30", "Tuesday, 21 May 2013"}};

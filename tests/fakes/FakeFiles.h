@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <map>
 #include <set>
 #include <string>
@@ -78,6 +79,8 @@ class FakeFiles : public Files {
     }
     folders_.insert(WithoutSeparator(path));
   }
+
+  std::uint64_t FileLen(const std::string& path) const override { return Read(path).size(); }
 
   std::string Read(const std::string& path) const override {
     ThrowIfTold(readFailures_, path);

@@ -339,4 +339,22 @@ TEST(FileError, GivesEachSystemErrorItsNumberAndText) {
   }
 }
 
+TEST(FileLen, CountsTheBytesOfAFile) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", std::string(100001, 'x'));
+  WriteFile(folder / "empty", "");
+  EXPECT_EQ(LinuxFiles().FileLen(folder / "file"), 100001U);
+  EXPECT_EQ(LinuxFiles().FileLen(folder / "empty"), 0U);
+}
+
+TEST(FileLen, OfWhatCannotBeReadFails) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "x");
+  std::filesystem::permissions(folder / "file", std::filesystem::perms(0));
+  const OrdinaryUser user;
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().FileLen(folder / "file"); }), 75);
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().FileLen(folder.Path()); }), 75);
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().FileLen(folder / "gone"); }), 53);
+}
+
 }  // namespace

@@ -84,4 +84,13 @@ TEST(QtClock, TellsThePresentLocalTimeInTheSystemsForm) {
   EXPECT_EQ(told, before);
 }
 
+TEST(QtClock, TellsDateAndTimeAsTheDatabasesKeepThem) {
+  const QDateTime before = QDateTime::currentDateTime().addSecs(-1);
+  const QString now = QString::fromStdString(QtClock().Now());
+  const QDateTime read = QDateTime::fromString(now, QStringLiteral("yyyy-MM-dd HH:mm:ss"));
+  EXPECT_TRUE(read.isValid()) << now.toStdString();
+  EXPECT_GE(read, before);
+  EXPECT_LE(read, QDateTime::currentDateTime());
+}
+
 }  // namespace
