@@ -20,11 +20,15 @@
 #include "app/UploadProgress.h"
 #include "app/WaitCursor.h"
 #include "core/BaseUnitDownload.h"
+#include "core/CommitGame.h"
 #include "core/FieldValue.h"
 #include "core/FirstRun.h"
+#include "core/NumberForms.h"
 #include "core/PlayerId.h"
 #include "core/ScreenFit.h"
 #include "core/UserDatabase.h"
+#include "members/MemberQueries.h"
+#include "members/Members.h"
 #include "missions/Scenarios.h"
 #include "platform/ErrorReport.h"
 #include "sheets/ScoreSheets.h"
@@ -54,6 +58,7 @@ bool frmRx::FormLoad() {
     return false;
   }
   factors_ = ReadSoldieringFactors(*ini_);
+  ui_->mnuCheckButton->setEnabled(services_.ButtonSwipe != nullptr);
   ConnectCommands();
   // Not before the window has come up.
   constexpr int followMilliseconds = 100;
@@ -181,6 +186,10 @@ void frmRx::ConnectCommands() {
       {ui_->mnuAdminData, &frmRx::ShowAdminData},
       {ui_->mnuMissionResults, &frmRx::EnterMissionResults},
       {ui_->mnuSetupMissions, &frmRx::SetUpMissions},
+      {ui_->mnuCommitGame, &frmRx::CommitGame},
+      {ui_->mnuManageMembers, &frmRx::ManageMembers},
+      {ui_->mnuCheckButton, &frmRx::CheckMembershipButton},
+      {ui_->mnuAssignMember, &frmRx::AssignMember},
       {ui_->mnuUnassignMember, &frmRx::UnassignMember},
       {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
       {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
@@ -376,6 +385,41 @@ void frmRx::ShowAbout() {
   About(this).exec();
 }
 
+void frmRx::CommitGame() {
+  CommitResult result;
+  {
+    const WaitCursor cursor;
+    result = CommitPlayers(game_, *dbMembers_, *rsMembers_, *members_, services_.Time);
+  }
+  TellCommitResult(result, services_.Boxes);
+}
+
+void frmRx::ManageMembers() {
+  ShowMembers(0);
+}
+
+void frmRx::CheckMembershipButton() {
+  const std::string dallasId = services_.ButtonSwipe();
+  if (dallasId == NoDallasId) {
+    return;
+  }
+  const auto found = dbMembers_->OpenRecordset(ButtonQuery(dallasId));
+  if (found->Eof()) {
+    services_.Boxes.Show("Button is not assigned to a member", DefaultBoxTitle, BoxIcon::Information);
+  } else {
+    ShowMembers(RoundToInt32(NumberOf(found->Fields("ContactID"))));
+  }
+}
+
+std::string frmRx::ShowMembers(std::int32_t contactToShow) {
+  Members window({*dbMembers_, services_.Boxes, services_.CommonDialog1, services_.Disk, services_.Time,
+                  services_.Strings, services_.ButtonSwipe},
+                 this);
+  window.ContactToShow = contactToShow;
+  window.exec();
+  return window.SelectedContact;
+}
+
 void frmRx::ShowAdminData() {
   AdminData(game_, services_.Strings, this).exec();
 }
@@ -401,6 +445,13 @@ void frmRx::ShowPopup(const QPoint& position) {
   ui_->mnuPopup->exec(ui_->ScoreDisplay->viewport()->mapToGlobal(position));
   CalculateScores();
   services_.Events.DoEvents();
+}
+
+void frmRx::AssignMember() {
+  const std::string contact = ShowMembers(0);
+  if (!contact.empty()) {
+    game_.Players(selectedPlayer_).MemberIndex = ToInt32(contact);
+  }
 }
 
 void frmRx::UnassignMember() {

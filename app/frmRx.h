@@ -67,12 +67,19 @@ class frmRx : public QMainWindow {
   void ShowCommPortSettings();
   void ShowSoldieringCalc();
   void ShowAbout();
+  void CommitGame();
+  void ManageMembers();
+  void CheckMembershipButton();
+  /// Shows the members, standing on one of them (0 for none); `ContactID` of the one chosen with OK, or
+  /// empty.
+  std::string ShowMembers(std::int32_t contactToShow);
   void ShowAdminData();
   void EnterMissionResults();
   void SetUpMissions();
 
   /// The context menu of the board, for the last of the selected rows.
   void ShowPopup(const QPoint& position);
+  void AssignMember();
   void UnassignMember();
   void ShowDetailed();
   void EnterBonusPoints();

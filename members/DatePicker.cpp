@@ -1,0 +1,122 @@
+#include "members/DatePicker.h"
+
+#include <QAction>
+#include <QCalendarWidget>
+#include <QDate>
+#include <QKeyEvent>
+#include <QLocale>
+#include <QStyle>
+#include <QVBoxLayout>
+
+#include "platform/qt/QtClock.h"
+
+namespace {
+
+constexpr qsizetype StoredDateLength = 10;
+
+QDate DateOf(const std::string& stored) {
+  return QDate::fromString(QString::fromStdString(stored).left(StoredDateLength), Qt::ISODate);
+}
+
+/// A form in which a day or a month of one digit may stand without a zero.
+QString Lenient(QString form) {
+  form.replace(QStringLiteral("dd"), QStringLiteral("d"));
+  if (!form.contains(QStringLiteral("MMM"))) {
+    form.replace(QStringLiteral("MM"), QStringLiteral("M"));
+  }
+  return form;
+}
+
+/// The date that `text` says, invalid for none. Two digits of a year are those of the last hundred years.
+QDate DateIn(const QString& text) {
+  const QLocale locale = QLocale::system();
+  QString form = Lenient(locale.dateFormat(QLocale::ShortFormat));
+  QString longForm = form;
+  QString shortForm = form;
+  if (form.contains(QStringLiteral("yyyy"))) {
+    shortForm.replace(QStringLiteral("yyyy"), QStringLiteral("yy"));
+  } else {
+    longForm.replace(QStringLiteral("yy"), QStringLiteral("yyyy"));
+  }
+  for (const QString& known : {longForm, QStringLiteral("yyyy-M-d")}) {
+    if (const QDate date = locale.toDate(text, known); date.isValid()) {
+      return date;
+    }
+  }
+  QDate date = locale.toDate(text, shortForm);
+  constexpr int century = 100;
+  while (date.isValid() && date.addYears(century) <= QDate::currentDate()) {
+    date = date.addYears(century);
+  }
+  return date;
+}
+
+}  // namespace
+
+DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
+  setPlaceholderText(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
+  QAction* calendar =
+      addAction(style()->standardIcon(QStyle::SP_ArrowDown, nullptr, this), QLineEdit::TrailingPosition);
+  connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
+  connect(this, &QLineEdit::textEdited, this, &DatePicker::TakeText);
+  connect(this, &QLineEdit::editingFinished, this, &DatePicker::ShowStored);
+}
+
+void DatePicker::SetStored(const std::string& stored) {
+  stored_ = stored;
+  ShowStored();
+}
+
+void DatePicker::ShowStored() {
+  const QDate date = DateOf(stored_);
+  setText(date.isValid() ? QString::fromStdString(ShortDateText(QLocale::system(), date)) : QString());
+}
+
+void DatePicker::TakeText(const QString& text) {
+  if (text.trimmed().isEmpty()) {
+    stored_.clear();
+  } else if (const QDate date = DateIn(text.trimmed()); date.isValid()) {
+    TakeDate(date);
+  }
+}
+
+void DatePicker::TakeDate(QDate date) {
+  stored_ = date.toString(QStringLiteral("yyyy-MM-dd 00:00:00")).toStdString();
+}
+
+void DatePicker::keyPressEvent(QKeyEvent* event) {
+  if (event->key() == Qt::Key_Down && event->modifiers().testFlag(Qt::AltModifier)) {
+    OpenCalendar();
+    return;
+  }
+  QLineEdit::keyPressEvent(event);
+}
+
+void DatePicker::focusOutEvent(QFocusEvent* event) {
+  QLineEdit::focusOutEvent(event);
+  if (event->reason() != Qt::PopupFocusReason) {
+    ShowStored();
+  }
+}
+
+void DatePicker::OpenCalendar() {
+  auto* popup = new QFrame(this, Qt::Popup);
+  popup->setAttribute(Qt::WA_DeleteOnClose);
+  auto* calendar = new QCalendarWidget(popup);
+  auto* layout = new QVBoxLayout(popup);
+  layout->setContentsMargins(0, 0, 0, 0);
+  layout->addWidget(calendar);
+  if (const QDate date = DateOf(stored_); date.isValid()) {
+    calendar->setSelectedDate(date);
+  }
+  const auto take = [this, popup](QDate date) {
+    TakeDate(date);
+    ShowStored();
+    popup->close();
+  };
+  connect(calendar, &QCalendarWidget::clicked, this, take);
+  connect(calendar, &QCalendarWidget::activated, this, take);
+  popup->move(mapToGlobal(QPoint(0, height())));
+  popup->show();
+  calendar->setFocus();
+}

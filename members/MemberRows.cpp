@@ -1,0 +1,127 @@
+#include "members/MemberRows.h"
+
+#include "platform/RuntimeError.h"
+
+namespace {
+constexpr int RecordIsDeleted = 3167;
+}
+
+MemberRows::MemberRows(Database& dbMembers, BoundControls& controls)
+    : dbMembers_(dbMembers), controls_(controls), rows_(dbMembers.OpenRecordset("Members")) {}
+
+void MemberRows::Refresh(const std::string& recordSource) {
+  WriteBack();
+  rows_ = dbMembers_.OpenRecordset(recordSource);
+  Show();
+}
+
+void MemberRows::MoveFirst() {
+  WriteBack();
+  rows_->MoveFirst();
+  Show();
+}
+
+void MemberRows::MovePrevious() {
+  WriteBack();
+  if (!rows_->Bof()) {
+    rows_->MovePrevious();
+  }
+  if (rows_->Bof()) {
+    rows_->MoveFirst();
+  }
+  Show();
+}
+
+void MemberRows::MoveNext() {
+  WriteBack();
+  if (!rows_->Eof()) {
+    rows_->MoveNext();
+  }
+  if (rows_->Eof()) {
+    rows_->MoveLast();
+  }
+  Show();
+}
+
+void MemberRows::MoveLast() {
+  WriteBack();
+  rows_->MoveLast();
+  Show();
+}
+
+void MemberRows::WalkTo(std::int64_t contactId) {
+  WriteBack();
+  rows_->WalkTo("ContactID", contactId);
+  Show();
+}
+
+void MemberRows::AddMember(const std::string& now) {
+  WriteBack();
+  rows_->AddNew();
+  rows_->SetField("DateJoined", now);
+  rows_->SetField("FirstName", "Enter Name");
+  rows_->SetField("LastName", "Enter Name");
+  Update();
+  rows_->MoveLast();
+  Show();
+}
+
+void MemberRows::Delete() {
+  rows_->Delete();
+  rows_->MoveFirst();
+  Show();
+}
+
+void MemberRows::WriteBack() {
+  if (!hasRow_) {
+    return;
+  }
+  const MemberDetails entered = controls_.Entered();
+  if (entered == shown_) {
+    return;
+  }
+  try {
+    rows_->Edit();
+    SetChanges(*rows_, shown_, entered);
+    Update();
+  } catch (const RuntimeError& error) {
+    if (error.Number() == RecordIsDeleted) {
+      shown_ = entered;  // or the cursor could never leave the place
+    }
+    throw;
+  }
+  shown_ = entered;
+}
+
+void MemberRows::SetField(const std::string& column, const std::string& text) {
+  rows_->Edit();
+  rows_->SetField(column, text);
+  Update();
+}
+
+void MemberRows::Update() {
+  try {
+    rows_->Update();
+  } catch (const RuntimeError&) {
+    rows_->CancelUpdate();
+    throw;
+  }
+}
+
+void MemberRows::Show() {
+  hasRow_ = false;
+  if (rows_->Eof() || rows_->Bof()) {
+    controls_.ShowNoRow();
+  } else {
+    try {
+      const ReadScope scope(dbMembers_);
+      controls_.ShowRow(*rows_);
+    } catch (const RuntimeError&) {
+      controls_.ShowNoRow();
+      throw;
+    }
+    hasRow_ = true;
+  }
+  shown_ = controls_.Entered();
+  controls_.RowChanged();
+}

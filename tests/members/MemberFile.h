@@ -1,0 +1,34 @@
+#pragma once
+
+#include "platform/sqlite/SqliteDatabase.h"
+#include "tests/platform/linux/TemporaryFolder.h"
+#include "tests/platform/sqlite/TestDatabase.h"
+
+/// A members file as a new installation has it, with four members.
+class MemberFile {
+ public:
+  MemberFile() {
+    Execute(ReadFile(std::string(TESSARINE_RESOURCES) + "/members_default.sql"));
+    Execute(
+        "INSERT INTO Members (ContactID, FirstName, LastName, NickName, Clan, Birthdate) VALUES "
+        "(1, 'Rhys', 'Morgan', NULL, 'Red Dragons', '1961-04-12 00:00:00'), (2, 'Alice', 'Belmont', 'Mole', "
+        "'', "
+        "NULL), (5, 'Sean', 'O''Brien', 'Shamrock', NULL, NULL), (9, '小明', '王', NULL, NULL, NULL)");
+  }
+
+  std::string Path() const { return folder_ / "members.mdb"; }
+  void Execute(const std::string& sql) const { OtherConnection(Path()).Execute(sql); }
+  std::string Query(const std::string& sql) const { return OtherConnection(Path()).Query(sql); }
+
+  /// A column of one member, read by another program.
+  std::string Stored(const std::string& column, int member) const {
+    return Query("SELECT " + column + " FROM Members WHERE ContactID = " + std::to_string(member));
+  }
+
+  std::unique_ptr<Database> Open() const {
+    return SqliteEngine(std::chrono::milliseconds(30)).OpenDatabase(Path());
+  }
+
+ private:
+  TemporaryFolder folder_;
+};
