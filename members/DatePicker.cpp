@@ -5,7 +5,7 @@
 #include <QDate>
 #include <QKeyEvent>
 #include <QLocale>
-#include <QStyle>
+#include <QPainter>
 #include <QVBoxLayout>
 
 #include "platform/qt/QtClock.h"
@@ -51,12 +51,28 @@ QDate DateIn(const QString& text) {
   return date;
 }
 
+QIcon CalendarIcon(const QColor& colour) {
+  constexpr int size = 64;
+  QPixmap picture(size, size);
+  picture.fill(Qt::transparent);
+  QPainter painter(&picture);
+  painter.setRenderHint(QPainter::Antialiasing);
+  painter.setPen(QPen(colour, 5));
+  painter.drawRoundedRect(QRect(8, 12, 48, 46), 6, 6);
+  painter.fillRect(QRect(8, 16, 48, 12), colour);
+  painter.drawLine(20, 4, 20, 16);
+  painter.drawLine(44, 4, 44, 16);
+  for (int day = 0; day < 6; ++day) {
+    painter.fillRect(QRect(17 + day % 3 * 12, 35 + day / 3 * 10, 6, 5), colour);
+  }
+  return picture;
+}
+
 }  // namespace
 
 DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
   setPlaceholderText(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
-  QAction* calendar =
-      addAction(style()->standardIcon(QStyle::SP_ArrowDown, nullptr, this), QLineEdit::TrailingPosition);
+  QAction* calendar = addAction(CalendarIcon(palette().color(QPalette::Text)), QLineEdit::TrailingPosition);
   connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
   connect(this, &QLineEdit::textEdited, this, &DatePicker::TakeText);
   connect(this, &QLineEdit::editingFinished, this, &DatePicker::ShowStored);

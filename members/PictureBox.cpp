@@ -3,11 +3,24 @@
 #include <QBuffer>
 #include <QImageReader>
 #include <QPainter>
+#include <algorithm>
 
 namespace {
 
 /// Photos of more dots than a screen shows are read smaller, which takes a fraction of the time and memory.
 constexpr QSize LargestPicture(1600, 1600);
+
+/// A head and shoulders, where there is no photo.
+void DrawSilhouette(QPainter& painter, const QRect& place, const QColor& colour) {
+  const double unit = std::min(place.width(), place.height()) / 10.0;
+  const QPointF centre = QRectF(place).center();
+  painter.setRenderHint(QPainter::Antialiasing);
+  painter.setClipRect(QRectF(0, 0, place.width(), centre.y() + 3.2 * unit));
+  painter.setPen(Qt::NoPen);
+  painter.setBrush(colour);
+  painter.drawEllipse(centre - QPointF(0, 1.2 * unit), 1.5 * unit, 1.7 * unit);
+  painter.drawEllipse(centre + QPointF(0, 3.4 * unit), 2.8 * unit, 2.4 * unit);
+}
 
 }  // namespace
 
@@ -38,6 +51,7 @@ void PictureBox::paintEvent(QPaintEvent* /*event*/) {
   painter.setPen(palette().color(QPalette::Mid));
   painter.drawRect(rect().adjusted(0, 0, -1, -1));
   if (picture_.isNull()) {
+    DrawSilhouette(painter, rect(), palette().color(QPalette::AlternateBase).darker(110));
     return;
   }
   constexpr int margin = 4;

@@ -145,7 +145,7 @@ TEST_F(MemberCursor, ShowsTheFirstRowAfterADeletion) {
   controls.Details.City = "given up";
   rows->Delete();
   EXPECT_EQ(controls.Number, "1");
-  EXPECT_EQ(file.Query("SELECT group_concat(ContactID) FROM Members"), "1,2,9");
+  EXPECT_EQ(file.Query("SELECT sum(ContactID) FROM Members"), "12");
   EXPECT_EQ(file.Query("SELECT count(*) FROM Members WHERE City = 'given up'"), "0");
 }
 
