@@ -15,6 +15,9 @@ using testing::IsEmpty;
 class NoDatabase : public Database {
  public:
   std::unique_ptr<Recordset> OpenRecordset(const std::string& /*source*/) override { return nullptr; }
+  void BeginTrans() override {}
+  void CommitTrans() override {}
+  void Rollback() noexcept override {}
 };
 
 /// Opens what exists and is not said to be bad.
