@@ -210,6 +210,17 @@ std::string Str(double value) {
   return NumberForm(value);
 }
 
+std::string PlainNumber(double value) {
+  std::string text = Str(value);
+  if (text.front() == ' ') {
+    text.erase(0, 1);
+  }
+  if (const auto point = text.find('.'); point == 0 || (point == 1 && text.front() == '-')) {
+    text.insert(point, "0");
+  }
+  return text;
+}
+
 double Val(std::string_view text) {
   text = Trimmed(text);
   std::string dense;

@@ -14,6 +14,10 @@ std::string Str(std::int32_t value);
 std::string Str(float value);
 std::string Str(double value);
 
+/// As a reader of records expects it: 12, 0.5, -0.25. No leading blank; digits and exponent as in Str. Throws
+/// as Str does.
+std::string PlainNumber(double value);
+
 /// Value of the leading numeric part of `text`: "12abc" is 12, and a text without one is 0. Blanks, tabs and
 /// line breaks count nowhere: "1 2" is 12. Never throws; a value too large for a double becomes the largest
 /// one whose number form can still be read back.

@@ -71,15 +71,20 @@ QIcon CalendarIcon(const QColor& colour) {
 }  // namespace
 
 DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
-  setPlaceholderText(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
+  setToolTip(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
   QAction* calendar = addAction(CalendarIcon(palette().color(QPalette::Text)), QLineEdit::TrailingPosition);
   connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
   connect(this, &QLineEdit::textEdited, this, &DatePicker::TakeText);
-  connect(this, &QLineEdit::editingFinished, this, &DatePicker::ShowStored);
+  connect(this, &QLineEdit::editingFinished, this, &DatePicker::Finish);
 }
 
 void DatePicker::SetStored(const std::string& stored) {
   stored_ = stored;
+  Finish();
+}
+
+void DatePicker::Finish() {
+  finished_ = stored_;
   ShowStored();
 }
 
@@ -88,11 +93,15 @@ void DatePicker::ShowStored() {
   setText(date.isValid() ? QString::fromStdString(ShortDateText(QLocale::system(), date)) : QString());
 }
 
+// Half of a text may be a date of its own, "1961-02-3", or none.
 void DatePicker::TakeText(const QString& text) {
+  const QDate date = DateIn(text.trimmed());
   if (text.trimmed().isEmpty()) {
     stored_.clear();
-  } else if (const QDate date = DateIn(text.trimmed()); date.isValid()) {
+  } else if (date.isValid()) {
     TakeDate(date);
+  } else {
+    stored_ = finished_;
   }
 }
 
@@ -111,7 +120,7 @@ void DatePicker::keyPressEvent(QKeyEvent* event) {
 void DatePicker::focusOutEvent(QFocusEvent* event) {
   QLineEdit::focusOutEvent(event);
   if (event->reason() != Qt::PopupFocusReason) {
-    ShowStored();
+    Finish();
   }
 }
 
@@ -127,7 +136,7 @@ void DatePicker::OpenCalendar() {
   }
   const auto take = [this, popup](QDate date) {
     TakeDate(date);
-    ShowStored();
+    Finish();
     popup->close();
   };
   connect(calendar, &QCalendarWidget::clicked, this, take);

@@ -24,9 +24,11 @@ class DatePicker : public QLineEdit {
 
  private:
   void TakeText(const QString& text);
+  void Finish();
   void TakeDate(QDate date);
   void ShowStored();
   void OpenCalendar();
 
   std::string stored_;
+  std::string finished_;  ///< what stands when the text in the entry is no date
 };

@@ -30,6 +30,11 @@ QString DateText(const std::string& stored) {
                                 ShortTimeText(locale, date.time()));
 }
 
+QString FigureText(const Value& value) {
+  const bool isNull = std::holds_alternative<std::monostate>(value);
+  return isNull ? QString() : QString::fromStdString(PlainNumber(NumberOf(value)));
+}
+
 QString AccuracyText(double accuracy) {
   return accuracy == 0 ? QStringLiteral("N/A") : QString::fromStdString(FormatPercent(accuracy));
 }
@@ -63,8 +68,7 @@ void Members::ConnectCommands() {
   };
   for (const auto& entry : commands) {
     const auto command = entry.second;
-    connect(entry.first, &QAbstractButton::clicked, this,
-            [this, command] { Run([this, command] { (this->*command)(); }); });
+    ConnectButton(*entry.first, [this, command] { (this->*command)(); });
   }
   const std::pair<QAbstractButton*, void (MemberRows::*)()> arrows[] = {
       {ui_->DataFirst, &MemberRows::MoveFirst},
@@ -74,9 +78,17 @@ void Members::ConnectCommands() {
   };
   for (const auto& entry : arrows) {
     const auto move = entry.second;
-    connect(entry.first, &QAbstractButton::clicked, this,
-            [this, move] { Run([this, move] { ((*data1_).*move)(); }); });
+    ConnectButton(*entry.first, [this, move] { ((*data1_).*move)(); });
   }
+}
+
+// A button that is pressed by other means than the mouse takes the focus, too: or the search box, left after
+// the command, would go back to the first member.
+void Members::ConnectButton(QAbstractButton& button, const std::function<void()>& command) {
+  connect(&button, &QAbstractButton::clicked, this, [this, &button, command] {
+    button.setFocus();
+    Run(command);
+  });
 }
 
 void Members::Run(const std::function<void()>& command) {
@@ -104,7 +116,9 @@ void Members::Activate() {
   RunClearSearch();
   if (ContactToShow != 0) {
     data1_->WalkTo(ContactToShow);
-    ui_->FirstNameEntry->setFocus();  // leaving the search box would go back to the first member
+    // Leaving the search box would go back to the first member.
+    QWidget* const focus = data1_->HasRow() ? static_cast<QWidget*>(ui_->FirstNameEntry) : ui_->DataPrevious;
+    focus->setFocus();
   } else {
     ui_->SearchText->setFocus();
   }
@@ -145,18 +159,16 @@ void Members::ShowRow(Recordset& rows) {
   Show(*ui_->PostCodeEntry, details.PostalCode);
   Show(*ui_->EmailEntry, details.EmailName);
   Show(*ui_->PhoneNumberEntry, details.PhoneNumber);
-  const std::pair<QLabel*, const char*> displays[] = {
-      {ui_->MemberIDDisplay, "DallasID"},
-      {ui_->TotalGamesPlayedDisplay, "TotalGamesPlayed"},
-      {ui_->TotalDamageDisplay, "TotalDamage"},
-      {ui_->AverageDamageDisplay, "AverageDamage"},
-      {ui_->TotalSoldieringDisplay, "TotalSoldiering"},
+  const std::pair<QLabel*, const char*> figures[] = {
+      {ui_->TotalGamesPlayedDisplay, "TotalGamesPlayed"},   {ui_->TotalDamageDisplay, "TotalDamage"},
+      {ui_->AverageDamageDisplay, "AverageDamage"},         {ui_->TotalSoldieringDisplay, "TotalSoldiering"},
       {ui_->AverageSoldieringDisplay, "AverageSoldiering"},
-      {ui_->Dummy, "ContactID"},
   };
-  for (const auto& [display, column] : displays) {
-    display->setText(QString::fromStdString(TextOf(rows.Fields(column))));
+  for (const auto& [display, column] : figures) {
+    display->setText(FigureText(rows.Fields(column)));
   }
+  ui_->MemberIDDisplay->setText(QString::fromStdString(TextOf(rows.Fields("DallasID"))));
+  ui_->Dummy->setText(QString::fromStdString(TextOf(rows.Fields("ContactID"))));
   ui_->DateJoinedDisplay->setText(DateText(TextOf(rows.Fields("DateJoined"))));
   ui_->LastPlayedDisplay->setText(DateText(TextOf(rows.Fields("LastPlayedDate"))));
   SetEntriesEnabled(true);

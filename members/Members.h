@@ -14,6 +14,8 @@
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
 
+class QAbstractButton;
+
 namespace Ui {
 class Members;
 }
@@ -54,6 +56,7 @@ class Members : public QDialog, private BoundControls {
   void RowChanged() override;
 
   void ConnectCommands();
+  void ConnectButton(QAbstractButton& button, const std::function<void()>& command);
   void Run(const std::function<void()>& command);
   /// As Run, but a failure is told only when the present event is over.
   void RunInFocusChange(const std::function<void()>& command);

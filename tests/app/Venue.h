@@ -74,8 +74,8 @@ class Venue {
     if (waits_ == Waits::Real) {
       events = &RealEvents;
     }
-    Window = std::make_unique<frmRx>(
-        ::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places, Boxes, Devices, Port, Word});
+    Window = std::make_unique<frmRx>(::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places,
+                                                Boxes, Devices, Port, Word, ButtonSwipe});
     return *Window;
   }
 
@@ -167,6 +167,8 @@ class Venue {
   FakeSerialDevices Devices;
   FakeSerialPort Port;
   FakeWordProcessor Word;
+  /// The reader of membership buttons; none as long as it is empty.
+  std::function<std::string()> ButtonSwipe;
   std::unique_ptr<frmRx> Window;
 
  private:

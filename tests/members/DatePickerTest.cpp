@@ -1,1 +1,136 @@
+#include "members/DatePicker.h"
+
 #include <gtest/gtest.h>
+
+#include <QApplication>
+#include <QCalendarWidget>
+#include <QTest>
+
+#include "tests/app/Controls.h"
+
+namespace {
+
+/// A date entry with another control beside it, in the forms of the C locale ("12 Apr 1961").
+class DateEntry : public testing::Test {
+ protected:
+  DateEntry() {
+    other.move(0, 60);
+    ::Show(window);
+    picker.setFocus();
+  }
+
+  void Enter(const std::string& text) {
+    picker.setFocus();
+    picker.selectAll();
+    QTest::keyClick(&picker, Qt::Key_Delete);
+    QTest::keyClicks(&picker, QString::fromStdString(text));
+  }
+
+  void Leave() { other.setFocus(); }
+  std::string Shown() { return picker.text().toStdString(); }
+
+  QCalendarWidget* Calendar() {
+    QWidget* popup = QApplication::activePopupWidget();
+    return popup == nullptr ? nullptr : popup->findChild<QCalendarWidget*>();
+  }
+
+  QWidget window;
+  DatePicker picker{&window};
+  QLineEdit other{&window};
+};
+
+TEST_F(DateEntry, ShowsAStoredDateWithAllDigitsOfTheYear) {
+  picker.SetStored("2004-02-29 00:00:00");
+  EXPECT_EQ(Shown(), "29 Feb 2004");
+  picker.SetStored("1899-12-31 10:20:30");
+  EXPECT_EQ(Shown(), "31 Dec 1899");
+  EXPECT_EQ(picker.Stored(), "1899-12-31 10:20:30");
+}
+
+TEST_F(DateEntry, IsEmptyWithoutADate) {
+  picker.SetStored("1961-04-12 00:00:00");
+  picker.SetStored("");
+  EXPECT_EQ(Shown(), "");
+  EXPECT_EQ(picker.Stored(), "");
+}
+
+TEST_F(DateEntry, KeepsWhatIsStoredAsItWasWhenNothingIsTyped) {
+  for (const char* stored : {"1961-04-12 11:22:33", "no date at all", ""}) {
+    picker.SetStored(stored);
+    picker.setFocus();
+    Leave();
+    EXPECT_EQ(picker.Stored(), stored);
+  }
+}
+
+TEST_F(DateEntry, TakesTheSystemsFormAndYearMonthDay) {
+  Enter("12 Apr 1961");
+  EXPECT_EQ(picker.Stored(), "1961-04-12 00:00:00");
+  Enter("1958-2-28");
+  EXPECT_EQ(picker.Stored(), "1958-02-28 00:00:00");
+  Enter(" 2010-12-01 ");
+  EXPECT_EQ(picker.Stored(), "2010-12-01 00:00:00");
+  Leave();
+  EXPECT_EQ(Shown(), "1 Dec 2010");
+}
+
+TEST_F(DateEntry, TakesTwoDigitsOfAYearAsOfTheLastHundredYears) {
+  const int thisYear = QDate::currentDate().year();
+  const auto twoDigits = [](int year) {
+    return "1 Jan " + QString::number(year % 100).rightJustified(2, u'0').toStdString();
+  };
+  for (const int year : {thisYear - 99, thisYear - 60, thisYear - 1, thisYear}) {
+    Enter(twoDigits(year));
+    EXPECT_EQ(picker.Stored(), std::to_string(year) + "-01-01 00:00:00");
+  }
+}
+
+TEST_F(DateEntry, TakesDatesBefore1970) {
+  for (const char* date : {"1969-12-31", "1901-01-01", "1752-09-14"}) {
+    Enter(date);
+    Leave();
+    EXPECT_EQ(picker.Stored(), date + std::string(" 00:00:00"));
+  }
+}
+
+TEST_F(DateEntry, GivesUpATextThatIsNoDateForTheLastOne) {
+  picker.SetStored("1961-04-12 00:00:00");
+  for (const char* text : {"yesterday", "1961-02-30", "1961-13-01", "12"}) {
+    Enter(text);
+    Leave();
+    EXPECT_EQ(Shown(), "12 Apr 1961") << text;
+    EXPECT_EQ(picker.Stored(), "1961-04-12 00:00:00") << text;
+  }
+}
+
+TEST_F(DateEntry, IsEmptiedByDeletingItsText) {
+  picker.SetStored("1961-04-12 00:00:00");
+  Enter("");
+  Leave();
+  EXPECT_EQ(picker.Stored(), "");
+  EXPECT_EQ(Shown(), "");
+}
+
+TEST_F(DateEntry, ChoosesInACalendarByTheKeyboard) {
+  picker.SetStored("1961-04-12 00:00:00");
+  QTest::keyClick(&picker, Qt::Key_Down, Qt::AltModifier);
+  QCalendarWidget* calendar = Calendar();
+  ASSERT_NE(calendar, nullptr);
+  EXPECT_EQ(calendar->selectedDate(), QDate(1961, 4, 12));
+  calendar->setSelectedDate(QDate(1961, 5, 20));
+  emit calendar->activated(calendar->selectedDate());
+  EXPECT_EQ(picker.Stored(), "1961-05-20 00:00:00");
+  EXPECT_EQ(Shown(), "20 May 1961");
+  EXPECT_EQ(Calendar(), nullptr);
+}
+
+TEST_F(DateEntry, ClosesTheCalendarByEscapeAndKeepsTheDate) {
+  picker.SetStored("1961-04-12 00:00:00");
+  QTest::keyClick(&picker, Qt::Key_Down, Qt::AltModifier);
+  ASSERT_NE(Calendar(), nullptr);
+  QTest::keyClick(QApplication::activePopupWidget(), Qt::Key_Escape);
+  EXPECT_EQ(Calendar(), nullptr);
+  EXPECT_EQ(picker.Stored(), "1961-04-12 00:00:00");
+}
+
+}  // namespace

@@ -2,56 +2,48 @@
 
 #include <gmock/gmock.h>
 
-#include <QBuffer>
-#include <QImage>
 #include <QLabel>
 #include <QLineEdit>
 
-#include "members/DatePicker.h"
+#include "core/Game.h"
 #include "members/Members.h"
 #include "members/PictureBox.h"
 #include "tests/app/Venue.h"
 #include "tests/platform/qt/WhileModal.h"
 
-/// A picture file of one colour.
-inline std::string PictureFile(const QColor& colour, const char* format = "JPG", QSize size = QSize(80, 60)) {
-  QImage image(size, QImage::Format_RGB32);
-  image.fill(colour);
-  QByteArray bytes;
-  QBuffer buffer(&bytes);
-  image.save(&buffer, format);
-  return bytes.toStdString();
-}
-
 /// The window of the members, opened from the main window on Rhys Morgan (1), Alice "Mole" Belmont (2), Sean
-/// O'Brien (5) and 王小明 (9).
+/// "Shamrock" O'Brien (5) and 王小明 (9).
 class MembersWindow : public testing::Test {
  protected:
   MembersWindow() {
     venue.PutDefaultFiles();
-    Sql("INSERT INTO Members (ContactID, FirstName, LastName, NickName, Clan, Birthdate, DateJoined, City) VALUES "
-        "(1, 'Rhys', 'Morgan', NULL, 'Red Dragons', '1961-04-12 00:00:00', '2010-03-01 09:05:00', 'Cardiff'), "
+    Sql("INSERT INTO Members (ContactID, FirstName, LastName, NickName, Clan, Birthdate, DateJoined, City) "
+        "VALUES (1, 'Rhys', 'Morgan', NULL, 'Red Dragons', '1961-04-12 00:00:00', '2010-03-01 09:05:00', "
+        "'Cardiff'), "
         "(2, 'Alice', 'Belmont', 'Mole', '', NULL, NULL, NULL), "
         "(5, 'Sean', 'O''Brien', 'Shamrock', NULL, NULL, NULL, NULL), "
         "(9, '小明', '王', NULL, NULL, NULL, NULL, NULL)");
+    venue.ButtonSwipe = [this] { return swiped; };
     venue.Start();
   }
 
   void Sql(const std::string& sql) { venue.ChangeDatabase("members.mdb", sql); }
+  std::string Query(const std::string& sql) { return venue.QueryDatabase("members.mdb", sql); }
 
+  /// A column of one member, read by another program.
   std::string Stored(const std::string& column, int member) {
-    return venue.QueryDatabase("members.mdb",
-                               "SELECT " + column + " FROM Members WHERE ContactID = " + std::to_string(member));
+    return Query("SELECT " + column + " FROM Members WHERE ContactID = " + std::to_string(member));
   }
 
   /// Opens the window, does `act` in it, and closes it by its close box where `act` did not.
-  void Open(const std::function<void()>& act, const char* menuItem = "mnuManageMembers") {
+  void Open(const std::function<void()>& act) {
     const WhileModal<Members> open([&](Members& opened) {
       window = &opened;
+      EXPECT_TRUE(QTest::qWaitFor([this] { return QApplication::activeWindow() == window; }));
       act();
       opened.close();
     });
-    venue.Trigger(menuItem);
+    venue.Trigger("mnuManageMembers");
     EXPECT_EQ(open.Runs(), 1);
     window = nullptr;
   }
@@ -61,19 +53,36 @@ class MembersWindow : public testing::Test {
   std::string Text(const std::string& name) { return Line(name).text().toStdString(); }
   std::string Shown(const std::string& name) { return ::Find<QLabel>(*window, name).text().toStdString(); }
   PictureBox& Photo() { return ::Find<PictureBox>(*window, "MemberPhoto"); }
-  QColor PhotoColour() { return Photo().Picture().pixelColor(10, 10); }
 
   /// The operator types over what an entry holds.
   void Enter(const std::string& name, const std::string& text) {
     Line(name).setFocus();
     Line(name).selectAll();
     QTest::keyClick(&Line(name), Qt::Key_Delete);
-    QTest::keyClicks(&Line(name), QString::fromStdString(text));
+    const QString typed = QString::fromStdString(text);
+    if (QString::fromLatin1(typed.toLatin1()) == typed) {
+      QTest::keyClicks(&Line(name), typed);
+    } else {
+      Line(name).insert(typed);  // there are no keys for it
+    }
   }
 
+  /// Types a name to search for and leaves the box with the Tab key.
   void SearchFor(const std::string& text) {
     Enter("SearchText", text);
     Type(*window, Qt::Key_Tab);
+    QApplication::processEvents();  // a fault is told when the focus has moved
+  }
+
+  /// Last names of all rows that the cursor goes through, each followed by a blank.
+  std::string Found() {
+    std::string names;
+    Press("DataFirst");
+    for (std::string place; place != Shown("DataPlace"); Press("DataNext")) {
+      place = Shown("DataPlace");
+      names += Text("LastNameEntry") + " ";
+    }
+    return names;
   }
 
   static FakeMessageBoxes::Box Fault(int number, const std::string& text) {
@@ -82,5 +91,6 @@ class MembersWindow : public testing::Test {
   }
 
   Venue venue;
+  std::string swiped = NoDallasId;  ///< what the reader reads
   Members* window = nullptr;
 };

@@ -1,1 +1,75 @@
+#include "members/PictureBox.h"
+
 #include <gtest/gtest.h>
+
+#include <QWidget>
+
+#include "tests/members/Pictures.h"
+
+namespace {
+
+class APictureBox : public testing::Test {
+ protected:
+  APictureBox() { box.resize(200, 100); }
+
+  QColor At(int x, int y) { return box.grab().toImage().pixelColor(x, y); }
+
+  PictureBox box{nullptr};
+};
+
+TEST_F(APictureBox, ReadsTheUsualKinds) {
+  for (const char* format : {"BMP", "JPG", "PNG", "PPM"}) {
+    box.Clear();
+    box.Load(PictureFile(Qt::white, format));
+    EXPECT_EQ(box.Picture().size(), QSize(80, 60)) << format;
+  }
+}
+
+TEST_F(APictureBox, ReadsGif) {
+  // One black dot.
+  const char gif[] =
+      "GIF89a\x01\x00\x01\x00\x80\x00\x00\x00\x00\x00\xFF\xFF\xFF\x2C\x00\x00\x00\x00\x01\x00\x01\x00\x00\x02"
+      "\x02\x44\x01\x00\x3B";
+  box.Load(std::string(gif, sizeof gif - 1));
+  EXPECT_EQ(box.Picture().size(), QSize(1, 1));
+}
+
+TEST_F(APictureBox, IgnoresBytesBehindThePicture) {
+  for (const char* format : {"BMP", "JPG", "PNG"}) {
+    box.Clear();
+    box.Load(PictureFile(Qt::white, format) + std::string(10000, '\0'));
+    EXPECT_EQ(box.Picture().size(), QSize(80, 60)) << format;
+  }
+}
+
+TEST_F(APictureBox, FitsThePictureWithItsProportions) {
+  box.Load(PictureFile(Qt::red));  // 4 to 3, in a box of 2 to 1
+  EXPECT_EQ(At(100, 50), QColor(Qt::red));
+  EXPECT_EQ(At(100, 6), QColor(Qt::red));
+  EXPECT_NE(At(20, 50), QColor(Qt::red));
+  EXPECT_NE(At(180, 50), QColor(Qt::red));
+}
+
+TEST_F(APictureBox, ShowsNoPictureOfDamagedBytes) {
+  for (const std::string& bytes :
+       {std::string(), std::string("no picture"), PictureFile(Qt::red).substr(0, 20)}) {
+    box.Load(PictureFile(Qt::red));
+    box.Load(bytes);
+    EXPECT_TRUE(box.Picture().isNull());
+    EXPECT_NE(At(100, 50), QColor(Qt::red));
+  }
+}
+
+TEST_F(APictureBox, ReadsAVeryLargePictureSmaller) {
+  box.Load(PictureFile(Qt::red, "JPG", QSize(4000, 1000)));
+  EXPECT_EQ(box.Picture().size(), QSize(1600, 400));
+}
+
+TEST_F(APictureBox, ShowsNothingOfThePictureBeforeOnceCleared) {
+  box.Load(PictureFile(Qt::red));
+  box.Clear();
+  EXPECT_TRUE(box.Picture().isNull());
+  EXPECT_NE(At(100, 50), QColor(Qt::red));
+}
+
+}  // namespace
