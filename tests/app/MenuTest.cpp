@@ -126,6 +126,12 @@ TEST_P(MenuBar, DisablesWhatHasNoWindowYet) {
   EXPECT_TRUE(venue.Find<QPushButton>("GetScores").isEnabled());
 }
 
+TEST_P(MenuBar, OffersToCheckAMembershipButtonWhereThereIsAReader) {
+  venue.ButtonSwipe = [] { return std::string(NoDallasId); };
+  venue.MakeWindow().FormLoad();
+  EXPECT_TRUE(venue.Find<QAction>("mnuCheckButton").isEnabled());
+}
+
 TEST_P(MenuBar, GivesNoAltKeyTwice) {
   const auto letterOf = [](const QAction* action) {
     const auto mark = action->text().indexOf(u'&');

@@ -6,6 +6,7 @@
 #include "app/Settings.h"
 #include "app/SoldieringCalc.h"
 #include "app/UploadProgress.h"
+#include "members/Members.h"
 #include "missions/MissionNameEntry.h"
 #include "missions/Scenarios.h"
 #include "tests/app/CaredFor.h"
@@ -40,6 +41,17 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<Scenarios>("mnuSetupMissions");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
+}
+
+TEST_P(Windows, OfTheMembersIsCaredForWithAndWithoutAMember) {
+  LookAt<Members>("mnuManageMembers");
+  venue.ChangeDatabase(
+      "members.mdb",
+      "INSERT INTO Members (DallasID, FirstName, LastName, DateJoined, LastPlayedDate, "
+      "TotalGamesPlayed, TotalDamage, AverageDamage, TotalSoldiering, AverageSoldiering, "
+      "AveragePrimAccuracy) VALUES ('EFCDAB8967452301', 'Ada', 'Byron', '2010-03-01 09:05:00', "
+      "'2026-11-20 20:15:00', 1234, 123456.5, 1000.25, -123456, -1000.75, 1)");
+  LookAt<Members>("mnuManageMembers");
 }
 
 TEST_P(Windows, OfAPlayerAreCaredFor) {
