@@ -149,11 +149,12 @@ void frmRx::SetUpLists() {
 }
 
 bool frmRx::OpenDatabases() {
+  backups_.emplace(userDataFolder_ + "/backups", services_.Disk, services_.Time);
   const auto open = [this](const std::string& name, const std::string& table) {
     const std::string program = services_.Places.Program();
     return OpenUserDatabase(
         {userDataFolder_ + "/" + name + ".mdb", table, program + "/" + name + "_default.mdb"},
-        {services_.Databases, services_.Old, services_.Disk, services_.Boxes});
+        {services_.Databases, services_.Old, services_.Disk, services_.Boxes, *backups_});
   };
   dbScenarios_ = open("scenarios", "Table1");
   if (!dbScenarios_) {
@@ -213,8 +214,17 @@ void frmRx::Run(const std::function<void()>& command) {
   ++runningCommands_;
   ReportErrors(services_.Boxes, command);
   --runningCommands_;
+  if (runningCommands_ == 0) {
+    TellOfMissingBackup();
+  }
   if (closeRequested_ && runningCommands_ == 0) {
     close();
+  }
+}
+
+void frmRx::TellOfMissingBackup() {
+  if (const std::string reason = backups_->TakeFailure(); !reason.empty()) {
+    services_.Boxes.Show(reason, "Database status", BoxIcon::Exclamation);
   }
 }
 

@@ -8,6 +8,7 @@
 #include <string>
 
 #include "app/Services.h"
+#include "core/Backups.h"
 #include "core/CommPort.h"
 #include "core/Game.h"
 #include "core/GameFileDialog.h"
@@ -48,6 +49,8 @@ class frmRx : public QMainWindow {
   void ConnectCommands();
   /// Runs a command of the operator; a failure in it is reported and ends the command.
   void Run(const std::function<void()>& command);
+
+  void TellOfMissingBackup();
 
   void FillMissionList();
   void SelectMission(int index);
@@ -96,6 +99,7 @@ class frmRx : public QMainWindow {
   // In the order in which start-up makes them.
   std::optional<IniReader> ini_;
   std::optional<CommPort> commPort_;
+  std::optional<Backups> backups_;
   std::unique_ptr<Database> dbScenarios_;
   std::unique_ptr<Recordset> rsScenarios_;
   std::optional<MissionList> missions_;

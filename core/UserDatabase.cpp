@@ -19,6 +19,12 @@ void TellOfConversion(const UserDatabase& database, const OldDatabaseReport& rep
   boxes.Show(text, Title, BoxIcon::Information);
 }
 
+std::unique_ptr<Database> Open(const std::string& path, const DatabaseServices& services) {
+  std::unique_ptr<Database> database = services.Engine.OpenDatabase(path);
+  services.Copies.Guard(*database, path);
+  return database;
+}
+
 std::string FreshPath(const std::string& path) {
   const std::string extension = ".mdb";
   return path.substr(0, path.size() - extension.size()) + "-new" + extension;
@@ -33,7 +39,7 @@ std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const D
       TellOfConversion(database, services.Old.Convert(database.Path, database.Table, database.DefaultPath),
                        services.Boxes);
     }
-    return services.Engine.OpenDatabase(database.Path);
+    return Open(database.Path, services);
   } catch (const RuntimeError& error) {
     if (error.Number() != UnrecognizedFormat) {
       throw;
@@ -52,5 +58,5 @@ std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const D
   if (!services.Disk.FileExists(fresh)) {
     services.Disk.Replace(fresh, services.Disk.Read(database.DefaultPath));
   }
-  return services.Engine.OpenDatabase(fresh);
+  return Open(fresh, services);
 }

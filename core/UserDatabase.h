@@ -3,6 +3,7 @@
 #include <memory>
 #include <string>
 
+#include "core/Backups.h"
 #include "platform/Database.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
@@ -21,10 +22,12 @@ struct DatabaseServices {
   OldDatabases& Old;
   Files& Disk;
   MessageBoxes& Boxes;
+  Backups& Copies;
 };
 
-/// Opens a database. A file of an old installation is converted first, which is told. One that cannot be read
-/// stays untouched: the operator is asked whether to go on with a fresh copy beside it, named "...-new.mdb",
-/// which is kept for the next such start. Returns nullptr when the operator chose to end the program. Throws
-/// RuntimeError as DatabaseEngine::OpenDatabase does for all but an unrecognized format.
+/// Opens a database, of which a backup copy will be made before its first change. A file of an old
+/// installation is converted first, which is told. One that cannot be read stays untouched: the operator is
+/// asked whether to go on with a fresh copy beside it, named "...-new.mdb", which is kept for the next such
+/// start. Returns nullptr when the operator chose to end the program. Throws RuntimeError as
+/// DatabaseEngine::OpenDatabase does for all but an unrecognized format.
 std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseServices& services);

@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -98,6 +99,15 @@ class Database {
   virtual void BeginTrans() = 0;
   virtual void CommitTrans() = 0;
   virtual void Rollback() noexcept = 0;
+
+  /// Runs `action` before each change through this database until it returns true. It may read, not write,
+  /// through this database, and must not throw.
+  virtual void BeforeChange(std::function<bool()> action) = 0;
+
+  /// Writes what the file holds to a new file at `path`, whose bytes are durable on return. Others can read
+  /// and write meanwhile. A failure may leave a part of the new file. Throws RuntimeError 3xxx as writing
+  /// does.
+  virtual void CopyTo(const std::string& path) = 0;
 };
 
 /// Makes many reads of a database cheap as long as it lives. While it holds the lock no other program, and no

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <string>
+#include <vector>
 
 /// Files and folders by path (UTF-8, the platform's separator).
 class Files {
@@ -31,6 +32,13 @@ class Files {
 
   /// Writes the whole file in place, neither atomic nor durable: for temporary files. Throws as Replace does.
   virtual void Write(const std::string& path, const std::string& bytes) = 0;
+
+  /// Names of the files in a folder, in ascending order; none when there is no such folder.
+  virtual std::vector<std::string> FileNames(const std::string& folder) const = 0;
+
+  /// Gives a file another path on the same disk, in place of what is there. Durable on return. Throws
+  /// RuntimeError 53 when it does not exist, 61, 70, 75 or 76.
+  virtual void Rename(const std::string& path, const std::string& newPath) = 0;
 
   /// Deletes a file. Throws RuntimeError 53 when it does not exist, 70, 75 or 76.
   virtual void Delete(const std::string& path) = 0;

@@ -6,6 +6,7 @@
 #include <cerrno>
 #include <cstdio>
 
+#include <algorithm>
 #include <array>
 #include <filesystem>
 #include <random>
@@ -203,6 +204,28 @@ void LinuxFiles::Write(const std::string& path, const std::string& bytes) {
   const Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC | O_NONBLOCK, 0644));
   if (file.Number() < 0 || !WriteAll(file.Number(), bytes)) {
     throw FileError(errno, path);
+  }
+}
+
+std::vector<std::string> LinuxFiles::FileNames(const std::string& folder) const {
+  std::vector<std::string> names;
+  std::error_code none;
+  for (std::filesystem::directory_iterator entry(folder, none), end; entry != end; entry.increment(none)) {
+    if (!entry->is_directory(none)) {
+      names.push_back(entry->path().filename());
+    }
+  }
+  std::sort(names.begin(), names.end());
+  return names;
+}
+
+void LinuxFiles::Rename(const std::string& path, const std::string& newPath) {
+  if (!FileExists(path)) {
+    throw RuntimeError(53, "File not found: " + path);
+  }
+  const std::string parent = std::filesystem::path(newPath).parent_path();
+  if (rename(path.c_str(), newPath.c_str()) != 0 || !SyncFolder(parent.empty() ? "." : parent)) {
+    throw FileError(errno, newPath);
   }
 }
 

@@ -171,6 +171,33 @@ void SqliteConnection::Undo() noexcept {
   }
 }
 
+void SqliteConnection::PrepareChange() {
+  const bool canChange = sqlite3_db_readonly(handle_, "main") == 0;
+  if (canChange && beforeChange_ && beforeChange_()) {
+    beforeChange_ = nullptr;
+  }
+}
+
+void SqliteConnection::CopyTo(const std::string& path) {
+  sqlite3* copy = nullptr;
+  constexpr int Flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
+  int result = sqlite3_open_v2(path.c_str(), &copy, Flags, nullptr);
+  const std::unique_ptr<sqlite3, decltype(&sqlite3_close)> closeAtEnd(copy, sqlite3_close);
+  if (result == SQLITE_OK) {
+    // Nobody needs half of a copy, nor the journal that would undo it.
+    sqlite3_exec(copy, "PRAGMA journal_mode = OFF", nullptr, nullptr, nullptr);
+    sqlite3_backup* backup = sqlite3_backup_init(copy, "main", handle_, "main");
+    if (backup == nullptr) {
+      throw SqliteError(copy, path);
+    }
+    sqlite3_backup_step(backup, -1);
+    result = sqlite3_backup_finish(backup);
+  }
+  if (result != SQLITE_OK) {
+    throw SqliteError(copy, path);
+  }
+}
+
 void SqliteConnection::Execute(const char* sql) {
   if (sqlite3_exec(handle_, sql, nullptr, nullptr, nullptr) != SQLITE_OK) {
     Fail();
@@ -196,6 +223,7 @@ WriteTransaction::WriteTransaction(SqliteConnection& connection)
   connection.LeaveState();
   if (!isPart_) {
     connection.Rollback();
+    connection.PrepareChange();
     connection.Execute("BEGIN IMMEDIATE");
     connection.writing_ = true;
   } else if (sqlite3_get_autocommit(connection.Handle()) != 0) {

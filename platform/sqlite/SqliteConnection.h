@@ -2,7 +2,9 @@
 
 #include <chrono>
 #include <cstdint>
+#include <functional>
 #include <string>
+#include <utility>
 
 #include "platform/sqlite/SqliteStatement.h"
 
@@ -43,6 +45,10 @@ class SqliteConnection {
   /// transaction.
   void Rollback() noexcept;
 
+  /// See Database::BeforeChange and CopyTo.
+  void BeforeChange(std::function<bool()> action) { beforeChange_ = std::move(action); }
+  void CopyTo(const std::string& path);
+
   void Execute(const char* sql);
   std::int64_t LastInsertedKey() const;
   std::int64_t ChangedRows() const;
@@ -53,6 +59,7 @@ class SqliteConnection {
  private:
   friend class WriteTransaction;
 
+  void PrepareChange();
   void Undo() noexcept;
   void Configure(std::chrono::milliseconds busyTimeout);
   void CheckWholePages();
@@ -64,6 +71,7 @@ class SqliteConnection {
   SqliteStatement dataVersion_;
   std::int64_t versionRead_ = 0;  ///< counts the changes by others
   std::uint64_t state_ = 1;
+  std::function<bool()> beforeChange_;
 };
 
 /// Writes that reach the file together when Commit returns, or not at all. One inside another is a part of

@@ -4,6 +4,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <utility>
 
 #include "platform/Database.h"
 #include "platform/sqlite/SqliteConnection.h"
@@ -20,6 +21,8 @@ class SqliteDatabase : public Database {
   void BeginTrans() override { group_.emplace(connection_); }
   void CommitTrans() override;
   void Rollback() noexcept override { group_.reset(); }
+  void BeforeChange(std::function<bool()> action) override { connection_.BeforeChange(std::move(action)); }
+  void CopyTo(const std::string& path) override { connection_.CopyTo(path); }
 
  private:
   SqliteConnection connection_;

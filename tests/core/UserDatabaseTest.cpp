@@ -2,6 +2,7 @@
 
 #include <gmock/gmock.h>
 
+#include "tests/fakes/FakeClock.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/fakes/FakeOldDatabases.h"
@@ -18,6 +19,11 @@ class NoDatabase : public Database {
   void BeginTrans() override {}
   void CommitTrans() override {}
   void Rollback() noexcept override {}
+  void BeforeChange(std::function<bool()> action) override { BeforeChangeOf = std::move(action); }
+  void CopyTo(const std::string& path) override { CopiedTo = path; }
+
+  std::function<bool()> BeforeChangeOf;
+  std::string CopiedTo;
 };
 
 /// Opens what exists and is not said to be bad.
@@ -45,7 +51,7 @@ class Opening : public testing::Test {
 
   std::unique_ptr<Database> Open() {
     return OpenUserDatabase({"/data/members.mdb", "Members", "/program/members_default.mdb"},
-                            {engine, old, disk, boxes});
+                            {engine, old, disk, boxes, copies});
   }
 
   static FakeMessageBoxes::Box Question(const std::string& reason) {
@@ -60,6 +66,8 @@ class Opening : public testing::Test {
   FakeOldDatabases old;
   FakeFiles disk;
   FakeMessageBoxes boxes;
+  FakeClock clock;
+  Backups copies{"/data/backups", disk, clock};
 };
 
 TEST_F(Opening, OfAFileOfTodayIsSilent) {
@@ -82,6 +90,22 @@ TEST_F(Opening, ConvertsAnOldFileAndTellsWhatWasNotTaken) {
           "is "
           "kept as /data/members.mdb.jet.\n\nNot taken over:\ntable Extras (3 rows)\ncolumn Shoe size",
           "Database status", BoxIcon::Information, BoxButtons::Ok}));
+}
+
+TEST_F(Opening, HasTheFileCopiedBeforeItChanges) {
+  const auto database = Open();
+  auto& opened = dynamic_cast<NoDatabase&>(*database);
+  ASSERT_TRUE(opened.BeforeChangeOf);
+  opened.BeforeChangeOf();
+  EXPECT_EQ(opened.CopiedTo, "/data/backups/members.part");
+}
+
+TEST_F(Opening, HasAFreshFileCopiedUnderItsOwnName) {
+  engine.BadPath = "/data/members.mdb";
+  const auto database = Open();
+  auto& opened = dynamic_cast<NoDatabase&>(*database);
+  opened.BeforeChangeOf();
+  EXPECT_EQ(opened.CopiedTo, "/data/backups/members-new.part");
 }
 
 TEST_F(Opening, GoesOnWithAFreshFileBesideADamagedOne) {

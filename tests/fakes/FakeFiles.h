@@ -115,6 +115,25 @@ class FakeFiles : public Files {
     contents_[path] = bytes;
   }
 
+  std::vector<std::string> FileNames(const std::string& folder) const override {
+    std::vector<std::string> names;
+    for (const auto& [path, bytes] : contents_) {
+      if (ParentOf(path) == WithoutSeparator(folder)) {
+        names.push_back(path.substr(path.rfind('/') + 1));
+      }
+    }
+    return names;
+  }
+
+  void Rename(const std::string& path, const std::string& newPath) override {
+    ThrowIfTold(replaceFailures_, newPath);
+    if (!FileExists(path)) {
+      throw RuntimeError(53);
+    }
+    contents_[newPath] = contents_[path];
+    contents_.erase(path);
+  }
+
   void Delete(const std::string& path) override {
     ThrowIfTold(deleteFailures_, path);
     if (contents_.erase(path) == 0) {

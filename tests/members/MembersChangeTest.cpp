@@ -253,9 +253,10 @@ TEST_F(MembersWindow, KeepsTheOldRowsOfAFullDisk) {
     EXPECT_EQ(Stored("Address", 1), "NULL");
     Press("DataNext");
   });
-  ASSERT_EQ(venue.Boxes.Boxes.size(), 3U);
+  ASSERT_EQ(venue.Boxes.Boxes.size(), 4U);
   EXPECT_THAT(venue.Boxes.Boxes[0].Text, testing::StartsWith("Run-time error '3026': "));
   EXPECT_THAT(venue.Boxes.Boxes[2].Text, testing::StartsWith("Run-time error '3026': "));
+  EXPECT_THAT(venue.Boxes.Boxes[3].Text, testing::StartsWith("The backup copies of "));
   EXPECT_EQ(Stored("length(Address)", 1), "255");
 }
 

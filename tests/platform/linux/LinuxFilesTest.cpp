@@ -357,4 +357,34 @@ TEST(FileLen, OfWhatCannotBeReadFails) {
   EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().FileLen(folder / "gone"); }), 53);
 }
 
+TEST(FileNames, AreThoseOfTheFilesInAFolderInOrder) {
+  const TemporaryFolder folder;
+  std::filesystem::create_directory(folder / "folder");
+  WriteFile(folder / "b", "");
+  WriteFile(folder / "a", "");
+  WriteFile(folder / "folder/c", "");
+  EXPECT_EQ(LinuxFiles().FileNames(folder.Path()), (std::vector<std::string>{"a", "b"}));
+  EXPECT_TRUE(LinuxFiles().FileNames(folder / "gone").empty());
+  EXPECT_TRUE(LinuxFiles().FileNames(folder / "a").empty());
+}
+
+TEST(Rename, PutsAFileInPlaceOfAnother) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "new", "new");
+  WriteFile(folder / "old", "old");
+  LinuxFiles().Rename(folder / "new", folder / "old");
+  EXPECT_EQ(ReadFile(folder / "old"), "new");
+  EXPECT_FALSE(LinuxFiles().FileExists(folder / "new"));
+}
+
+TEST(Rename, OfWhatIsNotThereOrToWhereNothingCanBeFails) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "x");
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().Rename(folder / "gone", folder / "other"); }), 53);
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().Rename(folder / "file", folder / "gone/other"); }), 76);
+  const OrdinaryUser user;
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().Rename(folder / "file", folder / "other"); }), 70);
+  EXPECT_EQ(ReadFile(folder / "file"), "x");
+}
+
 }  // namespace
