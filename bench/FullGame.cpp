@@ -61,6 +61,15 @@ void MakeMissions(const std::string& path, int missions) {
           "n;");
 }
 
+void MakeMembers(const std::string& path, int members) {
+  MakeDatabase(path, "members_default.sql",
+               "WITH RECURSIVE n(i) AS (SELECT 1 WHERE " + std::to_string(members) +
+                   " > 0 UNION ALL SELECT i + 1 FROM n WHERE i < " + std::to_string(members) +
+                   ") INSERT INTO Members (ContactID, DallasID, FirstName, LastName, NickName, City) "
+                   "SELECT i, printf('%016X', i), 'First' || i, 'Last' || i, "
+                   "iif(i % 2, 'Nick' || i, NULL), 'Somewhere' FROM n;");
+}
+
 class FullGame::NoBoxes : public MessageBoxes {
  public:
   BoxAnswer Show(const std::string& text, const std::string&, BoxIcon, BoxButtons) override {
@@ -73,14 +82,7 @@ FullGame::FullGame(int members) : boxes_(std::make_unique<NoBoxes>()) {
   std::string pattern = (std::filesystem::temp_directory_path() / "tessarine-bench-XXXXXX").string();
   folder_ = mkdtemp(pattern.data());
   MakeDatabase(folder_ / "scenarios.mdb", "scenarios_default.sql", "");
-  MakeDatabase(folder_ / "members.mdb", "members_default.sql",
-               members == 0
-                   ? ""
-                   : "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < " +
-                         std::to_string(members) +
-                         ") INSERT INTO Members (ContactID, DallasID, FirstName, LastName, NickName, City) "
-                         "SELECT i, printf('%016X', i), 'First' || i, 'Last' || i, "
-                         "iif(i % 2, 'Nick' || i, NULL), 'Somewhere' FROM n;");
+  MakeMembers(folder_ / "members.mdb", members);
   FillCompletely(game);
   if (members > 0) {
     for (int index = 1; index <= PlayerCount; ++index) {

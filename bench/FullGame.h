@@ -17,6 +17,10 @@ void FillCompletely(Game& game);
 /// Makes a mission file at `path` with that many missions.
 void MakeMissions(const std::string& path, int missions);
 
+/// Makes a members file at `path` with that many members: First7 Last7, every second with a nickname as
+/// Nick7.
+void MakeMembers(const std::string& path, int members);
+
 /// Scores the fullest game with databases of its own. A box shown is a fault and ends the program.
 class FullGame {
  public:

@@ -97,12 +97,21 @@ std::int64_t PendingRow::Insert() {
   return key;
 }
 
-bool PendingRow::Change(std::int64_t key) {
-  const std::vector<std::size_t> columns = ColumnsSet();
+void PendingRow::PrepareChange(const std::vector<std::size_t>& columns) {
+  if (change_ && changedColumns_ == columns) {
+    return;
+  }
   std::string assignments;
   for (const std::size_t i : columns) {
     assignments += (assignments.empty() ? "[" : ", [") + table_.Columns()[i].Name + "] = ?";
   }
+  change_ =
+      SqliteStatement(connection_, "UPDATE [" + table_.Name() + "] SET " + assignments + " WHERE rowid = ?");
+  changedColumns_ = columns;
+}
+
+bool PendingRow::Change(std::int64_t key) {
+  const std::vector<std::size_t> columns = ColumnsSet();
   if (columns.empty()) {
     connection_.PrepareRead();
     SqliteStatement row(connection_, "SELECT 1 FROM [" + table_.Name() + "] WHERE rowid = ?");
@@ -110,13 +119,12 @@ bool PendingRow::Change(std::int64_t key) {
     return row.Step();
   }
   WriteTransaction transaction(connection_);
-  SqliteStatement change(connection_,
-                         "UPDATE [" + table_.Name() + "] SET " + assignments + " WHERE rowid = ?");
+  PrepareChange(columns);
   for (std::size_t i = 0; i < columns.size(); ++i) {
-    change.Bind(static_cast<int>(i + 1), *values_[columns[i]]);
+    change_.Bind(static_cast<int>(i + 1), *values_[columns[i]]);
   }
-  change.Bind(static_cast<int>(columns.size() + 1), key);
-  change.Step();
+  change_.Bind(static_cast<int>(columns.size() + 1), key);
+  change_.Step();
   const bool changed = connection_.ChangedRows() != 0;
   transaction.Commit();
   return changed;

@@ -7,6 +7,7 @@
 
 #include "platform/Database.h"
 #include "platform/sqlite/SqliteConnection.h"
+#include "platform/sqlite/SqliteStatement.h"
 #include "platform/sqlite/SqliteTable.h"
 
 /// What AddNew or Edit has begun and Update will write: values for some of a table's columns. A failing write
@@ -39,9 +40,12 @@ class PendingRow {
   void TakeDefaults();
   void CheckStarted() const;
   std::vector<std::size_t> ColumnsSet() const;
+  void PrepareChange(const std::vector<std::size_t>& columns);
 
   SqliteConnection& connection_;
   const SqliteTable& table_;
   ::EditMode mode_ = ::EditMode::None;
   std::vector<std::optional<Value>> values_;
+  SqliteStatement change_;  ///< kept, since many rows are changed in the same columns one after the other
+  std::vector<std::size_t> changedColumns_;
 };

@@ -117,9 +117,10 @@ SqliteConnection::~SqliteConnection() {
 
 SqliteStatement SqliteConnection::PrepareSearch(const SqliteTable& table, const std::string& condition,
                                                 int syntaxError) {
-  // The line break ends a comment in the condition, which would otherwise hide the closing bracket.
+  // The line break ends a comment in the condition, which would otherwise hide the closing bracket. The plus
+  // keeps the whole table from being walked for the sake of the order where an index would find the rows.
   const std::string sql = "SELECT rowid FROM [" + table.Name() + "] WHERE (" +
-                          WithLikeRanges(table, condition) + "\n) ORDER BY rowid";
+                          WithLikeRanges(table, condition) + "\n) ORDER BY +rowid";
   sqlite3_stmt* prepared = nullptr;
   const char* tail = nullptr;
   const int result =

@@ -307,13 +307,24 @@ const Value& SqliteRecordset::Fields(std::string_view column) {
     return LongValue(i);
   }
   if (!wanted_[i]) {
-    wanted_[i] = true;
+    Want(i);
     read_ = SqliteStatement();
     row_ = nullptr;
     cache_.Clear();
   }
   ReadRow();
   return (*row_)[i];
+}
+
+// Who asks for many columns of a row that was not looked up shows it whole, and soon asks for the others.
+void SqliteRecordset::Want(std::size_t column) {
+  wanted_[column] = true;
+  constexpr std::ptrdiff_t few = 3;
+  if (!lookedUp_ && std::count(wanted_.begin(), wanted_.end(), true) > few) {
+    for (std::size_t i = 0; i < wanted_.size(); ++i) {
+      wanted_[i] = !table_.Columns()[i].IsLong;
+    }
+  }
 }
 
 void SqliteRecordset::AddNew() {

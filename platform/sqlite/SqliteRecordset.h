@@ -16,8 +16,9 @@
 #include "platform/sqlite/SqliteTable.h"
 
 /// A dynaset over one table. The current row is read at the first Fields after a move, and of it only the
-/// columns that were asked for since the last MoveFirst, which are few where many rows are looked up. A long
-/// binary column (declared type BLOB) is read whole when the row's is first asked for.
+/// columns that were asked for since the last MoveFirst, which are few where many rows are looked up; all of
+/// them once many were asked for without a look-up. A long binary column (declared type BLOB) is read whole
+/// when the row's is first asked for.
 class SqliteRecordset : public Recordset {
  public:
   /// The rows of `table` that `condition` holds for (all when it is empty), in table order. Throws as
@@ -68,6 +69,7 @@ class SqliteRecordset : public Recordset {
   bool WalkToPosition(std::optional<std::size_t> position);
   std::optional<std::size_t> FirstWith(std::size_t column, const Value& value);
 
+  void Want(std::size_t column);
   std::int64_t CurrentKey() const;
   bool TryReadRow();
   bool ReadInto(std::vector<Value>& row, std::int64_t key);

@@ -61,6 +61,38 @@ TEST_F(Editing, FieldsShowThePendingValuesAndTheOthersOfTheRow) {
   EXPECT_EQ(file.Query("SELECT FirstName FROM Members WHERE ContactID = 1"), "Sean");
 }
 
+TEST_F(Editing, UpdatesOneRowAfterTheOtherInTheSameAndInOtherColumns) {
+  const auto set = [this](const char* column, const std::string& text) {
+    rows->Edit();
+    rows->SetField(column, text);
+    rows->Update();
+  };
+  set("FirstName", "one");
+  rows->MoveNext();
+  set("FirstName", std::string(1000, 'x'));
+  set("LastName", "two");
+  rows->MoveNext();
+  set("LastName", "three");
+  set("FirstName", "four");
+  EXPECT_EQ(file.Query("SELECT FirstName || LastName FROM Members WHERE ContactID = 1"), "oneO'Brien");
+  EXPECT_EQ(file.Query("SELECT length(FirstName) || LastName FROM Members WHERE ContactID = 2"), "1000two");
+  EXPECT_EQ(file.Query("SELECT FirstName || LastName FROM Members WHERE ContactID = 5"), "fourthree");
+}
+
+TEST_F(Editing, ManyColumnsOfManyRowsAreReadAsTheyAre) {
+  std::string seen;
+  for (; !rows->Eof(); rows->MoveNext()) {
+    for (const char* column : {"DallasID", "FirstName", "LastName", "NickName", "Clan"}) {
+      const auto* text = std::get_if<std::string>(&rows->Fields(column));
+      seen += (text == nullptr ? "NULL" : *text) + " ";
+    }
+    EXPECT_EQ(IntegerOf(*rows, "TotalGamesPlayed"), 0);
+  }
+  EXPECT_EQ(seen,
+            "AA Sean O'Brien Shamrock none BB Alice Belmont Mole none NULL Rhys Morgan NULL none "
+            "BB Zoe Adams  none ");
+}
+
 TEST_F(Editing, UpdateLeavesColumnsThatOthersChangedMeanwhile) {
   rows->Edit();
   rows->SetField("FirstName", "John");
