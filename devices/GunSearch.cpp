@@ -34,7 +34,7 @@ void GunSearch::SearchGuns(std::int16_t maxPlayerId) {
 void GunSearch::Ask(std::uint8_t playerId) {
   events_.DoEvents();
   while (link_.TakeFrame()) {
-    TakeAnswer();  // came together with another one; the next packet would drop it
+    TakeAnswer();  // came together with another one
   }
   link_.SendGunPacket(playerId, BroadcastAddress, 0, 0, GunPacketType::Search);
   if (link_.WaitForFrame(false)) {

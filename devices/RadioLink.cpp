@@ -46,9 +46,6 @@ void RadioLink::SendAtCommand(std::uint8_t frameId, const AtLetters& letters,
 }
 
 void RadioLink::Send(std::span<const std::uint8_t> frame) {
-  while (TakeFrame()) {
-    // a late answer to an earlier packet
-  }
   receivedFrameType_ = 0;
   for (const std::uint8_t byte : frame) {
     if (Stopped()) {

@@ -32,8 +32,7 @@ class RadioLink {
 
   void XBee_CloseCommPort();
 
-  /// Sends a packet to the gun `playerId` behind the modem at `address`. What came in so far is no answer to
-  /// it and gets lost.
+  /// Sends a packet to the gun `playerId` behind the modem at `address`.
   void SendGunPacket(std::uint8_t playerId, const XBeeAddress& address, std::uint8_t byte2,
                      std::uint8_t byte3, std::uint8_t packetType, std::span<const std::uint8_t> payload = {});
 
@@ -47,7 +46,7 @@ class RadioLink {
   /// True when a good frame is among the bytes that have come in; it is then taken. Throws as WaitForFrame.
   bool TakeFrame();
 
-  /// API identifier of the last frame; 0 when none came since the last packet was sent.
+  /// API identifier of the last frame; 0 when none was taken since the last packet was sent.
   std::uint8_t ReceivedFrameType() const { return receivedFrameType_; }
 
   const ReceivedFrame& Frame() const { return parser_.Frame(); }

@@ -95,6 +95,10 @@ void ScoreFetch::Attempt(GunEntry& gun, std::uint8_t playerId) {
 }
 
 bool ScoreFetch::Command(const GunEntry& gun, std::uint8_t playerId, std::span<const std::uint8_t> payload) {
+  events_.DoEvents();
+  while (link_.TakeFrame()) {
+    // a late answer to an earlier command would pass for the one to this
+  }
   link_.SendGunPacket(playerId, gun.Address, 0, 0, GunPacketType::Command, payload);
   if (!link_.WaitForFrame(true)) {
     return false;
