@@ -24,6 +24,12 @@ RemoteManage::RemoteManage(const Parts& parts, QWidget* parent)
   ui_->setupUi(this);
   SetUpList();
   SetPlayersFound(0);
+  for (QWidget* progress :
+       {static_cast<QWidget*>(ui_->ProgressLabel), static_cast<QWidget*>(ui_->Progress)}) {
+    QSizePolicy place = progress->sizePolicy();
+    place.setRetainSizeWhenHidden(true);
+    progress->setSizePolicy(place);
+  }
   connect(ui_->SearchGunsButton, &QPushButton::clicked, this, &RemoteManage::SearchForGuns);
   connect(ui_->GetScoresButton, &QPushButton::clicked, this, &RemoteManage::GetScores);
   connect(ui_->Close, &QPushButton::clicked, this, &QDialog::reject);
