@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <iterator>
 
 #include "platform/RuntimeError.h"
 
@@ -15,7 +16,7 @@ std::vector<std::uint8_t> MakeGunPacket(std::uint8_t playerId, std::uint8_t byte
                                         std::uint8_t packetType, std::span<const std::uint8_t> payload) {
   std::vector<std::uint8_t> packet = {static_cast<std::uint8_t>(payload.size()), playerId, byte2, byte3,
                                       packetType};
-  packet.insert(packet.end(), payload.begin(), payload.end());
+  std::copy(payload.begin(), payload.end(), std::back_inserter(packet));
   return packet;
 }
 
