@@ -194,13 +194,14 @@ TEST_F(Search, TakesAnAnswerInALaterGunsSlot) {
   EXPECT_EQ(Gun(33).PlayerName, "Red  1");
 }
 
-TEST_F(Search, TakesAllAnswersThatComeAtOnce) {
+TEST_F(Search, TakesAllAnswersThatComeAtOnceAndKeepsTheSlotsBehind) {
   AfterCallOf40(Joined({Received(1, SearchAnswer(40)), Received(2, SearchAnswer(41)),
                         Received(3, SearchAnswer(42)), ModemStatusFrame(), Received(4, SearchAnswer(43))}));
   Run(128);
   for (const std::uint8_t id : Bytes{40, 41, 42, 43}) {
     EXPECT_TRUE(Gun(id).Present) << int(id);
   }
+  EXPECT_EQ(Events.Now(), milliseconds(255 * 12 + 3));
 }
 
 TEST_F(Search, ListsAGunThatWasNotCalled) {

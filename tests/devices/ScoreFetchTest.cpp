@@ -397,6 +397,17 @@ TEST_F(Fetch, TriesAgainAfterAWrongCheckByteOfTheBlock) {
   EXPECT_EQ(Red1().ShotCount, 258);
 }
 
+TEST_F(Fetch, TakesNoBlockFromAnAnswerToAnotherCommand) {
+  PutGun(33, BlockOfRed1(52));
+  Alter = [](Bytes answer) {
+    answer[5] = answer[5] == 2 ? 1 : answer[5];
+    return answer;
+  };
+  GetScores();
+  EXPECT_EQ(CountOf(3), 0);
+  EXPECT_EQ(StatusOf(33), ScoreStatus::Failed);
+}
+
 TEST_F(Fetch, NeverDecodesABlockWithAWrongCheckByte) {
   PutGun(33, BlockOfRed1(52));
   Alter = [](Bytes answer) {
