@@ -26,9 +26,10 @@ constexpr const char* LookSheet = R"(
 #GetScores:focus, #RemoteManageButton:focus { border: 2px solid white; }
 #RemoteManageButton:disabled { background: #222a3d; border-color: #2c3650; color: #7d879b; }
 #centralwidget > #Label1, #centralwidget > #Label2 { font-weight: bold; }
-ScoreListView { border: 1px solid #c3c9d6; selection-background-color: #2f6fd6; selection-color: white; }
-ScoreListView QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid #c3c9d6;
+ScoreListView, #DataList { border: 1px solid #c3c9d6; selection-background-color: #2f6fd6; selection-color: white; }
+ScoreListView QHeaderView::section, #DataList QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid #c3c9d6;
   background: #e9edf4; color: #1b2233; }
+#DataList QHeaderView::section { padding: 5px 3px; font-weight: bold; }
 )";
 
 Language LanguageOfSystem() {

@@ -18,7 +18,6 @@
 #include "app/SoldieringCalc.h"
 #include "app/Text.h"
 #include "app/UploadProgress.h"
-#include "app/WaitCursor.h"
 #include "core/BaseUnitDownload.h"
 #include "core/CommitGame.h"
 #include "core/FieldValue.h"
@@ -27,10 +26,12 @@
 #include "core/PlayerId.h"
 #include "core/ScreenFit.h"
 #include "core/UserDatabase.h"
+#include "devices/RemoteManage.h"
 #include "members/MemberQueries.h"
 #include "members/Members.h"
 #include "missions/Scenarios.h"
 #include "platform/ErrorReport.h"
+#include "platform/qt/WaitCursor.h"
 #include "sheets/ScoreSheets.h"
 #include "sheets/SheetProgressWindow.h"
 #include "ui_frmRx.h"
@@ -194,6 +195,7 @@ void frmRx::ConnectCommands() {
       {ui_->mnuUnassignMember, &frmRx::UnassignMember},
       {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
       {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
+      {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
   };
   for (const auto& entry : commands) {
     const auto command = entry.second;
@@ -202,6 +204,7 @@ void frmRx::ConnectCommands() {
   }
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
+  connect(ui_->RemoteManageButton, &QPushButton::clicked, ui_->mnuRemoteManage, &QAction::trigger);
   connect(ui_->ActiveMission, &QComboBox::currentIndexChanged, this,
           [this](int index) { Run([this, index] { SelectMission(index); }); });
   connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this,
@@ -443,6 +446,14 @@ void frmRx::SetUpMissions() {
   Scenarios(*dbScenarios_, *rsScenarios_, services_.Boxes, services_.Strings, this).exec();
   rsScenarios_->MoveFirst();
   FillMissionList();
+}
+
+void frmRx::ManageRemotely() {
+  RemoteManage({services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time,
+                services_.Strings, game_},
+               this)
+      .exec();
+  CalculateScores();
 }
 
 void frmRx::ShowPopup(const QPoint& position) {

@@ -79,6 +79,7 @@ class frmRx : public QMainWindow {
   void ShowAdminData();
   void EnterMissionResults();
   void SetUpMissions();
+  void ManageRemotely();
 
   /// The context menu of the board, for the last of the selected rows.
   void ShowPopup(const QPoint& position);

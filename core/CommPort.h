@@ -20,14 +20,16 @@ class CommPort {
   /// settings and another try. Returns false once Cancel was pressed.
   bool OpenCommPort(const std::string& settings);
 
+  /// Opens the line, which must be closed, once and without a question. Throws RuntimeError: as
+  /// SerialPort::Open does, 8002 for a number without a device, 13 or 6 for a setting that is no number.
+  void Open(const std::string& settings);
+
   void CloseIfOpen();
 
   /// True once the operator pressed Cancel at the port question.
   bool CommDisabled() const { return commDisabled_; }
 
  private:
-  void Open(const std::string& settings);
-
   SerialPort& port_;
   const IniReader& ini_;
   const SerialDevices& devices_;

@@ -45,7 +45,7 @@ const std::vector<Menu> Menus = {
       {"mnuFirmwareUpdate", 0, "F&irmware Update", false},
       {"mnuSoundRecorder", 0, "Sound &Recorder", false},
       {"mnuChargeiButton", 0, "Charge &iButton", false},
-      {"mnuRemoteManage", 0, "Remote &Manage", false}}},
+      {"mnuRemoteManage", 0, "Remote &Manage", true}}},
     {{"mnuSettings", 214, "&Settings", true},
      {{"mnuCommPort", 215, "&Communications Port", true},
       {"mnuSoldieringCalc", 216, "&Soldiering Calculation", true}}},
@@ -122,7 +122,7 @@ TEST_P(MenuBar, DisablesWhatHasNoWindowYet) {
       EXPECT_EQ(venue.Find<QAction>(item.Name).isEnabled(), item.Enabled) << item.Name;
     }
   }
-  EXPECT_FALSE(venue.Find<QPushButton>("RemoteManageButton").isEnabled());
+  EXPECT_TRUE(venue.Find<QPushButton>("RemoteManageButton").isEnabled());
   EXPECT_TRUE(venue.Find<QPushButton>("GetScores").isEnabled());
 }
 

@@ -6,6 +6,7 @@
 #include "app/Settings.h"
 #include "app/SoldieringCalc.h"
 #include "app/UploadProgress.h"
+#include "devices/RemoteManage.h"
 #include "members/Members.h"
 #include "missions/MissionNameEntry.h"
 #include "missions/Scenarios.h"
@@ -39,6 +40,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<Scenarios>("mnuSetupMissions");
+  LookAt<RemoteManage>("mnuRemoteManage");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }

@@ -1,0 +1,19 @@
+#pragma once
+
+#include <string>
+
+/// Where a job on the radio link shows how it goes.
+class RadioDisplay {
+ public:
+  virtual ~RadioDisplay() = default;
+
+  virtual void SetStatus(const std::string& text) = 0;
+  virtual void SetPlayersFound(int count) = 0;
+  virtual void ClearGunList() = 0;
+
+  /// Shows the guns as they now are, and serves pending events.
+  virtual void RefreshGunList() = 0;
+
+  /// Step `step` (from 0 up) of `steps` begins.
+  virtual void SetProgress(const std::string& text, int step, int steps) = 0;
+};
