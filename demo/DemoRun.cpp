@@ -16,8 +16,20 @@
 #include "demo/BoardText.h"
 #include "sheets/PrintOptions.h"
 
-DemoRun::DemoRun(QMainWindow& window, const QDir& folder)
-    : window_(window), folder_(folder), gameFile_(folder.absoluteFilePath(QStringLiteral("game.xml"))) {
+namespace {
+
+template <typename Button>
+void Press(QWidget& window, const char* name) {
+  QTest::mouseClick(window.findChild<Button*>(QString::fromLatin1(name)), Qt::LeftButton);
+}
+
+}  // namespace
+
+DemoRun::DemoRun(QMainWindow& window, DemoSource source, const QDir& folder)
+    : window_(window),
+      source_(source),
+      folder_(folder),
+      gameFile_(folder.absoluteFilePath(QStringLiteral("game.xml"))) {
   connect(&watch_, &QTimer::timeout, this, &DemoRun::AnswerDialogs);
 }
 
@@ -36,9 +48,29 @@ QStringList DemoRun::Run() {
   return faults_;
 }
 
+// A click returns when its job has ended: the handler waits inside.
 void DemoRun::PullGame() {
-  // The click returns when the download has ended: its handler waits inside.
-  QTest::mouseClick(window_.findChild<QPushButton*>(QStringLiteral("GetScores")), Qt::LeftButton);
+  if (source_ == DemoSource::BaseUnit) {
+    Press<QPushButton>(window_, "GetScores");
+    return;
+  }
+  QTimer::singleShot(0, this, &DemoRun::PullByRadio);
+  Press<QPushButton>(window_, "RemoteManageButton");
+}
+
+void DemoRun::PullByRadio() {
+  QWidget* const radio = QApplication::activeModalWidget();
+  if (!QTest::qWaitForWindowExposed(radio)) {
+    faults_.append(QStringLiteral("The window of the radio did not appear."));
+    return;
+  }
+  Press<QRadioButton>(*radio, "Guns224");
+  Press<QPushButton>(*radio, "SearchGunsButton");
+  Press<QPushButton>(*radio, "GetScoresButton");
+  if (!radio->grab().save(folder_.absoluteFilePath(QStringLiteral("radio.png")))) {
+    faults_.append(QStringLiteral("The picture of the guns could not be written."));
+  }
+  Press<QPushButton>(*radio, "Close");
 }
 
 void DemoRun::SaveGame() {

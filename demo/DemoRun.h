@@ -5,20 +5,25 @@
 #include <QStringList>
 #include <QTimer>
 
-/// Plays the operator for one game: presses the real button of the real window, waits for the end, saves the
-/// game through the menu and the file dialog, prints the score sheets of the active players to files, and
+/// Where the demo's game comes from.
+enum class DemoSource { BaseUnit, Radio };
+
+/// Plays the operator for one game: presses the real buttons of the real windows, waits for the end, saves
+/// the game through the menu and the file dialog, prints the score sheets of the active players to files, and
 /// leaves the board as text and picture.
 class DemoRun : public QObject {
   Q_OBJECT
 
  public:
-  DemoRun(QMainWindow& window, const QDir& folder);
+  DemoRun(QMainWindow& window, DemoSource source, const QDir& folder);
 
   /// Returns what went wrong, one line each; empty when all of it happened.
   QStringList Run();
 
  private:
   void PullGame();
+  /// In the window that is open: finds the guns, fetches their scores and closes it.
+  void PullByRadio();
   void SaveGame();
   void PrintSheets();
   void WriteBoard();
@@ -29,6 +34,7 @@ class DemoRun : public QObject {
   void AnswerDialogs();
 
   QMainWindow& window_;
+  DemoSource source_;
   QDir folder_;
   QString gameFile_;
   QTimer watch_;

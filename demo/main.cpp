@@ -7,12 +7,16 @@
 #include "demo/DemoRun.h"
 #include "platform/ErrorReport.h"
 
-/// tessarine-demo FOLDER: one game pulled, shown and saved without an operator. Leaves the results in FOLDER.
+/// tessarine-demo [--radio] FOLDER: one game pulled, shown and saved without an operator. Leaves the results
+/// in FOLDER.
 int main(int argc, char** argv) {
   QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
   QApplication application(argc, argv);
-  if (argc != 2 || !QDir(QString::fromLocal8Bit(argv[1])).exists()) {
-    std::fprintf(stderr, "usage: tessarine-demo FOLDER\n");
+  QStringList arguments = QApplication::arguments().mid(1);
+  const DemoSource source =
+      arguments.removeAll(QStringLiteral("--radio")) > 0 ? DemoSource::Radio : DemoSource::BaseUnit;
+  if (arguments.size() != 1 || !QDir(arguments.first()).exists()) {
+    std::fprintf(stderr, "usage: tessarine-demo [--radio] FOLDER\n");
     return 2;
   }
   PrepareApplication();
@@ -23,7 +27,7 @@ int main(int argc, char** argv) {
     return 1;
   }
   window.show();
-  const QStringList faults = DemoRun(window, QDir(QString::fromLocal8Bit(argv[1]))).Run();
+  const QStringList faults = DemoRun(window, source, QDir(arguments.first())).Run();
   for (const QString& fault : faults) {
     std::fprintf(stderr, "%s\n", qUtf8Printable(fault));
   }
