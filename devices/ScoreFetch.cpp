@@ -103,6 +103,9 @@ bool ScoreFetch::Command(const GunEntry& gun, std::uint8_t playerId, std::span<c
   if (!link_.WaitForFrame(true)) {
     return false;
   }
+  while (link_.TakeFrame()) {
+    // a status frame and the answer came at once: the data that came last count
+  }
   answer_ = ReadGunPacket(link_.Frame());
   return answer_[4] == GunPacketType::CommandAnswer;
 }

@@ -463,6 +463,24 @@ TEST_F(Fetch, EndsAnAttemptWithAStatusFrameThatComesFirst) {
   EXPECT_EQ(Red1().ShotCount, 258);
 }
 
+TEST_F(Fetch, TakesTheAnswerThatComesAtOnceWithAStatusFrame) {
+  for (const bool first : {true, false}) {
+    SiteGun& gun = PutGun(33, BlockOfRed1(100));
+    guns[1].ScoreStatus = ScoreStatus::Pending;
+    OnPacket = [&](const Bytes& packet) {
+      const Bytes answer = Received(33, AnswerOf(gun, packet));
+      Bytes burst = first ? ModemStatusFrame() : answer;
+      const Bytes rest = first ? answer : TransmitStatusFrame();
+      burst.insert(burst.end(), rest.begin(), rest.end());
+      Arrive(10, burst);
+    };
+    const int sizes = CountOf(1);
+    GetScores();
+    EXPECT_EQ(StatusOf(33), ScoreStatus::Ok) << first;
+    EXPECT_EQ(CountOf(1), sizes + 1) << first;
+  }
+}
+
 TEST_F(Fetch, TakesTheBlockBeforeOnceMoreWhenAStatusFrameComesFirst) {
   PutGun(33, BlockOfRed1(135));
   const auto answer = OnPacket;
