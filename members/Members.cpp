@@ -32,7 +32,7 @@ QString DateText(const std::string& stored) {
 
 QString FigureText(const Value& value) {
   const bool isNull = std::holds_alternative<std::monostate>(value);
-  return isNull ? QString() : QString::fromStdString(PlainNumber(NumberOf(value)));
+  return isNull ? QString() : QString::fromStdString(PlainDecimal(NumberOf(value)));
 }
 
 QString AccuracyText(double accuracy) {
