@@ -20,7 +20,7 @@
 namespace {
 
 QString DateText(const std::string& stored) {
-  const QString text = QString::fromStdString(stored);
+  QString text = QString::fromStdString(stored);
   const QDateTime date = QDateTime::fromString(text, QStringLiteral("yyyy-MM-dd HH:mm:ss"));
   if (!date.isValid()) {
     return text;
