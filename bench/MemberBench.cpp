@@ -104,11 +104,12 @@ void Search(benchmark::State& state, const Folder& folder, const std::string& te
 
 void SearchInEngine(benchmark::State& state, const Folder& folder, const std::string& text) {
   Engine engine(folder.Members());
-  const std::string pattern = text + "%";
+  std::string sql = SearchQuery(text);
+  for (std::size_t at = sql.find("*'"); at != std::string::npos; at = sql.find("*'")) {
+    sql[at] = '%';
+  }
   while (state.KeepRunning()) {
-    const int rows =
-        engine.RowsOf("SELECT * FROM Members WHERE (FirstName LIKE '" + pattern + "' OR LastName LIKE '" +
-                      pattern + "' OR NickName LIKE '" + pattern + "')");
+    const int rows = engine.RowsOf(sql);
     if (rows == 0) {
       std::abort();
     }

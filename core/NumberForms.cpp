@@ -210,7 +210,7 @@ std::string Str(double value) {
   return NumberForm(value);
 }
 
-std::string PlainNumber(double value) {
+std::string PlainDecimal(double value) {
   std::string text = Str(value);
   if (text.front() == ' ') {
     text.erase(0, 1);

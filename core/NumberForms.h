@@ -16,7 +16,7 @@ std::string Str(double value);
 
 /// As a reader of records expects it: 12, 0.5, -0.25. No leading blank; digits and exponent as in Str. Throws
 /// as Str does.
-std::string PlainNumber(double value);
+std::string PlainDecimal(double value);
 
 /// Value of the leading numeric part of `text`: "12abc" is 12, and a text without one is 0. Blanks, tabs and
 /// line breaks count nowhere: "1 2" is 12. Never throws; a value too large for a double becomes the largest

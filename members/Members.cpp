@@ -20,7 +20,7 @@
 namespace {
 
 QString DateText(const std::string& stored) {
-  const QString text = QString::fromStdString(stored);
+  QString text = QString::fromStdString(stored);
   const QDateTime date = QDateTime::fromString(text, QStringLiteral("yyyy-MM-dd HH:mm:ss"));
   if (!date.isValid()) {
     return text;
@@ -32,7 +32,7 @@ QString DateText(const std::string& stored) {
 
 QString FigureText(const Value& value) {
   const bool isNull = std::holds_alternative<std::monostate>(value);
-  return isNull ? QString() : QString::fromStdString(PlainNumber(NumberOf(value)));
+  return isNull ? QString() : QString::fromStdString(PlainDecimal(NumberOf(value)));
 }
 
 QString AccuracyText(double accuracy) {

@@ -69,15 +69,6 @@ std::string WithoutWeekday(const std::string& longDate) {
   return rest < longDate.size() ? longDate.substr(rest) : std::string();
 }
 
-std::string PlainDecimal(double value) {
-  std::string text = Trimmed(Str(value));
-  const auto point = text.find('.');
-  if (point == 0 || (point == 1 && text[0] == '-')) {
-    text.insert(point, "0");
-  }
-  return text;
-}
-
 BookmarkTexts ResultTexts(const Game& game, int index, int winner) {
   const bool won = TeamFromId(IdFromIndex(index)) == winner;
   return {{"Victory", won ? "Team Won!" : "Team Lost!"},

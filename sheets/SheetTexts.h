@@ -21,9 +21,6 @@ int WinningTeam(const Game& game);
 /// A date in long form without the weekday in front of its first comma.
 std::string WithoutWeekday(const std::string& longDate);
 
-/// A number as plain decimals: "12.5", "0.5", "12".
-std::string PlainDecimal(double value);
-
 /// Whose sheet it is and how the game ended for the team.
 BookmarkTexts ResultTexts(const Game& game, int index, int winner);
 

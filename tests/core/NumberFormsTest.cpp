@@ -111,14 +111,14 @@ TEST(Str, IsReadBackToTheSameNumber) {
   }
 }
 
-TEST(PlainNumber, HasAZeroBeforeThePointAndNoLeadingBlank) {
-  EXPECT_EQ(PlainNumber(0.5), "0.5");
-  EXPECT_EQ(PlainNumber(-0.25), "-0.25");
-  EXPECT_EQ(PlainNumber(12), "12");
-  EXPECT_EQ(PlainNumber(-7.5), "-7.5");
-  EXPECT_EQ(PlainNumber(0), "0");
-  EXPECT_EQ(PlainNumber(1028.75), "1028.75");
-  EXPECT_EQ(PlainNumber(1e20), "1E+20");
+TEST(PlainDecimal, HasAZeroBeforeThePointAndNoLeadingBlank) {
+  EXPECT_EQ(PlainDecimal(0.5), "0.5");
+  EXPECT_EQ(PlainDecimal(-0.25), "-0.25");
+  EXPECT_EQ(PlainDecimal(12), "12");
+  EXPECT_EQ(PlainDecimal(-7.5), "-7.5");
+  EXPECT_EQ(PlainDecimal(0), "0");
+  EXPECT_EQ(PlainDecimal(1028.75), "1028.75");
+  EXPECT_EQ(PlainDecimal(1e20), "1E+20");
 }
 
 TEST(Val, TakesTheLeadingNumericPart) {

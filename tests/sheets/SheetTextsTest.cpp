@@ -63,14 +63,6 @@ TEST(WithoutWeekday, DropsAllUpToTheBlankBehindTheFirstComma) {
   EXPECT_EQ(WithoutWeekday(""), "");
 }
 
-TEST(PlainDecimal, HasAZeroBeforeThePointAndNoBlank) {
-  EXPECT_EQ(PlainDecimal(12.5), "12.5");
-  EXPECT_EQ(PlainDecimal(0.5), "0.5");
-  EXPECT_EQ(PlainDecimal(-0.25), "-0.25");
-  EXPECT_EQ(PlainDecimal(12), "12");
-  EXPECT_EQ(PlainDecimal(0), "0");
-}
-
 TEST_F(Texts, OfAMemberTellTheHistory) {
   ExecuteSql(
       venue.MembersFile(),
