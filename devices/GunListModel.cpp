@@ -16,6 +16,9 @@ constexpr int ColumnCount = 5;
 
 }  // namespace
 
+GunListModel::Row::Row(const GunEntry& gun)
+    : Gun(gun), Battery(BatteryPicture(gun.Battery)), Status(StatusPicture(gun.ScoreStatus)) {}
+
 GunListModel::GunListModel(const QString& player, QObject* parent)
     : QAbstractTableModel(parent), player_(player) {}
 
@@ -24,19 +27,19 @@ void GunListModel::Show(const GunTable& guns, std::int16_t maxPlayerId) {
   for (const int index : ListedGuns(guns, maxPlayerId)) {
     const GunEntry& gun = guns[static_cast<std::size_t>(index)];
     const int shownRow = static_cast<int>(row);
-    if (row == rows_.size() || gun.PlayerID < rows_[row].PlayerID) {
+    if (row == rows_.size() || gun.PlayerID < rows_[row].Gun.PlayerID) {
       beginInsertRows({}, shownRow, shownRow);
-      rows_.insert(rows_.begin() + shownRow, gun);
+      rows_.insert(rows_.begin() + shownRow, Row(gun));
       endInsertRows();
-    } else {
-      rows_[row] = gun;
+    } else if (gun != rows_[row].Gun) {
+      rows_[row] = Row(gun);
       emit dataChanged(this->index(shownRow, 0), this->index(shownRow, ColumnCount - 1));
     }
     ++row;
   }
   if (row < rows_.size()) {
     beginRemoveRows({}, static_cast<int>(row), static_cast<int>(rows_.size()) - 1);
-    rows_.resize(row);
+    rows_.erase(rows_.begin() + static_cast<std::ptrdiff_t>(row), rows_.end());
     endRemoveRows();
   }
 }
@@ -59,17 +62,17 @@ QVariant GunListModel::data(const QModelIndex& index, int role) const {
   if (!index.isValid() || index.row() >= rowCount()) {
     return {};
   }
-  const GunEntry& gun = rows_[static_cast<std::size_t>(index.row())];
+  const Row& row = rows_[static_cast<std::size_t>(index.row())];
   switch (role) {
     case Qt::DisplayRole:
-      return QString::fromStdString(RowOf(gun)[static_cast<std::size_t>(index.column())]);
+      return QString::fromStdString(RowOf(row.Gun)[static_cast<std::size_t>(index.column())]);
     case Qt::DecorationRole:
       if (index.column() == BatteryColumn) {
-        return BatteryPicture(gun.Battery);
+        return row.Battery;
       }
-      return index.column() == StatusColumn ? QVariant(StatusPicture(gun.ScoreStatus)) : QVariant();
+      return index.column() == StatusColumn ? QVariant(row.Status) : QVariant();
     case Qt::BackgroundRole:
-      return StatusTint(gun.ScoreStatus, QGuiApplication::palette().base().color());
+      return StatusTint(row.Gun.ScoreStatus, QGuiApplication::palette().base().color());
     default:
       return {};
   }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QAbstractTableModel>
+#include <QPixmap>
 #include <QString>
 #include <vector>
 
@@ -24,6 +25,14 @@ class GunListModel : public QAbstractTableModel {
   QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
 
  private:
+  struct Row {
+    explicit Row(const GunEntry& gun);
+
+    GunEntry Gun;
+    QPixmap Battery;
+    QPixmap Status;
+  };
+
   QString player_;
-  std::vector<GunEntry> rows_;
+  std::vector<Row> rows_;
 };

@@ -20,6 +20,8 @@ struct GunEntry {
   std::string Firmware;
   std::uint8_t Battery = 0;  ///< percent
   ::ScoreStatus ScoreStatus = ScoreStatus::Pending;
+
+  bool operator==(const GunEntry&) const = default;
 };
 
 /// The guns, each at its player id less 32; the last entry is never used.
