@@ -4,7 +4,7 @@
 
 #include <filesystem>
 #include <fstream>
-#include <iterator>
+#include <sstream>
 #include <string>
 #include <vector>
 
@@ -15,6 +15,13 @@ struct ProcessInfo {
   std::string Command;  ///< its arguments, separated by NUL
 };
 
+/// A file below /proc; empty when its process has ended meanwhile.
+inline std::string TextOfProcessFile(const std::filesystem::path& path) {
+  std::ostringstream text;
+  text << std::ifstream(path).rdbuf();
+  return text.str();
+}
+
 inline std::vector<ProcessInfo> Processes() {
   std::vector<ProcessInfo> processes;
   for (const auto& entry : std::filesystem::directory_iterator("/proc")) {
@@ -22,15 +29,13 @@ inline std::vector<ProcessInfo> Processes() {
     if (name.find_first_not_of("0123456789") != std::string::npos) {
       continue;
     }
-    std::ifstream stat(entry.path() / "stat");
-    const std::string line{std::istreambuf_iterator<char>(stat), {}};
+    const std::string line = TextOfProcessFile(entry.path() / "stat");
     const auto end = line.rfind(')');
     if (end == std::string::npos || line.substr(end + 2, 1) == "Z") {
       continue;
     }
-    std::ifstream command(entry.path() / "cmdline");
-    processes.push_back({std::stoi(name), std::stoi(line.substr(end + 4)),
-                         std::string{std::istreambuf_iterator<char>(command), {}}});
+    processes.push_back(
+        {std::stoi(name), std::stoi(line.substr(end + 4)), TextOfProcessFile(entry.path() / "cmdline")});
   }
   return processes;
 }
