@@ -6,6 +6,7 @@
 #include <QKeyEvent>
 #include <QLocale>
 #include <QPainter>
+#include <QSignalBlocker>
 #include <QVBoxLayout>
 
 #include "platform/qt/QtClock.h"
@@ -74,7 +75,8 @@ DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
   setToolTip(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
   QAction* calendar = addAction(CalendarIcon(palette().color(QPalette::Text)), QLineEdit::TrailingPosition);
   connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
-  connect(this, &QLineEdit::textEdited, this, &DatePicker::TakeText);
+  // And not textEdited, which does not tell of a text that an assistive program enters.
+  connect(this, &QLineEdit::textChanged, this, &DatePicker::TakeText);
   connect(this, &QLineEdit::editingFinished, this, &DatePicker::Finish);
 }
 
@@ -90,6 +92,7 @@ void DatePicker::Finish() {
 
 void DatePicker::ShowStored() {
   const QDate date = DateOf(stored_);
+  const QSignalBlocker shownOnly(this);
   setText(date.isValid() ? QString::fromStdString(ShortDateText(QLocale::system(), date)) : QString());
 }
 

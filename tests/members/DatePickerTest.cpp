@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <QAccessible>
 #include <QApplication>
 #include <QCalendarWidget>
 #include <QTest>
@@ -72,6 +73,18 @@ TEST_F(DateEntry, TakesTheSystemsFormAndYearMonthDay) {
   EXPECT_EQ(picker.Stored(), "2010-12-01 00:00:00");
   Leave();
   EXPECT_EQ(Shown(), "1 Dec 2010");
+}
+
+TEST_F(DateEntry, TakesADateThatAnAssistiveProgramEnters) {
+  picker.SetStored("1961-04-12 10:20:30");
+  QAccessibleInterface* accessible = QAccessible::queryAccessibleInterface(&picker);
+  ASSERT_NE(accessible, nullptr);
+  QAccessibleEditableTextInterface* entry = accessible->editableTextInterface();
+  ASSERT_NE(entry, nullptr);
+  entry->replaceText(0, static_cast<int>(picker.text().size()), QStringLiteral("1958-02-28"));
+  EXPECT_EQ(picker.Stored(), "1958-02-28 00:00:00");
+  entry->deleteText(0, static_cast<int>(picker.text().size()));
+  EXPECT_EQ(picker.Stored(), "");
 }
 
 TEST_F(DateEntry, TakesTwoDigitsOfAYearAsOfTheLastHundredYears) {
