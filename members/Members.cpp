@@ -130,6 +130,12 @@ void Members::reject() {
   QDialog::reject();
 }
 
+// Who presses Search leaves the box by it, and a text that is no query is told of once.
+bool Members::IsLeaving(Qt::FocusReason reason) const {
+  const bool toSearch = focusWidget() == ui_->Search && reason != Qt::TabFocusReason;
+  return !toSearch && reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
+}
+
 bool Members::eventFilter(QObject* watched, QEvent* event) {
   if (watched == ui_->SearchText && event->type() == QEvent::KeyPress) {
     const int key = static_cast<QKeyEvent*>(event)->key();
@@ -138,11 +144,9 @@ bool Members::eventFilter(QObject* watched, QEvent* event) {
       return true;
     }
   }
-  if (watched == ui_->SearchText && event->type() == QEvent::FocusOut) {
-    const auto reason = static_cast<QFocusEvent*>(event)->reason();
-    if (isVisible() && reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason) {
-      RunInFocusChange([this] { RunSearch(); });
-    }
+  if (watched == ui_->SearchText && event->type() == QEvent::FocusOut && isVisible() &&
+      IsLeaving(static_cast<QFocusEvent*>(event)->reason())) {
+    RunInFocusChange([this] { RunSearch(); });
   }
   return QDialog::eventFilter(watched, event);
 }
@@ -243,10 +247,8 @@ void Members::PreviewPhoto(const std::string& file) {
 }
 
 void Members::RunSearch() {
+  ui_->MemberPhoto->Clear();
   data1_->Refresh(SearchQuery(ui_->SearchText->text().toStdString()));
-  if (!data1_->HasRow()) {
-    ui_->MemberPhoto->Clear();
-  }
 }
 
 void Members::RunClearSearch() {

@@ -67,6 +67,7 @@ class Members : public QDialog, private BoundControls {
   void PreviewPhoto(const std::string& file);
 
   void Activate();
+  bool IsLeaving(Qt::FocusReason reason) const;
   void RunSearch();
   void RunClearSearch();
   void AddMember();

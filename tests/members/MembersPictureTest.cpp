@@ -80,6 +80,18 @@ TEST_F(MembersPicture, ShowsNoPictureWhereNobodyWasFound) {
   });
 }
 
+TEST_F(MembersPicture, ClearsThePictureBeforeASearchAlsoWhenItCannotBeRead) {
+  Choose(PictureFile(Qt::red));
+  Open([this] {
+    Press("ChangePicture");
+    SearchFor("O'B");
+    EXPECT_TRUE(Photo().Picture().isNull());
+    EXPECT_EQ(Text("LastNameEntry"), "Morgan");
+    SearchFor("");
+    EXPECT_EQ(PhotoColour(), QColor(Qt::red));
+  });
+}
+
 TEST_F(MembersPicture, ReplacesAPhotoByASmallerOne) {
   Choose(PictureFileOf(30000, Qt::red));
   const std::string small = PictureFile(Qt::blue);

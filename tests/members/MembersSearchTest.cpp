@@ -120,6 +120,19 @@ TEST_F(MembersWindow, SaysThatATextWithAnApostropheIsNoQueryAndKeepsTheRows) {
   EXPECT_EQ(venue.Boxes.Boxes[0].Icon, BoxIcon::Critical);
 }
 
+TEST_F(MembersWindow, SaysOnceThatATextIsNoQueryWhenTheSearchButtonIsPressed) {
+  Open([this] {
+    Enter("SearchText", "O'B");
+    ::Find<QPushButton>(*window, "Search").click();  // as assistive programs do
+    QApplication::processEvents();
+    EXPECT_EQ(venue.Boxes.Boxes.size(), 1U);
+    Enter("SearchText", "O'B");
+    Press("Search");
+    QApplication::processEvents();
+    EXPECT_EQ(venue.Boxes.Boxes.size(), 2U);
+  });
+}
+
 TEST_F(MembersWindow, SaysThatAnOpenBracketIsNoPattern) {
   Open([this] {
     SearchFor("[a");
