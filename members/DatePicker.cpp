@@ -1,5 +1,6 @@
 #include "members/DatePicker.h"
 
+#include <QAbstractButton>
 #include <QAction>
 #include <QCalendarWidget>
 #include <QDate>
@@ -74,6 +75,7 @@ QIcon CalendarIcon(const QColor& colour) {
 DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
   setToolTip(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
   QAction* calendar = addAction(CalendarIcon(palette().color(QPalette::Text)), QLineEdit::TrailingPosition);
+  findChild<QAbstractButton*>()->setAccessibleName(QStringLiteral("Calendar"));  // shows the action
   connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
   // And not textEdited, which does not tell of a text that an assistive program enters.
   connect(this, &QLineEdit::textChanged, this, &DatePicker::TakeText);

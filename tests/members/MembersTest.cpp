@@ -1,3 +1,4 @@
+#include <QAccessible>
 #include <QGroupBox>
 
 #include "tests/members/MembersWindow.h"
@@ -62,6 +63,20 @@ TEST_F(MembersWindow, LabelsEachEntryAndFigure) {
         }
       }
       EXPECT_THAT(captions, ElementsAre(caption)) << control;
+    }
+  });
+}
+
+TEST_F(MembersWindow, NamesItsFramesAndButtonsToAssistivePrograms) {
+  const auto nameOf = [](QWidget* control) {
+    return QAccessible::queryAccessibleInterface(control)->text(QAccessible::Name).toStdString();
+  };
+  Open([&] {
+    for (QGroupBox* frame : window->findChildren<QGroupBox*>()) {
+      EXPECT_EQ(nameOf(frame), frame->title().toStdString());
+    }
+    for (QAbstractButton* button : window->findChildren<QAbstractButton*>()) {
+      EXPECT_NE(nameOf(button), "") << button->parent()->objectName().toStdString();
     }
   });
 }
