@@ -2,17 +2,22 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
+#include <limits>
 
 #include "core/FieldValue.h"
 #include "platform/RuntimeError.h"
 
 namespace {
 
+/// No column is longer, whatever its length column says.
+constexpr double LongestPhoto = std::numeric_limits<std::int32_t>::max();
+
 /// Bytes of the photo without padding; 0 also for a column that cannot be read.
 std::size_t SizeOf(Recordset& recordset, const std::string& lengthColumn) {
   try {
     const double size = NumberOf(recordset.Fields(lengthColumn));
-    return size < 1 ? 0 : static_cast<std::size_t>(size);
+    return size < 1 ? 0 : static_cast<std::size_t>(std::min(size, LongestPhoto));
   } catch (const RuntimeError&) {
     return 0;
   }

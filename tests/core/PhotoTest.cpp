@@ -77,6 +77,12 @@ TEST_F(Exporting, OfAColumnThatIsTooShortGivesWhatIsThere) {
   EXPECT_EQ(files.Contents().at("/tmp/p"), Pattern(12000));
 }
 
+TEST_F(Exporting, OfALengthThatCannotBeGivesWhatIsThere) {
+  Store(12000, "1e300");
+  EXPECT_TRUE(Export());
+  EXPECT_EQ(files.Contents().at("/tmp/p"), Pattern(12000));
+}
+
 TEST_F(Exporting, IgnoresAColumnThatIsNotThere) {
   Store(10, "10");
   EXPECT_TRUE(ExportPhoto(*venue.RsMembers, "Nowhere", "PhotographLength", "/tmp/p", files));
