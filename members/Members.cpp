@@ -2,7 +2,6 @@
 
 #include <QDateTime>
 #include <QFocusEvent>
-#include <QGuiApplication>
 #include <QKeyEvent>
 #include <QLocale>
 #include <QTimer>
@@ -15,6 +14,7 @@
 #include "members/MemberQueries.h"
 #include "platform/ErrorReport.h"
 #include "platform/qt/QtClock.h"
+#include "platform/qt/WaitCursor.h"
 #include "ui_Members.h"
 
 namespace {
@@ -233,9 +233,8 @@ void Members::ShowMemberExtras() {
 }
 
 void Members::ReadPhoto() {
-  QGuiApplication::setOverrideCursor(Qt::WaitCursor);
+  const WaitCursor cursor;
   ui_->MemberPhoto->Load(StoredPhoto(data1_->Rows(), "Photograph", "PhotographLength"));
-  QGuiApplication::restoreOverrideCursor();
 }
 
 void Members::PreviewPhoto(const std::string& file) {
