@@ -3,12 +3,33 @@
 #include <QBuffer>
 #include <QImageReader>
 #include <QPainter>
+#include <QtEndian>
 #include <algorithm>
+#include <string_view>
 
 namespace {
 
 /// Photos of more dots than a screen shows are read smaller, which takes a fraction of the time and memory.
 constexpr QSize LargestPicture(1600, 1600);
+
+/// True when the end of the picture is missing, which the toolkit overlooks for these formats. Others it
+/// checks.
+bool IsCutShort(std::string_view bytes, const QByteArray& format) {
+  using namespace std::string_view_literals;
+  if (format == "jpeg") {
+    const auto scan = bytes.rfind("\xFF\xDA"sv);
+    return scan == std::string_view::npos || bytes.find("\xFF\xD9"sv, scan) == std::string_view::npos;
+  }
+  if (format == "gif") {
+    return bytes.find("\x00\x3B"sv) == std::string_view::npos;
+  }
+  if (format == "bmp") {
+    constexpr std::size_t sizeAt = 2;
+    return bytes.size() < sizeAt + sizeof(quint32) ||
+           qFromLittleEndian<quint32>(bytes.data() + sizeAt) > bytes.size();
+  }
+  return false;
+}
 
 /// A head and shoulders, where there is no photo.
 void DrawSilhouette(QPainter& painter, const QRect& place, const QColor& colour) {
@@ -36,7 +57,8 @@ void PictureBox::Load(const std::string& bytes) {
   if (size.width() > LargestPicture.width() || size.height() > LargestPicture.height()) {
     reader.setScaledSize(size.scaled(LargestPicture, Qt::KeepAspectRatio));
   }
-  picture_ = reader.read();
+  const bool isWhole = reader.canRead() && !IsCutShort(bytes, reader.format());
+  picture_ = isWhole ? reader.read() : QImage();
   update();
 }
 

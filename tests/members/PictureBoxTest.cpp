@@ -8,6 +8,12 @@
 
 namespace {
 
+/// One black dot.
+const std::string gif(
+    "GIF89a\x01\x00\x01\x00\x80\x00\x00\x00\x00\x00\xFF\xFF\xFF\x2C\x00\x00\x00\x00\x01\x00\x01\x00\x00\x02"
+    "\x02\x44\x01\x00\x3B",
+    35);
+
 class APictureBox : public testing::Test {
  protected:
   APictureBox() { box.resize(200, 100); }
@@ -26,11 +32,7 @@ TEST_F(APictureBox, ReadsTheUsualKinds) {
 }
 
 TEST_F(APictureBox, ReadsGif) {
-  // One black dot.
-  const char gif[] =
-      "GIF89a\x01\x00\x01\x00\x80\x00\x00\x00\x00\x00\xFF\xFF\xFF\x2C\x00\x00\x00\x00\x01\x00\x01\x00\x00\x02"
-      "\x02\x44\x01\x00\x3B";
-  box.Load(std::string(gif, sizeof gif - 1));
+  box.Load(gif);
   EXPECT_EQ(box.Picture().size(), QSize(1, 1));
 }
 
@@ -52,12 +54,22 @@ TEST_F(APictureBox, FitsThePictureWithItsProportions) {
 
 TEST_F(APictureBox, ShowsNoPictureOfDamagedBytes) {
   for (const std::string& bytes :
-       {std::string(), std::string("no picture"), PictureFile(Qt::red).substr(0, 20)}) {
+       {std::string(), std::string("no picture"), std::string("BM"), PictureFile(Qt::red).substr(0, 20)}) {
     box.Load(PictureFile(Qt::red));
     box.Load(bytes);
     EXPECT_TRUE(box.Picture().isNull());
     EXPECT_NE(At(100, 50), QColor(Qt::red));
   }
+}
+
+TEST_F(APictureBox, ShowsNoPictureWhoseEndIsMissing) {
+  for (const char* format : {"BMP", "JPG", "PNG", "PPM"}) {
+    const std::string whole = PictureFile(Qt::red, format);
+    box.Load(whole.substr(0, whole.size() - 30));
+    EXPECT_TRUE(box.Picture().isNull()) << format;
+  }
+  box.Load(gif.substr(0, gif.size() - 3));
+  EXPECT_TRUE(box.Picture().isNull());
 }
 
 TEST_F(APictureBox, ReadsAVeryLargePictureSmaller) {
