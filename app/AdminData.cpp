@@ -8,7 +8,6 @@
 
 #include "app/Text.h"
 #include "core/HitLines.h"
-#include "core/NumberForms.h"
 #include "ui_AdminData.h"
 
 AdminData::AdminData(const Game& game, const StringTable& strings, QWidget* parent)
@@ -35,7 +34,7 @@ void AdminData::ShowPlayers(const Game& game) {
   for (int index = 1; index <= PlayerCount; ++index) {
     const Player& player = game.Players(index);
     const std::string cells[] = {game.DisplayName(index), RunTimeText(player.RunCounter),
-                                 Str(player.AdminKillCount)};
+                                 std::to_string(player.AdminKillCount)};
     for (int column = 0; column < 3; ++column) {
       auto* item = new QTableWidgetItem(QString::fromStdString(cells[column]));
       item->setTextAlignment(Qt::AlignVCenter | (column == 0 ? Qt::AlignLeft : Qt::AlignRight));

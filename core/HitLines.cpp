@@ -43,7 +43,7 @@ std::vector<std::string> SpecialDamageOf(const Player& player) {
                                         {"Radiation: ", player.RadiationDamage},
                                         {"Stuns: ", player.StunCount}}) {
     if (amount > 0) {
-      lines.push_back(caption + Str(amount));
+      lines.push_back(caption + std::to_string(amount));
     }
   }
   return lines;

@@ -100,6 +100,10 @@ void Scenarios::ConnectCommands() {
   }
   connect(ui_->MissionSelection1, &QListWidget::currentRowChanged, this,
           [this] { Run(&Scenarios::ShowSelectedMission); });
+  // Also on the entry that is current already: what was typed and not saved is replaced.
+  connect(ui_->MissionSelection1, &QListWidget::itemClicked, this,
+          [this] { Run(&Scenarios::ShowSelectedMission); });
+  connect(ui_->MissionSelection1, &QListWidget::itemSelectionChanged, this, &Scenarios::FollowSelection);
   connect(ui_->ObjectivesTab, &QTabBar::currentChanged, this, &Scenarios::BringToFront);
 }
 
@@ -133,6 +137,14 @@ void Scenarios::ShowSelectedMission() {
     ShowMissionRecord();
   } else {
     ClearMissionFields();
+  }
+}
+
+// A screen reader selects an entry without making it the current one.
+void Scenarios::FollowSelection() {
+  const QList<QListWidgetItem*> selected = ui_->MissionSelection1->selectedItems();
+  if (!selected.isEmpty()) {
+    ui_->MissionSelection1->setCurrentItem(selected.first());
   }
 }
 

@@ -43,6 +43,7 @@ class Scenarios : public QDialog {
   /// Selects an entry and shows its mission, as a click on it does.
   void SelectMission(int entry);
   void ShowSelectedMission();
+  void FollowSelection();
   bool FindSelectedMission();
   void ShowMissionRecord();
   void ClearMissionFields();

@@ -101,7 +101,7 @@ TEST_F(Details, ListWhoHitWhomWithMembersNames) {
       "<HitByPlayer><Index>2</Index><Amount>-4</Amount></HitByPlayer></HitData>",
       [](const PlayerDetails& window) {
         EXPECT_THAT(Lines(window, "WhoHitYou"),
-                    ElementsAre("Blue  7:  7  (Ada Byron)", "Red  40:  30", "Explosive:  5", "Stuns:  2"));
+                    ElementsAre("Blue  7:  7  (Ada Byron)", "Red  40:  30", "Explosive: 5", "Stuns: 2"));
         EXPECT_THAT(Lines(window, "WhoYouHit"), ElementsAre("Blue  7:  7  (Ada Byron)"));
       });
 }

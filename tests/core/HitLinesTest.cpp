@@ -17,15 +17,15 @@ TEST(RunTime, IsShownInHoursAndMinutesEachInTheNumberForm) {
   EXPECT_EQ(RunTimeText(-61), "-1H -1M");
 }
 
-TEST(SpecialDamage, IsListedWhereItIsAboveZero) {
+TEST(SpecialDamage, IsListedInPlainDigitsWhereItIsAboveZero) {
   Player player;
   EXPECT_THAT(SpecialDamageOf(player), IsEmpty());
   player.ExplosiveDamage = 5;
   player.RadiationDamage = -1;
   player.StunCount = 12;
-  EXPECT_THAT(SpecialDamageOf(player), ElementsAre("Explosive:  5", "Stuns:  12"));
+  EXPECT_THAT(SpecialDamageOf(player), ElementsAre("Explosive: 5", "Stuns: 12"));
   player.RadiationDamage = 7;
-  EXPECT_THAT(SpecialDamageOf(player), ElementsAre("Explosive:  5", "Radiation:  7", "Stuns:  12"));
+  EXPECT_THAT(SpecialDamageOf(player), ElementsAre("Explosive: 5", "Radiation: 7", "Stuns: 12"));
 }
 
 TEST(PlayerText, NamesTheRecordOfItsPlayer) {

@@ -1,3 +1,5 @@
+#include <QAccessible>
+
 #include "tests/missions/Editor.h"
 
 namespace {
@@ -36,6 +38,30 @@ TEST_F(Editor, ShowsTheMissionThatIsClicked) {
     QTest::keyClick(&List(), Qt::Key_Down);
     EXPECT_EQ(ShownName(), "Three");
   });
+}
+
+TEST_F(Editor, ReplacesWhatWasTypedWhenTheSameMissionIsClicked) {
+  Open([this] {
+    Press("Edit");
+    Describe("typed and not saved");
+    QTest::mouseClick(List().viewport(), Qt::LeftButton, {}, List().visualItemRect(List().item(0)).center());
+    EXPECT_EQ(ShownDescription(), "First text");
+    EXPECT_FALSE(Locked());
+  });
+}
+
+TEST_F(Editor, ShowsTheMissionThatAScreenReaderSelects) {
+  Open([this] {
+    QAccessibleInterface* list = QAccessible::queryAccessibleInterface(&List());
+    list->child(2)->actionInterface()->doAction(QAccessibleActionInterface::toggleAction());
+    EXPECT_EQ(ShownName(), "Three");
+    EXPECT_EQ(List().currentRow(), 2);
+    Press("Edit");
+    Describe("New third text");
+    Press("Save");
+  });
+  EXPECT_EQ(Stored("MissionDescription", "Three"), "New third text");
+  EXPECT_EQ(Stored("MissionDescription", "One"), "First text");
 }
 
 TEST_F(Editor, ShowsNothingOfAMissionThatIsGone) {
