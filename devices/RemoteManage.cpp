@@ -23,7 +23,7 @@ RemoteManage::RemoteManage(const Parts& parts, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::RemoteManage>()), parts_(parts), maxPlayerId_(FewestIds) {
   ui_->setupUi(this);
   SetUpList();
-  SetPlayersFound(0);
+  RemoteManage::SetPlayersFound(0);
   for (QWidget* progress :
        {static_cast<QWidget*>(ui_->ProgressLabel), static_cast<QWidget*>(ui_->Progress)}) {
     QSizePolicy place = progress->sizePolicy();
