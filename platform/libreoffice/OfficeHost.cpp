@@ -71,8 +71,6 @@ std::string UrlPath(const std::string& path) {
   const std::string installation = "-env:UserInstallation=file://" + UrlPath(profile);
   const std::string accept = "--accept=pipe,name=" + pipe + ";urp";
   setenv("SAL_USE_VCLPLUGIN", "svp", 1);
-  // Under a locale that is not installed, or C, it could name files in ASCII only.
-  setenv("LC_ALL", "C.UTF-8", 1);
   execl(office, office, installation.c_str(), "--headless", "--norestore", "--nologo", "--nodefault",
         accept.c_str(), nullptr);
   _exit(EXIT_FAILURE);
