@@ -4,6 +4,7 @@
 #include <com/sun/star/awt/Size.hpp>
 #include <com/sun/star/beans/XPropertySet.hpp>
 #include <com/sun/star/container/NoSuchElementException.hpp>
+#include <com/sun/star/container/XContentEnumerationAccess.hpp>
 #include <com/sun/star/container/XEnumerationAccess.hpp>
 #include <com/sun/star/container/XNamed.hpp>
 #include <com/sun/star/frame/XStorable.hpp>
@@ -14,6 +15,7 @@
 #include <com/sun/star/text/TextContentAnchorType.hpp>
 #include <com/sun/star/text/XBookmarksSupplier.hpp>
 #include <com/sun/star/text/XTextContent.hpp>
+#include <com/sun/star/text/XTextFrame.hpp>
 #include <com/sun/star/text/XTextTablesSupplier.hpp>
 #include <com/sun/star/util/XCloseable.hpp>
 #include <com/sun/star/view/XPrintable.hpp>
@@ -135,6 +137,37 @@ Size Fit(const Size& picture, const Size& box) {
           std::max(1, static_cast<int>(picture.Height * scale))};
 }
 
+/// Calls `use` with each paragraph of a text and each table in it, or with each portion of a paragraph.
+template <typename Use>
+void ForEachPart(const Reference<container::XEnumerationAccess>& whole, Use&& use) {
+  const Reference<container::XEnumeration> parts = whole->createEnumeration();
+  while (parts->hasMoreElements()) {
+    use(parts->nextElement());
+  }
+}
+
+/// Adds the name of `part` when it is a table.
+void AddTable(const Any& part, BodyTables& names) {
+  if (const Reference<text::XTextTable> found(part, UNO_QUERY); found.is()) {
+    names.push_back(Reference<container::XNamed>(found, UNO_QUERY_THROW)->getName());
+  }
+}
+
+/// A table that text flows around stands in the body for Word. Here it is the first thing in a frame, which
+/// hangs on a paragraph behind it, or on a character of that.
+void AddFloatingTables(const Any& place, BodyTables& names) {
+  const Reference<container::XContentEnumerationAccess> access(place, UNO_QUERY_THROW);
+  const Reference<container::XEnumeration> hanging =
+      access->createContentEnumeration("com.sun.star.text.TextContent");
+  while (hanging->hasMoreElements()) {
+    const Reference<text::XTextFrame> frame(hanging->nextElement(), UNO_QUERY);
+    if (frame.is()) {
+      const Reference<container::XEnumerationAccess> inside(frame->getText(), UNO_QUERY_THROW);
+      AddTable(inside->createEnumeration()->nextElement(), names);
+    }
+  }
+}
+
 }  // namespace
 
 OfficeDocument::OfficeDocument(const Reference<text::XTextDocument>& document, const OfficeServices& services,
@@ -247,13 +280,15 @@ Reference<text::XTextTable> OfficeDocument::Table(int number) {
 }
 
 void OfficeDocument::FindBodyTables() {
-  // The collection of tables is in no told order, and holds those in cells and frames too.
+  // The collection of tables is in no told order, and holds those in cells and text boxes too.
+  BodyTables names;
   const Reference<container::XEnumerationAccess> body(document_->getText(), UNO_QUERY_THROW);
-  const Reference<container::XEnumeration> parts = body->createEnumeration();
-  while (parts->hasMoreElements()) {
-    const Reference<text::XTextTable> found(parts->nextElement(), UNO_QUERY);
-    if (found.is()) {
-      bodyTables_->push_back(Reference<container::XNamed>(found, UNO_QUERY_THROW)->getName());
+  ForEachPart(body, [&names](const Any& part) {
+    AddTable(part, names);
+    if (const Reference<container::XEnumerationAccess> paragraph(part, UNO_QUERY); paragraph.is()) {
+      AddFloatingTables(part, names);
+      ForEachPart(paragraph, [&names](const Any& portion) { AddFloatingTables(portion, names); });
     }
-  }
+  });
+  *bodyTables_ = std::move(names);
 }

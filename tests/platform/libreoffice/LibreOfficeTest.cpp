@@ -127,6 +127,41 @@ TEST_F(Writer, WritesTablesWithMergedCells) {
   EXPECT_THAT(text, Not(HasSubstr("second")));
 }
 
+TEST_F(Writer, CountsTablesThatTextFlowsAround) {
+  const auto table = [](int rows) {
+    std::string text = "<table:table><table:table-column/>";
+    for (int row = 0; row < rows; ++row) {
+      text += "<table:table-row><table:table-cell><text:p/></table:table-cell></table:table-row>";
+    }
+    return text + "</table:table>";
+  };
+  const auto inFrame = [](const std::string& anchor, const std::string& inside) {
+    return "<text:p><draw:frame text:anchor-type='" + anchor + "' svg:width='5cm'><draw:text-box>" + inside +
+           "</draw:text-box></draw:frame>behind</text:p>";
+  };
+  WriteFile(folder / "floating.fodt",
+            R"(<?xml version="1.0" encoding="UTF-8"?><office:document
+              xmlns:office="urn:oasis:names:tc:opendocument:xmlns:office:1.0"
+              xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
+              xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
+              xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
+              xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
+              office:mimetype="application/vnd.oasis.opendocument.text"><office:body><office:text>)" +
+                inFrame("paragraph", table(1)) + table(2) + inFrame("char", table(3)) +
+                inFrame("char", "<text:p>box</text:p>") + table(4) +
+                "</office:text></office:body></office:document>");
+  const auto document = Office().Add(folder / "floating.fodt");
+  for (const std::size_t rows : {1, 2, 3, 4}) {
+    const int number = static_cast<int>(rows);
+    document->WriteCells(number, 1, 20, std::vector<std::string>(rows, "x"));
+    EXPECT_EQ(
+        NumberThrownBy([&] { document->WriteCells(number, 1, 20, std::vector<std::string>(rows + 1, "x")); }),
+        440);
+  }
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(5, 1, 20, {}); }), 9);
+  document->Close();
+}
+
 TEST_F(Writer, TakesNothingButPicturesAsPictures) {
   const auto document = Office().Add(Template);
   WriteFile(folder / "no-picture", "bytes");
