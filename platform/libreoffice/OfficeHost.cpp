@@ -1,15 +1,18 @@
 #include <fcntl.h>
+#include <langinfo.h>
 #include <poll.h>
 #include <sys/prctl.h>
 #include <sys/signalfd.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <clocale>
 #include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <string>
+#include <string_view>
 #include <system_error>
 
 namespace {
@@ -54,6 +57,14 @@ std::string UrlPath(const std::string& path) {
   return url;
 }
 
+/// LibreOffice finds only files whose names the locale can spell, and names come in every script. This one is
+/// part of the system, whatever locales are installed.
+void SpellAllNames() {
+  if (std::setlocale(LC_CTYPE, "") == nullptr || std::string_view(nl_langinfo(CODESET)) != "UTF-8") {
+    setenv("LC_ALL", "C.UTF-8", 1);
+  }
+}
+
 /// Becomes LibreOffice, which dies with this process's parent.
 [[noreturn]] void BecomeOffice(const char* office, const std::string& profile, const std::string& pipe,
                                pid_t host) {
@@ -71,6 +82,7 @@ std::string UrlPath(const std::string& path) {
   const std::string installation = "-env:UserInstallation=file://" + UrlPath(profile);
   const std::string accept = "--accept=pipe,name=" + pipe + ";urp";
   setenv("SAL_USE_VCLPLUGIN", "svp", 1);
+  SpellAllNames();
   execl(office, office, installation.c_str(), "--headless", "--norestore", "--nologo", "--nodefault",
         accept.c_str(), nullptr);
   _exit(EXIT_FAILURE);

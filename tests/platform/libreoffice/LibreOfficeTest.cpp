@@ -266,6 +266,25 @@ TEST_F(Writer, EndsWithAProgramThatCrashes) {
   EXPECT_EQ(Profiles(), profiles);
 }
 
+class LibreOfficeInLocale : public testing::TestWithParam<const char*> {};
+
+TEST_P(LibreOfficeInLocale, ReadsAndSavesFilesNamedInAnyScript) {
+  const TemporaryFolder folder;
+  std::filesystem::create_directory(folder / "目录");
+  std::filesystem::copy(Template, folder / "目录/样张.doc");
+  setenv("LC_ALL", GetParam(), 1);
+  LibreOffice office(TESSARINE_PROGRAM_FOLDER);
+  const bool ready = StartAndWait(office);
+  unsetenv("LC_ALL");
+  ASSERT_TRUE(ready);
+  const auto document = office.Add(folder / "目录/样张.doc");
+  document->SaveAs(folder / "目录/Red 5-王小明 é.doc");
+  document->Close();
+  EXPECT_TRUE(std::filesystem::exists(folder / "目录/Red 5-王小明 é.doc"));
+}
+
+INSTANTIATE_TEST_SUITE_P(OfAnyKind, LibreOfficeInLocale, testing::Values("C", "C.UTF-8", "tlh_XX.UTF-8"));
+
 TEST(LibreOfficeThatIsNotThere, IsAFailureOfTheStart) {
   const TemporaryFolder folder;
   LibreOffice office(folder.Path());
