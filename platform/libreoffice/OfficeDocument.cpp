@@ -1,6 +1,7 @@
 #include "platform/libreoffice/OfficeDocument.h"
 
 #include <algorithm>
+#include <atomic>
 #include <com/sun/star/awt/Size.hpp>
 #include <com/sun/star/beans/XPropertySet.hpp>
 #include <com/sun/star/container/NoSuchElementException.hpp>
@@ -18,13 +19,19 @@
 #include <com/sun/star/text/XTextFrame.hpp>
 #include <com/sun/star/text/XTextTablesSupplier.hpp>
 #include <com/sun/star/util/XCloseable.hpp>
+#include <com/sun/star/view/PrintableState.hpp>
+#include <com/sun/star/view/XPrintJobBroadcaster.hpp>
+#include <com/sun/star/view/XPrintJobListener.hpp>
 #include <com/sun/star/view/XPrintable.hpp>
+#include <cppuhelper/implbase1.hxx>
 #include <filesystem>
+#include <rtl/ref.hxx>
 #include <utility>
 
 namespace container = com::sun::star::container;
 namespace table = com::sun::star::table;
 namespace text = com::sun::star::text;
+namespace view = com::sun::star::view;
 using com::sun::star::awt::Size;
 using com::sun::star::beans::XPropertySet;
 using com::sun::star::uno::UNO_QUERY;
@@ -168,6 +175,23 @@ void AddFloatingTables(const Any& place, BodyTables& names) {
   }
 }
 
+/// Hears whether the printer's queue took a document: LibreOffice tells it in no other way.
+class PrintJobWatch : public cppu::WeakImplHelper1<view::XPrintJobListener> {
+ public:
+  bool Failed() const { return failed_; }
+
+  void SAL_CALL printJobEvent(const view::PrintJobEvent& event) override {
+    if (event.State == view::PrintableState_JOB_FAILED || event.State == view::PrintableState_JOB_ABORTED ||
+        event.State == view::PrintableState_JOB_SPOOLING_FAILED) {
+      failed_ = true;
+    }
+  }
+  void SAL_CALL disposing(const com::sun::star::lang::EventObject& /*source*/) override {}
+
+ private:
+  std::atomic<bool> failed_ = false;  // set by a thread of LibreOffice's
+};
+
 }  // namespace
 
 OfficeDocument::OfficeDocument(const Reference<text::XTextDocument>& document, const OfficeServices& services,
@@ -257,8 +281,12 @@ void OfficeDocument::PrintOut() {
     if (printer.isEmpty() || printer == "Generic Printer") {
       throw RuntimeError(482, "Printer error");
     }
-    const Reference<com::sun::star::view::XPrintable> printable(document_, UNO_QUERY_THROW);
-    printable->print(Uno::Properties({{"Wait", Any(true)}}));
+    const rtl::Reference<PrintJobWatch> watch(new PrintJobWatch);
+    Reference<view::XPrintJobBroadcaster>(document_, UNO_QUERY_THROW)->addPrintJobListener(watch.get());
+    Reference<view::XPrintable>(document_, UNO_QUERY_THROW)->print(Uno::Properties({{"Wait", Any(true)}}));
+    if (watch->Failed()) {
+      throw RuntimeError(482, "Printer error");
+    }
   });
 }
 

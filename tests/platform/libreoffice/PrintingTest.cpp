@@ -24,6 +24,16 @@ TEST(Printing, GoesToTheDefaultPrinterOfTheSystem) {
   }
 }
 
+TEST(Printing, FailsWhenThePrinterTakesNoJobs) {
+  PrintQueue queue(PrintQueue::Takes::Nothing);
+  ASSERT_TRUE(queue.IsUp());
+  LibreOffice office(TESSARINE_PROGRAM_FOLDER);
+  ASSERT_TRUE(StartAndWait(office));
+  const auto document = office.Add(TESSARINE_PROGRAM_FOLDER "/score_card_default.doc");
+  EXPECT_EQ(NumberThrownBy([&] { document->PrintOut(); }), 482);
+  document->Close();
+}
+
 TEST(Printing, FailsWithoutAPrinter) {
   setenv("CUPS_SERVER", "/nowhere", 1);
   LibreOffice office(TESSARINE_PROGRAM_FOLDER);
