@@ -21,7 +21,7 @@ namespace {
 constexpr int RestartAfterCrash = 79;
 constexpr int Restart = 81;
 
-/// A folder for LibreOffice's profile that goes with everything in it.
+/// A folder for LibreOffice's profile and temporary files that goes with everything in it.
 class Profile {
  public:
   Profile() {
@@ -82,6 +82,7 @@ void SpellAllNames() {
   const std::string installation = "-env:UserInstallation=file://" + UrlPath(profile);
   const std::string accept = "--accept=pipe,name=" + pipe + ";urp";
   setenv("SAL_USE_VCLPLUGIN", "svp", 1);
+  setenv("TMPDIR", profile.c_str(), 1);  // so that what it leaves goes with the profile
   SpellAllNames();
   execl(office, office, installation.c_str(), "--headless", "--norestore", "--nologo", "--nodefault",
         accept.c_str(), nullptr);
@@ -113,15 +114,8 @@ int WaitForEnd(pid_t office, int signals) {
       return status;
     }
   }
-  // Just asked to end, it needs a moment to clear up.
-  constexpr int graceMilliseconds = 500;
-  int status = 0;
-  pollfd ended = {signals, POLLIN, 0};
-  poll(&ended, 1, graceMilliseconds);
-  if (waitpid(office, &status, WNOHANG) != office) {
-    kill(office, SIGKILL);
-    waitpid(office, &status, 0);
-  }
+  kill(office, SIGKILL);
+  waitpid(office, nullptr, 0);
   return SIGKILL;
 }
 

@@ -285,6 +285,25 @@ TEST_P(LibreOfficeInLocale, ReadsAndSavesFilesNamedInAnyScript) {
 
 INSTANTIATE_TEST_SUITE_P(OfAnyKind, LibreOfficeInLocale, testing::Values("C", "C.UTF-8", "tlh_XX.UTF-8"));
 
+TEST(LibreOfficeThatHangs, EndsAndLeavesNoFiles) {
+  const TemporaryFolder folder;
+  setenv("TMPDIR", folder.Path().c_str(), 1);
+  LibreOffice office(TESSARINE_PROGRAM_FOLDER);
+  const bool ready = StartAndWait(office);
+  unsetenv("TMPDIR");
+  ASSERT_TRUE(ready);
+  const std::vector<pid_t> hosts = Hosts();
+  ASSERT_THAT(hosts, SizeIs(1));
+  const std::vector<pid_t> offices = ChildrenOf(hosts[0], "soffice.bin");
+  ASSERT_THAT(offices, SizeIs(1));
+  office.Add(Template)->Close();
+  kill(offices[0], SIGSTOP);
+  office.Quit();
+  EXPECT_EQ(office.State(), WordState::Ended);
+  EXPECT_THAT(Hosts(), IsEmpty());
+  EXPECT_TRUE(std::filesystem::is_empty(folder.Path()));
+}
+
 TEST(LibreOfficeThatIsNotThere, IsAFailureOfTheStart) {
   const TemporaryFolder folder;
   LibreOffice office(folder.Path());
