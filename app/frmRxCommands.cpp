@@ -99,7 +99,6 @@ void frmRx::PrintScores() {
   if (printOptions_->Choice().SheetSelection == SheetSelection::Nothing) {
     return;
   }
-  const WaitCursor cursor;
   SheetProgressWindow progress(services_.Strings, this);
   const SheetSources sources{game_,
                              *rsMembers_,

@@ -17,6 +17,7 @@ QString SheetProgressWindow::Words(const char* english, const char* chinese) con
 
 void SheetProgressWindow::Open() {
   stopped_ = false;
+  cursor_.emplace();
   ui_->Stop->setEnabled(true);
   ui_->SheetLabel->setText(Words("Starting the word processor...", "正在启动文字处理程序……"));
   ui_->PlayerLabel->clear();
@@ -35,6 +36,7 @@ void SheetProgressWindow::ShowSheet(int number, int count, const std::string& na
 
 void SheetProgressWindow::Close() {
   hide();
+  cursor_.reset();
 }
 
 void SheetProgressWindow::reject() {

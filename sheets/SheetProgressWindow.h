@@ -2,8 +2,10 @@
 
 #include <QDialog>
 #include <memory>
+#include <optional>
 
 #include "core/StringTable.h"
+#include "platform/qt/WaitCursor.h"
 #include "sheets/SheetProgress.h"
 
 namespace Ui {
@@ -11,7 +13,7 @@ class SheetProgressWindow;
 }
 
 /// The small window in front of a run of score sheets. Its button, Escape and the close box stop the run
-/// after the present sheet; the window stays until then.
+/// after the present sheet; the window stays until then, and with it the hourglass.
 class SheetProgressWindow : public QDialog, public SheetProgress {
   Q_OBJECT
 
@@ -32,4 +34,5 @@ class SheetProgressWindow : public QDialog, public SheetProgress {
   std::unique_ptr<Ui::SheetProgressWindow> ui_;
   const StringTable& strings_;
   bool stopped_ = false;
+  std::optional<WaitCursor> cursor_;
 };

@@ -117,9 +117,8 @@ void LibreOffice::Quit() noexcept {
   if (!HostRuns()) {
     return;
   }
-  if (ready_) {
-    client_->Terminate();
-  }
+  // It is not asked to end, since one that hangs would not answer; it has nothing to save.
+  client_->Disconnect();
   close(leash_);
   leash_ = -1;
   // The host lets nothing hold it up for long; waiting for it leaves no process behind this one.

@@ -25,8 +25,8 @@ class OfficeClient {
   virtual void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
                         const std::function<void()>& onProgress) = 0;
 
-  /// Asks the connected LibreOffice to end, and forgets it.
-  virtual void Terminate() noexcept = 0;
+  /// Lets go of the connected LibreOffice, without a word from it.
+  virtual void Disconnect() noexcept = 0;
 };
 
 /// Name and type of the module's one function; the caller owns what it returns.

@@ -1,9 +1,11 @@
 #include "platform/libreoffice/OfficeDocument.h"
 
 #include <algorithm>
+#include <atomic>
 #include <com/sun/star/awt/Size.hpp>
 #include <com/sun/star/beans/XPropertySet.hpp>
 #include <com/sun/star/container/NoSuchElementException.hpp>
+#include <com/sun/star/container/XContentEnumerationAccess.hpp>
 #include <com/sun/star/container/XEnumerationAccess.hpp>
 #include <com/sun/star/container/XNamed.hpp>
 #include <com/sun/star/frame/XStorable.hpp>
@@ -14,15 +16,22 @@
 #include <com/sun/star/text/TextContentAnchorType.hpp>
 #include <com/sun/star/text/XBookmarksSupplier.hpp>
 #include <com/sun/star/text/XTextContent.hpp>
+#include <com/sun/star/text/XTextFrame.hpp>
 #include <com/sun/star/text/XTextTablesSupplier.hpp>
 #include <com/sun/star/util/XCloseable.hpp>
+#include <com/sun/star/view/PrintableState.hpp>
+#include <com/sun/star/view/XPrintJobBroadcaster.hpp>
+#include <com/sun/star/view/XPrintJobListener.hpp>
 #include <com/sun/star/view/XPrintable.hpp>
+#include <cppuhelper/implbase1.hxx>
 #include <filesystem>
+#include <rtl/ref.hxx>
 #include <utility>
 
 namespace container = com::sun::star::container;
 namespace table = com::sun::star::table;
 namespace text = com::sun::star::text;
+namespace view = com::sun::star::view;
 using com::sun::star::awt::Size;
 using com::sun::star::beans::XPropertySet;
 using com::sun::star::uno::UNO_QUERY;
@@ -135,6 +144,54 @@ Size Fit(const Size& picture, const Size& box) {
           std::max(1, static_cast<int>(picture.Height * scale))};
 }
 
+/// Calls `use` with each paragraph of a text and each table in it, or with each portion of a paragraph.
+template <typename Use>
+void ForEachPart(const Reference<container::XEnumerationAccess>& whole, Use&& use) {
+  const Reference<container::XEnumeration> parts = whole->createEnumeration();
+  while (parts->hasMoreElements()) {
+    use(parts->nextElement());
+  }
+}
+
+/// Adds the name of `part` when it is a table.
+void AddTable(const Any& part, BodyTables& names) {
+  if (const Reference<text::XTextTable> found(part, UNO_QUERY); found.is()) {
+    names.push_back(Reference<container::XNamed>(found, UNO_QUERY_THROW)->getName());
+  }
+}
+
+/// A table that text flows around stands in the body for Word. Here it is the first thing in a frame, which
+/// hangs on a paragraph behind it, or on a character of that.
+void AddFloatingTables(const Any& place, BodyTables& names) {
+  const Reference<container::XContentEnumerationAccess> access(place, UNO_QUERY_THROW);
+  const Reference<container::XEnumeration> hanging =
+      access->createContentEnumeration("com.sun.star.text.TextContent");
+  while (hanging->hasMoreElements()) {
+    const Reference<text::XTextFrame> frame(hanging->nextElement(), UNO_QUERY);
+    if (frame.is()) {
+      const Reference<container::XEnumerationAccess> inside(frame->getText(), UNO_QUERY_THROW);
+      AddTable(inside->createEnumeration()->nextElement(), names);
+    }
+  }
+}
+
+/// Hears whether the printer's queue took a document: LibreOffice tells it in no other way.
+class PrintJobWatch : public cppu::WeakImplHelper1<view::XPrintJobListener> {
+ public:
+  bool Failed() const { return failed_; }
+
+  void SAL_CALL printJobEvent(const view::PrintJobEvent& event) override {
+    if (event.State == view::PrintableState_JOB_FAILED || event.State == view::PrintableState_JOB_ABORTED ||
+        event.State == view::PrintableState_JOB_SPOOLING_FAILED) {
+      failed_ = true;
+    }
+  }
+  void SAL_CALL disposing(const com::sun::star::lang::EventObject& /*source*/) override {}
+
+ private:
+  std::atomic<bool> failed_ = false;  // set by a thread of LibreOffice's
+};
+
 }  // namespace
 
 OfficeDocument::OfficeDocument(const Reference<text::XTextDocument>& document, const OfficeServices& services,
@@ -224,8 +281,12 @@ void OfficeDocument::PrintOut() {
     if (printer.isEmpty() || printer == "Generic Printer") {
       throw RuntimeError(482, "Printer error");
     }
-    const Reference<com::sun::star::view::XPrintable> printable(document_, UNO_QUERY_THROW);
-    printable->print(Uno::Properties({{"Wait", Any(true)}}));
+    const rtl::Reference<PrintJobWatch> watch(new PrintJobWatch);
+    Reference<view::XPrintJobBroadcaster>(document_, UNO_QUERY_THROW)->addPrintJobListener(watch.get());
+    Reference<view::XPrintable>(document_, UNO_QUERY_THROW)->print(Uno::Properties({{"Wait", Any(true)}}));
+    if (watch->Failed()) {
+      throw RuntimeError(482, "Printer error");
+    }
   });
 }
 
@@ -247,13 +308,15 @@ Reference<text::XTextTable> OfficeDocument::Table(int number) {
 }
 
 void OfficeDocument::FindBodyTables() {
-  // The collection of tables is in no told order, and holds those in cells and frames too.
+  // The collection of tables is in no told order, and holds those in cells and text boxes too.
+  BodyTables names;
   const Reference<container::XEnumerationAccess> body(document_->getText(), UNO_QUERY_THROW);
-  const Reference<container::XEnumeration> parts = body->createEnumeration();
-  while (parts->hasMoreElements()) {
-    const Reference<text::XTextTable> found(parts->nextElement(), UNO_QUERY);
-    if (found.is()) {
-      bodyTables_->push_back(Reference<container::XNamed>(found, UNO_QUERY_THROW)->getName());
+  ForEachPart(body, [&names](const Any& part) {
+    AddTable(part, names);
+    if (const Reference<container::XEnumerationAccess> paragraph(part, UNO_QUERY); paragraph.is()) {
+      AddFloatingTables(part, names);
+      ForEachPart(paragraph, [&names](const Any& portion) { AddFloatingTables(portion, names); });
     }
-  }
+  });
+  *bodyTables_ = std::move(names);
 }

@@ -1,15 +1,18 @@
 #include <fcntl.h>
+#include <langinfo.h>
 #include <poll.h>
 #include <sys/prctl.h>
 #include <sys/signalfd.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <clocale>
 #include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <string>
+#include <string_view>
 #include <system_error>
 
 namespace {
@@ -18,7 +21,7 @@ namespace {
 constexpr int RestartAfterCrash = 79;
 constexpr int Restart = 81;
 
-/// A folder for LibreOffice's profile that goes with everything in it.
+/// A folder for LibreOffice's profile and temporary files that goes with everything in it.
 class Profile {
  public:
   Profile() {
@@ -54,6 +57,14 @@ std::string UrlPath(const std::string& path) {
   return url;
 }
 
+/// LibreOffice finds only files whose names the locale can spell, and names come in every script. This one is
+/// part of the system, whatever locales are installed.
+void SpellAllNames() {
+  if (std::setlocale(LC_CTYPE, "") == nullptr || std::string_view(nl_langinfo(CODESET)) != "UTF-8") {
+    setenv("LC_ALL", "C.UTF-8", 1);
+  }
+}
+
 /// Becomes LibreOffice, which dies with this process's parent.
 [[noreturn]] void BecomeOffice(const char* office, const std::string& profile, const std::string& pipe,
                                pid_t host) {
@@ -71,6 +82,8 @@ std::string UrlPath(const std::string& path) {
   const std::string installation = "-env:UserInstallation=file://" + UrlPath(profile);
   const std::string accept = "--accept=pipe,name=" + pipe + ";urp";
   setenv("SAL_USE_VCLPLUGIN", "svp", 1);
+  setenv("TMPDIR", profile.c_str(), 1);  // so that what it leaves goes with the profile
+  SpellAllNames();
   execl(office, office, installation.c_str(), "--headless", "--norestore", "--nologo", "--nodefault",
         accept.c_str(), nullptr);
   _exit(EXIT_FAILURE);
@@ -101,15 +114,8 @@ int WaitForEnd(pid_t office, int signals) {
       return status;
     }
   }
-  // Just asked to end, it needs a moment to clear up.
-  constexpr int graceMilliseconds = 500;
-  int status = 0;
-  pollfd ended = {signals, POLLIN, 0};
-  poll(&ended, 1, graceMilliseconds);
-  if (waitpid(office, &status, WNOHANG) != office) {
-    kill(office, SIGKILL);
-    waitpid(office, &status, 0);
-  }
+  kill(office, SIGKILL);
+  waitpid(office, nullptr, 0);
   return SIGKILL;
 }
 

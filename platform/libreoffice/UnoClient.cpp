@@ -74,7 +74,7 @@ class UnoClient : public OfficeClient {
     ::JoinPdfs(parts, target, onProgress);
   }
 
-  void Terminate() noexcept override;
+  void Disconnect() noexcept override;
 
  private:
   void CreateLocalContext();
@@ -145,13 +145,9 @@ std::unique_ptr<WordDocument> UnoClient::Add(const std::string& path) {
   });
 }
 
-void UnoClient::Terminate() noexcept {
+void UnoClient::Disconnect() noexcept {
   services_ = {};
-  try {
-    std::exchange(desktop_, {})->terminate();
-  } catch (const com::sun::star::uno::Exception&) {
-    return;  // It has ended already.
-  }
+  desktop_.clear();
 }
 
 }  // namespace

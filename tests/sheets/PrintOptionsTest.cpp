@@ -138,6 +138,15 @@ TEST_P(PrintOptionsWindow, OfTheProgressShowsSheetAndName) {
   EXPECT_FALSE(progress.isVisible());
 }
 
+TEST_P(PrintOptionsWindow, OfTheProgressHasTheHourglassButLeavesNoneForTheBoxesBehindIt) {
+  SheetProgressWindow progress(strings, nullptr);
+  progress.Open();
+  ASSERT_NE(QGuiApplication::overrideCursor(), nullptr);
+  EXPECT_EQ(QGuiApplication::overrideCursor()->shape(), Qt::WaitCursor);
+  progress.Close();
+  EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
+}
+
 TEST_P(PrintOptionsWindow, OfTheProgressStaysUntilTheSheetIsDone) {
   SheetProgressWindow progress(strings, nullptr);
   progress.Open();

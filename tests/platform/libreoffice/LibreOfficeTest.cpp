@@ -127,6 +127,41 @@ TEST_F(Writer, WritesTablesWithMergedCells) {
   EXPECT_THAT(text, Not(HasSubstr("second")));
 }
 
+TEST_F(Writer, CountsTablesThatTextFlowsAround) {
+  const auto table = [](int rows) {
+    std::string text = "<table:table><table:table-column/>";
+    for (int row = 0; row < rows; ++row) {
+      text += "<table:table-row><table:table-cell><text:p/></table:table-cell></table:table-row>";
+    }
+    return text + "</table:table>";
+  };
+  const auto inFrame = [](const std::string& anchor, const std::string& inside) {
+    return "<text:p><draw:frame text:anchor-type='" + anchor + "' svg:width='5cm'><draw:text-box>" + inside +
+           "</draw:text-box></draw:frame>behind</text:p>";
+  };
+  WriteFile(folder / "floating.fodt",
+            R"(<?xml version="1.0" encoding="UTF-8"?><office:document
+              xmlns:office="urn:oasis:names:tc:opendocument:xmlns:office:1.0"
+              xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
+              xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
+              xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
+              xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
+              office:mimetype="application/vnd.oasis.opendocument.text"><office:body><office:text>)" +
+                inFrame("paragraph", table(1)) + table(2) + inFrame("char", table(3)) +
+                inFrame("char", "<text:p>box</text:p>") + table(4) +
+                "</office:text></office:body></office:document>");
+  const auto document = Office().Add(folder / "floating.fodt");
+  for (const std::size_t rows : {1, 2, 3, 4}) {
+    const int number = static_cast<int>(rows);
+    document->WriteCells(number, 1, 20, std::vector<std::string>(rows, "x"));
+    EXPECT_EQ(
+        NumberThrownBy([&] { document->WriteCells(number, 1, 20, std::vector<std::string>(rows + 1, "x")); }),
+        440);
+  }
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(5, 1, 20, {}); }), 9);
+  document->Close();
+}
+
 TEST_F(Writer, TakesNothingButPicturesAsPictures) {
   const auto document = Office().Add(Template);
   WriteFile(folder / "no-picture", "bytes");
@@ -229,6 +264,44 @@ TEST_F(Writer, EndsWithAProgramThatCrashes) {
   };
   EXPECT_TRUE(WaitUntil([&] { return !runs(hosts[0]) && !runs(offices[0]); }));
   EXPECT_EQ(Profiles(), profiles);
+}
+
+class LibreOfficeInLocale : public testing::TestWithParam<const char*> {};
+
+TEST_P(LibreOfficeInLocale, ReadsAndSavesFilesNamedInAnyScript) {
+  const TemporaryFolder folder;
+  std::filesystem::create_directory(folder / "目录");
+  std::filesystem::copy(Template, folder / "目录/样张.doc");
+  setenv("LC_ALL", GetParam(), 1);
+  LibreOffice office(TESSARINE_PROGRAM_FOLDER);
+  const bool ready = StartAndWait(office);
+  unsetenv("LC_ALL");
+  ASSERT_TRUE(ready);
+  const auto document = office.Add(folder / "目录/样张.doc");
+  document->SaveAs(folder / "目录/Red 5-王小明 é.doc");
+  document->Close();
+  EXPECT_TRUE(std::filesystem::exists(folder / "目录/Red 5-王小明 é.doc"));
+}
+
+INSTANTIATE_TEST_SUITE_P(OfAnyKind, LibreOfficeInLocale, testing::Values("C", "C.UTF-8", "tlh_XX.UTF-8"));
+
+TEST(LibreOfficeThatHangs, EndsAndLeavesNoFiles) {
+  const TemporaryFolder folder;
+  setenv("TMPDIR", folder.Path().c_str(), 1);
+  LibreOffice office(TESSARINE_PROGRAM_FOLDER);
+  const bool ready = StartAndWait(office);
+  unsetenv("TMPDIR");
+  ASSERT_TRUE(ready);
+  const std::vector<pid_t> hosts = Hosts();
+  ASSERT_THAT(hosts, SizeIs(1));
+  const std::vector<pid_t> offices = ChildrenOf(hosts[0], "soffice.bin");
+  ASSERT_THAT(offices, SizeIs(1));
+  office.Add(Template)->Close();
+  kill(offices[0], SIGSTOP);
+  office.Quit();
+  EXPECT_EQ(office.State(), WordState::Ended);
+  EXPECT_THAT(Hosts(), IsEmpty());
+  EXPECT_TRUE(std::filesystem::is_empty(folder.Path()));
 }
 
 TEST(LibreOfficeThatIsNotThere, IsAFailureOfTheStart) {

@@ -14,7 +14,9 @@
 /// A CUPS server of the test's own with one printer, the default one, that keeps each job as a file.
 class PrintQueue {
  public:
-  PrintQueue() {
+  enum class Takes { Jobs, Nothing };
+
+  explicit PrintQueue(Takes takes = Takes::Jobs) {
     std::filesystem::permissions(folder_.Path(), std::filesystem::perms(0777));
     for (const char* name : {"spool", "cache", "state", "printed", "programs", "programs/backend"}) {
       std::filesystem::create_directory(folder_ / name);
@@ -22,7 +24,7 @@ class PrintQueue {
     std::filesystem::permissions(folder_ / "printed", std::filesystem::perms(0777));
     std::filesystem::create_directory_symlink("/usr/lib/cups/daemon", folder_ / "programs/daemon");
     WriteBackend();
-    WriteSettings();
+    WriteSettings(takes);
     server_ = fork();
     if (server_ == 0) {
       execl("/usr/sbin/cupsd", "cupsd", "-f", "-c", (folder_ / "cupsd.conf").c_str(), "-s",
@@ -66,7 +68,7 @@ class PrintQueue {
     std::filesystem::permissions(backend, std::filesystem::perms(0755));
   }
 
-  void WriteSettings() const {
+  void WriteSettings(Takes takes) const {
     WriteFile(folder_ / "cupsd.conf",
               "Listen " + Socket() +
                   "\nWebInterface No\nBrowsing No\nDefaultAuthType None\n"
@@ -80,7 +82,8 @@ class PrintQueue {
                   (folder_ / "pages") + "\nUser nobody\nGroup nogroup\n");
     WriteFile(folder_ / "printers.conf",
               "<DefaultPrinter Venue>\nInfo Venue\nDeviceURI keep:" + (folder_ / "printed") +
-                  "\nState Idle\nAccepting Yes\nShared No\n</DefaultPrinter>\n");
+                  "\nState Idle\nAccepting " + (takes == Takes::Jobs ? "Yes" : "No") +
+                  "\nShared No\n</DefaultPrinter>\n");
   }
 
   TemporaryFolder folder_;
