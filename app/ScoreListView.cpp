@@ -1,6 +1,8 @@
 #include "app/ScoreListView.h"
 
+#include <QFocusEvent>
 #include <QHeaderView>
+#include <QKeyEvent>
 #include <QPainter>
 #include <QPixmap>
 #include <QProxyStyle>
@@ -73,6 +75,23 @@ void ScoreListView::paintEvent(QPaintEvent* event) {
     painter.drawPixmap(place, QPixmap(QStringLiteral(":/pictures/tessarine-256.png")));
   }
   QTableView::paintEvent(event);
+}
+
+void ScoreListView::focusInEvent(QFocusEvent* event) {
+  QTableView::focusInEvent(event);
+  const bool byKey = event->reason() == Qt::TabFocusReason || event->reason() == Qt::BacktabFocusReason;
+  if (byKey && selectionModel() != nullptr && !selectionModel()->hasSelection() && currentIndex().isValid()) {
+    selectRow(currentIndex().row());
+  }
+}
+
+void ScoreListView::keyPressEvent(QKeyEvent* event) {
+  // The toolkit knows only the menu key on this platform; many keyboards have none.
+  if (event->key() == Qt::Key_F10 && event->modifiers() == Qt::ShiftModifier) {
+    emit customContextMenuRequested(visualRect(currentIndex()).center());
+    return;
+  }
+  QTableView::keyPressEvent(event);
 }
 
 void ScoreListView::ShareWidth() {

@@ -3,7 +3,9 @@
 #include <QTableView>
 #include <vector>
 
-/// A score list on the screen: whole rows, large figures, columns that keep their share of the width.
+/// A score list on the screen: whole rows, large figures, columns that keep their share of the width. Reached
+/// with the Tab key and nothing selected, it selects its current row, so that commands by key have a row to
+/// act on.
 class ScoreListView : public QTableView {
   Q_OBJECT
 
@@ -19,6 +21,8 @@ class ScoreListView : public QTableView {
  protected:
   void resizeEvent(QResizeEvent* event) override;
   void paintEvent(QPaintEvent* event) override;
+  void focusInEvent(QFocusEvent* event) override;
+  void keyPressEvent(QKeyEvent* event) override;
 
  private:
   void ShareWidth();

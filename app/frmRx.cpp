@@ -183,6 +183,9 @@ void frmRx::ConnectCommands() {
     connect(entry.first, &QAction::triggered, this,
             [this, command] { Run([this, command] { (this->*command)(); }); });
   }
+  // In the bar, but never shown there: tools that read the screen find the items of an open context menu only
+  // so.
+  ui_->mnuPopup->menuAction()->setVisible(false);
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
   connect(ui_->RemoteManageButton, &QPushButton::clicked, ui_->mnuRemoteManage, &QAction::trigger);

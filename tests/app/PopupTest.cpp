@@ -1,6 +1,8 @@
 #include <gmock/gmock.h>
 
+#include <QAccessible>
 #include <QLineEdit>
+#include <QMenuBar>
 
 #include "app/BonusPoints.h"
 #include "app/PlayerDetails.h"
@@ -25,6 +27,14 @@ class Popup : public testing::Test {
   /// A right click at a place in the board: the mouse button, then the event that asks for the menu.
   void RightClick(const QPoint& place, const std::function<void(QMenu&)>& choose) {
     QTest::mouseClick(Board().viewport(), Qt::RightButton, {}, place);
+    WithMenu(choose, [&] {
+      QContextMenuEvent event(QContextMenuEvent::Mouse, place, Board().viewport()->mapToGlobal(place));
+      QApplication::sendEvent(Board().viewport(), &event);
+    });
+  }
+
+  /// Does `choose` with the menu open, if `open` opens it.
+  void WithMenu(const std::function<void(QMenu&)>& choose, const std::function<void()>& open) {
     auto& menu = venue.Find<QMenu>("mnuPopup");
     QTimer timer;
     QObject::connect(&timer, &QTimer::timeout, &timer, [&] {
@@ -35,8 +45,7 @@ class Popup : public testing::Test {
       }
     });
     timer.start(0);
-    QContextMenuEvent event(QContextMenuEvent::Mouse, place, Board().viewport()->mapToGlobal(place));
-    QApplication::sendEvent(Board().viewport(), &event);
+    open();
   }
 
   /// Gives points to the player of the row that the menu then stands for.
@@ -85,6 +94,37 @@ TEST_F(Popup, OpensByTheKeyboard) {
   venue.LoadGame(SmallGame());
   GiveBonus([this](const auto& choose) { venue.OpenPopup(0, choose); }, "-3");
   EXPECT_EQ(venue.Row("ScoreDisplay", 1)[2], "-3");
+}
+
+TEST_F(Popup, OpensByShiftAndF10) {
+  venue.LoadGame(SmallGame());
+  Board().selectRow(0);
+  GiveBonus(
+      [this](const auto& choose) {
+        WithMenu(choose, [this] { QTest::keyClick(&Board(), Qt::Key_F10, Qt::ShiftModifier); });
+      },
+      "-3");
+  EXPECT_EQ(venue.Row("ScoreDisplay", 1)[2], "-3");
+}
+
+TEST_F(Popup, ActsOnTheFirstRowWhenTheBoardWasReachedWithTheTabKey) {
+  venue.LoadGame(SmallGame());
+  QFocusEvent tabbed(QEvent::FocusIn, Qt::TabFocusReason);
+  QApplication::sendEvent(&Board(), &tabbed);
+  GiveBonus([this](const auto& choose) { venue.OpenPopup(-1, choose); }, "-3");
+  EXPECT_EQ(venue.Row("ScoreDisplay", 1)[2], "-3");
+}
+
+TEST_F(Popup, IsFoundByScreenReadersWithoutShowingInTheMenuBar) {
+  auto& bar = venue.Find<QMenuBar>("menubar");
+  EXPECT_FALSE(venue.Find<QMenu>("mnuPopup").menuAction()->isVisible());
+  const QAccessibleInterface* items = QAccessible::queryAccessibleInterface(&bar);
+  ASSERT_NE(items, nullptr);
+  const QAccessibleInterface* popup = items->child(items->childCount() - 1);
+  ASSERT_EQ(popup->childCount(), 1);
+  const QAccessibleInterface* menu = popup->child(0);
+  EXPECT_EQ(menu->child(menu->childCount() - 1)->text(QAccessible::Name),
+            QStringLiteral("Bonus Soldiering Points"));
 }
 
 TEST_F(Popup, ActsOnTheLastOfSeveralSelectedRows) {
