@@ -186,6 +186,8 @@ void frmRx::ConnectCommands() {
   // In the bar, but never shown there: tools that read the screen find the items of an open context menu only
   // so.
   ui_->mnuPopup->menuAction()->setVisible(false);
+  // An item that such a tool presses does not close its menu by itself, and the board waits for that.
+  connect(ui_->mnuPopup, &QMenu::triggered, ui_->mnuPopup, &QWidget::close);
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
   connect(ui_->RemoteManageButton, &QPushButton::clicked, ui_->mnuRemoteManage, &QAction::trigger);

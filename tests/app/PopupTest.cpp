@@ -101,7 +101,10 @@ TEST_F(Popup, OpensByShiftAndF10) {
   Board().selectRow(0);
   GiveBonus(
       [this](const auto& choose) {
-        WithMenu(choose, [this] { QTest::keyClick(&Board(), Qt::Key_F10, Qt::ShiftModifier); });
+        WithMenu(choose, [this] {
+          QKeyEvent press(QEvent::KeyPress, Qt::Key_F10, Qt::ShiftModifier);
+          QApplication::sendEvent(&Board(), &press);
+        });
       },
       "-3");
   EXPECT_EQ(venue.Row("ScoreDisplay", 1)[2], "-3");
@@ -125,6 +128,18 @@ TEST_F(Popup, IsFoundByScreenReadersWithoutShowingInTheMenuBar) {
   const QAccessibleInterface* menu = popup->child(0);
   EXPECT_EQ(menu->child(menu->childCount() - 1)->text(QAccessible::Name),
             QStringLiteral("Bonus Soldiering Points"));
+}
+
+TEST_F(Popup, ClosesWhenAnItemIsPressedByAScreenReader) {
+  venue.LoadGame(SmallGame());
+  Board().selectRow(0);
+  auto& menu = venue.Find<QMenu>("mnuPopup");
+  bool open = true;
+  venue.OpenPopup(0, [&](QMenu&) {
+    venue.Find<QAction>("mnuUnassignMember").trigger();
+    open = menu.isVisible();
+  });
+  EXPECT_FALSE(open);
 }
 
 TEST_F(Popup, ActsOnTheLastOfSeveralSelectedRows) {
