@@ -86,6 +86,15 @@ void Scenarios::SetCaptions() {
   }
   ui_->MissionSelection1->setAccessibleName(text(183));
   ui_->Description->setAccessibleName(text(184));
+  // A label names its buddy to screen readers only beside it, and these boxes lie on pages of their own.
+  for (const ObjectiveBoxes& boxes : objectives_) {
+    boxes.PrimaryDescription->setAccessibleName(text(192));
+    boxes.PrimaryPoints->setAccessibleName(text(193));
+    boxes.SecondaryDescription->setAccessibleName(text(194));
+    boxes.SecondaryPoints->setAccessibleName(text(193));
+    boxes.PrimaryPoints->setAccessibleDescription(text(192));
+    boxes.SecondaryPoints->setAccessibleDescription(text(194));
+  }
 }
 
 void Scenarios::ConnectCommands() {

@@ -92,6 +92,20 @@ TEST_F(Editor, UnlocksForEditingAndStaysSoOnTheNextMission) {
   EXPECT_EQ(Stored("MissionDescription", "One"), "First text");
 }
 
+TEST_F(Editor, NamesItsObjectiveBoxesToScreenReaders) {
+  Open([this] {
+    const auto name = [](QWidget& box) {
+      return QAccessible::queryAccessibleInterface(&box)->text(QAccessible::Name).toStdString();
+    };
+    for (const std::string set : {"0", "1", "2"}) {
+      EXPECT_EQ(name(Memo("PrimaryObjectiveDescription" + set)), "Primary  Objective");
+      EXPECT_EQ(name(Memo("SecondaryObjectiveDescription" + set)), "Secondary Objective");
+      EXPECT_EQ(name(Line("PrimaryPoints" + set)), "Victory points");
+      EXPECT_EQ(name(Line("SecondaryPoints" + set)), "Victory points");
+    }
+  });
+}
+
 TEST_F(Editor, BringsTheTabsObjectivesToTheFront) {
   Open([this] {
     auto& tabs = ::Find<QTabBar>(*window, "ObjectivesTab");
