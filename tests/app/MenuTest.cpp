@@ -89,7 +89,9 @@ class MenuBar : public testing::TestWithParam<Language> {
 TEST_P(MenuBar, HasEveryItemInItsPlace) {
   std::vector<std::string> heads;
   for (const QAction* action : ItemsOf(Bar())) {
-    heads.push_back(NameOf(*action));
+    if (action->isVisible()) {
+      heads.push_back(NameOf(*action));
+    }
   }
   EXPECT_THAT(heads,
               ElementsAre("mnuFile", "mnuMissions", "mnuMembers", "mnuTools", "mnuSettings", "mnuHelp"));
