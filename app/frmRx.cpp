@@ -8,6 +8,7 @@
 #include <utility>
 #include <vector>
 
+#include "app/PlayerDelegate.h"
 #include "app/ScoreListModel.h"
 #include "app/Text.h"
 #include "core/FieldValue.h"
@@ -124,6 +125,7 @@ void frmRx::SetUpLists() {
   ui_->ScoreDisplay->setModel(new ScoreListModel(
       scoreDisplay_, game_, headers({103, 104, 105, 106, 107, 108, 109, 110, 111}), 1, this));
   ui_->ScoreDisplay->SetColumnShares(boardShares);
+  ui_->ScoreDisplay->setItemDelegateForColumn(1, new PlayerDelegate(this));
   ui_->ScoreDisplay->horizontalHeader()->setSectionsClickable(true);
   ui_->TeamScores->setModel(new ScoreListModel(teamScores_, game_, headers({112, 113, 105}), 1, this));
   ui_->TeamScores->SetColumnShares(std::vector<double>(TeamColumnCount, 1.0 / TeamColumnCount));

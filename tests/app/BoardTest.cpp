@@ -250,6 +250,25 @@ TEST_F(Board, ColoursEachTeamInBothLists) {
   EXPECT_EQ(colours("ScoreDisplay", 2), colours("TeamScores", 2));
 }
 
+TEST_F(Board, ShowsAMembersNameBelowThePlayer) {
+  venue.LoadGame(GameOfFour());
+  const auto& board = venue.Find<QTableView>("ScoreDisplay");
+  // Dark dots to the right of the team's badge, in the lowest quarter of the cell.
+  const auto inkBelow = [&board](int row) {
+    const QRect cell = board.visualRect(board.model()->index(row, 1));
+    const QImage picture = board.viewport()->grab(cell.adjusted(40, cell.height() * 3 / 4, 0, 0)).toImage();
+    int dots = 0;
+    for (int y = 0; y < picture.height(); ++y) {
+      for (int x = 0; x < picture.width(); ++x) {
+        dots += picture.pixelColor(x, y).lightness() < 128 ? 1 : 0;
+      }
+    }
+    return dots;
+  };
+  EXPECT_EQ(inkBelow(0), 0);  // Red 1, who is no member
+  EXPECT_GT(inkBelow(2), 20);
+}
+
 TEST_F(Board, TellsTheWholePlayerAsToolTip) {
   venue.LoadGame(GameOfFour());
   const QAbstractItemModel& board = *venue.Find<QTableView>("ScoreDisplay").model();

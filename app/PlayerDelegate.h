@@ -1,0 +1,14 @@
+#pragma once
+
+#include <QStyledItemDelegate>
+
+/// Shows a player with the member's name in small letters below, since both do not fit side by side into the
+/// board's column.
+class PlayerDelegate : public QStyledItemDelegate {
+  Q_OBJECT
+
+ public:
+  using QStyledItemDelegate::QStyledItemDelegate;
+
+  void paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const override;
+};
