@@ -12,6 +12,8 @@
 #include <system_error>
 #include <thread>
 
+#include "sim/PortLock.h"
+
 namespace sim {
 namespace {
 
@@ -51,6 +53,7 @@ PseudoTerminal::PseudoTerminal(int baud, Pace pace)
     ThrowSystemError("pseudo terminal");
   }
   slavePath_ = SlavePathOf(master_.Get());
+  AwaitPortUnlocked(slavePath_);
   slave_ = OpenRaw(slavePath_);
   std::array<int, 2> wake{};
   if (::pipe2(wake.data(), O_CLOEXEC) != 0) {

@@ -7,6 +7,7 @@
 #include <unistd.h>
 
 #include <chrono>
+#include <csignal>
 #include <cstdio>
 #include <random>
 #include <thread>
@@ -38,6 +39,8 @@ void LibreOffice::LoadModule() {
   if (client_ != nullptr) {
     return;
   }
+  // A call to a LibreOffice that has just died is to fail, and not to end this program.
+  std::signal(SIGPIPE, SIG_IGN);
   // Never unloaded: LibreOffice's libraries keep threads of their own.
   void* const module = dlopen((folder_ + "/libtessarine-office.so").c_str(), RTLD_NOW | RTLD_LOCAL);
   void* const symbol = module == nullptr ? nullptr : dlsym(module, NewOfficeClientName);

@@ -212,6 +212,12 @@ TEST_F(Writer, JoinsPdfs) {
   EXPECT_FALSE(std::filesystem::exists(folder / "none.pdf"));
 }
 
+TEST_F(Writer, CannotEndTheProgramByEndingInACall) {
+  struct sigaction onLostPipe {};
+  ASSERT_EQ(sigaction(SIGPIPE, nullptr, &onLostPipe), 0);
+  EXPECT_EQ(onLostPipe.sa_handler, SIG_IGN);
+}
+
 TEST_F(Writer, IsStartedAfreshWhenItWasKilled) {
   const std::vector<pid_t> hosts = Hosts();
   ASSERT_THAT(hosts, SizeIs(1));

@@ -11,6 +11,8 @@
 #include <string>
 #include <vector>
 
+#include "sim/PortLock.h"
+
 /// A serial line whose far end is in the test's hand.
 class PseudoTerminal {
  public:
@@ -21,6 +23,7 @@ class PseudoTerminal {
       throw std::runtime_error("No pseudo terminal to be had");
     }
     device_ = name;
+    sim::AwaitPortUnlocked(device_);
     termios raw = Settings();
     ::cfmakeraw(&raw);
     ::tcsetattr(master_, TCSANOW, &raw);
