@@ -32,9 +32,6 @@ SqliteRecordset::SqliteRecordset(SqliteConnection& connection, const std::string
       ownRow_(table_.Columns().size()),
       pending_(connection, table_) {
   ReadKeys(condition);
-  if (keys_.Size() != 0) {
-    GoTo(0);
-  }
 }
 
 // The keys of a whole table are taken in whatever order is cheapest: an index is a small part of the table,
@@ -48,7 +45,7 @@ void SqliteRecordset::ReadKeys(const std::string& condition) {
   while (search.Step()) {
     keys.push_back(search.Integer(0));
   }
-  keys_ = KeySet(std::move(keys));
+  cursor_ = KeyCursor(KeySet(std::move(keys)));
 }
 
 std::size_t SqliteRecordset::LongColumnAt(std::string_view name) const {
@@ -60,13 +57,7 @@ std::size_t SqliteRecordset::LongColumnAt(std::string_view name) const {
 }
 
 void SqliteRecordset::GoTo(std::size_t position) {
-  place_ = Place::Row;
-  position_ = position;
-  ForgetRow();
-}
-
-void SqliteRecordset::GoToEnd() {
-  place_ = keys_.Size() == 0 ? Place::BothEnds : Place::End;
+  cursor_.MoveTo(position);
   ForgetRow();
 }
 
@@ -75,56 +66,19 @@ void SqliteRecordset::ForgetRow() {
   longValues_.clear();
 }
 
-void SqliteRecordset::MoveFirst() {
+void SqliteRecordset::Move(void (KeyCursor::*move)()) {
   pending_.Drop();
   lookedUp_ = false;
+  (cursor_.*move)();
+  ForgetRow();
+}
+
+void SqliteRecordset::MoveFirst() {
+  Move(&KeyCursor::MoveFirst);
   // A walk begins, which may well ask for other columns than what came before it.
   wanted_.assign(wanted_.size(), false);
   read_ = SqliteStatement();
   cache_.Clear();
-  if (keys_.Size() == 0) {
-    GoToEnd();
-  } else {
-    GoTo(0);
-  }
-}
-
-void SqliteRecordset::MoveNext() {
-  pending_.Drop();
-  lookedUp_ = false;
-  if (Eof()) {
-    throw RuntimeError(3021);
-  }
-  const std::size_t next = place_ == Place::Gap ? position_ : place_ == Place::Beginning ? 0 : position_ + 1;
-  if (next < keys_.Size()) {
-    GoTo(next);
-  } else {
-    GoToEnd();
-  }
-}
-
-void SqliteRecordset::MovePrevious() {
-  pending_.Drop();
-  if (Bof()) {
-    throw RuntimeError(3021);
-  }
-  const std::size_t behind = place_ == Place::End ? keys_.Size() : position_;
-  if (behind > 0) {
-    GoTo(behind - 1);
-  } else {
-    place_ = keys_.Size() == 0 ? Place::BothEnds : Place::Beginning;
-    ForgetRow();
-  }
-}
-
-void SqliteRecordset::MoveLast() {
-  pending_.Drop();
-  lookedUp_ = false;
-  if (keys_.Size() == 0) {
-    GoToEnd();
-  } else {
-    GoTo(keys_.Size() - 1);
-  }
 }
 
 std::optional<std::size_t> SqliteRecordset::FirstPosition(SqliteStatement& search) {
@@ -132,11 +86,11 @@ std::optional<std::size_t> SqliteRecordset::FirstPosition(SqliteStatement& searc
   const ResetAtEnd reset(search);
   std::optional<std::size_t> first;
   while (search.Step()) {
-    const std::optional<std::size_t> position = keys_.PositionOf(search.Integer(0));
+    const std::optional<std::size_t> position = cursor_.Keys().PositionOf(search.Integer(0));
     if (position && (!first || *position < *first)) {
       first = position;
       // The search yields keys in ascending order.
-      if (keys_.Ascending()) {
+      if (cursor_.Keys().Ascending()) {
         break;
       }
     }
@@ -169,14 +123,15 @@ bool SqliteRecordset::WalkTo(const std::string& column, const Value& value) {
   if (key != nullptr ? WalkToKey(*key) : WalkToValue(i, value)) {
     return true;
   }
-  GoToEnd();
+  cursor_.MoveBehind();
+  ForgetRow();
   connection_.Rollback();
   return false;
 }
 
 // The commonest search: finding the row and reading it are one.
 bool SqliteRecordset::WalkToKey(std::int64_t key) {
-  const std::optional<std::size_t> position = keys_.PositionOf(key);
+  const std::optional<std::size_t> position = cursor_.Keys().PositionOf(key);
   if (!position) {
     return false;
   }
@@ -218,15 +173,8 @@ std::optional<std::size_t> SqliteRecordset::FirstWith(std::size_t column, const 
   return FirstPosition(walk);
 }
 
-std::int64_t SqliteRecordset::CurrentKey() const {
-  if (place_ != Place::Row) {
-    throw RuntimeError(3021);
-  }
-  return keys_.At(position_);
-}
-
 bool SqliteRecordset::TryReadRow() {
-  const std::int64_t key = CurrentKey();
+  const std::int64_t key = cursor_.Key();
   if (row_ != nullptr) {
     return true;
   }
@@ -273,7 +221,7 @@ void SqliteRecordset::ReadRow() {
 }
 
 const Value& SqliteRecordset::LongValue(std::size_t column) {
-  const std::int64_t key = CurrentKey();
+  const std::int64_t key = cursor_.Key();
   const auto held = longValues_.find(column);
   if (held != longValues_.end()) {
     return held->second;
@@ -348,28 +296,15 @@ void SqliteRecordset::Update() {
       throw RuntimeError(3020);
     case ::EditMode::InProgress:
       ForgetRow();
-      if (!pending_.Change(CurrentKey())) {
+      if (!pending_.Change(cursor_.Key())) {
         FailDeleted();
       }
       break;
     case ::EditMode::Add:
-      JoinKey(pending_.Insert());
+      cursor_.Append(pending_.Insert());
       break;
   }
   pending_.Drop();
-}
-
-// A key that was already here belonged to a row that someone else deleted meanwhile.
-void SqliteRecordset::JoinKey(std::int64_t key) {
-  if (const std::optional<std::size_t> stale = keys_.PositionOf(key)) {
-    keys_.Erase(*stale);
-    if (place_ == Place::Row && position_ == *stale) {
-      place_ = Place::Gap;
-    } else if (position_ > *stale) {
-      --position_;
-    }
-  }
-  keys_.Append(key);
 }
 
 void SqliteRecordset::CancelUpdate() {
@@ -381,7 +316,7 @@ void SqliteRecordset::CancelUpdate() {
 
 void SqliteRecordset::Delete() {
   pending_.Drop();
-  const std::int64_t key = CurrentKey();
+  const std::int64_t key = cursor_.Key();
   WriteTransaction transaction(connection_);
   SqliteStatement deletion(connection_, "DELETE FROM [" + table_.Name() + "] WHERE rowid = ?1");
   deletion.Bind(1, key);
@@ -390,8 +325,7 @@ void SqliteRecordset::Delete() {
     FailDeleted();
   }
   transaction.Commit();
-  keys_.Erase(position_);
-  place_ = Place::Gap;
+  cursor_.Erase();
   ForgetRow();
 }
 

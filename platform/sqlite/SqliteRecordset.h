@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "platform/Database.h"
-#include "platform/sqlite/KeySet.h"
+#include "platform/sqlite/KeyCursor.h"
 #include "platform/sqlite/PendingRow.h"
 #include "platform/sqlite/RowCache.h"
 #include "platform/sqlite/SqliteConnection.h"
@@ -26,13 +26,15 @@ class SqliteRecordset : public Recordset {
   SqliteRecordset(SqliteConnection& connection, const std::string& table, const std::string& condition);
 
   void MoveFirst() override;
-  void MoveNext() override;
-  void MovePrevious() override;
-  void MoveLast() override;
-  bool Eof() const override { return place_ == Place::End || place_ == Place::BothEnds; }
-  bool Bof() const override { return place_ == Place::Beginning || place_ == Place::BothEnds; }
-  int RecordCount() const override { return static_cast<int>(keys_.Size()); }
-  int AbsolutePosition() const override { return place_ == Place::Row ? static_cast<int>(position_) : -1; }
+  void MoveNext() override { Move(&KeyCursor::MoveNext); }
+  void MovePrevious() override { Move(&KeyCursor::MovePrevious); }
+  void MoveLast() override { Move(&KeyCursor::MoveLast); }
+  bool Eof() const override { return cursor_.Eof(); }
+  bool Bof() const override { return cursor_.Bof(); }
+  int RecordCount() const override { return static_cast<int>(cursor_.Keys().Size()); }
+  int AbsolutePosition() const override {
+    return cursor_.OnRow() ? static_cast<int>(cursor_.Position()) : -1;
+  }
   void FindFirst(const std::string& criterion) override;
   bool NoMatch() const override { return noMatch_; }
   bool WalkTo(const std::string& column, const Value& value) override;
@@ -49,19 +51,11 @@ class SqliteRecordset : public Recordset {
   void AppendChunk(std::string_view column, const Blob& bytes) override;
 
  private:
-  enum class Place {
-    Row,        ///< on the row at position_
-    Gap,        ///< before the row at position_, where a row was deleted
-    Beginning,  ///< before the first row
-    End,        ///< after the last row
-    BothEnds    ///< there were no rows
-  };
-
   void ReadKeys(const std::string& condition);
   std::size_t LongColumnAt(std::string_view name) const;
 
   void GoTo(std::size_t position);
-  void GoToEnd();
+  void Move(void (KeyCursor::*move)());
   void ForgetRow();
   std::optional<std::size_t> FirstPosition(SqliteStatement& search);
   bool WalkToKey(std::int64_t key);
@@ -70,21 +64,16 @@ class SqliteRecordset : public Recordset {
   std::optional<std::size_t> FirstWith(std::size_t column, const Value& value);
 
   void Want(std::size_t column);
-  std::int64_t CurrentKey() const;
   bool TryReadRow();
   bool ReadInto(std::vector<Value>& row, std::int64_t key);
   void ReadRow();
   const Value& LongValue(std::size_t column);
   [[noreturn]] void FailDeleted();
 
-  void JoinKey(std::int64_t key);
-
   SqliteConnection& connection_;
   SqliteTable table_;
 
-  KeySet keys_;
-  Place place_ = Place::BothEnds;
-  std::size_t position_ = 0;
+  KeyCursor cursor_;
 
   std::string findCriterion_;
   SqliteStatement find_;

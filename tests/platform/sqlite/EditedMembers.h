@@ -1,0 +1,24 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string>
+
+#include "tests/platform/sqlite/TestDatabase.h"
+
+/// A cursor on the first of the members.
+class EditedMembers : public testing::Test {
+ protected:
+  EditedMembers() {
+    file.AddMembers();
+    database = file.Open();
+    rows = database->OpenRecordset("Members");
+  }
+
+  std::string Count() const { return file.Query("SELECT count(*) FROM Members"); }
+
+  TestDatabase file;
+  std::unique_ptr<Database> database;
+  std::unique_ptr<Recordset> rows;
+};
