@@ -3,10 +3,10 @@
 #include <QCoreApplication>
 #include <QFileInfo>
 
-ConversionWithProgress::ConversionWithProgress(const StringTable& strings, std::chrono::milliseconds moment)
+ConversionWithProgress::ConversionWithProgress(const StringTable& strings, std::chrono::milliseconds moment,
+                                               const std::string& reader)
     : strings_(strings),
-      converter_(JetReaderPath(), JetConverter::LongestSilence,
-                 [this](std::int64_t rows) { ShowRows(rows); }),
+      converter_(reader, JetConverter::LongestSilence, [this](std::int64_t rows) { ShowRows(rows); }),
       moment_(moment) {}
 
 OldDatabaseReport ConversionWithProgress::Convert(const std::string& path, const std::string& table,

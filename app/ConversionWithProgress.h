@@ -13,7 +13,8 @@ class ConversionWithProgress : public OldDatabases {
  public:
   /// `moment` is the time after which the window comes up, and from one text in it to the next.
   explicit ConversionWithProgress(const StringTable& strings,
-                                  std::chrono::milliseconds moment = std::chrono::milliseconds(90));
+                                  std::chrono::milliseconds moment = std::chrono::milliseconds(90),
+                                  const std::string& reader = JetReaderPath());
 
   bool IsOld(const std::string& path) const override { return converter_.IsOld(path); }
   OldDatabaseReport Convert(const std::string& path, const std::string& table,

@@ -1,5 +1,3 @@
-#include <sys/resource.h>
-
 #include <QApplication>
 #include <chrono>
 #include <cstdio>
@@ -7,6 +5,7 @@
 #include "app/Composition.h"
 #include "app/UploadProgress.h"
 #include "bench/Goals.h"
+#include "bench/RealLine.h"
 #include "core/BaseUnitDownload.h"
 #include "sim/BaseUnit.h"
 #include "sim/GameMaker.h"
@@ -18,34 +17,12 @@ using Seconds = std::chrono::duration<double>;
 constexpr double Baud = 19200;
 constexpr double BitsPerByte = 10;
 
-double ProcessorSeconds() {
-  rusage usage{};
-  getrusage(RUSAGE_SELF, &usage);
-  return static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
-         static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
-}
-
 /// Boxes are answered at once.
 class SilentBoxes : public MessageBoxes {
  public:
   BoxAnswer Show(const std::string&, const std::string&, BoxIcon, BoxButtons) override {
     return BoxAnswer::Cancel;
   }
-};
-
-class OneDevice : public SerialDevices {
- public:
-  explicit OneDevice(std::string device) : device_(std::move(device)) {}
-  std::vector<std::string> Names() const override { return {device_}; }
-  bool Exists(const std::string& device) const override { return device == device_; }
-
- private:
-  std::string device_;
-};
-
-struct Spent {
-  double Wall;
-  double Processor;
 };
 
 /// One download with the real line, event loop and progress window.
@@ -61,10 +38,11 @@ Spent Download(const sim::BaseUnit& unit) {
   const QtClock clock;
   CommPort commPort(port, ini, device, boxes, strings, [] {});
   UploadProgress progress(strings, nullptr);
-  const double processor = ProcessorSeconds();
+  const double processor = ProcessorSeconds(RUSAGE_SELF);
   const auto start = std::chrono::steady_clock::now();
   BaseUnitDownload(port, commPort, events, boxes, clock, progress, game).GetScores();
-  return {Seconds(std::chrono::steady_clock::now() - start).count(), ProcessorSeconds() - processor};
+  return {Seconds(std::chrono::steady_clock::now() - start).count(),
+          ProcessorSeconds(RUSAGE_SELF) - processor};
 }
 
 bool MeasureDownload() {

@@ -1,5 +1,3 @@
-#include <sys/resource.h>
-
 #include <QApplication>
 #include <QPushButton>
 #include <QRadioButton>
@@ -10,6 +8,7 @@
 
 #include "app/Composition.h"
 #include "bench/Goals.h"
+#include "bench/RealLine.h"
 #include "core/IniReader.h"
 #include "devices/FrameParser.h"
 #include "devices/RemoteManage.h"
@@ -20,21 +19,9 @@ namespace {
 
 using Seconds = std::chrono::duration<double>;
 
+constexpr int Who = RUSAGE_THREAD;  // the modem has a thread of its own
 constexpr int Guns = 40;
 constexpr std::chrono::milliseconds AnswerTime(5);
-
-struct Spent {
-  double Wall;
-  double Processor;
-};
-
-/// Of this thread: the modem has one of its own.
-double ProcessorSeconds() {
-  rusage usage{};
-  getrusage(RUSAGE_THREAD, &usage);
-  return static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
-         static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
-}
 
 /// Answers with a block of 90 bytes, as fetching scores brings them, a million bytes or a little more.
 std::vector<std::uint8_t> BlockAnswers() {
@@ -78,16 +65,6 @@ bool MeasureParser() {
   return ReportGoal("100 MB/s / speed of the radio's frame parser", goal / speed, 1, detail);
 }
 
-class OneDevice : public SerialDevices {
- public:
-  explicit OneDevice(std::string device) : device_(std::move(device)) {}
-  std::vector<std::string> Names() const override { return {device_}; }
-  bool Exists(const std::string& device) const override { return device == device_; }
-
- private:
-  std::string device_;
-};
-
 /// The window on a real line with 40 guns behind the modem.
 class Site {
  public:
@@ -98,10 +75,10 @@ class Site {
   }
 
   Spent Press(const char* button) {
-    const double processor = ProcessorSeconds();
+    const double processor = ProcessorSeconds(Who);
     const auto start = std::chrono::steady_clock::now();
     window_.findChild<QPushButton*>(QString::fromLatin1(button))->click();
-    return {Seconds(std::chrono::steady_clock::now() - start).count(), ProcessorSeconds() - processor};
+    return {Seconds(std::chrono::steady_clock::now() - start).count(), ProcessorSeconds(Who) - processor};
   }
 
   sim::RadioModemTraffic Traffic() const { return modem_.Traffic(); }

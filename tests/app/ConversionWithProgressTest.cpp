@@ -12,23 +12,37 @@
 
 namespace {
 
+/// What a reader writes of one member.
+std::string OneMember() {
+  const auto number = [](std::size_t value, std::size_t bytes) {
+    std::string text;
+    for (std::size_t i = 0; i < bytes; ++i) {
+      text += static_cast<char>(value >> (8 * i) & 255);
+    }
+    return text;
+  };
+  const auto text = [&number](const std::string& value) { return "S" + number(value.size(), 4) + value; };
+  return "T" + text("Members") + number(2, 4) + text("ContactID") + text("FirstName") + "RI" + number(7, 8) +
+         text("Ada") + "E";
+}
+
 class ConversionWindow : public testing::TestWithParam<Language> {
  protected:
-  void SetUp() override {
-    if (!std::filesystem::exists(OldFile)) {
-      GTEST_SKIP() << "needs the files of an old installation in " TESSARINE_OLD_FILES;
-    }
-    std::filesystem::copy_file(OldFile, Path);
+  ConversionWindow() {
+    WriteFile(Path, std::string(4096, '\0'));
+    WriteFile(folder / "written", OneMember());
+    WriteFile(Reader, "#!/bin/sh\ncat '" + (folder / "written") + "'\n");
+    std::filesystem::permissions(Reader, std::filesystem::perms(0755));
   }
 
-  const std::string OldFile = TESSARINE_OLD_FILES "/members.mdb";
   TemporaryFolder folder;
   const std::string Path = folder / "members.mdb";
+  const std::string Reader = folder / "reader";
 };
 
 TEST_P(ConversionWindow, TellsFileAndRowsUntilItIsDone) {
   const StringTable strings(GetParam());
-  ConversionWithProgress conversion(strings, std::chrono::milliseconds(0));
+  ConversionWithProgress conversion(strings, std::chrono::milliseconds(0), Reader);
   QStringList seen;
   QTimer watch;
   QObject::connect(&watch, &QTimer::timeout, [&seen] {
@@ -42,7 +56,9 @@ TEST_P(ConversionWindow, TellsFileAndRowsUntilItIsDone) {
   watch.start(0);
   conversion.Convert(Path, "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb");
   ASSERT_FALSE(seen.isEmpty());
-  EXPECT_TRUE(seen.front().contains(QStringLiteral("members.mdb"))) << seen.front().toStdString();
+  EXPECT_EQ(seen.front(), GetParam() == Language::English
+                              ? QStringLiteral("Converting members.mdb of an old installation: 1 rows")
+                              : QStringLiteral("正在转换旧安装的数据库 members.mdb：1 行"));
   for (const QWidget* window : QApplication::topLevelWidgets()) {
     EXPECT_EQ(qobject_cast<const QProgressDialog*>(window), nullptr);
   }

@@ -6,6 +6,7 @@
 #include <stdexcept>
 
 #include "tests/app/Venue.h"
+#include "tests/platform/jet/OldFiles.h"
 #include "tests/platform/linux/Thrown.h"
 
 namespace {
@@ -158,9 +159,7 @@ TEST_F(Start, EndsWithoutAnotherWordWhenTheOperatorWantsNoFreshFile) {
 }
 
 TEST_F(Start, TakesTheFilesOfAnOldInstallationOver) {
-  if (!std::filesystem::exists(TESSARINE_OLD_FILES "/members.mdb")) {
-    GTEST_SKIP() << "needs the files of an old installation in " TESSARINE_OLD_FILES;
-  }
+  SKIP_WITHOUT_OLD_FILES();
   venue.PutDefaultFiles();
   for (const char* name : {"scenarios.mdb", "members.mdb"}) {
     WriteFile(venue.DataFile(name), ReadFile(std::string(TESSARINE_OLD_FILES "/") + name));

@@ -7,6 +7,7 @@
 #include <iterator>
 #include <random>
 
+#include "tests/platform/jet/OldFiles.h"
 #include "tests/platform/linux/TemporaryFolder.h"
 #include "tests/platform/linux/Thrown.h"
 #include "tests/platform/sqlite/TestDatabase.h"
@@ -26,11 +27,7 @@ constexpr OldFile OldFiles[] = {{"scenarios", "Table1"}, {"members", "Members"}}
 
 class Conversion : public testing::Test {
  protected:
-  void SetUp() override {
-    if (!std::filesystem::exists(TESSARINE_OLD_FILES "/members.mdb")) {
-      GTEST_SKIP() << "needs the files of an old installation in " TESSARINE_OLD_FILES;
-    }
-  }
+  void SetUp() override { SKIP_WITHOUT_OLD_FILES(); }
 
   /// A copy of an old file that may be written.
   std::string Copy(const char* name) const {
