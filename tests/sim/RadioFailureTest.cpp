@@ -18,32 +18,24 @@ GunCommand CommandUnder(const RadioFailureInfo& info) {
                                                      : info.Concerned.value_or(GunCommand::Search);
 }
 
-Bytes RequestTo(GunCommand command) {
-  switch (command) {
-    case GunCommand::Search:
-      return SearchRed2;
-    case GunCommand::Size:
-      return SizeRed2;
-    case GunCommand::Block:
-      return BlockRed2;
-    case GunCommand::Close:
-      break;
-  }
-  return CloseRed2;
-}
+struct Exchange {
+  Bytes Request;
+  Bytes Answer;
+};
 
-Bytes FaultlessAnswerTo(GunCommand command) {
+/// What goes over the line without a failure.
+Exchange Faultless(GunCommand command) {
   switch (command) {
     case GunCommand::Search:
-      return FoundRed2;
+      return {SearchRed2, FoundRed2};
     case GunCommand::Size:
-      return SizedRed2;
+      return {SizeRed2, SizedRed2};
     case GunCommand::Block:
-      return GotRed2;
+      return {BlockRed2, GotRed2};
     case GunCommand::Close:
       break;
   }
-  return ClosedRed2;
+  return {CloseRed2, ClosedRed2};
 }
 
 Bytes FirstHalf(const Bytes& frame) {
@@ -141,7 +133,7 @@ class FailureByRadio : public testing::TestWithParam<RadioFailureInfo> {
 TEST_P(FailureByRadio, ReachesTheHostAsItsNameSays) {
   RadioModem modem(FieldUnder({}));
   RawHost host(modem.DevicePath());
-  host.Write(RequestTo(CommandUnder(GetParam())));
+  host.Write(Faultless(CommandUnder(GetParam())).Request);
   const Bytes expected = StruckAnswer(GetParam().Failure);
   if (PullsOut()) {
     ExpectPulledOut(host, expected);
@@ -156,17 +148,17 @@ TEST_P(FailureByRadio, StrikesNoMoreAnswersThanTold) {
   RawHost host(modem.DevicePath());
   const GunCommand command = CommandUnder(GetParam());
   Bytes expected = StruckAnswer(GetParam().Failure);
-  host.Write(RequestTo(command));
+  host.Write(Faultless(command).Request);
   if (PullsOut()) {
     ExpectPulledOut(host, expected);
     return;
   }
   EXPECT_EQ(host.Read(expected.size()), expected);
-  host.Write(RequestTo(command));
+  host.Write(Faultless(command).Request);
   if (GetParam().Failure == RadioFailure::OtherSlot) {
     expected = FoundRed2 + FoundRed2;                              // the one kept back and its own
   } else if (GetParam().Failure != RadioFailure::TotalAbove270) {  // long scores do not shrink
-    expected = FaultlessAnswerTo(command);
+    expected = Faultless(command).Answer;
   }
   EXPECT_EQ(host.Read(expected.size()), expected);
   EXPECT_TRUE(host.IsSilent());
@@ -176,7 +168,7 @@ TEST_P(FailureByRadio, GoesOnWhenNoNumberIsTold) {
   RadioModem modem(FieldUnder({}));
   RawHost host(modem.DevicePath());
   Bytes expected = StruckAnswer(GetParam().Failure);
-  host.Write(RequestTo(CommandUnder(GetParam())));
+  host.Write(Faultless(CommandUnder(GetParam())).Request);
   if (PullsOut()) {
     ExpectPulledOut(host, expected);
     return;
@@ -186,7 +178,7 @@ TEST_P(FailureByRadio, GoesOnWhenNoNumberIsTold) {
     expected = FoundRed2;  // always the one kept back
   }
   for (int time = 2; time <= 3; ++time) {
-    host.Write(RequestTo(CommandUnder(GetParam())));
+    host.Write(Faultless(CommandUnder(GetParam())).Request);
     EXPECT_EQ(host.Read(expected.size()), expected);
   }
   EXPECT_TRUE(host.IsSilent());
@@ -197,8 +189,8 @@ TEST_P(FailureByRadio, SparesTheOtherGuns) {
   RawHost host(modem.DevicePath());
   for (const GunCommand command :
        {GunCommand::Search, GunCommand::Size, GunCommand::Block, GunCommand::Close}) {
-    host.Write(RequestTo(command));
-    EXPECT_EQ(host.Read(FaultlessAnswerTo(command).size()), FaultlessAnswerTo(command));
+    host.Write(Faultless(command).Request);
+    EXPECT_EQ(host.Read(Faultless(command).Answer.size()), Faultless(command).Answer);
   }
   EXPECT_TRUE(host.IsSilent());
 }
@@ -206,7 +198,7 @@ TEST_P(FailureByRadio, SparesTheOtherGuns) {
 TEST_P(FailureByRadio, StrikesEveryGunWhenNoneIsNamed) {
   RadioModem modem(FieldUnder({.Gun = 0}));
   RawHost host(modem.DevicePath());
-  host.Write(RequestTo(CommandUnder(GetParam())));
+  host.Write(Faultless(CommandUnder(GetParam())).Request);
   const Bytes expected = StruckAnswer(GetParam().Failure);
   if (PullsOut()) {
     ExpectPulledOut(host, expected);
