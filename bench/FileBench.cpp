@@ -4,7 +4,7 @@
 
 #include "bench/FullGame.h"
 #include "bench/Goals.h"
-#include "core/GameFile.h"
+#include "core/gamefile/GameFile.h"
 
 namespace {
 

@@ -4,11 +4,11 @@
 #include <memory>
 #include <string>
 
-#include "core/Game.h"
-#include "core/MemberLookup.h"
-#include "core/MissionList.h"
-#include "core/ScoreAnalysis.h"
-#include "core/ScoreList.h"
+#include "core/game/Game.h"
+#include "core/game/MemberLookup.h"
+#include "core/game/MissionList.h"
+#include "core/game/ScoreAnalysis.h"
+#include "core/game/ScoreList.h"
 #include "platform/sqlite/SqliteDatabase.h"
 
 /// The fullest game: all 224 players active, all 50,176 hits above 0.

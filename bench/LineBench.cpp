@@ -6,9 +6,9 @@
 #include "app/UploadProgress.h"
 #include "bench/Goals.h"
 #include "bench/RealLine.h"
-#include "core/BaseUnitDownload.h"
-#include "sim/BaseUnit.h"
-#include "sim/GameMaker.h"
+#include "devices/baseunit/BaseUnitDownload.h"
+#include "sim/baseunit/BaseUnit.h"
+#include "sim/game/GameMaker.h"
 
 namespace {
 

@@ -13,8 +13,8 @@
 
 #include "bench/FullGame.h"
 #include "bench/Goals.h"
-#include "core/CommitGame.h"
-#include "core/Photo.h"
+#include "core/data/Photo.h"
+#include "core/game/CommitGame.h"
 #include "members/MemberQueries.h"
 #include "members/Members.h"
 #include "platform/linux/LinuxFiles.h"

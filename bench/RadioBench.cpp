@@ -9,11 +9,11 @@
 #include "app/Composition.h"
 #include "bench/Goals.h"
 #include "bench/RealLine.h"
-#include "core/IniReader.h"
-#include "devices/FrameParser.h"
-#include "devices/RemoteManage.h"
-#include "sim/GameMaker.h"
-#include "sim/RadioModem.h"
+#include "core/data/IniReader.h"
+#include "devices/radio/FrameParser.h"
+#include "devices/radio/RemoteManage.h"
+#include "sim/game/GameMaker.h"
+#include "sim/radio/RadioModem.h"
 
 namespace {
 

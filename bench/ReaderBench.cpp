@@ -2,7 +2,7 @@
 #include <map>
 
 #include "bench/Goals.h"
-#include "devices/SerialOneWire.h"
+#include "devices/buttons/SerialOneWire.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/fakes/FakeSerialDevices.h"

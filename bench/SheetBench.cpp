@@ -15,7 +15,7 @@
 #include "bench/FullGame.h"
 #include "bench/Goals.h"
 #include "bench/PlainSheets.h"
-#include "core/Photo.h"
+#include "core/data/Photo.h"
 #include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/qt/QtClock.h"

@@ -12,7 +12,7 @@
 
 #include "bench/FullGame.h"
 #include "bench/Goals.h"
-#include "core/GameFile.h"
+#include "core/gamefile/GameFile.h"
 #include "platform/linux/LinuxFiles.h"
 
 namespace {

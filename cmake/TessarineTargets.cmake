@@ -1,6 +1,5 @@
-# Warnings, strictness and include root that all of our own code shares.
+# Warnings and strictness that all of our own code shares.
 add_library(tessarine_options INTERFACE)
-target_include_directories(tessarine_options INTERFACE ${CMAKE_SOURCE_DIR})
 target_compile_options(tessarine_options INTERFACE
   -Wall -Wextra -Wpedantic -Werror -Wshadow -Wconversion -Wno-sign-conversion -Wnon-virtual-dtor
   -Woverloaded-virtual -Wold-style-cast -Wcast-align -Wnull-dereference -Wformat=2
@@ -19,10 +18,15 @@ if(TESSARINE_SANITIZE)
   target_link_options(tessarine_options INTERFACE -fsanitize=address,undefined,fuzzer-no-link)
 endif()
 
-# tessarine_library(<name> <sources>...): one folder's library.
+# What the program is made of: the same, with src/ as include root.
+add_library(tessarine_source INTERFACE)
+target_link_libraries(tessarine_source INTERFACE tessarine_options)
+target_include_directories(tessarine_source INTERFACE ${CMAKE_SOURCE_DIR}/src)
+
+# tessarine_library(<name> <sources>...): one folder's library of the program.
 function(tessarine_library name)
   add_library(${name} STATIC ${ARGN})
-  target_link_libraries(${name} PUBLIC tessarine_options)
+  target_link_libraries(${name} PUBLIC tessarine_source)
 endfunction()
 
 # tessarine_test(<name> LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest knows one by one.
@@ -30,6 +34,7 @@ function(tessarine_test name)
   cmake_parse_arguments(ARG "" "" "LIBS;SOURCES" ${ARGN})
   add_executable(${name} ${ARG_SOURCES})
   target_link_libraries(${name} PRIVATE ${ARG_LIBS} tessarine_options GTest::gmock GTest::gtest_main)
+  target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/src)
   # A test's own code runs once: half the time to build it is worth more than its speed.
   target_compile_options(${name} PRIVATE -O0)
   target_precompile_headers(${name} PRIVATE <gmock/gmock.h> <gtest/gtest.h>)

@@ -4,8 +4,8 @@
 
 #include <QLabel>
 
-#include "tests/app/Venue.h"
-#include "tests/platform/qt/WhileModal.h"
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 namespace {
 

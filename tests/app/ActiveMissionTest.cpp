@@ -2,7 +2,7 @@
 
 #include <QLabel>
 
-#include "tests/app/Venue.h"
+#include "tests/support/Venue.h"
 
 namespace {
 

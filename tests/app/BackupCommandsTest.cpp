@@ -1,6 +1,6 @@
 #include <gmock/gmock.h>
 
-#include "tests/app/Venue.h"
+#include "tests/support/Venue.h"
 
 // Backup copies of both databases, as the program makes them.
 

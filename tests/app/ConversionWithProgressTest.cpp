@@ -7,8 +7,8 @@
 #include <QTimer>
 #include <filesystem>
 
-#include "tests/app/Controls.h"
-#include "tests/platform/linux/TemporaryFolder.h"
+#include "tests/support/Controls.h"
+#include "tests/support/TemporaryFolder.h"
 
 namespace {
 

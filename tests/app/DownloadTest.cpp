@@ -4,11 +4,11 @@
 #include <QLineEdit>
 #include <QProgressBar>
 
-#include "app/Settings.h"
 #include "app/UploadProgress.h"
-#include "tests/app/Venue.h"
-#include "tests/core/Frames.h"
-#include "tests/platform/qt/WhileModal.h"
+#include "settings/Settings.h"
+#include "tests/support/Frames.h"
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 namespace {
 

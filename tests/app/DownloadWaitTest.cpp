@@ -4,12 +4,12 @@
 #include <QTimer>
 
 #include "app/About.h"
-#include "app/Settings.h"
-#include "app/SoldieringCalc.h"
 #include "app/UploadProgress.h"
-#include "tests/app/Venue.h"
-#include "tests/core/Frames.h"
-#include "tests/platform/qt/WhileModal.h"
+#include "settings/Settings.h"
+#include "settings/SoldieringCalc.h"
+#include "tests/support/Frames.h"
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 // A download waits on the toolkit's own event loop, as in the program; what the operator does meanwhile are
 // events in it.

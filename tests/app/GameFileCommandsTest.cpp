@@ -2,7 +2,7 @@
 
 #include <QGuiApplication>
 
-#include "tests/app/Venue.h"
+#include "tests/support/Venue.h"
 
 namespace {
 

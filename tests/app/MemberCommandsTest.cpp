@@ -4,8 +4,8 @@
 #include <QLineEdit>
 
 #include "members/Members.h"
-#include "tests/app/Venue.h"
-#include "tests/platform/qt/WhileModal.h"
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 // The commands of the main window that are about members.
 

@@ -5,7 +5,7 @@
 #include <QMenuBar>
 #include <set>
 
-#include "tests/app/Venue.h"
+#include "tests/support/Venue.h"
 
 namespace {
 

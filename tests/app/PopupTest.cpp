@@ -4,10 +4,10 @@
 #include <QLineEdit>
 #include <QMenuBar>
 
-#include "app/BonusPoints.h"
-#include "app/PlayerDetails.h"
-#include "tests/app/Venue.h"
-#include "tests/platform/qt/WhileModal.h"
+#include "board/BonusPoints.h"
+#include "board/PlayerDetails.h"
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 // The context menu of the board.
 

@@ -3,8 +3,8 @@
 #include <QRadioButton>
 
 #include "sheets/PrintOptions.h"
-#include "tests/app/Venue.h"
-#include "tests/platform/qt/WhileModal.h"
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 namespace {
 

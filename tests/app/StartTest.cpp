@@ -5,9 +5,9 @@
 #include <algorithm>
 #include <stdexcept>
 
-#include "tests/app/Venue.h"
-#include "tests/platform/jet/OldFiles.h"
-#include "tests/platform/linux/Thrown.h"
+#include "tests/support/OldFiles.h"
+#include "tests/support/Thrown.h"
+#include "tests/support/Venue.h"
 
 namespace {
 

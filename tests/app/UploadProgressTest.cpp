@@ -5,7 +5,7 @@
 #include <QLabel>
 #include <QProgressBar>
 
-#include "tests/app/Controls.h"
+#include "tests/support/Controls.h"
 
 namespace {
 

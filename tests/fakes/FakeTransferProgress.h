@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-#include "core/BaseUnitDownload.h"
+#include "devices/baseunit/BaseUnitDownload.h"
 
 /// Records what a download shows, in order: "Open", "Status Requesting Data...", "Maximum 3", "Progress 1",
 /// "Animate", "Close".

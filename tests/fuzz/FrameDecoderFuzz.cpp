@@ -4,7 +4,7 @@
 #include <cstdlib>
 #include <string>
 
-#include "core/FrameDecoder.h"
+#include "core/game/FrameDecoder.h"
 #include "tests/fakes/FakeClock.h"
 
 namespace {

@@ -3,8 +3,8 @@
 #include <cstdint>
 #include <cstdlib>
 
-#include "devices/FrameParser.h"
-#include "devices/GunPacket.h"
+#include "devices/radio/FrameParser.h"
+#include "devices/radio/GunPacket.h"
 #include "platform/RuntimeError.h"
 
 namespace {

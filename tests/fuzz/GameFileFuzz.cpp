@@ -6,8 +6,8 @@
 #include <optional>
 #include <string>
 
-#include "core/GameFile.h"
-#include "core/TextEncoding.h"
+#include "core/gamefile/GameFile.h"
+#include "core/text/TextEncoding.h"
 #include "platform/RuntimeError.h"
 
 namespace {

@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-#include "core/IniReader.h"
-#include "core/TextEncoding.h"
+#include "core/data/IniReader.h"
+#include "core/text/TextEncoding.h"
 #include "tests/fakes/FakeFiles.h"
 
 namespace {

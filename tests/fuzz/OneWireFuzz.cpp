@@ -3,8 +3,8 @@
 #include <cstdint>
 #include <cstdlib>
 
-#include "core/Checksum.h"
-#include "devices/SerialOneWire.h"
+#include "core/line/Checksum.h"
+#include "devices/buttons/SerialOneWire.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/fakes/FakeSerialDevices.h"

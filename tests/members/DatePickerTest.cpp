@@ -7,7 +7,7 @@
 #include <QCalendarWidget>
 #include <QTest>
 
-#include "tests/app/Controls.h"
+#include "tests/support/Controls.h"
 
 namespace {
 

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "platform/sqlite/SqliteDatabase.h"
-#include "tests/platform/linux/TemporaryFolder.h"
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/TestDatabase.h"
 
 /// A members file as a new installation has it, with four members.
 class MemberFile {

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/members/MemberFile.h"
-#include "tests/platform/linux/Thrown.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

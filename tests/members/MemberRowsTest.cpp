@@ -2,12 +2,12 @@
 
 #include <gtest/gtest.h>
 
-#include "core/FieldValue.h"
+#include "core/data/FieldValue.h"
 #include "members/MemberQueries.h"
 #include "tests/members/MemberFile.h"
-#include "tests/platform/linux/FileSizeLimit.h"
-#include "tests/platform/linux/OrdinaryUser.h"
-#include "tests/platform/linux/Thrown.h"
+#include "tests/support/FileSizeLimit.h"
+#include "tests/support/OrdinaryUser.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

@@ -1,6 +1,6 @@
 #include "tests/members/MembersWindow.h"
 #include "tests/members/Pictures.h"
-#include "tests/platform/linux/OrdinaryUser.h"
+#include "tests/support/OrdinaryUser.h"
 
 namespace {
 

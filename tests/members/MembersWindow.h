@@ -5,11 +5,11 @@
 #include <QLabel>
 #include <QLineEdit>
 
-#include "core/Game.h"
+#include "core/game/Game.h"
 #include "members/Members.h"
 #include "members/PictureBox.h"
-#include "tests/app/Venue.h"
-#include "tests/platform/qt/WhileModal.h"
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 /// The window of the members, opened from the main window on Rhys Morgan (1), Alice "Mole" Belmont (2), Sean
 /// "Shamrock" O'Brien (5) and 王小明 (9).

@@ -10,8 +10,8 @@
 
 #include "missions/MissionNameEntry.h"
 #include "missions/Scenarios.h"
-#include "tests/app/Venue.h"
-#include "tests/platform/qt/WhileModal.h"
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 /// The mission editor, opened from the main window on missions "One", "Two" and "Three".
 class Editor : public testing::Test {

@@ -5,11 +5,11 @@
 #include <fstream>
 #include <iterator>
 
-#include "core/TextEncoding.h"
+#include "core/text/TextEncoding.h"
 #include "platform/sqlite/SqliteDatabase.h"
-#include "tests/platform/linux/TemporaryFolder.h"
-#include "tests/platform/linux/Thrown.h"
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/TestDatabase.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

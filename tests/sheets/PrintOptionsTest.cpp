@@ -9,9 +9,9 @@
 #include <QRadioButton>
 
 #include "sheets/SheetProgressWindow.h"
-#include "tests/app/CaredFor.h"
-#include "tests/app/Controls.h"
 #include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/support/CaredFor.h"
+#include "tests/support/Controls.h"
 
 namespace {
 

@@ -2,12 +2,12 @@
 
 #include <gmock/gmock.h>
 
-#include "tests/core/ScoredGame.h"
 #include "tests/fakes/FakeClock.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/fakes/FakeSheetProgress.h"
 #include "tests/fakes/FakeWordProcessor.h"
+#include "tests/support/ScoredGame.h"
 
 namespace {
 

@@ -2,7 +2,7 @@
 
 #include <gmock/gmock.h>
 
-#include "tests/core/ScoredGame.h"
+#include "tests/support/ScoredGame.h"
 
 namespace {
 

@@ -1,7 +1,7 @@
 #!/usr/bin/python3
-"""Makes resources/score_card_default.doc, the template of the score sheets.
+"""Makes src/resources/score_card_default.doc, the template of the score sheets.
 
-    tools/score_card/make_score_card.py resources/score_card_default.doc
+    tools/score_card/make_score_card.py src/resources/score_card_default.doc
 
 Needs LibreOffice Writer and its Python bridge (libreoffice-writer-nogui, python3-uno). The document is built from
 nothing, stored as "MS Word 97", opened again and checked; a file that breaks the contract with the sheet printing

@@ -7,10 +7,10 @@
 #include <iterator>
 #include <random>
 
-#include "tests/platform/jet/OldFiles.h"
-#include "tests/platform/linux/TemporaryFolder.h"
-#include "tests/platform/linux/Thrown.h"
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/OldFiles.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/TestDatabase.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

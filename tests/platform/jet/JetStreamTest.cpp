@@ -2,7 +2,7 @@
 
 #include <gmock/gmock.h>
 
-#include "tests/platform/linux/Thrown.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

@@ -2,8 +2,8 @@
 
 #include <gmock/gmock.h>
 
-#include "tests/platform/linux/Thrown.h"
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/TestDatabase.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

@@ -14,8 +14,8 @@
 #include "platform/RuntimeError.h"
 #include "tests/platform/libreoffice/OfficeProcesses.h"
 #include "tests/platform/libreoffice/OfficeStart.h"
-#include "tests/platform/linux/TemporaryFolder.h"
-#include "tests/platform/linux/Thrown.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

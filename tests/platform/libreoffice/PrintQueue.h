@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "tests/platform/libreoffice/OfficeStart.h"
-#include "tests/platform/linux/TemporaryFolder.h"
+#include "tests/support/TemporaryFolder.h"
 
 /// A CUPS server of the test's own with one printer, the default one, that keeps each job as a file.
 class PrintQueue {

@@ -3,7 +3,7 @@
 #include "platform/libreoffice/LibreOffice.h"
 #include "tests/platform/libreoffice/OfficeStart.h"
 #include "tests/platform/libreoffice/PrintQueue.h"
-#include "tests/platform/linux/Thrown.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

@@ -12,10 +12,10 @@
 #include "gmock/gmock.h"
 #include "gtest/gtest.h"
 #include "platform/linux/FileError.h"
-#include "tests/platform/linux/FileSizeLimit.h"
-#include "tests/platform/linux/OrdinaryUser.h"
-#include "tests/platform/linux/TemporaryFolder.h"
-#include "tests/platform/linux/Thrown.h"
+#include "tests/support/FileSizeLimit.h"
+#include "tests/support/OrdinaryUser.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

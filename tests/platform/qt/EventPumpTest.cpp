@@ -3,9 +3,9 @@
 #include <QTimer>
 #include <string>
 
-#include "FailureOf.h"
 #include "platform/qt/QtEventPump.h"
 #include "tests/fakes/FakeEventPump.h"
+#include "tests/support/FailureOf.h"
 
 using namespace std::chrono_literals;
 

@@ -11,7 +11,7 @@
 #include <string>
 #include <vector>
 
-#include "sim/PortLock.h"
+#include "sim/line/PortLock.h"
 
 /// A serial line whose far end is in the test's hand.
 class PseudoTerminal {

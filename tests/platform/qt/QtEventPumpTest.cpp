@@ -7,8 +7,8 @@
 #include <QTimer>
 #include <string>
 
-#include "FailureOf.h"
-#include "ProcessorTime.h"
+#include "tests/support/FailureOf.h"
+#include "tests/support/ProcessorTime.h"
 
 using namespace std::chrono_literals;
 

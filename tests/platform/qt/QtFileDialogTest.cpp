@@ -11,7 +11,7 @@
 #include <QTemporaryDir>
 #include <QTest>
 
-#include "WhileModal.h"
+#include "tests/support/WhileModal.h"
 
 namespace {
 

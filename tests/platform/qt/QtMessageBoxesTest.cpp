@@ -7,7 +7,7 @@
 #include <QPushButton>
 #include <QTest>
 
-#include "WhileModal.h"
+#include "tests/support/WhileModal.h"
 
 namespace {
 

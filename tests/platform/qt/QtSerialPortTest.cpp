@@ -12,10 +12,10 @@
 #include <chrono>
 #include <thread>
 
-#include "FailureOf.h"
-#include "ProcessorTime.h"
-#include "PseudoTerminal.h"
 #include "platform/qt/QtEventPump.h"
+#include "tests/platform/qt/PseudoTerminal.h"
+#include "tests/support/FailureOf.h"
+#include "tests/support/ProcessorTime.h"
 
 using namespace std::chrono_literals;
 

@@ -5,7 +5,7 @@
 #include <memory>
 #include <string>
 
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/TestDatabase.h"
 
 /// A cursor on the first of the members.
 class EditedMembers : public testing::Test {

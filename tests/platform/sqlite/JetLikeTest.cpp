@@ -3,7 +3,7 @@
 #include <string>
 
 #include "gtest/gtest.h"
-#include "tests/platform/linux/Thrown.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

@@ -3,8 +3,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "tests/platform/linux/Thrown.h"
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/TestDatabase.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

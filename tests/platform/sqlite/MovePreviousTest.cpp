@@ -1,7 +1,7 @@
 #include <gtest/gtest.h>
 
-#include "tests/platform/linux/Thrown.h"
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/TestDatabase.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

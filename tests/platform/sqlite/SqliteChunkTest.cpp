@@ -3,8 +3,8 @@
 #include <cstddef>
 #include <cstdint>
 
-#include "tests/platform/linux/Thrown.h"
 #include "tests/platform/sqlite/EditedMembers.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

@@ -7,9 +7,9 @@
 
 #include "gmock/gmock.h"
 #include "gtest/gtest.h"
-#include "tests/platform/linux/OrdinaryUser.h"
-#include "tests/platform/linux/Thrown.h"
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/OrdinaryUser.h"
+#include "tests/support/TestDatabase.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

@@ -4,8 +4,8 @@
 
 #include "gmock/gmock.h"
 #include "gtest/gtest.h"
-#include "tests/platform/linux/Thrown.h"
 #include "tests/platform/sqlite/EditedMembers.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

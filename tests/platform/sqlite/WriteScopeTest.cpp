@@ -2,9 +2,9 @@
 
 #include <optional>
 
-#include "tests/platform/linux/FileSizeLimit.h"
-#include "tests/platform/linux/Thrown.h"
-#include "tests/platform/sqlite/TestDatabase.h"
+#include "tests/support/FileSizeLimit.h"
+#include "tests/support/TestDatabase.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 

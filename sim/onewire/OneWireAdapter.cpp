@@ -1,0 +1,134 @@
+#include "sim/onewire/OneWireAdapter.h"
+
+#include <stdexcept>
+
+namespace sim {
+namespace {
+
+constexpr int powerUpBaud = 9600;
+constexpr std::uint8_t identityFamily = 0x81;
+constexpr std::uint64_t identitySerial = 0x0000001E5A37;
+
+OneWireAdapterSettings Checked(OneWireAdapterSettings settings) {
+  for (const OneWireFailureInfo& info : OneWireFailures) {
+    const bool isBit = info.Place == OneWireFailurePlace::Bit;
+    if (info.Failure == settings.Failure && info.Place != OneWireFailurePlace::None &&
+        (settings.FailurePlace == 0 || (isBit && settings.FailurePlace > 64))) {
+      throw std::invalid_argument("There is no " + std::string(isBit ? "bit " : "byte ") +
+                                  std::to_string(settings.FailurePlace));
+    }
+  }
+  return settings;
+}
+
+OneWireBusSettings BusOf(const OneWireAdapterSettings& settings) {
+  OneWireBusSettings bus;
+  if (settings.Failure != OneWireFailure::NoOwnDevice) {
+    bus.OwnDevice = MakeRomId(identityFamily, identitySerial);
+  }
+  bus.Shorted = settings.Failure == OneWireFailure::ShortCircuit;
+  if (settings.Failure == OneWireFailure::ContactLost) {
+    bus.ContactLostAfterBits = settings.FailurePlace;
+  }
+  return bus;
+}
+
+// A button of the same family whose serial number differs in one bit, as in a box of new ones.
+RomId CompanionOf(const RomId& rom) {
+  std::uint64_t serial = 0;
+  for (std::size_t i = 6; i > 0; --i) {
+    serial = serial << 8U | rom[i];
+  }
+  return MakeRomId(rom[0], serial ^ 1U);
+}
+
+}  // namespace
+
+OneWireAdapter::OneWireAdapter(OneWireAdapterSettings settings)
+    : settings_(Checked(settings)),
+      terminal_(powerUpBaud, settings_.LinePace),
+      log_(settings_.Log, "1-wire"),
+      bus_(BusOf(settings_)),
+      chip_(bus_),
+      thread_([this] { Run(); }) {}
+
+OneWireAdapter::~OneWireAdapter() {
+  terminal_.Interrupt();
+  thread_.join();
+}
+
+void OneWireAdapter::Touch(const RomId& rom) {
+  const std::scoped_lock lock(busMutex_);
+  for (const RomId& device : OnTheBus(rom)) {
+    bus_.Touch(device);
+  }
+}
+
+bool OneWireAdapter::Leave(const RomId& rom) {
+  const std::scoped_lock lock(busMutex_);
+  bool left = false;
+  for (const RomId& device : OnTheBus(rom)) {
+    left = bus_.Leave(device) || left;
+  }
+  return left;
+}
+
+void OneWireAdapter::LeaveAll() {
+  const std::scoped_lock lock(busMutex_);
+  bus_.LeaveAll();
+}
+
+void OneWireAdapter::Run() {
+  while (const std::optional<std::uint8_t> byte = terminal_.ReadByte()) {
+    log_.FromHost(*byte);
+    const std::optional<std::uint8_t> answer = AnswerTo(*byte);
+    terminal_.SetBaud(chip_.Baud());
+    if (answer && !Send(*answer)) {
+      break;
+    }
+  }
+}
+
+std::optional<std::uint8_t> OneWireAdapter::AnswerTo(std::uint8_t byte) {
+  const bool configures = chip_.ExpectsCommand() && byte < 0x80;
+  const std::scoped_lock lock(busMutex_);
+  const std::optional<std::uint8_t> answer = chip_.Receive(byte);
+  return configures && Fails(OneWireFailure::NoDetection) ? std::nullopt : answer;
+}
+
+// False when the line is gone.
+bool OneWireAdapter::Send(std::uint8_t answer) {
+  constexpr std::uint8_t noise = 0xF8;
+  ++answers_;
+  if (Fails(OneWireFailure::Silence) && answers_ >= settings_.FailurePlace) {
+    return true;
+  }
+  if (Fails(OneWireFailure::HangUp) && answers_ == settings_.FailurePlace) {
+    log_.Note("adapter pulled out");
+    terminal_.HangUp();
+    return false;
+  }
+  std::vector<std::uint8_t> bytes{answer};
+  if (Fails(OneWireFailure::NoiseByte) && answers_ == settings_.FailurePlace) {
+    bytes.insert(bytes.begin(), noise);
+  }
+  const std::size_t sent =
+      Fails(OneWireFailure::TornWrites) ? terminal_.WriteTorn(bytes) : terminal_.Write(bytes);
+  log_.ToHost(bytes);
+  return sent == bytes.size();
+}
+
+// What hangs on the bus while the button `rom` is held to the reader.
+std::vector<RomId> OneWireAdapter::OnTheBus(const RomId& rom) const {
+  if (Fails(OneWireFailure::WrongCrc)) {
+    RomId wrong = rom;
+    wrong[7] ^= 0x80U;
+    return {wrong};
+  }
+  if (Fails(OneWireFailure::TwoButtons)) {
+    return {rom, CompanionOf(rom)};
+  }
+  return {rom};
+}
+
+}  // namespace sim

@@ -1,0 +1,69 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <mutex>
+#include <optional>
+#include <ostream>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "sim/line/PseudoTerminal.h"
+#include "sim/line/WireLog.h"
+#include "sim/onewire/Ds2480b.h"
+#include "sim/onewire/OneWireBus.h"
+#include "sim/onewire/OneWireFailure.h"
+
+namespace sim {
+
+struct OneWireAdapterSettings {
+  OneWireFailure Failure = OneWireFailure::None;
+  std::size_t FailurePlace = 1;  ///< byte (from 1) or bit (1 to 64) that the failure concerns
+  Pace LinePace = Pace::AsWired;
+  std::ostream* Log = nullptr;  ///< gets both directions of the line
+};
+
+/// The reader of membership buttons at the operator's desk: a DS2480B on a serial line that begins at 9600
+/// baud, with an identity device of its own on the bus. It is powered up once, at its construction: a host
+/// that goes and comes back finds the chip as it left it. It serves until its line has been pulled out or its
+/// destruction. On the line it takes and gives bytes in turn, so a block takes up to twice as long as on a
+/// real line.
+class OneWireAdapter {
+ public:
+  /// Throws std::invalid_argument when the failure has no such place, std::system_error when the system
+  /// grants no pseudo terminal. The log must outlive the adapter.
+  explicit OneWireAdapter(OneWireAdapterSettings settings);
+  ~OneWireAdapter();
+  OneWireAdapter(const OneWireAdapter&) = delete;
+  OneWireAdapter& operator=(const OneWireAdapter&) = delete;
+
+  /// The device that the host opens.
+  const std::string& DevicePath() const { return terminal_.SlavePath(); }
+
+  /// Holds a button to the reader until it leaves. One that is there already stays.
+  void Touch(const RomId& rom);
+  /// False when no such button is at the reader.
+  bool Leave(const RomId& rom);
+  void LeaveAll();
+
+ private:
+  void Run();
+  std::optional<std::uint8_t> AnswerTo(std::uint8_t byte);
+  bool Send(std::uint8_t answer);
+  bool Fails(OneWireFailure failure) const { return settings_.Failure == failure; }
+  std::vector<RomId> OnTheBus(const RomId& rom) const;
+
+  OneWireAdapterSettings settings_;
+  PseudoTerminal terminal_;
+  WireLog log_;
+  std::size_t answers_ = 0;
+
+  std::mutex busMutex_;
+  OneWireBus bus_;
+  Ds2480b chip_;
+
+  std::thread thread_;
+};
+
+}  // namespace sim

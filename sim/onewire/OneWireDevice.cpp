@@ -1,0 +1,98 @@
+#include "sim/onewire/OneWireDevice.h"
+
+namespace sim {
+namespace {
+
+constexpr std::size_t romBits = 64;
+constexpr std::uint8_t readRom = 0x33;
+constexpr std::uint8_t matchRom = 0x55;
+constexpr std::uint8_t skipRom = 0xCC;
+constexpr std::uint8_t searchRom = 0xF0;
+
+}  // namespace
+
+void OneWireDevice::Reset() {
+  state_ = State::Command;
+  bit_ = 0;
+  command_ = 0;
+  romBitsGiven_ = 0;
+}
+
+bool OneWireDevice::Releases() const {
+  switch (state_) {
+    case State::SearchBit:
+    case State::Read:
+      return RomBit();
+    case State::SearchComplement:
+      return !RomBit();
+    case State::Deaf:
+    case State::Command:
+    case State::SearchSelect:
+    case State::Match:
+    case State::Selected:
+      break;
+  }
+  return true;
+}
+
+void OneWireDevice::Slot(bool level) {
+  switch (state_) {
+    case State::Deaf:
+    case State::Selected:
+      break;
+    case State::Command:
+      command_ |= (level ? 1U : 0U) << bit_;
+      if (++bit_ == 8) {
+        Obey(static_cast<std::uint8_t>(command_));
+      }
+      break;
+    case State::SearchBit:
+      ++romBitsGiven_;
+      state_ = State::SearchComplement;
+      break;
+    case State::SearchComplement:
+      state_ = State::SearchSelect;
+      break;
+    case State::SearchSelect:
+      level == RomBit() ? NextBit(State::SearchBit) : LoseContact();
+      break;
+    case State::Match:
+      level == RomBit() ? NextBit(State::Match) : LoseContact();
+      break;
+    case State::Read:
+      ++romBitsGiven_;
+      NextBit(State::Read);
+      break;
+  }
+}
+
+bool OneWireDevice::RomBit() const {
+  return (rom_[bit_ / 8] >> (bit_ % 8) & 1U) != 0;
+}
+
+void OneWireDevice::Obey(std::uint8_t command) {
+  bit_ = 0;
+  switch (command) {
+    case readRom:
+      state_ = State::Read;
+      break;
+    case matchRom:
+      state_ = State::Match;
+      break;
+    case skipRom:
+      state_ = State::Selected;
+      break;
+    case searchRom:
+      state_ = State::SearchBit;
+      break;
+    default:
+      state_ = State::Deaf;
+      break;
+  }
+}
+
+void OneWireDevice::NextBit(State next) {
+  state_ = ++bit_ == romBits ? State::Selected : next;
+}
+
+}  // namespace sim

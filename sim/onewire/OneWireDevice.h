@@ -1,0 +1,49 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+
+#include "sim/onewire/RomId.h"
+
+namespace sim {
+
+/// A device on a 1-Wire bus, time slot by time slot: the commands that read, find and select ROM numbers.
+/// What a selected device is asked beyond that, it leaves unanswered, and so it does any other command.
+class OneWireDevice {
+ public:
+  /// Deaf until the first reset pulse.
+  explicit OneWireDevice(const RomId& rom) : rom_(rom) {}
+
+  const RomId& Rom() const { return rom_; }
+
+  /// A reset pulse has passed: the next eight slots carry a ROM command.
+  void Reset();
+  /// Loses the contact; back at the next reset pulse.
+  void LoseContact() { state_ = State::Deaf; }
+
+  /// Whether the device leaves the line high in the coming slot.
+  bool Releases() const;
+  /// The slot has passed with `level` on the line.
+  void Slot(bool level);
+
+  /// Whether the device, as the one that was meant, takes what follows for a command to itself.
+  bool IsSelected() const { return state_ == State::Selected; }
+
+  /// Bits of its ROM number that the device has put on the line since the reset pulse, 0 to 64.
+  std::size_t RomBitsGiven() const { return romBitsGiven_; }
+
+ private:
+  enum class State { Deaf, Command, SearchBit, SearchComplement, SearchSelect, Match, Read, Selected };
+
+  bool RomBit() const;
+  void Obey(std::uint8_t command);
+  void NextBit(State next);
+
+  RomId rom_;
+  State state_ = State::Deaf;
+  std::size_t bit_ = 0;
+  unsigned command_ = 0;
+  std::size_t romBitsGiven_ = 0;
+};
+
+}  // namespace sim

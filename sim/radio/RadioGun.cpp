@@ -1,0 +1,41 @@
+#include "sim/radio/RadioGun.h"
+
+#include <algorithm>
+#include <array>
+
+#include "sim/game/ScoreFrame.h"
+
+namespace sim {
+namespace {
+
+// Every code that has a name, so that a field of 27 guns shows each once.
+constexpr std::array<std::uint8_t, 27> weapons{0,  1,  2,  3,  4,   5,   6,   7,   8,   9,   10,  11,  12, 13,
+                                               14, 15, 16, 17, 100, 101, 102, 103, 104, 105, 106, 107, 108};
+// The maker's part of a radio's address; the 0x7E in the serial number is data, whatever it looks like.
+constexpr std::uint64_t addressBase = 0x0013A200'407E0000;
+
+}  // namespace
+
+std::vector<RadioGun> MakeRadioGuns(const std::vector<GunScores>& game,
+                                    std::chrono::microseconds answerTime) {
+  std::vector<RadioGun> guns;
+  guns.reserve(game.size());
+  for (const GunScores& scores : game) {
+    const unsigned id = scores.PlayerId;
+    RadioGun gun;
+    gun.PlayerId = scores.PlayerId;
+    gun.Address = addressBase + std::uint64_t{id} * 151U % 256U * 256U + id;
+    gun.FirmwareMajor = id % 16 == 0 ? 1 : 2;
+    gun.FirmwareMinor = static_cast<std::uint8_t>(id % 3 + 9);
+    gun.Battery = static_cast<std::uint8_t>(100 - id * 37U % 91U);
+    gun.Weapon = weapons.at(id % weapons.size());
+    gun.Frame = EncodeScoreFrame(scores);
+    gun.AnswerTime = answerTime;
+    guns.push_back(gun);
+  }
+  std::sort(guns.begin(), guns.end(),
+            [](const RadioGun& left, const RadioGun& right) { return left.PlayerId < right.PlayerId; });
+  return guns;
+}
+
+}  // namespace sim

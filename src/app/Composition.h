@@ -1,0 +1,58 @@
+#pragma once
+
+#include <QTranslator>
+
+#include "app/ConversionWithProgress.h"
+#include "app/Services.h"
+#include "core/text/StringTable.h"
+#include "devices/buttons/SerialOneWire.h"
+#include "platform/libreoffice/LibreOffice.h"
+#include "platform/linux/LinuxFiles.h"
+#include "platform/qt/QtClock.h"
+#include "platform/qt/QtEventPump.h"
+#include "platform/qt/QtFileDialog.h"
+#include "platform/qt/QtFolders.h"
+#include "platform/qt/QtMessageBoxes.h"
+#include "platform/qt/QtSerialDevices.h"
+#include "platform/qt/QtSerialPort.h"
+#include "platform/sqlite/SqliteDatabase.h"
+
+/// The real parts of the platform, put together for one run of the program. Needs a QApplication.
+class Composition {
+ public:
+  Composition();
+
+  ::Services Services();
+
+  /// Boxes and dialogs belong to `window` while no other window is active.
+  void SetMainWindow(QWidget* window);
+
+  MessageBoxes& Boxes() { return boxes_; }
+
+ private:
+  std::string SwipeButton();
+
+  StringTable strings_;
+  QTranslator dialogTexts_;  ///< the toolkit's own texts ("OK", "File name:") in the program's language
+  QtClock clock_;
+  SqliteEngine databases_;
+  ConversionWithProgress old_{strings_};
+  QtEventPump events_;
+  QtFileDialog fileDialog_;
+  LinuxFiles files_;
+  QtFolders folders_;
+  QtMessageBoxes boxes_;
+  QtSerialDevices devices_;
+  QtSerialPort port_;
+  QtSerialPort readerPort_;
+  IniReader readerSettings_;
+  SerialOneWire wire_{readerPort_, events_, readerSettings_, devices_};
+  LibreOffice wordProcessor_;
+  QWidget* mainWindow_ = nullptr;
+};
+
+/// Name, icon and look of the application; call once before the first window.
+void PrepareApplication();
+
+/// Shows the main window and runs the program until it is closed. Returns the process's exit code.
+int RunProgram();

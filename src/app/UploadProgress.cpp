@@ -1,0 +1,52 @@
+#include "app/UploadProgress.h"
+
+#include "ui/Text.h"
+#include "ui_UploadProgress.h"
+
+UploadProgress::UploadProgress(const StringTable& strings, QWidget* parent)
+    : QDialog(parent), ui_(std::make_unique<Ui::UploadProgress>()) {
+  ui_->setupUi(this);
+  setWindowTitle(Text(strings, 172));
+}
+
+UploadProgress::~UploadProgress() = default;
+
+void UploadProgress::Open() {
+  closedByOperator_ = false;
+  ui_->Progress->setMaximum(PlayerCount);
+  ui_->Progress->setValue(0);
+  ui_->UploadIndex->clear();
+  StopTransferAnim();
+  show();
+}
+
+void UploadProgress::Close() {
+  StopTransferAnim();
+  hide();
+}
+
+void UploadProgress::SetStatusText(const std::string& text) {
+  ui_->StatusText->setText(QString::fromStdString(text));
+}
+
+void UploadProgress::SetMaximum(int maximum) {
+  ui_->Progress->setMaximum(maximum);
+}
+
+void UploadProgress::SetProgress(int value) {
+  ui_->Progress->setValue(value);
+  ui_->UploadIndex->setText(QString::number(value));
+}
+
+void UploadProgress::StartTransferAnim() {
+  ui_->Animation1->Start();
+}
+
+void UploadProgress::StopTransferAnim() {
+  ui_->Animation1->Stop();
+}
+
+void UploadProgress::reject() {
+  closedByOperator_ = true;
+  Close();
+}

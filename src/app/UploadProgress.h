@@ -1,0 +1,34 @@
+#pragma once
+
+#include <QDialog>
+#include <memory>
+
+#include "devices/baseunit/BaseUnitDownload.h"
+
+namespace Ui {
+class UploadProgress;
+}
+
+/// The small window shown during a download. Closing it ends the download.
+class UploadProgress : public QDialog, public TransferProgress {
+  Q_OBJECT
+
+ public:
+  UploadProgress(const StringTable& strings, QWidget* parent);
+  ~UploadProgress() override;
+
+  void Open() override;
+  void Close() override;
+  bool ClosedByOperator() const override { return closedByOperator_; }
+  void SetStatusText(const std::string& text) override;
+  void SetMaximum(int maximum) override;
+  void SetProgress(int value) override;
+  void StartTransferAnim() override;
+  void StopTransferAnim();
+
+  void reject() override;
+
+ private:
+  std::unique_ptr<Ui::UploadProgress> ui_;
+  bool closedByOperator_ = false;
+};

@@ -1,0 +1,74 @@
+#include "board/AdminData.h"
+
+#include <QAction>
+#include <QClipboard>
+#include <QGuiApplication>
+#include <QHeaderView>
+#include <QKeyEvent>
+
+#include "core/game/HitLines.h"
+#include "ui/Text.h"
+#include "ui_AdminData.h"
+
+AdminData::AdminData(const Game& game, const StringTable& strings, QWidget* parent)
+    : QDialog(parent), ui_(std::make_unique<Ui::AdminData>()) {
+  ui_->setupUi(this);
+  ui_->PlayerList->setObjectName(QStringLiteral("AdminData"));  // which the form cannot call it: its own name
+  setWindowTitle(Text(strings, 136));
+  ui_->Command1->setText(Text(strings, 137));
+  ui_->PlayerList->setHorizontalHeaderLabels({Text(strings, 104), Text(strings, 134), Text(strings, 135)});
+  ui_->PlayerList->setAccessibleName(windowTitle());
+  ui_->PlayerList->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
+  ui_->PlayerList->verticalHeader()->hide();
+  ui_->PlayerList->addAction(ui_->Copy);
+  ui_->PlayerList->installEventFilter(this);
+  connect(ui_->Copy, &QAction::triggered, this, &AdminData::Copy);
+  connect(ui_->CopyButton, &QPushButton::clicked, ui_->Copy, &QAction::trigger);
+  ShowPlayers(game);
+}
+
+AdminData::~AdminData() = default;
+
+void AdminData::ShowPlayers(const Game& game) {
+  ui_->PlayerList->setRowCount(PlayerCount);
+  for (int index = 1; index <= PlayerCount; ++index) {
+    const Player& player = game.Players(index);
+    const std::string cells[] = {game.DisplayName(index), RunTimeText(player.RunCounter),
+                                 std::to_string(player.AdminKillCount)};
+    for (int column = 0; column < 3; ++column) {
+      auto* item = new QTableWidgetItem(QString::fromStdString(cells[column]));
+      item->setTextAlignment(Qt::AlignVCenter | (column == 0 ? Qt::AlignLeft : Qt::AlignRight));
+      ui_->PlayerList->setItem(index - 1, column, item);
+    }
+  }
+}
+
+// A list answers to the key itself, with the text of one cell.
+bool AdminData::eventFilter(QObject* watched, QEvent* event) {
+  if (event->type() == QEvent::KeyPress && static_cast<QKeyEvent*>(event)->matches(QKeySequence::Copy)) {
+    Copy();
+    return true;
+  }
+  return QDialog::eventFilter(watched, event);
+}
+
+void AdminData::Copy() const {
+  const QTableWidget& list = *ui_->PlayerList;
+  QStringList lines;
+  QStringList headers;
+  for (int column = 0; column < list.columnCount(); ++column) {
+    headers.append(list.horizontalHeaderItem(column)->text());
+  }
+  lines.append(headers.join(QLatin1Char('\t')));
+  const bool all = !list.selectionModel()->hasSelection();
+  for (int row = 0; row < list.rowCount(); ++row) {
+    if (all || list.item(row, 0)->isSelected()) {
+      QStringList cells;
+      for (int column = 0; column < list.columnCount(); ++column) {
+        cells.append(list.item(row, column)->text());
+      }
+      lines.append(cells.join(QLatin1Char('\t')));
+    }
+  }
+  QGuiApplication::clipboard()->setText(lines.join(QLatin1Char('\n')) + QLatin1Char('\n'));
+}

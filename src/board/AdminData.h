@@ -1,0 +1,30 @@
+#pragma once
+
+#include <QDialog>
+#include <memory>
+
+#include "core/game/Game.h"
+#include "core/text/StringTable.h"
+
+namespace Ui {
+class AdminData;
+}
+
+/// Run time and admin kills of all guns.
+class AdminData : public QDialog {
+  Q_OBJECT
+
+ public:
+  AdminData(const Game& game, const StringTable& strings, QWidget* parent);
+  ~AdminData() override;
+
+ protected:
+  bool eventFilter(QObject* watched, QEvent* event) override;
+
+ private:
+  void ShowPlayers(const Game& game);
+  /// Puts the selected rows, or all when none is, on the clipboard as text with tabs, the headers first.
+  void Copy() const;
+
+  std::unique_ptr<Ui::AdminData> ui_;
+};

@@ -1,0 +1,91 @@
+#include "board/MissionResultEntry.h"
+
+#include <QEvent>
+#include <string>
+
+#include "core/data/FieldValue.h"
+#include "core/data/IniReader.h"
+#include "ui/Text.h"
+#include "ui_MissionResultEntry.h"
+
+MissionResultEntry::MissionResultEntry(Game& game, MissionList& missions, const StringTable& strings,
+                                       QWidget* parent)
+    : QDialog(parent), ui_(std::make_unique<Ui::MissionResultEntry>()), game_(game) {
+  ui_->setupUi(this);
+  sets_ = {{{ui_->TeamA, ui_->PrimaryCompleted1, ui_->SecondaryCompleted1},
+            {ui_->TeamB, ui_->PrimaryCompleted2, ui_->SecondaryCompleted2},
+            {ui_->TeamC, ui_->PrimaryCompleted3, ui_->SecondaryCompleted3}}};
+  SetCaptions(strings);
+  ShowResults();
+  ShowObjectives(missions);
+  connect(ui_->OK, &QPushButton::clicked, this, [this] {
+    StoreResults();
+    accept();
+  });
+}
+
+MissionResultEntry::~MissionResultEntry() = default;
+
+void MissionResultEntry::SetCaptions(const StringTable& strings) {
+  setWindowTitle(Text(strings, 142));
+  ui_->Frame1->setTitle(Text(strings, 143));
+  ui_->Frame2->setTitle(Text(strings, 144));
+  ui_->Frame3->setTitle(Text(strings, 145));
+  for (QLabel* label : {ui_->Label2, ui_->Label3, ui_->Label4}) {
+    label->setText(Text(strings, 113));
+  }
+  for (const SetControls& set : sets_) {
+    set.PrimaryCompleted->setText(Text(strings, 146));
+    set.SecondaryCompleted->setText(Text(strings, 147));
+    for (QCheckBox* box : {set.PrimaryCompleted, set.SecondaryCompleted}) {
+      box->installEventFilter(this);
+    }
+  }
+  ui_->Label1->setText(Text(strings, 148));
+  ui_->OK->setText(Text(strings, 140));
+}
+
+void MissionResultEntry::ShowResults() {
+  for (int k = 1; k <= TeamCount; ++k) {
+    const SetControls& set = sets_[static_cast<std::size_t>(k - 1)];
+    const ObjectiveTeam& objective = game_.ObjectiveTeams(k);
+    set.PrimaryCompleted->setChecked(objective.PrimaryAchieved);
+    set.SecondaryCompleted->setChecked(objective.SecondaryAchieved);
+    for (const std::string& name : game_.TeamNames) {
+      set.Team->addItem(QString::fromStdString(name));
+    }
+    set.Team->setCurrentIndex(set.Team->findText(QString::fromStdString(objective.Name)));
+  }
+}
+
+void MissionResultEntry::ShowObjectives(MissionList& missions) {
+  if (!missions.ActivateCurrentMissionRecord()) {
+    return;
+  }
+  for (int k = 0; k < TeamCount; ++k) {
+    const char letter = static_cast<char>('A' + k);
+    const auto objective = [&](const char* column) {
+      return QString::fromStdString(
+          FirstLineOf(TextOf(missions.Row().Fields(column + std::string(1, letter)))));
+    };
+    sets_[static_cast<std::size_t>(k)].PrimaryCompleted->setToolTip(objective("PrimaryObjectiveDescription"));
+    sets_[static_cast<std::size_t>(k)].SecondaryCompleted->setToolTip(
+        objective("SecondaryObjectiveDescription"));
+  }
+}
+
+// A touch screen knows no hovering, and a screen reader no tool tips.
+bool MissionResultEntry::eventFilter(QObject* watched, QEvent* event) {
+  if (event->type() == QEvent::FocusIn || event->type() == QEvent::Enter) {
+    ui_->ObjectiveText->setText(qobject_cast<QWidget*>(watched)->toolTip());
+  }
+  return QDialog::eventFilter(watched, event);
+}
+
+void MissionResultEntry::StoreResults() {
+  for (int k = 1; k <= TeamCount; ++k) {
+    const SetControls& set = sets_[static_cast<std::size_t>(k - 1)];
+    game_.ObjectiveTeams(k) = {set.Team->currentText().toStdString(), set.PrimaryCompleted->isChecked(),
+                               set.SecondaryCompleted->isChecked()};
+  }
+}

@@ -1,0 +1,154 @@
+#include "core/game/CommitGame.h"
+
+#include <algorithm>
+#include <vector>
+
+#include "core/data/FieldValue.h"
+#include "core/text/NumberForms.h"
+#include "platform/RuntimeError.h"
+
+namespace {
+
+bool IsDue(const Player& player) {
+  return player.MemberIndex != 0 && !player.Committed && player.Active;
+}
+
+double Quotient(double sum, double count) {
+  if (count == 0) {
+    throw RuntimeError(11);
+  }
+  return sum / count;
+}
+
+/// Sets the figures of the current row, which is in edit mode, as they are with this player's game. Each one
+/// takes in those before it.
+void AddFigures(Recordset& row, const Player& player, const Clock& clock) {
+  const auto number = [&row](const char* column) { return NumberOf(row.Fields(column)); };
+  const auto count = [&row](const char* column) {
+    row.SetField(column, std::int64_t{RoundToInt32(NumberOf(row.Fields(column)) + 1)});
+  };
+  count("TotalGamesPlayed");
+  const double games = number("TotalGamesPlayed");
+  row.SetField("LastPlayedDate", clock.Now());
+  row.SetField("TotalDamage", number("TotalDamage") + player.TotalDamage);
+  row.SetField("AverageDamage", Round2(Quotient(number("TotalDamage"), games)));
+  row.SetField("TotalSoldiering", number("TotalSoldiering") + player.Soldiering);
+  row.SetField("AverageSoldiering", Round2(Quotient(number("TotalSoldiering"), games)));
+  if (player.Accuracy == 0) {
+    count("PriZeroAccuracyCount");
+  }
+  row.SetField("TotalPrimaryAccuracy", number("TotalPrimaryAccuracy") + double{player.Accuracy});
+  const double accurateGames = games - number("PriZeroAccuracyCount");
+  if (accurateGames != 0) {
+    row.SetField("AveragePrimAccuracy", number("TotalPrimaryAccuracy") / accurateGames);
+  }
+  row.SetField("AverageSecAccuracy", 0.0);
+}
+
+class GameCommit {
+ public:
+  GameCommit(Game& game, Database& dbMembers, Recordset& rsMembers, MemberLookup& members, const Clock& clock)
+      : game_(game), dbMembers_(dbMembers), rsMembers_(rsMembers), members_(members), clock_(clock) {}
+
+  /// Commits all players. Throws RuntimeError at the one that fails.
+  void Run() {
+    for (int index = 1; index <= PlayerCount; ++index) {
+      if (!CommitTogether(index)) {
+        // Nothing of the group was written. One by one, those before the faulty row get in.
+        for (; index <= PlayerCount; ++index) {
+          CommitOne(index);
+        }
+      } else if (index <= PlayerCount) {
+        CommitOne(index);  // tells that the member is gone
+      }
+    }
+  }
+
+ private:
+  /// Commits the players from `index` up to the first whose member is gone, which `index` then stands for. A
+  /// box about that must not hold up the disk, and so ends the group. Returns false when the database failed;
+  /// then nothing is written or marked, and `index` stands for the first of them.
+  bool CommitTogether(int& index) {
+    while (index <= PlayerCount && !IsDue(game_.Players(index))) {
+      ++index;
+    }
+    if (index > PlayerCount) {
+      return true;
+    }
+    std::vector<int> marked;
+    try {
+      WriteScope group(dbMembers_);
+      int next = index;
+      for (; next <= PlayerCount; ++next) {
+        const Player& player = game_.Players(next);
+        if (!IsDue(player)) {
+          continue;
+        }
+        if (!rsMembers_.WalkTo("ContactID", std::int64_t{player.MemberIndex})) {
+          break;
+        }
+        marked.push_back(next);
+        AddGame(next);
+      }
+      group.Commit();
+      index = next;
+      return true;
+    } catch (const RuntimeError&) {
+      for (const int member : marked) {
+        game_.Players(member).Committed = false;
+      }
+      return false;
+    }
+  }
+
+  void CommitOne(int index) {
+    const Player& player = game_.Players(index);
+    if (IsDue(player) && members_.LoadMember(player.MemberIndex)) {
+      AddGame(index);
+    }
+  }
+
+  void AddGame(int index) {
+    rsMembers_.Edit();
+    game_.Players(index).Committed = true;
+    AddFigures(rsMembers_, game_.Players(index), clock_);
+    rsMembers_.Update();
+  }
+
+  Game& game_;
+  Database& dbMembers_;
+  Recordset& rsMembers_;
+  MemberLookup& members_;
+  const Clock& clock_;
+};
+
+}  // namespace
+
+CommitResult CommitPlayers(Game& game, Database& dbMembers, Recordset& rsMembers, MemberLookup& members,
+                           const Clock& clock) {
+  const bool alreadyCommitted = std::any_of(game.Players.begin(), game.Players.end(),
+                                            [](const Player& player) { return player.Committed; });
+  try {
+    GameCommit(game, dbMembers, rsMembers, members, clock).Run();
+  } catch (const RuntimeError&) {
+    return CommitResult::Failed;
+  }
+  return alreadyCommitted ? CommitResult::SomeWereAlready : CommitResult::Committed;
+}
+
+void TellCommitResult(CommitResult result, MessageBoxes& boxes) {
+  switch (result) {
+    case CommitResult::Committed:
+      boxes.Show("Scores have been committed to the Database", "Update Success", BoxIcon::Information);
+      break;
+    case CommitResult::SomeWereAlready:
+      boxes.Show(
+          "Some Scores have already been committed to the Database. Uncommited scores are now committed.",
+          "Update Success", BoxIcon::Information);
+      break;
+    case CommitResult::Failed:
+      boxes.Show("Error occured while saving data to Database", "Database Error", BoxIcon::Exclamation,
+                 BoxButtons::OkCancel);
+      break;
+  }
+}

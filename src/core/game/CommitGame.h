@@ -1,0 +1,23 @@
+#pragma once
+
+#include "core/game/Game.h"
+#include "core/game/MemberLookup.h"
+#include "platform/Clock.h"
+#include "platform/Database.h"
+#include "platform/MessageBoxes.h"
+
+enum class CommitResult {
+  Committed,
+  SomeWereAlready,  ///< players were left out because their game counts already
+  Failed            ///< the database refused a player; those before are committed, those behind are not
+};
+
+/// Adds the game of each active player with a member to that member's lifetime figures, and marks the player
+/// `Committed`. A player whose member is gone is said in a box and left out. All rows that were written are
+/// durable on return, mostly after one wait for the disk. The player on whose row the database failed is
+/// marked although the row is the old one, so that a write of unknown outcome can never count twice.
+CommitResult CommitPlayers(Game& game, Database& dbMembers, Recordset& rsMembers, MemberLookup& members,
+                           const Clock& clock);
+
+/// Tells the operator how it went.
+void TellCommitResult(CommitResult result, MessageBoxes& boxes);

@@ -1,0 +1,223 @@
+#include "core/game/ScoreAnalysis.h"
+
+#include <cmath>
+#include <limits>
+#include <utility>
+
+#include "core/data/FieldValue.h"
+#include "core/text/NumberForms.h"
+
+namespace {
+
+void AddTo(std::int32_t& sum, std::int32_t amount) {
+  if (__builtin_add_overflow(sum, amount, &sum)) {
+    throw RuntimeError(6);
+  }
+}
+
+/// Shooters stand in blocks of 32 that belong to one team each.
+constexpr int BlockSize = 32;
+
+/// Damage that each player dealt to foes and to the own team, by record index less 1.
+struct DealtDamage {
+  std::array<std::int32_t, PlayerCount> ToFoes{};
+  std::array<std::int32_t, PlayerCount> ToOwnTeam{};
+};
+
+/// Adds one victim's hits. Returns false when one is negative or a sum has left the 32-bit range. Written so
+/// that the compiler adds several at a time.
+bool AddHits(std::int32_t* sums, const std::int32_t* hits) {
+  std::uint32_t signs = 0;
+  for (int i = 0; i < BlockSize; ++i) {
+    const std::uint32_t sum = static_cast<std::uint32_t>(sums[i]) + static_cast<std::uint32_t>(hits[i]);
+    signs |= sum | static_cast<std::uint32_t>(hits[i]);
+    sums[i] = static_cast<std::int32_t>(sum);
+  }
+  return signs <= std::numeric_limits<std::int32_t>::max();
+}
+
+}  // namespace
+
+void ScoreAnalysis::CalculateScores() {
+  scoreDisplay_.Clear();
+  teamScores_.Clear();
+  for (std::int32_t& total : game_.TeamTotals) {
+    total = 0;
+  }
+  missionPoints_.reset();
+  AddUpDamage();
+  for (int index = 1; index <= PlayerCount; ++index) {
+    if (game_.Players(index).Active) {
+      ScorePlayer(index);
+    }
+  }
+  ListTeams();
+  SortListNumeric(scoreDisplay_, static_cast<int>(BoardColumn::Soldiering), true, game_);
+  SortListNumeric(teamScores_, static_cast<int>(BoardColumn::Soldiering), true, game_);
+}
+
+void ScoreAnalysis::AddUpDamage() {
+  if (!AddUpDamageAtOnce()) {
+    AddUpDamageHitByHit();
+  }
+}
+
+bool ScoreAnalysis::AddUpDamageAtOnce() {
+  // Whole factors need no rounding, so the order of the hits does not matter unless a sum on the way could
+  // leave the range.
+  const bool isWhole = std::trunc(factors_.FriendlyFire) == factors_.FriendlyFire;
+  DealtDamage dealt;
+  bool inRange = isWhole && std::abs(factors_.FriendlyFire) <= std::numeric_limits<std::int32_t>::max();
+  for (int victim = 0; victim < PlayerCount && inRange; ++victim) {
+    const std::int32_t* hits = &*game_.Players(victim + 1).HitByPlayer.begin();
+    for (int first = 0; first < PlayerCount; first += BlockSize) {
+      auto& sums = IsOwnTeamHit(victim + 1, first + 1) ? dealt.ToOwnTeam : dealt.ToFoes;
+      inRange &= AddHits(&sums[first], hits + first);
+    }
+  }
+  const auto factor = inRange ? static_cast<std::int64_t>(factors_.FriendlyFire) : 0;
+  for (int shooter = 0; shooter < PlayerCount && inRange; ++shooter) {
+    const std::int64_t toFoes = dealt.ToFoes[shooter];
+    const std::int64_t toOwnTeam = dealt.ToOwnTeam[shooter];
+    inRange = std::abs(toOwnTeam * factor) + toFoes + toOwnTeam <= std::numeric_limits<std::int32_t>::max();
+    Player& player = game_.Players(shooter + 1);
+    player.TotalDamage = static_cast<std::int32_t>(toFoes + toOwnTeam * factor);
+    player.AbsoluteDamage = static_cast<std::int32_t>(toFoes + toOwnTeam);
+  }
+  return inRange;
+}
+
+void ScoreAnalysis::AddUpDamageHitByHit() {
+  for (Player& player : game_.Players) {
+    player.TotalDamage = 0;
+    player.AbsoluteDamage = 0;
+  }
+  // Each shooter's sums grow in the order of the victims, which is how the matrix lies in memory.
+  for (int victim = 1; victim <= PlayerCount; ++victim) {
+    for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
+      const std::int32_t hit = game_.Players(victim).HitByPlayer(shooter);
+      Player& player = game_.Players(shooter);
+      if (IsOwnTeamHit(victim, shooter)) {
+        // Rounded each by itself: half a point twice is nothing.
+        player.TotalDamage =
+            RoundToInt32(hit * static_cast<long double>(factors_.FriendlyFire) + player.TotalDamage);
+      } else {
+        AddTo(player.TotalDamage, hit);
+      }
+      AddTo(player.AbsoluteDamage, hit);
+    }
+  }
+}
+
+bool ScoreAnalysis::IsOwnTeamHit(int victim, int shooter) const {
+  return missions_.ListIndex() != MissionList::FreeForAll &&
+         TeamFromId(IdFromIndex(victim)) == TeamFromId(IdFromIndex(shooter));
+}
+
+void ScoreAnalysis::ScorePlayer(int index) {
+  Player& player = game_.Players(index);
+  const int team = TeamFromId(IdFromIndex(index));
+  // What may show a box comes before the row: a command given meanwhile can rebuild the lists.
+  std::string playerText = PlayerText(index);
+  CalculateAccuracy(player);
+  CalculateSoldiering(player);
+  AddMissionPoints(player, game_.TeamNames(team));
+  ScoreList::Row& row = scoreDisplay_.AddRow();
+  row.Cells[1] = std::move(playerText);
+  row.Cells[0] = Str(std::int32_t{player.Rank});
+  row.Cells[2] = Str(player.Soldiering);
+  row.Cells[3] = AccuracyText(player);
+  row.Cells[4] = Str(player.TotalDamage);
+  row.Cells[5] = Str(player.ShotCount);
+  row.Cells[6] = Str(player.HealCount);
+  row.Cells[7] = Str(player.DeathCount);
+  row.Cells[8] = Str(player.AmmoAddCount);
+  AddTo(game_.TeamTotals(team), player.Soldiering);
+}
+
+std::string ScoreAnalysis::PlayerText(int index) {
+  Player& player = game_.Players(index);
+  if (player.MemberIndex == 0 && player.DallasID != NoDallasId) {
+    player.MemberIndex = members_.FindByDallasId(player.DallasID);
+  }
+  std::string text = game_.DisplayName(index);
+  if (player.MemberIndex != 0 && members_.LoadMember(player.MemberIndex)) {
+    text += ": " + members_.GetPlayerName(true);
+  }
+  return text;
+}
+
+void ScoreAnalysis::CalculateAccuracy(Player& player) const {
+  if (player.PrimaryDamage == 0) {
+    return;
+  }
+  player.Accuracy = player.ShotCount > 0 ? static_cast<float>(static_cast<double>(player.AbsoluteDamage) /
+                                                              player.PrimaryDamage / player.ShotCount)
+                                         : 0.0F;
+}
+
+void ScoreAnalysis::CalculateSoldiering(Player& player) const {
+  using Wide = long double;
+  const Wide sum = player.HealCount * Wide{factors_.Heal} + player.TotalDamage * Wide{factors_.Damage} +
+                   player.DeathCount * Wide{factors_.Death} + player.AmmoAddCount * Wide{factors_.Ammo} +
+                   player.Accuracy * Wide{100} * Wide{factors_.Accuracy} + player.BonusPoints;
+  player.Soldiering = RoundToInt32(sum);
+}
+
+void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName) {
+  if (missions_.ListIndex() <= MissionList::FreeForAll) {
+    return;
+  }
+  if (!missionPoints_) {
+    if (!missions_.ActivateCurrentMissionRecord()) {
+      return;
+    }
+    missionPoints_ = ReadMissionPoints();
+  }
+  const auto add = [&player](long double points) {
+    player.Soldiering = RoundToInt32(player.Soldiering + points);
+  };
+  for (int set = 0; set < TeamCount; ++set) {
+    const ObjectiveTeam& objective = game_.ObjectiveTeams(set + 1);
+    if (objective.Name != teamName) {
+      continue;
+    }
+    if (objective.PrimaryAchieved) {
+      add(missionPoints_->Primary[set]);
+    }
+    if (objective.SecondaryAchieved) {
+      add(missionPoints_->Secondary[set]);
+    }
+  }
+  add(-static_cast<long double>(missionPoints_->RespawnPenalty) * player.RespawnCount);
+  add(-static_cast<long double>(missionPoints_->HealPenalty) * player.HealCount);
+}
+
+ScoreAnalysis::MissionPoints ScoreAnalysis::ReadMissionPoints() {
+  const auto number = [this](const std::string& column) { return NumberOf(missions_.Row().Fields(column)); };
+  MissionPoints points{};
+  for (int set = 0; set < TeamCount; ++set) {
+    const char letter = static_cast<char>('A' + set);
+    points.Primary[set] = number(std::string("PrimaryObjectivePoints") + letter);
+    points.Secondary[set] = number(std::string("SecondaryObjectivePoints") + letter);
+  }
+  points.RespawnPenalty = number("RespawnPenalty");
+  points.HealPenalty = number("HealPenalty");
+  return points;
+}
+
+std::string ScoreAnalysis::AccuracyText(const Player& player) const {
+  if (player.PrimaryDamage == 0) {
+    return strings_.Text(126);
+  }
+  return player.ShotCount > 0 ? FormatPercent(player.Accuracy) : strings_.Text(129);
+}
+
+void ScoreAnalysis::ListTeams() {
+  for (int team = 1; team <= TeamCount; ++team) {
+    ScoreList::Row& row = teamScores_.AddRow();
+    row.Cells[0] = Str(0);
+    row.Cells[1] = game_.TeamNames(team);
+    row.Cells[2] = Str(game_.TeamTotals(team));
+  }
+}

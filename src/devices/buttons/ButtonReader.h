@@ -1,0 +1,37 @@
+#pragma once
+
+#include <string>
+
+#include "core/game/DallasId.h"
+#include "devices/buttons/ReaderPoll.h"
+#include "platform/MessageBoxes.h"
+
+/// Waits for a membership button to touch the reader, tick by tick.
+class ButtonReader {
+ public:
+  /// Both must outlive this object.
+  ButtonReader(OneWire& wire, MessageBoxes& boxes) : poll_(wire), boxes_(boxes) {}
+
+  /// Forgets the last button and waits for the next one.
+  void Activate();
+
+  /// The coming tick is the last one; a button that it reads still counts.
+  void Cancel() { finished_ = true; }
+
+  /// Looks once for a button. The operator is told of one that was read, of a reader that does not answer and
+  /// of a driver that fails. True while there is more to wait for.
+  bool Tick();
+
+  /// The button that was read; NoDallasId without one.
+  const std::string& DallasID() const { return dallasId_; }
+
+ private:
+  void Poll();
+  void TakeDevice();
+  void EndFailedPoll();
+
+  ReaderPoll poll_;
+  MessageBoxes& boxes_;
+  std::string dallasId_ = NoDallasId;
+  bool finished_ = false;
+};

@@ -1,0 +1,39 @@
+#include "devices/buttons/ButtonSwipe.h"
+
+#include <QShowEvent>
+
+#include "ui_ButtonSwipe.h"
+
+ButtonSwipe::ButtonSwipe(OneWire& wire, MessageBoxes& boxes, const StringTable& strings, QWidget* parent)
+    : QDialog(parent),
+      ui_(std::make_unique<Ui::ButtonSwipe>()),
+      reader_(wire, boxes),
+      timer1_(new QTimer(this)) {
+  ui_->setupUi(this);
+  ui_->Cancel->setText(QString::fromStdString(strings.Text(141)));
+  constexpr int pollMilliseconds = 100;
+  timer1_->setObjectName(QStringLiteral("Timer1"));
+  timer1_->setInterval(pollMilliseconds);
+  connect(timer1_, &QTimer::timeout, this, &ButtonSwipe::Tick);
+}
+
+ButtonSwipe::~ButtonSwipe() = default;
+
+void ButtonSwipe::showEvent(QShowEvent* event) {
+  QDialog::showEvent(event);
+  if (!event->spontaneous()) {
+    reader_.Activate();
+    timer1_->start();
+  }
+}
+
+void ButtonSwipe::reject() {
+  reader_.Cancel();
+}
+
+void ButtonSwipe::Tick() {
+  if (!reader_.Tick()) {
+    timer1_->stop();
+    hide();
+  }
+}

@@ -1,0 +1,53 @@
+#include "devices/buttons/RomSearch.h"
+
+#include "core/line/Checksum.h"
+
+namespace {
+
+constexpr int BitCount = 64;
+
+/// Place of the pair for a ROM's bit.
+struct Pair {
+  explicit Pair(int bit)
+      : Byte(static_cast<std::size_t>(bit / 4)),
+        Conflict(static_cast<std::uint8_t>(1U << (bit % 4 * 2))),
+        Path(static_cast<std::uint8_t>(Conflict << 1U)) {}
+
+  std::size_t Byte;
+  std::uint8_t Conflict;
+  std::uint8_t Path;
+};
+
+bool BitOf(const std::array<std::uint8_t, 8>& rom, int bit) {
+  return (rom[static_cast<std::size_t>(bit / 8)] >> (bit % 8) & 1) != 0;
+}
+
+}  // namespace
+
+SearchBlock PathToNext(const OneWireState& state) {
+  SearchBlock path{};
+  for (int bit = 0; bit <= state.Branch && bit < BitCount; ++bit) {
+    if (bit == state.Branch || BitOf(state.Rom, bit)) {
+      const Pair pair(bit);
+      path[pair.Byte] |= pair.Path;
+    }
+  }
+  return path;
+}
+
+bool TakeFound(const SearchBlock& answer, OneWireState& state) {
+  state = {};
+  for (int bit = 0; bit < BitCount; ++bit) {
+    const Pair pair(bit);
+    if ((answer[pair.Byte] & pair.Path) != 0) {
+      state.Rom[static_cast<std::size_t>(bit / 8)] |= static_cast<std::uint8_t>(1U << (bit % 8));
+    } else if ((answer[pair.Byte] & pair.Conflict) != 0) {
+      state.Branch = bit;
+    }
+  }
+  state.Found = state.Rom[0] != 0 && Crc8(state.Rom) == 0;
+  if (!state.Found) {
+    state = {};
+  }
+  return state.Found;
+}

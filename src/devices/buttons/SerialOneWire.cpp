@@ -1,0 +1,139 @@
+#include "devices/buttons/SerialOneWire.h"
+
+#include <algorithm>
+#include <limits>
+
+#include "core/line/EnumPorts.h"
+#include "core/text/NumberForms.h"
+#include "platform/RuntimeError.h"
+
+namespace {
+
+constexpr const char* LineSettings = "9600,N,8,1";
+constexpr std::uint8_t MatchRom = 0x55;
+constexpr std::uint8_t IdleBus = 0xFF;
+
+/// Runs an operation on the line; a line that is lost in the middle counts as failed.
+template <typename Operation>
+bool Succeeds(Operation&& operation) {
+  try {
+    return operation();
+  } catch (const RuntimeError&) {
+    return false;
+  }
+}
+
+std::int16_t ResultOf(bool done) {
+  return done ? 1 : 0;
+}
+
+/// The number in a text of digits, 0 to 32767.
+std::optional<std::int16_t> NumberIn(const std::string& text) {
+  constexpr std::size_t mostDigits = 5;
+  const bool digits = !text.empty() && text.find_first_not_of("0123456789") == std::string::npos;
+  if (!digits || text.size() > mostDigits || Val(text) > std::numeric_limits<std::int16_t>::max()) {
+    return std::nullopt;
+  }
+  return ToInt16(text);
+}
+
+}  // namespace
+
+std::int16_t SerialOneWire::TMReadDefaultPort(std::int16_t& port, std::int16_t& type) {
+  const auto namedPort = NumberIn(ini_.ReadIni("onewire", "port", ""));
+  const auto namedType = NumberIn(ini_.ReadIni("onewire", "type", std::to_string(SerialAdapter)));
+  if (!namedPort || *namedPort == 0 || !namedType) {
+    return 0;
+  }
+  port = *namedPort;
+  type = *namedType;
+  return 1;
+}
+
+std::int32_t SerialOneWire::TMExtendedStartSession(std::int16_t port, std::int16_t type,
+                                                   std::int32_t /*reserved*/) {
+  if (chip_ || type != SerialAdapter) {
+    return 0;
+  }
+  const std::string device = EnumPorts(ini_, devices_).DeviceOf(port);
+  chip_.emplace(port_, events_);
+  const bool found = !device.empty() && Succeeds([&] {
+    port_.Open(device, LineSettings);
+    return chip_->Detect();
+  });
+  if (!found) {
+    chip_.reset();
+    port_.Close();
+    return 0;
+  }
+  handle_ = handle_ % std::numeric_limits<std::int32_t>::max() + 1;
+  return handle_;
+}
+
+std::int16_t SerialOneWire::TMSetup(std::int32_t handle) {
+  return ResultOf(IsOpen(handle));
+}
+
+std::int16_t SerialOneWire::TMNext(std::int32_t handle, OneWireState& state) {
+  if (!IsOpen(handle)) {
+    return 0;
+  }
+  const bool behindTheLast = state.Found && state.Branch == OneWireState::None;
+  const bool found = !behindTheLast && Succeeds([&] { return FindNext(state); });
+  if (!found) {
+    state = {};
+  }
+  return ResultOf(found);
+}
+
+bool SerialOneWire::FindNext(OneWireState& state) {
+  if (chip_->Reset() != Presence::Devices) {
+    return false;
+  }
+  const auto answer = chip_->Search(PathToNext(state));
+  return answer && TakeFound(*answer, state);
+}
+
+std::int16_t SerialOneWire::TMRom(std::int32_t handle, OneWireState& state, OneWireRom& rom) {
+  if (!IsOpen(handle) || rom[0] != 0) {
+    return 0;
+  }
+  std::copy(state.Rom.begin(), state.Rom.end(), rom.begin());
+  return 1;
+}
+
+std::int16_t SerialOneWire::TMAccess(std::int32_t handle, OneWireState& state) {
+  return ResultOf(IsOpen(handle) && state.Found && Succeeds([&] { return Select(state); }));
+}
+
+bool SerialOneWire::Select(const OneWireState& state) {
+  if (chip_->Reset() != Presence::Devices) {
+    return false;
+  }
+  std::array<std::uint8_t, 9> command{MatchRom};
+  std::copy(state.Rom.begin(), state.Rom.end(), command.begin() + 1);
+  auto answer = command;
+  return chip_->Exchange(answer) && answer == command;
+}
+
+std::int16_t SerialOneWire::TMTouchByte(std::int32_t handle, std::uint8_t byte) {
+  std::array<std::uint8_t, 1> bytes{byte};
+  return TMBlockStream(handle, bytes) == 1 ? bytes[0] : IdleBus;
+}
+
+std::int16_t SerialOneWire::TMBlockStream(std::int32_t handle, std::span<std::uint8_t> bytes) {
+  return ResultOf(IsOpen(handle) && Succeeds([&] { return chip_->Exchange(bytes); }));
+}
+
+std::int16_t SerialOneWire::TMEndSession(std::int32_t handle) {
+  if (!IsOpen(handle)) {
+    return 0;
+  }
+  Succeeds([&] {
+    chip_->Rest();
+    return true;
+  });
+  chip_.reset();
+  port_.Close();
+  return 1;
+}

@@ -1,0 +1,38 @@
+#pragma once
+
+#include <QAbstractTableModel>
+#include <QPixmap>
+#include <QString>
+#include <vector>
+
+#include "devices/radio/GunTable.h"
+
+/// The guns that were found, as rows of a list. Rows that stay where they are stay selected.
+class GunListModel : public QAbstractTableModel {
+  Q_OBJECT
+
+ public:
+  /// `player` is the header of the first column.
+  explicit GunListModel(const QString& player, QObject* parent);
+
+  /// Shows the listed ones of `guns`.
+  void Show(const GunTable& guns, std::int16_t maxPlayerId);
+  void Clear();
+
+  int rowCount(const QModelIndex& parent = {}) const override;
+  int columnCount(const QModelIndex& parent = {}) const override;
+  QVariant data(const QModelIndex& index, int role) const override;
+  QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
+
+ private:
+  struct Row {
+    explicit Row(const GunEntry& gun);
+
+    GunEntry Gun;
+    QPixmap Battery;
+    QPixmap Status;
+  };
+
+  QString player_;
+  std::vector<Row> rows_;
+};

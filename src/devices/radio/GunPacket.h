@@ -1,0 +1,36 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <span>
+#include <vector>
+
+#include "devices/radio/FrameParser.h"
+
+/// What goes between us and a gun in the data of a frame, either way:
+///
+///     0   N, length of the payload
+///     1   id of the gun that is asked, or that answers
+///     2   0
+///     3   0
+///     4   type
+///     5   payload
+using GunPacket = std::array<std::uint8_t, 100>;
+
+/// Types of packets.
+namespace GunPacketType {
+inline constexpr std::uint8_t Command = 4;
+inline constexpr std::uint8_t CommandAnswer = 5;
+inline constexpr std::uint8_t Search = 6;
+inline constexpr std::uint8_t SearchAnswer = 7;
+}  // namespace GunPacketType
+
+std::vector<std::uint8_t> MakeGunPacket(std::uint8_t playerId, std::uint8_t byte2, std::uint8_t byte3,
+                                        std::uint8_t packetType, std::span<const std::uint8_t> payload);
+
+/// The packet in the data of `frame`, with one byte more than its payload. Throws RuntimeError 9 when a
+/// payload of 95 bytes or more is announced.
+GunPacket ReadGunPacket(const ReceivedFrame& frame);
+
+/// `value` as the byte that the guns' protocol has room for. Throws RuntimeError 6 when it does not fit.
+std::uint8_t ByteOf(int value);

@@ -1,0 +1,66 @@
+#include "devices/radio/GunSearch.h"
+
+#include <string>
+
+#include "core/game/PlayerId.h"
+#include "core/text/NumberForms.h"
+
+GunSearch::GunSearch(RadioLink& link, EventPump& events, const StringTable& strings, GunTable& guns,
+                     RadioDisplay& display)
+    : link_(link), events_(events), strings_(strings), guns_(guns), display_(display) {}
+
+void GunSearch::SearchGuns(std::int16_t maxPlayerId) {
+  constexpr int passes = 2;
+  for (GunEntry& gun : guns_) {
+    gun.Present = false;
+  }
+  link_.OpenXBeePort();
+  display_.SetStatus("Searching...");
+  display_.ClearGunList();
+  display_.SetPlayersFound(playersFound_);
+  for (int pass = 0; pass < passes; ++pass) {
+    for (int index = 0; index < maxPlayerId && !link_.Stopped(); ++index) {
+      const int playerId = FirstGunId + index;
+      display_.SetProgress("Pass " + std::to_string(pass + 1) + " of " + std::to_string(passes) + ", ID " +
+                               std::to_string(playerId),
+                           pass * maxPlayerId + index, passes * maxPlayerId);
+      Ask(static_cast<std::uint8_t>(playerId));
+    }
+  }
+  display_.SetStatus("Idle");
+  link_.XBee_CloseCommPort();
+}
+
+void GunSearch::Ask(std::uint8_t playerId) {
+  events_.DoEvents();
+  while (link_.TakeFrame()) {
+    TakeAnswer();  // came together with another one, and must not end the next gun's slot
+  }
+  link_.SendGunPacket(playerId, BroadcastAddress, 0, 0, GunPacketType::Search);
+  if (link_.WaitForFrame(false)) {
+    TakeAnswer();
+  }
+}
+
+void GunSearch::TakeAnswer() {
+  const GunPacket answer = ReadGunPacket(link_.Frame());
+  if (answer[4] != GunPacketType::SearchAnswer) {
+    return;
+  }
+  const std::uint8_t playerId = answer[1];
+  GunEntry& gun = guns_[ByteOf(playerId - FirstGunId)];
+  if (gun.Present) {
+    return;
+  }
+  gun.Firmware = Str(answer[5]) + "." + Str(answer[6]);
+  gun.Battery = answer[7];
+  gun.WeaponType = answer[8];
+  gun.PlayerID = playerId;
+  gun.PlayerName =
+      TeamNameFromNumber(strings_, TeamFromId(playerId)) + " " + Str(PlayerNumberFromId(playerId));
+  gun.Present = true;
+  gun.Address = link_.Frame().SourceAddress;
+  gun.ScoreStatus = ScoreStatus::Pending;
+  display_.SetPlayersFound(++playersFound_);
+  display_.RefreshGunList();
+}

@@ -1,0 +1,72 @@
+#pragma once
+
+#include <QDialog>
+#include <functional>
+#include <memory>
+
+#include "core/game/Game.h"
+#include "core/line/CommPort.h"
+#include "core/text/StringTable.h"
+#include "devices/radio/GunTable.h"
+#include "devices/radio/RadioDisplay.h"
+#include "platform/Clock.h"
+#include "platform/EventPump.h"
+#include "platform/MessageBoxes.h"
+#include "platform/SerialPort.h"
+
+class GunListModel;
+class RadioLink;
+
+namespace Ui {
+class RemoteManage;
+}
+
+/// Guns in radio range: who is there, and their scores. Both buttons stay alive during a run; the later run
+/// ends the earlier one. Closed in mid-run, the window goes once the run has unwound.
+class RemoteManage : public QDialog, private RadioDisplay {
+  Q_OBJECT
+
+ public:
+  /// What the window works with; it outlives it.
+  struct Parts {
+    SerialPort& MSComm1;
+    CommPort& Port;
+    EventPump& Events;
+    MessageBoxes& Boxes;
+    const Clock& Time;
+    const StringTable& Strings;
+    Game& Scores;
+  };
+
+  RemoteManage(const Parts& parts, QWidget* parent);
+  ~RemoteManage() override;
+
+  void reject() override;
+
+ protected:
+  bool eventFilter(QObject* watched, QEvent* event) override;
+
+ private:
+  void SetUpList();
+  void ShareListWidth();
+  void SearchForGuns();
+  void GetScores();
+  /// Runs a job on a link of its own; whatever ends it, the line is closed and the pointer back.
+  void Run(const std::function<void(RadioLink&)>& job);
+  void Work(const std::function<void(RadioLink&)>& job);
+
+  void SetStatus(const std::string& text) override;
+  void SetPlayersFound(int count) override;
+  void ClearGunList() override;
+  void RefreshGunList() override;
+  void SetProgress(const std::string& text, int step, int steps) override;
+
+  std::unique_ptr<Ui::RemoteManage> ui_;
+  const Parts parts_;
+  GunListModel* list_ = nullptr;
+  GunTable guns_;
+  std::int16_t maxPlayerId_;  ///< 128 or 224: ids that the last search tried
+  int latestRun_ = 0;
+  int runs_ = 0;  ///< runs on the stack
+  bool closing_ = false;
+};

@@ -1,0 +1,43 @@
+#pragma once
+
+#include <cstdint>
+#include <span>
+
+#include "core/game/FrameDecoder.h"
+#include "core/game/Game.h"
+#include "devices/radio/GunTable.h"
+#include "devices/radio/RadioDisplay.h"
+#include "devices/radio/RadioLink.h"
+#include "platform/Clock.h"
+#include "platform/EventPump.h"
+
+/// Fetches the score block of every listed gun that is pending or failed, and adds it to the game. Commands
+/// of 1 (size), 2 (read a block) and 3 (close the transfer), each to one gun and answered by it.
+class ScoreFetch {
+ public:
+  ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, Game& game, GunTable& guns,
+             RadioDisplay& display);
+
+  /// Throws RuntimeError 6 for a gun that reports 0 bytes, or needs a block that begins beyond byte 255; 9
+  /// for an answer that is longer than its buffer. That gun then stays "in progress".
+  void GetScores();
+
+ private:
+  void FetchGun(int index);
+  void Attempt(GunEntry& gun, std::uint8_t playerId);
+  /// Sends a command; true when an answer to a command came, now in `answer_`.
+  bool Command(const GunEntry& gun, std::uint8_t playerId, std::span<const std::uint8_t> payload);
+  /// Number of bytes that came.
+  int FetchBlocks(const GunEntry& gun, std::uint8_t playerId, int total);
+  /// Puts a block into the buffer where it says that it belongs. Returns its length.
+  int TakeBlock();
+
+  RadioLink& link_;
+  EventPump& events_;
+  const Clock& clock_;
+  Game& game_;
+  GunTable& guns_;
+  RadioDisplay& display_;
+  GunPacket answer_{};
+  ReceiveBuffer buffer_{};
+};

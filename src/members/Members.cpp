@@ -1,0 +1,314 @@
+#include "members/Members.h"
+
+#include <QDateTime>
+#include <QFocusEvent>
+#include <QKeyEvent>
+#include <QLocale>
+#include <QTimer>
+#include <utility>
+
+#include "core/data/FieldValue.h"
+#include "core/data/Photo.h"
+#include "core/game/Game.h"
+#include "core/text/NumberForms.h"
+#include "members/MemberQueries.h"
+#include "platform/ErrorReport.h"
+#include "platform/qt/QtClock.h"
+#include "ui/WaitCursor.h"
+#include "ui_Members.h"
+
+namespace {
+
+QString DateText(const std::string& stored) {
+  QString text = QString::fromStdString(stored);
+  const QDateTime date = QDateTime::fromString(text, QStringLiteral("yyyy-MM-dd HH:mm:ss"));
+  if (!date.isValid()) {
+    return text;
+  }
+  const QLocale locale = QLocale::system();
+  return QString::fromStdString(ShortDateText(locale, date.date()) + " " +
+                                ShortTimeText(locale, date.time()));
+}
+
+QString FigureText(const Value& value) {
+  const bool isNull = std::holds_alternative<std::monostate>(value);
+  return isNull ? QString() : QString::fromStdString(PlainDecimal(NumberOf(value)));
+}
+
+QString AccuracyText(double accuracy) {
+  return accuracy == 0 ? QStringLiteral("N/A") : QString::fromStdString(FormatPercent(accuracy));
+}
+
+void Show(QLineEdit& entry, const std::string& text) {
+  entry.setText(QString::fromStdString(text));
+  entry.setCursorPosition(0);
+}
+
+}  // namespace
+
+Members::Members(Needs needs, QWidget* parent)
+    : QDialog(parent), ui_(std::make_unique<Ui::Members>()), needs_(std::move(needs)) {
+  ui_->setupUi(this);
+  ui_->Dummy->hide();
+  ui_->ChangeID->setEnabled(needs_.ButtonSwipe != nullptr);
+  ui_->SearchText->installEventFilter(this);
+  BoundControls& controls = *this;
+  data1_.emplace(needs_.DbMembers, controls);
+  ConnectCommands();
+}
+
+Members::~Members() = default;
+
+void Members::ConnectCommands() {
+  const std::pair<QAbstractButton*, void (Members::*)()> commands[] = {
+      {ui_->Search, &Members::RunSearch},        {ui_->ClearSearch, &Members::RunClearSearch},
+      {ui_->NewMember, &Members::AddMember},     {ui_->Delete, &Members::DeleteMember},
+      {ui_->ChangeID, &Members::ChangeMemberId}, {ui_->ChangePicture, &Members::ChangeMemberPicture},
+      {ui_->OK, &Members::SelectMember},
+  };
+  for (const auto& entry : commands) {
+    const auto command = entry.second;
+    ConnectButton(*entry.first, [this, command] { (this->*command)(); });
+  }
+  const std::pair<QAbstractButton*, void (MemberRows::*)()> arrows[] = {
+      {ui_->DataFirst, &MemberRows::MoveFirst},
+      {ui_->DataPrevious, &MemberRows::MovePrevious},
+      {ui_->DataNext, &MemberRows::MoveNext},
+      {ui_->DataLast, &MemberRows::MoveLast},
+  };
+  for (const auto& entry : arrows) {
+    const auto move = entry.second;
+    ConnectButton(*entry.first, [this, move] { ((*data1_).*move)(); });
+  }
+}
+
+// A button that is pressed by other means than the mouse takes the focus, too: or the search box, left after
+// the command, would go back to the first member.
+void Members::ConnectButton(QAbstractButton& button, const std::function<void()>& command) {
+  connect(&button, &QAbstractButton::clicked, this, [this, &button, command] {
+    button.setFocus();
+    Run(command);
+  });
+}
+
+void Members::Run(const std::function<void()>& command) {
+  ReportErrors(needs_.Boxes, command);
+}
+
+void Members::RunInFocusChange(const std::function<void()>& command) {
+  try {
+    command();
+  } catch (const RuntimeError& error) {
+    QTimer::singleShot(0, this, [this, number = error.Number(), text = std::string(error.what())] {
+      ShowErrorReport(needs_.Boxes, number, text);
+    });
+  }
+}
+
+void Members::showEvent(QShowEvent* event) {
+  QDialog::showEvent(event);
+  if (!event->spontaneous()) {
+    Run([this] { Activate(); });
+  }
+}
+
+void Members::Activate() {
+  RunClearSearch();
+  if (ContactToShow != 0) {
+    data1_->WalkTo(ContactToShow);
+    // Leaving the search box would go back to the first member.
+    QWidget* const focus = data1_->HasRow() ? static_cast<QWidget*>(ui_->FirstNameEntry) : ui_->DataPrevious;
+    focus->setFocus();
+  } else {
+    ui_->SearchText->setFocus();
+  }
+}
+
+// Escape and the close box unload the window.
+void Members::reject() {
+  Run([this] { RunClearSearch(); });
+  QDialog::reject();
+}
+
+// Who presses Search leaves the box by it, and a text that is no query is told of once.
+bool Members::IsLeaving(Qt::FocusReason reason) const {
+  const bool toSearch = focusWidget() == ui_->Search && reason != Qt::TabFocusReason;
+  return !toSearch && reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
+}
+
+bool Members::eventFilter(QObject* watched, QEvent* event) {
+  if (watched == ui_->SearchText && event->type() == QEvent::KeyPress) {
+    const int key = static_cast<QKeyEvent*>(event)->key();
+    if (key == Qt::Key_Return || key == Qt::Key_Enter) {
+      Run([this] { RunSearch(); });  // and not OK, which would choose the member in view
+      return true;
+    }
+  }
+  if (watched == ui_->SearchText && event->type() == QEvent::FocusOut && isVisible() &&
+      IsLeaving(static_cast<QFocusEvent*>(event)->reason())) {
+    RunInFocusChange([this] { RunSearch(); });
+  }
+  return QDialog::eventFilter(watched, event);
+}
+
+void Members::ShowRow(Recordset& rows) {
+  const MemberDetails details = ReadDetails(rows);
+  Show(*ui_->FirstNameEntry, details.FirstName);
+  Show(*ui_->LastNameEntry, details.LastName);
+  Show(*ui_->NickNameEntry, details.NickName);
+  Show(*ui_->ClanEntry, details.Clan);
+  ui_->DOBPicker->SetStored(details.Birthdate);
+  Show(*ui_->AddressEntry, details.Address);
+  Show(*ui_->CityEntry, details.City);
+  Show(*ui_->PostCodeEntry, details.PostalCode);
+  Show(*ui_->EmailEntry, details.EmailName);
+  Show(*ui_->PhoneNumberEntry, details.PhoneNumber);
+  const std::pair<QLabel*, const char*> figures[] = {
+      {ui_->TotalGamesPlayedDisplay, "TotalGamesPlayed"},   {ui_->TotalDamageDisplay, "TotalDamage"},
+      {ui_->AverageDamageDisplay, "AverageDamage"},         {ui_->TotalSoldieringDisplay, "TotalSoldiering"},
+      {ui_->AverageSoldieringDisplay, "AverageSoldiering"},
+  };
+  for (const auto& [display, column] : figures) {
+    display->setText(FigureText(rows.Fields(column)));
+  }
+  ui_->MemberIDDisplay->setText(QString::fromStdString(TextOf(rows.Fields("DallasID"))));
+  ui_->Dummy->setText(QString::fromStdString(TextOf(rows.Fields("ContactID"))));
+  ui_->DateJoinedDisplay->setText(DateText(TextOf(rows.Fields("DateJoined"))));
+  ui_->LastPlayedDisplay->setText(DateText(TextOf(rows.Fields("LastPlayedDate"))));
+  SetEntriesEnabled(true);
+}
+
+void Members::ShowNoRow() {
+  for (QLineEdit* entry :
+       {ui_->FirstNameEntry, ui_->LastNameEntry, ui_->NickNameEntry, ui_->ClanEntry, ui_->AddressEntry,
+        ui_->CityEntry, ui_->PostCodeEntry, ui_->EmailEntry, ui_->PhoneNumberEntry}) {
+    entry->clear();
+  }
+  ui_->DOBPicker->SetStored({});
+  for (QLabel* display : {ui_->MemberIDDisplay, ui_->DateJoinedDisplay, ui_->LastPlayedDisplay,
+                          ui_->TotalGamesPlayedDisplay, ui_->TotalDamageDisplay, ui_->AverageDamageDisplay,
+                          ui_->TotalSoldieringDisplay, ui_->AverageSoldieringDisplay, ui_->Dummy}) {
+    display->clear();
+  }
+  SetEntriesEnabled(false);
+}
+
+void Members::SetEntriesEnabled(bool enabled) {
+  for (QGroupBox* frame : {ui_->NameFrame, ui_->PersonalDetails, ui_->ContactDetails}) {
+    frame->setEnabled(enabled);
+  }
+}
+
+MemberDetails Members::Entered() const {
+  const auto text = [](const QLineEdit* entry) { return entry->text().toStdString(); };
+  return {text(ui_->FirstNameEntry),  text(ui_->LastNameEntry), text(ui_->NickNameEntry),
+          text(ui_->ClanEntry),       ui_->DOBPicker->Stored(), text(ui_->AddressEntry),
+          text(ui_->CityEntry),       text(ui_->PostCodeEntry), text(ui_->EmailEntry),
+          text(ui_->PhoneNumberEntry)};
+}
+
+void Members::RowChanged() {
+  ShowPlace();
+  ShowMemberExtras();
+}
+
+void Members::ShowPlace() {
+  const QLocale locale = QLocale::system();
+  ui_->DataPlace->setText(locale.toString(data1_->Rows().AbsolutePosition() + 1) + QStringLiteral(" / ") +
+                          locale.toString(data1_->Rows().RecordCount()));
+}
+
+void Members::ShowMemberExtras() {
+  Recordset& rows = data1_->Rows();
+  if (rows.Eof() || rows.Bof()) {
+    return;
+  }
+  if (NumberOf(rows.Fields("PhotographLength")) != 0) {
+    ReadPhoto();
+  } else {
+    ui_->MemberPhoto->Clear();
+  }
+  ui_->PrimaryAccuracyDisplay->setText(AccuracyText(NumberOf(rows.Fields("AveragePrimAccuracy"))));
+  ui_->SecondaryAccuracyDisplay->setText(AccuracyText(NumberOf(rows.Fields("AverageSecAccuracy"))));
+}
+
+void Members::ReadPhoto() {
+  const WaitCursor cursor;
+  ui_->MemberPhoto->Load(StoredPhoto(data1_->Rows(), "Photograph", "PhotographLength"));
+}
+
+void Members::PreviewPhoto(const std::string& file) {
+  try {
+    ui_->MemberPhoto->Load(needs_.Disk.Read(file));
+  } catch (const RuntimeError&) {
+    ui_->MemberPhoto->Clear();  // storing it will say why
+  }
+}
+
+void Members::RunSearch() {
+  ui_->MemberPhoto->Clear();
+  data1_->Refresh(SearchQuery(ui_->SearchText->text().toStdString()));
+}
+
+void Members::RunClearSearch() {
+  data1_->Refresh(AllMembers);
+  ui_->SearchText->clear();
+}
+
+void Members::AddMember() {
+  data1_->AddMember(needs_.Time.Now());
+  ui_->FirstNameEntry->setFocus();
+  ui_->FirstNameEntry->selectAll();
+}
+
+void Members::DeleteMember() {
+  const BoxAnswer answer =
+      needs_.Boxes.Show("This will delete the Member. Are you Sure?", needs_.Strings.Text(124),
+                        BoxIcon::Question, BoxButtons::OkCancel);
+  if (answer == BoxAnswer::Ok) {
+    data1_->Delete();
+  }
+  ShowMemberExtras();
+}
+
+void Members::ChangeMemberId() {
+  const std::string dallasId = needs_.ButtonSwipe();
+  if (dallasId != NoDallasId) {
+    data1_->SetField("DallasID", dallasId);
+    ui_->MemberIDDisplay->setText(QString::fromStdString(dallasId));
+  }
+}
+
+void Members::ChangeMemberPicture() {
+  if (!data1_->HasRow()) {
+    throw RuntimeError(3021);
+  }
+  data1_->WriteBack();
+  const std::string file =
+      needs_.CommonDialog1.ShowOpen("Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif", "");
+  if (file.empty()) {
+    ShowMemberExtras();
+    return;
+  }
+  Recordset& rows = data1_->Rows();
+  try {
+    PreviewPhoto(file);
+    rows.Edit();
+    StorePhoto(file, rows, "Photograph", "PhotographLength", needs_.Disk, needs_.Boxes);
+    rows.Update();
+  } catch (const RuntimeError&) {
+    if (rows.EditMode() != EditMode::None) {
+      rows.CancelUpdate();
+    }
+    ShowMemberExtras();
+    throw;
+  }
+  ShowMemberExtras();
+}
+
+void Members::SelectMember() {
+  data1_->Refresh(
+      NameQuery(ui_->FirstNameEntry->text().toStdString(), ui_->LastNameEntry->text().toStdString()));
+  SelectedContact = TextOf(data1_->Rows().Fields("ContactID"));
+  accept();
+}

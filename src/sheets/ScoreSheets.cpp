@@ -1,0 +1,254 @@
+#include "sheets/ScoreSheets.h"
+
+#include <chrono>
+#include <optional>
+#include <string_view>
+#include <utility>
+
+#include "core/data/Photo.h"
+#include "core/text/NumberForms.h"
+#include "platform/RuntimeError.h"
+#include "sheets/SheetTexts.h"
+
+using std::chrono::milliseconds;
+
+namespace {
+
+/// The end of a run at one of its stages.
+struct StageFailure {
+  std::string Text;
+  std::string Title;
+};
+
+/// The end of a run because the program closes.
+struct ProgramCloses {};
+
+constexpr const char* FailureTitle = "Print Error";
+
+/// Runs a stage of a sheet; any failure of it ends the run with its text.
+template <typename Operation>
+void Stage(const std::string& text, const std::string& title, Operation&& operation) {
+  try {
+    operation();
+  } catch (const RuntimeError&) {
+    throw StageFailure{text, title};
+  }
+}
+
+template <typename Operation>
+void Stage(const std::string& text, Operation&& operation) {
+  Stage(text, FailureTitle, std::forward<Operation>(operation));
+}
+
+/// Throws RuntimeError 75 for a name that some system a sheet is carried to would refuse.
+void CheckFileName(const std::string& name) {
+  constexpr std::size_t longest = 255;
+  bool valid = name.size() <= longest;
+  for (const char c : name) {
+    valid = valid && static_cast<unsigned char>(c) >= 0x20 && c != 0x7F &&
+            std::string_view("\\/:*?\"<>|").find(c) == std::string_view::npos;
+  }
+  if (!valid) {
+    throw RuntimeError(75);
+  }
+}
+
+}  // namespace
+
+ScoreSheets::ScoreSheets(const SheetSources& sources, const PrintChoice& choice)
+    : in_(sources),
+      choice_(choice),
+      folder_(sources.UserDataFolder + "/scores"),
+      winner_(WinningTeam(sources.Board)),
+      sheetDate_(WithoutWeekday(sources.Time.LongDate(sources.Board.GameDate))) {}
+
+void ScoreSheets::GenerateScoreSheets() {
+  std::optional<StageFailure> failure;
+  bool closing = false;
+  try {
+    MakeSheets();
+  } catch (const StageFailure& stage) {
+    failure = stage;
+  } catch (const ProgramCloses&) {
+    closing = true;
+  }
+  in_.Progress.Close();
+  for (const std::string& page : pages_) {
+    if (in_.Disk.FileExists(page)) {
+      in_.Disk.Delete(page);
+    }
+  }
+  if (closing) {
+    return;
+  }
+  if (failure) {
+    in_.Boxes.Show(failure->Text, failure->Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
+    return;
+  }
+  std::string text = in_.Strings.Text(130);
+  if (choice_.OutputTarget == OutputTarget::Files) {
+    text += " Files saved to " + in_.UserDataFolder + "/Scores.";
+  }
+  in_.Boxes.Show(text, in_.Strings.Text(131), BoxIcon::Information);
+}
+
+bool ScoreSheets::IsChosen(int index) const {
+  const std::uint8_t id = IdFromIndex(index);
+  const bool inTeam = TeamFromId(id) == choice_.SelectedTeam;
+  switch (choice_.SheetSelection) {
+    case SheetSelection::All:
+      return true;
+    case SheetSelection::Active:
+      return in_.Board.Players(index).Active;
+    case SheetSelection::Team:
+      return inTeam;
+    case SheetSelection::OnePlayer:
+      return inTeam && PlayerNumberFromId(id) == choice_.SelectedNumber;
+    default:
+      return false;
+  }
+}
+
+std::vector<int> ScoreSheets::ChosenPlayers() const {
+  std::vector<int> chosen;
+  for (int index = 1; index <= PlayerCount; ++index) {
+    if (IsChosen(index)) {
+      chosen.push_back(index);
+    }
+  }
+  return chosen;
+}
+
+void ScoreSheets::MakeSheets() {
+  const std::vector<int> chosen = ChosenPlayers();
+  if (chosen.empty()) {
+    return;
+  }
+  in_.Progress.Open();
+  Stage("Could not locate score template file.", [this] { StartWordProcessor(); });
+  const int count = static_cast<int>(chosen.size());
+  for (int number = 1; number <= count && !in_.Progress.Stopped(); ++number) {
+    MakeSheet(chosen[static_cast<std::size_t>(number) - 1], number, count);
+  }
+  if (!pages_.empty()) {
+    Stage("Error occured during file saving.", [this] { JoinSheets(); });
+  }
+}
+
+void ScoreSheets::StartWordProcessor() {
+  in_.WordApp.Start();
+  constexpr milliseconds step(60);
+  constexpr int steps = 1000;
+  for (int i = 0; i < steps && in_.WordApp.State() == WordState::Starting && !in_.Progress.Stopped(); ++i) {
+    if (in_.Events.WaitFor([] { return false; }, step) == WaitResult::Ended) {
+      throw ProgramCloses{};
+    }
+  }
+}
+
+void ScoreSheets::MakeSheet(int index, int number, int count) {
+  std::unique_ptr<WordDocument> document;
+  Stage("Could not locate score template file.",
+        [&] { document = in_.WordApp.Add(in_.UserDataFolder + "/score_card.doc"); });
+  ServeEvents();
+  Stage(in_.Strings.Text(132), in_.Strings.Text(133), [&] {
+    FillPlayer(*document, index, number, count);
+    FillGame(*document, index);
+  });
+  Save(*document);
+  Stage("Error occured during printing.", [&] {
+    if (choice_.OutputTarget == OutputTarget::Printer) {
+      document->PrintOut();
+    }
+    document->Close();
+  });
+  ServeEvents();
+}
+
+void ScoreSheets::FillPlayer(WordDocument& document, int index, int number, int count) {
+  Write(document, ResultTexts(in_.Board, index, winner_));
+  const std::int32_t member = in_.Board.Players(index).MemberIndex;
+  const bool found = member != 0 && in_.Members.LoadMember(member);
+  const BookmarkTexts texts = found ? MemberTexts(in_.RsMembers, in_.Members) : GuestTexts();
+  const std::string& name = texts.front().second;
+  const std::uint8_t id = IdFromIndex(index);
+  const std::string player =
+      in_.Board.TeamNames(TeamFromId(id)) + Str(std::int32_t{PlayerNumberFromId(id)}) + "-" + name;
+  sheetName_ = player + "-" + sheetDate_ + "-" + in_.MissionName;
+  in_.Progress.ShowSheet(number, count, player);
+  ServeEvents();
+  Write(document, texts);
+  if (found) {
+    Stage("Error occured getting Memmber photo.", [&] { AddPhoto(document); });
+  }
+}
+
+void ScoreSheets::AddPhoto(WordDocument& document) {
+  const std::string file = in_.Disk.MakeTempFileName();
+  // The file of a member without a photo stays.
+  if (ExportPhoto(in_.RsMembers, "Photograph", "PhotographLength", file, in_.Disk)) {
+    document.AddPicture(1, 1, 1, file);
+    in_.Disk.Delete(file);
+  }
+  ServeEvents();
+}
+
+void ScoreSheets::FillGame(WordDocument& document, int index) {
+  const Player& player = in_.Board.Players(index);
+  const std::string rank = choice_.RankHidden ? in_.Strings.Text(129) : Str(std::int32_t{player.Rank});
+  Write(document, GameTexts(player, in_.MissionName, sheetDate_, rank));
+  constexpr int firstRow = 2;
+  constexpr int rows = 20;
+  document.WriteCells(4, firstRow, rows, HitsScored(in_.Board, index, in_.Members));
+  ServeEvents();
+  document.WriteCells(5, firstRow, rows, HitsTaken(in_.Board, index, in_.Members));
+  ServeEvents();
+}
+
+void ScoreSheets::Write(WordDocument& document, const BookmarkTexts& texts) {
+  for (const auto& [name, text] : texts) {
+    document.SetBookmark(name, text);
+  }
+  ServeEvents();
+}
+
+void ScoreSheets::Save(WordDocument& document) {
+  Stage("Failed to create sub folder for score saving.", [this] {
+    if (!in_.Disk.FolderExists(folder_)) {
+      in_.Disk.CreateFolder(folder_);
+    }
+  });
+  Stage("Error occured during file saving.", [&] {
+    document.SaveAs(FreeName(sheetName_, ".doc"));
+    ServeEvents();
+    if (choice_.OutputTarget == OutputTarget::Files) {
+      pages_.push_back(in_.Disk.MakeTempFileName());
+      document.ExportPdf(pages_.back());
+      ServeEvents();
+    }
+  });
+}
+
+std::string ScoreSheets::FreeName(const std::string& base, const std::string& extension) const {
+  const std::string folder = folder_ + "/";
+  std::string name = base + extension;
+  std::int32_t n = 0;
+  while (in_.Disk.FileExists(folder + name)) {
+    name = base;
+    name += Str(++n);
+    name += extension;
+  }
+  CheckFileName(name);
+  return folder + name;
+}
+
+void ScoreSheets::JoinSheets() {
+  in_.WordApp.JoinPdfs(pages_, FreeName("Score sheets-" + sheetDate_ + "-" + in_.MissionName, ".pdf"),
+                       [this] { ServeEvents(); });
+}
+
+void ScoreSheets::ServeEvents() {
+  if (in_.Events.WaitFor([] { return false; }, milliseconds(0)) == WaitResult::Ended) {
+    throw ProgramCloses{};
+  }
+}

@@ -1,0 +1,38 @@
+#pragma once
+
+#include <QDialog>
+#include <memory>
+#include <optional>
+
+#include "core/text/StringTable.h"
+#include "sheets/SheetProgress.h"
+#include "ui/WaitCursor.h"
+
+namespace Ui {
+class SheetProgressWindow;
+}
+
+/// The small window in front of a run of score sheets. Its button, Escape and the close box stop the run
+/// after the present sheet; the window stays until then, and with it the hourglass.
+class SheetProgressWindow : public QDialog, public SheetProgress {
+  Q_OBJECT
+
+ public:
+  SheetProgressWindow(const StringTable& strings, QWidget* parent);
+  ~SheetProgressWindow() override;
+
+  void Open() override;
+  void ShowSheet(int number, int count, const std::string& name) override;
+  bool Stopped() const override { return stopped_; }
+  void Close() override;
+
+  void reject() override;
+
+ private:
+  QString Words(const char* english, const char* chinese) const;
+
+  std::unique_ptr<Ui::SheetProgressWindow> ui_;
+  const StringTable& strings_;
+  bool stopped_ = false;
+  std::optional<WaitCursor> cursor_;
+};

@@ -1,0 +1,10 @@
+#pragma once
+
+#include <QString>
+
+#include "core/text/StringTable.h"
+
+/// Text `number` of the string table for a control.
+inline QString Text(const StringTable& strings, int number) {
+  return QString::fromStdString(strings.Text(number));
+}

@@ -1,0 +1,50 @@
+#include "app/ScreenFit.h"
+
+#include <gtest/gtest.h>
+
+#include <tuple>
+#include <utility>
+
+namespace {
+
+TEST(FitToScreen, MaximisesWithoutAWarningOnExactlyTheRecommendedSize) {
+  const ScreenFit fit = FitToScreen(1024, 768);
+  EXPECT_FALSE(fit.Warn);
+  EXPECT_TRUE(fit.Maximised);
+  EXPECT_FALSE(fit.Width || fit.Height);
+}
+
+TEST(FitToScreen, LeavesTheWindowAloneOnALargerScreen) {
+  for (const auto& [width, height] : {std::pair{1280, 1024}, {1025, 768}, {1024, 769}, {3840, 2160}}) {
+    const ScreenFit fit = FitToScreen(width, height);
+    EXPECT_FALSE(fit.Warn || fit.Maximised || fit.Width || fit.Height) << width << " x " << height;
+  }
+}
+
+TEST(FitToScreen, WarnsAndLimitsBothOnASmallScreen) {
+  const ScreenFit fit = FitToScreen(800, 600);
+  EXPECT_TRUE(fit.Warn);
+  EXPECT_EQ(fit.Width, 800);
+  EXPECT_EQ(fit.Height, 567);  // less 500 twips at 15 to the pixel
+  EXPECT_TRUE(fit.Maximised);
+}
+
+TEST(FitToScreen, LimitsTheWidthAloneOnANarrowScreen) {
+  for (const auto& [width, height] : {std::pair{800, 1200}, {1023, 768}}) {
+    const ScreenFit fit = FitToScreen(width, height);
+    EXPECT_TRUE(fit.Warn);
+    EXPECT_EQ(fit.Width, width);
+    EXPECT_FALSE(fit.Height || fit.Maximised);
+  }
+}
+
+TEST(FitToScreen, LimitsTheHeightAloneOnALowScreen) {
+  for (const auto& [width, height, limit] : {std::tuple{1920, 700, 667}, {1024, 767, 734}}) {
+    const ScreenFit fit = FitToScreen(width, height);
+    EXPECT_TRUE(fit.Warn && fit.Maximised);
+    EXPECT_EQ(fit.Height, limit);
+    EXPECT_FALSE(fit.Width);
+  }
+}
+
+}  // namespace

@@ -1,0 +1,157 @@
+#include "board/MissionResultEntry.h"
+
+#include <gmock/gmock.h>
+
+#include <QCheckBox>
+#include <QLabel>
+
+#include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
+
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+class Results : public testing::Test {
+ protected:
+  Results() {
+    venue.PutDefaultFiles();
+    venue.ChangeDatabase(
+        "scenarios.mdb",
+        "DELETE FROM Table1; INSERT INTO Table1 (ID, MissionName, PrimaryObjectivePointsA, "
+        "PrimaryObjectivePointsB, SecondaryObjectivePointsC, PrimaryObjectiveDescriptionA, "
+        "SecondaryObjectiveDescriptionC) VALUES (1, 'Test', 100, 20, 3, 'Hold the well' || char(13, 10) "
+        "|| 'to the end', 'Run')");
+    venue.Start();
+    venue.LoadGame(GameFile(PlayerOf(1) + PlayerOf(40) + PlayerOf(70)));
+    venue.ActiveMission().setCurrentIndex(2);
+  }
+
+  /// Opens the window, does `act` in it and presses OK; by `close` it goes by its close box instead.
+  void Open(const std::function<void()>& act, bool close = false) {
+    const WhileModal<MissionResultEntry> open([&](MissionResultEntry& opened) {
+      window = &opened;
+      act();
+      if (close) {
+        opened.close();
+      } else {
+        ::Press(opened, "OK");
+      }
+    });
+    venue.Trigger("mnuMissionResults");
+    EXPECT_EQ(open.Runs(), 1);
+  }
+
+  QCheckBox& Box(const std::string& name) { return ::Find<QCheckBox>(*window, name); }
+  QComboBox& Team(const std::string& name) { return ::Find<QComboBox>(*window, name); }
+
+  /// Soldiering of Red 0, Blue 7 and Yellow 5.
+  std::vector<int> Scores() {
+    std::vector<int> scores;
+    for (const char* player : {"Red  0", "Blue  7", "Yellow  5"}) {
+      for (int row = 0; row < 3; ++row) {
+        if (venue.Row("ScoreDisplay", row)[1] == player) {
+          scores.push_back(std::stoi(venue.Row("ScoreDisplay", row)[2]));
+        }
+      }
+    }
+    return scores;
+  }
+
+  Venue venue;
+  MissionResultEntry* window = nullptr;
+};
+
+TEST_F(Results, AreEnteredOnlyForAMission) {
+  for (const auto& [entry, enabled] : {std::pair{2, true}, {1, false}, {2, true}, {0, false}}) {
+    venue.ActiveMission().setCurrentIndex(entry);
+    EXPECT_EQ(venue.Find<QAction>("mnuMissionResults").isEnabled(), enabled) << entry;
+  }
+}
+
+TEST_F(Results, StartAsNothingCompletedByRedBlueAndYellow) {
+  Open([this] {
+    for (const char* box : {"PrimaryCompleted1", "PrimaryCompleted2", "PrimaryCompleted3",
+                            "SecondaryCompleted1", "SecondaryCompleted2", "SecondaryCompleted3"}) {
+      EXPECT_FALSE(Box(box).isChecked()) << box;
+    }
+    EXPECT_EQ(Team("TeamA").currentText(), QStringLiteral("Red"));
+    EXPECT_EQ(Team("TeamB").currentText(), QStringLiteral("Blue"));
+    EXPECT_EQ(Team("TeamC").currentText(), QStringLiteral("Yellow"));
+    EXPECT_EQ(Team("TeamB").count(), 3);
+    EXPECT_EQ(window->windowTitle(), QStringLiteral("Mission Results"));
+    EXPECT_EQ(
+        ::Find<QLabel>(*window, "Label1").text(),
+        QStringLiteral("Hold the mouse over an objective to  see a description of what the objective is."));
+  });
+}
+
+TEST_F(Results, PayTheTeamOfTheSet) {
+  Open([this] { Box("PrimaryCompleted2").setChecked(true); });
+  EXPECT_THAT(Scores(), ElementsAre(0, 20, 0));
+  Open([this] {
+    EXPECT_TRUE(Box("PrimaryCompleted2").isChecked());
+    Box("SecondaryCompleted3").setChecked(true);
+  });
+  EXPECT_THAT(Scores(), ElementsAre(0, 20, 3));
+}
+
+TEST_F(Results, OfTwoSetsMayBelongToOneTeam) {
+  Open([this] {
+    Team("TeamB").setCurrentText(QStringLiteral("Red"));
+    Box("PrimaryCompleted1").setChecked(true);
+    Box("PrimaryCompleted2").setChecked(true);
+  });
+  EXPECT_THAT(Scores(), ElementsAre(120, 0, 0));
+}
+
+TEST_F(Results, StayAsTheyWereWhenTheWindowIsClosedByItsBox) {
+  Open([this] { Box("PrimaryCompleted1").setChecked(true); });
+  Open(
+      [this] {
+        Box("PrimaryCompleted1").setChecked(false);
+        Team("TeamA").setCurrentIndex(2);
+      },
+      true);
+  EXPECT_THAT(Scores(), ElementsAre(100, 0, 0));
+}
+
+TEST_F(Results, StayTickedForTheNextGame) {
+  Open([this] { Box("PrimaryCompleted1").setChecked(true); });
+  venue.Trigger("mnuClearScores");
+  Open([this] { EXPECT_TRUE(Box("PrimaryCompleted1").isChecked()); });
+}
+
+TEST_F(Results, ShowTheFirstLineOfEachObjective) {
+  Open([this] {
+    EXPECT_EQ(Box("PrimaryCompleted1").toolTip(), QStringLiteral("Hold the well"));
+    EXPECT_EQ(Box("SecondaryCompleted3").toolTip(), QStringLiteral("Run"));
+    EXPECT_EQ(Box("PrimaryCompleted2").toolTip(), QString());
+    Show(*window);
+    QApplication::setActiveWindow(window);
+    auto& text = ::Find<QLabel>(*window, "ObjectiveText");
+    Box("PrimaryCompleted1").setFocus();
+    EXPECT_EQ(text.text(), QStringLiteral("Hold the well"));
+    Box("PrimaryCompleted2").setFocus();
+    EXPECT_EQ(text.text(), QString());
+  });
+}
+
+TEST_F(Results, OfAMissionThatIsGoneHaveNoObjectives) {
+  venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1");
+  venue.Boxes.Boxes.clear();
+  Open([this] { EXPECT_EQ(Box("PrimaryCompleted1").toolTip(), QString()); });
+  ASSERT_FALSE(venue.Boxes.Boxes.empty());
+  EXPECT_EQ(venue.Boxes.Boxes[0].Text, "Could not locate selected Mission in Mission Database");
+}
+
+TEST_F(Results, TakeATeamThatIsNoneOfTheThreeFromAFile) {
+  venue.LoadGame(
+      "<GameData><GameHeader><MissionName>Test</MissionName><Team><Name>Green</Name>"
+      "<PrimaryObjectiveAchieved>1</PrimaryObjectiveAchieved>"
+      "<SecondryObjectiveAchieved>0</SecondryObjectiveAchieved></Team></GameHeader></GameData>");
+  Open([this] { EXPECT_EQ(Team("TeamA").currentIndex(), -1); });
+}
+
+}  // namespace

@@ -1,0 +1,144 @@
+#include "core/data/UserDatabase.h"
+
+#include <gmock/gmock.h>
+
+#include "tests/fakes/FakeClock.h"
+#include "tests/fakes/FakeFiles.h"
+#include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/fakes/FakeOldDatabases.h"
+#include "tests/support/Thrown.h"
+
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+class NoDatabase : public Database {
+ public:
+  std::unique_ptr<Recordset> OpenRecordset(const std::string& /*source*/) override { return nullptr; }
+  void BeginTrans() override {}
+  void CommitTrans() override {}
+  void Rollback() noexcept override {}
+  void BeforeChange(std::function<bool()> action) override { BeforeChangeOf = std::move(action); }
+  void CopyTo(const std::string& path) override { CopiedTo = path; }
+
+  std::function<bool()> BeforeChangeOf;
+  std::string CopiedTo;
+};
+
+/// Opens what exists and is not said to be bad.
+class ScriptedEngine : public DatabaseEngine {
+ public:
+  std::vector<std::string> Opened;
+  std::string BadPath;
+  int BadNumber = 3343;
+
+  std::unique_ptr<Database> OpenDatabase(const std::string& path) override {
+    if (path == BadPath) {
+      throw RuntimeError(BadNumber, "Unrecognized database format.");
+    }
+    Opened.push_back(path);
+    return std::make_unique<NoDatabase>();
+  }
+};
+
+class Opening : public testing::Test {
+ protected:
+  Opening() {
+    disk.Put("/data/members.mdb", "mine");
+    disk.Put("/program/members_default.mdb", "fresh");
+  }
+
+  std::unique_ptr<Database> Open() {
+    return OpenUserDatabase({"/data/members.mdb", "Members", "/program/members_default.mdb"},
+                            {engine, old, disk, boxes, copies});
+  }
+
+  static FakeMessageBoxes::Box Question(const std::string& reason) {
+    return {"The database /data/members.mdb cannot be used. " + reason +
+                "\n\nIt stays as it is. Press OK to go on with a fresh database, /data/members-new.mdb, or "
+                "Cancel to end "
+                "the program.",
+            "Database status", BoxIcon::Exclamation, BoxButtons::OkCancel};
+  }
+
+  ScriptedEngine engine;
+  FakeOldDatabases old;
+  FakeFiles disk;
+  FakeMessageBoxes boxes;
+  FakeClock clock;
+  Backups copies{"/data/backups", disk, clock};
+};
+
+TEST_F(Opening, OfAFileOfTodayIsSilent) {
+  EXPECT_NE(Open(), nullptr);
+  EXPECT_THAT(engine.Opened, ElementsAre("/data/members.mdb"));
+  EXPECT_THAT(old.Converted, IsEmpty());
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+}
+
+TEST_F(Opening, ConvertsAnOldFileAndTellsWhatWasNotTaken) {
+  old.OldPaths = {"/data/members.mdb"};
+  old.Report = {40, {"table Extras (3 rows)", "column Shoe size"}, "/data/members.mdb.jet"};
+  EXPECT_NE(Open(), nullptr);
+  EXPECT_THAT(old.Converted, ElementsAre("/data/members.mdb Members /program/members_default.mdb"));
+  EXPECT_THAT(engine.Opened, ElementsAre("/data/members.mdb"));
+  EXPECT_THAT(
+      boxes.Boxes,
+      ElementsAre(FakeMessageBoxes::Box{
+          "The database of an old installation has been converted: /data/members.mdb, 40 rows. The old file "
+          "is "
+          "kept as /data/members.mdb.jet.\n\nNot taken over:\ntable Extras (3 rows)\ncolumn Shoe size",
+          "Database status", BoxIcon::Information, BoxButtons::Ok}));
+}
+
+TEST_F(Opening, HasTheFileCopiedBeforeItChanges) {
+  const auto database = Open();
+  auto& opened = dynamic_cast<NoDatabase&>(*database);
+  ASSERT_TRUE(opened.BeforeChangeOf);
+  opened.BeforeChangeOf();
+  EXPECT_EQ(opened.CopiedTo, "/data/backups/members.part");
+}
+
+TEST_F(Opening, HasAFreshFileCopiedUnderItsOwnName) {
+  engine.BadPath = "/data/members.mdb";
+  const auto database = Open();
+  auto& opened = dynamic_cast<NoDatabase&>(*database);
+  opened.BeforeChangeOf();
+  EXPECT_EQ(opened.CopiedTo, "/data/backups/members-new.part");
+}
+
+TEST_F(Opening, GoesOnWithAFreshFileBesideADamagedOne) {
+  old.OldPaths = {"/data/members.mdb"};
+  old.Failure = "It is damaged.";
+  EXPECT_NE(Open(), nullptr);
+  EXPECT_THAT(boxes.Boxes, ElementsAre(Question("It is damaged.")));
+  EXPECT_THAT(engine.Opened, ElementsAre("/data/members-new.mdb"));
+  EXPECT_EQ(disk.Contents().at("/data/members-new.mdb"), "fresh");
+  EXPECT_EQ(disk.Contents().at("/data/members.mdb"), "mine");
+}
+
+TEST_F(Opening, UsesTheFreshFileOfTheLastTimeAgain) {
+  engine.BadPath = "/data/members.mdb";
+  disk.Put("/data/members-new.mdb", "with rows by now");
+  EXPECT_NE(Open(), nullptr);
+  EXPECT_THAT(boxes.Boxes, ElementsAre(Question("Unrecognized database format.")));
+  EXPECT_EQ(disk.Contents().at("/data/members-new.mdb"), "with rows by now");
+}
+
+TEST_F(Opening, EndsOnCancelAndLeavesEverything) {
+  engine.BadPath = "/data/members.mdb";
+  boxes.Answers = {BoxAnswer::Cancel};
+  EXPECT_EQ(Open(), nullptr);
+  EXPECT_THAT(disk.Replaced, IsEmpty());
+  EXPECT_THAT(engine.Opened, IsEmpty());
+}
+
+TEST_F(Opening, PassesOtherFailuresOn) {
+  engine.BadPath = "/data/members.mdb";
+  engine.BadNumber = 3050;
+  EXPECT_EQ(NumberThrownBy([this] { Open(); }), 3050);
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+}
+
+}  // namespace

@@ -1,0 +1,397 @@
+#include "devices/radio/RemoteManage.h"
+
+#include <gmock/gmock.h>
+
+#include <QGroupBox>
+#include <QLabel>
+#include <QProgressBar>
+#include <QRadioButton>
+#include <QTableView>
+#include <chrono>
+
+#include "tests/devices/radio/HealthyGun.h"
+#include "tests/support/CaredFor.h"
+#include "tests/support/Controls.h"
+#include "tests/support/WhileModal.h"
+
+namespace {
+
+using std::chrono::milliseconds;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+class RemoteWindow : public testing::TestWithParam<Language>, protected RadioSite {
+ protected:
+  RemoteWindow() : RadioSite(GetParam()) {
+    OnPacket = [this](const Bytes& packet) {
+      const bool there = std::find(guns.begin(), guns.end(), packet[1]) != guns.end();
+      if (there && (packet[4] == 6 || packet[1] != silent)) {
+        Arrive(5, Received(packet[1], AnswerTo(packet)));
+      }
+    };
+    window.show();
+  }
+
+  void Press(const char* button) { ::Press(window, button); }
+  std::string TextOf(const char* label) const { return Find<QLabel>(window, label).text().toStdString(); }
+  const QAbstractItemModel& List() const { return *Find<QTableView>(window, "DataList").model(); }
+
+  std::vector<std::string> Row(int row) const {
+    std::vector<std::string> cells;
+    for (int column = 0; column < List().columnCount(); ++column) {
+      cells.push_back(List().index(row, column).data().toString().toStdString());
+    }
+    return cells;
+  }
+  std::vector<std::string> Column(int column) const {
+    std::vector<std::string> cells;
+    for (int row = 0; row < List().rowCount(); ++row) {
+      cells.push_back(Row(row)[static_cast<std::size_t>(column)]);
+    }
+    return cells;
+  }
+
+  std::string Red() const { return Strings.Text(114); }
+
+  /// The operator does this in mid-run.
+  void Meanwhile(int delay, std::function<void()> act) { Events.At(milliseconds(delay), std::move(act)); }
+
+  void ExpectUsable() {
+    EXPECT_FALSE(Port.PortOpen());
+    EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
+    EXPECT_TRUE(window.isVisible());
+    EXPECT_FALSE(Find<QProgressBar>(window, "Progress").isVisible());
+    OnPacket = [](const Bytes&) {};
+    const std::size_t before = Port.Log.size();
+    Press("SearchGunsButton");
+    EXPECT_GT(Port.Log.size(), before + 128);
+    EXPECT_EQ(TextOf("StatusLabel"), "Idle");
+  }
+
+  Bytes guns;
+  int silent = 0;  ///< this gun answers the search alone
+  Game game{Strings};
+  RemoteManage window{{Port, Line, Events, Boxes, Time, Strings, game}, nullptr};
+};
+
+TEST_P(RemoteWindow, OpensIdleAndEmpty) {
+  EXPECT_EQ(window.windowTitle(), QStringLiteral("Remote Management"));
+  EXPECT_EQ(TextOf("StatusLabel"), "Idle");
+  EXPECT_EQ(TextOf("Label1"), "Players Found:");
+  EXPECT_EQ(TextOf("PlayerCountLabel"), " 0");
+  EXPECT_EQ(Find<QGroupBox>(window, "Frame1").title(), QStringLiteral("Max PlayerID"));
+  EXPECT_TRUE(Find<QRadioButton>(window, "Guns128").isChecked());
+  EXPECT_EQ(Find<QRadioButton>(window, "Guns128").text(), QStringLiteral("128"));
+  EXPECT_EQ(Find<QRadioButton>(window, "Guns224").text(), QStringLiteral("224"));
+  EXPECT_EQ(Find<QPushButton>(window, "SearchGunsButton").text(), QStringLiteral("Search for Guns"));
+  EXPECT_EQ(Find<QPushButton>(window, "GetScoresButton").text(), QStringLiteral("Get Scores"));
+  EXPECT_EQ(Find<QPushButton>(window, "Close").text(), QStringLiteral("Close"));
+  EXPECT_EQ(List().rowCount(), 0);
+  EXPECT_THAT(Port.Log, IsEmpty());
+}
+
+TEST_P(RemoteWindow, HasAColumnForEachThingAGunTells) {
+  std::vector<std::string> headers;
+  for (int column = 0; column < List().columnCount(); ++column) {
+    headers.push_back(List().headerData(column, Qt::Horizontal).toString().toStdString());
+  }
+  EXPECT_THAT(headers,
+              ElementsAre(Strings.Text(104), "Firmware Version", "Battery Level", "Weapon Type", "Status"));
+}
+
+TEST_P(RemoteWindow, SharesTheListsWidthAmongItsColumns) {
+  window.resize(900, 600);
+  QCoreApplication::processEvents();
+  const auto& list = Find<QTableView>(window, "DataList");
+  const int width = list.viewport()->width();
+  for (int column = 0; column < 4; ++column) {
+    EXPECT_EQ(list.columnWidth(column), width / 5);
+  }
+  EXPECT_EQ(list.columnWidth(4), static_cast<int>(width / 5.1));
+}
+
+TEST_P(RemoteWindow, ListsTheGunsThatAnswer) {
+  guns = {33, 40};
+  Press("SearchGunsButton");
+  ASSERT_EQ(List().rowCount(), 2);
+  EXPECT_THAT(Row(0), ElementsAre(Red() + "  1", " 2. 5", " 85%", "Pistol 1", "Scores Pending"));
+  EXPECT_THAT(Row(1), ElementsAre(Red() + "  8", " 2. 5", " 85%", "Pistol 1", "Scores Pending"));
+  EXPECT_EQ(TextOf("PlayerCountLabel"), " 2");
+  EXPECT_EQ(TextOf("StatusLabel"), "Idle");
+}
+
+TEST_P(RemoteWindow, TriesAsManyIdsAsAreChosen) {
+  Press("SearchGunsButton");
+  EXPECT_EQ(Frames.size(), 256U);
+  Frames.clear();
+  QTest::mouseClick(&Find<QRadioButton>(window, "Guns224"), Qt::LeftButton, {}, QPoint(8, 8));
+  Press("SearchGunsButton");
+  EXPECT_EQ(Frames.size(), 448U);
+}
+
+TEST_P(RemoteWindow, ListsNoGunAboveTheLargestIdThatWasTried) {
+  OnPacket = [this](const Bytes& packet) {
+    if (packet[1] == 40) {
+      Arrive(3, Joined({Received(1, SearchAnswer(160)), Received(2, SearchAnswer(161))}));
+    }
+  };
+  Press("SearchGunsButton");
+  EXPECT_EQ(List().rowCount(), 1);
+  EXPECT_EQ(TextOf("PlayerCountLabel"), " 2");
+}
+
+TEST_P(RemoteWindow, KeepsRowsInTheOrderOfIds) {
+  OnPacket = [this](const Bytes& packet) {
+    if (packet[1] == 40) {
+      Arrive(3, Joined({Received(1, SearchAnswer(50)), Received(2, SearchAnswer(35)),
+                        Received(3, SearchAnswer(42))}));
+    }
+  };
+  Press("SearchGunsButton");
+  EXPECT_THAT(Column(0), ElementsAre(Red() + "  3", Red() + "  10", Red() + "  18"));
+}
+
+TEST_P(RemoteWindow, ShowsHowASearchGoes) {
+  guns = {33};
+  int looks = 0;
+  Meanwhile(131 * 12 - 3, [&] {
+    ++looks;
+    EXPECT_EQ(TextOf("StatusLabel"), "Searching...");
+    EXPECT_EQ(TextOf("PlayerCountLabel"), " 1");
+    EXPECT_EQ(TextOf("ProgressLabel"), "Pass 2 of 2, ID 35");
+    EXPECT_TRUE(Find<QLabel>(window, "ProgressLabel").isVisible());
+    EXPECT_EQ(Find<QProgressBar>(window, "Progress").value(), 131);
+    EXPECT_EQ(Find<QProgressBar>(window, "Progress").maximum(), 256);
+    ASSERT_NE(QGuiApplication::overrideCursor(), nullptr);
+    EXPECT_EQ(QGuiApplication::overrideCursor()->shape(), Qt::WaitCursor);
+    EXPECT_TRUE(Find<QPushButton>(window, "SearchGunsButton").isEnabled());
+    EXPECT_TRUE(Find<QPushButton>(window, "GetScoresButton").isEnabled());
+  });
+  Press("SearchGunsButton");
+  EXPECT_EQ(looks, 1);
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, FetchesTheScoresOfTheListedGuns) {
+  guns = {33, 40};
+  silent = 40;
+  Press("SearchGunsButton");
+  bool looked = false;
+  Meanwhile(500, [&] {
+    looked = true;
+    EXPECT_EQ(TextOf("StatusLabel"), "Getting Scores...");
+    EXPECT_EQ(TextOf("ProgressLabel"), "Gun 2 of 2");
+    EXPECT_THAT(Column(4), ElementsAre("Scores OK", "Scores In Progress"));
+  });
+  Press("GetScoresButton");
+  EXPECT_TRUE(looked);
+  EXPECT_THAT(Column(4), ElementsAre("Scores OK", "Scores Failed"));
+  EXPECT_EQ(TextOf("StatusLabel"), "Done");
+  EXPECT_TRUE(game.Players(2).Active);
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, MarksFailedRowsAndShowsTheBattery) {
+  guns = {33, 40, 41};
+  silent = 40;
+  Press("SearchGunsButton");
+  Press("GetScoresButton");
+  const auto background = [this](int row) {
+    return List().index(row, 0).data(Qt::BackgroundRole).value<QColor>();
+  };
+  EXPECT_NE(background(0), background(1));
+  EXPECT_EQ(background(0), background(2));
+  for (const int column : {2, 4}) {
+    EXPECT_FALSE(List().index(0, column).data(Qt::DecorationRole).value<QPixmap>().isNull());
+  }
+}
+
+TEST_P(RemoteWindow, OfAnEmptyListIsDoneAtOnce) {
+  Press("GetScoresButton");
+  EXPECT_EQ(TextOf("StatusLabel"), "Done");
+  EXPECT_THAT(Port.Log, ElementsAre("Open /dev/ttyS0 57600,N,8,1", "Close"));
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, NamesAnOverflowAndStaysUsable) {
+  OnPacket = [this](const Bytes& packet) {
+    if (packet[1] == 40) {
+      Arrive(3, Received(1, SearchAnswer(31)));
+    }
+  };
+  Boxes.WhileOpen = [this](const auto& /*box*/) {
+    EXPECT_FALSE(Port.PortOpen());
+    EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
+  };
+  Press("SearchGunsButton");
+  EXPECT_THAT(Boxes.Boxes, ElementsAre(FakeMessageBoxes::Box{"Run-time error '6': Overflow", "Tessarine",
+                                                             BoxIcon::Critical, BoxButtons::Ok}));
+  EXPECT_EQ(TextOf("StatusLabel"), "Idle");
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, NamesTheOverflowOfATotalOfZero) {
+  guns = {33};
+  Press("SearchGunsButton");
+  OnPacket = [this](const Bytes&) { Arrive(3, Received(1, {4, 33, 0, 0, 5, 1, 0, 0, 0})); };
+  Press("GetScoresButton");
+  ASSERT_EQ(Boxes.Boxes.size(), 1U);
+  EXPECT_EQ(Boxes.Boxes[0].Text, "Run-time error '6': Overflow");
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, TellsOnceThatTheLineDidNotOpen) {
+  Port.FailNextOpen(8002);
+  Press("SearchGunsButton");
+  ASSERT_EQ(Boxes.Boxes.size(), 1U);
+  EXPECT_EQ(Boxes.Boxes[0].Text, "Run-time error '8018': Operation valid only when the port is open");
+  EXPECT_EQ(TextOf("StatusLabel"), "Idle");
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, TellsOnceThatTheLineWasLost) {
+  guns = {33};
+  Press("SearchGunsButton");
+  OnPacket = [this](const Bytes&) { Port.Lose(); };
+  Press("GetScoresButton");
+  ASSERT_EQ(Boxes.Boxes.size(), 1U);
+  EXPECT_EQ(Boxes.Boxes[0].Text, "Run-time error '8012': The device is not open");
+  EXPECT_THAT(Column(4), ElementsAre("Scores Failed"));
+  EXPECT_EQ(TextOf("StatusLabel"), "Done");
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, ClosedInMidSearchGoesOnceThatHasUnwound) {
+  bool stillThere = false;
+  Meanwhile(100, [&] {
+    window.close();
+    stillThere = window.isVisible();
+  });
+  Press("SearchGunsButton");
+  EXPECT_TRUE(stillThere);
+  EXPECT_FALSE(window.isVisible());
+  EXPECT_EQ(Events.Now(), milliseconds(100));
+  EXPECT_FALSE(Port.PortOpen());
+  EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+}
+
+TEST_P(RemoteWindow, ClosedByItsButtonInMidFetchGoesOnceThatHasUnwound) {
+  guns = {33, 40};
+  silent = 33;
+  Press("SearchGunsButton");
+  const auto start = Events.Now();
+  Meanwhile(3000, [&] { Press("Close"); });
+  Press("GetScoresButton");
+  EXPECT_FALSE(window.isVisible());
+  EXPECT_EQ(Events.Now() - start, milliseconds(3000));
+  EXPECT_FALSE(Port.PortOpen());
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+}
+
+TEST_P(RemoteWindow, ClosedByEscapeInMidRunGoesOnceThatHasUnwound) {
+  Meanwhile(100, [&] { QTest::keyClick(&window, Qt::Key_Escape); });
+  Press("SearchGunsButton");
+  EXPECT_FALSE(window.isVisible());
+  EXPECT_EQ(Events.Now(), milliseconds(100));
+}
+
+TEST_P(RemoteWindow, IsClosedByEscapeWhenIdle) {
+  QTest::keyClick(&window, Qt::Key_Escape);
+  EXPECT_FALSE(window.isVisible());
+}
+
+TEST_P(RemoteWindow, SearchedDuringAFetchEndsThatAndSearches) {
+  guns = {33, 40};
+  silent = 33;
+  Press("SearchGunsButton");
+  Frames.clear();
+  Meanwhile(1000, [&] { Press("SearchGunsButton"); });
+  Press("GetScoresButton");
+  EXPECT_EQ(Frames.size(), 1U + 256U);
+  EXPECT_THAT(Column(4), ElementsAre("Scores Pending", "Scores Pending"));
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, FetchedDuringASearchEndsThatAndFetches) {
+  guns = {33, 40};
+  Meanwhile(50, [&] { Press("GetScoresButton"); });
+  Press("SearchGunsButton");
+  EXPECT_THAT(Column(0), ElementsAre(Red() + "  1"));
+  EXPECT_THAT(Column(4), ElementsAre("Scores OK"));
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, FetchedDuringAFetchLeavesTheFirstOnesGunFailed) {
+  guns = {33, 40};
+  silent = 33;
+  Press("SearchGunsButton");
+  Meanwhile(100, [&] { Press("GetScoresButton"); });
+  Press("GetScoresButton");
+  EXPECT_THAT(Column(4), ElementsAre("Scores Failed", "Scores OK"));
+  EXPECT_EQ(game.Players(2).ShotCount, 258);
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, SurvivesAnyButtonAtAnyTime) {
+  guns = {33, 34, 40};
+  silent = 34;
+  Press("SearchGunsButton");
+  int presses = 0;
+  for (int time = 7; time < 9000; time += 613) {
+    Meanwhile(time, [this, &presses, time] {
+      ++presses;
+      Press(time % 2 == 0 ? "SearchGunsButton" : "GetScoresButton");
+    });
+  }
+  Press("GetScoresButton");
+  Press("GetScoresButton");
+  EXPECT_GT(presses, 5);
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  ExpectUsable();
+}
+
+TEST_P(RemoteWindow, ClosedInANestedRunGoesWhenAllHaveUnwound) {
+  Meanwhile(100, [&] { Press("SearchGunsButton"); });
+  Meanwhile(200, [&] { Press("SearchGunsButton"); });
+  Meanwhile(300, [&] { window.close(); });
+  Press("SearchGunsButton");
+  EXPECT_FALSE(window.isVisible());
+  EXPECT_EQ(Events.Now(), milliseconds(300));
+  EXPECT_FALSE(Port.PortOpen());
+  EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+}
+
+TEST_P(RemoteWindow, IsDrivenByTheKeyboard) {
+  window.activateWindow();
+  ASSERT_TRUE(QTest::qWaitForWindowActive(&window));
+  Find<QPushButton>(window, "GetScoresButton").setFocus();
+  QTest::keyClick(&Find<QPushButton>(window, "GetScoresButton"), Qt::Key_Return);
+  EXPECT_EQ(TextOf("StatusLabel"), "Done");
+  Find<QRadioButton>(window, "Guns128").setFocus();
+  QTest::keyClick(&Find<QRadioButton>(window, "Guns128"), Qt::Key_Right);
+  EXPECT_TRUE(Find<QRadioButton>(window, "Guns224").isChecked());
+  QTest::keyClick(&window, Qt::Key_Return);
+  EXPECT_EQ(Frames.size(), 448U);
+}
+
+TEST_P(RemoteWindow, IsCaredFor) {
+  guns = {33, 40};
+  Press("SearchGunsButton");
+  ExpectCaredFor(window);
+  Meanwhile(100, [this] { ExpectCaredFor(window); });
+  Press("SearchGunsButton");
+}
+
+INSTANTIATE_TEST_SUITE_P(Languages, RemoteWindow,
+                         testing::Values(Language::English, Language::SimplifiedChinese),
+                         [](const auto& language) {
+                           return language.param == Language::English ? "English" : "Chinese";
+                         });
+
+}  // namespace

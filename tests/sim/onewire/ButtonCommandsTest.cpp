@@ -1,0 +1,61 @@
+#include "sim/onewire/ButtonCommands.h"
+
+#include <gtest/gtest.h>
+
+#include <stdexcept>
+
+#include "tests/sim/onewire/AdapterHost.h"
+
+namespace sim {
+namespace {
+
+constexpr std::uint8_t present = 0xCD;
+constexpr std::uint8_t absent = 0xCF;
+
+class ButtonCommands : public testing::Test {
+ protected:
+  std::string Obey(const std::string& line) { return ObeyButtonCommand(adapter_, line); }
+  std::uint8_t ResetAnswer() { return host_.Ask({0xC1}, 1).at(0); }
+
+  OneWireAdapter adapter_{{.Failure = OneWireFailure::NoOwnDevice, .LinePace = Pace::Fast}};
+  AdapterHost host_{adapter_.DevicePath()};
+};
+
+TEST_F(ButtonCommands, TouchAButtonWithTheRomThatTheyName) {
+  EXPECT_EQ(Obey("touch efcdab8967452301"), "touched EFCDAB8967452301");
+  EXPECT_EQ(host_.Ask({0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3}, 10),
+            (Bytes{present, 0x33, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF}));
+}
+
+TEST_F(ButtonCommands, TakeAButtonAway) {
+  Obey("touch EFCDAB8967452301");
+  EXPECT_EQ(Obey("  leave   EFCDAB8967452301 \r"), "left EFCDAB8967452301");
+  EXPECT_EQ(ResetAnswer(), absent);
+}
+
+TEST_F(ButtonCommands, TakeAllButtonsAway) {
+  Obey("touch EFCDAB8967452301");
+  Obey("touch A200000001B81C02");
+  EXPECT_EQ(ResetAnswer(), present);
+  EXPECT_EQ(Obey("leave"), "left");
+  EXPECT_EQ(ResetAnswer(), absent);
+  EXPECT_EQ(Obey("leave"), "left");
+}
+
+TEST_F(ButtonCommands, DoNothingOnAnEmptyLine) {
+  EXPECT_EQ(Obey(""), "");
+  EXPECT_EQ(Obey(" \t"), "");
+}
+
+TEST_F(ButtonCommands, RefuseWhatTheyDoNotUnderstandAndButtonsThatAreNotThere) {
+  Obey("touch EFCDAB8967452301");
+  for (const char* line :
+       {"touch", "touch 1", "touch EFCDAB8967452301 now", "leave A200000001B81C02", "leave all",
+        "leave EFCDAB8967452301 now", "Touch EFCDAB8967452301", "EFCDAB8967452301"}) {
+    EXPECT_THROW(Obey(line), std::invalid_argument) << line;
+  }
+  EXPECT_EQ(ResetAnswer(), present);
+}
+
+}  // namespace
+}  // namespace sim

@@ -1,0 +1,41 @@
+#pragma once
+
+#include <chrono>
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "sim/line/FileDescriptor.h"
+
+namespace sim {
+
+using Bytes = std::vector<std::uint8_t>;
+
+/// Longest wait for something that must come; long enough for a busy machine.
+constexpr std::chrono::seconds limit{20};
+
+/// The host's end of a line, byte by byte and without a protocol.
+class RawHost {
+ public:
+  /// Fails the running test when `path` cannot be opened.
+  explicit RawHost(const std::string& path);
+
+  void Write(const Bytes& bytes);
+  /// None when `longestWait` passed first or the line hung up.
+  std::optional<std::uint8_t> ReadByte(std::chrono::milliseconds longestWait = limit);
+  /// `count` bytes, or fewer when one does not come within the limit.
+  Bytes Read(std::size_t count);
+  /// All bytes until the line hangs up.
+  Bytes ReadUntilHangUp();
+  /// True when no byte waits and none comes for a while that exceeds the line's own delays by far.
+  bool IsSilent() { return !ReadByte(std::chrono::milliseconds(60)); }
+  bool HungUp() const { return hungUp_; }
+
+ private:
+  FileDescriptor line_;
+  bool hungUp_ = false;
+};
+
+}  // namespace sim
