@@ -42,7 +42,7 @@ class Pipe {
   std::array<int, 2> ends_{};
 };
 
-/// A running program, which does not outlive this.
+/// A running program; the destructor kills it.
 class Child {
  public:
   Child(const std::string& program, const std::vector<std::string>& arguments, const Pipe& output,
@@ -73,7 +73,7 @@ class Child {
 
   void Kill() const { kill(id_, SIGKILL); }
 
-  /// True when it ended by itself with 0.
+  /// True if it exited with status 0.
   bool Wait() {
     int status = 0;
     while (waitpid(id_, &status, 0) < 0 && errno == EINTR) {

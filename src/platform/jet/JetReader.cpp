@@ -1,6 +1,6 @@
-// tessarine-jet-reader FILE TABLE: the rows of one table of a Jet file on standard output, for the main
-// program, which ends this one when it hangs. Ends with 0 when all rows were read. JetStream.h tells the
-// form.
+// tessarine-jet-reader FILE TABLE: writes the rows of one table of a Jet file to standard output, in the
+// format described in JetStream.h. The main program kills this one if it hangs. Exits with 0 when all rows
+// were read.
 
 #include <glib.h>
 #include <mdbtools.h>
@@ -64,7 +64,7 @@ void WriteReal(double value) {
   WriteNumber(bits, 8);
 }
 
-/// A 32-bit float as the double that its shortest decimal says.
+/// A 32-bit float as the double nearest to its shortest decimal form: 0.1f becomes 0.1.
 double Widened(float value) {
   char text[32];
   const auto written = std::to_chars(text, text + sizeof text, value);
@@ -73,7 +73,8 @@ double Widened(float value) {
   return wide;
 }
 
-/// Days since 1899-12-30, the time of day being their fraction, also of days before that.
+/// "YYYY-MM-DD HH:MM:SS" of a date in days since 1899-12-30. The fraction is the time of day, and counts
+/// forwards for negative dates too.
 std::string DateText(double date) {
   constexpr std::int64_t daysBefore1970 = 25569;
   constexpr int secondsOfDay = 86400;
@@ -83,7 +84,7 @@ std::string DateText(double date) {
     seconds = 0;
     ++day;
   }
-  // Civil date of a day number by eras of 400 years.
+  // Civil date from the day number, by 400-year eras that begin on 1 March.
   const std::int64_t shifted = day - daysBefore1970 + 719468;
   const std::int64_t era = (shifted >= 0 ? shifted : shifted - 146096) / 146097;
   const std::int64_t ofEra = shifted - era * 146097;
@@ -235,7 +236,7 @@ void WriteTable(MdbTableDef* table) {
 
 /// A damaged file can make the library ask for more and more memory.
 void LimitMemory() {
-#if !HAS_FEATURE(address_sanitizer)  // which takes terabytes of addresses for itself
+#if !HAS_FEATURE(address_sanitizer)  // which reserves terabytes of address space
   constexpr rlim_t mostMemory = rlim_t{2} << 30U;
   const rlimit limit{mostMemory, mostMemory};
   setrlimit(RLIMIT_AS, &limit);
@@ -280,6 +281,6 @@ int main(int argc, char** argv) {
   if (std::fflush(stdout) != 0) {
     Fail("The reader of old files has lost its listener.");
   }
-  // The library's own clean-up is not needed, and not safe after a damaged file.
+  // The library's own clean-up is not needed, and is not safe after reading a damaged file.
   std::_Exit(0);
 }

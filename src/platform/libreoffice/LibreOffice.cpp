@@ -39,7 +39,7 @@ void LibreOffice::LoadModule() {
   if (client_ != nullptr) {
     return;
   }
-  // A call to a LibreOffice that has just died is to fail, and not to end this program.
+  // A call to a LibreOffice that has just died must fail instead of ending this program.
   std::signal(SIGPIPE, SIG_IGN);
   // Never unloaded: LibreOffice's libraries keep threads of their own.
   void* const module = dlopen((folder_ + "/libtessarine-office.so").c_str(), RTLD_NOW | RTLD_LOCAL);
@@ -120,11 +120,11 @@ void LibreOffice::Quit() noexcept {
   if (!HostRuns()) {
     return;
   }
-  // It is not asked to end, since one that hangs would not answer; it has nothing to save.
+  // LibreOffice is not asked to quit: it would not answer if it hangs, and it has nothing to save.
   client_->Disconnect();
   close(leash_);
   leash_ = -1;
-  // The host lets nothing hold it up for long; waiting for it leaves no process behind this one.
+  // The host ends promptly whatever LibreOffice does; waiting for it leaves no process behind.
   while (waitpid(host_, nullptr, 0) < 0 && errno == EINTR) {
   }
   host_ = 0;
