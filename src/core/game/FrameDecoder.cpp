@@ -6,7 +6,7 @@
 
 namespace {
 
-/// Adds unless the sum leaves the 32-bit range.
+/// Adds, unless the sum would leave the 32-bit range.
 void AddTo(std::int32_t& sum, std::int32_t amount) {
   std::int32_t result = 0;
   if (!__builtin_add_overflow(sum, amount, &result)) {
@@ -14,14 +14,14 @@ void AddTo(std::int32_t& sum, std::int32_t amount) {
   }
 }
 
-/// Reads a frame from front to back.
+/// Reads a frame from start to end.
 class FrameReader {
  public:
   explicit FrameReader(const ReceiveBuffer& buffer) : buffer_(buffer) {}
 
   void MoveTo(std::size_t offset) { offset_ = offset; }
 
-  /// The next byte; nothing past the buffer's end.
+  /// The next byte; nullopt past the buffer's end.
   std::optional<std::uint8_t> Byte() {
     const std::size_t offset = offset_++;
     return offset < buffer_.size() ? std::optional(buffer_[offset]) : std::nullopt;

@@ -8,7 +8,7 @@
 #include "core/game/PlayerId.h"
 #include "core/text/StringTable.h"
 
-/// One gun's game. "Calculated" fields are written by the score analysis alone.
+/// One gun's game. Only the score analysis writes the "calculated" fields.
 struct Player {
   OneBased<std::int32_t, PlayerCount>
       HitByPlayer;  ///< damage this player took from player q; self-hits included
@@ -40,11 +40,11 @@ struct Player {
   std::int32_t StunCount = 0;
   std::uint8_t PowerCheatFlag = 0;
 
-  /// Back to an empty record; `AbsoluteDamage` and `Accuracy` stay, the score analysis rewrites them.
+  /// Empties the record, except `AbsoluteDamage` and `Accuracy`, which the score analysis rewrites.
   void Clear();
 };
 
-/// Who plays one of the mission's objective sets A, B, C, and what they achieved.
+/// The team that plays one of the mission's objective sets A, B, C, and what it achieved.
 struct ObjectiveTeam {
   std::string Name;  ///< one of `TeamNames`
   bool PrimaryAchieved = false;
@@ -53,7 +53,7 @@ struct ObjectiveTeam {
 
 inline constexpr int TeamCount = 3;
 
-/// The game on the board. The table of players always exists whole; who took no part is not `Active`.
+/// The game on the board. The table of players is always complete; those who took no part are not `Active`.
 struct Game {
   explicit Game(const StringTable& strings);
 
@@ -65,9 +65,9 @@ struct Game {
   std::string GameDate;      ///< a text: the date as the locale writes it, or what a loaded file says
   bool DataPresent = false;  ///< true once a frame was decoded or a file loaded
 
-  /// Forgets the players and the date. Team names and objective results stay for the next game.
+  /// Clears the players and the date. Team names and objective results stay for the next game.
   void Clear();
 
-  /// How a player is named: team, one blank, number form of the number ("Blue  7").
+  /// A player's display name: team, one blank, number form of the player number ("Blue  7").
   std::string DisplayName(int index) const;
 };

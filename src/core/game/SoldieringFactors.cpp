@@ -14,7 +14,7 @@ struct FactorKey {
   double SoldieringFactors::*Factor;
 };
 
-/// In the order in which they are written.
+/// In the order in which they are written to the file.
 constexpr std::array<FactorKey, 6> FactorKeys = {{
     {"total_damage", &SoldieringFactors::Damage},
     {"respawns", &SoldieringFactors::Death},

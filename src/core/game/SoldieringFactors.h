@@ -2,8 +2,8 @@
 
 #include "core/data/IniReader.h"
 
-/// What one point of each quantity adds to a player's soldiering score; FriendlyFire weighs damage to the own
-/// team.
+/// What one unit of each quantity adds to a player's soldiering score. FriendlyFire weights damage done to
+/// one's own team.
 struct SoldieringFactors {
   double Damage = 1;
   double Death = -1;
@@ -13,9 +13,9 @@ struct SoldieringFactors {
   double FriendlyFire = -1;
 };
 
-/// Section "soldiering_calc"; a missing key gives its default. Throws RuntimeError 13 for a text that is no
-/// number, 6 for a number that is too large.
+/// Reads section "soldiering_calc"; a missing key has its default. Throws RuntimeError 13 for a text that is
+/// not a number, 6 for a number that is too large.
 SoldieringFactors ReadSoldieringFactors(const IniReader& ini);
 
-/// Writes all six factors in one replacement of the file; failure is not reported.
+/// Writes all six factors, replacing the file once; a failure is not reported.
 void WriteSoldieringFactors(IniReader& ini, const SoldieringFactors& factors);

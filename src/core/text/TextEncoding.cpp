@@ -7,7 +7,7 @@
 
 namespace {
 
-/// Unicode of the bytes 0x80 to 0x9F.
+/// Code points of the bytes 0x80 to 0x9F.
 constexpr std::array<std::uint16_t, 32> Windows1252High = {
     0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
     0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
@@ -32,7 +32,7 @@ std::size_t LengthOfAsciiRun(std::string_view text, std::size_t from) {
   return at - from;
 }
 
-/// Length of the well-formed sequence of 2 to 4 bytes that `text` begins with, 0 when it begins with none.
+/// Length of the well-formed sequence of 2 to 4 bytes at the start of `text`, 0 if there is none.
 std::size_t LengthOfSequence(std::string_view text) {
   const auto byte = [text](std::size_t at) { return static_cast<unsigned char>(text[at]); };
   const unsigned char lead = byte(0);
@@ -43,7 +43,7 @@ std::size_t LengthOfSequence(std::string_view text) {
   if (length == 0 || text.size() < length) {
     return 0;
   }
-  // The second byte alone rules out overlong forms, surrogates and what lies above U+10FFFF.
+  // The range of the second byte rules out overlong forms, surrogates and code points above U+10FFFF.
   const unsigned char lowest = lead == 0xE0 ? 0xA0 : lead == 0xF0 ? 0x90 : 0x80;
   const unsigned char highest = lead == 0xED ? 0x9F : lead == 0xF4 ? 0x8F : 0xBF;
   if (byte(1) < lowest || byte(1) > highest) {
