@@ -20,7 +20,7 @@ QDate DateOf(const std::string& stored) {
   return QDate::fromString(QString::fromStdString(stored).left(StoredDateLength), Qt::ISODate);
 }
 
-/// A form in which a day or a month of one digit may stand without a zero.
+/// The format changed so that one-digit days and months may be written without a zero.
 QString Lenient(QString form) {
   form.replace(QStringLiteral("dd"), QStringLiteral("d"));
   if (!form.contains(QStringLiteral("MMM"))) {
@@ -29,7 +29,7 @@ QString Lenient(QString form) {
   return form;
 }
 
-/// The date that `text` says, invalid for none. Two digits of a year are those of the last hundred years.
+/// The date in `text`, invalid if there is none. A two-digit year is taken from the last hundred years.
 QDate DateIn(const QString& text) {
   const QLocale locale = QLocale::system();
   QString form = Lenient(locale.dateFormat(QLocale::ShortFormat));
@@ -75,9 +75,9 @@ QIcon CalendarIcon(const QColor& colour) {
 DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
   setToolTip(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
   QAction* calendar = addAction(CalendarIcon(palette().color(QPalette::Text)), QLineEdit::TrailingPosition);
-  findChild<QAbstractButton*>()->setAccessibleName(QStringLiteral("Calendar"));  // shows the action
+  findChild<QAbstractButton*>()->setAccessibleName(QStringLiteral("Calendar"));  // the action's button
   connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
-  // And not textEdited, which does not tell of a text that an assistive program enters.
+  // textChanged, since textEdited is not emitted when an assistive program enters a text.
   connect(this, &QLineEdit::textChanged, this, &DatePicker::TakeText);
   connect(this, &QLineEdit::editingFinished, this, &DatePicker::Finish);
 }
@@ -98,7 +98,8 @@ void DatePicker::ShowStored() {
   setText(date.isValid() ? QString::fromStdString(ShortDateText(QLocale::system(), date)) : QString());
 }
 
-// Half of a text may be a date of its own, "1961-02-3", or none.
+// While the operator types, the text may be a different date ("1961-02-3") or no date at all; in the latter
+// case the last finished date counts.
 void DatePicker::TakeText(const QString& text) {
   const QDate date = DateIn(text.trimmed());
   if (text.trimmed().isEmpty()) {

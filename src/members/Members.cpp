@@ -82,8 +82,8 @@ void Members::ConnectCommands() {
   }
 }
 
-// A button that is pressed by other means than the mouse takes the focus, too: or the search box, left after
-// the command, would go back to the first member.
+// Takes the focus even if the button was not pressed with the mouse. Otherwise the search box would lose the
+// focus only after the command, search again, and go back to the first member.
 void Members::ConnectButton(QAbstractButton& button, const std::function<void()>& command) {
   connect(&button, &QAbstractButton::clicked, this, [this, &button, command] {
     button.setFocus();
@@ -116,7 +116,7 @@ void Members::Activate() {
   RunClearSearch();
   if (ContactToShow != 0) {
     data1_->WalkTo(ContactToShow);
-    // Leaving the search box would go back to the first member.
+    // The search box must not get the focus: leaving it would go back to the first member.
     QWidget* const focus = data1_->HasRow() ? static_cast<QWidget*>(ui_->FirstNameEntry) : ui_->DataPrevious;
     focus->setFocus();
   } else {
@@ -124,13 +124,14 @@ void Members::Activate() {
   }
 }
 
-// Escape and the close box unload the window.
+// Called by Escape and the close box.
 void Members::reject() {
   Run([this] { RunClearSearch(); });
   QDialog::reject();
 }
 
-// Who presses Search leaves the box by it, and a text that is no query is told of once.
+// Does not count a click on Search as leaving, since it runs the search itself: a malformed query is then
+// reported once, not twice.
 bool Members::IsLeaving(Qt::FocusReason reason) const {
   const bool toSearch = focusWidget() == ui_->Search && reason != Qt::TabFocusReason;
   return !toSearch && reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
@@ -140,7 +141,7 @@ bool Members::eventFilter(QObject* watched, QEvent* event) {
   if (watched == ui_->SearchText && event->type() == QEvent::KeyPress) {
     const int key = static_cast<QKeyEvent*>(event)->key();
     if (key == Qt::Key_Return || key == Qt::Key_Enter) {
-      Run([this] { RunSearch(); });  // and not OK, which would choose the member in view
+      Run([this] { RunSearch(); });  // instead of OK, which would choose the member in view
       return true;
     }
   }
@@ -241,7 +242,7 @@ void Members::PreviewPhoto(const std::string& file) {
   try {
     ui_->MemberPhoto->Load(needs_.Disk.Read(file));
   } catch (const RuntimeError&) {
-    ui_->MemberPhoto->Clear();  // storing it will say why
+    ui_->MemberPhoto->Clear();  // storing the photo will report why
   }
 }
 

@@ -19,7 +19,7 @@ const std::string& TeamName(const Game& game, int index) {
   return game.TeamNames(TeamFromId(IdFromIndex(index)));
 }
 
-/// What was hit, or who hit: team, number, damage, and the name of a member.
+/// One line of a hit list: the other player's team and number, the damage, and the member's name if known.
 std::string HitText(const Game& game, int index, std::int32_t damage, MemberLookup& members) {
   std::string text = Trimmed(TeamName(game, index)) + " " + Trimmed(NumberText(index)) + ": " + Str(damage);
   const std::int32_t member = game.Players(index).MemberIndex;
@@ -58,7 +58,7 @@ std::string WithoutWeekday(const std::string& longDate) {
   if (comma == std::string::npos) {
     return longDate;
   }
-  // The character behind the comma goes too, all of its bytes.
+  // The character after the comma is dropped too, with all its UTF-8 bytes.
   const auto isContinuation = [&longDate](std::size_t at) {
     return at < longDate.size() && (static_cast<unsigned char>(longDate[at]) & 0xC0) == 0x80;
   };

@@ -13,7 +13,7 @@ constexpr const char* LineSettings = "9600,N,8,1";
 constexpr std::uint8_t MatchRom = 0x55;
 constexpr std::uint8_t IdleBus = 0xFF;
 
-/// Runs an operation on the line; a line that is lost in the middle counts as failed.
+/// Runs an operation on the line; if the line is lost meanwhile, the operation has failed.
 template <typename Operation>
 bool Succeeds(Operation&& operation) {
   try {
@@ -27,7 +27,7 @@ std::int16_t ResultOf(bool done) {
   return done ? 1 : 0;
 }
 
-/// The number in a text of digits, 0 to 32767.
+/// The value of a text of digits, if it is 0 to 32767.
 std::optional<std::int16_t> NumberIn(const std::string& text) {
   constexpr std::size_t mostDigits = 5;
   const bool digits = !text.empty() && text.find_first_not_of("0123456789") == std::string::npos;
