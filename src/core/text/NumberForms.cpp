@@ -108,8 +108,8 @@ double ValueOfNumber(std::string_view text) {
   if (!IsTooLarge(text)) {
     return 0;
   }
-  constexpr double Infinity = std::numeric_limits<double>::infinity();
-  return text.starts_with('-') ? -Infinity : Infinity;
+  constexpr double infinity = std::numeric_limits<double>::infinity();
+  return text.starts_with('-') ? -infinity : infinity;
 }
 
 void RequireFinite(double value) {
@@ -150,14 +150,14 @@ std::string HundredthsAsPercent(long long hundredths) {
 
 template <typename Float>
 std::string NumberForm(Float value) {
-  constexpr int MostDigits = std::is_same_v<Float, float> ? 7 : 15;
+  constexpr int mostDigits = std::is_same_v<Float, float> ? 7 : 15;
   RequireFinite(value);
   if (value == 0) {
     return " 0";
   }
   std::array<char, 32> buffer{};
   const auto written = std::to_chars(buffer.data(), buffer.data() + buffer.size(), std::abs(value),
-                                     std::chars_format::scientific, MostDigits - 1);
+                                     std::chars_format::scientific, mostDigits - 1);
   const std::string_view shown(buffer.data(), static_cast<std::size_t>(written.ptr - buffer.data()));
   const std::size_t letterE = shown.find('e');
   const std::string exponentText(shown.substr(letterE + 1));
@@ -168,7 +168,7 @@ std::string NumberForm(Float value) {
   digits.erase(digits.find_last_not_of('0') + 1);
 
   const std::string sign(value < 0 ? "-" : " ");
-  if (exponent < -4 || exponent >= MostDigits) {
+  if (exponent < -4 || exponent >= mostDigits) {
     return sign + digits.substr(0, 1) + (digits.size() > 1 ? "." : "") + digits.substr(1) + "E" +
            exponentText;
   }
@@ -313,8 +313,8 @@ std::string FormatFixed(double value, int decimals) {
   // to_chars would round it to the even digit, so it is written exactly, with one more decimal, and then
   // rounded up.
   const bool tie = std::abs(std::fmod(std::ldexp(value, decimals + 1), 2)) == 1;
-  constexpr int MostBeforeDecimals = 312;
-  std::string text(static_cast<std::size_t>(MostBeforeDecimals + decimals), '\0');
+  constexpr int mostBeforeDecimals = 312;
+  std::string text(static_cast<std::size_t>(mostBeforeDecimals + decimals), '\0');
   const auto written = std::to_chars(text.data(), text.data() + text.size(), value, std::chars_format::fixed,
                                      tie ? decimals + 1 : decimals);
   text.resize(static_cast<std::size_t>(written.ptr - text.data()));

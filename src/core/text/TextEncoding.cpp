@@ -18,11 +18,11 @@ bool StartsCharacter(char letter) {
 }
 
 std::size_t LengthOfAsciiRun(std::string_view text, std::size_t from) {
-  constexpr std::uint64_t HighBits = 0x8080808080808080U;
+  constexpr std::uint64_t highBits = 0x8080808080808080U;
   std::size_t at = from;
   for (std::uint64_t eight = 0; at + sizeof eight <= text.size(); at += sizeof eight) {
     std::memcpy(&eight, text.data() + at, sizeof eight);
-    if ((eight & HighBits) != 0) {
+    if ((eight & highBits) != 0) {
       break;
     }
   }

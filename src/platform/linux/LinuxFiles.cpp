@@ -36,8 +36,8 @@ class Descriptor {
 
 // The path behind all symbolic links at the end of `path`; it need not exist.
 std::string FollowLinks(std::string path) {
-  constexpr int MostLinks = 40;
-  for (int links = 0; links < MostLinks; ++links) {
+  constexpr int mostLinks = 40;
+  for (int links = 0; links < mostLinks; ++links) {
     std::error_code error;
     const std::filesystem::path target = std::filesystem::read_symlink(path, error);
     if (error) {

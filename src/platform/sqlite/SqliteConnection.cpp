@@ -52,7 +52,7 @@ void Like(sqlite3_context* context, int, sqlite3_value** arguments) {
 // Uses stat and does not open the file: closing any descriptor of a database file would drop the locks that
 // this process holds on it through other connections.
 void CheckFile(const std::string& path) {
-  constexpr off_t SmallestDatabase = 512;
+  constexpr off_t smallestDatabase = 512;
   struct stat info {};
   if (stat(path.c_str(), &info) != 0) {
     if (errno == ENOENT || errno == ENOTDIR) {
@@ -64,7 +64,7 @@ void CheckFile(const std::string& path) {
     throw RuntimeError(3051, "Cannot open the file '" + path + "'. It is no file.");
   }
   // An empty file would pass for a database without tables.
-  if (info.st_size < SmallestDatabase) {
+  if (info.st_size < smallestDatabase) {
     throw UnrecognizedFormat(path);
   }
 }
@@ -74,10 +74,10 @@ void CheckFile(const std::string& path) {
 SqliteConnection::SqliteConnection(const std::string& path, std::chrono::milliseconds busyTimeout)
     : path_(path) {
   CheckFile(path);
-  constexpr int Flags =
+  constexpr int flags =
       SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOMUTEX | SQLITE_OPEN_PRIVATECACHE | SQLITE_OPEN_EXRESCODE;
   try {
-    if (sqlite3_open_v2(path.c_str(), &handle_, Flags, nullptr) != SQLITE_OK) {
+    if (sqlite3_open_v2(path.c_str(), &handle_, flags, nullptr) != SQLITE_OK) {
       Fail();
     }
     Configure(busyTimeout);
@@ -181,8 +181,8 @@ void SqliteConnection::PrepareChange() {
 
 void SqliteConnection::CopyTo(const std::string& path) {
   sqlite3* copy = nullptr;
-  constexpr int Flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
-  int result = sqlite3_open_v2(path.c_str(), &copy, Flags, nullptr);
+  constexpr int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
+  int result = sqlite3_open_v2(path.c_str(), &copy, flags, nullptr);
   const std::unique_ptr<sqlite3, decltype(&sqlite3_close)> closeAtEnd(copy, sqlite3_close);
   if (result == SQLITE_OK) {
     // A partial copy is of no use, so it needs no journal to be rolled back by.
