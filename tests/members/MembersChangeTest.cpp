@@ -241,7 +241,7 @@ TEST_F(MembersWindow, ShowsTheMembersOfAReadOnlyFile) {
   venue.Window.reset();
 }
 
-TEST_F(MembersWindow, KeepsTheOldRowsOfAFullDisk) {
+TEST_F(MembersWindow, KeepsTheOldRowsOnAFullDisk) {
   Open([this] {
     Line("AddressEntry").setText(QString(255, u'明'));
     {

@@ -106,7 +106,7 @@ TEST_F(MembersWindow, TakesTheDatabasesWildcards) {
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
-TEST_F(MembersWindow, SaysThatATextWithAnApostropheIsNoQueryAndKeepsTheRows) {
+TEST_F(MembersWindow, ReportsASearchWithAnApostropheAsMalformedAndKeepsTheRows) {
   Open([this] {
     Press("DataNext");
     SearchFor("O'B");
@@ -120,7 +120,7 @@ TEST_F(MembersWindow, SaysThatATextWithAnApostropheIsNoQueryAndKeepsTheRows) {
   EXPECT_EQ(venue.Boxes.Boxes[0].Icon, BoxIcon::Critical);
 }
 
-TEST_F(MembersWindow, SaysOnceThatATextIsNoQueryWhenTheSearchButtonIsPressed) {
+TEST_F(MembersWindow, ReportsAMalformedSearchOnceWhenTheSearchButtonIsPressed) {
   Open([this] {
     Enter("SearchText", "O'B");
     ::Find<QPushButton>(*window, "Search").click();  // as assistive programs do
@@ -133,7 +133,7 @@ TEST_F(MembersWindow, SaysOnceThatATextIsNoQueryWhenTheSearchButtonIsPressed) {
   });
 }
 
-TEST_F(MembersWindow, SaysThatAnOpenBracketIsNoPattern) {
+TEST_F(MembersWindow, ReportsAnUnclosedBracketAsMalformed) {
   Open([this] {
     SearchFor("[a");
     EXPECT_TRUE(window->isVisible());

@@ -175,7 +175,7 @@ TEST_F(Sheets, OfOnePlayerAreOne) {
   EXPECT_THAT(Names(), ElementsAre("/data/scores/Blue 40-Guest-21 May 2013-Sniper Hunt.doc"));
 }
 
-TEST_F(Sheets, OfAPlayerWhoDoesNotExistAreNoneAndTheRunEndsAtOnce) {
+TEST_F(Sheets, OfAPlayerWhoDoesNotExistAreNotMadeAndTheRunEndsAtOnce) {
   choice.SheetSelection = SheetSelection::OnePlayer;
   choice.OutputTarget = 0;
   choice.SelectedTeam = 3;

@@ -165,7 +165,7 @@ TEST_F(Backup, TakesThePlaceOfOneThatACrashLeftHalfWritten) {
   EXPECT_EQ(NickNameIn("members-2013-05-21-143005.mdb"), "Shamrock");
 }
 
-TEST_F(Backup, ThatCannotBeMadeIsToldOnceAndHoldsUpNoChange) {
+TEST_F(Backup, ThatCannotBeMadeIsReportedOnceAndDelaysNoChange) {
   WriteFile(Folder(), "a file in place of the folder");
   Open();
   Change("first");

@@ -153,7 +153,7 @@ TEST_F(Commit, CountsNullAsZero) {
   EXPECT_EQ(Figure("TotalGamesPlayed || ' ' || TotalDamage || ' ' || AverageSoldiering"), "1 10.0 20.0");
 }
 
-TEST_F(Commit, SkipsWhoHasNoMemberOrDidNotPlay) {
+TEST_F(Commit, SkipsPlayersWithoutAMemberOrWhoDidNotPlay) {
   AddMembers(2);
   Play(1, 0);
   Play(2, 1).Active = false;
@@ -277,7 +277,7 @@ TEST_F(Commit, MarksNobodyButTheFirstWhenTheLastFlushFails) {
   EXPECT_EQ(Figure("sum(TotalGamesPlayed)"), "0");
 }
 
-TEST_F(Commit, FailsOnAFigureThatCannotBe) {
+TEST_F(Commit, FailsOnAnImpossibleFigure) {
   AddMembers(1);
   Sql("UPDATE Members SET TotalGamesPlayed = -1");
   Play(1, 1);

@@ -98,7 +98,7 @@ TEST_F(Decoding, AddsCountersAndHitsAndReplacesTheRest) {
   EXPECT_EQ(Red1().PowerCheatFlag, 3);
 }
 
-TEST_F(Decoding, LeavesWhatIsNotTheGunsToTell) {
+TEST_F(Decoding, LeavesFieldsThatAFrameDoesNotHold) {
   Red1().TotalDamage = 1;
   Red1().AbsoluteDamage = 2;
   Red1().Soldiering = 3;

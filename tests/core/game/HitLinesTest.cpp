@@ -38,7 +38,7 @@ TEST(PlayerText, NamesTheRecordOfItsPlayer) {
   EXPECT_EQ(IndexFromPlayerText(texts, "Red  40"), 105);
 }
 
-TEST(PlayerText, FailsWhereItsNumberIsNone) {
+TEST(PlayerText, FailsWhenItsNumberIsNotANumber) {
   const StringTable texts(Language::English);
   EXPECT_EQ(NumberThrownBy([&] { IndexFromPlayerText(texts, "Red x"); }), 13);
   EXPECT_EQ(NumberThrownBy([&] { IndexFromPlayerText(texts, "Red 300"); }), 6);

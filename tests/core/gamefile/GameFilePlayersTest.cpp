@@ -92,7 +92,7 @@ TEST_F(Players, OfSeveralPlayerDatasCountTogether) {
               ElementsAre(3, 5, 9));
 }
 
-TEST_F(Players, OneOfThemMalformedMakesTheFileNone) {
+TEST_F(Players, MakeTheWholeFileInvalidWhenOneIsMalformed) {
   for (const char* fault : {"<Index>5</Inde>", "<Player>", "</Player>", "<A", "</PlayerData>", "<!--"}) {
     EXPECT_FALSE(ActiveIn(InData(PlayerOf(3) + PlayerOf(4) + fault + PlayerOf(7))).has_value()) << fault;
   }

@@ -80,7 +80,7 @@ class Conversion : public testing::Test {
   JetConverter converter{JetReaderPath(), 1s};
 };
 
-TEST_F(Conversion, TakesEveryValueOver) {
+TEST_F(Conversion, ConvertsEveryValue) {
   for (const OldFile& old : OldFiles) {
     const std::string path = Copy(old.Name);
     EXPECT_TRUE(converter.IsOld(path));
@@ -92,7 +92,7 @@ TEST_F(Conversion, TakesEveryValueOver) {
   }
 }
 
-TEST_F(Conversion, KeepsTheOldFileUnderANameThatNothingHas) {
+TEST_F(Conversion, KeepsTheOldFileUnderAnUnusedName) {
   const std::string path = Copy("members");
   const std::string before = ReadFile(path);
   WriteFile(path + ".jet", "an older one");
@@ -139,7 +139,7 @@ TEST_F(Conversion, WithoutItsTableFails) {
   EXPECT_EQ(FilesInFolder(), 1U);
 }
 
-TEST_F(Conversion, TellsOfTablesThatItDoesNotTake) {
+TEST_F(Conversion, ReportsTablesThatItDoesNotConvert) {
   const std::string path = Copy("members");
   // The same file asked for under a new file that has the other table only: all of its columns are unknown.
   EXPECT_EQ(NumberThrownBy([&] { converter.Convert(path, "Members", Empty("scenarios")); }), 3343);
@@ -163,7 +163,7 @@ TEST(OldFormat, IsKnownByItsMark) {
   EXPECT_FALSE(converter.IsOld(folder / "none.mdb"));
 }
 
-TEST(OldFormat, ThatCannotBeReadForLackOfTheReaderIsTold) {
+TEST(OldFormat, ThatCannotBeReadWithoutTheReaderIsReported) {
   const TemporaryFolder folder;
   WriteFile(folder / "x.mdb", std::string("\0\1\0\0", 4) + "Standard Jet DB" + std::string(4096 - 19, '\0'));
   JetConverter converter("/nowhere/tessarine-jet-reader");

@@ -60,7 +60,7 @@ TEST_F(Stream, GivesBytes) {
   EXPECT_FALSE(stream.Ended());
 }
 
-TEST_F(Stream, RefusesWhatIsNotOfItsForm) {
+TEST_F(Stream, RefusesMalformedInput) {
   const std::string table = "T" + Text("M") + std::string("\x01\0\0\0", 4) + Text("P");
   for (const std::string& bytes :
        {std::string("x"), std::string("R"), std::string("E"), table + "O", table + table, table + "Rx",

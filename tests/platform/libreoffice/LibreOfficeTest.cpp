@@ -162,7 +162,7 @@ TEST_F(Writer, CountsTablesThatTextFlowsAround) {
   document->Close();
 }
 
-TEST_F(Writer, TakesNothingButPicturesAsPictures) {
+TEST_F(Writer, AddsPicturesWithPaddingAndRefusesOtherFiles) {
   const auto document = Office().Add(Template);
   WriteFile(folder / "no-picture", "bytes");
   EXPECT_EQ(NumberThrownBy([&] { document->AddPicture(1, 1, 1, folder / "no-picture"); }), 440);

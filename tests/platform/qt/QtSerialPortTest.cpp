@@ -323,7 +323,7 @@ TEST_F(QtSerialPortTest, ReadingPastTheInputFails) {
   EXPECT_EQ(FailureOf([&] { Port.Input(); }), 62);
 }
 
-TEST_F(QtSerialPortTest, ALostLineWakesWhoWaitsForIt) {
+TEST_F(QtSerialPortTest, ALostLineWakesAWaitForInput) {
   Open();
   QTimer::singleShot(30, [&] { Line.Unplug(); });
   EXPECT_EQ(FailureOf([&] { Pump.WaitFor([&] { return Port.InBufferCount() > 0; }, 20s); }), 8012);

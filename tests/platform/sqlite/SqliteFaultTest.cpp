@@ -138,7 +138,7 @@ TEST_P(FullDisk, Is3026AndLeavesTheOldRowAndTheEdit) {
 
 INSTANTIATE_TEST_SUITE_P(JournalOrFile, FullDisk, testing::Values(1024, 40'960));
 
-TEST(DamagedPage, IsMetAs3343WhenItsRowIsRead) {
+TEST(DamagedPage, FailsWith3343WhenItsRowIsRead) {
   const TestDatabase file;
   file.Execute(
       "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 5000) "
