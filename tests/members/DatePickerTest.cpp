@@ -11,7 +11,7 @@
 
 namespace {
 
-/// A date entry with another control beside it, in the forms of the C locale ("12 Apr 1961").
+/// A date entry with another control beside it, in the C locale's date format ("12 Apr 1961").
 class DateEntry : public testing::Test {
  protected:
   DateEntry() {

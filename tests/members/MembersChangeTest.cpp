@@ -14,7 +14,7 @@ TEST_F(MembersWindow, WritesBackEveryEntryWhenItLeavesTheRow) {
       Enter(entry, entry);
     }
     Enter("DOBPicker", "1958-02-28");
-    EXPECT_EQ(Stored("FirstName", 1), "Rhys");  // not before
+    EXPECT_EQ(Stored("FirstName", 1), "Rhys");  // not written yet
     Press("DataNext");
   });
   for (const auto& [column, text] : {std::pair{"FirstName", "FirstNameEntry"},
@@ -166,7 +166,7 @@ TEST_F(MembersWindow, GivesTheMemberInViewTheButtonThatWasRead) {
     EXPECT_EQ(Stored("DallasID", 2), "EFCDAB8967452301");
     Press("DataNext");
     EXPECT_EQ(Shown("MemberIDDisplay"), "");
-    Press("ChangeID");  // nobody looks whether another has it
+    Press("ChangeID");  // duplicates are not checked
   });
   EXPECT_EQ(Stored("DallasID", 5), "EFCDAB8967452301");
   EXPECT_EQ(Stored("City", 2), "Swansea");
@@ -234,7 +234,7 @@ TEST_F(MembersWindow, ShowsTheMembersOfAReadOnlyFile) {
     Press("ChangeID");
     EXPECT_EQ(Shown("MemberIDDisplay"), "");
   });
-  ASSERT_EQ(venue.Boxes.Boxes.size(), 4U);  // one is the question
+  ASSERT_EQ(venue.Boxes.Boxes.size(), 4U);  // including the question
   for (const std::size_t box : {0, 2, 3}) {
     EXPECT_THAT(venue.Boxes.Boxes[box].Text, testing::StartsWith("Run-time error '3027': "));
   }

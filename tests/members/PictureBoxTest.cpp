@@ -8,7 +8,7 @@
 
 namespace {
 
-/// One black dot.
+/// One black pixel.
 const std::string gif(
     "GIF89a\x01\x00\x01\x00\x80\x00\x00\x00\x00\x00\xFF\xFF\xFF\x2C\x00\x00\x00\x00\x01\x00\x01\x00\x00\x02"
     "\x02\x44\x01\x00\x3B",
@@ -45,7 +45,7 @@ TEST_F(APictureBox, IgnoresBytesBehindThePicture) {
 }
 
 TEST_F(APictureBox, FitsThePictureWithItsProportions) {
-  box.Load(PictureFile(Qt::red));  // 4 to 3, in a box of 2 to 1
+  box.Load(PictureFile(Qt::red));  // 4:3, in a 2:1 box
   EXPECT_EQ(At(100, 50), QColor(Qt::red));
   EXPECT_EQ(At(100, 6), QColor(Qt::red));
   EXPECT_NE(At(20, 50), QColor(Qt::red));

@@ -13,7 +13,7 @@
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
 
-/// The mission editor, opened from the main window on missions "One", "Two" and "Three".
+/// The mission editor, opened from the main window, with missions "One", "Two" and "Three".
 class Editor : public testing::Test {
  protected:
   Editor() {
@@ -26,7 +26,7 @@ class Editor : public testing::Test {
     venue.Start();
   }
 
-  /// Opens the editor, does `act` in it, and closes it by its close box where `act` did not.
+  /// Opens the editor, runs `act` in it, and closes it by its close box if `act` did not.
   void Open(const std::function<void()>& act) {
     const WhileModal<Scenarios> open([&](Scenarios& opened) {
       window = &opened;

@@ -29,7 +29,7 @@ class Conversion : public testing::Test {
  protected:
   void SetUp() override { SKIP_WITHOUT_OLD_FILES(); }
 
-  /// A copy of an old file that may be written.
+  /// A writable copy of an old file.
   std::string Copy(const char* name) const {
     const std::string copy = folder / (std::string(name) + ".mdb");
     WriteFile(copy, ReadFile(std::string(TESSARINE_OLD_FILES "/") + name + ".mdb"));
@@ -45,7 +45,7 @@ class Conversion : public testing::Test {
                                                   std::filesystem::directory_iterator()));
   }
 
-  /// Number of values of the converted file that differ from the JSON, which is `json`.
+  /// Number of values in the converted file that differ from the expected ones in `json`.
   static std::string Differences(const std::string& path, const OldFile& old, const std::string& json) {
     OtherConnection connection(path);
     connection.Execute("CREATE TEMP TABLE Json (Text)");
@@ -139,9 +139,9 @@ TEST_F(Conversion, WithoutItsTableFails) {
   EXPECT_EQ(FilesInFolder(), 1U);
 }
 
-TEST_F(Conversion, ReportsTablesThatItDoesNotConvert) {
+TEST_F(Conversion, IntoADatabaseWithoutTheTableFails) {
   const std::string path = Copy("members");
-  // The same file asked for under a new file that has the other table only: all of its columns are unknown.
+  // The new file is a copy of the other empty database, which has no such table.
   EXPECT_EQ(NumberThrownBy([&] { converter.Convert(path, "Members", Empty("scenarios")); }), 3343);
   EXPECT_TRUE(converter.IsOld(path));
 }

@@ -23,7 +23,7 @@ namespace {
 
 using Bytes = std::vector<std::uint8_t>;
 
-/// A further descriptor of a terminal's near end.
+/// A second descriptor for a terminal's near end.
 class SecondOpener {
  public:
   explicit SecondOpener(const std::string& device)
@@ -33,7 +33,7 @@ class SecondOpener {
   SecondOpener& operator=(const SecondOpener&) = delete;
 
   bool Lock() const { return ::flock(descriptor_, LOCK_EX | LOCK_NB) == 0; }
-  /// True once the line has taken nothing more for 100 ms.
+  /// True once the line has accepted no more bytes for 100 ms.
   bool AwaitFull() const {
     pollfd writable{descriptor_, POLLOUT, 0};
     const auto limit = std::chrono::steady_clock::now() + 2s;
@@ -202,7 +202,7 @@ TEST_F(QtSerialPortTest, GoesOnReceivingWhenInputIsClearedAfterTheSystemAnnounce
     ++cleared;
     Port.ClearInput();
     early.setEnabled(false);
-    errno = EAGAIN;  // as any call before the read of nothing may leave it
+    errno = EAGAIN;  // a leftover value, which an empty read must not be judged by
   });
   Line.Write({1, 2, 3});
   ASSERT_TRUE(probe.AwaitInput());
