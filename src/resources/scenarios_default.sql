@@ -1,13 +1,12 @@
--- The missions that a new installation starts with. The operator changes, adds and deletes them in Mission Setup.
+-- The missions of a new installation. The operator changes, adds and deletes missions in Mission Setup.
 
 PRAGMA user_version = 1;
 
 BEGIN;
 
--- Short texts are held to the 255 characters of the database format that these files once had; descriptions were memos
--- in some of them. NUMERIC columns turn a text
--- that is a number into that number and leave any other text as it is. Texts compare above all numbers, so the ranges
--- refuse them as well as infinities.
+-- Short texts are limited to the 255 characters of the former file format; descriptions were memos in some of those
+-- files. NUMERIC columns convert a numeric text to a number and leave any other text alone. Texts compare greater than
+-- all numbers, so the range checks refuse them, and infinities too.
 CREATE TABLE Table1 (
   ID INTEGER PRIMARY KEY AUTOINCREMENT,
   MissionName TEXT NOT NULL DEFAULT '' CHECK (length(MissionName) <= 255),
