@@ -38,7 +38,7 @@ CREATE TABLE Table1 (
   TeamRatio TEXT NOT NULL DEFAULT '' CHECK (length(TeamRatio) <= 255)
 );
 
--- One mission a row. The first line of a description or objective is its tool tip, so it stands for itself.
+-- One mission per row. The first line of a description or objective is its tool tip, so it must make sense by itself.
 WITH Mission(Name, Description, Duration, Ratio, Respawn, Heal,
              PrimaryA, PrimaryPointsA, SecondaryA, SecondaryPointsA,
              PrimaryB, PrimaryPointsB, SecondaryB, SecondaryPointsB,
@@ -172,7 +172,7 @@ Played in three rounds. The teams change ends after each, and whoever has fallen
    'Win two of the three rounds.', 150,
    'Win a round without losing anybody.', 100)
 ),
--- Lines end in CR LF: there the tool tips are cut.
+-- Lines end in CR LF, where the tool tips are cut.
 Lines AS (
   SELECT *, replace(Description, char(10), char(13, 10)) AS Text FROM Mission
 )
