@@ -57,7 +57,7 @@ class Ds2480b {
   Presence presence_ = Presence::None;
   bool busIsReset_ = false;
   bool inDataMode_ = false;
-  bool lost_ =
-      false;  ///< an answer was missing or wrong: the chip counts as gone for the rest of the session
+  /// True once an answer was missing or wrong: the chip counts as gone for the rest of the session.
+  bool lost_ = false;
   bool ended_ = false;  ///< the program is closing
 };
