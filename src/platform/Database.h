@@ -124,8 +124,8 @@ class ReadScope {
   Database& database_;
 };
 
-/// Writes that are committed together, or not at all. Others are locked out of the file until Commit returns,
-/// so do not wait for the operator inside.
+/// Writes that are committed together, or not at all. Others cannot write the file meanwhile, nor read it
+/// during Commit, so do not wait for the operator inside.
 class WriteScope {
  public:
   explicit WriteScope(Database& database) : database_(database) { database_.BeginTrans(); }
