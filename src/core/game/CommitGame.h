@@ -9,7 +9,7 @@
 enum class CommitResult {
   Committed,
   SomeWereAlready,  ///< players were left out because their game counts already
-  Failed            ///< the database refused a player; those before are committed, those behind are not
+  Failed            ///< the database refused a player; those before it are committed, those after it are not
 };
 
 /// Adds the game of each active player with a member to that member's lifetime figures, and marks the player

@@ -153,8 +153,8 @@ TEST_F(Decoding, Takes255Hits) {
 
 TEST_F(Decoding, SkipsWhatALongerStatisticsBlockAddsAndWhatFollowsTheFlag) {
   Bytes frame = FrameOfRed1();
-  frame.insert(frame.begin() + 45, {0xEE, 0xEE});        // behind the flag
-  frame.insert(frame.begin() + 24, {0xDD, 0xDD, 0xDD});  // behind the counters
+  frame.insert(frame.begin() + 45, {0xEE, 0xEE});        // after the flag
+  frame.insert(frame.begin() + 24, {0xDD, 0xDD, 0xDD});  // after the counters
   frame[0] += 5;
   frame[2] += 5;
   frame[5] += 3;
