@@ -9,7 +9,7 @@
 namespace {
 
 /// One black pixel.
-const std::string gif(
+const std::string Gif(
     "GIF89a\x01\x00\x01\x00\x80\x00\x00\x00\x00\x00\xFF\xFF\xFF\x2C\x00\x00\x00\x00\x01\x00\x01\x00\x00\x02"
     "\x02\x44\x01\x00\x3B",
     35);
@@ -32,7 +32,7 @@ TEST_F(APictureBox, ReadsTheUsualKinds) {
 }
 
 TEST_F(APictureBox, ReadsGif) {
-  box.Load(gif);
+  box.Load(Gif);
   EXPECT_EQ(box.Picture().size(), QSize(1, 1));
 }
 
@@ -68,7 +68,7 @@ TEST_F(APictureBox, ShowsNoPictureWhoseEndIsMissing) {
     box.Load(whole.substr(0, whole.size() - 30));
     EXPECT_TRUE(box.Picture().isNull()) << format;
   }
-  box.Load(gif.substr(0, gif.size() - 3));
+  box.Load(Gif.substr(0, Gif.size() - 3));
   EXPECT_TRUE(box.Picture().isNull());
 }
 

@@ -15,13 +15,13 @@
 
 namespace {
 
-constexpr const char* gameFilter = "XML Files & (*.xml) |*.xml";
+constexpr const char* GameFilter = "XML Files & (*.xml) |*.xml";
 
 TEST(NameFilters, AreMadeOfDescriptionAndPatterns) {
   const auto filters = [](const char* text) {
     return NameFilters(text).join(QLatin1Char('|')).toStdString();
   };
-  EXPECT_EQ(filters(gameFilter), "XML Files & (*.xml)");
+  EXPECT_EQ(filters(GameFilter), "XML Files & (*.xml)");
   EXPECT_EQ(filters("Text documents (*.txt) |*.txt"), "Text documents (*.txt)");
   EXPECT_EQ(filters("Playlist Files|*.txt|All Files|*.*"), "Playlist Files (*.txt)|All Files (*)");
   EXPECT_EQ(filters("Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif"), "Photo Files (*.bmp *.jpg *.gif)");
@@ -34,14 +34,14 @@ class QtFileDialogTest : public testing::Test {
  protected:
   using Act = std::function<void(QFileDialog&)>;
 
-  std::string Open(const std::string& fileName, const Act& act, const std::string& filter = gameFilter) {
+  std::string Open(const std::string& fileName, const Act& act, const std::string& filter = GameFilter) {
     const WhileModal<QFileDialog> operatorAtWork(act);
     std::string result = Dialog.ShowOpen(filter, fileName);
     EXPECT_EQ(operatorAtWork.Runs(), 1);
     return result;
   }
 
-  std::string Save(const std::string& fileName, const Act& act, const std::string& filter = gameFilter) {
+  std::string Save(const std::string& fileName, const Act& act, const std::string& filter = GameFilter) {
     const WhileModal<QFileDialog> operatorAtWork(act);
     std::string result = Dialog.ShowSave(filter, fileName);
     EXPECT_EQ(operatorAtWork.Runs(), 1);
