@@ -83,11 +83,11 @@ TEST(OneWireAdapter, EndsInTheMiddleOfAnExchange) {
 
 TEST(OneWireAdapter, RefusesPlacesThatDoNotExist) {
   for (const OneWireFailureInfo& info : OneWireFailures) {
-    const bool hasPlace = info.Place != OneWireFailurePlace::None;
+    const bool hasPlace = info.Place != FailurePlace::None;
     for (const auto& [place, refused] : {std::pair<std::size_t, bool>{0, hasPlace},
                                          {1, false},
                                          {64, false},
-                                         {65, info.Place == OneWireFailurePlace::Bit}}) {
+                                         {65, info.Place == FailurePlace::Bit}}) {
       const OneWireAdapterSettings settings{.Failure = info.Failure, .FailurePlace = place};
       if (refused) {
         EXPECT_THROW(OneWireAdapter{settings}, std::invalid_argument) << info.Name << ' ' << place;
