@@ -21,10 +21,7 @@ void Row(std::ostream& text, const std::string& head, std::string_view meaning) 
 
 void Rows(std::ostream& text, const std::vector<CommandLineOption>& options) {
   for (const CommandLineOption& option : options) {
-    std::string head;
-    for (const std::string& spelling : option.Spellings) {
-      head += (head.empty() ? "" : ", ") + spelling;
-    }
+    const std::string& head = option.Spellings.front();
     Row(text, option.Value.empty() ? head : head + ' ' + option.Value, option.Meaning);
   }
 }
@@ -65,7 +62,11 @@ std::string VenueUsage(const std::vector<DeviceEntry>& devices) {
          "nothing.\n\n";
   Rows(text, GeneralOptions());
   for (const DeviceEntry& entry : devices) {
-    text << "\nThe " << entry.Title << ":\n";
+    text << "\nThe " << entry.Title;
+    if (entry.PlainOptions) {
+      text << " (--" << entry.Name << "-link and so on are other spellings)";
+    }
+    text << ":\n";
     Rows(text, OptionsOf(entry));
   }
   for (const DeviceEntry& entry : devices) {
