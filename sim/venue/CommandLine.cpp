@@ -132,39 +132,40 @@ class OptionMaker {
   std::string name_;
 };
 
-using Value = const std::string&;
+using Argument = const std::string&;
 
 }  // namespace
 
 std::vector<CommandLineOption> GeneralOptions() {
-  return {{{"--players"},
-           "N",
-           "guns in the game, 0 to 224 (40)",
-           [](VenueOptions& options, Value spelling, Value value) {
-             options.Players = static_cast<int>(ParseNumber(spelling, value, 224));
-           }},
-          {{"--seed"},
-           "S",
-           "picks the game; a seed always gives the same game (1)",
-           [](VenueOptions& options, Value spelling, Value value) {
-             options.Seed = static_cast<std::uint32_t>(
-                 ParseNumber(spelling, value, std::numeric_limits<std::uint32_t>::max()));
-           }},
-          {{"--fast"},
-           "",
-           "bytes as fast as possible instead of at the line's speed",
-           [](VenueOptions& options, Value, Value) { options.Fast = true; }},
-          {{"--log"},
-           "FILE",
-           "what passes the lines: seconds, device, -> to or <- from the host, bytes",
-           [](VenueOptions& options, Value spelling, Value value) {
-             options.LogFile = ParseFile(spelling, value);
-           }},
-          {{"--until-eof"},
-           "",
-           "end when the standard input ends",
-           [](VenueOptions& options, Value, Value) { options.UntilEof = true; }},
-          {{"--help"}, "", "this text", [](VenueOptions& options, Value, Value) { options.Help = true; }}};
+  return {
+      {{"--players"},
+       "N",
+       "guns in the game, 0 to 224 (40)",
+       [](VenueOptions& options, Argument spelling, Argument value) {
+         options.Players = static_cast<int>(ParseNumber(spelling, value, 224));
+       }},
+      {{"--seed"},
+       "S",
+       "picks the game; a seed always gives the same game (1)",
+       [](VenueOptions& options, Argument spelling, Argument value) {
+         options.Seed = static_cast<std::uint32_t>(
+             ParseNumber(spelling, value, std::numeric_limits<std::uint32_t>::max()));
+       }},
+      {{"--fast"},
+       "",
+       "bytes as fast as possible instead of at the line's speed",
+       [](VenueOptions& options, Argument, Argument) { options.Fast = true; }},
+      {{"--log"},
+       "FILE",
+       "what passes the lines: seconds, device, -> to or <- from the host, bytes",
+       [](VenueOptions& options, Argument spelling, Argument value) {
+         options.LogFile = ParseFile(spelling, value);
+       }},
+      {{"--until-eof"},
+       "",
+       "end when the standard input ends",
+       [](VenueOptions& options, Argument, Argument) { options.UntilEof = true; }},
+      {{"--help"}, "", "this text", [](VenueOptions& options, Argument, Argument) { options.Help = true; }}};
 }
 
 std::vector<CommandLineOption> OptionsOf(const DeviceEntry& entry) {

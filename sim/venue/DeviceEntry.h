@@ -42,7 +42,8 @@ struct DeviceCommand {
   std::string_view Meaning;
 };
 
-/// What a device is started with.
+/// What a device is started with. It lasts for the start alone; streams last as long as the device, and
+/// EndVenue may be kept.
 struct DeviceStart {
   const DeviceOptions& Options;
   const std::vector<GunScores>& Game;  ///< the one that was played at the venue

@@ -44,7 +44,7 @@ Venue::Venue(const VenueOptions& options, std::function<void()> endVenue,
   const std::vector<GunScores> game = MakeGame(options.Players, options.Seed);
   for (const DeviceEntry& entry : devices) {
     if (options.Of(entry.Name).Served) {
-      devices_.push_back(std::unique_ptr<ServedDevice>(new ServedDevice{entry, {}, {}, {}}));
+      devices_.push_back(std::make_unique<ServedDevice>(entry));
       Start(*devices_.back(), options, game);
     }
   }

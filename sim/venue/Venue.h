@@ -39,6 +39,8 @@ class Venue {
 
  private:
   struct ServedDevice {
+    explicit ServedDevice(const DeviceEntry& entry) : Entry(entry) {}
+
     const DeviceEntry& Entry;
     std::map<std::string, std::ofstream, std::less<>> Files;
     StartedDevice Started;
