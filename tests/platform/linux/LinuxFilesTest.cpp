@@ -1,5 +1,8 @@
 #include "platform/linux/LinuxFiles.h"
 
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -9,8 +12,6 @@
 #include <filesystem>
 #include <string>
 
-#include "gmock/gmock.h"
-#include "gtest/gtest.h"
 #include "platform/linux/FileError.h"
 #include "tests/support/FileSizeLimit.h"
 #include "tests/support/OrdinaryUser.h"
