@@ -75,11 +75,14 @@ QIcon CalendarIcon(const QColor& colour) {
 DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
   setToolTip(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
   QAction* calendar = addAction(CalendarIcon(palette().color(QPalette::Text)), QLineEdit::TrailingPosition);
-  findChild<QAbstractButton*>()->setAccessibleName(QStringLiteral("Calendar"));  // shows the action
   connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
   // And not textEdited, which does not tell of a text that an assistive program enters.
   connect(this, &QLineEdit::textChanged, this, &DatePicker::TakeText);
   connect(this, &QLineEdit::editingFinished, this, &DatePicker::Finish);
+}
+
+void DatePicker::SetCalendarName(const QString& name) {
+  findChild<QAbstractButton*>()->setAccessibleName(name);  // shows the action
 }
 
 void DatePicker::SetStored(const std::string& stored) {

@@ -5,6 +5,7 @@
 #include <utility>
 #include <vector>
 
+#include "core/text/Filled.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -52,7 +53,7 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
     if (error.Number() == FileIsLocked) {
       return false;
     }
-    failure_ = "The backup copies of " + path + " could not be brought up to date. " + error.what();
+    failure_ = Filled(strings_.Text(OwnText::BackupFailed), {path, error.what()});
   }
   return true;
 }
