@@ -14,6 +14,7 @@
 #include "core/data/FieldValue.h"
 #include "core/data/FirstRun.h"
 #include "core/data/UserDatabase.h"
+#include "core/text/Pieces.h"
 #include "platform/ErrorReport.h"
 #include "ui/Text.h"
 #include "ui_frmRx.h"

@@ -6,7 +6,7 @@
 #include <QHeaderView>
 #include <QKeyEvent>
 
-#include "core/game/HitLines.h"
+#include "core/text/NumberForms.h"
 #include "ui/Text.h"
 #include "ui_AdminData.h"
 

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "core/text/Filled.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -34,9 +35,8 @@ bool IsCopyOf(const std::string& name, std::string_view file) {
   }
   file.remove_prefix(name.size() + 1);
   file.remove_suffix(Extension.size());
-  return std::equal(file.begin(), file.end(), DateForm.begin(), DateForm.end(), [](char letter, char form) {
-    return form == '0' ? letter >= '0' && letter <= '9' : letter == form;
-  });
+  return std::equal(file.begin(), file.end(), DateForm.begin(), DateForm.end(),
+                    [](char letter, char form) { return form == '0' ? IsDigit(letter) : letter == form; });
 }
 
 }  // namespace

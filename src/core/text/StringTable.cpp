@@ -4,7 +4,7 @@
 #include <cstddef>
 #include <iterator>
 
-#include "core/text/TextEncoding.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {

@@ -58,8 +58,7 @@ void GunSearch::TakeAnswer() {
   gun.Battery = answer[7];
   gun.WeaponType = answer[8];
   gun.PlayerID = playerId;
-  gun.PlayerName =
-      TeamNameFromNumber(strings_, TeamFromId(playerId)) + " " + Str(PlayerNumberFromId(playerId));
+  gun.PlayerName = PlayerName(TeamNameFromNumber(strings_, TeamFromId(playerId)), playerId);
   gun.Present = true;
   gun.Address = link_.Frame().SourceAddress;
   gun.ScoreStatus = ScoreStatus::Pending;
