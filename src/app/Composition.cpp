@@ -6,10 +6,8 @@
 #include <QLibraryInfo>
 #include <QLocale>
 
-#include "app/frmRx.h"
 #include "core/data/FirstRun.h"
 #include "devices/buttons/ButtonSwipe.h"
-#include "platform/ErrorReport.h"
 #include "platform/qt/DialogParent.h"
 
 namespace {
@@ -97,17 +95,4 @@ void PrepareApplication() {
   QApplication::setDesktopFileName(QStringLiteral("tessarine"));
   QApplication::setWindowIcon(QIcon(QStringLiteral(":/pictures/tessarine-256.png")));
   qApp->setStyleSheet(QString::fromUtf8(LookSheet));
-}
-
-int RunProgram() {
-  PrepareApplication();
-  Composition composition;
-  frmRx window(composition.Services());
-  composition.SetMainWindow(&window);
-  bool loaded = false;
-  if (!ReportErrors(composition.Boxes(), [&] { loaded = window.FormLoad(); }) || !loaded) {
-    return 1;
-  }
-  window.show();
-  return QApplication::exec();
 }

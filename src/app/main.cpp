@@ -1,8 +1,9 @@
 #include <QApplication>
 
-#include "app/Composition.h"
+#include "app/Program.h"
 
 int main(int argc, char** argv) {
   QApplication application(argc, argv);
-  return RunProgram();
+  Program program;
+  return program.Start() ? QApplication::exec() : 1;
 }

@@ -14,6 +14,7 @@
 #include "members/MemberQueries.h"
 #include "platform/ErrorReport.h"
 #include "platform/qt/QtClock.h"
+#include "ui/Text.h"
 #include "ui/WaitCursor.h"
 #include "ui_Members.h"
 
@@ -52,12 +53,30 @@ Members::Members(Needs needs, QWidget* parent)
   ui_->Dummy->hide();
   ui_->ChangeID->setEnabled(needs_.ButtonSwipe != nullptr);
   ui_->SearchText->installEventFilter(this);
+  SetCaptions();
   BoundControls& controls = *this;
   data1_.emplace(needs_.DbMembers, controls);
   ConnectCommands();
 }
 
 Members::~Members() = default;
+
+void Members::SetCaptions() {
+  const StringTable& strings = needs_.Strings;
+  ui_->SearchText->setPlaceholderText(Text(strings, OwnText::NameToSearchFor));
+  ui_->MemberPhoto->setAccessibleName(Text(strings, OwnText::Photo));
+  ui_->DOBPicker->SetCalendarName(Text(strings, OwnText::Calendar));
+  const std::pair<QAbstractButton*, OwnText> arrows[] = {
+      {ui_->DataFirst, OwnText::FirstMember},
+      {ui_->DataPrevious, OwnText::PreviousMember},
+      {ui_->DataNext, OwnText::NextMember},
+      {ui_->DataLast, OwnText::LastMember},
+  };
+  for (const auto& [arrow, name] : arrows) {
+    arrow->setAccessibleName(Text(strings, name));
+    arrow->setToolTip(Text(strings, name));
+  }
+}
 
 void Members::ConnectCommands() {
   const std::pair<QAbstractButton*, void (Members::*)()> commands[] = {

@@ -55,6 +55,7 @@ class Members : public QDialog, private BoundControls {
   MemberDetails Entered() const override;
   void RowChanged() override;
 
+  void SetCaptions();
   void ConnectCommands();
   void ConnectButton(QAbstractButton& button, const std::function<void()>& command);
   void Run(const std::function<void()>& command);

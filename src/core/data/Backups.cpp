@@ -5,6 +5,8 @@
 #include <utility>
 #include <vector>
 
+#include "core/text/Filled.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -33,9 +35,8 @@ bool IsCopyOf(const std::string& name, std::string_view file) {
   }
   file.remove_prefix(name.size() + 1);
   file.remove_suffix(Extension.size());
-  return std::equal(file.begin(), file.end(), DateForm.begin(), DateForm.end(), [](char letter, char form) {
-    return form == '0' ? letter >= '0' && letter <= '9' : letter == form;
-  });
+  return std::equal(file.begin(), file.end(), DateForm.begin(), DateForm.end(),
+                    [](char letter, char form) { return form == '0' ? IsDigit(letter) : letter == form; });
 }
 
 }  // namespace
@@ -52,7 +53,7 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
     if (error.Number() == FileIsLocked) {
       return false;
     }
-    failure_ = "The backup copies of " + path + " could not be brought up to date. " + error.what();
+    failure_ = Filled(strings_.Text(OwnText::BackupFailed), {path, error.what()});
   }
   return true;
 }

@@ -1,5 +1,6 @@
 #include "core/data/UserDatabase.h"
 
+#include "core/text/Filled.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -7,16 +8,29 @@ namespace {
 constexpr int UnrecognizedFormat = 3343;
 constexpr const char* Title = "Database status";
 
-void TellOfConversion(const UserDatabase& database, const OldDatabaseReport& report, MessageBoxes& boxes) {
-  std::string text = "The database of an old installation has been converted: " + database.Path + ", " +
-                     std::to_string(report.Rows) + " rows. The old file is kept as " + report.KeptAs + ".";
+std::string TextOf(const NotTakenOver& what, const StringTable& strings) {
+  switch (what.What) {
+    case NotTakenOver::Table:
+      return Filled(strings.Text(OwnText::TableNotTakenOver), {what.Name, std::to_string(what.Rows)});
+    case NotTakenOver::Column:
+      return Filled(strings.Text(OwnText::ColumnNotTakenOver), {what.Name});
+    case NotTakenOver::TextsOfColumn:
+      break;
+  }
+  return Filled(strings.Text(OwnText::TextsNotTakenOver), {what.Name});
+}
+
+void TellOfConversion(const UserDatabase& database, const OldDatabaseReport& report,
+                      const DatabaseServices& services) {
+  std::string text = Filled(services.Strings.Text(OwnText::OldDatabaseConverted),
+                            {database.Path, std::to_string(report.Rows), report.KeptAs});
   if (!report.NotTaken.empty()) {
-    text += "\n\nNot taken over:";
-    for (const std::string& what : report.NotTaken) {
-      text += "\n" + what;
+    text += "\n\n" + services.Strings.Text(OwnText::NotTakenOver);
+    for (const NotTakenOver& what : report.NotTaken) {
+      text += "\n" + TextOf(what, services.Strings);
     }
   }
-  boxes.Show(text, Title, BoxIcon::Information);
+  services.Boxes.Show(text, Title, BoxIcon::Information);
 }
 
 std::unique_ptr<Database> Open(const std::string& path, const DatabaseServices& services) {
@@ -37,7 +51,7 @@ std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const D
   try {
     if (services.Old.IsOld(database.Path)) {
       TellOfConversion(database, services.Old.Convert(database.Path, database.Table, database.DefaultPath),
-                       services.Boxes);
+                       services);
     }
     return Open(database.Path, services);
   } catch (const RuntimeError& error) {
@@ -47,11 +61,9 @@ std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const D
     reason = error.what();
   }
   const std::string fresh = FreshPath(database.Path);
-  const BoxAnswer answer =
-      services.Boxes.Show("The database " + database.Path + " cannot be used. " + reason +
-                              "\n\nIt stays as it is. Press OK to go on with a fresh database, " + fresh +
-                              ", or Cancel to end the program.",
-                          Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
+  const BoxAnswer answer = services.Boxes.Show(
+      Filled(services.Strings.Text(OwnText::DatabaseUnusable), {database.Path, reason, fresh}), Title,
+      BoxIcon::Exclamation, BoxButtons::OkCancel);
   if (answer == BoxAnswer::Cancel) {
     return nullptr;
   }

@@ -4,6 +4,7 @@
 #include <string>
 
 #include "core/data/Backups.h"
+#include "core/text/StringTable.h"
 #include "platform/Database.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
@@ -23,6 +24,7 @@ struct DatabaseServices {
   Files& Disk;
   MessageBoxes& Boxes;
   Backups& Copies;
+  const StringTable& Strings;
 };
 
 /// Opens a database, of which a backup copy will be made before its first change. A file of an old

@@ -8,30 +8,14 @@
 #include <limits>
 #include <type_traits>
 
+#include "core/text/Pieces.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
 
 /// Beyond this the number form of a double rounds up to a text that is out of range.
 constexpr double LargestReadable = 1.79769313486231E+308;
-
-bool IsDigit(char letter) {
-  return letter >= '0' && letter <= '9';
-}
-
-bool IsWhiteSpace(char letter) {
-  return letter == ' ' || (letter >= '\t' && letter <= '\r');
-}
-
-std::string_view Trimmed(std::string_view text) {
-  while (!text.empty() && IsWhiteSpace(text.front())) {
-    text.remove_prefix(1);
-  }
-  while (!text.empty() && IsWhiteSpace(text.back())) {
-    text.remove_suffix(1);
-  }
-  return text;
-}
 
 std::size_t EndOfDigits(std::string_view text, std::size_t at) {
   while (at < text.size() && IsDigit(text[at])) {
@@ -222,7 +206,7 @@ std::string PlainDecimal(double value) {
 }
 
 double Val(std::string_view text) {
-  text = Trimmed(text);
+  text = Trimmed(text, IsWhiteSpace);
   std::string dense;
   const std::size_t next = text.find_first_not_of("0123456789+-.Ee");
   if (next != std::string_view::npos && IsWhiteSpace(text[next])) {
@@ -237,11 +221,19 @@ double Val(std::string_view text) {
 }
 
 std::optional<double> NumberIn(std::string_view text) {
-  const std::string_view number = Trimmed(text);
+  const std::string_view number = Trimmed(text, IsWhiteSpace);
   if (number.empty() || LengthOfNumber(number) != number.size()) {
     return std::nullopt;
   }
   return ValueOfNumber(number);
+}
+
+std::optional<std::int16_t> NumberOfDigits(std::string_view text) {
+  std::int16_t number = 0;
+  const char* const end = text.data() + text.size();
+  const auto parsed = std::from_chars(text.data(), end, number);
+  const bool whole = parsed.ec == std::errc() && parsed.ptr == end && IsDigit(text.front());
+  return whole ? std::optional(number) : std::nullopt;
 }
 
 bool IsNumeric(std::string_view text) {
@@ -305,6 +297,11 @@ std::string FormatPercent(double value) {
   const std::size_t units = point + 1;
   text.erase(first, std::min(text.find_first_not_of('0', first), units) - first);
   return text + "%";
+}
+
+std::string RunTimeText(std::int32_t minutes) {
+  const std::int32_t hours = minutes / 60;
+  return Str(hours) + "H " + Str(minutes - hours * 60) + "M";
 }
 
 std::string FormatFixed(double value, int decimals) {

@@ -107,7 +107,7 @@ OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const std::
   TableImport import(newFile, table);
   OldDatabaseReport report;
   JetStream stream({[&report](const std::string& other, std::int64_t rows) {
-                      report.NotTaken.push_back("table " + other + " (" + std::to_string(rows) + " rows)");
+                      report.NotTaken.push_back({NotTakenOver::Table, other, rows});
                     },
                     [&import](const std::vector<std::string>& columns) { import.SetColumns(columns); },
                     [&import](const std::vector<Value>& row) { import.AddRow(row); }});
@@ -124,10 +124,10 @@ OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const std::
   import.Finish();
   report.Rows = import.Rows();
   for (const std::string& column : import.UnknownColumns()) {
-    report.NotTaken.push_back("column " + column);
+    report.NotTaken.push_back({NotTakenOver::Column, column});
   }
   for (const std::string& column : import.ZeroedColumns()) {
-    report.NotTaken.push_back("texts in column " + column + " that are no numbers (now 0)");
+    report.NotTaken.push_back({NotTakenOver::TextsOfColumn, column});
   }
   return report;
 }
