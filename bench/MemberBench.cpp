@@ -35,8 +35,8 @@ class NoBoxes : public MessageBoxes {
 
 class NoDialog : public FileDialog {
  public:
-  std::string ShowOpen(const std::string&, const std::string&) override { return {}; }
-  std::string ShowSave(const std::string&, const std::string&) override { return {}; }
+  std::optional<std::string> ShowOpen(const FileRequest&) override { return std::nullopt; }
+  std::optional<std::string> ShowSave(const FileRequest&) override { return std::nullopt; }
 };
 
 /// The files of one run of this program.

@@ -284,17 +284,17 @@ void Members::ChangeMemberPicture() {
     throw RuntimeError(3021);
   }
   data1_->WriteBack();
-  const std::string file =
-      needs_.CommonDialog1.ShowOpen("Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif", "");
-  if (file.empty()) {
+  const std::optional<std::string> file =
+      needs_.CommonDialog1.ShowOpen({.Filter = "Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif"});
+  if (!file) {
     ShowMemberExtras();
     return;
   }
   Recordset& rows = data1_->Rows();
   try {
-    PreviewPhoto(file);
+    PreviewPhoto(*file);
     rows.Edit();
-    StorePhoto(file, rows, "Photograph", "PhotographLength", needs_.Disk, needs_.Boxes);
+    StorePhoto(*file, rows, "Photograph", "PhotographLength", needs_.Disk, needs_.Boxes);
     rows.Update();
   } catch (const RuntimeError&) {
     if (rows.EditMode() != EditMode::None) {
