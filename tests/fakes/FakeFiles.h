@@ -78,10 +78,10 @@ class FakeFiles : public Files {
     Created.push_back(path);
     ThrowIfTold(createFailures_, path);
     if (!FolderExists(ParentOf(path))) {
-      throw RuntimeError(76);
+      throw RuntimeError(Fault::PathNotFound);
     }
     if (FolderExists(path) || FileExists(WithoutSeparator(path))) {
-      throw RuntimeError(75);
+      throw RuntimeError(Fault::PathAccess);
     }
     folders_.insert(WithoutSeparator(path));
   }
@@ -101,10 +101,10 @@ class FakeFiles : public Files {
     Replaced.push_back({path, bytes});
     ThrowIfTold(replaceFailures_, path);
     if (!FolderExists(ParentOf(path))) {
-      throw RuntimeError(76, "Path not found: " + path);
+      throw RuntimeError(Fault::PathNotFound, "Path not found: " + path);
     }
     if (FolderExists(path)) {
-      throw RuntimeError(75, "Path/File access error: " + path);
+      throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
     }
     contents_[path] = bytes;
   }
@@ -125,17 +125,17 @@ class FakeFiles : public Files {
     ++Appends;
     ThrowIfTold(replaceFailures_, path);
     if (!FolderExists(ParentOf(path))) {
-      throw RuntimeError(76, "Path not found: " + path);
+      throw RuntimeError(Fault::PathNotFound, "Path not found: " + path);
     }
     if (FolderExists(path)) {
-      throw RuntimeError(75, "Path/File access error: " + path);
+      throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
     }
     contents_[path] += bytes;
   }
 
   std::uint64_t FreeSpace(const std::string& path) const override {
     if (!FileExists(path) && !FolderExists(path)) {
-      throw RuntimeError(76, "Path not found: " + path);
+      throw RuntimeError(Fault::PathNotFound, "Path not found: " + path);
     }
     return FreeBytes;
   }
@@ -153,7 +153,7 @@ class FakeFiles : public Files {
   void Rename(const std::string& path, const std::string& newPath) override {
     ThrowIfTold(replaceFailures_, newPath);
     if (!FileExists(path)) {
-      throw RuntimeError(53);
+      throw RuntimeError(Fault::FileNotFound);
     }
     contents_[newPath] = contents_[path];
     contents_.erase(path);
@@ -162,7 +162,7 @@ class FakeFiles : public Files {
   void Delete(const std::string& path) override {
     ThrowIfTold(deleteFailures_, path);
     if (contents_.erase(path) == 0) {
-      throw RuntimeError(53);
+      throw RuntimeError(Fault::FileNotFound);
     }
   }
 

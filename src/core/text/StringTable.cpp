@@ -46,7 +46,7 @@ StringTable::StringTable(Language language) : language_(language) {
 
 const std::string& StringTable::Text(int number) const {
   if (number < FirstText || number > LastText) {
-    throw RuntimeError(9);
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
   return texts_[static_cast<std::size_t>(number - FirstText)];
 }
