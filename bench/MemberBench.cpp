@@ -195,7 +195,13 @@ void NextMember(benchmark::State& state, const Folder& folder) {
   const QtClock clock;
   SqliteEngine engine;
   const auto database = engine.OpenDatabase(folder.Members());
-  Members window({*database, boxes, dialog, disk, clock, strings, {}}, nullptr);
+  Members window({.DbMembers = *database,
+                  .Boxes = boxes,
+                  .CommonDialog1 = dialog,
+                  .Disk = disk,
+                  .Time = clock,
+                  .Strings = strings},
+                 nullptr);
   window.show();
   QApplication::processEvents();
   auto* next = window.findChild<QPushButton*>(QStringLiteral("DataNext"));

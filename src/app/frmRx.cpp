@@ -138,7 +138,11 @@ bool frmRx::OpenDatabases() {
     const std::string program = services_.Places.Program();
     return OpenUserDatabase(
         {userDataFolder_ + "/" + name + ".mdb", table, program + "/" + name + "_default.mdb"},
-        {services_.Databases, services_.Old, services_.Disk, services_.Boxes, *backups_});
+        {.Engine = services_.Databases,
+         .Old = services_.Old,
+         .Disk = services_.Disk,
+         .Boxes = services_.Boxes,
+         .Copies = *backups_});
   };
   dbScenarios_ = open("scenarios", "Table1");
   if (!dbScenarios_) {

@@ -4,7 +4,6 @@
 
 namespace {
 
-constexpr int UnrecognizedFormat = 3343;
 constexpr const char* Title = "Database status";
 
 void TellOfConversion(const UserDatabase& database, const OldDatabaseReport& report, MessageBoxes& boxes) {
@@ -19,9 +18,9 @@ void TellOfConversion(const UserDatabase& database, const OldDatabaseReport& rep
   boxes.Show(text, Title, BoxIcon::Information);
 }
 
-std::unique_ptr<Database> Open(const std::string& path, const DatabaseServices& services) {
-  std::unique_ptr<Database> database = services.Engine.OpenDatabase(path);
-  services.Copies.Guard(*database, path);
+std::unique_ptr<Database> Open(const std::string& path, const DatabaseParts& parts) {
+  std::unique_ptr<Database> database = parts.Engine.OpenDatabase(path);
+  parts.Copies.Guard(*database, path);
   return database;
 }
 
@@ -32,31 +31,31 @@ std::string FreshPath(const std::string& path) {
 
 }  // namespace
 
-std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseServices& services) {
+std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseParts& parts) {
   std::string reason;
   try {
-    if (services.Old.IsOld(database.Path)) {
-      TellOfConversion(database, services.Old.Convert(database.Path, database.Table, database.DefaultPath),
-                       services.Boxes);
+    if (parts.Old.IsOld(database.Path)) {
+      TellOfConversion(database, parts.Old.Convert(database.Path, database.Table, database.DefaultPath),
+                       parts.Boxes);
     }
-    return Open(database.Path, services);
+    return Open(database.Path, parts);
   } catch (const RuntimeError& error) {
-    if (error.Number() != UnrecognizedFormat) {
+    if (error.Number() != Fault::UnrecognizedDatabase) {
       throw;
     }
     reason = error.what();
   }
   const std::string fresh = FreshPath(database.Path);
   const BoxAnswer answer =
-      services.Boxes.Show("The database " + database.Path + " cannot be used. " + reason +
-                              "\n\nIt stays as it is. Press OK to go on with a fresh database, " + fresh +
-                              ", or Cancel to end the program.",
-                          Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
+      parts.Boxes.Show("The database " + database.Path + " cannot be used. " + reason +
+                           "\n\nIt stays as it is. Press OK to go on with a fresh database, " + fresh +
+                           ", or Cancel to end the program.",
+                       Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
   if (answer == BoxAnswer::Cancel) {
     return nullptr;
   }
-  if (!services.Disk.FileExists(fresh)) {
-    services.Disk.Replace(fresh, services.Disk.Read(database.DefaultPath));
+  if (!parts.Disk.FileExists(fresh)) {
+    parts.Disk.Replace(fresh, parts.Disk.Read(database.DefaultPath));
   }
-  return Open(fresh, services);
+  return Open(fresh, parts);
 }
