@@ -1,9 +1,13 @@
 #include "app/Program.h"
 
+#include <QApplication>
+
+#include "app/SystemFacts.h"
 #include "platform/ErrorReport.h"
 
 Program::Program() {
   PrepareApplication();
+  composition_.Log().Started(SystemFacts());
   window_.emplace(composition_.Services());
   composition_.SetMainWindow(&*window_);
 }
@@ -15,4 +19,10 @@ bool Program::Start() {
   }
   window_->show();
   return true;
+}
+
+int Program::Run() {
+  const int exitCode = Start() ? QApplication::exec() : 1;
+  composition_.Log().Ended(exitCode);
+  return exitCode;
 }

@@ -14,6 +14,9 @@ class Program {
   /// told, or when the operator chose to end it.
   bool Start();
 
+  /// Starts, and runs until the main window is closed. Returns the process's exit code.
+  int Run();
+
   frmRx& Window() { return *window_; }
 
  private:

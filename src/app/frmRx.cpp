@@ -139,7 +139,12 @@ bool frmRx::OpenDatabases() {
     const std::string program = services_.Places.Program();
     return OpenUserDatabase(
         {userDataFolder_ + "/" + name + ".mdb", table, program + "/" + name + "_default.mdb"},
-        {services_.Databases, services_.Old, services_.Disk, services_.Boxes, *backups_, services_.Strings});
+         {.Engine = services_.Databases,
+          .Old = services_.Old,
+          .Disk = services_.Disk,
+          .Boxes = services_.Boxes,
+          .Copies = *backups_,
+          .Strings = services_.Strings});
   };
   dbScenarios_ = open("scenarios", "Table1");
   if (!dbScenarios_) {

@@ -14,7 +14,6 @@ namespace {
 constexpr std::size_t MostCopies = 10;
 constexpr std::string_view Extension = ".mdb";
 constexpr std::string_view DateForm = "0000-00-00-000000";
-constexpr int FileIsLocked = 3050;
 
 /// "members" of "/home/x/members.mdb".
 std::string NameIn(const std::string& path) {
@@ -50,7 +49,7 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
     Copy(database, NameIn(path));
   } catch (const RuntimeError& error) {
     // Of a file that another program has locked the change will fail as well; the next one tries again.
-    if (error.Number() == FileIsLocked) {
+    if (error.Number() == Fault::DatabaseLocked) {
       return false;
     }
     failure_ = Filled(strings_.Text(OwnText::BackupFailed), {path, error.what()});

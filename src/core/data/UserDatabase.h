@@ -18,7 +18,7 @@ struct UserDatabase {
 };
 
 /// What is needed to open one.
-struct DatabaseServices {
+struct DatabaseParts {
   DatabaseEngine& Engine;
   OldDatabases& Old;
   Files& Disk;
@@ -32,4 +32,4 @@ struct DatabaseServices {
 /// asked whether to go on with a fresh copy beside it, named "...-new.mdb", which is kept for the next such
 /// start. Returns nullptr when the operator chose to end the program. Throws RuntimeError as
 /// DatabaseEngine::OpenDatabase does for all but an unrecognized format.
-std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseServices& services);
+std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseParts& parts);

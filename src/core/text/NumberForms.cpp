@@ -98,7 +98,7 @@ double ValueOfNumber(std::string_view text) {
 
 void RequireFinite(double value) {
   if (!std::isfinite(value)) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
 }
 
@@ -170,7 +170,7 @@ template <typename Integer>
 Integer ToInteger(std::string_view text) {
   const std::int32_t value = ToInt32(text);
   if (value < std::numeric_limits<Integer>::min() || value > std::numeric_limits<Integer>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<Integer>(value);
 }
@@ -243,7 +243,7 @@ bool IsNumeric(std::string_view text) {
 double ToDouble(std::string_view text) {
   const std::optional<double> value = NumberIn(text);
   if (!value) {
-    throw RuntimeError(13);
+    throw RuntimeError(Fault::TypeMismatch);
   }
   RequireFinite(*value);
   return *value;
@@ -252,7 +252,7 @@ double ToDouble(std::string_view text) {
 float ToSingle(std::string_view text) {
   const double value = ToDouble(text);
   if (std::abs(value) > std::numeric_limits<float>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<float>(value);
 }
@@ -275,7 +275,7 @@ std::int32_t RoundToInt32(long double value) {
   const long long rounded = near ? std::llrint(value) : std::numeric_limits<long long>::max();
   if (rounded < std::numeric_limits<std::int32_t>::min() ||
       rounded > std::numeric_limits<std::int32_t>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<std::int32_t>(rounded);
 }

@@ -81,7 +81,7 @@ JetPattern::JetPattern(std::string_view pattern) {
 void JetPattern::AddSet(std::string_view& rest) {
   const std::size_t end = rest.find(']');
   if (end == std::string_view::npos) {
-    throw RuntimeError(93, "Invalid pattern string");
+    throw RuntimeError(Fault::InvalidPattern, "Invalid pattern string");
   }
   std::string_view list = rest.substr(0, end);
   rest.remove_prefix(end + 1);
@@ -101,7 +101,7 @@ void JetPattern::AddSet(std::string_view& rest) {
       last = TakeFolded(list);
     }
     if (last < first) {
-      throw RuntimeError(93, "Invalid pattern string");
+      throw RuntimeError(Fault::InvalidPattern, "Invalid pattern string");
     }
     set.Ranges.push_back({first, last});
   }
