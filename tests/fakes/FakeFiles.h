@@ -26,6 +26,12 @@ class FakeFiles : public Files {
   /// All calls of CreateFolder, also those that failed.
   std::vector<std::string> Created;
 
+  /// Number of calls of Append, also of those that failed.
+  int Appends = 0;
+
+  /// What FreeSpace answers.
+  std::uint64_t FreeBytes = std::uint64_t{1} << 40U;
+
   /// Adds a folder and those above it.
   void AddFolder(const std::string& path) {
     for (std::string folder = path; !FolderExists(folder); folder = ParentOf(folder)) {
@@ -43,7 +49,7 @@ class FakeFiles : public Files {
 
   const std::map<std::string, std::string>& Contents() const { return contents_; }
 
-  /// Every read, replacement or making of `path` fails from now on.
+  /// Every read, replacement (also Write and Append) or making of `path` fails from now on.
   void FailRead(const std::string& path, const RuntimeError& error) {
     readFailures_.insert_or_assign(path, error);
   }
@@ -113,6 +119,25 @@ class FakeFiles : public Files {
   void Write(const std::string& path, const std::string& bytes) override {
     ThrowIfTold(replaceFailures_, path);
     contents_[path] = bytes;
+  }
+
+  void Append(const std::string& path, const std::string& bytes) override {
+    ++Appends;
+    ThrowIfTold(replaceFailures_, path);
+    if (!FolderExists(ParentOf(path))) {
+      throw RuntimeError(76, "Path not found: " + path);
+    }
+    if (FolderExists(path)) {
+      throw RuntimeError(75, "Path/File access error: " + path);
+    }
+    contents_[path] += bytes;
+  }
+
+  std::uint64_t FreeSpace(const std::string& path) const override {
+    if (!FileExists(path) && !FolderExists(path)) {
+      throw RuntimeError(76, "Path not found: " + path);
+    }
+    return FreeBytes;
   }
 
   std::vector<std::string> FileNames(const std::string& folder) const override {

@@ -207,6 +207,29 @@ void LinuxFiles::Write(const std::string& path, const std::string& bytes) {
   }
 }
 
+void LinuxFiles::Append(const std::string& path, const std::string& bytes) {
+  const Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC | O_NONBLOCK, 0644));
+  struct stat info {};
+  if (file.Number() < 0 || fstat(file.Number(), &info) != 0) {
+    throw FileError(errno, path);
+  }
+  if (!S_ISREG(info.st_mode)) {
+    throw FileError(EISDIR, path);
+  }
+  if (!WriteAll(file.Number(), bytes)) {
+    throw FileError(errno, path);
+  }
+}
+
+std::uint64_t LinuxFiles::FreeSpace(const std::string& path) const {
+  std::error_code error;
+  const std::filesystem::space_info space = std::filesystem::space(path, error);
+  if (error) {
+    throw FileError(error.value(), path);
+  }
+  return space.available;
+}
+
 std::vector<std::string> LinuxFiles::FileNames(const std::string& folder) const {
   std::vector<std::string> names;
   std::error_code none;
