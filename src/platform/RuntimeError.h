@@ -6,8 +6,8 @@
 /// A failure that an operation of the platform, or a conversion, reports by number and text.
 /// Numbers in use: 6 overflow, 9 subscript out of range, 11 division by zero, 13 type mismatch, 53 file not
 /// found, 61 disk full, 62 past end of file, 70 permission denied, 75 path or file access error, 76 path not
-/// found, 3xxx database, 8002 no such serial port, 8005 serial port already open, 8012 serial port lost, 8018
-/// serial port not open.
+/// found, 380 settings that cannot be had, 3xxx database, 8002 no such serial port, 8005 serial port in use
+/// or not permitted, 8012 serial port lost, 8018 serial port not open.
 class RuntimeError : public std::runtime_error {
  public:
   /// With the usual text of `number`.
@@ -39,6 +39,8 @@ class RuntimeError : public std::runtime_error {
         return "Path/File access error";
       case 76:
         return "Path not found";
+      case 380:
+        return "Invalid property value";
       case 3020:
         return "Update or CancelUpdate without AddNew or Edit.";
       case 3021:
