@@ -46,17 +46,18 @@ std::string ModuleFolder() {
       .toStdString();
 }
 
-std::string SettingsFile(const Folders& folders) {
+std::string UserDataFolder(const Folders& folders) {
   std::string folder;
   folders.LocalAppData(folder);
-  return folder + UserDataSubfolder + "/tessarine.ini";
+  return folder + UserDataSubfolder;
 }
 
 }  // namespace
 
 Composition::Composition()
     : strings_(LanguageOfSystem()),
-      readerSettings_(files_, SettingsFile(folders_)),
+      logFolder_(UserDataFolder(folders_) + "/logs"),
+      readerSettings_(files_, UserDataFolder(folders_) + "/tessarine.ini"),
       wordProcessor_(ModuleFolder()) {
   if (strings_.TextLanguage() == Language::SimplifiedChinese &&
       dialogTexts_.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
@@ -75,7 +76,7 @@ Composition::Composition()
           folders_,
           boxes_,
           devices_,
-          port_,
+          loggedPort_,
           wordProcessor_,
           [this] { return SwipeButton(); }};
 }

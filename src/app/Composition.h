@@ -4,6 +4,7 @@
 
 #include "app/ConversionWithProgress.h"
 #include "app/Services.h"
+#include "core/line/LoggedPort.h"
 #include "core/text/StringTable.h"
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
@@ -43,10 +44,14 @@ class Composition {
   QtFolders folders_;
   QtMessageBoxes boxes_;
   QtSerialDevices devices_;
+  const std::string logFolder_;
   QtSerialPort port_;
+  LoggedPort loggedPort_{port_, {files_, logFolder_, events_, clock_}, "line"};
   QtSerialPort readerPort_;
+  LoggedPort loggedReaderPort_{
+      readerPort_, {files_, logFolder_, events_, clock_}, "1-wire", Transcript::Repeats::Counted};
   IniReader readerSettings_;
-  SerialOneWire wire_{readerPort_, events_, readerSettings_, devices_};
+  SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
   QWidget* mainWindow_ = nullptr;
 };

@@ -1,5 +1,6 @@
 #include "core/line/Transcript.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdio>
 #include <utility>
@@ -7,6 +8,7 @@
 namespace {
 
 constexpr std::size_t MostWaitingBytes = 16384;
+constexpr std::size_t RememberedConversations = 4;
 
 }  // namespace
 
@@ -54,16 +56,22 @@ void Transcript::Note(std::string_view note, std::string_view detail) {
 
 void Transcript::End() {
   EndRow();
-  if (repeats_ == Repeats::Counted && isWhole_ && passed_ == previous_) {
+  const bool repeats = repeats_ == Repeats::Counted && isWhole_ &&
+                       std::find(previous_.begin(), previous_.end(), passed_) != previous_.end();
+  if (repeats) {
     rows_.clear();
     ++repeatCount_;
     repeatTime_ = time_.Elapsed();
   } else {
     Write();
-    previous_ = passed_;
   }
-  passed_.clear();
   isWhole_ = true;
+  if (repeats_ == Repeats::Counted) {
+    previous_.push_back(std::exchange(passed_, {}));
+    if (previous_.size() > RememberedConversations) {
+      previous_.pop_front();
+    }
+  }
 }
 
 std::string Transcript::RowStart(std::chrono::microseconds time, std::string_view direction) const {
@@ -93,7 +101,7 @@ std::string Transcript::RepeatsRow() {
     return {};
   }
   const int count = std::exchange(repeatCount_, 0);
-  return RowStart(repeatTime_, "--") + " the same again, " + std::to_string(count) +
+  return RowStart(repeatTime_, "--") + " the last ones again, " + std::to_string(count) +
          (count == 1 ? " time\n" : " times\n");
 }
 

@@ -4,6 +4,7 @@
 #include <chrono>
 #include <cstddef>
 #include <cstdint>
+#include <deque>
 #include <string>
 #include <string_view>
 
@@ -23,8 +24,8 @@ class Transcript {
   static constexpr std::size_t RowBytes = 64;
   static constexpr std::uint64_t FileBytes = 2U << 20U;
 
-  /// What becomes of a conversation that repeats the one before to the byte: polling a reader is the same
-  /// ten times a second.
+  /// What becomes of a conversation that repeats one of the last four to the byte. Polling a reader is the
+  /// same ten times a second, or in turn as many as there are steps in a walk along its bus.
   enum class Repeats { Written, Counted };
 
   /// `time` must outlive this object.
@@ -50,7 +51,7 @@ class Transcript {
   void Add(char direction, std::uint8_t byte);
   std::string RowStart(std::chrono::microseconds time, std::string_view direction) const;
   void FinishRow(std::string_view note, std::string_view detail = {});
-  /// Tells how often the conversation before was repeated; empty when it was not.
+  /// Tells how often the last conversations were repeated; empty when they were not.
   std::string RepeatsRow();
   void Write();
 
@@ -64,10 +65,10 @@ class Transcript {
   char rowDirection_ = 0;
   std::chrono::microseconds rowTime_{0};
 
-  std::string rows_;      ///< not written yet
-  std::string passed_;    ///< the present conversation without its times
-  std::string previous_;  ///< the one before
-  bool isWhole_ = true;   ///< nothing of the present one was written yet
+  std::string rows_;                  ///< not written yet
+  std::string passed_;                ///< the present conversation without its times
+  std::deque<std::string> previous_;  ///< the last ones
+  bool isWhole_ = true;               ///< nothing of the present one was written yet
   int repeatCount_ = 0;
   std::chrono::microseconds repeatTime_{0};
 };

@@ -173,7 +173,7 @@ TEST_F(LoggedLine, CountsThePollsOfAReaderThatRepeatTheLastOne) {
             "    0.000000 1-wire <- C1\n"
             "    0.000000 1-wire -> CD\n"
             "    0.000000 1-wire -- closed\n"
-            "    0.000000 1-wire -- the same again, 59 times\n"
+            "    0.000000 1-wire -- the last ones again, 59 times\n"
             "    0.000000 1-wire -- not opened /dev/ttyS0 19200,N,8,1: 8002 Invalid port number "
             "2013-05-21 14:30:59\n");
 }

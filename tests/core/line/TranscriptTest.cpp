@@ -146,25 +146,38 @@ TEST_F(PollTranscript, CountsTicksThatRepeatTheLastOne) {
             "    0.100000 box <- C1\n"
             "    0.100000 box -> CD CD\n"
             "    0.100000 box -- closed\n"
-            "    3.800000 box -- the same again, 37 times\n"
+            "    3.800000 box -- the last ones again, 37 times\n"
             "    3.900000 box -- opened 3900\n"
             "    3.900000 box <- C1\n"
             "    3.900000 box -> CF CF\n"
             "    3.900000 box -- closed\n");
 }
 
-TEST_F(PollTranscript, ComparesWithTheLastTickOnly) {
-  for (const auto answer : std::initializer_list<std::uint8_t>{1, 2, 1}) {
-    Tick(answer);
+/// So it is when a walk along the bus has several steps.
+TEST_F(PollTranscript, CountsTicksThatRepeatInTurn) {
+  for (int round = 0; round < 10; ++round) {
+    for (std::uint8_t step = 1; step <= 4; ++step) {
+      Tick(step);
+    }
   }
-  EXPECT_EQ(files.Appends, 3);
+  EXPECT_EQ(files.Appends, 4);
+  Tick(9);
+  EXPECT_THAT(Written(), testing::HasSubstr(" box -- the last ones again, 36 times\n"));
+}
+
+TEST_F(PollTranscript, WritesATickAgainThatWasNotAmongTheLastFour) {
+  for (std::uint8_t step = 1; step <= 5; ++step) {
+    Tick(step);
+  }
+  Tick(1);
+  EXPECT_EQ(files.Appends, 6);
 }
 
 TEST_F(PollTranscript, TellsRepeatsAtItsEndToo) {
   Tick(1);
   Tick(1);
   poll.reset();
-  EXPECT_THAT(Written(), testing::EndsWith("    0.200000 box -- the same again, 1 time\n"));
+  EXPECT_THAT(Written(), testing::EndsWith("    0.200000 box -- the last ones again, 1 time\n"));
 }
 
 TEST_F(PollTranscript, TakesBytesThatOnlyComeInAnotherPaceForTheSame) {
