@@ -44,7 +44,7 @@ std::string ModuleFolder() {
       .toStdString();
 }
 
-std::string DataFolder(const Folders& folders) {
+std::string UserDataFolder(const Folders& folders) {
   std::string folder;
   folders.LocalAppData(folder);
   return folder + UserDataSubfolder;
@@ -54,8 +54,9 @@ std::string DataFolder(const Folders& folders) {
 
 Composition::Composition()
     : strings_(LanguageOfSystem()),
-      log_(files_, clock_, DataFolder(folders_)),
-      readerSettings_(files_, DataFolder(folders_) + "/tessarine.ini"),
+      log_(files_, clock_, UserDataFolder(folders_)),
+      logFolder_(UserDataFolder(folders_) + "/logs"),
+      readerSettings_(files_, UserDataFolder(folders_) + "/tessarine.ini"),
       wordProcessor_(ModuleFolder()) {
   if (strings_.TextLanguage() == Language::SimplifiedChinese &&
       dialogTexts_.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
@@ -74,7 +75,7 @@ Composition::Composition()
           .Places = folders_,
           .Boxes = boxes_,
           .Devices = devices_,
-          .MSComm1 = port_,
+          .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
           .ButtonSwipe = [this] { return SwipeButton(); }};
 }

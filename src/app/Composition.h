@@ -6,6 +6,7 @@
 #include "app/Services.h"
 #include "core/data/LoggedBoxes.h"
 #include "core/data/ProgramLog.h"
+#include "core/line/LoggedPort.h"
 #include "core/text/StringTable.h"
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
@@ -48,10 +49,14 @@ class Composition {
   QtMessageBoxes shownBoxes_;
   LoggedBoxes boxes_{shownBoxes_, log_};
   QtSerialDevices devices_;
+  const std::string logFolder_;
   QtSerialPort port_;
+  LoggedPort loggedPort_{port_, {files_, logFolder_, events_, clock_}, "line"};
   QtSerialPort readerPort_;
+  LoggedPort loggedReaderPort_{
+      readerPort_, {files_, logFolder_, events_, clock_}, "1-wire", Transcript::Repeats::Counted};
   IniReader readerSettings_;
-  SerialOneWire wire_{readerPort_, events_, readerSettings_, devices_};
+  SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
   QWidget* mainWindow_ = nullptr;
 };
