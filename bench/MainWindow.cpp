@@ -8,6 +8,7 @@
 #include "app/frmRx.h"
 #include "bench/FirstIdle.h"
 #include "platform/ErrorReport.h"
+#include "ui/Look.h"
 
 namespace {
 
@@ -31,7 +32,7 @@ void LoadThroughMenu(QWidget& window, const QString& file) {
 int main(int argc, char** argv) {
   QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
   QApplication application(argc, argv);
-  PrepareApplication();
+  PrepareLook();
   Composition composition;
   frmRx window(composition.Services());
   composition.SetMainWindow(&window);

@@ -6,6 +6,7 @@
 #include "app/frmRx.h"
 #include "demo/DemoRun.h"
 #include "platform/ErrorReport.h"
+#include "ui/Look.h"
 
 /// tessarine-demo [--radio] FOLDER: one game pulled, shown and saved without an operator. Leaves the results
 /// in FOLDER.
@@ -19,7 +20,7 @@ int main(int argc, char** argv) {
     std::fprintf(stderr, "usage: tessarine-demo [--radio] FOLDER\n");
     return 2;
   }
-  PrepareApplication();
+  PrepareLook();
   Composition composition;
   frmRx window(composition.Services());
   composition.SetMainWindow(&window);

@@ -51,8 +51,5 @@ class Composition {
   QWidget* mainWindow_ = nullptr;
 };
 
-/// Name, icon and look of the application; call once before the first window.
-void PrepareApplication();
-
 /// Shows the main window and runs the program until it is closed. Returns the process's exit code.
 int RunProgram();
