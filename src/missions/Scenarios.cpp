@@ -8,7 +8,6 @@
 #include "core/data/Rows.h"
 #include "core/text/NumberForms.h"
 #include "missions/MissionNameEntry.h"
-#include "platform/ErrorReport.h"
 #include "ui_Scenarios.h"
 
 namespace {
@@ -43,7 +42,8 @@ Scenarios::Scenarios(Database& dbScenarios, Recordset& rsScenarios, MessageBoxes
       dbScenarios_(dbScenarios),
       rsScenarios_(rsScenarios),
       boxes_(boxes),
-      strings_(strings) {
+      strings_(strings),
+      commands_(*this, boxes) {
   ui_->setupUi(this);
   objectives_ = {{{ui_->PrimaryObjectiveDescription0, ui_->SecondaryObjectiveDescription0,
                    ui_->PrimaryPoints0, ui_->SecondaryPoints0},
@@ -98,26 +98,19 @@ void Scenarios::SetCaptions() {
 }
 
 void Scenarios::ConnectCommands() {
-  const std::pair<QPushButton*, void (Scenarios::*)()> commands[] = {
-      {ui_->NewButton, &Scenarios::NewMission},  {ui_->Edit, &Scenarios::EditMission},
-      {ui_->Save, &Scenarios::SaveMission},      {ui_->Delete, &Scenarios::DeleteMission},
-      {ui_->SelectExit, &Scenarios::SelectExit},
-  };
-  for (const auto& entry : commands) {
-    const auto command = entry.second;
-    connect(entry.first, &QPushButton::clicked, this, [this, command] { Run(command); });
-  }
-  connect(ui_->MissionSelection1, &QListWidget::currentRowChanged, this,
-          [this] { Run(&Scenarios::ShowSelectedMission); });
+  commands_.Connect(*this, {
+                               {ui_->NewButton, &Scenarios::NewMission},
+                               {ui_->Edit, &Scenarios::EditMission},
+                               {ui_->Save, &Scenarios::SaveMission},
+                               {ui_->Delete, &Scenarios::DeleteMission},
+                               {ui_->SelectExit, &Scenarios::SelectExit},
+                           });
+  const auto show = [this] { commands_.Run([this] { ShowSelectedMission(); }); };
+  connect(ui_->MissionSelection1, &QListWidget::currentRowChanged, this, show);
   // Also on the entry that is current already: what was typed and not saved is replaced.
-  connect(ui_->MissionSelection1, &QListWidget::itemClicked, this,
-          [this] { Run(&Scenarios::ShowSelectedMission); });
+  connect(ui_->MissionSelection1, &QListWidget::itemClicked, this, show);
   connect(ui_->MissionSelection1, &QListWidget::itemSelectionChanged, this, &Scenarios::FollowSelection);
   connect(ui_->ObjectivesTab, &QTabBar::currentChanged, this, &Scenarios::BringToFront);
-}
-
-void Scenarios::Run(void (Scenarios::*command)()) {
-  ReportErrors(boxes_, [this, command] { (this->*command)(); });
 }
 
 void Scenarios::LoadMissionList() {
