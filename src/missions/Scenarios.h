@@ -36,7 +36,7 @@ class Scenarios : public QDialog {
     QLineEdit* SecondaryPoints;
   };
 
-  void SetCaptions();
+  void ShowTexts();
   void ConnectCommands();
 
   void LoadMissionList();

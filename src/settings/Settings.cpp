@@ -2,7 +2,7 @@
 
 #include "core/line/EnumPorts.h"
 #include "core/text/NumberForms.h"
-#include "ui/Text.h"
+#include "ui/Captions.h"
 #include "ui_Settings.h"
 
 namespace {
@@ -17,10 +17,7 @@ Settings::Settings(IniReader& ini, const SerialDevices& devices, MessageBoxes& b
       commands_(*this, boxes),
       checks_(commands_, boxes) {
   ui_->setupUi(this);
-  setWindowTitle(Text(strings, 160));
-  ui_->Frame1->setTitle(Text(strings, 161));
-  ui_->SaveExit->setText(Text(strings, 162));
-  ui_->Cancel->setText(Text(strings, 141));
+  SetCaptions(strings, {{this, 160}, {ui_->Frame1, 161}, {ui_->SaveExit, 162}, {ui_->Cancel, 141}});
   ui_->CommPortNumber->setText(QString::fromStdString(ini_.ReadIni("comm", "commport", "1")));
   ui_->CommPortNumber->selectAll();
   ListAvailablePorts(devices);

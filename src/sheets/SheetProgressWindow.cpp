@@ -1,11 +1,12 @@
 #include "sheets/SheetProgressWindow.h"
 
+#include "ui/Text.h"
 #include "ui_SheetProgressWindow.h"
 
 SheetProgressWindow::SheetProgressWindow(const StringTable& strings, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::SheetProgressWindow>()), strings_(strings) {
   ui_->setupUi(this);
-  setWindowTitle(QString::fromStdString(strings.Text(131)));
+  setWindowTitle(Text(strings, 131));
   ui_->Stop->setText(Words("Stop", "停止"));
 }
 

@@ -8,6 +8,7 @@
 #include "devices/radio/GunSearch.h"
 #include "devices/radio/RadioLink.h"
 #include "devices/radio/ScoreFetch.h"
+#include "ui/Text.h"
 #include "ui/WaitCursor.h"
 #include "ui_RemoteManage.h"
 
@@ -41,7 +42,7 @@ RemoteManage::RemoteManage(const Parts& parts, QWidget* parent)
 RemoteManage::~RemoteManage() = default;
 
 void RemoteManage::SetUpList() {
-  list_ = new GunListModel(QString::fromStdString(parts_.Strings.Text(104)), this);
+  list_ = new GunListModel(Text(parts_.Strings, 104), this);
   QFont figures = ui_->DataList->font();
   figures.setPointSizeF(figures.pointSizeF() * 1.25);
   ui_->DataList->setFont(figures);
