@@ -9,7 +9,6 @@
 #include "core/data/FirstRun.h"
 #include "devices/buttons/ButtonSwipe.h"
 #include "platform/ErrorReport.h"
-#include "platform/qt/DialogParent.h"
 #include "ui/Look.h"
 
 namespace {
@@ -63,15 +62,9 @@ Composition::Composition()
 }
 
 std::string Composition::SwipeButton() {
-  ButtonSwipe window(wire_, boxes_, strings_, DialogParent(mainWindow_));
+  ButtonSwipe window(wire_, boxes_, strings_, parent_.Window());
   window.exec();
   return window.DallasID();
-}
-
-void Composition::SetMainWindow(QWidget* window) {
-  mainWindow_ = window;
-  boxes_.SetMainWindow(window);
-  fileDialog_.SetMainWindow(window);
 }
 
 int RunProgram() {

@@ -16,6 +16,7 @@
 #include "platform/qt/QtSerialDevices.h"
 #include "platform/qt/QtSerialPort.h"
 #include "platform/sqlite/SqliteDatabase.h"
+#include "ui/DialogParent.h"
 
 /// The real parts of the platform, put together for one run of the program. Needs a QApplication.
 class Composition {
@@ -25,7 +26,7 @@ class Composition {
   ::Services Services();
 
   /// Boxes and dialogs belong to `window` while no other window is active.
-  void SetMainWindow(QWidget* window);
+  void SetMainWindow(QWidget* window) { parent_.SetMainWindow(window); }
 
   MessageBoxes& Boxes() { return boxes_; }
 
@@ -38,17 +39,17 @@ class Composition {
   SqliteEngine databases_;
   ConversionWithProgress old_{strings_};
   QtEventPump events_;
-  QtFileDialog fileDialog_;
+  DialogParent parent_;
+  QtFileDialog fileDialog_{[this] { return parent_.Window(); }};
   LinuxFiles files_;
   QtFolders folders_;
-  QtMessageBoxes boxes_;
+  QtMessageBoxes boxes_{[this] { return parent_.Window(); }};
   QtSerialDevices devices_;
   QtSerialPort port_;
   QtSerialPort readerPort_;
   IniReader readerSettings_;
   SerialOneWire wire_{readerPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
-  QWidget* mainWindow_ = nullptr;
 };
 
 /// Shows the main window and runs the program until it is closed. Returns the process's exit code.

@@ -1,8 +1,9 @@
 #pragma once
 
-#include <QPointer>
 #include <QStringList>
 #include <QWidget>
+#include <functional>
+#include <utility>
 
 #include "platform/FileDialog.h"
 
@@ -14,8 +15,8 @@ QStringList NameFilters(const std::string& filter);
 /// documents.
 class QtFileDialog : public FileDialog {
  public:
-  /// Window that dialogs belong to while no window of the program is active.
-  void SetMainWindow(QWidget* mainWindow) { mainWindow_ = mainWindow; }
+  /// `parent` tells the window that one opened now belongs to; it may be none.
+  explicit QtFileDialog(std::function<QWidget*()> parent) : parent_(std::move(parent)) {}
 
   std::string ShowOpen(const std::string& filter, const std::string& fileName) override;
   std::string ShowSave(const std::string& filter, const std::string& fileName) override;
@@ -23,6 +24,6 @@ class QtFileDialog : public FileDialog {
  private:
   std::string Ask(bool save, const std::string& filter, const std::string& fileName);
 
-  QPointer<QWidget> mainWindow_;
+  std::function<QWidget*()> parent_;
   QString lastFolder_;
 };

@@ -1,8 +1,7 @@
 #include "platform/qt/QtMessageBoxes.h"
 
 #include <QMessageBox>
-
-#include "platform/qt/DialogParent.h"
+#include <QPointer>
 
 namespace {
 
@@ -56,7 +55,7 @@ BoxAnswer AnswerOf(int pressed, BoxButtons buttons) {
 BoxAnswer QtMessageBoxes::Show(const std::string& text, const std::string& title, BoxIcon icon,
                                BoxButtons buttons) {
   // Not on the stack: its parent may be destroyed, and the box with it, while it is open.
-  const QPointer<QMessageBox> box = new QMessageBox(DialogParent(mainWindow_));
+  const QPointer<QMessageBox> box = new QMessageBox(parent_());
   box->setTextFormat(Qt::PlainText);
   box->setText(QString::fromStdString(text));
   box->setWindowTitle(QString::fromStdString(title));

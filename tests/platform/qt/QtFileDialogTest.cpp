@@ -72,7 +72,7 @@ class QtFileDialogTest : public testing::Test {
     };
   }
 
-  QtFileDialog Dialog;
+  QtFileDialog Dialog{[] { return QApplication::activeModalWidget(); }};
 
  private:
   QTemporaryDir folder_;
