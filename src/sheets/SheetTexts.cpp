@@ -1,6 +1,7 @@
 #include "sheets/SheetTexts.h"
 
-#include "core/data/FieldValue.h"
+#include <optional>
+
 #include "core/text/NumberForms.h"
 
 namespace {
@@ -22,9 +23,10 @@ const std::string& TeamName(const Game& game, int index) {
 /// What was hit, or who hit: team, number, damage, and the name of a member.
 std::string HitText(const Game& game, int index, std::int32_t damage, MemberLookup& members) {
   std::string text = Trimmed(TeamName(game, index)) + " " + Trimmed(NumberText(index)) + ": " + Str(damage);
-  const std::int32_t member = game.Players(index).MemberIndex;
-  if (member != 0 && members.LoadMember(member)) {
-    text += "  (" + members.GetPlayerName(true) + ")";
+  if (const std::int32_t contactId = game.Players(index).MemberIndex; contactId != 0) {
+    if (const std::optional<Member> member = members.LoadMember(contactId)) {
+      text += "  (" + member->GetPlayerName(true) + ")";
+    }
   }
   return text;
 }
@@ -76,19 +78,15 @@ BookmarkTexts ResultTexts(const Game& game, int index, int winner) {
           {"PlayerID", NumberText(index) + " "}};
 }
 
-BookmarkTexts MemberTexts(Recordset& rsMembers, MemberLookup& members) {
-  const auto text = [&rsMembers](const char* column) {
-    std::string value = TextOf(rsMembers.Fields(column));
-    return value.empty() ? "None" : value;
-  };
-  const auto number = [&rsMembers](const char* column) { return NumberOf(rsMembers.Fields(column)); };
-  return {{"PlayerName", members.GetPlayerName(false)},
-          {"NickName", text("NickName")},
-          {"AvgGames", PlainDecimal(number("TotalGamesPlayed"))},
-          {"AvgAccuracy", FormatPercent(number("AveragePrimAccuracy"))},
-          {"AvgDamage", PlainDecimal(Round2(number("AverageDamage")))},
-          {"AvgSoldiering", PlainDecimal(Round2(number("AverageSoldiering")))},
-          {"ClanName", text("Clan")}};
+BookmarkTexts MemberTexts(const Member& member, const MemberHistory& history) {
+  const auto orNone = [](const std::string& text) { return text.empty() ? "None" : text; };
+  return {{"PlayerName", member.GetPlayerName(false)},
+          {"NickName", orNone(member.NickName)},
+          {"AvgGames", PlainDecimal(history.TotalGamesPlayed)},
+          {"AvgAccuracy", FormatPercent(history.AveragePrimAccuracy)},
+          {"AvgDamage", PlainDecimal(Round2(history.AverageDamage))},
+          {"AvgSoldiering", PlainDecimal(Round2(history.AverageSoldiering))},
+          {"ClanName", orNone(history.Clan)}};
 }
 
 BookmarkTexts GuestTexts() {

@@ -1,5 +1,6 @@
 #include "core/game/HitLines.h"
 
+#include <optional>
 #include <utility>
 
 #include "core/text/NumberForms.h"
@@ -12,9 +13,10 @@ void AddLine(std::vector<HitLine>& lines, int index, std::int32_t amount, const 
     return;
   }
   std::string text = game.DisplayName(index) + ": " + Str(amount);
-  const std::int32_t member = game.Players(index).MemberIndex;
-  if (member != 0 && members.LoadMember(member)) {
-    text += "  (" + members.GetPlayerName(false) + ")";
+  if (const std::int32_t contactId = game.Players(index).MemberIndex; contactId != 0) {
+    if (const std::optional<Member> member = members.LoadMember(contactId)) {
+      text += "  (" + member->GetPlayerName(false) + ")";
+    }
   }
   lines.push_back({std::move(text), index, amount});
 }

@@ -294,9 +294,9 @@ double Round2(double value) {
 
 std::string FormatPercent(double value) {
   constexpr double mostPercent = 1e9;
-  if (std::abs(value) < mostPercent && static_cast<float>(value) == value) {
-    // Ten thousand times a float is exact in a double, and so is the tie.
-    return HundredthsAsPercent(std::llround(value * 10'000));
+  const auto single = static_cast<float>(value);
+  if (std::abs(value) < mostPercent && single == value) {
+    return HundredthsAsPercent(static_cast<long long>(PercentHundredths(single)));
   }
   std::string text = FormatFixed(value, 4);
   const std::size_t point = text.find('.');
@@ -305,6 +305,11 @@ std::string FormatPercent(double value) {
   const std::size_t units = point + 1;
   text.erase(first, std::min(text.find_first_not_of('0', first), units) - first);
   return text + "%";
+}
+
+double PercentHundredths(float value) {
+  // Ten thousand times a float is exact in a double, and so is the tie.
+  return std::round(double{value} * 10'000);
 }
 
 std::string FormatFixed(double value, int decimals) {

@@ -51,5 +51,8 @@ double Round2(double value);
 /// zero; zero has no sign, and digits are not grouped. Throws RuntimeError 6 for an infinity or a NaN.
 std::string FormatPercent(double value);
 
+/// The number that FormatPercent shows of a float, in hundredths of a percent: 5000 for "50.00%".
+double PercentHundredths(float value);
+
 /// `value` with `decimals` (0 or more) digits behind the point, rounded like FormatPercent.
 std::string FormatFixed(double value, int decimals);
