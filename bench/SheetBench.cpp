@@ -263,8 +263,9 @@ double PlainRun(Evening& evening, const std::string& host) {
       sheet.Bookmarks.insert(sheet.Bookmarks.end(), texts.begin(), texts.end());
     };
     add(ResultTexts(evening.Board, index, WinningTeam(evening.Board)));
-    members.LoadMember(evening.Board.Players(index).MemberIndex);
-    add(MemberTexts(*evening.RsMembers, members));
+    const std::int32_t contactId = evening.Board.Players(index).MemberIndex;
+    const std::optional<Member> member = members.LoadMember(contactId);
+    add(MemberTexts(*member, members.LoadHistory(contactId)));
     sheet.Photo = files.MakeTempFileName();
     ExportPhoto(*evening.RsMembers, "Photograph", "PhotographLength", sheet.Photo, files);
     add(GameTexts(evening.Board.Players(index), "Bench", "15 November 2026", " 1"));

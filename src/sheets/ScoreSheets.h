@@ -51,7 +51,7 @@ class ScoreSheets {
   void MakeSheet(int index, int number, int count);
   void StartWordProcessor();
   void FillPlayer(WordDocument& document, int index, int number, int count);
-  void AddPhoto(WordDocument& document);
+  void AddPhoto(WordDocument& document, const Member& member);
   void FillGame(WordDocument& document, int index);
   void Save(WordDocument& document);
   /// A name in the folder of sheets that is not taken: `base` and the extension, with a number between where

@@ -82,7 +82,7 @@ class Commands : public QObject {
       Connect(*control, [&owner, command = command] { (owner.*command)(); });
     }
   }
-  void Start(const std::function<void()>& command, WhileBusy whileBusy);
+  void Start(const QObject& control, const std::function<void()>& command, WhileBusy whileBusy);
   void Press(QAbstractButton& button, const std::function<void()>& command, WhileBusy whileBusy);
   /// Gives the button the focus. Returns false when an entry that is left thereby keeps it.
   bool TakeFocus(QAbstractButton& button);

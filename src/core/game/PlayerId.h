@@ -46,7 +46,3 @@ constexpr int IndexFromId(std::uint8_t id) {
 constexpr std::uint8_t IdFromIndex(int index) {
   return static_cast<std::uint8_t>(index + 31);
 }
-
-/// Record index of the player whom the player text of a board row names: team word, blank, number, and for a
-/// member ":" and the name. Throws RuntimeError 13 or 6 for a number that no byte can hold.
-int IndexFromPlayerText(const StringTable& texts, std::string_view playerText);

@@ -18,11 +18,13 @@ std::string ReadOrNothing(const Files& files, const std::string& path) {
 
 }  // namespace
 
-void CurrentGameFile::SaveGame(const Game& game, const std::string& missionName) {
+bool CurrentGameFile::SaveGame(const Game& game, const std::string& missionName) {
   fileName_ = dialog_.ShowSave({.Filter = Filter, .Name = fileName_}).value_or(fileName_);
-  if (!fileName_.empty()) {
-    files_.Replace(fileName_, WriteGameFile(game, missionName));
+  if (fileName_.empty()) {
+    return false;
   }
+  files_.Replace(fileName_, WriteGameFile(game, missionName));
+  return true;
 }
 
 bool CurrentGameFile::AskForGame() {

@@ -15,8 +15,9 @@ class CurrentGameFile {
       : dialog_(dialog), files_(files), boxes_(boxes) {}
 
   /// Asks for a name and saves there, replacing the file. Cancel saves under the name of the last load or
-  /// save, and does nothing when there is none. A failure throws RuntimeError and leaves the old file.
-  void SaveGame(const Game& game, const std::string& missionName);
+  /// save, and does nothing when there is none. Returns true when the game was saved. A failure throws
+  /// RuntimeError and leaves the old file.
+  bool SaveGame(const Game& game, const std::string& missionName);
 
   /// Asks for a game to load. False when the operator cancels, which also forgets the file.
   bool AskForGame();

@@ -286,9 +286,9 @@ double Round2(double value) {
 
 std::string FormatPercent(double value) {
   constexpr double mostPercent = 1e9;
-  if (std::abs(value) < mostPercent && static_cast<float>(value) == value) {
-    // Ten thousand times a float is exact in a double, and so is the tie.
-    return HundredthsAsPercent(std::llround(value * 10'000));
+  const auto single = static_cast<float>(value);
+  if (std::abs(value) < mostPercent && single == value) {
+    return HundredthsAsPercent(static_cast<long long>(PercentHundredths(single)));
   }
   std::string text = FormatFixed(value, 4);
   const std::size_t point = text.find('.');
@@ -302,6 +302,11 @@ std::string FormatPercent(double value) {
 std::string RunTimeText(std::int32_t minutes) {
   const std::int32_t hours = minutes / 60;
   return Str(hours) + "H " + Str(minutes - hours * 60) + "M";
+}
+
+double PercentHundredths(float value) {
+  // Ten thousand times a float is exact in a double, and so is the tie.
+  return std::round(double{value} * 10'000);
 }
 
 std::string FormatFixed(double value, int decimals) {

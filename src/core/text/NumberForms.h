@@ -56,6 +56,8 @@ std::string FormatPercent(double value);
 
 /// A running time in minutes as hours and minutes, each in the number form: " 2H  5M" for 125.
 std::string RunTimeText(std::int32_t minutes);
+/// The number that FormatPercent shows of a float, in hundredths of a percent: 5000 for "50.00%".
+double PercentHundredths(float value);
 
 /// `value` with `decimals` (0 or more) digits behind the point, rounded like FormatPercent.
 std::string FormatFixed(double value, int decimals);

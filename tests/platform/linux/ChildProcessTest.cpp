@@ -6,8 +6,8 @@
 #include <csignal>
 #include <string>
 
-#include "gmock/gmock.h"
-#include "gtest/gtest.h"
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
 #include "tests/support/Thrown.h"
 
 namespace {

@@ -10,7 +10,7 @@
 #include <string>
 #include <thread>
 
-#include "gtest/gtest.h"
+#include <gtest/gtest.h>
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/Thrown.h"
 
