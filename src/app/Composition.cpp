@@ -6,10 +6,8 @@
 #include <QLibraryInfo>
 #include <QLocale>
 
-#include "app/frmRx.h"
 #include "core/data/FirstRun.h"
 #include "devices/buttons/ButtonSwipe.h"
-#include "platform/ErrorReport.h"
 #include "platform/qt/DialogParent.h"
 
 namespace {
@@ -46,17 +44,18 @@ std::string ModuleFolder() {
       .toStdString();
 }
 
-std::string SettingsFile(const Folders& folders) {
+std::string DataFolder(const Folders& folders) {
   std::string folder;
   folders.LocalAppData(folder);
-  return folder + UserDataSubfolder + "/tessarine.ini";
+  return folder + UserDataSubfolder;
 }
 
 }  // namespace
 
 Composition::Composition()
     : strings_(LanguageOfSystem()),
-      readerSettings_(files_, SettingsFile(folders_)),
+      log_(files_, clock_, DataFolder(folders_)),
+      readerSettings_(files_, DataFolder(folders_) + "/tessarine.ini"),
       wordProcessor_(ModuleFolder()) {
   if (strings_.TextLanguage() == Language::SimplifiedChinese &&
       dialogTexts_.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
@@ -65,19 +64,19 @@ Composition::Composition()
 }
 
 ::Services Composition::Services() {
-  return {strings_,
-          clock_,
-          databases_,
-          old_,
-          events_,
-          fileDialog_,
-          files_,
-          folders_,
-          boxes_,
-          devices_,
-          port_,
-          wordProcessor_,
-          [this] { return SwipeButton(); }};
+  return {.Strings = strings_,
+          .Time = clock_,
+          .Databases = databases_,
+          .Old = old_,
+          .Events = events_,
+          .CommonDialog1 = fileDialog_,
+          .Disk = files_,
+          .Places = folders_,
+          .Boxes = boxes_,
+          .Devices = devices_,
+          .MSComm1 = port_,
+          .WordProcessor = wordProcessor_,
+          .ButtonSwipe = [this] { return SwipeButton(); }};
 }
 
 std::string Composition::SwipeButton() {
@@ -88,7 +87,7 @@ std::string Composition::SwipeButton() {
 
 void Composition::SetMainWindow(QWidget* window) {
   mainWindow_ = window;
-  boxes_.SetMainWindow(window);
+  shownBoxes_.SetMainWindow(window);
   fileDialog_.SetMainWindow(window);
 }
 
@@ -97,17 +96,4 @@ void PrepareApplication() {
   QApplication::setDesktopFileName(QStringLiteral("tessarine"));
   QApplication::setWindowIcon(QIcon(QStringLiteral(":/pictures/tessarine-256.png")));
   qApp->setStyleSheet(QString::fromUtf8(LookSheet));
-}
-
-int RunProgram() {
-  PrepareApplication();
-  Composition composition;
-  frmRx window(composition.Services());
-  composition.SetMainWindow(&window);
-  bool loaded = false;
-  if (!ReportErrors(composition.Boxes(), [&] { loaded = window.FormLoad(); }) || !loaded) {
-    return 1;
-  }
-  window.show();
-  return QApplication::exec();
 }

@@ -4,6 +4,8 @@
 
 #include "app/ConversionWithProgress.h"
 #include "app/Services.h"
+#include "core/data/LoggedBoxes.h"
+#include "core/data/ProgramLog.h"
 #include "core/text/StringTable.h"
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
@@ -28,6 +30,7 @@ class Composition {
   void SetMainWindow(QWidget* window);
 
   MessageBoxes& Boxes() { return boxes_; }
+  ProgramLog& Log() { return log_; }
 
  private:
   std::string SwipeButton();
@@ -41,7 +44,9 @@ class Composition {
   QtFileDialog fileDialog_;
   LinuxFiles files_;
   QtFolders folders_;
-  QtMessageBoxes boxes_;
+  ProgramLog log_;
+  QtMessageBoxes shownBoxes_;
+  LoggedBoxes boxes_{shownBoxes_, log_};
   QtSerialDevices devices_;
   QtSerialPort port_;
   QtSerialPort readerPort_;
@@ -53,6 +58,3 @@ class Composition {
 
 /// Name, icon and look of the application; call once before the first window.
 void PrepareApplication();
-
-/// Shows the main window and runs the program until it is closed. Returns the process's exit code.
-int RunProgram();

@@ -21,7 +21,7 @@ Settings::Settings(IniReader& ini, const SerialDevices& devices, MessageBoxes& b
   ui_->Frame1->setTitle(Text(strings, 161));
   ui_->SaveExit->setText(Text(strings, 162));
   ui_->Cancel->setText(Text(strings, 141));
-  ui_->CommPortNumber->setText(QString::fromStdString(ini_.ReadIni("comm", "commport", "1")));
+  ui_->CommPortNumber->setText(QString::fromStdString(ini_.ReadIni(Keys::CommPort)));
   ui_->CommPortNumber->selectAll();
   ui_->CommPortNumber->installEventFilter(this);
   ListAvailablePorts(devices);
@@ -76,7 +76,7 @@ bool Settings::ValidateCommPortNumber() {
 
 void Settings::SaveAndExit() {
   if (ValidateCommPortNumber()) {
-    ini_.WriteIni("comm", "commport", Str(std::int32_t{ToInt16(ui_->CommPortNumber->text().toStdString())}));
+    ini_.WriteIni(Keys::CommPort, Str(std::int32_t{ToInt16(ui_->CommPortNumber->text().toStdString())}));
     accept();
   }
 }

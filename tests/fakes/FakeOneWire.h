@@ -113,7 +113,7 @@ class FakeOneWire : public OneWire {
       onCall(operation);
     }
     if (operation == Broken) {
-      throw RuntimeError(53);
+      throw RuntimeError(Fault::FileNotFound);
     }
   }
 

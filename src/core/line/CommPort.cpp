@@ -34,7 +34,7 @@ bool CommPort::OpenCommPort(const std::string& settings) {
 }
 
 void CommPort::Open(const std::string& settings) {
-  const std::int16_t number = ToInt16(ini_.ReadIni("comm", "commport", "1"));
+  const std::int16_t number = ToInt16(ini_.ReadIni(Keys::CommPort));
   const std::string device = EnumPorts(ini_, devices_).DeviceOf(number);
   if (device.empty()) {
     throw RuntimeError(8002);

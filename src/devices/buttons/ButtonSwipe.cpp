@@ -2,6 +2,7 @@
 
 #include <QShowEvent>
 
+#include "ui/Text.h"
 #include "ui_ButtonSwipe.h"
 
 ButtonSwipe::ButtonSwipe(OneWire& wire, MessageBoxes& boxes, const StringTable& strings, QWidget* parent)
@@ -10,7 +11,8 @@ ButtonSwipe::ButtonSwipe(OneWire& wire, MessageBoxes& boxes, const StringTable& 
       reader_(wire, boxes),
       timer1_(new QTimer(this)) {
   ui_->setupUi(this);
-  ui_->Cancel->setText(QString::fromStdString(strings.Text(141)));
+  ui_->Image1->setAccessibleName(Text(strings, OwnText::ButtonPicture));
+  ui_->Cancel->setText(Text(strings, 141));
   constexpr int pollMilliseconds = 100;
   timer1_->setObjectName(QStringLiteral("Timer1"));
   timer1_->setInterval(pollMilliseconds);

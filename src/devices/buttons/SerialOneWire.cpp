@@ -27,21 +27,11 @@ std::int16_t ResultOf(bool done) {
   return done ? 1 : 0;
 }
 
-/// The number in a text of digits, 0 to 32767.
-std::optional<std::int16_t> NumberIn(const std::string& text) {
-  constexpr std::size_t mostDigits = 5;
-  const bool digits = !text.empty() && text.find_first_not_of("0123456789") == std::string::npos;
-  if (!digits || text.size() > mostDigits || Val(text) > std::numeric_limits<std::int16_t>::max()) {
-    return std::nullopt;
-  }
-  return ToInt16(text);
-}
-
 }  // namespace
 
 std::int16_t SerialOneWire::TMReadDefaultPort(std::int16_t& port, std::int16_t& type) {
-  const auto namedPort = NumberIn(ini_.ReadIni("onewire", "port", ""));
-  const auto namedType = NumberIn(ini_.ReadIni("onewire", "type", std::to_string(SerialAdapter)));
+  const auto namedPort = NumberOfDigits(ini_.ReadIni(Keys::ReaderPort));
+  const auto namedType = NumberOfDigits(ini_.ReadIni(Keys::ReaderType));
   if (!namedPort || *namedPort == 0 || !namedType) {
     return 0;
   }

@@ -7,6 +7,7 @@
 #include <string>
 
 #include "core/line/Checksum.h"
+#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
@@ -37,9 +38,15 @@ int BlocksIn(int total) {
 
 }  // namespace
 
-ScoreFetch::ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, Game& game, GunTable& guns,
-                       RadioDisplay& display)
-    : link_(link), events_(events), clock_(clock), game_(game), guns_(guns), display_(display) {}
+ScoreFetch::ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, const StringTable& strings,
+                       Game& game, GunTable& guns, RadioDisplay& display)
+    : link_(link),
+      events_(events),
+      clock_(clock),
+      strings_(strings),
+      game_(game),
+      guns_(guns),
+      display_(display) {}
 
 void ScoreFetch::GetScores() {
   link_.OpenXBeePort();
@@ -49,8 +56,9 @@ void ScoreFetch::GetScores() {
   for (int index = 0; index < GunCount && !link_.Stopped(); ++index) {
     events_.DoEvents();
     if (WantsScores(guns_[static_cast<std::size_t>(index)])) {
-      display_.SetProgress("Gun " + std::to_string(fetched + 1) + " of " + std::to_string(wanted), fetched,
-                           wanted);
+      display_.SetProgress(Filled(strings_.Text(OwnText::FetchProgress),
+                                  {std::to_string(fetched + 1), std::to_string(wanted)}),
+                           fetched, wanted);
       FetchGun(index);
       ++fetched;
     }
