@@ -4,9 +4,10 @@
 
 #include "app/SystemFacts.h"
 #include "platform/ErrorReport.h"
+#include "ui/Look.h"
 
 Program::Program() {
-  PrepareApplication();
+  PrepareLook();
   composition_.Log().Started(SystemFacts());
   window_.emplace(composition_.Services());
   composition_.SetMainWindow(&*window_);

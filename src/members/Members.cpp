@@ -48,7 +48,10 @@ void Show(QLineEdit& entry, const std::string& text) {
 }  // namespace
 
 Members::Members(Parts parts, QWidget* parent)
-    : QDialog(parent), ui_(std::make_unique<Ui::Members>()), parts_(std::move(parts)) {
+    : QDialog(parent),
+      ui_(std::make_unique<Ui::Members>()),
+      parts_(std::move(parts)),
+      commands_(*this, parts_.Boxes) {
   ui_->setupUi(this);
   ui_->Dummy->hide();
   ui_->ChangeID->setEnabled(parts_.ButtonSwipe != nullptr);
@@ -62,7 +65,7 @@ Members::Members(Parts parts, QWidget* parent)
 Members::~Members() = default;
 
 void Members::SetCaptions() {
-  const StringTable& strings = needs_.Strings;
+  const StringTable& strings = parts_.Strings;
   ui_->SearchText->setPlaceholderText(Text(strings, OwnText::NameToSearchFor));
   ui_->MemberPhoto->setAccessibleName(Text(strings, OwnText::Photo));
   ui_->DOBPicker->SetCalendarName(Text(strings, OwnText::Calendar));
@@ -79,39 +82,21 @@ void Members::SetCaptions() {
 }
 
 void Members::ConnectCommands() {
-  const std::pair<QAbstractButton*, void (Members::*)()> commands[] = {
-      {ui_->Search, &Members::RunSearch},        {ui_->ClearSearch, &Members::RunClearSearch},
-      {ui_->NewMember, &Members::AddMember},     {ui_->Delete, &Members::DeleteMember},
-      {ui_->ChangeID, &Members::ChangeMemberId}, {ui_->ChangePicture, &Members::ChangeMemberPicture},
-      {ui_->OK, &Members::SelectMember},
-  };
-  for (const auto& entry : commands) {
-    const auto command = entry.second;
-    ConnectButton(*entry.first, [this, command] { (this->*command)(); });
-  }
-  const std::pair<QAbstractButton*, void (MemberRows::*)()> arrows[] = {
-      {ui_->DataFirst, &MemberRows::MoveFirst},
-      {ui_->DataPrevious, &MemberRows::MovePrevious},
-      {ui_->DataNext, &MemberRows::MoveNext},
-      {ui_->DataLast, &MemberRows::MoveLast},
-  };
-  for (const auto& entry : arrows) {
-    const auto move = entry.second;
-    ConnectButton(*entry.first, [this, move] { ((*data1_).*move)(); });
-  }
-}
-
-// A button that is pressed by other means than the mouse takes the focus, too: or the search box, left after
-// the command, would go back to the first member.
-void Members::ConnectButton(QAbstractButton& button, const std::function<void()>& command) {
-  connect(&button, &QAbstractButton::clicked, this, [this, &button, command] {
-    button.setFocus();
-    Run(command);
-  });
-}
-
-void Members::Run(const std::function<void()>& command) {
-  ReportErrors(parts_.Boxes, command);
+  commands_.Connect(*this, {
+                               {ui_->Search, &Members::RunSearch},
+                               {ui_->ClearSearch, &Members::RunClearSearch},
+                               {ui_->NewMember, &Members::AddMember},
+                               {ui_->Delete, &Members::DeleteMember},
+                               {ui_->ChangeID, &Members::ChangeMemberId},
+                               {ui_->ChangePicture, &Members::ChangeMemberPicture},
+                               {ui_->OK, &Members::SelectMember},
+                           });
+  commands_.Connect(*data1_, {
+                                 {ui_->DataFirst, &MemberRows::MoveFirst},
+                                 {ui_->DataPrevious, &MemberRows::MovePrevious},
+                                 {ui_->DataNext, &MemberRows::MoveNext},
+                                 {ui_->DataLast, &MemberRows::MoveLast},
+                             });
 }
 
 void Members::RunInFocusChange(const std::function<void()>& command) {
@@ -127,7 +112,7 @@ void Members::RunInFocusChange(const std::function<void()>& command) {
 void Members::showEvent(QShowEvent* event) {
   QDialog::showEvent(event);
   if (!event->spontaneous()) {
-    Run([this] { Activate(); });
+    commands_.Run([this] { Activate(); });
   }
 }
 
@@ -145,7 +130,7 @@ void Members::Activate() {
 
 // Escape and the close box unload the window.
 void Members::reject() {
-  Run([this] { RunClearSearch(); });
+  commands_.Run([this] { RunClearSearch(); });
   QDialog::reject();
 }
 
@@ -159,7 +144,7 @@ bool Members::eventFilter(QObject* watched, QEvent* event) {
   if (watched == ui_->SearchText && event->type() == QEvent::KeyPress) {
     const int key = static_cast<QKeyEvent*>(event)->key();
     if (key == Qt::Key_Return || key == Qt::Key_Enter) {
-      Run([this] { RunSearch(); });  // and not OK, which would choose the member in view
+      commands_.Run([this] { RunSearch(); });  // and not OK, which would choose the member in view
       return true;
     }
   }

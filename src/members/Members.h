@@ -13,8 +13,7 @@
 #include "platform/FileDialog.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
-
-class QAbstractButton;
+#include "ui/Commands.h"
 
 namespace Ui {
 class Members;
@@ -58,9 +57,7 @@ class Members : public QDialog, private BoundControls {
 
   void SetCaptions();
   void ConnectCommands();
-  void ConnectButton(QAbstractButton& button, const std::function<void()>& command);
-  void Run(const std::function<void()>& command);
-  /// As Run, but a failure is told only when the present event is over.
+  /// Runs a command; a failure is told only when the present event is over.
   void RunInFocusChange(const std::function<void()>& command);
   void SetEntriesEnabled(bool enabled);
   void ShowPlace();
@@ -80,5 +77,6 @@ class Members : public QDialog, private BoundControls {
 
   std::unique_ptr<Ui::Members> ui_;
   const Parts parts_;
+  Commands commands_;
   std::optional<MemberRows> data1_;
 };

@@ -259,7 +259,6 @@ class MembersWindowOn : public MembersWindow {
     return *window;
   }
 
-  std::unique_ptr<Database> database = venue.Databases.OpenDatabase(venue.DataFile("members.mdb"));
   std::unique_ptr<Members> opened;
 };
 

@@ -55,7 +55,7 @@ std::uint8_t IdFromTeamAndNumber(std::uint8_t team, std::uint8_t number) {
     id = number + 96;
   }
   if (id > 255) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<std::uint8_t>(id);
 }

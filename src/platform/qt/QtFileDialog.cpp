@@ -3,10 +3,9 @@
 #include <QDir>
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QPointer>
 #include <QRegularExpression>
 #include <QStandardPaths>
-
-#include "platform/qt/DialogParent.h"
 
 namespace {
 
@@ -67,7 +66,7 @@ std::optional<std::string> QtFileDialog::ShowSave(const FileRequest& request) {
 
 std::optional<std::string> QtFileDialog::Ask(bool save, const FileRequest& request) {
   // Not on the stack: its parent may be destroyed, and the dialog with it, while it is open.
-  const QPointer<QFileDialog> dialog = new QFileDialog(DialogParent(mainWindow_));
+  const QPointer<QFileDialog> dialog = new QFileDialog(parent_());
   dialog->setObjectName(QStringLiteral("CommonDialog1"));
   dialog->setAcceptMode(save ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
   // A name without a file is for the caller to judge, also when opening.

@@ -1,8 +1,9 @@
 #pragma once
 
-#include <QPointer>
 #include <QStringList>
 #include <QWidget>
+#include <functional>
+#include <utility>
 
 #include "platform/FileDialog.h"
 
@@ -15,8 +16,8 @@ QStringList NameFilters(const std::string& filter);
 /// else in the user's documents.
 class QtFileDialog : public FileDialog {
  public:
-  /// Window that dialogs belong to while no window of the program is active.
-  void SetMainWindow(QWidget* mainWindow) { mainWindow_ = mainWindow; }
+  /// `parent` tells the window that one opened now belongs to; it may be none.
+  explicit QtFileDialog(std::function<QWidget*()> parent) : parent_(std::move(parent)) {}
 
   std::optional<std::string> ShowOpen(const FileRequest& request) override;
   std::optional<std::string> ShowSave(const FileRequest& request) override;
@@ -24,6 +25,6 @@ class QtFileDialog : public FileDialog {
  private:
   std::optional<std::string> Ask(bool save, const FileRequest& request);
 
-  QPointer<QWidget> mainWindow_;
+  std::function<QWidget*()> parent_;
   QString lastFolder_;
 };

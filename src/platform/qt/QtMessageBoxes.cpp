@@ -3,8 +3,7 @@
 #include <QCloseEvent>
 #include <QKeyEvent>
 #include <QMessageBox>
-
-#include "platform/qt/DialogParent.h"
+#include <QPointer>
 
 namespace {
 
@@ -87,7 +86,7 @@ BoxAnswer AnswerOf(int pressed, BoxButtons buttons) {
 BoxAnswer QtMessageBoxes::Show(const std::string& text, const std::string& title, BoxIcon icon,
                                BoxButtons buttons) {
   // Not on the stack: its parent may be destroyed, and the box with it, while it is open.
-  const QPointer<QMessageBox> box = NewBox(buttons, DialogParent(mainWindow_));
+  const QPointer<QMessageBox> box = NewBox(buttons, parent_());
   box->setTextFormat(Qt::PlainText);
   box->setText(QString::fromStdString(text));
   box->setWindowTitle(QString::fromStdString(title));

@@ -82,7 +82,7 @@ class QtFileDialogTest : public testing::Test {
     };
   }
 
-  QtFileDialog Dialog;
+  QtFileDialog Dialog{[] { return QApplication::activeModalWidget(); }};
 
  private:
   QTemporaryDir folder_;

@@ -30,7 +30,7 @@ class QtMessageBoxesTest : public testing::Test {
     return [key](QMessageBox& box) { QTest::keyClick(&box, key); };
   }
 
-  QtMessageBoxes Boxes;
+  QtMessageBoxes Boxes{[] { return QApplication::activeModalWidget(); }};
 };
 
 TEST_F(QtMessageBoxesTest, ShowsTextAndTitleToTheLetter) {
@@ -123,35 +123,6 @@ TEST_F(QtMessageBoxesTest, AQuestionOfYesAndNoIsClosedByItsButtonsAlone) {
                    }),
               answer);
   }
-}
-
-TEST_F(QtMessageBoxesTest, BelongsToTheModalWindowThatIsOpen) {
-  QWidget mainWindow;
-  mainWindow.show();
-  Boxes.SetMainWindow(&mainWindow);
-  QDialog dialog(&mainWindow);
-  dialog.setModal(true);
-  dialog.show();
-  Show(BoxButtons::Ok, [&](QMessageBox& box) {
-    EXPECT_EQ(box.parentWidget(), &dialog);
-    box.close();
-  });
-}
-
-TEST_F(QtMessageBoxesTest, BelongsToTheMainWindowWhenItIsVisibleAndNothingElseIsActive) {
-  QWidget mainWindow;
-  Boxes.SetMainWindow(&mainWindow);
-  ASSERT_EQ(QApplication::activeWindow(), nullptr);
-  Show(BoxButtons::Ok, [&](QMessageBox& box) {
-    EXPECT_EQ(box.parentWidget(), nullptr);
-    box.close();
-  });
-  mainWindow.setAttribute(Qt::WA_ShowWithoutActivating);
-  mainWindow.show();
-  Show(BoxButtons::Ok, [&](QMessageBox& box) {
-    EXPECT_EQ(box.parentWidget(), &mainWindow);
-    box.close();
-  });
 }
 
 TEST_F(QtMessageBoxesTest, AnswersTheLastButtonWhenItsWindowIsDestroyed) {

@@ -1,14 +1,13 @@
-#include "platform/qt/DialogParent.h"
+#include "ui/DialogParent.h"
 
 #include <QApplication>
-#include <QWidget>
 
-QWidget* DialogParent(QWidget* mainWindow) {
+QWidget* DialogParent::Window() const {
   if (QWidget* modal = QApplication::activeModalWidget()) {
     return modal;
   }
   if (QWidget* active = QApplication::activeWindow()) {
     return active;
   }
-  return mainWindow != nullptr && mainWindow->isVisible() ? mainWindow : nullptr;
+  return !mainWindow_.isNull() && mainWindow_->isVisible() ? mainWindow_.data() : nullptr;
 }
