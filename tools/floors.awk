@@ -109,7 +109,8 @@ function Check(file, name,    target, from, to) {
   includes[file] = includes[file] "\n" target
   from = Folder(file)
   to = Folder(target)
-  if (from != to && ++uses[from, to] == 1) edges[from] = edges[from] "\n" to
+  # A test ties no folders together: nothing includes it.
+  if (from != to && ++uses[from, to] && file !~ /Test\.cpp$/ && !linked[from, to]++) edges[from] = edges[from] "\n" to
   if (index(mayUse[Root(file)], " " Root(target) " ") == 0) {
     Fault(file ": " Root(file) "/ does not include " Root(target) "/: " target)
   } else if (Root(target) == "src") {

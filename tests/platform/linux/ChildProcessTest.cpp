@@ -1,13 +1,13 @@
 #include "platform/linux/ChildProcess.h"
 
 #include <fcntl.h>
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
 #include <sys/wait.h>
 
 #include <csignal>
 #include <string>
 
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
 #include "tests/support/Thrown.h"
 
 namespace {

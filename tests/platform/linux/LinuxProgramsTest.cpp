@@ -1,5 +1,6 @@
 #include "platform/linux/LinuxPrograms.h"
 
+#include <gtest/gtest.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -10,7 +11,6 @@
 #include <string>
 #include <thread>
 
-#include <gtest/gtest.h>
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/Thrown.h"
 
