@@ -5,11 +5,8 @@
 #include <QLibraryInfo>
 #include <QLocale>
 
-#include "app/frmRx.h"
 #include "core/data/FirstRun.h"
 #include "devices/buttons/ButtonSwipe.h"
-#include "platform/ErrorReport.h"
-#include "ui/Look.h"
 
 namespace {
 
@@ -27,17 +24,19 @@ std::string ModuleFolder() {
       .toStdString();
 }
 
-std::string SettingsFile(const Folders& folders) {
+std::string UserDataFolder(const Folders& folders) {
   std::string folder;
   folders.LocalAppData(folder);
-  return folder + UserDataSubfolder + "/tessarine.ini";
+  return folder + UserDataSubfolder;
 }
 
 }  // namespace
 
 Composition::Composition()
     : strings_(LanguageOfSystem()),
-      readerSettings_(files_, SettingsFile(folders_)),
+      log_(files_, clock_, UserDataFolder(folders_)),
+      logFolder_(UserDataFolder(folders_) + "/logs"),
+      readerSettings_(files_, UserDataFolder(folders_) + "/tessarine.ini"),
       wordProcessor_(ModuleFolder()) {
   if (strings_.TextLanguage() == Language::SimplifiedChinese &&
       dialogTexts_.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
@@ -46,19 +45,19 @@ Composition::Composition()
 }
 
 ::Services Composition::Services() {
-  return {strings_,
-          clock_,
-          databases_,
-          old_,
-          events_,
-          fileDialog_,
-          files_,
-          folders_,
-          boxes_,
-          devices_,
-          port_,
-          wordProcessor_,
-          [this] { return SwipeButton(); }};
+  return {.Strings = strings_,
+          .Time = clock_,
+          .Databases = databases_,
+          .Old = old_,
+          .Events = events_,
+          .CommonDialog1 = fileDialog_,
+          .Disk = files_,
+          .Places = folders_,
+          .Boxes = boxes_,
+          .Devices = devices_,
+          .MSComm1 = loggedPort_,
+          .WordProcessor = wordProcessor_,
+          .ButtonSwipe = [this] { return SwipeButton(); }};
 }
 
 std::string Composition::SwipeButton() {
@@ -66,16 +65,4 @@ std::string Composition::SwipeButton() {
   window.exec();
   return window.DallasID();
 }
-
-int RunProgram() {
-  PrepareLook();
-  Composition composition;
-  frmRx window(composition.Services());
-  composition.SetMainWindow(&window);
-  bool loaded = false;
-  if (!ReportErrors(composition.Boxes(), [&] { loaded = window.FormLoad(); }) || !loaded) {
-    return 1;
-  }
-  window.show();
-  return QApplication::exec();
 }

@@ -4,6 +4,9 @@
 
 #include "app/ConversionWithProgress.h"
 #include "app/Services.h"
+#include "core/data/LoggedBoxes.h"
+#include "core/data/ProgramLog.h"
+#include "core/line/LoggedPort.h"
 #include "core/text/StringTable.h"
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
@@ -29,6 +32,7 @@ class Composition {
   void SetMainWindow(QWidget* window) { parent_.SetMainWindow(window); }
 
   MessageBoxes& Boxes() { return boxes_; }
+  ProgramLog& Log() { return log_; }
 
  private:
   std::string SwipeButton();
@@ -43,14 +47,17 @@ class Composition {
   QtFileDialog fileDialog_{[this] { return parent_.Window(); }};
   LinuxFiles files_;
   QtFolders folders_;
-  QtMessageBoxes boxes_{[this] { return parent_.Window(); }};
+  ProgramLog log_;
+  QtMessageBoxes shownBoxes_{[this] { return parent_.Window(); }};
+  LoggedBoxes boxes_{shownBoxes_, log_};
   QtSerialDevices devices_;
+  const std::string logFolder_;
   QtSerialPort port_;
+  LoggedPort loggedPort_{port_, {files_, logFolder_, events_, clock_}, "line"};
   QtSerialPort readerPort_;
+  LoggedPort loggedReaderPort_{
+      readerPort_, {files_, logFolder_, events_, clock_}, "1-wire", Transcript::Repeats::Counted};
   IniReader readerSettings_;
-  SerialOneWire wire_{readerPort_, events_, readerSettings_, devices_};
+  SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
 };
-
-/// Shows the main window and runs the program until it is closed. Returns the process's exit code.
-int RunProgram();

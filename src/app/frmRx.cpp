@@ -14,6 +14,7 @@
 #include "core/data/FieldValue.h"
 #include "core/data/FirstRun.h"
 #include "core/data/UserDatabase.h"
+#include "core/text/Pieces.h"
 #include "platform/ErrorReport.h"
 #include "ui/Text.h"
 #include "ui_frmRx.h"
@@ -133,12 +134,17 @@ void frmRx::SetUpLists() {
 }
 
 bool frmRx::OpenDatabases() {
-  backups_.emplace(userDataFolder_ + "/backups", services_.Disk, services_.Time);
+  backups_.emplace(userDataFolder_ + "/backups", services_.Disk, services_.Time, services_.Strings);
   const auto open = [this](const std::string& name, const std::string& table) {
     const std::string program = services_.Places.Program();
     return OpenUserDatabase(
         {userDataFolder_ + "/" + name + ".mdb", table, program + "/" + name + "_default.mdb"},
-        {services_.Databases, services_.Old, services_.Disk, services_.Boxes, *backups_});
+         {.Engine = services_.Databases,
+          .Old = services_.Old,
+          .Disk = services_.Disk,
+          .Boxes = services_.Boxes,
+          .Copies = *backups_,
+          .Strings = services_.Strings});
   };
   dbScenarios_ = open("scenarios", "Table1");
   if (!dbScenarios_) {

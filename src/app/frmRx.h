@@ -16,7 +16,7 @@
 #include "core/game/ScoreAnalysis.h"
 #include "core/game/ScoreList.h"
 #include "core/game/SoldieringFactors.h"
-#include "core/gamefile/GameFileDialog.h"
+#include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
 #include "sheets/PrintOptions.h"
 
@@ -94,7 +94,7 @@ class frmRx : public QMainWindow {
   SoldieringFactors factors_;
   ScoreList scoreDisplay_;
   ScoreList teamScores_;
-  GameFileDialog gameFile_;
+  CurrentGameFile gameFile_;
   std::string userDataFolder_;
 
   // In the order in which start-up makes them.

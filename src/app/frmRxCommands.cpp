@@ -100,19 +100,19 @@ void frmRx::PrintScores() {
     return;
   }
   SheetProgressWindow progress(services_.Strings, this);
-  const SheetSources sources{game_,
-                             *rsMembers_,
-                             *members_,
-                             services_.Strings,
-                             services_.Time,
-                             services_.Events,
-                             services_.Disk,
-                             services_.Boxes,
-                             services_.WordProcessor,
-                             progress,
-                             userDataFolder_,
-                             missions_->Text()};
-  ScoreSheets(sources, printOptions_->Choice()).GenerateScoreSheets();
+  const SheetParts parts{.Board = game_,
+                         .RsMembers = *rsMembers_,
+                         .Members = *members_,
+                         .Strings = services_.Strings,
+                         .Time = services_.Time,
+                         .Events = services_.Events,
+                         .Disk = services_.Disk,
+                         .Boxes = services_.Boxes,
+                         .WordApp = services_.WordProcessor,
+                         .Progress = progress,
+                         .UserDataFolder = userDataFolder_,
+                         .MissionName = missions_->Text()};
+  ScoreSheets(parts, printOptions_->Choice()).GenerateScoreSheets();
 }
 
 void frmRx::ShowCommPortSettings() {
@@ -156,8 +156,13 @@ void frmRx::CheckMembershipButton() {
 }
 
 std::string frmRx::ShowMembers(std::int32_t contactToShow) {
-  Members window({*dbMembers_, services_.Boxes, services_.CommonDialog1, services_.Disk, services_.Time,
-                  services_.Strings, services_.ButtonSwipe},
+  Members window({.DbMembers = *dbMembers_,
+                  .Boxes = services_.Boxes,
+                  .CommonDialog1 = services_.CommonDialog1,
+                  .Disk = services_.Disk,
+                  .Time = services_.Time,
+                  .Strings = services_.Strings,
+                  .ButtonSwipe = services_.ButtonSwipe},
                  this);
   window.ContactToShow = contactToShow;
   window.exec();
@@ -180,8 +185,13 @@ void frmRx::SetUpMissions() {
 }
 
 void frmRx::ManageRemotely() {
-  RemoteManage({services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time,
-                services_.Strings, game_},
+  RemoteManage({.MSComm1 = services_.MSComm1,
+                .Port = *commPort_,
+                .Events = services_.Events,
+                .Boxes = services_.Boxes,
+                .Time = services_.Time,
+                .Strings = services_.Strings,
+                .Scores = game_},
                this)
       .exec();
   CalculateScores();

@@ -4,7 +4,7 @@
 #include <string>
 
 #include "core/data/FieldValue.h"
-#include "core/data/IniReader.h"
+#include "core/text/Pieces.h"
 #include "ui/Captions.h"
 #include "ui_MissionResultEntry.h"
 

@@ -25,7 +25,8 @@ class Members : public QDialog, private BoundControls {
   Q_OBJECT
 
  public:
-  struct Needs {
+  /// What the window works with; it outlives it.
+  struct Parts {
     Database& DbMembers;
     MessageBoxes& Boxes;
     FileDialog& CommonDialog1;
@@ -33,10 +34,10 @@ class Members : public QDialog, private BoundControls {
     const Clock& Time;
     const StringTable& Strings;
     /// Waits for a membership button; its number, or NoDallasId. May be empty where there is no reader.
-    std::function<std::string()> ButtonSwipe;
+    std::function<std::string()> ButtonSwipe = {};
   };
 
-  Members(Needs needs, QWidget* parent);
+  Members(Parts parts, QWidget* parent);
   ~Members() override;
 
   std::int32_t ContactToShow = 0;  ///< member to stand on when the window comes up, 0 for none
@@ -54,6 +55,7 @@ class Members : public QDialog, private BoundControls {
   MemberDetails Entered() const override;
   void RowChanged() override;
 
+  void SetCaptions();
   void ConnectCommands();
   /// Runs a command; a failure is told only when the present event is over.
   void RunInFocusChange(const std::function<void()>& command);
@@ -74,7 +76,7 @@ class Members : public QDialog, private BoundControls {
   void SelectMember();
 
   std::unique_ptr<Ui::Members> ui_;
-  const Needs needs_;
+  const Parts parts_;
   Commands commands_;
   std::optional<MemberRows> data1_;
 };

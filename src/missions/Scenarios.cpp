@@ -296,7 +296,7 @@ void Scenarios::StartRow() {
     // A row whose insertion failed is still to be added; any other save must meet the row that the list
     // shows.
     if (!FindSelectedMission()) {
-      throw RuntimeError(3021);
+      throw RuntimeError(Fault::NoCurrentRecord);
     }
     rsScenarios_.Edit();
   }

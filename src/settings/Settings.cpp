@@ -18,7 +18,7 @@ Settings::Settings(IniReader& ini, const SerialDevices& devices, MessageBoxes& b
       checks_(commands_, boxes) {
   ui_->setupUi(this);
   SetCaptions(strings, {{this, 160}, {ui_->Frame1, 161}, {ui_->SaveExit, 162}, {ui_->Cancel, 141}});
-  ui_->CommPortNumber->setText(QString::fromStdString(ini_.ReadIni("comm", "commport", "1")));
+  ui_->CommPortNumber->setText(QString::fromStdString(ini_.ReadIni(Keys::CommPort)));
   ui_->CommPortNumber->selectAll();
   ListAvailablePorts(devices);
   checks_.Add(*ui_->CommPortNumber, [this] { return FaultOfPortNumber(); });
@@ -54,7 +54,7 @@ std::optional<EntryFault> Settings::FaultOfPortNumber() const {
 
 void Settings::SaveAndExit() {
   if (checks_.Holds(*ui_->CommPortNumber)) {
-    ini_.WriteIni("comm", "commport", Str(std::int32_t{ToInt16(ui_->CommPortNumber->text().toStdString())}));
+    ini_.WriteIni(Keys::CommPort, Str(std::int32_t{ToInt16(ui_->CommPortNumber->text().toStdString())}));
     accept();
   }
 }

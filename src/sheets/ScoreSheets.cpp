@@ -49,18 +49,18 @@ void CheckFileName(const std::string& name) {
             std::string_view("\\/:*?\"<>|").find(c) == std::string_view::npos;
   }
   if (!valid) {
-    throw RuntimeError(75);
+    throw RuntimeError(Fault::PathAccess);
   }
 }
 
 }  // namespace
 
-ScoreSheets::ScoreSheets(const SheetSources& sources, const PrintChoice& choice)
-    : in_(sources),
+ScoreSheets::ScoreSheets(const SheetParts& parts, const PrintChoice& choice)
+    : in_(parts),
       choice_(choice),
-      folder_(sources.UserDataFolder + "/scores"),
-      winner_(WinningTeam(sources.Board)),
-      sheetDate_(WithoutWeekday(sources.Time.LongDate(sources.Board.GameDate))) {}
+      folder_(parts.UserDataFolder + "/scores"),
+      winner_(WinningTeam(parts.Board)),
+      sheetDate_(WithoutWeekday(parts.Time.LongDate(parts.Board.GameDate))) {}
 
 void ScoreSheets::GenerateScoreSheets() {
   std::optional<StageFailure> failure;

@@ -1,6 +1,8 @@
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
+#include <QApplication>
 #include <QMessageBox>
+#include <QTimer>
 #include <filesystem>
 
 #include "app/Composition.h"
@@ -39,6 +41,27 @@ TEST_F(ReaderOfTheProgram, AsksForAButtonAndTellsItsCode) {
   EXPECT_EQ(composition.Services().ButtonSwipe(), "A300CDAB89674501");
   EXPECT_EQ(touch.Runs(), 1);
   EXPECT_EQ(told, QStringLiteral("Membership button read sucessfully, code = A300CDAB89674501"));
+}
+
+TEST_F(ReaderOfTheProgram, KeepsATranscriptThatCountsPollsWithoutChange) {
+  {
+    Composition composition;
+    int polls = 0;
+    QTimer timer;
+    QObject::connect(&timer, &QTimer::timeout, [&polls] {
+      if (++polls == 12) {
+        QApplication::activeModalWidget()->close();
+      }
+    });
+    timer.start(100);
+    composition.Services().ButtonSwipe();
+  }
+  const std::string log = ReadFile(data / "Orvalin/Tessarine/logs/1-wire.log");
+  EXPECT_THAT(log, testing::HasSubstr(" 1-wire <- C1\n"));
+  EXPECT_THAT(log, testing::HasSubstr(" 1-wire -> CD"));
+  EXPECT_THAT(log, testing::HasSubstr(" 1-wire -- closed\n"));
+  // In turn the walk finds the reader's own device and the end of the bus.
+  EXPECT_THAT(log, testing::HasSubstr(" 1-wire -- the last ones again, "));
 }
 
 TEST_F(ReaderOfTheProgram, GivesNoButtonAfterCancel) {

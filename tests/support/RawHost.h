@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "sim/line/FileDescriptor.h"
+#include "sim/line/LineSettings.h"
 
 namespace sim {
 
@@ -22,6 +23,9 @@ class RawHost {
   /// Fails the running test when `path` cannot be opened.
   explicit RawHost(const std::string& path);
 
+  /// Sets the host's end of the line; without this it has what the device begins with.
+  void Speak(const LineSettings& settings) { SetRawLine(line_.Get(), settings); }
+  LineSettings Settings() const { return ReadLineSettings(line_.Get()); }
   void Write(const Bytes& bytes);
   /// None when `longestWait` passed first or the line hung up.
   std::optional<std::uint8_t> ReadByte(std::chrono::milliseconds longestWait = limit);

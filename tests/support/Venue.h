@@ -43,8 +43,19 @@ class Venue : public DataSite {
     if (waits_ == Waits::Real) {
       events = &RealEvents;
     }
-    Window = std::make_unique<frmRx>(::Services{Strings, Time, Databases, Old, *events, Dialog, Disk, Places,
-                                                Boxes, Devices, Port, Word, ButtonSwipe});
+    Window = std::make_unique<frmRx>(::Services{.Strings = Strings,
+                                                .Time = Time,
+                                                .Databases = Databases,
+                                                .Old = Old,
+                                                .Events = *events,
+                                                .CommonDialog1 = Dialog,
+                                                .Disk = Disk,
+                                                .Places = Places,
+                                                .Boxes = Boxes,
+                                                .Devices = Devices,
+                                                .MSComm1 = Port,
+                                                .WordProcessor = Word,
+                                                .ButtonSwipe = ButtonSwipe});
     return *Window;
   }
 

@@ -15,7 +15,7 @@ bool IsDue(const Player& player) {
 
 double Quotient(double sum, double count) {
   if (count == 0) {
-    throw RuntimeError(11);
+    throw RuntimeError(Fault::DivisionByZero);
   }
   return sum / count;
 }

@@ -16,6 +16,7 @@ ButtonSwipe::ButtonSwipe(OneWire& wire, MessageBoxes& boxes, const StringTable& 
       commands_(*this, boxes),
       timer1_(new PollTimer(commands_, PollMilliseconds, [this] { Tick(); })) {
   ui_->setupUi(this);
+  ui_->Image1->setAccessibleName(Text(strings, OwnText::ButtonPicture));
   ui_->Cancel->setText(Text(strings, 141));
   timer1_->setObjectName(QStringLiteral("Timer1"));
 }

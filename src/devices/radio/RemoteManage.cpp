@@ -47,6 +47,7 @@ void RemoteManage::SetUpList() {
   figures.setPointSizeF(figures.pointSizeF() * 1.25);
   ui_->DataList->setFont(figures);
   ui_->DataList->setModel(list_);
+  ui_->DataList->setAccessibleName(Text(parts_.Strings, OwnText::GunList));
   ui_->DataList->verticalHeader()->hide();
   ui_->DataList->verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
   ui_->DataList->verticalHeader()->setDefaultSectionSize(QFontMetrics(figures).height() + 10);
@@ -81,7 +82,7 @@ void RemoteManage::SearchForGuns() {
 
 void RemoteManage::GetScores() {
   Work([this](RadioLink& link) {
-    ScoreFetch(link, parts_.Events, parts_.Time, parts_.Scores, guns_, *this).GetScores();
+    ScoreFetch(link, parts_.Events, parts_.Time, parts_.Strings, parts_.Scores, guns_, *this).GetScores();
   });
 }
 

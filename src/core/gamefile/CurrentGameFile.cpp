@@ -1,4 +1,4 @@
-#include "core/gamefile/GameFileDialog.h"
+#include "core/gamefile/CurrentGameFile.h"
 
 #include "core/gamefile/GameFile.h"
 #include "platform/RuntimeError.h"
@@ -18,19 +18,19 @@ std::string ReadOrNothing(const Files& files, const std::string& path) {
 
 }  // namespace
 
-void GameFileDialog::SaveGame(const Game& game, const std::string& missionName) {
-  fileName_ = dialog_.ShowSave(Filter, fileName_);
+void CurrentGameFile::SaveGame(const Game& game, const std::string& missionName) {
+  fileName_ = dialog_.ShowSave({.Filter = Filter, .Name = fileName_}).value_or(fileName_);
   if (!fileName_.empty()) {
     files_.Replace(fileName_, WriteGameFile(game, missionName));
   }
 }
 
-bool GameFileDialog::AskForGame() {
-  fileName_ = dialog_.ShowOpen(Filter, "");
+bool CurrentGameFile::AskForGame() {
+  fileName_ = dialog_.ShowOpen({.Filter = Filter}).value_or("");
   return !fileName_.empty();
 }
 
-bool GameFileDialog::LoadGame(Game& game, const std::function<void(const std::string&)>& selectMission) {
+bool CurrentGameFile::LoadGame(Game& game, const std::function<void(const std::string&)>& selectMission) {
   if (ReadGameFile(ReadOrNothing(files_, fileName_), game, selectMission)) {
     return true;
   }

@@ -1,4 +1,4 @@
-#include "core/gamefile/GameFileDialog.h"
+#include "core/gamefile/CurrentGameFile.h"
 
 #include <gmock/gmock.h>
 
@@ -26,7 +26,7 @@ class GameFiles : public testing::Test {
   FakeMessageBoxes boxes;
   StringTable strings{Language::English};
   Game game{strings};
-  GameFileDialog gameFile{dialog, files, boxes};
+  CurrentGameFile gameFile{dialog, files, boxes};
 };
 
 TEST_F(GameFiles, AreSavedUnderTheChosenNameWithoutABox) {

@@ -8,17 +8,17 @@
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
 
-/// Load Game and Save Game, with the file name that both keep for the next time.
-class GameFileDialog {
+/// The file that Load Game and Save Game were last about, whose name both keep for the next time.
+class CurrentGameFile {
  public:
-  GameFileDialog(FileDialog& dialog, Files& files, MessageBoxes& boxes)
+  CurrentGameFile(FileDialog& dialog, Files& files, MessageBoxes& boxes)
       : dialog_(dialog), files_(files), boxes_(boxes) {}
 
   /// Asks for a name and saves there, replacing the file. Cancel saves under the name of the last load or
   /// save, and does nothing when there is none. A failure throws RuntimeError and leaves the old file.
   void SaveGame(const Game& game, const std::string& missionName);
 
-  /// Asks for a game to load. False when the operator cancels.
+  /// Asks for a game to load. False when the operator cancels, which also forgets the file.
   bool AskForGame();
 
   /// Reads the chosen file into the cleared `game`. Returns false after a box when it is no game file;
