@@ -12,6 +12,9 @@ class DatePicker : public QLineEdit {
  public:
   explicit DatePicker(QWidget* parent);
 
+  /// What an assistive program calls the button that opens the calendar.
+  void SetCalendarName(const QString& name);
+
   /// Shows a date as the database keeps it, "YYYY-MM-DD HH:MM:SS"; nothing for any other text.
   void SetStored(const std::string& stored);
 

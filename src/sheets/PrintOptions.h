@@ -27,7 +27,6 @@ class PrintOptions : public QDialog {
   void reject() override;
 
  private:
-  void SetCaptions(const StringTable& strings);
   void FillLists(const StringTable& strings);
   /// Only the lists of the option that is set can be used.
   void EnableLists();

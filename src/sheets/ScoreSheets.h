@@ -17,8 +17,8 @@
 #include "sheets/PrintChoice.h"
 #include "sheets/SheetProgress.h"
 
-/// What a run of score sheets works with.
-struct SheetSources {
+/// What a run of score sheets works with; it outlives the run.
+struct SheetParts {
   const Game& Board;
   Recordset& RsMembers;
   MemberLookup& Members;
@@ -38,7 +38,7 @@ struct SheetSources {
 /// as one PDF too.
 class ScoreSheets {
  public:
-  ScoreSheets(const SheetSources& sources, const PrintChoice& choice);
+  ScoreSheets(const SheetParts& parts, const PrintChoice& choice);
 
   /// Runs to the end, which a box tells; to the first failure, which a box tells too; or, without a box,
   /// until the program closes. Events are served all the while. Sheets that were made stay.
@@ -51,7 +51,7 @@ class ScoreSheets {
   void MakeSheet(int index, int number, int count);
   void StartWordProcessor();
   void FillPlayer(WordDocument& document, int index, int number, int count);
-  void AddPhoto(WordDocument& document);
+  void AddPhoto(WordDocument& document, const Member& member);
   void FillGame(WordDocument& document, int index);
   void Save(WordDocument& document);
   /// A name in the folder of sheets that is not taken: `base` and the extension, with a number between where
@@ -62,7 +62,7 @@ class ScoreSheets {
   /// Lets events be served. Ends the run when the program closes.
   void ServeEvents();
 
-  const SheetSources& in_;
+  const SheetParts& in_;
   const PrintChoice& choice_;
   std::string folder_;
   int winner_ = 0;

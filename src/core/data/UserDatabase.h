@@ -4,6 +4,7 @@
 #include <string>
 
 #include "core/data/Backups.h"
+#include "core/text/StringTable.h"
 #include "platform/Database.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
@@ -17,12 +18,13 @@ struct UserDatabase {
 };
 
 /// What is needed to open one.
-struct DatabaseServices {
+struct DatabaseParts {
   DatabaseEngine& Engine;
   OldDatabases& Old;
   Files& Disk;
   MessageBoxes& Boxes;
   Backups& Copies;
+  const StringTable& Strings;
 };
 
 /// Opens a database, of which a backup copy will be made before its first change. A file of an old
@@ -30,4 +32,4 @@ struct DatabaseServices {
 /// asked whether to go on with a fresh copy beside it, named "...-new.mdb", which is kept for the next such
 /// start. Returns nullptr when the operator chose to end the program. Throws RuntimeError as
 /// DatabaseEngine::OpenDatabase does for all but an unrecognized format.
-std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseServices& services);
+std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseParts& parts);

@@ -11,7 +11,7 @@ namespace {
 
 void AddTo(std::int32_t& sum, std::int32_t amount) {
   if (__builtin_add_overflow(sum, amount, &sum)) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
 }
 
@@ -36,11 +36,18 @@ bool AddHits(std::int32_t* sums, const std::int32_t* hits) {
   return signs <= std::numeric_limits<std::int32_t>::max();
 }
 
+AccuracyKind KindOfAccuracy(const Player& player) {
+  if (player.PrimaryDamage == 0) {
+    return AccuracyKind::NoPrimaryDamage;
+  }
+  return player.ShotCount > 0 ? AccuracyKind::Known : AccuracyKind::NoShots;
+}
+
 }  // namespace
 
 void ScoreAnalysis::CalculateScores() {
-  scoreDisplay_.Clear();
-  teamScores_.Clear();
+  players_.Clear();
+  teams_.Clear();
   for (std::int32_t& total : game_.TeamTotals) {
     total = 0;
   }
@@ -52,8 +59,8 @@ void ScoreAnalysis::CalculateScores() {
     }
   }
   ListTeams();
-  SortListNumeric(scoreDisplay_, static_cast<int>(BoardColumn::Soldiering), true, game_);
-  SortListNumeric(teamScores_, static_cast<int>(BoardColumn::Soldiering), true, game_);
+  SortListNumeric(players_, BoardColumn::Soldiering, true, game_);
+  SortListNumeric(teams_, BoardColumn::Soldiering, true, game_);
 }
 
 void ScoreAnalysis::AddUpDamage() {
@@ -118,33 +125,34 @@ void ScoreAnalysis::ScorePlayer(int index) {
   Player& player = game_.Players(index);
   const int team = TeamFromId(IdFromIndex(index));
   // What may show a box comes before the row: a command given meanwhile can rebuild the lists.
-  std::string playerText = PlayerText(index);
+  std::string memberName = NameOfMember(player);
   CalculateAccuracy(player);
   CalculateSoldiering(player);
   AddMissionPoints(player, game_.TeamNames(team));
-  ScoreList::Row& row = scoreDisplay_.AddRow();
-  row.Cells[1] = std::move(playerText);
-  row.Cells[0] = Str(std::int32_t{player.Rank});
-  row.Cells[2] = Str(player.Soldiering);
-  row.Cells[3] = AccuracyText(player);
-  row.Cells[4] = Str(player.TotalDamage);
-  row.Cells[5] = Str(player.ShotCount);
-  row.Cells[6] = Str(player.HealCount);
-  row.Cells[7] = Str(player.DeathCount);
-  row.Cells[8] = Str(player.AmmoAddCount);
+  players_.AddRow({.Index = index,
+                   .Team = team,
+                   .Rank = player.Rank,
+                   .MemberName = std::move(memberName),
+                   .Soldiering = player.Soldiering,
+                   .HasAccuracy = KindOfAccuracy(player),
+                   .Accuracy = player.Accuracy,
+                   .Damage = player.TotalDamage,
+                   .ShotsFired = player.ShotCount,
+                   .Wia = player.HealCount,
+                   .Kia = player.DeathCount,
+                   .AmmoAdds = player.AmmoAddCount});
   AddTo(game_.TeamTotals(team), player.Soldiering);
 }
 
-std::string ScoreAnalysis::PlayerText(int index) {
-  Player& player = game_.Players(index);
+std::string ScoreAnalysis::NameOfMember(Player& player) {
   if (player.MemberIndex == 0 && player.DallasID != NoDallasId) {
     player.MemberIndex = members_.FindByDallasId(player.DallasID);
   }
-  std::string text = game_.DisplayName(index);
-  if (player.MemberIndex != 0 && members_.LoadMember(player.MemberIndex)) {
-    text += ": " + members_.GetPlayerName(true);
+  if (player.MemberIndex == 0) {
+    return {};
   }
-  return text;
+  const std::optional<Member> member = members_.LoadMember(player.MemberIndex);
+  return member ? member->GetPlayerName(true) : std::string();
 }
 
 void ScoreAnalysis::CalculateAccuracy(Player& player) const {
@@ -206,18 +214,8 @@ ScoreAnalysis::MissionPoints ScoreAnalysis::ReadMissionPoints() {
   return points;
 }
 
-std::string ScoreAnalysis::AccuracyText(const Player& player) const {
-  if (player.PrimaryDamage == 0) {
-    return strings_.Text(126);
-  }
-  return player.ShotCount > 0 ? FormatPercent(player.Accuracy) : strings_.Text(129);
-}
-
 void ScoreAnalysis::ListTeams() {
   for (int team = 1; team <= TeamCount; ++team) {
-    ScoreList::Row& row = teamScores_.AddRow();
-    row.Cells[0] = Str(0);
-    row.Cells[1] = game_.TeamNames(team);
-    row.Cells[2] = Str(game_.TeamTotals(team));
+    teams_.AddRow({.Team = team, .Soldiering = game_.TeamTotals(team)});
   }
 }

@@ -31,6 +31,9 @@ class Ds2480b {
   /// an empty bus when the program closes meanwhile, since that is no fault to tell of.
   bool Detect();
 
+  /// False once an answer did not come or was wrong: the chip counts as gone for this session.
+  bool Answers() const { return !lost_; }
+
   /// Resets the bus, unless nothing was sent to it since the last reset. None also when the chip does not
   /// answer.
   Presence Reset();
@@ -56,6 +59,6 @@ class Ds2480b {
   Presence presence_ = Presence::None;
   bool busIsReset_ = false;
   bool inDataMode_ = false;
-  bool lost_ = false;   ///< an answer did not come or was another's: the chip counts as gone for this session
+  bool lost_ = false;
   bool ended_ = false;  ///< the program closes
 };

@@ -86,8 +86,8 @@ class SqliteRecordset : public Recordset {
   std::vector<Value> ownRow_;                ///< a row that was read outside of a group of reads
   const std::vector<Value>* row_ = nullptr;  ///< the current row once it is read
   RowCache cache_;
-  bool lookedUp_ =
-      false;  ///< the current row was searched by a value, as will be again; a walk reads each row once
+  /// The current row was searched by a value, as will be again; a walk reads each row once.
+  bool lookedUp_ = false;
   std::map<std::size_t, Value> longValues_;
 
   PendingRow pending_;
