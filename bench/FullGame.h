@@ -4,11 +4,11 @@
 #include <memory>
 #include <string>
 
+#include "core/game/BoardTexts.h"
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
 #include "core/game/MissionList.h"
 #include "core/game/ScoreAnalysis.h"
-#include "core/game/ScoreList.h"
 #include "platform/sqlite/SqliteDatabase.h"
 
 /// The fullest game: all 224 players active, all 50,176 hits above 0.
@@ -32,6 +32,10 @@ class FullGame {
 
   void CalculateScores();
 
+  /// Makes the texts of all cells of both lists, as a screen that shows them all does; how many letters they
+  /// have.
+  std::size_t ShowLists() const;
+
   /// Makes the next calculation look up all players by their buttons.
   void Unassign();
 
@@ -51,7 +55,8 @@ class FullGame {
   std::unique_ptr<Recordset> rsMembers_;
   std::unique_ptr<MemberLookup> members_;
   SoldieringFactors factors_;
-  ScoreList board_;
-  ScoreList teams_;
+  Board players_{[] {}};
+  Board teams_{[] {}};
+  BoardTexts texts_{game, Strings};
   std::unique_ptr<ScoreAnalysis> analysis_;
 };

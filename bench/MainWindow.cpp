@@ -4,10 +4,8 @@
 #include <QLineEdit>
 #include <QTimer>
 
-#include "app/Composition.h"
-#include "app/frmRx.h"
+#include "app/Program.h"
 #include "bench/FirstIdle.h"
-#include "platform/ErrorReport.h"
 
 namespace {
 
@@ -30,17 +28,13 @@ void LoadThroughMenu(QWidget& window, const QString& file) {
 int main(int argc, char** argv) {
   QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
   QApplication application(argc, argv);
-  PrepareApplication();
-  Composition composition;
-  frmRx window(composition.Services());
-  composition.SetMainWindow(&window);
-  if (!ReportErrors(composition.Boxes(), [&window] { window.FormLoad(); })) {
+  Program program;
+  if (!program.Start()) {
     return 1;
   }
-  window.show();
   if (argc > 1) {
-    LoadThroughMenu(window, QString::fromLocal8Bit(argv[1]));
+    LoadThroughMenu(program.Window(), QString::fromLocal8Bit(argv[1]));
   }
-  QuitWhenUsable(window);
+  QuitWhenUsable(program.Window());
   return QApplication::exec();
 }

@@ -35,8 +35,8 @@ class NoBoxes : public MessageBoxes {
 
 class NoDialog : public FileDialog {
  public:
-  std::string ShowOpen(const std::string&, const std::string&) override { return {}; }
-  std::string ShowSave(const std::string&, const std::string&) override { return {}; }
+  std::optional<std::string> ShowOpen(const FileRequest&) override { return std::nullopt; }
+  std::optional<std::string> ShowSave(const FileRequest&) override { return std::nullopt; }
 };
 
 /// The files used by one run of this benchmark.
@@ -195,7 +195,13 @@ void NextMember(benchmark::State& state, const Folder& folder) {
   const QtClock clock;
   SqliteEngine engine;
   const auto database = engine.OpenDatabase(folder.Members());
-  Members window({*database, boxes, dialog, disk, clock, strings, {}}, nullptr);
+  Members window({.DbMembers = *database,
+                  .Boxes = boxes,
+                  .CommonDialog1 = dialog,
+                  .Disk = disk,
+                  .Time = clock,
+                  .Strings = strings},
+                 nullptr);
   window.show();
   QApplication::processEvents();
   auto* next = window.findChild<QPushButton*>(QStringLiteral("DataNext"));

@@ -14,6 +14,7 @@
 #include "devices/radio/RemoteManage.h"
 #include "sim/game/GameMaker.h"
 #include "sim/radio/RadioModem.h"
+#include "ui/Look.h"
 
 namespace {
 
@@ -135,7 +136,7 @@ bool MeasureSite() {
 
 int main(int argc, char** argv) {
   QApplication application(argc, argv);
-  PrepareApplication();
+  PrepareLook();
   bool met = MeasureParser();
   met &= MeasureSite();
   return met ? 0 : 1;

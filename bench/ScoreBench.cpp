@@ -41,6 +41,7 @@ void Score(benchmark::State& state, int members, int mode, bool byButton) {
       full.Unassign();
     }
     full.CalculateScores();
+    benchmark::DoNotOptimize(full.ShowLists());
   }
 }
 BENCHMARK_CAPTURE(Score, plain, 0, MissionList::None, false);

@@ -1,6 +1,3 @@
-#include <fcntl.h>
-#include <spawn.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 #include <QApplication>
@@ -17,6 +14,7 @@
 #include "bench/PlainSheets.h"
 #include "core/data/Photo.h"
 #include "platform/libreoffice/LibreOffice.h"
+#include "platform/linux/ChildProcess.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/qt/QtClock.h"
 #include "platform/qt/QtEventPump.h"
@@ -212,54 +210,50 @@ double OwnRun(Evening& evening, LibreOffice& office, std::int16_t target, Times&
   LinuxFiles files;
   TimedWord word(office, times);
   SheetProgressWindow progress(evening.Strings, nullptr);
-  const SheetSources sources{
-      evening.Board, *evening.RsMembers, members, evening.Strings, clock,          pump,
-      files,         evening.Boxes,      word,    progress,        evening.Folder, "Bench"};
+  const SheetParts parts{.Board = evening.Board,
+                         .RsMembers = *evening.RsMembers,
+                         .Members = members,
+                         .Strings = evening.Strings,
+                         .Time = clock,
+                         .Events = pump,
+                         .Disk = files,
+                         .Boxes = evening.Boxes,
+                         .WordApp = word,
+                         .Progress = progress,
+                         .UserDataFolder = evening.Folder,
+                         .MissionName = "Bench"};
   const PrintChoice choice{SheetSelection::All, false, target, 0, 0};
   const auto start = Steady::now();
   times.Served = start;
-  ScoreSheets(sources, choice).GenerateScoreSheets();
+  ScoreSheets(parts, choice).GenerateScoreSheets();
   return MillisecondsSince(start);
 }
 
 /// A separate LibreOffice for PlainSheets.
 class PlainOffice {
  public:
-  explicit PlainOffice(const std::string& host) {
-    int leash[2];
-    if (pipe2(leash, O_CLOEXEC) != 0) {
-      std::abort();
-    }
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    posix_spawn_file_actions_adddup2(&actions, leash[0], STDIN_FILENO);
-    std::string office = LIBREOFFICE_PROGRAM "/soffice.bin";
-    char* const arguments[] = {const_cast<char*>(host.c_str()), office.data(), Pipe.data(), nullptr};
-    if (posix_spawn(&process_, host.c_str(), &actions, nullptr, arguments, environ) != 0) {
-      std::abort();
-    }
-    posix_spawn_file_actions_destroy(&actions);
-    close(leash[0]);
-    leash_ = leash[1];
+  explicit PlainOffice(const std::string& host)
+      : process_({host, LIBREOFFICE_PROGRAM "/soffice.bin", Name}, {.Input = leash_.ReadEnd.Number()}) {
+    leash_.ReadEnd.Close();
   }
   ~PlainOffice() {
-    close(leash_);
-    waitpid(process_, nullptr, 0);
+    leash_.WriteEnd.Close();
+    process_.Wait();
   }
   PlainOffice(const PlainOffice&) = delete;
   PlainOffice& operator=(const PlainOffice&) = delete;
 
-  std::string Pipe = "tessarine-plain-" + std::to_string(getpid());
+  std::string Name = "tessarine-plain-" + std::to_string(getpid());  ///< of the pipe on which it listens
 
  private:
-  pid_t process_ = 0;
-  int leash_ = -1;
+  Pipe leash_;
+  ChildProcess process_;
 };
 
 /// Time for all 224 sheets made by PlainSheets, in milliseconds, extrapolated from some of them.
 double PlainRun(Evening& evening, const std::string& host) {
   const PlainOffice office(host);
-  PlainSheets plain(office.Pipe);
+  PlainSheets plain(office.Name);
   MemberLookup members(*evening.RsMembers, evening.Boxes);
   LinuxFiles files;
   const auto start = Steady::now();
@@ -270,8 +264,9 @@ double PlainRun(Evening& evening, const std::string& host) {
       sheet.Bookmarks.insert(sheet.Bookmarks.end(), texts.begin(), texts.end());
     };
     add(ResultTexts(evening.Board, index, WinningTeam(evening.Board)));
-    members.LoadMember(evening.Board.Players(index).MemberIndex);
-    add(MemberTexts(*evening.RsMembers, members));
+    const std::int32_t contactId = evening.Board.Players(index).MemberIndex;
+    const std::optional<Member> member = members.LoadMember(contactId);
+    add(MemberTexts(*member, members.LoadHistory(contactId)));
     sheet.Photo = files.MakeTempFileName();
     ExportPhoto(*evening.RsMembers, "Photograph", "PhotographLength", sheet.Photo, files);
     add(GameTexts(evening.Board.Players(index), "Bench", "15 November 2026", " 1"));

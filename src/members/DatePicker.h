@@ -12,6 +12,9 @@ class DatePicker : public QLineEdit {
  public:
   explicit DatePicker(QWidget* parent);
 
+  /// The accessible name of the button that opens the calendar.
+  void SetCalendarName(const QString& name);
+
   /// Shows a date in the database's form, "YYYY-MM-DD HH:MM:SS"; shows nothing for any other text.
   void SetStored(const std::string& stored);
 

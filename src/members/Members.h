@@ -13,8 +13,7 @@
 #include "platform/FileDialog.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
-
-class QAbstractButton;
+#include "ui/Commands.h"
 
 namespace Ui {
 class Members;
@@ -26,7 +25,8 @@ class Members : public QDialog, private BoundControls {
   Q_OBJECT
 
  public:
-  struct Needs {
+  /// What the window works with; it outlives it.
+  struct Parts {
     Database& DbMembers;
     MessageBoxes& Boxes;
     FileDialog& CommonDialog1;
@@ -35,10 +35,10 @@ class Members : public QDialog, private BoundControls {
     const StringTable& Strings;
     /// Waits for a membership button and returns its number, or NoDallasId. May be empty if there is no
     /// reader.
-    std::function<std::string()> ButtonSwipe;
+    std::function<std::string()> ButtonSwipe = {};
   };
 
-  Members(Needs needs, QWidget* parent);
+  Members(Parts parts, QWidget* parent);
   ~Members() override;
 
   std::int32_t ContactToShow = 0;  ///< member to show when the window opens, 0 for the first
@@ -56,10 +56,10 @@ class Members : public QDialog, private BoundControls {
   MemberDetails Entered() const override;
   void RowChanged() override;
 
+  void SetCaptions();
   void ConnectCommands();
-  void ConnectButton(QAbstractButton& button, const std::function<void()>& command);
-  void Run(const std::function<void()>& command);
-  /// Like Run, but reports a failure only after the current event: a box must not open during a focus change.
+  /// Runs a command, but reports a failure only after the current event: a box must not open during a focus
+  /// change.
   void RunInFocusChange(const std::function<void()>& command);
   void SetEntriesEnabled(bool enabled);
   void ShowPlace();
@@ -78,6 +78,7 @@ class Members : public QDialog, private BoundControls {
   void SelectMember();
 
   std::unique_ptr<Ui::Members> ui_;
-  const Needs needs_;
+  const Parts parts_;
+  Commands commands_;
   std::optional<MemberRows> data1_;
 };

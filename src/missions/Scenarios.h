@@ -9,6 +9,7 @@
 #include "missions/MissionRecord.h"
 #include "platform/Database.h"
 #include "platform/MessageBoxes.h"
+#include "ui/Commands.h"
 
 class QLineEdit;
 
@@ -35,9 +36,8 @@ class Scenarios : public QDialog {
     QLineEdit* SecondaryPoints;
   };
 
-  void SetCaptions();
+  void ShowTexts();
   void ConnectCommands();
-  void Run(void (Scenarios::*command)());
 
   void LoadMissionList();
   /// Selects an entry and shows its mission, like a click on it.
@@ -66,6 +66,7 @@ class Scenarios : public QDialog {
   Recordset& rsScenarios_;
   MessageBoxes& boxes_;
   const StringTable& strings_;
+  Commands commands_;
   bool isNewRecord_ = false;  ///< the next save adds a row
   bool locked_ = true;        ///< the entries are read-only
   bool silentSave_ = false;   ///< the next save shows no box

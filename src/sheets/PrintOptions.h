@@ -27,7 +27,6 @@ class PrintOptions : public QDialog {
   void reject() override;
 
  private:
-  void SetCaptions(const StringTable& strings);
   void FillLists(const StringTable& strings);
   /// Enables only the lists that belong to the checked option.
   void EnableLists();

@@ -17,8 +17,8 @@
 #include "sheets/PrintChoice.h"
 #include "sheets/SheetProgress.h"
 
-/// What a run of score sheets works with.
-struct SheetSources {
+/// What a run of score sheets works with; it outlives the run.
+struct SheetParts {
   const Game& Board;
   Recordset& RsMembers;
   MemberLookup& Members;
@@ -38,7 +38,7 @@ struct SheetSources {
 /// run in one PDF.
 class ScoreSheets {
  public:
-  ScoreSheets(const SheetSources& sources, const PrintChoice& choice);
+  ScoreSheets(const SheetParts& parts, const PrintChoice& choice);
 
   /// Runs to the end or to the first failure, either of which a box reports, or until the program closes,
   /// without a box. Events are processed throughout. Finished sheets are kept in every case.
@@ -51,7 +51,7 @@ class ScoreSheets {
   void MakeSheet(int index, int number, int count);
   void StartWordProcessor();
   void FillPlayer(WordDocument& document, int index, int number, int count);
-  void AddPhoto(WordDocument& document);
+  void AddPhoto(WordDocument& document, const Member& member);
   void FillGame(WordDocument& document, int index);
   void Save(WordDocument& document);
   /// An unused path in the folder of sheets: `base` and the extension, with a number in between if needed.
@@ -61,7 +61,7 @@ class ScoreSheets {
   /// Processes events. Ends the run if the program is closing.
   void ServeEvents();
 
-  const SheetSources& in_;
+  const SheetParts& in_;
   const PrintChoice& choice_;
   std::string folder_;
   int winner_ = 0;

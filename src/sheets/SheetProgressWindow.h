@@ -29,8 +29,6 @@ class SheetProgressWindow : public QDialog, public SheetProgress {
   void reject() override;
 
  private:
-  QString Words(const char* english, const char* chinese) const;
-
   std::unique_ptr<Ui::SheetProgressWindow> ui_;
   const StringTable& strings_;
   bool stopped_ = false;

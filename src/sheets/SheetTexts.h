@@ -6,7 +6,6 @@
 
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
-#include "platform/Database.h"
 
 /// Bookmarks and their texts, in the order in which they are written.
 using BookmarkTexts = std::vector<std::pair<const char*, std::string>>;
@@ -24,8 +23,7 @@ std::string WithoutWeekday(const std::string& longDate);
 /// Whose sheet it is, and the game's result for the player's team.
 BookmarkTexts ResultTexts(const Game& game, int index, int winner);
 
-/// The member's name and playing history, from the current row.
-BookmarkTexts MemberTexts(Recordset& rsMembers, MemberLookup& members);
+BookmarkTexts MemberTexts(const Member& member, const MemberHistory& history);
 
 BookmarkTexts GuestTexts();
 
@@ -33,7 +31,7 @@ BookmarkTexts GuestTexts();
 BookmarkTexts GameTexts(const Player& player, const std::string& missionName, const std::string& date,
                         const std::string& rank);
 
-/// The hits that player `index` scored, on themselves too. Moves the members' cursor.
+/// The hits that player `index` scored, on themselves too.
 CellTexts HitsScored(const Game& game, int index, MemberLookup& members);
 
 /// The hits that player `index` took, then the special damage.

@@ -133,29 +133,6 @@ TEST_F(Editor, Accepts1000CharactersAnd255InAnObjective) {
   EXPECT_EQ(Stored("length(PrimaryObjectiveDescriptionB)", "One"), "255");
 }
 
-TEST_F(Editor, MakesANewMissionAndGoesOnEditingIt) {
-  Open([this] {
-    NewMission("Four");
-    EXPECT_THAT(Entries(), ElementsAre("One", "Two", "Three", "Four"));
-    EXPECT_EQ(List().currentRow(), 3);
-    EXPECT_EQ(ShownName(), "Four");
-    EXPECT_EQ(ShownDescription(), "Enter Mission Details");
-    EXPECT_EQ(EditCaption(), "Editing");
-    EXPECT_FALSE(Locked());
-    EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
-    Describe("All against all");
-    Type("PrimaryPoints0", "9");
-    Press("Save");
-    EXPECT_EQ(List().currentRow(), 3);
-  });
-  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Saved()));
-  EXPECT_THAT(Names(), ElementsAre("One", "Two", "Three", "Four"));
-  EXPECT_EQ(Stored("MissionDescription", "Four"), "All against all");
-  EXPECT_EQ(Stored("MissionDescription2", "Four"), "NULL");
-  EXPECT_EQ(Stored("RespawnPenalty", "Four"), "0.0");
-  EXPECT_EQ(venue.ActiveMission().itemText(5), QStringLiteral("Four"));
-}
-
 TEST_F(Editor, PresetsTheNameOfANewMission) {
   Open([this] {
     const WhileModal<MissionNameEntry> entry([](MissionNameEntry& asked) {

@@ -43,9 +43,19 @@ class Sheets : public testing::Test {
   }
 
   void Run() {
-    const SheetSources sources{venue.game, *venue.RsMembers, *venue.Members, venue.Strings, clock,   events,
-                               files,      venue.Boxes,      word,           progress,      "/data", mission};
-    ScoreSheets(sources, choice).GenerateScoreSheets();
+    const SheetParts parts{.Board = venue.game,
+                           .RsMembers = *venue.RsMembers,
+                           .Members = *venue.Members,
+                           .Strings = venue.Strings,
+                           .Time = clock,
+                           .Events = events,
+                           .Disk = files,
+                           .Boxes = venue.Boxes,
+                           .WordApp = word,
+                           .Progress = progress,
+                           .UserDataFolder = "/data",
+                           .MissionName = mission};
+    ScoreSheets(parts, choice).GenerateScoreSheets();
   }
 
   const FakeWordProcessor::Document& Sheet(std::size_t at) const { return *word.Documents.at(at); }

@@ -5,6 +5,8 @@
 #include <utility>
 #include <vector>
 
+#include "core/text/Filled.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -12,7 +14,6 @@ namespace {
 constexpr std::size_t MostCopies = 10;
 constexpr std::string_view Extension = ".mdb";
 constexpr std::string_view DateForm = "0000-00-00-000000";
-constexpr int FileIsLocked = 3050;
 
 /// "members" of "/home/x/members.mdb".
 std::string NameIn(const std::string& path) {
@@ -33,9 +34,8 @@ bool IsCopyOf(const std::string& name, std::string_view file) {
   }
   file.remove_prefix(name.size() + 1);
   file.remove_suffix(Extension.size());
-  return std::equal(file.begin(), file.end(), DateForm.begin(), DateForm.end(), [](char letter, char form) {
-    return form == '0' ? letter >= '0' && letter <= '9' : letter == form;
-  });
+  return std::equal(file.begin(), file.end(), DateForm.begin(), DateForm.end(),
+                    [](char letter, char form) { return form == '0' ? IsDigit(letter) : letter == form; });
 }
 
 }  // namespace
@@ -49,10 +49,10 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
     Copy(database, NameIn(path));
   } catch (const RuntimeError& error) {
     // Another program has locked the file, so the change itself will fail too; the next change tries again.
-    if (error.Number() == FileIsLocked) {
+    if (error.Number() == Fault::DatabaseLocked) {
       return false;
     }
-    failure_ = "The backup copies of " + path + " could not be brought up to date. " + error.what();
+    failure_ = Filled(strings_.Text(OwnText::BackupFailed), {path, error.what()});
   }
   return true;
 }

@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "core/text/StringTable.h"
 #include "platform/Clock.h"
 #include "platform/Database.h"
 #include "platform/Files.h"
@@ -11,8 +12,8 @@
 /// databases that it guards.
 class Backups {
  public:
-  Backups(std::string folder, Files& disk, const Clock& time)
-      : folder_(std::move(folder)), disk_(disk), time_(time) {}
+  Backups(std::string folder, Files& disk, const Clock& time, const StringTable& strings)
+      : folder_(std::move(folder)), disk_(disk), time_(time), strings_(strings) {}
 
   /// From now on copies `database`, whose file is at `path` and ends in ".mdb", before its first change. The
   /// change goes ahead even if the copy fails.
@@ -29,5 +30,6 @@ class Backups {
   const std::string folder_;
   Files& disk_;
   const Clock& time_;
+  const StringTable& strings_;
   std::string failure_;
 };

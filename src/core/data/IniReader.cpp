@@ -2,8 +2,11 @@
 
 #include <algorithm>
 #include <optional>
+#include <string_view>
 
+#include "core/text/Pieces.h"
 #include "core/text/TextEncoding.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -12,12 +15,6 @@ namespace {
 constexpr std::size_t MostBytesOfValue = 254;
 
 constexpr std::string_view ByteOrderMark = "\xEF\xBB\xBF";
-
-std::string_view Trimmed(std::string_view text) {
-  const std::size_t first = text.find_first_not_of(" \t");
-  return first == std::string_view::npos ? text.substr(0, 0)
-                                         : text.substr(first, text.find_last_not_of(" \t") - first + 1);
-}
 
 /// Each name and value is decoded by itself, since the values that this program writes into an old file are
 /// UTF-8 among others in code page 1252.
@@ -32,19 +29,13 @@ bool SameName(std::string_view bytes, std::string_view name) {
 }
 
 std::string ShownValue(std::string_view bytes) {
-  std::string_view content = Trimmed(bytes);
+  std::string_view content = Trimmed(bytes, IsBlank);
   if (content.size() >= 2 && content.front() == content.back() &&
       (content.front() == '"' || content.front() == '\'')) {
     content = content.substr(1, content.size() - 2);
   }
   std::string value = Decoded(content);
-  if (value.size() > MostBytesOfValue) {
-    std::size_t end = MostBytesOfValue;
-    while ((static_cast<unsigned char>(value[end]) & 0xC0U) == 0x80U) {
-      --end;
-    }
-    value.resize(end);
-  }
+  value.resize(FirstBytes(value, MostBytesOfValue).size());
   return value;
 }
 
@@ -70,17 +61,17 @@ class Lines {
     const std::size_t start = Next;
     End = std::min(bytes_.find_first_of("\r\n", start), bytes_.size());
     Next = std::min(End + (bytes_.substr(End, 2) == "\r\n" ? 2 : 1), bytes_.size());
-    const std::string_view line = Trimmed(bytes_.substr(start, End - start));
+    const std::string_view line = Trimmed(bytes_.substr(start, End - start), IsBlank);
     LineKind = Kind::Other;
     if (line.starts_with('[')) {
       if (const std::size_t close = line.find(']'); close != std::string_view::npos) {
         LineKind = Kind::Section;
-        Name = Trimmed(line.substr(1, close - 1));
+        Name = Trimmed(line.substr(1, close - 1), IsBlank);
       }
     } else if (const std::size_t equals = line.find('=');
                equals != std::string_view::npos && !line.starts_with(';')) {
       LineKind = Kind::Entry;
-      Name = Trimmed(line.substr(0, equals));
+      Name = Trimmed(line.substr(0, equals), IsBlank);
       ValueStart = bytes_.find('=', start) + 1;
       Value = bytes_.substr(ValueStart, End - ValueStart);
     }
@@ -180,8 +171,4 @@ void IniReader::WriteIni(const std::string& section, const Values& values) {
     // Callers carry on with the value in memory; the file is unchanged.
     return;
   }
-}
-
-std::string FirstLineOf(std::string_view text) {
-  return std::string(text.substr(0, text.find("\r\n")));
 }

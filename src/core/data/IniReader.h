@@ -1,15 +1,19 @@
 #pragma once
 
 #include <string>
-#include <string_view>
 #include <utility>
 #include <vector>
 
+#include "core/data/SettingsTable.h"
 #include "platform/Files.h"
 
 /// Settings in an ini file, read and written key by key when used. Section and key names ignore case, the
 /// first one with a given name counts, and only ";" begins a comment. Texts are UTF-8; a value that is not
 /// valid UTF-8 is read as code page 1252.
+///
+/// Not a library's reader, for none keeps these rules: the first of two keys counts, a value ends after 254
+/// bytes, names and values are decoded one by one, and a write leaves every other line as it is to the byte,
+/// with its comments, blanks and line breaks.
 class IniReader {
  public:
   using Values = std::vector<std::pair<std::string, std::string>>;
@@ -23,12 +27,21 @@ class IniReader {
   std::string ReadIni(const std::string& section, const std::string& key,
                       const std::string& defaultText) const;
 
+  /// The value of a setting, or its default.
+  std::string ReadIni(const Setting& setting) const {
+    return ReadIni(setting.Section, setting.Key, setting.Default);
+  }
+
   /// Keys and values of all sections with this name, in file order, each value as ReadIni returns it.
   Values ReadSection(const std::string& section) const;
 
   /// Changes or adds one value; every other line is left as it is. If the file cannot be read or written, or
   /// `value` contains a line break, the file is left unchanged and nothing is reported.
   void WriteIni(const std::string& section, const std::string& key, const std::string& value);
+
+  void WriteIni(const Setting& setting, const std::string& value) {
+    WriteIni(setting.Section, setting.Key, value);
+  }
 
   /// The same for several values, all or none of them.
   void WriteIni(const std::string& section, const Values& values);
@@ -37,6 +50,3 @@ class IniReader {
   Files& files_;
   std::string path_;
 };
-
-/// `text` up to its first carriage return and line feed, or all of it.
-std::string FirstLineOf(std::string_view text);

@@ -7,12 +7,11 @@
 /// recordset was opened.
 template <typename Act>
 void ForEachRow(Recordset& rows, const Act& act) {
-  constexpr int recordIsDeleted = 3167;
   for (rows.MoveFirst(); !rows.Eof(); rows.MoveNext()) {
     try {
       act();
     } catch (const RuntimeError& error) {
-      if (error.Number() != recordIsDeleted) {
+      if (error.Number() != Fault::RecordDeleted) {
         throw;
       }
     }

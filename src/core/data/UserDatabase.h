@@ -4,6 +4,7 @@
 #include <string>
 
 #include "core/data/Backups.h"
+#include "core/text/StringTable.h"
 #include "platform/Database.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
@@ -17,12 +18,13 @@ struct UserDatabase {
 };
 
 /// What OpenUserDatabase works with.
-struct DatabaseServices {
+struct DatabaseParts {
   DatabaseEngine& Engine;
   OldDatabases& Old;
   Files& Disk;
   MessageBoxes& Boxes;
   Backups& Copies;
+  const StringTable& Strings;
 };
 
 /// Opens a database and has it backed up before its first change. A file from an old installation is
@@ -30,4 +32,4 @@ struct DatabaseServices {
 /// whether to go on with a fresh copy beside it, named "...-new.mdb", which later starts will use again.
 /// Returns nullptr if the operator chooses to end the program. Throws RuntimeError as
 /// DatabaseEngine::OpenDatabase does, except for an unrecognized format.
-std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseServices& services);
+std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseParts& parts);

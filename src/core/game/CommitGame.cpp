@@ -15,7 +15,7 @@ bool IsDue(const Player& player) {
 
 double Quotient(double sum, double count) {
   if (count == 0) {
-    throw RuntimeError(11);
+    throw RuntimeError(Fault::DivisionByZero);
   }
   return sum / count;
 }
@@ -103,11 +103,13 @@ class GameCommit {
 
   void CommitOne(int index) {
     const Player& player = game_.Players(index);
-    if (IsDue(player) && members_.LoadMember(player.MemberIndex)) {
+    if (IsDue(player) && members_.LoadMember(player.MemberIndex) &&
+        rsMembers_.WalkTo("ContactID", std::int64_t{player.MemberIndex})) {
       AddGame(index);
     }
   }
 
+  /// Adds a player's game to the member on whose row the cursor stands.
   void AddGame(int index) {
     rsMembers_.Edit();
     game_.Players(index).Committed = true;

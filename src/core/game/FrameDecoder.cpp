@@ -6,8 +6,7 @@
 
 namespace {
 
-/// Adds, unless the sum would leave the 32-bit range.
-void AddTo(std::int32_t& sum, std::int32_t amount) {
+void AddUnlessOverflow(std::int32_t& sum, std::int32_t amount) {
   std::int32_t result = 0;
   if (!__builtin_add_overflow(sum, amount, &result)) {
     sum = result;
@@ -41,7 +40,7 @@ class FrameReader {
 
   void AddWord(std::int32_t& field) {
     if (const auto word = HighFirstWord()) {
-      AddTo(field, *word);
+      AddUnlessOverflow(field, *word);
     }
   }
 
@@ -87,7 +86,7 @@ void ReadHits(FrameReader& frame, Player& player) {
     const auto shooterId = frame.Byte();
     const auto amount = frame.LowFirstWord();
     if (shooterId && amount && OneBased<Player, PlayerCount>::Holds(IndexFromId(*shooterId))) {
-      AddTo(player.HitByPlayer(IndexFromId(*shooterId)), *amount);
+      AddUnlessOverflow(player.HitByPlayer(IndexFromId(*shooterId)), *amount);
     }
   }
 }

@@ -26,7 +26,7 @@ class OneBased {
  private:
   static constexpr std::size_t Checked(int index) {
     if (!Holds(index)) {
-      throw RuntimeError(9);
+      throw RuntimeError(Fault::SubscriptOutOfRange);
     }
     return static_cast<std::size_t>(index - 1);
   }

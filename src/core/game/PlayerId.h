@@ -10,6 +10,8 @@
 /// within the team, the low five bits the number within the block. Teams 1 and 2 have player numbers 0 to 95,
 /// team 3 has 0 to 31.
 
+inline constexpr std::int16_t TeamCount = 3;
+
 /// Number of guns, and of records in the table of players.
 inline constexpr int PlayerCount = 224;
 
@@ -29,6 +31,9 @@ std::uint8_t IdFromTeamAndNumber(std::uint8_t team, std::uint8_t number);
 /// Display name of team 1 to 3, empty for any other.
 std::string TeamNameFromNumber(const StringTable& texts, std::int16_t team);
 
+/// How the gun `id` of a team is named: team, one blank, number form of the number ("Blue  7").
+std::string PlayerName(std::string_view teamName, std::uint8_t id);
+
 /// Team (1 to 3) whose display name is exactly `name`, 0 if there is none.
 std::int16_t TeamNumberFromName(const StringTable& texts, std::string_view name);
 
@@ -41,7 +46,3 @@ constexpr int IndexFromId(std::uint8_t id) {
 constexpr std::uint8_t IdFromIndex(int index) {
   return static_cast<std::uint8_t>(index + 31);
 }
-
-/// Record index of the player named in a board row's player text: team, blank, number, and for a member ":"
-/// and the name. Throws RuntimeError 13 for a number that is not numeric, 6 for one that a byte cannot hold.
-int IndexFromPlayerText(const StringTable& texts, std::string_view playerText);

@@ -8,30 +8,14 @@
 #include <limits>
 #include <type_traits>
 
+#include "core/text/Pieces.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
 
 /// Above this, a double's number form rounds up to a text that no double can hold.
 constexpr double LargestReadable = 1.79769313486231E+308;
-
-bool IsDigit(char letter) {
-  return letter >= '0' && letter <= '9';
-}
-
-bool IsWhiteSpace(char letter) {
-  return letter == ' ' || (letter >= '\t' && letter <= '\r');
-}
-
-std::string_view Trimmed(std::string_view text) {
-  while (!text.empty() && IsWhiteSpace(text.front())) {
-    text.remove_prefix(1);
-  }
-  while (!text.empty() && IsWhiteSpace(text.back())) {
-    text.remove_suffix(1);
-  }
-  return text;
-}
 
 std::size_t EndOfDigits(std::string_view text, std::size_t at) {
   while (at < text.size() && IsDigit(text[at])) {
@@ -114,7 +98,7 @@ double ValueOfNumber(std::string_view text) {
 
 void RequireFinite(double value) {
   if (!std::isfinite(value)) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
 }
 
@@ -186,7 +170,7 @@ template <typename Integer>
 Integer ToInteger(std::string_view text) {
   const std::int32_t value = ToInt32(text);
   if (value < std::numeric_limits<Integer>::min() || value > std::numeric_limits<Integer>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<Integer>(value);
 }
@@ -222,7 +206,7 @@ std::string PlainDecimal(double value) {
 }
 
 double Val(std::string_view text) {
-  text = Trimmed(text);
+  text = Trimmed(text, IsWhiteSpace);
   std::string dense;
   const std::size_t next = text.find_first_not_of("0123456789+-.Ee");
   if (next != std::string_view::npos && IsWhiteSpace(text[next])) {
@@ -237,11 +221,19 @@ double Val(std::string_view text) {
 }
 
 std::optional<double> NumberIn(std::string_view text) {
-  const std::string_view number = Trimmed(text);
+  const std::string_view number = Trimmed(text, IsWhiteSpace);
   if (number.empty() || LengthOfNumber(number) != number.size()) {
     return std::nullopt;
   }
   return ValueOfNumber(number);
+}
+
+std::optional<std::int16_t> NumberOfDigits(std::string_view text) {
+  std::int16_t number = 0;
+  const char* const end = text.data() + text.size();
+  const auto parsed = std::from_chars(text.data(), end, number);
+  const bool whole = parsed.ec == std::errc() && parsed.ptr == end && IsDigit(text.front());
+  return whole ? std::optional(number) : std::nullopt;
 }
 
 bool IsNumeric(std::string_view text) {
@@ -251,7 +243,7 @@ bool IsNumeric(std::string_view text) {
 double ToDouble(std::string_view text) {
   const std::optional<double> value = NumberIn(text);
   if (!value) {
-    throw RuntimeError(13);
+    throw RuntimeError(Fault::TypeMismatch);
   }
   RequireFinite(*value);
   return *value;
@@ -260,7 +252,7 @@ double ToDouble(std::string_view text) {
 float ToSingle(std::string_view text) {
   const double value = ToDouble(text);
   if (std::abs(value) > std::numeric_limits<float>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<float>(value);
 }
@@ -283,7 +275,7 @@ std::int32_t RoundToInt32(long double value) {
   const long long rounded = near ? std::llrint(value) : std::numeric_limits<long long>::max();
   if (rounded < std::numeric_limits<std::int32_t>::min() ||
       rounded > std::numeric_limits<std::int32_t>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<std::int32_t>(rounded);
 }
@@ -294,9 +286,9 @@ double Round2(double value) {
 
 std::string FormatPercent(double value) {
   constexpr double mostPercent = 1e9;
-  if (std::abs(value) < mostPercent && static_cast<float>(value) == value) {
-    // Ten thousand times a float is exact in a double, so a tie is recognized exactly.
-    return HundredthsAsPercent(std::llround(value * 10'000));
+  const auto single = static_cast<float>(value);
+  if (std::abs(value) < mostPercent && single == value) {
+    return HundredthsAsPercent(static_cast<long long>(PercentHundredths(single)));
   }
   std::string text = FormatFixed(value, 4);
   const std::size_t point = text.find('.');
@@ -305,6 +297,16 @@ std::string FormatPercent(double value) {
   const std::size_t units = point + 1;
   text.erase(first, std::min(text.find_first_not_of('0', first), units) - first);
   return text + "%";
+}
+
+std::string RunTimeText(std::int32_t minutes) {
+  const std::int32_t hours = minutes / 60;
+  return Str(hours) + "H " + Str(minutes - hours * 60) + "M";
+}
+
+double PercentHundredths(float value) {
+  // Ten thousand times a float is exact in a double, and so is the tie.
+  return std::round(double{value} * 10'000);
 }
 
 std::string FormatFixed(double value, int decimals) {

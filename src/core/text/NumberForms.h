@@ -26,6 +26,9 @@ double Val(std::string_view text);
 /// The value of a numeric text (see IsNumeric), an infinity if it is too large; nullopt for any other text.
 std::optional<double> NumberIn(std::string_view text);
 
+/// The number that a text of digits and nothing else says; nothing for any other text, and above 32767.
+std::optional<std::int16_t> NumberOfDigits(std::string_view text);
+
 /// True for an optional sign, digits with at most one point, and an optional exponent, with any white space
 /// around it.
 bool IsNumeric(std::string_view text);
@@ -49,6 +52,11 @@ double Round2(double value);
 /// `value` times 100 with two decimals and "%": 0.5 is "50.00%". Rounds the exact value, ties away from zero;
 /// a zero has no sign, and digits are not grouped. Throws RuntimeError 6 for an infinity or a NaN.
 std::string FormatPercent(double value);
+
+/// A running time in minutes as hours and minutes, each in the number form: " 2H  5M" for 125.
+std::string RunTimeText(std::int32_t minutes);
+/// The number that FormatPercent shows of a float, in hundredths of a percent: 5000 for "50.00%".
+double PercentHundredths(float value);
 
 /// `value` with `decimals` (0 or more) digits after the point, rounded like FormatPercent.
 std::string FormatFixed(double value, int decimals);

@@ -1,8 +1,10 @@
 #pragma once
 
-#include <array>
 #include <string>
 #include <string_view>
+#include <vector>
+
+#include "core/text/OwnTexts.h"
 
 /// Languages of the string table.
 enum class Language { English = 1033, SimplifiedChinese = 2052 };
@@ -19,12 +21,13 @@ class StringTable {
 
   explicit StringTable(Language language);
 
-  /// Text `number`, 101 to 218. Throws RuntimeError 9 for any other number.
+  /// Text `number`: 101 to 218, or that of an OwnText. Throws RuntimeError 9 for any other number.
   const std::string& Text(int number) const;
+  const std::string& Text(OwnText text) const { return Text(static_cast<int>(text)); }
 
   Language TextLanguage() const { return language_; }
 
  private:
   Language language_;
-  std::array<std::string, LastText - FirstText + 1> texts_;
+  std::vector<std::string> texts_;  ///< in the order of the table
 };

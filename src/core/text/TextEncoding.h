@@ -4,11 +4,6 @@
 #include <string>
 #include <string_view>
 
-/// ASCII letters only.
-constexpr char LowerAscii(char letter) {
-  return letter >= 'A' && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
-}
-
 /// True when `text` is well-formed UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
 bool IsUtf8(std::string_view text);
 
@@ -21,3 +16,6 @@ std::size_t CharacterCount(std::string_view text);
 
 /// Up to `count` characters of a UTF-8 text, starting with character `first` (counted from 0).
 std::string Characters(std::string_view text, std::size_t first, std::size_t count);
+
+/// The first `most` bytes of a text in UTF-8, or fewer where these would cut a character.
+std::string_view FirstBytes(std::string_view text, std::size_t most);

@@ -30,7 +30,7 @@ void ButtonReader::Poll() {
   if (!poll_.Begin()) {
     boxes_.Show("Error loading Membership button driver", "Memberbership Error", BoxIcon::Exclamation);
     finished_ = true;
-  } else if (poll_.Next()) {
+  } else if (poll_.Next() == BusStep::Device) {
     TakeDevice();
   }
   poll_.End();

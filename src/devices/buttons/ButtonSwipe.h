@@ -1,11 +1,12 @@
 #pragma once
 
 #include <QDialog>
-#include <QTimer>
 #include <memory>
 
 #include "core/text/StringTable.h"
 #include "devices/buttons/ButtonReader.h"
+#include "ui/Commands.h"
+#include "ui/PollTimer.h"
 
 namespace Ui {
 class ButtonSwipe;
@@ -34,5 +35,6 @@ class ButtonSwipe : public QDialog {
 
   std::unique_ptr<Ui::ButtonSwipe> ui_;
   ButtonReader reader_;
-  QTimer* timer1_;
+  Commands commands_;
+  PollTimer* timer1_;
 };

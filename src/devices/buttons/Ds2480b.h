@@ -32,6 +32,9 @@ class Ds2480b {
   /// program closes meanwhile, returns true with an empty bus, since that is not an error to report.
   bool Detect();
 
+  /// False once an answer was missing or wrong: the chip counts as gone for the rest of the session.
+  bool Answers() const { return !lost_; }
+
   /// Resets the bus, unless nothing was sent to it since the last reset. Presence::None also if the chip does
   /// not answer.
   Presence Reset();
@@ -57,7 +60,6 @@ class Ds2480b {
   Presence presence_ = Presence::None;
   bool busIsReset_ = false;
   bool inDataMode_ = false;
-  /// True once an answer was missing or wrong: the chip counts as gone for the rest of the session.
   bool lost_ = false;
   bool ended_ = false;  ///< the program is closing
 };

@@ -4,6 +4,9 @@
 
 #include "platform/OneWire.h"
 
+/// Result of one step of the search. After a bad read it is unknown what is on the bus.
+enum class BusStep { Device, End, BadRead };
+
 /// Polls the reader for a window: one session per tick of its timer. Between ticks only the position in the
 /// search of the bus is kept. Throws what the driver throws.
 class ReaderPoll {
@@ -14,8 +17,8 @@ class ReaderPoll {
   /// Begins a session on the default adapter; false if that fails. Call End() in either case.
   bool Begin();
 
-  /// Moves on to the next device; true if there is one.
-  bool Next();
+  /// Moves on to the next device. After any other result the next call starts again at the first one.
+  BusStep Next();
 
   /// ROM number of that device, family code first.
   std::array<std::uint8_t, 8> Rom();

@@ -30,7 +30,8 @@ class SerialOneWire : public OneWire {
 
  private:
   bool IsOpen(std::int32_t handle) const { return chip_ && handle == handle_; }
-  bool FindNext(OneWireState& state);
+  std::int16_t FindNext(OneWireState& state);
+  std::int16_t ConfirmEnd(const OneWireState& last);
   bool Select(const OneWireState& state);
 
   SerialPort& port_;

@@ -137,7 +137,7 @@ template <std::size_t Size>
 void FrameParser::Append(std::array<std::uint8_t, Size>& data, std::uint8_t& length, std::uint8_t byte) {
   if (length == Size) {
     state_ = State::Start;
-    throw RuntimeError(9);
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
   data[length] = byte;
   ++length;

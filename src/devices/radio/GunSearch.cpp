@@ -3,6 +3,7 @@
 #include <string>
 
 #include "core/game/PlayerId.h"
+#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 
 GunSearch::GunSearch(RadioLink& link, EventPump& events, const StringTable& strings, GunTable& guns,
@@ -21,9 +22,10 @@ void GunSearch::SearchGuns(std::int16_t maxPlayerId) {
   for (int pass = 0; pass < passes; ++pass) {
     for (int index = 0; index < maxPlayerId && !link_.Stopped(); ++index) {
       const int playerId = FirstGunId + index;
-      display_.SetProgress("Pass " + std::to_string(pass + 1) + " of " + std::to_string(passes) + ", ID " +
-                               std::to_string(playerId),
-                           pass * maxPlayerId + index, passes * maxPlayerId);
+      display_.SetProgress(
+          Filled(strings_.Text(OwnText::SearchProgress),
+                 {std::to_string(pass + 1), std::to_string(passes), std::to_string(playerId)}),
+          pass * maxPlayerId + index, passes * maxPlayerId);
       Ask(static_cast<std::uint8_t>(playerId));
     }
   }
@@ -56,8 +58,7 @@ void GunSearch::TakeAnswer() {
   gun.Battery = answer[7];
   gun.WeaponType = answer[8];
   gun.PlayerID = playerId;
-  gun.PlayerName =
-      TeamNameFromNumber(strings_, TeamFromId(playerId)) + " " + Str(PlayerNumberFromId(playerId));
+  gun.PlayerName = PlayerName(TeamNameFromNumber(strings_, TeamFromId(playerId)), playerId);
   gun.Present = true;
   gun.Address = link_.Frame().SourceAddress;
   gun.ScoreStatus = ScoreStatus::Pending;

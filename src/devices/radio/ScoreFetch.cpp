@@ -7,6 +7,7 @@
 #include <string>
 
 #include "core/line/Checksum.h"
+#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
@@ -37,9 +38,15 @@ int BlocksIn(int total) {
 
 }  // namespace
 
-ScoreFetch::ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, Game& game, GunTable& guns,
-                       RadioDisplay& display)
-    : link_(link), events_(events), clock_(clock), game_(game), guns_(guns), display_(display) {}
+ScoreFetch::ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, const StringTable& strings,
+                       Game& game, GunTable& guns, RadioDisplay& display)
+    : link_(link),
+      events_(events),
+      clock_(clock),
+      strings_(strings),
+      game_(game),
+      guns_(guns),
+      display_(display) {}
 
 void ScoreFetch::GetScores() {
   link_.OpenXBeePort();
@@ -49,8 +56,9 @@ void ScoreFetch::GetScores() {
   for (int index = 0; index < GunCount && !link_.Stopped(); ++index) {
     events_.DoEvents();
     if (WantsScores(guns_[static_cast<std::size_t>(index)])) {
-      display_.SetProgress("Gun " + std::to_string(fetched + 1) + " of " + std::to_string(wanted), fetched,
-                           wanted);
+      display_.SetProgress(Filled(strings_.Text(OwnText::FetchProgress),
+                                  {std::to_string(fetched + 1), std::to_string(wanted)}),
+                           fetched, wanted);
       FetchGun(index);
       ++fetched;
     }
@@ -130,7 +138,7 @@ int ScoreFetch::TakeBlock() {
   const std::size_t start = answer_[6];
   const std::size_t length = answer_[7] + 1U;
   if (dataOffset + length > answer_.size()) {
-    throw RuntimeError(9);
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
   std::copy_n(answer_.begin() + dataOffset, length, buffer_.begin() + static_cast<std::ptrdiff_t>(start));
   return static_cast<int>(length);

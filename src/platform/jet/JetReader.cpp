@@ -7,7 +7,6 @@
 #include <sys/resource.h>
 
 #include <charconv>
-#include <cmath>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
@@ -15,6 +14,8 @@
 #include <string>
 #include <system_error>
 #include <vector>
+
+#include "platform/jet/JetDate.h"
 
 namespace {
 
@@ -71,33 +72,6 @@ double Widened(float value) {
   double wide = value;
   std::from_chars(text, written.ptr, wide);
   return wide;
-}
-
-/// "YYYY-MM-DD HH:MM:SS" of a date in days since 1899-12-30. The fraction is the time of day, and counts
-/// forwards for negative dates too.
-std::string DateText(double date) {
-  constexpr std::int64_t daysBefore1970 = 25569;
-  constexpr int secondsOfDay = 86400;
-  std::int64_t day = static_cast<std::int64_t>(date);
-  auto seconds = static_cast<int>(std::lround(std::abs(date - static_cast<double>(day)) * secondsOfDay));
-  if (seconds == secondsOfDay) {
-    seconds = 0;
-    ++day;
-  }
-  // Civil date from the day number, by 400-year eras that begin on 1 March.
-  const std::int64_t shifted = day - daysBefore1970 + 719468;
-  const std::int64_t era = (shifted >= 0 ? shifted : shifted - 146096) / 146097;
-  const std::int64_t ofEra = shifted - era * 146097;
-  const std::int64_t year = (ofEra - ofEra / 1460 + ofEra / 36524 - ofEra / 146096) / 365;
-  const std::int64_t ofYear = ofEra - (365 * year + year / 4 - year / 100);
-  const std::int64_t month = (5 * ofYear + 2) / 153;
-  char text[64];
-  std::snprintf(text, sizeof text, "%04d-%02d-%02d %02d:%02d:%02d",
-                static_cast<int>(year + era * 400 + (month >= 10 ? 1 : 0)),
-                static_cast<int>(month < 10 ? month + 3 : month - 9),
-                static_cast<int>(ofYear - (153 * month + 2) / 5 + 1), seconds / 3600, seconds / 60 % 60,
-                seconds % 60);
-  return text;
 }
 
 /// Reads the columns of a table's current row.
@@ -171,7 +145,7 @@ class Row {
         WriteReal(mdb_get_double(page, at));
         break;
       case MDB_DATETIME:
-        WriteText(DateText(mdb_get_double(page, at)));
+        WriteText(JetDateText(mdb_get_double(page, at)));
         break;
       case MDB_OLE: {
         std::size_t size = 0;

@@ -1,13 +1,13 @@
 #pragma once
 
-#include <sys/types.h>
-
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
 #include "platform/WordProcessor.h"
+#include "platform/linux/ChildProcess.h"
 
 class OfficeClient;
 
@@ -32,11 +32,12 @@ class LibreOffice : public WordProcessor {
   void StartHost();
   /// True while the host runs. Once it has ended, resets what belongs to it.
   bool HostRuns();
+  void ForgetHost();
 
   std::string folder_;
   std::unique_ptr<OfficeClient> client_;
-  std::string pipe_;  ///< name of the pipe on which LibreOffice listens
-  pid_t host_ = 0;    ///< 0 when none is running
-  int leash_ = -1;    ///< the host ends when this is closed
+  std::string pipe_;  ///< name on which LibreOffice listens
+  std::optional<ChildProcess> host_;
+  Descriptor leash_;  ///< the host ends when this is closed
   bool ready_ = false;
 };

@@ -279,13 +279,13 @@ void OfficeDocument::PrintOut() {
     // "Generic Printer" is the stand-in on a system without printers: it discards whatever it is given.
     const OUString printer = services_.Printers->getDefaultPrinterName();
     if (printer.isEmpty() || printer == "Generic Printer") {
-      throw RuntimeError(482, "Printer error");
+      throw RuntimeError(Fault::PrinterError, "Printer error");
     }
     const rtl::Reference<PrintJobWatch> watch(new PrintJobWatch);
     Reference<view::XPrintJobBroadcaster>(document_, UNO_QUERY_THROW)->addPrintJobListener(watch.get());
     Reference<view::XPrintable>(document_, UNO_QUERY_THROW)->print(Uno::Properties({{"Wait", Any(true)}}));
     if (watch->Failed()) {
-      throw RuntimeError(482, "Printer error");
+      throw RuntimeError(Fault::PrinterError, "Printer error");
     }
   });
 }
@@ -302,7 +302,7 @@ Reference<text::XTextTable> OfficeDocument::Table(int number) {
     FindBodyTables();
   }
   if (number > static_cast<int>(bodyTables_->size())) {
-    throw RuntimeError(9);
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
   return {tables_->getByName((*bodyTables_)[static_cast<std::size_t>(number) - 1]), UNO_QUERY_THROW};
 }

@@ -47,7 +47,7 @@ void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
     writer.write();
   } catch (const std::exception& failure) {
     Remove(target);
-    throw RuntimeError(75, failure.what());
+    throw RuntimeError(Fault::PathAccess, failure.what());
   } catch (...) {
     Remove(target);  // `onProgress` threw to cancel
     throw;

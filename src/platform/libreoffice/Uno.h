@@ -33,7 +33,7 @@ inline std::string FromOffice(const OUString& text) {
 inline OUString UrlOf(const std::string& path) {
   OUString url;
   if (osl::FileBase::getFileURLFromSystemPath(ToOffice(path), url) != osl::FileBase::E_None) {
-    throw RuntimeError(75, "Path/File access error: " + path);
+    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
   }
   return url;
 }
@@ -56,7 +56,7 @@ auto Call(Operation&& operation) {
   try {
     return operation();
   } catch (const com::sun::star::uno::Exception& failure) {
-    throw RuntimeError(440, "Automation error: " + FromOffice(failure.Message));
+    throw RuntimeError(Fault::AutomationError, "Automation error: " + FromOffice(failure.Message));
   }
 }
 

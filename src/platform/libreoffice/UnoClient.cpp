@@ -125,7 +125,7 @@ std::unique_ptr<WordDocument> UnoClient::Add(const std::string& path) {
   std::error_code failure;
   const auto changed = std::filesystem::last_write_time(path, failure);
   if (failure) {
-    throw RuntimeError(53, "File not found: " + path);
+    throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
   }
   return Uno::Call([&] {
     Template& known = templates_[{path, changed}];
@@ -139,7 +139,7 @@ std::unique_ptr<WordDocument> UnoClient::Add(const std::string& path) {
       if (const Reference<com::sun::star::util::XCloseable> open(component, UNO_QUERY); open.is()) {
         open->close(true);
       }
-      throw RuntimeError(321, "Invalid file format: " + path);
+      throw RuntimeError(Fault::InvalidFileFormat, "Invalid file format: " + path);
     }
     return std::make_unique<OfficeDocument>(document, services_, known.Tables);
   });

@@ -19,6 +19,8 @@ class LinuxFiles : public Files {
   void Replace(const std::string& path, const std::string& bytes) override;
   std::string MakeTempFileName() override;
   void Write(const std::string& path, const std::string& bytes) override;
+  void Append(const std::string& path, const std::string& bytes) override;
+  std::uint64_t FreeSpace(const std::string& path) const override;
   std::vector<std::string> FileNames(const std::string& folder) const override;
   void Rename(const std::string& path, const std::string& newPath) override;
   void Delete(const std::string& path) override;

@@ -9,38 +9,21 @@
 #include <utility>
 
 #include "platform/RuntimeError.h"
+#include "platform/Utf8.h"
 
 namespace {
 
 // Bytes that are not UTF-8 map to values above all characters, so that each one equals only itself.
 constexpr char32_t StrayByte = 0x110000;
 
-std::size_t SequenceLength(unsigned char lead) {
-  if (lead >= 0xC2 && lead <= 0xDF) {
-    return 2;
-  }
-  if (lead >= 0xE0 && lead <= 0xEF) {
-    return 3;
-  }
-  return lead >= 0xF0 && lead <= 0xF4 ? 4 : 1;
-}
-
 char32_t TakeCharacter(std::string_view& text) {
-  const auto lead = static_cast<unsigned char>(text.front());
-  const std::size_t length = SequenceLength(lead);
-  if (length == 1 || length > text.size()) {
+  const std::size_t length = Utf8::LengthOfCharacter(text);
+  if (length == 0) {
+    const auto stray = static_cast<unsigned char>(text.front());
     text.remove_prefix(1);
-    return lead < 0x80 ? lead : StrayByte + lead;
+    return StrayByte + stray;
   }
-  char32_t character = lead & (0x7Fu >> length);
-  for (std::size_t i = 1; i < length; ++i) {
-    const auto next = static_cast<unsigned char>(text[i]);
-    if ((next & 0xC0) != 0x80) {
-      text.remove_prefix(1);
-      return StrayByte + lead;
-    }
-    character = (character << 6) | (next & 0x3Fu);
-  }
+  const char32_t character = Utf8::CharacterOf(text.substr(0, length));
   text.remove_prefix(length);
   return character;
 }
@@ -98,7 +81,7 @@ JetPattern::JetPattern(std::string_view pattern) {
 void JetPattern::AddSet(std::string_view& rest) {
   const std::size_t end = rest.find(']');
   if (end == std::string_view::npos) {
-    throw RuntimeError(93, "Invalid pattern string");
+    throw RuntimeError(Fault::InvalidPattern, "Invalid pattern string");
   }
   std::string_view list = rest.substr(0, end);
   rest.remove_prefix(end + 1);
@@ -118,7 +101,7 @@ void JetPattern::AddSet(std::string_view& rest) {
       last = TakeFolded(list);
     }
     if (last < first) {
-      throw RuntimeError(93, "Invalid pattern string");
+      throw RuntimeError(Fault::InvalidPattern, "Invalid pattern string");
     }
     set.Ranges.push_back({first, last});
   }

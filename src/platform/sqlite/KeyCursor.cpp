@@ -22,7 +22,7 @@ void KeyCursor::MoveBehind() {
 
 void KeyCursor::MoveNext() {
   if (Eof()) {
-    throw RuntimeError(3021);
+    throw RuntimeError(Fault::NoCurrentRecord);
   }
   const std::size_t next = place_ == Place::Gap ? position_ : place_ == Place::Beginning ? 0 : position_ + 1;
   if (next < keys_.Size()) {
@@ -34,7 +34,7 @@ void KeyCursor::MoveNext() {
 
 void KeyCursor::MovePrevious() {
   if (Bof()) {
-    throw RuntimeError(3021);
+    throw RuntimeError(Fault::NoCurrentRecord);
   }
   const std::size_t behind = place_ == Place::End ? keys_.Size() : position_;
   if (behind > 0) {

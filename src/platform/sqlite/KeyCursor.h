@@ -24,7 +24,7 @@ class KeyCursor {
   /// Throws RuntimeError 3021 unless on a row.
   std::int64_t Key() const {
     if (!OnRow()) {
-      throw RuntimeError(3021);
+      throw RuntimeError(Fault::NoCurrentRecord);
     }
     return keys_.At(position_);
   }

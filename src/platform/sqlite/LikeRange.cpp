@@ -7,6 +7,7 @@
 #include <string_view>
 
 #include "platform/RuntimeError.h"
+#include "platform/Utf8.h"
 #include "platform/sqlite/JetLike.h"
 
 namespace {
@@ -69,22 +70,11 @@ std::string Unquoted(std::string_view quoted) {
   return text;
 }
 
-// `text` as a quoted SQL string in UTF-8. Only for characters below U+D800.
 std::string Quoted(std::u32string_view text) {
   std::string quoted = "'";
   for (const char32_t character : text) {
-    if (character == U'\'') {
-      quoted += "''";
-    } else if (character < 0x80) {
-      quoted += static_cast<char>(character);
-    } else if (character < 0x800) {
-      quoted += static_cast<char>(0xC0 | (character >> 6));
-      quoted += static_cast<char>(0x80 | (character & 0x3F));
-    } else {
-      quoted += static_cast<char>(0xE0 | (character >> 12));
-      quoted += static_cast<char>(0x80 | ((character >> 6) & 0x3F));
-      quoted += static_cast<char>(0x80 | (character & 0x3F));
-    }
+    quoted += character == U'\'' ? "'" : "";  // doubled
+    Utf8::Append(quoted, character);
   }
   return quoted + "'";
 }

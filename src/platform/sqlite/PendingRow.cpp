@@ -43,7 +43,7 @@ void PendingRow::Drop() {
 
 void PendingRow::CheckStarted() const {
   if (mode_ == ::EditMode::None) {
-    throw RuntimeError(3020);
+    throw RuntimeError(Fault::UpdateWithoutEdit);
   }
 }
 
@@ -51,7 +51,7 @@ void PendingRow::Set(std::size_t column, Value value) {
   CheckStarted();
   const SqliteColumn& target = table_.Columns()[column];
   if (target.IsKey && mode_ == ::EditMode::InProgress) {
-    throw RuntimeError(3164, "Field cannot be updated: " + target.Name);
+    throw RuntimeError(Fault::FieldReadOnly, "Field cannot be updated: " + target.Name);
   }
   values_[column] = target.Accept(std::move(value));
 }

@@ -56,12 +56,13 @@ void CheckFile(const std::string& path) {
   struct stat info {};
   if (stat(path.c_str(), &info) != 0) {
     if (errno == ENOENT || errno == ENOTDIR) {
-      throw RuntimeError(3024, "Could not find file '" + path + "'.");
+      throw RuntimeError(Fault::DatabaseNotFound, "Could not find file '" + path + "'.");
     }
-    throw RuntimeError(3051, "Cannot open the file '" + path + "'. You may lack the permission for it.");
+    throw RuntimeError(Fault::DatabaseCannotOpen,
+                       "Cannot open the file '" + path + "'. You may lack the permission for it.");
   }
   if (!S_ISREG(info.st_mode)) {
-    throw RuntimeError(3051, "Cannot open the file '" + path + "'. It is no file.");
+    throw RuntimeError(Fault::DatabaseCannotOpen, "Cannot open the file '" + path + "'. It is no file.");
   }
   // An empty file would pass for a database without tables.
   if (info.st_size < smallestDatabase) {
@@ -228,7 +229,7 @@ WriteTransaction::WriteTransaction(SqliteConnection& connection)
     connection.Execute("BEGIN IMMEDIATE");
     connection.writing_ = true;
   } else if (sqlite3_get_autocommit(connection.Handle()) != 0) {
-    throw RuntimeError(3034);
+    throw RuntimeError(Fault::NoTransaction);
   }
 }
 

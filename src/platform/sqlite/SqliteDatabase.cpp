@@ -53,14 +53,14 @@ std::unique_ptr<Recordset> SqliteDatabase::OpenRecordset(const std::string& sour
   const bool limited = TakeKeyword(rest, "WHERE");
   SkipBlanks(rest);
   if (!all || table.empty() || limited == rest.empty()) {
-    throw RuntimeError(3075, "Syntax error in query '" + source + "'.");
+    throw RuntimeError(Fault::QuerySyntax, "Syntax error in query '" + source + "'.");
   }
   return std::make_unique<SqliteRecordset>(connection_, table, std::string(rest));
 }
 
 void SqliteDatabase::CommitTrans() {
   if (!group_) {
-    throw RuntimeError(3034);
+    throw RuntimeError(Fault::NoTransaction);
   }
   group_->Commit();
   group_.reset();

@@ -40,7 +40,7 @@ void SqliteRecordset::ReadKeys(const std::string& condition) {
   connection_.PrepareRead();
   SqliteStatement search = condition.empty()
                                ? SqliteStatement(connection_, "SELECT rowid FROM [" + table_.Name() + "]")
-                               : connection_.PrepareSearch(table_, condition, 3075);
+                               : connection_.PrepareSearch(table_, condition, Fault::QuerySyntax);
   std::vector<std::int64_t> keys;
   while (search.Step()) {
     keys.push_back(search.Integer(0));
@@ -51,7 +51,7 @@ void SqliteRecordset::ReadKeys(const std::string& condition) {
 std::size_t SqliteRecordset::LongColumnAt(std::string_view name) const {
   const std::size_t column = table_.ColumnAt(name);
   if (!table_.Columns()[column].IsLong) {
-    throw RuntimeError(3259, "Invalid field data type: " + std::string(name));
+    throw RuntimeError(Fault::InvalidFieldType, "Invalid field data type: " + std::string(name));
   }
   return column;
 }
@@ -103,7 +103,7 @@ void SqliteRecordset::FindFirst(const std::string& criterion) {
   // The query is kept: scoring looks up the same mission once for each player.
   if (!find_ || criterion != findCriterion_) {
     connection_.PrepareRead();
-    find_ = connection_.PrepareSearch(table_, criterion, 3077);
+    find_ = connection_.PrepareSearch(table_, criterion, Fault::CriterionSyntax);
     findCriterion_ = criterion;
   }
   const std::optional<std::size_t> position = FirstPosition(find_);
@@ -240,7 +240,7 @@ const Value& SqliteRecordset::LongValue(std::size_t column) {
 
 void SqliteRecordset::FailDeleted() {
   connection_.Rollback();
-  throw RuntimeError(3167);
+  throw RuntimeError(Fault::RecordDeleted);
 }
 
 const Value& SqliteRecordset::Fields(std::string_view column) {
@@ -294,7 +294,7 @@ void SqliteRecordset::SetField(std::string_view column, Value value) {
 void SqliteRecordset::Update() {
   switch (pending_.Mode()) {
     case ::EditMode::None:
-      throw RuntimeError(3020);
+      throw RuntimeError(Fault::UpdateWithoutEdit);
     case ::EditMode::InProgress:
       ForgetRow();
       if (!pending_.Change(cursor_.Key())) {
@@ -310,7 +310,7 @@ void SqliteRecordset::Update() {
 
 void SqliteRecordset::CancelUpdate() {
   if (pending_.Mode() == ::EditMode::None) {
-    throw RuntimeError(3020);
+    throw RuntimeError(Fault::UpdateWithoutEdit);
   }
   pending_.Drop();
 }

@@ -23,7 +23,7 @@ class Backup : public testing::Test {
   void Open() {
     rows.reset();
     database = file.Open();
-    backups = std::make_unique<Backups>(Folder(), disk, clock);
+    backups = std::make_unique<Backups>(Folder(), disk, clock, strings);
     backups->Guard(*database, file.Path());
     rows = database->OpenRecordset("Members");
   }
@@ -50,6 +50,7 @@ class Backup : public testing::Test {
   TestDatabase file;
   LinuxFiles disk;
   FakeClock clock;
+  StringTable strings{Language::English};
   std::unique_ptr<Backups> backups;
   std::unique_ptr<Database> database;
   std::unique_ptr<Recordset> rows;

@@ -220,16 +220,4 @@ TEST_F(WriteIni, DoesNotReportAFailure) {
   EXPECT_EQ(Ini.ReadIni("comm", "commport", ""), "3");
 }
 
-TEST(FirstLineOf, EndsBeforeTheFirstLineBreak) {
-  EXPECT_EQ(FirstLineOf("one\r\ntwo\r\nthree"), "one");
-  EXPECT_EQ(FirstLineOf("\r\ntwo"), "");
-}
-
-TEST(FirstLineOf, IsAllOfATextWithoutOne) {
-  EXPECT_EQ(FirstLineOf("one"), "one");
-  EXPECT_EQ(FirstLineOf(""), "");
-  EXPECT_EQ(FirstLineOf("one\ntwo\rthree"), "one\ntwo\rthree");
-  EXPECT_EQ(FirstLineOf("one\r"), "one\r");
-}
-
 }  // namespace

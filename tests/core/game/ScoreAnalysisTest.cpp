@@ -105,8 +105,8 @@ TEST(CalculateScores, TellsTheViewsOfBothListsInTheEnd) {
   venue.Activate(Red0);
   int boardRows = 99;
   int teamRows = 99;
-  venue.Board.Changed = [&] { boardRows = venue.Board.RowCount(); };
-  venue.Teams.Changed = [&] { teamRows = venue.Teams.RowCount(); };
+  venue.BoardChanged = [&] { boardRows = venue.Board.RowCount(); };
+  venue.TeamsChanged = [&] { teamRows = venue.Teams.RowCount(); };
   venue.CalculateScores();
   EXPECT_EQ(boardRows, 1U);
   EXPECT_EQ(teamRows, 3U);

@@ -361,4 +361,21 @@ TEST(FormatFixed, HoldsTheLargestNumberAndManyDecimals) {
   EXPECT_EQ(FormatFixed(0.1, 30), "0.100000000000000005551115123126");
 }
 
+TEST(RunTime, IsShownInHoursAndMinutesEachInTheNumberForm) {
+  EXPECT_EQ(RunTimeText(125), " 2H  5M");
+  EXPECT_EQ(RunTimeText(0), " 0H  0M");
+  EXPECT_EQ(RunTimeText(59), " 0H  59M");
+  EXPECT_EQ(RunTimeText(6000), " 100H  0M");
+  EXPECT_EQ(RunTimeText(-61), "-1H -1M");
+}
+
+TEST(NumberOfDigits, IsThatOfDigitsAndNothingElse) {
+  EXPECT_EQ(NumberOfDigits("0"), 0);
+  EXPECT_EQ(NumberOfDigits("07"), 7);
+  EXPECT_EQ(NumberOfDigits("32767"), 32767);
+  for (const char* text : {"", "32768", "99999999999", "-1", "+1", " 1", "1 ", "1.0", "1E2", "x", "1x"}) {
+    EXPECT_EQ(NumberOfDigits(text), std::nullopt) << text;
+  }
+}
+
 }  // namespace

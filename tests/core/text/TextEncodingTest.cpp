@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "platform/Letters.h"
+
 #include <string>
 
 namespace {

@@ -144,6 +144,29 @@ TYPED_TEST(EventPumpTest, AFailureInTheConditionEndsTheWait) {
   EXPECT_EQ(this->Pump_.WaitFor([] { return false; }, 1ms), WaitResult::TimedOut);
 }
 
+TYPED_TEST(EventPumpTest, TellsTheTimeThatPassesInWaitsAndPauses) {
+  const auto start = this->Pump_.Elapsed();
+  EXPECT_GE(start, 0us);
+  this->Pump_.Sleep(20ms);
+  const auto afterPause = this->Pump_.Elapsed();
+  EXPECT_GE(afterPause - start, 20ms);
+  this->Pump_.WaitFor([] { return false; }, 30ms);
+  EXPECT_GE(this->Pump_.Elapsed() - afterPause, 29ms);
+  EXPECT_LT(this->Pump_.Elapsed() - start, 20s);
+}
+
+TEST(FakeEventPump, TimeThatPassesInABlockingCallServesNoEvent) {
+  FakeEventPump pump;
+  bool served = false;
+  pump.At(1ms, [&] { served = true; });
+  pump.Pass(1500us);
+  EXPECT_FALSE(served);
+  EXPECT_EQ(pump.Elapsed(), 1500us);
+  EXPECT_EQ(pump.Now(), 1ms);
+  pump.DoEvents();
+  EXPECT_TRUE(served);
+}
+
 TEST(FakeEventPump, AMinuteTakesNoTimeAndCanBeReadFromItsClock) {
   FakeEventPump pump;
   const auto start = std::chrono::steady_clock::now();

@@ -48,6 +48,13 @@ TEST(LongDateText, IsTheLocalesFormOfAShortDateWithOrWithoutATime) {
   EXPECT_EQ(LongDateText(QLocale::c(), QStringLiteral("9 May 2013 14:30:05")), "Thursday, 9 May 2013");
 }
 
+TEST(LongDateText, TakesTwoDigitsOfAYearAs1930To2029) {
+  const QLocale american(QLocale::English, QLocale::UnitedStates);
+  EXPECT_EQ(LongDateText(american, QStringLiteral("5/9/13 2:30 PM")), "Thursday, May 9, 2013");
+  EXPECT_EQ(LongDateText(american, QStringLiteral("1/1/30")), "Wednesday, January 1, 1930");
+  EXPECT_EQ(LongDateText(american, QStringLiteral("12/31/29")), "Monday, December 31, 2029");
+}
+
 TEST(LongDateText, IsTheTextItselfWhenItIsNoDate) {
   for (const char* text : {"", "N/A", "today", "31/31/2013 14:30", " 14:30 "}) {
     EXPECT_EQ(LongDateText(QLocale(QLocale::English, QLocale::UnitedStates), QString::fromUtf8(text)), text);

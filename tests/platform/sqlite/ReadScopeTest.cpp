@@ -1,10 +1,11 @@
+#include <gtest/gtest.h>
+
 #include <sqlite3.h>
 
 #include <cstdint>
 #include <stdexcept>
 #include <string>
 
-#include "gtest/gtest.h"
 #include "tests/support/TestDatabase.h"
 #include "tests/support/Thrown.h"
 

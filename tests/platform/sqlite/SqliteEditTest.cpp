@@ -1,9 +1,10 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
 #include <cstddef>
 #include <cstdint>
 #include <string>
 
-#include "gmock/gmock.h"
-#include "gtest/gtest.h"
 #include "tests/platform/sqlite/EditedMembers.h"
 #include "tests/support/Thrown.h"
 
