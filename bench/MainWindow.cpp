@@ -4,14 +4,12 @@
 #include <QLineEdit>
 #include <QTimer>
 
-#include "app/Composition.h"
-#include "app/frmRx.h"
+#include "app/Program.h"
 #include "bench/FirstIdle.h"
-#include "platform/ErrorReport.h"
 
 namespace {
 
-/// Loads `file` through the menu and the dialog.
+/// Loads `file` through the menu and the file dialog.
 void LoadThroughMenu(QWidget& window, const QString& file) {
   QTimer answer;
   QObject::connect(&answer, &QTimer::timeout, &answer, [&file] {
@@ -26,22 +24,17 @@ void LoadThroughMenu(QWidget& window, const QString& file) {
 
 }  // namespace
 
-/// bench-main-window [GAME]: the program as it starts, ended once it is usable, with GAME loaded first when
-/// it is named.
+/// bench-main-window [GAME]: starts the program, loads GAME if given, and ends once the window is usable.
 int main(int argc, char** argv) {
   QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
   QApplication application(argc, argv);
-  PrepareApplication();
-  Composition composition;
-  frmRx window(composition.Services());
-  composition.SetMainWindow(&window);
-  if (!ReportErrors(composition.Boxes(), [&window] { window.FormLoad(); })) {
+  Program program;
+  if (!program.Start()) {
     return 1;
   }
-  window.show();
   if (argc > 1) {
-    LoadThroughMenu(window, QString::fromLocal8Bit(argv[1]));
+    LoadThroughMenu(program.Window(), QString::fromLocal8Bit(argv[1]));
   }
-  QuitWhenUsable(window);
+  QuitWhenUsable(program.Window());
   return QApplication::exec();
 }

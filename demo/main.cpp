@@ -2,13 +2,11 @@
 #include <QDir>
 #include <cstdio>
 
-#include "app/Composition.h"
-#include "app/frmRx.h"
+#include "app/Program.h"
 #include "demo/DemoRun.h"
-#include "platform/ErrorReport.h"
 
-/// tessarine-demo [--radio] FOLDER: one game pulled, shown and saved without an operator. Leaves the results
-/// in FOLDER.
+/// tessarine-demo [--radio] FOLDER: pulls, shows and saves one game without an operator, and leaves the
+/// results in FOLDER.
 int main(int argc, char** argv) {
   QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
   QApplication application(argc, argv);
@@ -19,15 +17,11 @@ int main(int argc, char** argv) {
     std::fprintf(stderr, "usage: tessarine-demo [--radio] FOLDER\n");
     return 2;
   }
-  PrepareApplication();
-  Composition composition;
-  frmRx window(composition.Services());
-  composition.SetMainWindow(&window);
-  if (!ReportErrors(composition.Boxes(), [&window] { window.FormLoad(); })) {
+  Program program;
+  if (!program.Start()) {
     return 1;
   }
-  window.show();
-  const QStringList faults = DemoRun(window, source, QDir(arguments.first())).Run();
+  const QStringList faults = DemoRun(program.Window(), source, QDir(arguments.first())).Run();
   for (const QString& fault : faults) {
     std::fprintf(stderr, "%s\n", qUtf8Printable(fault));
   }

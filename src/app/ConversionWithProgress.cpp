@@ -2,6 +2,9 @@
 
 #include <QCoreApplication>
 #include <QFileInfo>
+#include <string>
+
+#include "core/text/Filled.h"
 
 ConversionWithProgress::ConversionWithProgress(const StringTable& strings, std::chrono::milliseconds moment,
                                                const std::string& reader)
@@ -25,7 +28,6 @@ void ConversionWithProgress::ShowRows(std::int64_t rows) {
     return;
   }
   sinceShown_.start();
-  const bool chinese = strings_.TextLanguage() == Language::SimplifiedChinese;
   if (!window_) {
     window_ = std::make_unique<QProgressDialog>();
     window_->setWindowTitle(QStringLiteral("Tessarine"));
@@ -34,9 +36,7 @@ void ConversionWithProgress::ShowRows(std::int64_t rows) {
     window_->setMinimumWidth(window_->fontMetrics().averageCharWidth() * 60);
     window_->show();
   }
-  window_->setLabelText(QString::fromUtf8(chinese ? "正在转换旧安装的数据库 %1：%2 行"
-                                                  : "Converting %1 of an old installation: %2 rows")
-                            .arg(file_)
-                            .arg(rows));
+  window_->setLabelText(QString::fromStdString(
+      Filled(strings_.Text(OwnText::ConvertingOldDatabase), {file_.toStdString(), std::to_string(rows)})));
   QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
 }

@@ -11,7 +11,6 @@
 #include "board/PlayerDelegate.h"
 #include "board/ScoreListModel.h"
 #include "core/data/FirstRun.h"
-#include "platform/ErrorReport.h"
 #include "ui_frmRx.h"
 
 frmRx::frmRx(const Services& services)
@@ -20,7 +19,8 @@ frmRx::frmRx(const Services& services)
       session_(services.Strings, services.Time, services.Boxes),
       subscription_(session_.Listen([this](SessionChange change) { Show(change); })),
       gameFile_(services.CommonDialog1, services.Disk, services.Boxes),
-      wordProcessor_(services.WordProcessor) {
+      wordProcessor_(services.WordProcessor),
+      commands_(*this, services.Boxes) {
   ui_->setupUi(this);
 }
 
@@ -35,8 +35,11 @@ bool frmRx::FormLoad() {
   ini_.emplace(services_.Disk, userDataFolder_ + "/tessarine.ini");
   commPort_.emplace(services_.MSComm1, *ini_, services_.Devices, services_.Boxes, services_.Strings,
                     [this] { ShowCommPortSettings(); });
-  if (!session_.Open({services_.Databases, services_.Old, services_.Disk, userDataFolder_,
-                      services_.Places.Program()})) {
+  if (!session_.Open({.Engine = services_.Databases,
+                      .Old = services_.Old,
+                      .Disk = services_.Disk,
+                      .UserDataFolder = userDataFolder_,
+                      .ProgramFolder = services_.Places.Program()})) {
     return false;
   }
   session_.Factors() = ReadSoldieringFactors(*ini_);
@@ -44,7 +47,8 @@ bool frmRx::FormLoad() {
   ConnectCommands();
   // Not before the window has come up.
   constexpr int followMilliseconds = 100;
-  connect(&wordProcessorTimer_, &QTimer::timeout, this, [this] { Run([this] { FollowWordProcessor(); }); });
+  connect(&wordProcessorTimer_, &QTimer::timeout, this,
+          [this] { commands_.Run([this] { FollowWordProcessor(); }); });
   wordProcessorTimer_.start(followMilliseconds);
   return true;
 }
@@ -66,32 +70,29 @@ void frmRx::SetUpLists() {
 }
 
 void frmRx::ConnectCommands() {
-  const std::pair<QAction*, void (frmRx::*)()> commands[] = {
-      {ui_->mnuLoadScores, &frmRx::LoadGame},
-      {ui_->mnuSaveScores, &frmRx::SaveGame},
-      {ui_->mnuClearScores, &frmRx::ClearGame},
-      {ui_->mnuGetKeshData, &frmRx::GetScoreData},
-      {ui_->mnuPrintScores, &frmRx::PrintScores},
-      {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},
-      {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
-      {ui_->mnuAbout, &frmRx::ShowAbout},
-      {ui_->mnuAdminData, &frmRx::ShowAdminData},
-      {ui_->mnuMissionResults, &frmRx::EnterMissionResults},
-      {ui_->mnuSetupMissions, &frmRx::SetUpMissions},
-      {ui_->mnuCommitGame, &frmRx::CommitGame},
-      {ui_->mnuManageMembers, &frmRx::ManageMembers},
-      {ui_->mnuCheckButton, &frmRx::CheckMembershipButton},
-      {ui_->mnuAssignMember, &frmRx::AssignMember},
-      {ui_->mnuUnassignMember, &frmRx::UnassignMember},
-      {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
-      {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
-      {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
-  };
-  for (const auto& entry : commands) {
-    const auto command = entry.second;
-    connect(entry.first, &QAction::triggered, this,
-            [this, command] { Run([this, command] { (this->*command)(); }); });
-  }
+  commands_.EndWaits = [this] { services_.Events.EndWaits(); };
+  commands_.AllUnwound = [this] { TellOfMissingBackup(); };
+  commands_.Connect(*this, {
+                               {ui_->mnuLoadScores, &frmRx::LoadGame},
+                               {ui_->mnuSaveScores, &frmRx::SaveGame},
+                               {ui_->mnuClearScores, &frmRx::ClearGame},
+                               {ui_->mnuGetKeshData, &frmRx::GetScoreData},
+                               {ui_->mnuPrintScores, &frmRx::PrintScores},
+                               {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},
+                               {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
+                               {ui_->mnuAbout, &frmRx::ShowAbout},
+                               {ui_->mnuAdminData, &frmRx::ShowAdminData},
+                               {ui_->mnuMissionResults, &frmRx::EnterMissionResults},
+                               {ui_->mnuSetupMissions, &frmRx::SetUpMissions},
+                               {ui_->mnuCommitGame, &frmRx::CommitGame},
+                               {ui_->mnuManageMembers, &frmRx::ManageMembers},
+                               {ui_->mnuCheckButton, &frmRx::CheckMembershipButton},
+                               {ui_->mnuAssignMember, &frmRx::AssignMember},
+                               {ui_->mnuUnassignMember, &frmRx::UnassignMember},
+                               {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
+                               {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
+                               {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
+                           });
   // In the bar, but never shown there: tools that read the screen find the items of an open context menu only
   // so.
   ui_->mnuPopup->menuAction()->setVisible(false);
@@ -101,23 +102,11 @@ void frmRx::ConnectCommands() {
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
   connect(ui_->RemoteManageButton, &QPushButton::clicked, ui_->mnuRemoteManage, &QAction::trigger);
   connect(ui_->ActiveMission, &QComboBox::currentIndexChanged, this,
-          [this](int index) { Run([this, index] { session_.SelectMission(index); }); });
+          [this](int index) { commands_.Run([this, index] { session_.SelectMission(index); }); });
   connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this,
-          [this](int section) { Run([this, section] { session_.SortByHeader(section + 1); }); });
+          [this](int section) { commands_.Run([this, section] { session_.SortByHeader(section + 1); }); });
   connect(ui_->ScoreDisplay, &QWidget::customContextMenuRequested, this,
-          [this](const QPoint& position) { Run([this, position] { ShowPopup(position); }); });
-}
-
-void frmRx::Run(const std::function<void()>& command) {
-  ++runningCommands_;
-  ReportErrors(services_.Boxes, command);
-  --runningCommands_;
-  if (runningCommands_ == 0) {
-    TellOfMissingBackup();
-  }
-  if (closeRequested_ && runningCommands_ == 0) {
-    close();
-  }
+          [this](const QPoint& position) { commands_.Run([this, position] { ShowPopup(position); }); });
 }
 
 void frmRx::TellOfMissingBackup() {
@@ -127,9 +116,7 @@ void frmRx::TellOfMissingBackup() {
 }
 
 void frmRx::closeEvent(QCloseEvent* event) {
-  if (runningCommands_ > 0) {
-    closeRequested_ = true;
-    services_.Events.EndWaits();
+  if (!commands_.MayClose()) {
     event->ignore();
     return;
   }

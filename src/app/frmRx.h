@@ -11,9 +11,10 @@
 #include "app/WordProcessorStart.h"
 #include "core/data/IniReader.h"
 #include "core/game/Session.h"
-#include "core/gamefile/GameFileDialog.h"
+#include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
 #include "sheets/PrintOptions.h"
+#include "ui/Commands.h"
 
 namespace Ui {
 class frmRx;
@@ -37,8 +38,6 @@ class frmRx : public QMainWindow {
  private:
   void SetUpLists();
   void ConnectCommands();
-  /// Runs a command of the operator; a failure in it is reported and ends the command.
-  void Run(const std::function<void()>& command);
 
   void TellOfMissingBackup();
 
@@ -79,7 +78,7 @@ class frmRx : public QMainWindow {
   std::unique_ptr<Ui::frmRx> ui_;
   Session session_;
   Subscription subscription_;
-  GameFileDialog gameFile_;
+  CurrentGameFile gameFile_;
   WordProcessorStart wordProcessor_;
   std::string userDataFolder_;
   std::optional<IniReader> ini_;
@@ -87,6 +86,5 @@ class frmRx : public QMainWindow {
   int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again
   QTimer wordProcessorTimer_;
-  int runningCommands_ = 0;      ///< commands on the stack; a wait in one can start another
-  bool closeRequested_ = false;  ///< close as soon as the last of them has unwound
+  Commands commands_;
 };

@@ -81,11 +81,19 @@ void frmRx::PrintScores() {
     return;
   }
   SheetProgressWindow progress(services_.Strings, this);
-  const SheetSources sources{session_.Game(),   session_.RsMembers(), session_.Members(),
-                             services_.Strings, services_.Time,       services_.Events,
-                             services_.Disk,    services_.Boxes,      services_.WordProcessor,
-                             progress,          userDataFolder_,      session_.Missions().Text()};
-  ScoreSheets(sources, printOptions_->Choice()).GenerateScoreSheets();
+  const SheetParts parts{.Board = session_.Game(),
+                         .RsMembers = session_.RsMembers(),
+                         .Members = session_.Members(),
+                         .Strings = services_.Strings,
+                         .Time = services_.Time,
+                         .Events = services_.Events,
+                         .Disk = services_.Disk,
+                         .Boxes = services_.Boxes,
+                         .WordApp = services_.WordProcessor,
+                         .Progress = progress,
+                         .UserDataFolder = userDataFolder_,
+                         .MissionName = session_.Missions().Text()};
+  ScoreSheets(parts, printOptions_->Choice()).GenerateScoreSheets();
 }
 
 void frmRx::ShowCommPortSettings() {
@@ -129,12 +137,17 @@ void frmRx::CheckMembershipButton() {
 }
 
 std::string frmRx::ShowMembers(std::int32_t contactToShow) {
-  Members window({session_.DbMembers(), services_.Boxes, services_.CommonDialog1, services_.Disk,
-                  services_.Time, services_.Strings, services_.ButtonSwipe},
+  Members window({.DbMembers = session_.DbMembers(),
+                  .Boxes = services_.Boxes,
+                  .CommonDialog1 = services_.CommonDialog1,
+                  .Disk = services_.Disk,
+                  .Time = services_.Time,
+                  .Strings = services_.Strings,
+                  .ButtonSwipe = services_.ButtonSwipe},
                  this);
   window.ContactToShow = contactToShow;
   window.exec();
-  return window.SelectedContact;
+  return window.SelectedContact();
 }
 
 void frmRx::ShowAdminData() {
@@ -153,8 +166,13 @@ void frmRx::SetUpMissions() {
 }
 
 void frmRx::ManageRemotely() {
-  RemoteManage({services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time,
-                services_.Strings, session_.Game()},
+  RemoteManage({.MSComm1 = services_.MSComm1,
+                .Port = *commPort_,
+                .Events = services_.Events,
+                .Boxes = services_.Boxes,
+                .Time = services_.Time,
+                .Strings = services_.Strings,
+                .Scores = session_.Game()},
                this)
       .exec();
   session_.CalculateScores();

@@ -1,8 +1,8 @@
 #include <QApplication>
 
-#include "app/Composition.h"
+#include "app/Program.h"
 
 int main(int argc, char** argv) {
   QApplication application(argc, argv);
-  return RunProgram();
+  return Program().Run();
 }

@@ -6,7 +6,7 @@
 #include <QHeaderView>
 #include <QKeyEvent>
 
-#include "core/game/HitLines.h"
+#include "core/text/NumberForms.h"
 #include "ui/Text.h"
 #include "ui_AdminData.h"
 
@@ -16,6 +16,8 @@ AdminData::AdminData(const Game& game, const StringTable& strings, QWidget* pare
   ui_->PlayerList->setObjectName(QStringLiteral("AdminData"));  // which the form cannot call it: its own name
   setWindowTitle(Text(strings, 136));
   ui_->Command1->setText(Text(strings, 137));
+  ui_->Copy->setText(Text(strings, OwnText::Copy));
+  ui_->CopyButton->setText(ui_->Copy->text());
   ui_->PlayerList->setHorizontalHeaderLabels({Text(strings, 104), Text(strings, 134), Text(strings, 135)});
   ui_->PlayerList->setAccessibleName(windowTitle());
   ui_->PlayerList->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);

@@ -14,8 +14,8 @@ PlayerDetails::PlayerDetails(int playerIndex, const Game& game, MemberLookup& me
   const Player& player = game.Players(playerIndex);
   ui_->PlayerName->setText(QString::fromStdString(game.DisplayName(playerIndex)));
   ShowFigures(player);
-  ShowHits(HitsGivenBy(playerIndex, game, members), game, *ui_->WhoYouHit, *ui_->InflictedBars);
-  ShowHits(HitsTakenBy(playerIndex, game, members), game, *ui_->WhoHitYou, *ui_->TakenBars);
+  ShowHits(HitsGivenBy(playerIndex, game), game, members, *ui_->WhoYouHit, *ui_->InflictedBars);
+  ShowHits(HitsTakenBy(playerIndex, game), game, members, *ui_->WhoHitYou, *ui_->TakenBars);
   for (const std::string& line : SpecialDamageOf(player)) {
     ui_->WhoHitYou->addItem(QString::fromStdString(line));
   }
@@ -50,13 +50,14 @@ void PlayerDetails::ShowFigures(const Player& player) {
   }
 }
 
-void PlayerDetails::ShowHits(const std::vector<HitLine>& hits, const Game& game, QListWidget& list,
-                             HitBars& bars) {
+void PlayerDetails::ShowHits(const std::vector<Hit>& hits, const Game& game, MemberLookup& members,
+                             QListWidget& list, HitBars& bars) {
   std::vector<HitBars::Bar> shown;
-  for (const HitLine& hit : hits) {
-    list.addItem(QString::fromStdString(hit.Text));
-    shown.push_back({QString::fromStdString(game.DisplayName(hit.Index)), hit.Amount,
-                     TeamColour(TeamFromId(IdFromIndex(hit.Index)))});
+  for (const Hit& hit : hits) {
+    const std::string name = game.DisplayName(hit.Index);
+    list.addItem(QString::fromStdString(HitText(name, hit, game, members, false)));
+    shown.push_back(
+        {QString::fromStdString(name), hit.Amount, TeamColour(TeamFromId(IdFromIndex(hit.Index)))});
   }
   bars.SetBars(std::move(shown));
 }

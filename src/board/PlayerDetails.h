@@ -25,7 +25,8 @@ class PlayerDetails : public QDialog {
 
  private:
   void ShowFigures(const Player& player);
-  static void ShowHits(const std::vector<HitLine>& hits, const Game& game, QListWidget& list, HitBars& bars);
+  static void ShowHits(const std::vector<Hit>& hits, const Game& game, MemberLookup& members,
+                       QListWidget& list, HitBars& bars);
 
   std::unique_ptr<Ui::PlayerDetails> ui_;
 };

@@ -20,39 +20,6 @@ QDate DateOf(const std::string& stored) {
   return QDate::fromString(QString::fromStdString(stored).left(StoredDateLength), Qt::ISODate);
 }
 
-/// A form in which a day or a month of one digit may stand without a zero.
-QString Lenient(QString form) {
-  form.replace(QStringLiteral("dd"), QStringLiteral("d"));
-  if (!form.contains(QStringLiteral("MMM"))) {
-    form.replace(QStringLiteral("MM"), QStringLiteral("M"));
-  }
-  return form;
-}
-
-/// The date that `text` says, invalid for none. Two digits of a year are those of the last hundred years.
-QDate DateIn(const QString& text) {
-  const QLocale locale = QLocale::system();
-  QString form = Lenient(locale.dateFormat(QLocale::ShortFormat));
-  QString longForm = form;
-  QString shortForm = form;
-  if (form.contains(QStringLiteral("yyyy"))) {
-    shortForm.replace(QStringLiteral("yyyy"), QStringLiteral("yy"));
-  } else {
-    longForm.replace(QStringLiteral("yy"), QStringLiteral("yyyy"));
-  }
-  for (const QString& known : {longForm, QStringLiteral("yyyy-M-d")}) {
-    if (const QDate date = locale.toDate(text, known); date.isValid()) {
-      return date;
-    }
-  }
-  QDate date = locale.toDate(text, shortForm);
-  constexpr int century = 100;
-  while (date.isValid() && date.addYears(century) <= QDate::currentDate()) {
-    date = date.addYears(century);
-  }
-  return date;
-}
-
 QIcon CalendarIcon(const QColor& colour) {
   constexpr int size = 64;
   QPixmap picture(size, size);
@@ -75,11 +42,14 @@ QIcon CalendarIcon(const QColor& colour) {
 DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
   setToolTip(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
   QAction* calendar = addAction(CalendarIcon(palette().color(QPalette::Text)), QLineEdit::TrailingPosition);
-  findChild<QAbstractButton*>()->setAccessibleName(QStringLiteral("Calendar"));  // shows the action
   connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
-  // And not textEdited, which does not tell of a text that an assistive program enters.
+  // textChanged, since textEdited is not emitted when an assistive program enters a text.
   connect(this, &QLineEdit::textChanged, this, &DatePicker::TakeText);
   connect(this, &QLineEdit::editingFinished, this, &DatePicker::Finish);
+}
+
+void DatePicker::SetCalendarName(const QString& name) {
+  findChild<QAbstractButton*>()->setAccessibleName(name);  // the action's button
 }
 
 void DatePicker::SetStored(const std::string& stored) {
@@ -98,9 +68,12 @@ void DatePicker::ShowStored() {
   setText(date.isValid() ? QString::fromStdString(ShortDateText(QLocale::system(), date)) : QString());
 }
 
-// Half of a text may be a date of its own, "1961-02-3", or none.
+// While the operator types, the text may be a different date ("1961-02-3") or no date at all; in the latter
+// case the last finished date counts.
 void DatePicker::TakeText(const QString& text) {
-  const QDate date = DateIn(text.trimmed());
+  // A two-digit year is taken from the last hundred years, since birthdates are not in the future.
+  const QDate earliest = QDate::currentDate().addYears(-100).addDays(1);
+  const QDate date = DateIn(QLocale::system(), text.trimmed(), earliest);
   if (text.trimmed().isEmpty()) {
     stored_.clear();
   } else if (date.isValid()) {

@@ -4,12 +4,27 @@
 #include <string>
 #include <vector>
 
+/// Something of an old file that is not in the new one as it was.
+struct NotTakenOver {
+  enum Kind {
+    Table,         ///< which the new file has no place for
+    Column,        ///< likewise
+    TextsOfColumn  ///< that are no numbers, where the new file takes only these; they are 0 now
+  };
+  Kind What;
+  std::string Name;
+  std::int64_t Rows = 0;  ///< of a table
+
+  bool operator==(const NotTakenOver&) const = default;
+};
+
 /// What became of an old file.
 struct OldDatabaseReport {
-  std::int64_t Rows = 0;  ///< rows taken over
-  std::vector<std::string>
-      NotTaken;        ///< tables and columns that the new file has no place for, and changed values
-  std::string KeptAs;  ///< path of the old file now
+  /// Rows taken over.
+  std::int64_t Rows = 0;
+  std::vector<NotTakenOver> NotTaken;
+  /// Path of the old file now.
+  std::string KeptAs;
 };
 
 /// Files of the database format that this program used before.

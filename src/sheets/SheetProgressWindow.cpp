@@ -1,25 +1,23 @@
 #include "sheets/SheetProgressWindow.h"
 
+#include "core/text/Filled.h"
+#include "ui/Text.h"
 #include "ui_SheetProgressWindow.h"
 
 SheetProgressWindow::SheetProgressWindow(const StringTable& strings, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::SheetProgressWindow>()), strings_(strings) {
   ui_->setupUi(this);
-  setWindowTitle(QString::fromStdString(strings.Text(131)));
-  ui_->Stop->setText(Words("Stop", "停止"));
+  setWindowTitle(Text(strings, 131));
+  ui_->Stop->setText(Text(strings, OwnText::Stop));
 }
 
 SheetProgressWindow::~SheetProgressWindow() = default;
-
-QString SheetProgressWindow::Words(const char* english, const char* chinese) const {
-  return QString::fromUtf8(strings_.TextLanguage() == Language::SimplifiedChinese ? chinese : english);
-}
 
 void SheetProgressWindow::Open() {
   stopped_ = false;
   cursor_.emplace();
   ui_->Stop->setEnabled(true);
-  ui_->SheetLabel->setText(Words("Starting the word processor...", "正在启动文字处理程序……"));
+  ui_->SheetLabel->setText(Text(strings_, OwnText::StartingWordProcessor));
   ui_->PlayerLabel->clear();
   ui_->Progress->setRange(0, 0);
   show();
@@ -27,7 +25,8 @@ void SheetProgressWindow::Open() {
 
 void SheetProgressWindow::ShowSheet(int number, int count, const std::string& name) {
   if (!stopped_) {
-    ui_->SheetLabel->setText(Words("Sheet %1 of %2", "第 %1 张，共 %2 张").arg(number).arg(count));
+    ui_->SheetLabel->setText(QString::fromStdString(
+        Filled(strings_.Text(OwnText::SheetOfSheets), {std::to_string(number), std::to_string(count)})));
   }
   ui_->PlayerLabel->setText(QString::fromStdString(name));
   ui_->Progress->setRange(0, count);
@@ -42,5 +41,5 @@ void SheetProgressWindow::Close() {
 void SheetProgressWindow::reject() {
   stopped_ = true;
   ui_->Stop->setEnabled(false);
-  ui_->SheetLabel->setText(Words("Stopping after this sheet...", "完成本张后停止……"));
+  ui_->SheetLabel->setText(Text(strings_, OwnText::StoppingAfterThisSheet));
 }

@@ -1,34 +1,27 @@
 #include "sheets/SheetTexts.h"
 
-#include <optional>
+#include <string_view>
 
+#include "core/game/HitLines.h"
 #include "core/text/NumberForms.h"
+#include "core/text/Pieces.h"
+#include "core/text/TextEncoding.h"
+#include "platform/Letters.h"
 
 namespace {
-
-std::string Trimmed(const std::string& text) {
-  const auto first = text.find_first_not_of(' ');
-  return first == std::string::npos ? std::string()
-                                    : text.substr(first, text.find_last_not_of(' ') - first + 1);
-}
 
 std::string NumberText(int index) {
   return Str(std::int32_t{PlayerNumberFromId(IdFromIndex(index))});
 }
 
-const std::string& TeamName(const Game& game, int index) {
-  return game.TeamNames(TeamFromId(IdFromIndex(index)));
-}
-
-/// What was hit, or who hit: team, number, damage, and the name of a member.
-std::string HitText(const Game& game, int index, std::int32_t damage, MemberLookup& members) {
-  std::string text = Trimmed(TeamName(game, index)) + " " + Trimmed(NumberText(index)) + ": " + Str(damage);
-  if (const std::int32_t contactId = game.Players(index).MemberIndex; contactId != 0) {
-    if (const std::optional<Member> member = members.LoadMember(contactId)) {
-      text += "  (" + member->GetPlayerName(true) + ")";
-    }
+/// Sheets show the other player with one blank between team and number, and a member by the nickname.
+CellTexts TextsOf(const std::vector<Hit>& hits, const Game& game, MemberLookup& members) {
+  CellTexts cells;
+  for (const Hit& hit : hits) {
+    const std::string number(Trimmed(NumberText(hit.Index), IsBlank));
+    cells.push_back(HitText(game.TeamName(hit.Index) + " " + number, hit, game, members, true));
   }
-  return text;
+  return cells;
 }
 
 }  // namespace
@@ -60,21 +53,14 @@ std::string WithoutWeekday(const std::string& longDate) {
   if (comma == std::string::npos) {
     return longDate;
   }
-  // The character behind the comma goes too, all of its bytes.
-  const auto isContinuation = [&longDate](std::size_t at) {
-    return at < longDate.size() && (static_cast<unsigned char>(longDate[at]) & 0xC0) == 0x80;
-  };
-  std::size_t rest = comma + 2;
-  while (isContinuation(rest)) {
-    ++rest;
-  }
-  return rest < longDate.size() ? longDate.substr(rest) : std::string();
+  // The character after the comma is dropped too.
+  return Characters(std::string_view(longDate).substr(comma + 1), 1, longDate.size());
 }
 
 BookmarkTexts ResultTexts(const Game& game, int index, int winner) {
   const bool won = TeamFromId(IdFromIndex(index)) == winner;
   return {{"Victory", won ? "Team Won!" : "Team Lost!"},
-          {"PlayerTeam", TeamName(game, index)},
+          {"PlayerTeam", game.TeamName(index)},
           {"PlayerID", NumberText(index) + " "}};
 }
 
@@ -109,31 +95,13 @@ BookmarkTexts GameTexts(const Player& player, const std::string& missionName, co
 }
 
 CellTexts HitsScored(const Game& game, int index, MemberLookup& members) {
-  CellTexts cells;
-  for (int other = 1; other <= PlayerCount; ++other) {
-    const std::int32_t damage = game.Players(other).HitByPlayer(index);
-    if (damage > 0) {
-      cells.push_back(HitText(game, other, damage, members));
-    }
-  }
-  return cells;
+  return TextsOf(HitsGivenBy(index, game), game, members);
 }
 
 CellTexts HitsTaken(const Game& game, int index, MemberLookup& members) {
-  const Player& player = game.Players(index);
-  CellTexts cells;
-  for (int other = 1; other <= PlayerCount; ++other) {
-    if (player.HitByPlayer(other) > 0) {
-      cells.push_back(HitText(game, other, player.HitByPlayer(other), members));
-    }
-  }
-  const std::pair<const char*, std::int32_t> specials[] = {{"Explosive: ", player.ExplosiveDamage},
-                                                           {"Radiation: ", player.RadiationDamage},
-                                                           {"Stuns: ", player.StunCount}};
-  for (const auto& [label, amount] : specials) {
-    if (amount > 0) {
-      cells.push_back(label + Str(amount));
-    }
+  CellTexts cells = TextsOf(HitsTakenBy(index, game), game, members);
+  for (const SpecialHit& hit : SpecialHitsOf(game.Players(index))) {
+    cells.push_back(hit.Caption + Str(hit.Amount));
   }
   return cells;
 }

@@ -8,3 +8,8 @@
 inline QString Text(const StringTable& strings, int number) {
   return QString::fromStdString(strings.Text(number));
 }
+
+/// One of the program's further texts for a control.
+inline QString Text(const StringTable& strings, OwnText text) {
+  return QString::fromStdString(strings.Text(text));
+}

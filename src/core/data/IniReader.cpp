@@ -2,25 +2,22 @@
 
 #include <algorithm>
 #include <optional>
+#include <string_view>
 
+#include "core/text/Pieces.h"
 #include "core/text/TextEncoding.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
 
-/// The buffer of 255 bytes that callers have always passed, less its terminator.
+/// The 255-byte buffer that callers have always passed, less its terminator.
 constexpr std::size_t MostBytesOfValue = 254;
 
 constexpr std::string_view ByteOrderMark = "\xEF\xBB\xBF";
 
-std::string_view Trimmed(std::string_view text) {
-  const std::size_t first = text.find_first_not_of(" \t");
-  return first == std::string_view::npos ? text.substr(0, 0)
-                                         : text.substr(first, text.find_last_not_of(" \t") - first + 1);
-}
-
-/// Decoded name by name and value by value, since a value that this program writes into an old file is UTF-8
-/// among others that are not.
+/// Each name and value is decoded by itself, since the values that this program writes into an old file are
+/// UTF-8 among others in code page 1252.
 std::string Decoded(std::string_view bytes) {
   return IsUtf8(bytes) ? std::string(bytes) : Windows1252ToUtf8(bytes);
 }
@@ -32,32 +29,26 @@ bool SameName(std::string_view bytes, std::string_view name) {
 }
 
 std::string ShownValue(std::string_view bytes) {
-  std::string_view content = Trimmed(bytes);
+  std::string_view content = Trimmed(bytes, IsBlank);
   if (content.size() >= 2 && content.front() == content.back() &&
       (content.front() == '"' || content.front() == '\'')) {
     content = content.substr(1, content.size() - 2);
   }
   std::string value = Decoded(content);
-  if (value.size() > MostBytesOfValue) {
-    std::size_t end = MostBytesOfValue;
-    while ((static_cast<unsigned char>(value[end]) & 0xC0U) == 0x80U) {
-      --end;
-    }
-    value.resize(end);
-  }
+  value.resize(FirstBytes(value, MostBytesOfValue).size());
   return value;
 }
 
-/// Walks over the lines of an ini file; offsets are those into its bytes.
+/// Iterates over the lines of an ini file. Offsets are into the file's bytes.
 class Lines {
  public:
   enum class Kind { Other, Section, Entry };
 
   Kind LineKind = Kind::Other;
   std::string_view Name;       ///< of the section or key
-  std::string_view Value;      ///< of an entry: all that stands behind the "="
+  std::string_view Value;      ///< of an entry: everything after the "="
   std::size_t ValueStart = 0;  ///< of an entry
-  std::size_t End = 0;         ///< where the line's own bytes end
+  std::size_t End = 0;         ///< where the line ends, without its line break
   std::size_t Next = 0;        ///< where the next line begins
 
   explicit Lines(std::string_view bytes)
@@ -70,17 +61,17 @@ class Lines {
     const std::size_t start = Next;
     End = std::min(bytes_.find_first_of("\r\n", start), bytes_.size());
     Next = std::min(End + (bytes_.substr(End, 2) == "\r\n" ? 2 : 1), bytes_.size());
-    const std::string_view line = Trimmed(bytes_.substr(start, End - start));
+    const std::string_view line = Trimmed(bytes_.substr(start, End - start), IsBlank);
     LineKind = Kind::Other;
     if (line.starts_with('[')) {
       if (const std::size_t close = line.find(']'); close != std::string_view::npos) {
         LineKind = Kind::Section;
-        Name = Trimmed(line.substr(1, close - 1));
+        Name = Trimmed(line.substr(1, close - 1), IsBlank);
       }
     } else if (const std::size_t equals = line.find('=');
                equals != std::string_view::npos && !line.starts_with(';')) {
       LineKind = Kind::Entry;
-      Name = Trimmed(line.substr(0, equals));
+      Name = Trimmed(line.substr(0, equals), IsBlank);
       ValueStart = bytes_.find('=', start) + 1;
       Value = bytes_.substr(ValueStart, End - ValueStart);
     }
@@ -96,8 +87,7 @@ std::string_view LineBreakOf(std::string_view bytes) {
   return first != std::string_view::npos && bytes.substr(first, 2) == "\r\n" ? "\r\n" : "\n";
 }
 
-/// `bytes` with the value of one key changed in its line, or the key added behind the last one of its
-/// section.
+/// `bytes` with the value of one key changed in place, or the key added after the last one of its section.
 std::string WithValue(std::string bytes, std::string_view section, std::string_view key,
                       std::string_view value) {
   std::optional<std::size_t> insertAt;
@@ -178,11 +168,7 @@ void IniReader::WriteIni(const std::string& section, const Values& values) {
     }
     files_.Replace(path_, bytes);
   } catch (const RuntimeError&) {
-    // Callers carry on with the value in memory; the file is as it was.
+    // Callers carry on with the value in memory; the file is unchanged.
     return;
   }
-}
-
-std::string FirstLineOf(std::string_view text) {
-  return std::string(text.substr(0, text.find("\r\n")));
 }

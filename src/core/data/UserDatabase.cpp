@@ -1,27 +1,40 @@
 #include "core/data/UserDatabase.h"
 
+#include "core/text/Filled.h"
 #include "platform/RuntimeError.h"
 
 namespace {
 
-constexpr int UnrecognizedFormat = 3343;
 constexpr const char* Title = "Database status";
 
-void TellOfConversion(const UserDatabase& database, const OldDatabaseReport& report, MessageBoxes& boxes) {
-  std::string text = "The database of an old installation has been converted: " + database.Path + ", " +
-                     std::to_string(report.Rows) + " rows. The old file is kept as " + report.KeptAs + ".";
-  if (!report.NotTaken.empty()) {
-    text += "\n\nNot taken over:";
-    for (const std::string& what : report.NotTaken) {
-      text += "\n" + what;
-    }
+std::string TextOf(const NotTakenOver& what, const StringTable& strings) {
+  switch (what.What) {
+    case NotTakenOver::Table:
+      return Filled(strings.Text(OwnText::TableNotTakenOver), {what.Name, std::to_string(what.Rows)});
+    case NotTakenOver::Column:
+      return Filled(strings.Text(OwnText::ColumnNotTakenOver), {what.Name});
+    case NotTakenOver::TextsOfColumn:
+      break;
   }
-  boxes.Show(text, Title, BoxIcon::Information);
+  return Filled(strings.Text(OwnText::TextsNotTakenOver), {what.Name});
 }
 
-std::unique_ptr<Database> Open(const std::string& path, const DatabaseServices& services) {
-  std::unique_ptr<Database> database = services.Engine.OpenDatabase(path);
-  services.Copies.Guard(*database, path);
+void TellOfConversion(const UserDatabase& database, const OldDatabaseReport& report,
+                      const DatabaseParts& parts) {
+  std::string text = Filled(parts.Strings.Text(OwnText::OldDatabaseConverted),
+                            {database.Path, std::to_string(report.Rows), report.KeptAs});
+  if (!report.NotTaken.empty()) {
+    text += "\n\n" + parts.Strings.Text(OwnText::NotTakenOver);
+    for (const NotTakenOver& what : report.NotTaken) {
+      text += "\n" + TextOf(what, parts.Strings);
+    }
+  }
+  parts.Boxes.Show(text, Title, BoxIcon::Information);
+}
+
+std::unique_ptr<Database> Open(const std::string& path, const DatabaseParts& parts) {
+  std::unique_ptr<Database> database = parts.Engine.OpenDatabase(path);
+  parts.Copies.Guard(*database, path);
   return database;
 }
 
@@ -32,31 +45,29 @@ std::string FreshPath(const std::string& path) {
 
 }  // namespace
 
-std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseServices& services) {
+std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseParts& parts) {
   std::string reason;
   try {
-    if (services.Old.IsOld(database.Path)) {
-      TellOfConversion(database, services.Old.Convert(database.Path, database.Table, database.DefaultPath),
-                       services.Boxes);
+    if (parts.Old.IsOld(database.Path)) {
+      TellOfConversion(database, parts.Old.Convert(database.Path, database.Table, database.DefaultPath),
+                       parts);
     }
-    return Open(database.Path, services);
+    return Open(database.Path, parts);
   } catch (const RuntimeError& error) {
-    if (error.Number() != UnrecognizedFormat) {
+    if (error.Number() != Fault::UnrecognizedDatabase) {
       throw;
     }
     reason = error.what();
   }
   const std::string fresh = FreshPath(database.Path);
   const BoxAnswer answer =
-      services.Boxes.Show("The database " + database.Path + " cannot be used. " + reason +
-                              "\n\nIt stays as it is. Press OK to go on with a fresh database, " + fresh +
-                              ", or Cancel to end the program.",
-                          Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
+      parts.Boxes.Show(Filled(parts.Strings.Text(OwnText::DatabaseUnusable), {database.Path, reason, fresh}),
+                       Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
   if (answer == BoxAnswer::Cancel) {
     return nullptr;
   }
-  if (!services.Disk.FileExists(fresh)) {
-    services.Disk.Replace(fresh, services.Disk.Read(database.DefaultPath));
+  if (!parts.Disk.FileExists(fresh)) {
+    parts.Disk.Replace(fresh, parts.Disk.Read(database.DefaultPath));
   }
-  return Open(fresh, services);
+  return Open(fresh, parts);
 }

@@ -2,8 +2,6 @@
 
 #include <utility>
 
-#include "core/text/NumberForms.h"
-
 void Player::Clear() {
   Player cleared;
   cleared.AbsoluteDamage = AbsoluteDamage;
@@ -12,8 +10,8 @@ void Player::Clear() {
 }
 
 Game::Game(const StringTable& strings) {
-  for (int team = 1; team <= TeamCount; ++team) {
-    TeamNames(team) = strings.Text(113 + team);
+  for (std::int16_t team = 1; team <= TeamCount; ++team) {
+    TeamNames(team) = TeamNameFromNumber(strings, team);
     ObjectiveTeams(team).Name = TeamNames(team);
   }
 }
@@ -24,12 +22,4 @@ void Game::Clear() {
   }
   GameDate.clear();
   DataPresent = false;
-}
-
-std::string Game::DisplayName(int index) const {
-  const std::uint8_t id = IdFromIndex(index);
-  std::string name = TeamNames(TeamFromId(id));
-  name += ' ';
-  name += Str(std::int32_t{PlayerNumberFromId(id)});
-  return name;
 }

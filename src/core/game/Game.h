@@ -8,66 +8,71 @@
 #include "core/game/PlayerId.h"
 #include "core/text/StringTable.h"
 
-/// One gun's game. "Calculated" fields are written by the score analysis alone.
+/// One gun's game. Only the score analysis writes the "calculated" fields.
 struct Player {
-  OneBased<std::int32_t, PlayerCount>
-      HitByPlayer;  ///< damage this player took from player q; self-hits included
+  /// Damage this player took from player q; self-hits included.
+  OneBased<std::int32_t, PlayerCount> HitByPlayer;
   std::int32_t ShotCount = 0;
-  std::int32_t TotalDamage =
-      0;  ///< calculated: damage dealt, own-team damage weighted by the friendly fire factor
-  std::int32_t AbsoluteDamage = 0;  ///< calculated: damage dealt, unweighted
-  std::int32_t Soldiering = 0;      ///< calculated
-  std::int32_t HealCount = 0;       ///< times healed ("W.I.A.")
+  /// Calculated: damage dealt, own-team damage weighted by the friendly fire factor.
+  std::int32_t TotalDamage = 0;
+  /// Calculated: damage dealt, unweighted.
+  std::int32_t AbsoluteDamage = 0;
+  std::int32_t Soldiering = 0;  ///< calculated
+  std::int32_t HealCount = 0;   ///< times healed ("W.I.A.")
   std::int32_t AmmoAddCount = 0;
   std::int32_t AdminKillCount = 0;
   std::int32_t RespawnCount = 0;
   std::int32_t RemainingHealth = 0;
   std::int32_t RemainingClips = 0;
   std::int32_t RemainingAmmo = 0;
-  std::int32_t DeathCount = 0;        ///< "K.I.A."
-  std::int32_t SecondaryDamage = 0;   ///< damage of one hit of the secondary weapon
-  std::int32_t PrimaryDamage = 0;     ///< damage of one hit of the primary weapon
-  float Accuracy = 0;                 ///< calculated: fraction, 1.0 = all shots hit
-  std::int32_t RunCounter = 0;        ///< the gun's running time in minutes
-  bool Active = false;                ///< took part in the game
-  std::int16_t Rank = 0;              ///< place on the board, 1 = first
-  std::string DallasID = NoDallasId;  ///< membership button, 16 upper-case hexadecimal digits
-  std::int32_t MemberIndex = 0;       ///< `ContactID` of the member, 0 = none
-  bool Committed = false;             ///< this game was added to the member's totals
+  std::int32_t DeathCount = 0;       ///< "K.I.A."
+  std::int32_t SecondaryDamage = 0;  ///< damage of one hit of the secondary weapon
+  std::int32_t PrimaryDamage = 0;    ///< damage of one hit of the primary weapon
+  float Accuracy = 0;                ///< calculated: fraction, 1.0 = all shots hit
+  std::int32_t RunCounter = 0;       ///< the gun's running time in minutes
+  bool Active = false;               ///< took part in the game
+  std::int16_t Rank = 0;             ///< place on the board, 1 = first
+  /// Membership button, 16 upper-case hexadecimal digits.
+  std::string DallasID = NoDallasId;
+  std::int32_t MemberIndex = 0;  ///< `ContactID` of the member, 0 = none
+  bool Committed = false;        ///< this game was added to the member's totals
   std::int32_t BonusPoints = 0;
   std::int32_t ExplosiveDamage = 0;
   std::int32_t RadiationDamage = 0;
   std::int32_t StunCount = 0;
   std::uint8_t PowerCheatFlag = 0;
 
-  /// Back to an empty record; `AbsoluteDamage` and `Accuracy` stay, the score analysis rewrites them.
+  /// Empties the record, except `AbsoluteDamage` and `Accuracy`, which the score analysis rewrites.
   void Clear();
 };
 
-/// Who plays one of the mission's objective sets A, B, C, and what they achieved.
+/// The team that plays one of the mission's objective sets A, B, C, and what it achieved.
 struct ObjectiveTeam {
   std::string Name;  ///< one of `TeamNames`
   bool PrimaryAchieved = false;
   bool SecondaryAchieved = false;
 };
 
-inline constexpr int TeamCount = 3;
-
-/// The game on the board. The table of players always exists whole; who took no part is not `Active`.
+/// The game on the board. The table of players is always complete; those who took no part are not `Active`.
 struct Game {
   explicit Game(const StringTable& strings);
 
   OneBased<Player, PlayerCount> Players;
   OneBased<std::string, TeamCount> TeamNames;
-  OneBased<std::int32_t, TeamCount>
-      TeamTotals;  ///< calculated: sum of `Soldiering` of a team's active players
+  /// Calculated: sum of `Soldiering` of a team's active players.
+  OneBased<std::int32_t, TeamCount> TeamTotals;
   OneBased<ObjectiveTeam, TeamCount> ObjectiveTeams;
-  std::string GameDate;      ///< a text: the date as the locale writes it, or what a loaded file says
-  bool DataPresent = false;  ///< true once a frame was decoded or a file loaded
+  /// A text: the date as the locale writes it, or what a loaded file says.
+  std::string GameDate;
+  /// True once a frame was decoded or a file loaded.
+  bool DataPresent = false;
 
-  /// Forgets the players and the date. Team names and objective results stay for the next game.
+  /// Clears the players and the date. Team names and objective results stay for the next game.
   void Clear();
 
-  /// How a player is named: team, one blank, number form of the number ("Blue  7").
-  std::string DisplayName(int index) const;
+  /// Name of the team of the player at record `index`.
+  const std::string& TeamName(int index) const { return TeamNames(TeamFromId(IdFromIndex(index))); }
+
+  /// How that player is named: "Blue  7".
+  std::string DisplayName(int index) const { return PlayerName(TeamName(index), IdFromIndex(index)); }
 };

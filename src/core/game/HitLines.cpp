@@ -1,57 +1,62 @@
 #include "core/game/HitLines.h"
 
 #include <optional>
-#include <utility>
 
 #include "core/text/NumberForms.h"
 
 namespace {
 
-void AddLine(std::vector<HitLine>& lines, int index, std::int32_t amount, const Game& game,
-             MemberLookup& members) {
-  if (amount <= 0) {
-    return;
+void AddHit(std::vector<Hit>& hits, int index, std::int32_t amount) {
+  if (amount > 0) {
+    hits.push_back({index, amount});
   }
-  std::string text = game.DisplayName(index) + ": " + Str(amount);
-  if (const std::int32_t contactId = game.Players(index).MemberIndex; contactId != 0) {
-    if (const std::optional<Member> member = members.LoadMember(contactId)) {
-      text += "  (" + member->GetPlayerName(false) + ")";
-    }
-  }
-  lines.push_back({std::move(text), index, amount});
 }
 
 }  // namespace
 
-std::vector<HitLine> HitsGivenBy(int index, const Game& game, MemberLookup& members) {
-  std::vector<HitLine> lines;
+std::vector<Hit> HitsGivenBy(int index, const Game& game) {
+  std::vector<Hit> hits;
   for (int victim = 1; victim <= PlayerCount; ++victim) {
-    AddLine(lines, victim, game.Players(victim).HitByPlayer(index), game, members);
+    AddHit(hits, victim, game.Players(victim).HitByPlayer(index));
   }
-  return lines;
+  return hits;
 }
 
-std::vector<HitLine> HitsTakenBy(int index, const Game& game, MemberLookup& members) {
-  std::vector<HitLine> lines;
+std::vector<Hit> HitsTakenBy(int index, const Game& game) {
+  std::vector<Hit> hits;
   for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
-    AddLine(lines, shooter, game.Players(index).HitByPlayer(shooter), game, members);
+    AddHit(hits, shooter, game.Players(index).HitByPlayer(shooter));
   }
-  return lines;
+  return hits;
+}
+
+std::string HitText(const std::string& playerName, const Hit& hit, const Game& game, MemberLookup& members,
+                    bool useNickName) {
+  std::string text = playerName + ": " + Str(hit.Amount);
+  if (const std::int32_t contactId = game.Players(hit.Index).MemberIndex; contactId != 0) {
+    if (const std::optional<Member> member = members.LoadMember(contactId)) {
+      text += "  (" + member->GetPlayerName(useNickName) + ")";
+    }
+  }
+  return text;
+}
+
+std::vector<SpecialHit> SpecialHitsOf(const Player& player) {
+  std::vector<SpecialHit> hits;
+  for (const SpecialHit& hit :
+       {SpecialHit{"Explosive: ", player.ExplosiveDamage}, SpecialHit{"Radiation: ", player.RadiationDamage},
+        SpecialHit{"Stuns: ", player.StunCount}}) {
+    if (hit.Amount > 0) {
+      hits.push_back(hit);
+    }
+  }
+  return hits;
 }
 
 std::vector<std::string> SpecialDamageOf(const Player& player) {
   std::vector<std::string> lines;
-  for (const auto& [caption, amount] : {std::pair{"Explosive: ", player.ExplosiveDamage},
-                                        {"Radiation: ", player.RadiationDamage},
-                                        {"Stuns: ", player.StunCount}}) {
-    if (amount > 0) {
-      lines.push_back(caption + std::to_string(amount));
-    }
+  for (const SpecialHit& hit : SpecialHitsOf(player)) {
+    lines.push_back(hit.Caption + std::to_string(hit.Amount));
   }
   return lines;
-}
-
-std::string RunTimeText(std::int32_t minutes) {
-  const std::int32_t hours = minutes / 60;
-  return Str(hours) + "H " + Str(minutes - hours * 60) + "M";
 }

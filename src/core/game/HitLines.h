@@ -7,22 +7,30 @@
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
 
-/// One line of "who hit whom".
-struct HitLine {
-  std::string Text;
+/// Damage that a player dealt to, or took from, another one.
+struct Hit {
   int Index;            ///< record of the other player
   std::int32_t Amount;  ///< damage, above 0
 };
 
-/// What the player at record `index` did to each player, by ascending record. A member who cannot be found is
-/// told in a box, and the line has no name.
-std::vector<HitLine> HitsGivenBy(int index, const Game& game, MemberLookup& members);
+/// The damage that the player at record `index` did to each player, themselves included, by ascending record.
+std::vector<Hit> HitsGivenBy(int index, const Game& game);
 
-/// What each player did to the player at record `index`.
-std::vector<HitLine> HitsTakenBy(int index, const Game& game, MemberLookup& members);
+/// The damage that each player did to the player at record `index`.
+std::vector<Hit> HitsTakenBy(int index, const Game& game);
 
-/// "Explosive: 5" and the like, for what hit the player without a shooter.
+/// One line of the hit list: `playerName`, damage, and the name if the player is a member: "Red  4:  40
+/// (Mole)". If the member cannot be found, a box says so and the line has no name.
+std::string HitText(const std::string& playerName, const Hit& hit, const Game& game, MemberLookup& members,
+                    bool useNickName);
+
+/// Damage taken that has no shooter.
+struct SpecialHit {
+  const char* Caption;  ///< "Explosive: " and the like
+  std::int32_t Amount;  ///< above 0
+};
+
+std::vector<SpecialHit> SpecialHitsOf(const Player& player);
+
+/// The same as lines with plain digits, "Explosive: 5".
 std::vector<std::string> SpecialDamageOf(const Player& player);
-
-/// A running time in minutes as hours and minutes: " 2H  5M" for 125.
-std::string RunTimeText(std::int32_t minutes);

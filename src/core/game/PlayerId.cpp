@@ -1,11 +1,11 @@
 #include "core/game/PlayerId.h"
 
+#include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
 namespace {
 
 constexpr int FirstTeamNameText = 114;
-constexpr std::int16_t TeamCount = 3;
 
 }  // namespace
 
@@ -53,13 +53,20 @@ std::uint8_t IdFromTeamAndNumber(std::uint8_t team, std::uint8_t number) {
     id = number + 96;
   }
   if (id > 255) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<std::uint8_t>(id);
 }
 
 std::string TeamNameFromNumber(const StringTable& texts, std::int16_t team) {
   return team >= 1 && team <= TeamCount ? texts.Text(FirstTeamNameText + team - 1) : std::string();
+}
+
+std::string PlayerName(std::string_view teamName, std::uint8_t id) {
+  std::string name(teamName);
+  name += ' ';
+  name += Str(std::int32_t{PlayerNumberFromId(id)});
+  return name;
 }
 
 std::int16_t TeamNumberFromName(const StringTable& texts, std::string_view name) {

@@ -11,7 +11,7 @@ namespace {
 
 void AddTo(std::int32_t& sum, std::int32_t amount) {
   if (__builtin_add_overflow(sum, amount, &sum)) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
 }
 

@@ -3,8 +3,8 @@
 #include <utility>
 
 #include "core/data/FieldValue.h"
-#include "core/data/IniReader.h"
 #include "core/data/UserDatabase.h"
+#include "core/text/Pieces.h"
 
 Session::Session(const StringTable& strings, const Clock& time, MessageBoxes& boxes)
     : strings_(strings), time_(time), boxes_(boxes), game_(strings) {}
@@ -14,11 +14,16 @@ Subscription Session::Listen(std::function<void(SessionChange)> listener) {
 }
 
 bool Session::Open(const Sources& sources) {
-  backups_.emplace(sources.UserDataFolder + "/backups", sources.Disk, time_);
+  backups_.emplace(sources.UserDataFolder + "/backups", sources.Disk, time_, strings_);
   const auto open = [&](const std::string& name, const std::string& table) {
     return OpenUserDatabase({sources.UserDataFolder + "/" + name + ".mdb", table,
                              sources.ProgramFolder + "/" + name + "_default.mdb"},
-                            {sources.Engine, sources.Old, sources.Disk, boxes_, *backups_});
+                            {.Engine = sources.Engine,
+                             .Old = sources.Old,
+                             .Disk = sources.Disk,
+                             .Boxes = boxes_,
+                             .Copies = *backups_,
+                             .Strings = strings_});
   };
   dbScenarios_ = open("scenarios", "Table1");
   if (!dbScenarios_) {

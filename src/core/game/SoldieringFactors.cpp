@@ -3,42 +3,37 @@
 #include <array>
 #include <string>
 
-#include "core/text/NumberForms.h"
-
 namespace {
 
-constexpr const char* Section = "soldiering_calc";
-
-struct FactorKey {
-  const char* Key;
+struct FactorSetting {
+  const Setting& In;
   double SoldieringFactors::*Factor;
 };
 
-/// In the order in which they are written.
-constexpr std::array<FactorKey, 6> FactorKeys = {{
-    {"total_damage", &SoldieringFactors::Damage},
-    {"respawns", &SoldieringFactors::Death},
-    {"heals", &SoldieringFactors::Heal},
-    {"ammo_adds", &SoldieringFactors::Ammo},
-    {"accuracy", &SoldieringFactors::Accuracy},
-    {"friendly_fire_factor", &SoldieringFactors::FriendlyFire},
+/// In the order in which they are written to the file.
+constexpr std::array<FactorSetting, 6> FactorSettings = {{
+    {Keys::TotalDamage, &SoldieringFactors::Damage},
+    {Keys::Respawns, &SoldieringFactors::Death},
+    {Keys::Heals, &SoldieringFactors::Heal},
+    {Keys::AmmoAdds, &SoldieringFactors::Ammo},
+    {Keys::Accuracy, &SoldieringFactors::Accuracy},
+    {Keys::FriendlyFire, &SoldieringFactors::FriendlyFire},
 }};
 
 }  // namespace
 
 SoldieringFactors ReadSoldieringFactors(const IniReader& ini) {
   SoldieringFactors factors;
-  for (const FactorKey& entry : FactorKeys) {
-    double& factor = factors.*entry.Factor;
-    factor = ToDouble(ini.ReadIni(Section, entry.Key, Str(factor)));
+  for (const FactorSetting& setting : FactorSettings) {
+    factors.*setting.Factor = ToDouble(ini.ReadIni(setting.In));
   }
   return factors;
 }
 
 void WriteSoldieringFactors(IniReader& ini, const SoldieringFactors& factors) {
   IniReader::Values values;
-  for (const FactorKey& entry : FactorKeys) {
-    values.emplace_back(entry.Key, Str(factors.*entry.Factor));
+  for (const FactorSetting& setting : FactorSettings) {
+    values.emplace_back(setting.In.Key, Str(factors.*setting.Factor));
   }
-  ini.WriteIni(Section, values);
+  ini.WriteIni(FactorSettings.front().In.Section, values);
 }

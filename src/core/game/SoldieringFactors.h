@@ -1,21 +1,23 @@
 #pragma once
 
 #include "core/data/IniReader.h"
+#include "core/data/SettingsTable.h"
+#include "core/text/NumberForms.h"
 
-/// What one point of each quantity adds to a player's soldiering score; FriendlyFire weighs damage to the own
-/// team.
+/// What one unit of each quantity adds to a player's soldiering score. FriendlyFire weights damage done to
+/// one's own team.
 struct SoldieringFactors {
-  double Damage = 1;
-  double Death = -1;
-  double Heal = -1;
-  double Ammo = -1;
-  double Accuracy = 1;
-  double FriendlyFire = -1;
+  double Damage = ToDouble(Keys::TotalDamage.Default);
+  double Death = ToDouble(Keys::Respawns.Default);
+  double Heal = ToDouble(Keys::Heals.Default);
+  double Ammo = ToDouble(Keys::AmmoAdds.Default);
+  double Accuracy = ToDouble(Keys::Accuracy.Default);
+  double FriendlyFire = ToDouble(Keys::FriendlyFire.Default);
 };
 
-/// Section "soldiering_calc"; a missing key gives its default. Throws RuntimeError 13 for a text that is no
-/// number, 6 for a number that is too large.
+/// A missing key has its default. Throws RuntimeError 13 for a text that is not a number, 6 for a number that
+/// is too large.
 SoldieringFactors ReadSoldieringFactors(const IniReader& ini);
 
-/// Writes all six factors in one replacement of the file; failure is not reported.
+/// Writes all six factors, replacing the file once; a failure is not reported.
 void WriteSoldieringFactors(IniReader& ini, const SoldieringFactors& factors);

@@ -1,32 +1,32 @@
 #include "core/line/EnumPorts.h"
 
 #include <algorithm>
-#include <charconv>
 #include <cstddef>
+#include <string_view>
 
-#include "core/text/TextEncoding.h"
+#include "core/text/NumberForms.h"
+#include "platform/Letters.h"
 
 namespace {
 
 /// n of a key "com<n>" in plain decimal, 0 when the key is none.
-int PortOfKey(const std::string& key) {
-  constexpr std::size_t PrefixLength = 3;
-  std::string prefix = key.substr(0, PrefixLength);
-  std::transform(prefix.begin(), prefix.end(), prefix.begin(), LowerAscii);
-  if (prefix != "com" || key.size() == PrefixLength || key[PrefixLength] == '0') {
+std::int16_t PortOfKey(const std::string& key) {
+  constexpr std::string_view form = Keys::PortDevice.Key;
+  constexpr std::string_view prefix = form.substr(0, form.find('<'));
+  const std::string_view start = std::string_view(key).substr(0, prefix.size());
+  const bool named = std::equal(start.begin(), start.end(), prefix.begin(), prefix.end(),
+                                [](char letter, char of) { return LowerAscii(letter) == of; });
+  if (!named || key.size() == prefix.size() || key[prefix.size()] == '0') {
     return 0;
   }
-  int number = 0;
-  const char* const end = key.data() + key.size();
-  const auto parsed = std::from_chars(key.data() + PrefixLength, end, number);
-  return parsed.ec == std::errc() && parsed.ptr == end && number > 0 ? number : 0;
+  return NumberOfDigits(std::string_view(key).substr(prefix.size())).value_or(0);
 }
 
 }  // namespace
 
 EnumPorts::EnumPorts(const IniReader& ini, const SerialDevices& devices)
     : devices_(devices), found_(devices.Names()) {
-  for (const auto& [key, device] : ini.ReadSection("ports")) {
+  for (const auto& [key, device] : ini.ReadSection(Keys::PortDevice.Section)) {
     named_.try_emplace(PortOfKey(key), device);
   }
   named_.erase(0);

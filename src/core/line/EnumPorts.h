@@ -24,6 +24,6 @@ class EnumPorts {
 
  private:
   const SerialDevices& devices_;
-  std::map<int, std::string> named_;
+  std::map<std::int16_t, std::string> named_;
   std::vector<std::string> found_;
 };

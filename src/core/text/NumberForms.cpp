@@ -8,30 +8,14 @@
 #include <limits>
 #include <type_traits>
 
+#include "core/text/Pieces.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
 
-/// Beyond this the number form of a double rounds up to a text that is out of range.
+/// Above this, a double's number form rounds up to a text that no double can hold.
 constexpr double LargestReadable = 1.79769313486231E+308;
-
-bool IsDigit(char letter) {
-  return letter >= '0' && letter <= '9';
-}
-
-bool IsWhiteSpace(char letter) {
-  return letter == ' ' || (letter >= '\t' && letter <= '\r');
-}
-
-std::string_view Trimmed(std::string_view text) {
-  while (!text.empty() && IsWhiteSpace(text.front())) {
-    text.remove_prefix(1);
-  }
-  while (!text.empty() && IsWhiteSpace(text.back())) {
-    text.remove_suffix(1);
-  }
-  return text;
-}
 
 std::size_t EndOfDigits(std::string_view text, std::size_t at) {
   while (at < text.size() && IsDigit(text[at])) {
@@ -40,8 +24,8 @@ std::size_t EndOfDigits(std::string_view text, std::size_t at) {
   return at;
 }
 
-/// Length of the number that `text` begins with: sign, digits with at most one point, exponent; 0 when there
-/// is none.
+/// Length of the number at the start of `text`: sign, digits with at most one point, exponent; 0 if there is
+/// none.
 std::size_t LengthOfNumber(std::string_view text) {
   const auto isSign = [text](std::size_t at) {
     return at < text.size() && (text[at] == '+' || text[at] == '-');
@@ -67,8 +51,8 @@ std::size_t LengthOfNumber(std::string_view text) {
   return end;
 }
 
-/// True when the number in `text`, which no double can hold, is too large and not too small. Only the place
-/// of its first digit above 0 counts: a power of ten is far from 0 in both cases.
+/// For a number in `text` that no double can hold: true if it is too large, false if too small. The power of
+/// ten of its first non-zero digit decides, being far from 0 in both cases.
 bool IsTooLarge(std::string_view text) {
   const std::size_t letterE = std::min(text.find_first_of("Ee"), text.size());
   const std::string_view mantissa = text.substr(0, letterE);
@@ -88,13 +72,13 @@ bool IsTooLarge(std::string_view text) {
   return point - firstDigit + (negative ? -exponent : exponent) > 0;
 }
 
-/// Value of a text that is wholly a number: an infinity when it is too large, 0 when too small.
+/// Value of a text that is a number as a whole: an infinity if too large, 0 if too small.
 double ValueOfNumber(std::string_view text) {
   if (text.starts_with('+')) {
     text.remove_prefix(1);
   }
   constexpr std::size_t exactDigits = 15;
-  if (text.size() <= exactDigits) {  // the usual case, and several times faster
+  if (text.size() <= exactDigits) {  // usually an integer, which parses several times faster
     long long whole = 0;
     if (std::from_chars(text.data(), text.data() + text.size(), whole).ptr == text.data() + text.size()) {
       return static_cast<double>(whole);
@@ -108,17 +92,17 @@ double ValueOfNumber(std::string_view text) {
   if (!IsTooLarge(text)) {
     return 0;
   }
-  constexpr double Infinity = std::numeric_limits<double>::infinity();
-  return text.starts_with('-') ? -Infinity : Infinity;
+  constexpr double infinity = std::numeric_limits<double>::infinity();
+  return text.starts_with('-') ? -infinity : infinity;
 }
 
 void RequireFinite(double value) {
   if (!std::isfinite(value)) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
 }
 
-/// Counts the last digit of a decimal text up, with carry: "-1.99" becomes "-2.00".
+/// Increments the last digit of a decimal text, with carry: "-1.99" becomes "-2.00".
 void AddOneToLastDigit(std::string& number) {
   for (std::size_t at = number.size(); at > 0 && number[at - 1] != '-'; --at) {
     char& digit = number[at - 1];
@@ -150,14 +134,14 @@ std::string HundredthsAsPercent(long long hundredths) {
 
 template <typename Float>
 std::string NumberForm(Float value) {
-  constexpr int MostDigits = std::is_same_v<Float, float> ? 7 : 15;
+  constexpr int mostDigits = std::is_same_v<Float, float> ? 7 : 15;
   RequireFinite(value);
   if (value == 0) {
     return " 0";
   }
   std::array<char, 32> buffer{};
   const auto written = std::to_chars(buffer.data(), buffer.data() + buffer.size(), std::abs(value),
-                                     std::chars_format::scientific, MostDigits - 1);
+                                     std::chars_format::scientific, mostDigits - 1);
   const std::string_view shown(buffer.data(), static_cast<std::size_t>(written.ptr - buffer.data()));
   const std::size_t letterE = shown.find('e');
   const std::string exponentText(shown.substr(letterE + 1));
@@ -168,7 +152,7 @@ std::string NumberForm(Float value) {
   digits.erase(digits.find_last_not_of('0') + 1);
 
   const std::string sign(value < 0 ? "-" : " ");
-  if (exponent < -4 || exponent >= MostDigits) {
+  if (exponent < -4 || exponent >= mostDigits) {
     return sign + digits.substr(0, 1) + (digits.size() > 1 ? "." : "") + digits.substr(1) + "E" +
            exponentText;
   }
@@ -186,7 +170,7 @@ template <typename Integer>
 Integer ToInteger(std::string_view text) {
   const std::int32_t value = ToInt32(text);
   if (value < std::numeric_limits<Integer>::min() || value > std::numeric_limits<Integer>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<Integer>(value);
 }
@@ -222,11 +206,11 @@ std::string PlainDecimal(double value) {
 }
 
 double Val(std::string_view text) {
-  text = Trimmed(text);
+  text = Trimmed(text, IsWhiteSpace);
   std::string dense;
   const std::size_t next = text.find_first_not_of("0123456789+-.Ee");
   if (next != std::string_view::npos && IsWhiteSpace(text[next])) {
-    // Blanks between its parts do not end a number.
+    // Blanks within a number do not end it.
     std::copy_if(text.begin(), text.end(), std::back_inserter(dense),
                  [](char letter) { return !IsWhiteSpace(letter); });
     text = dense;
@@ -237,11 +221,19 @@ double Val(std::string_view text) {
 }
 
 std::optional<double> NumberIn(std::string_view text) {
-  const std::string_view number = Trimmed(text);
+  const std::string_view number = Trimmed(text, IsWhiteSpace);
   if (number.empty() || LengthOfNumber(number) != number.size()) {
     return std::nullopt;
   }
   return ValueOfNumber(number);
+}
+
+std::optional<std::int16_t> NumberOfDigits(std::string_view text) {
+  std::int16_t number = 0;
+  const char* const end = text.data() + text.size();
+  const auto parsed = std::from_chars(text.data(), end, number);
+  const bool whole = parsed.ec == std::errc() && parsed.ptr == end && IsDigit(text.front());
+  return whole ? std::optional(number) : std::nullopt;
 }
 
 bool IsNumeric(std::string_view text) {
@@ -251,7 +243,7 @@ bool IsNumeric(std::string_view text) {
 double ToDouble(std::string_view text) {
   const std::optional<double> value = NumberIn(text);
   if (!value) {
-    throw RuntimeError(13);
+    throw RuntimeError(Fault::TypeMismatch);
   }
   RequireFinite(*value);
   return *value;
@@ -260,7 +252,7 @@ double ToDouble(std::string_view text) {
 float ToSingle(std::string_view text) {
   const double value = ToDouble(text);
   if (std::abs(value) > std::numeric_limits<float>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<float>(value);
 }
@@ -283,7 +275,7 @@ std::int32_t RoundToInt32(long double value) {
   const long long rounded = near ? std::llrint(value) : std::numeric_limits<long long>::max();
   if (rounded < std::numeric_limits<std::int32_t>::min() ||
       rounded > std::numeric_limits<std::int32_t>::max()) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<std::int32_t>(rounded);
 }
@@ -307,6 +299,11 @@ std::string FormatPercent(double value) {
   return text + "%";
 }
 
+std::string RunTimeText(std::int32_t minutes) {
+  const std::int32_t hours = minutes / 60;
+  return Str(hours) + "H " + Str(minutes - hours * 60) + "M";
+}
+
 double PercentHundredths(float value) {
   // Ten thousand times a float is exact in a double, and so is the tie.
   return std::round(double{value} * 10'000);
@@ -314,11 +311,12 @@ double PercentHundredths(float value) {
 
 std::string FormatFixed(double value, int decimals) {
   RequireFinite(value);
-  // A tie is an odd multiple of half the last decimal, which for a binary fraction means an odd multiple of
-  // 1 / 2^(decimals + 1). The conversion would take it to the even digit; with one more decimal it is exact.
+  // A tie is an odd multiple of half the last decimal place; for a binary fraction, of 1 / 2^(decimals + 1).
+  // to_chars would round it to the even digit, so it is written exactly, with one more decimal, and then
+  // rounded up.
   const bool tie = std::abs(std::fmod(std::ldexp(value, decimals + 1), 2)) == 1;
-  constexpr int MostBeforeDecimals = 312;
-  std::string text(static_cast<std::size_t>(MostBeforeDecimals + decimals), '\0');
+  constexpr int mostBeforeDecimals = 312;
+  std::string text(static_cast<std::size_t>(mostBeforeDecimals + decimals), '\0');
   const auto written = std::to_chars(text.data(), text.data() + text.size(), value, std::chars_format::fixed,
                                      tie ? decimals + 1 : decimals);
   text.resize(static_cast<std::size_t>(written.ptr - text.data()));

@@ -1,8 +1,10 @@
 #include "core/text/StringTable.h"
 
+#include <algorithm>
 #include <cstddef>
+#include <iterator>
 
-#include "core/text/TextEncoding.h"
+#include "platform/Letters.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -15,20 +17,26 @@ struct Entry {
 
 constexpr Entry Entries[] = {
 #define TEXT(number, english, simplifiedChinese) {number, english, simplifiedChinese},
+#define OWN_TEXT(number, name, english, simplifiedChinese) {number, english, simplifiedChinese},
 #include "resources/StringTable.inc"
-#undef TEXT
 };
 
-constexpr bool IsComplete() {
-  int expected = StringTable::FirstText;
-  for (const Entry& entry : Entries) {
-    if (entry.Number != expected++) {
+constexpr std::size_t NumberedTexts = StringTable::LastText - StringTable::FirstText + 1;
+constexpr int FirstOwnText = 301;
+
+constexpr bool IsInOrder() {
+  for (std::size_t at = 0; at < std::size(Entries); ++at) {
+    const int number = Entries[at].Number;
+    const bool inOrder = at < NumberedTexts ? number == StringTable::FirstText + static_cast<int>(at)
+                                            : number >= FirstOwnText && number > Entries[at - 1].Number;
+    if (!inOrder) {
       return false;
     }
   }
-  return expected == StringTable::LastText + 1;
+  return std::size(Entries) >= NumberedTexts;
 }
-static_assert(IsComplete(), "the string table holds each number once, in ascending order");
+static_assert(IsInOrder(),
+              "the string table holds each number once, in ascending order, 101 to 218 without a gap");
 
 }  // namespace
 
@@ -39,14 +47,18 @@ Language LanguageOf(std::string_view localeName) {
 }
 
 StringTable::StringTable(Language language) : language_(language) {
-  for (std::size_t text = 0; text < texts_.size(); ++text) {
-    texts_[text] = language == Language::English ? Entries[text].English : Entries[text].SimplifiedChinese;
+  texts_.reserve(std::size(Entries));
+  for (const Entry& entry : Entries) {
+    texts_.emplace_back(language == Language::English ? entry.English : entry.SimplifiedChinese);
   }
 }
 
 const std::string& StringTable::Text(int number) const {
-  if (number < FirstText || number > LastText) {
-    throw RuntimeError(9);
+  const Entry* const found =
+      std::lower_bound(std::begin(Entries), std::end(Entries), number,
+                       [](const Entry& entry, int wanted) { return entry.Number < wanted; });
+  if (found == std::end(Entries) || found->Number != number) {
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
-  return texts_[static_cast<std::size_t>(number - FirstText)];
+  return texts_[static_cast<std::size_t>(found - std::begin(Entries))];
 }

@@ -3,6 +3,7 @@
 #include <string>
 
 #include "core/game/PlayerId.h"
+#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 
 GunSearch::GunSearch(RadioLink& link, EventPump& events, const StringTable& strings, GunTable& guns,
@@ -21,9 +22,10 @@ void GunSearch::SearchGuns(std::int16_t maxPlayerId) {
   for (int pass = 0; pass < passes; ++pass) {
     for (int index = 0; index < maxPlayerId && !link_.Stopped(); ++index) {
       const int playerId = FirstGunId + index;
-      display_.SetProgress("Pass " + std::to_string(pass + 1) + " of " + std::to_string(passes) + ", ID " +
-                               std::to_string(playerId),
-                           pass * maxPlayerId + index, passes * maxPlayerId);
+      display_.SetProgress(
+          Filled(strings_.Text(OwnText::SearchProgress),
+                 {std::to_string(pass + 1), std::to_string(passes), std::to_string(playerId)}),
+          pass * maxPlayerId + index, passes * maxPlayerId);
       Ask(static_cast<std::uint8_t>(playerId));
     }
   }
@@ -44,20 +46,19 @@ void GunSearch::Ask(std::uint8_t playerId) {
 
 void GunSearch::TakeAnswer() {
   const GunPacket answer = ReadGunPacket(link_.Frame());
-  if (answer[4] != GunPacketType::SearchAnswer) {
+  if (answer.Type != GunPacketType::SearchAnswer) {
     return;
   }
-  const std::uint8_t playerId = answer[1];
+  const std::uint8_t playerId = answer.PlayerId;
   GunEntry& gun = guns_[ByteOf(playerId - FirstGunId)];
   if (gun.Present) {
     return;
   }
-  gun.Firmware = Str(answer[5]) + "." + Str(answer[6]);
-  gun.Battery = answer[7];
-  gun.WeaponType = answer[8];
+  gun.Firmware = Str(answer.Payload[0]) + "." + Str(answer.Payload[1]);
+  gun.Battery = answer.Payload[2];
+  gun.WeaponType = answer.Payload[3];
   gun.PlayerID = playerId;
-  gun.PlayerName =
-      TeamNameFromNumber(strings_, TeamFromId(playerId)) + " " + Str(PlayerNumberFromId(playerId));
+  gun.PlayerName = PlayerName(TeamNameFromNumber(strings_, TeamFromId(playerId)), playerId);
   gun.Present = true;
   gun.Address = link_.Frame().SourceAddress;
   gun.ScoreStatus = ScoreStatus::Pending;

@@ -7,6 +7,7 @@
 #include <string>
 
 #include "core/line/Checksum.h"
+#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
@@ -27,7 +28,7 @@ bool WantsScores(const GunEntry& gun) {
 
 /// The guns split the size by 255, not 256.
 int TotalOf(const GunPacket& answer) {
-  return answer[7] * 255 + answer[6];
+  return answer.Payload[2] * 255 + answer.Payload[1];
 }
 
 int BlocksIn(int total) {
@@ -37,9 +38,15 @@ int BlocksIn(int total) {
 
 }  // namespace
 
-ScoreFetch::ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, Game& game, GunTable& guns,
-                       RadioDisplay& display)
-    : link_(link), events_(events), clock_(clock), game_(game), guns_(guns), display_(display) {}
+ScoreFetch::ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, const StringTable& strings,
+                       Game& game, GunTable& guns, RadioDisplay& display)
+    : link_(link),
+      events_(events),
+      clock_(clock),
+      strings_(strings),
+      game_(game),
+      guns_(guns),
+      display_(display) {}
 
 void ScoreFetch::GetScores() {
   link_.OpenXBeePort();
@@ -49,8 +56,9 @@ void ScoreFetch::GetScores() {
   for (int index = 0; index < GunCount && !link_.Stopped(); ++index) {
     events_.DoEvents();
     if (WantsScores(guns_[static_cast<std::size_t>(index)])) {
-      display_.SetProgress("Gun " + std::to_string(fetched + 1) + " of " + std::to_string(wanted), fetched,
-                           wanted);
+      display_.SetProgress(Filled(strings_.Text(OwnText::FetchProgress),
+                                  {std::to_string(fetched + 1), std::to_string(wanted)}),
+                           fetched, wanted);
       FetchGun(index);
       ++fetched;
     }
@@ -83,13 +91,13 @@ void ScoreFetch::Attempt(GunEntry& gun, std::uint8_t playerId) {
     return;
   }
   const int total = TotalOf(answer_);
-  const std::uint8_t check = answer_[8];
+  const std::uint8_t check = answer_.Payload[3];
   if (FetchBlocks(gun, playerId, total) < total ||
       Crc8(std::span(buffer_).first(static_cast<std::size_t>(total))) != check) {
     return;
   }
   AnalyseData(buffer_, game_, clock_);
-  if (Command(gun, playerId, std::array{CloseTransfer}) && answer_[5] == CloseTransfer) {
+  if (Command(gun, playerId, std::array{CloseTransfer}) && answer_.Payload[0] == CloseTransfer) {
     gun.ScoreStatus = ScoreStatus::Ok;
   }
 }
@@ -107,7 +115,7 @@ bool ScoreFetch::Command(const GunEntry& gun, std::uint8_t playerId, std::span<c
     // a status frame and the answer came at once: the data that came last count
   }
   answer_ = ReadGunPacket(link_.Frame());
-  return answer_[4] == GunPacketType::CommandAnswer;
+  return answer_.Type == GunPacketType::CommandAnswer;
 }
 
 int ScoreFetch::FetchBlocks(const GunEntry& gun, std::uint8_t playerId, int total) {
@@ -118,7 +126,7 @@ int ScoreFetch::FetchBlocks(const GunEntry& gun, std::uint8_t playerId, int tota
     const int count = std::min(BlockLength, total - position);
     position += count;
     const std::array request = {ReadBlock, ByteOf(block * BlockLength), ByteOf(count)};
-    if (Command(gun, playerId, request) && answer_[5] == ReadBlock) {
+    if (Command(gun, playerId, request) && answer_.Payload[0] == ReadBlock) {
       received += TakeBlock();
     }
   }
@@ -126,12 +134,13 @@ int ScoreFetch::FetchBlocks(const GunEntry& gun, std::uint8_t playerId, int tota
 }
 
 int ScoreFetch::TakeBlock() {
-  constexpr std::size_t dataOffset = 8;
-  const std::size_t start = answer_[6];
-  const std::size_t length = answer_[7] + 1U;
-  if (dataOffset + length > answer_.size()) {
-    throw RuntimeError(9);
+  constexpr std::size_t dataOffset = 3;  // in the payload
+  const std::size_t start = answer_.Payload[1];
+  const std::size_t length = answer_.Payload[2] + 1U;
+  if (dataOffset + length > answer_.Payload.size()) {
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
-  std::copy_n(answer_.begin() + dataOffset, length, buffer_.begin() + static_cast<std::ptrdiff_t>(start));
+  std::copy_n(answer_.Payload.begin() + dataOffset, length,
+              buffer_.begin() + static_cast<std::ptrdiff_t>(start));
   return static_cast<int>(length);
 }

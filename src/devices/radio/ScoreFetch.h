@@ -3,8 +3,9 @@
 #include <cstdint>
 #include <span>
 
-#include "core/game/FrameDecoder.h"
 #include "core/game/Game.h"
+#include "core/game/ScoreFrame.h"
+#include "core/text/StringTable.h"
 #include "devices/radio/GunTable.h"
 #include "devices/radio/RadioDisplay.h"
 #include "devices/radio/RadioLink.h"
@@ -15,8 +16,8 @@
 /// of 1 (size), 2 (read a block) and 3 (close the transfer), each to one gun and answered by it.
 class ScoreFetch {
  public:
-  ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, Game& game, GunTable& guns,
-             RadioDisplay& display);
+  ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, const StringTable& strings, Game& game,
+             GunTable& guns, RadioDisplay& display);
 
   /// Throws RuntimeError 6 for a gun that reports 0 bytes, or needs a block that begins beyond byte 255; 9
   /// for an answer that is longer than its buffer. That gun then stays "in progress".
@@ -35,6 +36,7 @@ class ScoreFetch {
   RadioLink& link_;
   EventPump& events_;
   const Clock& clock_;
+  const StringTable& strings_;
   Game& game_;
   GunTable& guns_;
   RadioDisplay& display_;

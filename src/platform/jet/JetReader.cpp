@@ -1,13 +1,12 @@
-// tessarine-jet-reader FILE TABLE: the rows of one table of a Jet file on standard output, for the main
-// program, which ends this one when it hangs. Ends with 0 when all rows were read. JetStream.h tells the
-// form.
+// tessarine-jet-reader FILE TABLE: writes the rows of one table of a Jet file to standard output, in the
+// format described in JetStream.h. The main program kills this one if it hangs. Exits with 0 when all rows
+// were read.
 
 #include <glib.h>
 #include <mdbtools.h>
 #include <sys/resource.h>
 
 #include <charconv>
-#include <cmath>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
@@ -15,6 +14,8 @@
 #include <string>
 #include <system_error>
 #include <vector>
+
+#include "platform/jet/JetDate.h"
 
 namespace {
 
@@ -64,39 +65,13 @@ void WriteReal(double value) {
   WriteNumber(bits, 8);
 }
 
-/// A 32-bit float as the double that its shortest decimal says.
+/// A 32-bit float as the double nearest to its shortest decimal form: 0.1f becomes 0.1.
 double Widened(float value) {
   char text[32];
   const auto written = std::to_chars(text, text + sizeof text, value);
   double wide = value;
   std::from_chars(text, written.ptr, wide);
   return wide;
-}
-
-/// Days since 1899-12-30, the time of day being their fraction, also of days before that.
-std::string DateText(double date) {
-  constexpr std::int64_t daysBefore1970 = 25569;
-  constexpr int secondsOfDay = 86400;
-  std::int64_t day = static_cast<std::int64_t>(date);
-  auto seconds = static_cast<int>(std::lround(std::abs(date - static_cast<double>(day)) * secondsOfDay));
-  if (seconds == secondsOfDay) {
-    seconds = 0;
-    ++day;
-  }
-  // Civil date of a day number by eras of 400 years.
-  const std::int64_t shifted = day - daysBefore1970 + 719468;
-  const std::int64_t era = (shifted >= 0 ? shifted : shifted - 146096) / 146097;
-  const std::int64_t ofEra = shifted - era * 146097;
-  const std::int64_t year = (ofEra - ofEra / 1460 + ofEra / 36524 - ofEra / 146096) / 365;
-  const std::int64_t ofYear = ofEra - (365 * year + year / 4 - year / 100);
-  const std::int64_t month = (5 * ofYear + 2) / 153;
-  char text[64];
-  std::snprintf(text, sizeof text, "%04d-%02d-%02d %02d:%02d:%02d",
-                static_cast<int>(year + era * 400 + (month >= 10 ? 1 : 0)),
-                static_cast<int>(month < 10 ? month + 3 : month - 9),
-                static_cast<int>(ofYear - (153 * month + 2) / 5 + 1), seconds / 3600, seconds / 60 % 60,
-                seconds % 60);
-  return text;
 }
 
 /// Reads the columns of a table's current row.
@@ -170,7 +145,7 @@ class Row {
         WriteReal(mdb_get_double(page, at));
         break;
       case MDB_DATETIME:
-        WriteText(DateText(mdb_get_double(page, at)));
+        WriteText(JetDateText(mdb_get_double(page, at)));
         break;
       case MDB_OLE: {
         std::size_t size = 0;
@@ -235,7 +210,7 @@ void WriteTable(MdbTableDef* table) {
 
 /// A damaged file can make the library ask for more and more memory.
 void LimitMemory() {
-#if !HAS_FEATURE(address_sanitizer)  // which takes terabytes of addresses for itself
+#if !HAS_FEATURE(address_sanitizer)  // which reserves terabytes of address space
   constexpr rlim_t mostMemory = rlim_t{2} << 30U;
   const rlimit limit{mostMemory, mostMemory};
   setrlimit(RLIMIT_AS, &limit);
@@ -280,6 +255,6 @@ int main(int argc, char** argv) {
   if (std::fflush(stdout) != 0) {
     Fail("The reader of old files has lost its listener.");
   }
-  // The library's own clean-up is not needed, and not safe after a damaged file.
+  // The library's own clean-up is not needed, and is not safe after reading a damaged file.
   std::_Exit(0);
 }

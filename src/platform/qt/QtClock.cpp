@@ -10,18 +10,36 @@ QString ShortFormatWithFullYear(const QLocale& locale) {
   return format;
 }
 
-/// The date that `text` is as a whole.
-QDate DateIn(const QLocale& locale, const QString& text) {
-  for (const QString& format : {ShortFormatWithFullYear(locale), locale.dateFormat(QLocale::ShortFormat),
-                                QStringLiteral("yyyy-MM-dd")}) {
-    if (const QDate date = locale.toDate(text, format); date.isValid()) {
+/// The format changed so that one-digit days and months may be written without a zero.
+QString Lenient(QString form) {
+  form.replace(QStringLiteral("dd"), QStringLiteral("d"));
+  if (!form.contains(QStringLiteral("MMM"))) {
+    form.replace(QStringLiteral("MM"), QStringLiteral("M"));
+  }
+  return form;
+}
+
+/// Two digits of a year in a file's text mean 1930 to 2029.
+const QDate EarliestOfFiles(1930, 1, 1);
+
+}  // namespace
+
+QDate DateIn(const QLocale& locale, const QString& text, QDate earliest) {
+  const QString longForm = Lenient(ShortFormatWithFullYear(locale));
+  for (const QString& form : {longForm, QStringLiteral("yyyy-M-d")}) {
+    if (const QDate date = locale.toDate(text, form); date.isValid()) {
       return date;
     }
   }
-  return {};
+  QString shortForm = longForm;
+  shortForm.replace(QStringLiteral("yyyy"), QStringLiteral("yy"));
+  QDate date = locale.toDate(text, shortForm);  // in the 1900s
+  constexpr int century = 100;
+  while (date.isValid() && date < earliest) {
+    date = date.addYears(century);
+  }
+  return date;
 }
-
-}  // namespace
 
 std::string ShortDateText(const QLocale& locale, QDate date) {
   return locale.toString(date, ShortFormatWithFullYear(locale)).toStdString();
@@ -35,7 +53,7 @@ std::string LongDateText(const QLocale& locale, const QString& text) {
   // The date may have blanks of its own, and so may the time: the longest text that is a date counts.
   const QString trimmed = text.trimmed();
   for (auto end = trimmed.size(); end > 0; end = trimmed.lastIndexOf(u' ', end - 1)) {
-    if (const QDate date = DateIn(locale, trimmed.left(end)); date.isValid()) {
+    if (const QDate date = DateIn(locale, trimmed.left(end), EarliestOfFiles); date.isValid()) {
       return locale.toString(date, QLocale::LongFormat).toStdString();
     }
   }

@@ -12,8 +12,13 @@ std::string ShortDateText(const QLocale& locale, QDate date);
 /// `time` in the short form of `locale`.
 std::string ShortTimeText(const QLocale& locale, QTime time);
 
+/// The date that `text` is as a whole, invalid for none: in the short form of `locale`, with two or four
+/// digits of the year, or year-month-day; zeros in front may be missing. Two digits of a year make a date of
+/// the hundred years from `earliest` on.
+QDate DateIn(const QLocale& locale, const QString& text, QDate earliest);
+
 /// The date at the start of `text`, in the long form of `locale`; `text` as it stands when there is none.
-/// Dates are read in the locale's short form, with two or four digits of the year, and as year-month-day.
+/// Dates are read as DateIn reads them; two digits of a year mean 1930 to 2029.
 std::string LongDateText(const QLocale& locale, const QString& text);
 
 class QtClock : public Clock {

@@ -6,11 +6,9 @@
 #include <algorithm>
 #include <string_view>
 
-namespace {
+#include "platform/Letters.h"
 
-bool IsDigit(char c) {
-  return c >= '0' && c <= '9';
-}
+namespace {
 
 /// Takes the run of digits at the front of `text`, without its leading zeros.
 std::string_view TakeNumber(std::string_view& text) {

@@ -20,7 +20,7 @@ class IniReaderTest : public testing::Test {
     return Ini.ReadIni("comm", "commport", "default");
   }
 
-  /// What a file of these bytes becomes when "comm"/"commport" is written.
+  /// The file's bytes after writing `value` to "comm"/"commport".
   std::string Written(const std::string& bytes, const std::string& value) {
     Store.Put(Path, bytes);
     Ini.WriteIni("comm", "commport", value);
@@ -218,18 +218,6 @@ TEST_F(WriteIni, DoesNotReportAFailure) {
   EXPECT_NO_THROW(Ini.WriteIni("comm", "commport", "7"));
   EXPECT_EQ(Store.Replaced.size(), 1U);
   EXPECT_EQ(Ini.ReadIni("comm", "commport", ""), "3");
-}
-
-TEST(FirstLineOf, EndsBeforeTheFirstLineBreak) {
-  EXPECT_EQ(FirstLineOf("one\r\ntwo\r\nthree"), "one");
-  EXPECT_EQ(FirstLineOf("\r\ntwo"), "");
-}
-
-TEST(FirstLineOf, IsAllOfATextWithoutOne) {
-  EXPECT_EQ(FirstLineOf("one"), "one");
-  EXPECT_EQ(FirstLineOf(""), "");
-  EXPECT_EQ(FirstLineOf("one\ntwo\rthree"), "one\ntwo\rthree");
-  EXPECT_EQ(FirstLineOf("one\r"), "one\r");
 }
 
 }  // namespace

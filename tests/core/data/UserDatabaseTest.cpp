@@ -26,7 +26,7 @@ class NoDatabase : public Database {
   std::string CopiedTo;
 };
 
-/// Opens what exists and is not said to be bad.
+/// Opens any file that exists and is not listed as bad.
 class ScriptedEngine : public DatabaseEngine {
  public:
   std::vector<std::string> Opened;
@@ -51,7 +51,7 @@ class Opening : public testing::Test {
 
   std::unique_ptr<Database> Open() {
     return OpenUserDatabase({"/data/members.mdb", "Members", "/program/members_default.mdb"},
-                            {engine, old, disk, boxes, copies});
+                            {engine, old, disk, boxes, copies, strings});
   }
 
   static FakeMessageBoxes::Box Question(const std::string& reason) {
@@ -67,7 +67,8 @@ class Opening : public testing::Test {
   FakeFiles disk;
   FakeMessageBoxes boxes;
   FakeClock clock;
-  Backups copies{"/data/backups", disk, clock};
+  StringTable strings{Language::English};
+  Backups copies{"/data/backups", disk, clock, strings};
 };
 
 TEST_F(Opening, OfAFileOfTodayIsSilent) {
@@ -79,7 +80,8 @@ TEST_F(Opening, OfAFileOfTodayIsSilent) {
 
 TEST_F(Opening, ConvertsAnOldFileAndTellsWhatWasNotTaken) {
   old.OldPaths = {"/data/members.mdb"};
-  old.Report = {40, {"table Extras (3 rows)", "column Shoe size"}, "/data/members.mdb.jet"};
+  old.Report = {
+      40, {{NotTakenOver::Table, "Extras", 3}, {NotTakenOver::Column, "Shoe size"}}, "/data/members.mdb.jet"};
   EXPECT_NE(Open(), nullptr);
   EXPECT_THAT(old.Converted, ElementsAre("/data/members.mdb Members /program/members_default.mdb"));
   EXPECT_THAT(engine.Opened, ElementsAre("/data/members.mdb"));

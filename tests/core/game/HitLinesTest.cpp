@@ -7,14 +7,6 @@ namespace {
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-TEST(RunTime, IsShownInHoursAndMinutesEachInTheNumberForm) {
-  EXPECT_EQ(RunTimeText(125), " 2H  5M");
-  EXPECT_EQ(RunTimeText(0), " 0H  0M");
-  EXPECT_EQ(RunTimeText(59), " 0H  59M");
-  EXPECT_EQ(RunTimeText(6000), " 100H  0M");
-  EXPECT_EQ(RunTimeText(-61), "-1H -1M");
-}
-
 TEST(SpecialDamage, IsListedInPlainDigitsWhereItIsAboveZero) {
   Player player;
   EXPECT_THAT(SpecialDamageOf(player), IsEmpty());

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <iterator>
 #include <string>
 
 #include "core/text/TextEncoding.h"
@@ -45,7 +46,7 @@ TEST(StringTable, HasEveryTextInBothLanguages) {
   EXPECT_EQ(chinese.Text(114), "红队");
 }
 
-TEST(StringTable, HasTeamNamesThatThePlayerTextsCanBeTakenApartBy) {
+TEST(StringTable, HasTeamNamesByWhichPlayerTextsCanBeParsed) {
   for (const Language language : {Language::English, Language::SimplifiedChinese}) {
     const StringTable texts(language);
     for (int number = 114; number <= 116; ++number) {
@@ -59,7 +60,7 @@ TEST(StringTable, HasTeamNamesThatThePlayerTextsCanBeTakenApartBy) {
 
 TEST(StringTable, ReportsANumberOutsideTheTable) {
   const StringTable texts(Language::English);
-  for (const int number : {-1, 0, 100, 219, 100000}) {
+  for (const int number : {-1, 0, 100, 219, 300, 349, 100000}) {
     try {
       texts.Text(number);
       ADD_FAILURE() << number;
@@ -67,6 +68,56 @@ TEST(StringTable, ReportsANumberOutsideTheTable) {
       EXPECT_EQ(error.Number(), 9);
     }
   }
+}
+
+struct NamedText {
+  OwnText Text;
+  const char* Name;
+};
+
+constexpr NamedText OwnTexts[] = {
+#define OWN_TEXT(number, name, english, simplifiedChinese) {OwnText::name, #name},
+#include "resources/StringTable.inc"
+};
+
+/// The places for values in a text, "%1%2", each once, ascending.
+std::string PlacesIn(const std::string& text) {
+  std::string places;
+  for (char digit = '0'; digit <= '9'; ++digit) {
+    const std::string place{'%', digit};
+    places += text.find(place) != std::string::npos ? place : "";
+  }
+  return places;
+}
+
+TEST(StringTable, HasEveryTextOfItsOwnInBothLanguages) {
+  const StringTable english(Language::English);
+  const StringTable chinese(Language::SimplifiedChinese);
+  ASSERT_GE(std::size(OwnTexts), 20U);
+  for (const NamedText& own : OwnTexts) {
+    EXPECT_GE(static_cast<int>(own.Text), 301) << own.Name;
+    EXPECT_FALSE(english.Text(own.Text).empty()) << own.Name;
+    EXPECT_FALSE(IsUtf8(chinese.Text(own.Text)) &&
+                 CharacterCount(chinese.Text(own.Text)) == chinese.Text(own.Text).size())
+        << own.Name << " has no character of its language";
+    EXPECT_TRUE(IsUtf8(chinese.Text(own.Text))) << own.Name;
+  }
+}
+
+TEST(StringTable, HasTheSamePlacesForValuesInBothLanguages) {
+  const StringTable english(Language::English);
+  const StringTable chinese(Language::SimplifiedChinese);
+  for (const NamedText& own : OwnTexts) {
+    const std::string places = PlacesIn(english.Text(own.Text));
+    EXPECT_EQ(PlacesIn(chinese.Text(own.Text)), places) << own.Name;
+    EXPECT_EQ(places, std::string("%1%2%3%4%5%6%7%8%9").substr(0, places.size())) << own.Name;
+  }
+}
+
+TEST(StringTable, GivesATextOfItsOwnByNameAndNumber) {
+  EXPECT_EQ(StringTable(Language::English).Text(OwnText::Copy), "Copy");
+  EXPECT_EQ(StringTable(Language::SimplifiedChinese).Text(OwnText::Copy), "复制");
+  EXPECT_EQ(StringTable(Language::English).Text(302), "Stop");
 }
 
 TEST(LanguageOf, IsChineseForEveryChineseLocale) {

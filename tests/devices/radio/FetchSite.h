@@ -49,7 +49,7 @@ class Fetch : public testing::Test, protected RadioSite {
 
   void GetScores() {
     RadioLink link(Port, Line, Events, [this] { return stopped; });
-    ScoreFetch(link, Events, Time, game, guns, display).GetScores();
+    ScoreFetch(link, Events, Time, Strings, game, guns, display).GetScores();
     try {
       link.ThrowIfLineLost();
     } catch (const RuntimeError& error) {

@@ -50,7 +50,9 @@ class RadioVenue : public testing::TestWithParam<sim::RadioFailureInfo> {
   }
 
   void GetScores() {
-    Run([this](RadioLink& link) { ScoreFetch(link, events_, time_, game_, guns_, display_).GetScores(); });
+    Run([this](RadioLink& link) {
+      ScoreFetch(link, events_, time_, strings_, game_, guns_, display_).GetScores();
+    });
   }
 
   int CountOf(ScoreStatus status) const {

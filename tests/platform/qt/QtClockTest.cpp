@@ -4,15 +4,15 @@
 
 namespace {
 
-const QDate date(2013, 5, 9);
-const QTime afternoon(14, 30, 5);
+const QDate Date(2013, 5, 9);
+const QTime Afternoon(14, 30, 5);
 
 TEST(ShortDateText, IsTheLocalesFormWithAllDigitsOfTheYear) {
-  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::UnitedStates), date), "5/9/2013");
-  EXPECT_EQ(ShortDateText(QLocale(QLocale::German, QLocale::Germany), date), "09.05.2013");
-  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::Australia), date), "9/5/2013");
-  EXPECT_EQ(ShortDateText(QLocale(QLocale::Chinese, QLocale::China), date), "2013/5/9");
-  EXPECT_EQ(ShortDateText(QLocale::c(), date), "9 May 2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::UnitedStates), Date), "5/9/2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::German, QLocale::Germany), Date), "09.05.2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::Australia), Date), "9/5/2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::Chinese, QLocale::China), Date), "2013/5/9");
+  EXPECT_EQ(ShortDateText(QLocale::c(), Date), "9 May 2013");
 }
 
 TEST(ShortDateText, ShowsTheYearInEveryLocaleWithWesternDigits) {
@@ -20,7 +20,7 @@ TEST(ShortDateText, ShowsTheYearInEveryLocaleWithWesternDigits) {
   for (const QLocale& locale :
        QLocale::matchingLocales(QLocale::AnyLanguage, QLocale::AnyScript, QLocale::AnyTerritory)) {
     if (locale.zeroDigit() == QStringLiteral("0")) {
-      const std::string text = ShortDateText(locale, date);
+      const std::string text = ShortDateText(locale, Date);
       EXPECT_NE(text.find("2013"), std::string::npos) << locale.name().toStdString() << ": " << text;
       EXPECT_EQ(text.find("20132013"), std::string::npos) << locale.name().toStdString() << ": " << text;
       ++checked;
@@ -30,10 +30,10 @@ TEST(ShortDateText, ShowsTheYearInEveryLocaleWithWesternDigits) {
 }
 
 TEST(ShortTimeText, IsTheLocalesForm) {
-  EXPECT_EQ(ShortTimeText(QLocale(QLocale::English, QLocale::UnitedStates), afternoon), "2:30 PM");
-  EXPECT_EQ(ShortTimeText(QLocale(QLocale::German, QLocale::Germany), afternoon), "14:30");
-  EXPECT_EQ(ShortTimeText(QLocale(QLocale::Chinese, QLocale::China), afternoon), "14:30");
-  EXPECT_EQ(ShortTimeText(QLocale::c(), afternoon), "14:30:05");
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::English, QLocale::UnitedStates), Afternoon), "2:30 PM");
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::German, QLocale::Germany), Afternoon), "14:30");
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::Chinese, QLocale::China), Afternoon), "14:30");
+  EXPECT_EQ(ShortTimeText(QLocale::c(), Afternoon), "14:30:05");
 }
 
 TEST(LongDateText, IsTheLocalesFormOfAShortDateWithOrWithoutATime) {
@@ -48,6 +48,13 @@ TEST(LongDateText, IsTheLocalesFormOfAShortDateWithOrWithoutATime) {
   EXPECT_EQ(LongDateText(QLocale::c(), QStringLiteral("9 May 2013 14:30:05")), "Thursday, 9 May 2013");
 }
 
+TEST(LongDateText, TakesTwoDigitsOfAYearAs1930To2029) {
+  const QLocale american(QLocale::English, QLocale::UnitedStates);
+  EXPECT_EQ(LongDateText(american, QStringLiteral("5/9/13 2:30 PM")), "Thursday, May 9, 2013");
+  EXPECT_EQ(LongDateText(american, QStringLiteral("1/1/30")), "Wednesday, January 1, 1930");
+  EXPECT_EQ(LongDateText(american, QStringLiteral("12/31/29")), "Monday, December 31, 2029");
+}
+
 TEST(LongDateText, IsTheTextItselfWhenItIsNoDate) {
   for (const char* text : {"", "N/A", "today", "31/31/2013 14:30", " 14:30 "}) {
     EXPECT_EQ(LongDateText(QLocale(QLocale::English, QLocale::UnitedStates), QString::fromUtf8(text)), text);
@@ -59,9 +66,9 @@ TEST(LongDateText, ReadsWhatTheClockWritesInEveryLocaleWithWesternDigits) {
   for (const QLocale& locale :
        QLocale::matchingLocales(QLocale::AnyLanguage, QLocale::AnyScript, QLocale::AnyTerritory)) {
     if (locale.zeroDigit() == QStringLiteral("0")) {
-      const std::string text = ShortDateText(locale, date) + ' ' + ShortTimeText(locale, afternoon);
+      const std::string text = ShortDateText(locale, Date) + ' ' + ShortTimeText(locale, Afternoon);
       EXPECT_EQ(LongDateText(locale, QString::fromStdString(text)),
-                locale.toString(date, QLocale::LongFormat).toStdString())
+                locale.toString(Date, QLocale::LongFormat).toStdString())
           << locale.name().toStdString() << ": " << text;
       ++checked;
     }

@@ -1,0 +1,38 @@
+#include "app/Program.h"
+
+#include <QApplication>
+
+#include "app/SystemFacts.h"
+#include "platform/ErrorReport.h"
+#include "ui/CommandEvent.h"
+#include "ui/Look.h"
+
+Program::Program() {
+  PrepareLook();
+  composition_.Log().Started(SystemFacts());
+  qApp->installEventFilter(this);
+  window_.emplace(composition_.Services());
+  composition_.SetMainWindow(&*window_);
+}
+
+bool Program::Start() {
+  bool loaded = false;
+  if (!ReportErrors(composition_.Boxes(), [&] { loaded = window_->FormLoad(); }) || !loaded) {
+    return false;
+  }
+  window_->show();
+  return true;
+}
+
+int Program::Run() {
+  const int exitCode = Start() ? QApplication::exec() : 1;
+  composition_.Log().Ended(exitCode);
+  return exitCode;
+}
+
+bool Program::eventFilter(QObject* watched, QEvent* event) {
+  if (event->type() == CommandEvent::EventType()) {
+    composition_.Log().Command(static_cast<CommandEvent*>(event)->Name().toStdString());
+  }
+  return QObject::eventFilter(watched, event);
+}

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <array>
+
+/// One value of tessarine.ini.
+struct Setting {
+  const char* Section;
+  const char* Key;
+  const char* Default;  ///< what counts where the file has none; empty for nothing
+  const char* Meaning;  ///< as the manual tells it
+};
+
+/// Every setting of the program, each named here and nowhere else. A new one gets a section that no other
+/// program or earlier version wrote, a line in AllSettings, and its row in the manual, which a test compares.
+namespace Keys {
+
+inline constexpr Setting CommPort = {"comm", "commport", "1",
+                                     "Number of the serial port with the base unit or the radio modem."};
+
+inline constexpr Setting TotalDamage = {"soldiering_calc", "total_damage", "1",
+                                        "Soldiering points for each point of damage."};
+inline constexpr Setting Respawns = {"soldiering_calc", "respawns", "-1",
+                                     "Soldiering points for each death."};
+inline constexpr Setting Heals = {"soldiering_calc", "heals", "-1", "Soldiering points for each heal."};
+inline constexpr Setting AmmoAdds = {"soldiering_calc", "ammo_adds", "-1",
+                                     "Soldiering points for each ammunition refill."};
+inline constexpr Setting Accuracy = {"soldiering_calc", "accuracy", "1",
+                                     "Soldiering points for each percent of accuracy."};
+inline constexpr Setting FriendlyFire = {"soldiering_calc", "friendly_fire_factor", "-1",
+                                         "Factor by which damage to the own team counts."};
+
+inline constexpr Setting ReaderPort = {
+    "onewire", "port", "",
+    "Number of the serial port with the reader of membership buttons; without it port 1, with an adapter of "
+    "kind 5."};
+inline constexpr Setting ReaderType = {
+    "onewire", "type", "5", "Kind of the reader's adapter; 5 is a serial one with a DS2480B chip."};
+
+/// One key for each port number n.
+inline constexpr Setting PortDevice = {
+    "ports", "com<n>", "",
+    "Device that port number n stands for; without it the n-th serial port of the machine."};
+
+}  // namespace Keys
+
+/// In the order of the manual.
+inline constexpr std::array AllSettings = {
+    Keys::CommPort, Keys::TotalDamage,  Keys::Respawns,   Keys::Heals,      Keys::AmmoAdds,
+    Keys::Accuracy, Keys::FriendlyFire, Keys::ReaderPort, Keys::ReaderType, Keys::PortDevice};

@@ -1,0 +1,80 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+/// The byte form of UTF-8, the one place where it is taken apart and put together. Down here because the
+/// databases match texts by it; core/text/TextEncoding.h has what callers above want of a text.
+namespace Utf8 {
+
+/// False for a byte that goes on with the character before it.
+constexpr bool StartsCharacter(char byte) {
+  return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U;
+}
+
+/// Length of the well-formed character, 1 to 4 bytes, that `text` begins with; 0 when it begins with none, or
+/// is empty. Overlong forms, surrogates and what lies above U+10FFFF are not well-formed.
+constexpr std::size_t LengthOfCharacter(std::string_view text) {
+  const auto byte = [text](std::size_t at) { return static_cast<unsigned char>(text[at]); };
+  if (text.empty()) {
+    return 0;
+  }
+  const unsigned char lead = byte(0);
+  if (lead < 0x80) {
+    return 1;
+  }
+  const std::size_t length = lead >= 0xC2 && lead <= 0xDF   ? 2
+                             : lead >= 0xE0 && lead <= 0xEF ? 3
+                             : lead >= 0xF0 && lead <= 0xF4 ? 4
+                                                            : 0;
+  if (length == 0 || text.size() < length) {
+    return 0;
+  }
+  // The range of the second byte rules out overlong forms, surrogates and code points above U+10FFFF.
+  const unsigned char lowest = lead == 0xE0 ? 0xA0 : lead == 0xF0 ? 0x90 : 0x80;
+  const unsigned char highest = lead == 0xED ? 0x9F : lead == 0xF4 ? 0x8F : 0xBF;
+  if (byte(1) < lowest || byte(1) > highest) {
+    return 0;
+  }
+  for (std::size_t at = 2; at < length; ++at) {
+    if (StartsCharacter(text[at])) {
+      return 0;
+    }
+  }
+  return length;
+}
+
+/// The character whose bytes are all of `bytes`, which is well-formed.
+constexpr char32_t CharacterOf(std::string_view bytes) {
+  const auto lead = static_cast<unsigned char>(bytes.front());
+  char32_t character = bytes.size() == 1 ? lead : lead & (0x7FU >> bytes.size());
+  for (const char byte : bytes.substr(1)) {
+    character = (character << 6U) | (static_cast<unsigned char>(byte) & 0x3FU);
+  }
+  return character;
+}
+
+/// Puts a character up to U+10FFFF, not a surrogate, at the end of `text`.
+inline void Append(std::string& text, char32_t character) {
+  const auto following = [&text, character](unsigned int shift) {
+    text += static_cast<char>(0x80U | ((character >> shift) & 0x3FU));
+  };
+  if (character < 0x80) {
+    text += static_cast<char>(character);
+  } else if (character < 0x800) {
+    text += static_cast<char>(0xC0U | (character >> 6U));
+    following(0);
+  } else if (character < 0x10000) {
+    text += static_cast<char>(0xE0U | (character >> 12U));
+    following(6);
+    following(0);
+  } else {
+    text += static_cast<char>(0xF0U | (character >> 18U));
+    following(12);
+    following(6);
+    following(0);
+  }
+}
+
+}  // namespace Utf8
