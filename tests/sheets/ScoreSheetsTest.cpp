@@ -145,6 +145,19 @@ TEST_F(Sheets, PutThePhotoInAndDeleteItsFile) {
   EXPECT_EQ(Sheet(1).Picture, "");
 }
 
+TEST_F(Sheets, ShowTheOwnPhotoWhenACommandMeanwhileLooksAnotherMemberUp) {
+  std::string photo;
+  word.OnOperation = [&](const std::string& operation) {
+    if (operation == "SetBookmark ClanName") {
+      events.At(std::chrono::milliseconds(0), [this] { venue.Members->LoadMember(4); });
+    } else if (operation == "AddPicture 1 1 1") {
+      photo = files.Contents().at("/tmp/per1");
+    }
+  };
+  Run();
+  EXPECT_EQ(photo, std::string("\1\2\3\4"));
+}
+
 TEST_F(Sheets, LeaveTheEmptyFileOfAMemberWithoutAPhoto) {
   venue.game.Players(1).MemberIndex = 4;
   Run();
