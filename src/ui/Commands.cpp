@@ -57,7 +57,9 @@ void Commands::Press(QAbstractButton& button, const std::function<void()>& comma
   } else {
     // Keys have brought the focus before the click; so this is a screen reader. The command takes what
     // stands, and an entry that would otherwise be left by the command itself is left now.
-    button.setFocus(Qt::NoFocusReason);
+    pressedUnfocused_ = true;
+    button.setFocus();
+    pressedUnfocused_ = false;
   }
   Start(button, command, whileBusy);
 }

@@ -70,6 +70,9 @@ class Commands : public QObject {
   /// unwound.
   bool MayClose();
 
+  /// True while a button takes the focus that a screen reader pressed: entries are left unchecked then.
+  bool PressedUnfocused() const { return pressedUnfocused_; }
+
   QWidget& Window() const { return window_; }
 
  protected:
@@ -94,4 +97,5 @@ class Commands : public QObject {
   std::vector<QPointer<QAbstractButton>> buttons_;
   int running_ = 0;  ///< commands on the stack
   bool closeRequested_ = false;
+  bool pressedUnfocused_ = false;
 };

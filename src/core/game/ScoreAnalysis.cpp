@@ -15,8 +15,17 @@ void AddTo(std::int32_t& sum, std::int32_t amount) {
   }
 }
 
-/// Shooters stand in blocks of 32 that belong to one team each.
+/// Players stand in blocks of 32 that belong to one team each.
 constexpr int BlockSize = 32;
+constexpr int BlockCount = PlayerCount / BlockSize;
+
+std::array<int, BlockCount> TeamsOfBlocks() {
+  std::array<int, BlockCount> teams{};
+  for (int block = 0; block < BlockCount; ++block) {
+    teams[block] = TeamFromId(IdFromIndex(block * BlockSize + 1));
+  }
+  return teams;
+}
 
 /// Damage that each player dealt to foes and to the own team, by record index less 1.
 struct DealtDamage {
@@ -73,13 +82,16 @@ bool ScoreAnalysis::AddUpDamageAtOnce() {
   // Whole factors need no rounding, so the order of the hits does not matter unless a sum on the way could
   // leave the range.
   const bool isWhole = std::trunc(factors_.FriendlyFire) == factors_.FriendlyFire;
+  const bool countsFriendlyFire = missions_.ListIndex() != MissionList::FreeForAll;
+  const std::array<int, BlockCount> teams = TeamsOfBlocks();
   DealtDamage dealt;
   bool inRange = isWhole && std::abs(factors_.FriendlyFire) <= std::numeric_limits<std::int32_t>::max();
   for (int victim = 0; victim < PlayerCount && inRange; ++victim) {
     const std::int32_t* hits = &*game_.Players(victim + 1).HitByPlayer.begin();
-    for (int first = 0; first < PlayerCount; first += BlockSize) {
-      auto& sums = IsOwnTeamHit(victim + 1, first + 1) ? dealt.ToOwnTeam : dealt.ToFoes;
-      inRange &= AddHits(&sums[first], hits + first);
+    const int team = teams[victim / BlockSize];
+    for (int block = 0; block < BlockCount; ++block) {
+      auto& sums = countsFriendlyFire && teams[block] == team ? dealt.ToOwnTeam : dealt.ToFoes;
+      inRange &= AddHits(&sums[block * BlockSize], hits + block * BlockSize);
     }
   }
   const auto factor = inRange ? static_cast<std::int64_t>(factors_.FriendlyFire) : 0;
@@ -183,7 +195,9 @@ void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName
     missionPoints_ = ReadMissionPoints();
   }
   const auto add = [&player](long double points) {
-    player.Soldiering = RoundToInt32(player.Soldiering + points);
+    if (points != 0) {
+      player.Soldiering = RoundToInt32(player.Soldiering + points);
+    }
   };
   for (int set = 0; set < TeamCount; ++set) {
     const ObjectiveTeam& objective = game_.ObjectiveTeams(set + 1);
