@@ -1,5 +1,6 @@
 #include "core/game/PlayerId.h"
 
+#include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
 namespace {
