@@ -28,7 +28,7 @@ std::string DallasIdOf(int member) {
   return text;
 }
 
-/// Every player is some member far from the others.
+/// A player's member; the members of different players are far apart in the table.
 int MemberOf(int index, int members) {
   return index * (members / PlayerCount);
 }

@@ -14,17 +14,17 @@
 /// The fullest game: all 224 players active, all 50,176 hits above 0.
 void FillCompletely(Game& game);
 
-/// Makes a mission file at `path` with that many missions.
+/// Creates a mission file at `path` with that many missions.
 void MakeMissions(const std::string& path, int missions);
 
-/// Makes a members file at `path` with that many members: First7 Last7, every second with a nickname as
-/// Nick7.
+/// Creates a members file at `path` with that many members, named First7 Last7; every second one has a
+/// nickname like Nick7.
 void MakeMembers(const std::string& path, int members);
 
-/// Scores the fullest game with databases of its own. A box shown is a fault and ends the program.
+/// Scores the fullest game with its own databases. A box is an error and ends the program.
 class FullGame {
  public:
-  /// `members`: how many members the database has; every player is then one of them.
+  /// `members` is the number of members in the database; every player is one of them.
   explicit FullGame(int members);
   ~FullGame();
   FullGame(const FullGame&) = delete;
@@ -36,7 +36,7 @@ class FullGame {
   /// have.
   std::size_t ShowLists() const;
 
-  /// Makes the next calculation look all players up by their buttons.
+  /// Makes the next calculation look up all players by their buttons.
   void Unassign();
 
   StringTable Strings{Language::English};

@@ -14,7 +14,7 @@ std::string NumberText(int index) {
   return Str(std::int32_t{PlayerNumberFromId(IdFromIndex(index))});
 }
 
-/// Sheets name the other player with one blank between team and number, and a member by the nickname.
+/// Sheets show the other player with one blank between team and number, and a member by the nickname.
 CellTexts TextsOf(const std::vector<Hit>& hits, const Game& game, MemberLookup& members) {
   CellTexts cells;
   for (const Hit& hit : hits) {
@@ -53,7 +53,7 @@ std::string WithoutWeekday(const std::string& longDate) {
   if (comma == std::string::npos) {
     return longDate;
   }
-  // The character behind the comma goes too.
+  // The character after the comma is dropped too.
   return Characters(std::string_view(longDate).substr(comma + 1), 1, longDate.size());
 }
 

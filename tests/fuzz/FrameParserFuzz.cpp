@@ -15,7 +15,7 @@ void Require(bool condition) {
   }
 }
 
-/// What a byte makes of the parser: the frame's identifier, or -1 for the fault of a full buffer.
+/// The parser's result for one byte: a frame's identifier, or -1 if a buffer overflowed (RuntimeError 9).
 int Receive(FrameParser& parser, std::uint8_t byte) {
   try {
     return parser.Receive(byte);
@@ -25,7 +25,7 @@ int Receive(FrameParser& parser, std::uint8_t byte) {
   }
 }
 
-/// True when the bytes up to `end` (its check byte included) close with a frame of this identifier.
+/// True if the bytes before `end` finish with a frame of this identifier, check byte included.
 bool EndsWithFrame(const std::uint8_t* begin, const std::uint8_t* end, int type) {
   unsigned int sum = *(end - 1);
   for (const std::uint8_t* body = end - 2; body - begin >= 3; --body) {
@@ -50,8 +50,8 @@ void RequireReadable(const ReceivedFrame& frame) {
 
 }  // namespace
 
-/// Whatever the bytes: each frame that is told of stands among them with a right check byte, buffers keep
-/// their bounds, and a parser that is reset takes the next frame.
+/// Whatever the bytes: each reported frame is among them with a valid check byte, no buffer overruns, and the
+/// parser accepts a frame after a reset.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   FrameParser parser;
   for (std::size_t i = 0; i < size; ++i) {

@@ -7,7 +7,7 @@ namespace {
 
 constexpr const char* Filter = "XML Files & (*.xml) |*.xml";
 
-/// The file's bytes; none when it cannot be read, which is no game file either.
+/// The file's bytes; empty if it cannot be read, which then fails like any file that is not a game file.
 std::string ReadOrNothing(const Files& files, const std::string& path) {
   try {
     return files.Read(path);

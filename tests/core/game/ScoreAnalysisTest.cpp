@@ -323,7 +323,7 @@ TEST(Accuracy, IsNothingWithoutShots) {
   }
 }
 
-TEST(Accuracy, IsStoredWith32BitsAndEntersTheSumSo) {
+TEST(Accuracy, IsRoundedTo32BitsBeforeItEntersTheSum) {
   ScoredGame venue;
   venue.Factors.Accuracy = 1e8;
   venue.Factors.Damage = 0;

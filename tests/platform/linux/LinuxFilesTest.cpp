@@ -398,7 +398,7 @@ TEST(FileLen, CountsTheBytesOfAFile) {
   EXPECT_EQ(LinuxFiles().FileLen(folder / "empty"), 0U);
 }
 
-TEST(FileLen, OfWhatCannotBeReadFails) {
+TEST(FileLen, FailsForWhatCannotBeRead) {
   const TemporaryFolder folder;
   WriteFile(folder / "file", "x");
   std::filesystem::permissions(folder / "file", std::filesystem::perms(0));
@@ -428,7 +428,7 @@ TEST(Rename, PutsAFileInPlaceOfAnother) {
   EXPECT_FALSE(LinuxFiles().FileExists(folder / "new"));
 }
 
-TEST(Rename, OfWhatIsNotThereOrToWhereNothingCanBeFails) {
+TEST(Rename, FailsForAMissingFileOrAnImpossibleTarget) {
   const TemporaryFolder folder;
   WriteFile(folder / "file", "x");
   EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().Rename(folder / "gone", folder / "other"); }), 53);

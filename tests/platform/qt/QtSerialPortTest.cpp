@@ -24,7 +24,7 @@ namespace {
 
 using Bytes = std::vector<std::uint8_t>;
 
-/// A further descriptor of a terminal's near end.
+/// A second descriptor for a terminal's near end.
 class SecondOpener {
  public:
   explicit SecondOpener(const std::string& device)
@@ -39,7 +39,7 @@ class SecondOpener {
     return ::ioctl(descriptor_, TIOCGEXCL, &exclusive) == 0 && exclusive != 0;
   }
   bool Lock() const { return ::flock(descriptor_, LOCK_EX | LOCK_NB) == 0; }
-  /// True once the line has taken nothing more for 100 ms.
+  /// True once the line has accepted no more bytes for 100 ms.
   bool AwaitFull() const {
     pollfd writable{descriptor_, POLLOUT, 0};
     const auto limit = std::chrono::steady_clock::now() + 2s;
@@ -214,7 +214,7 @@ TEST_F(QtSerialPortTest, GoesOnReceivingWhenInputIsClearedAfterTheSystemAnnounce
     ++cleared;
     Port.ClearInput();
     early.setEnabled(false);
-    errno = EAGAIN;  // as any call before the read of nothing may leave it
+    errno = EAGAIN;  // a leftover value, which an empty read must not be judged by
   });
   Line.Write({1, 2, 3});
   ASSERT_TRUE(probe.AwaitInput());
@@ -444,7 +444,7 @@ TEST_F(QtSerialPortTest, ReadingPastTheInputFails) {
   EXPECT_EQ(FailureOf([&] { Port.Input(); }), 62);
 }
 
-TEST_F(QtSerialPortTest, ALostLineWakesWhoWaitsForIt) {
+TEST_F(QtSerialPortTest, ALostLineWakesAWaitForInput) {
   Open();
   QTimer::singleShot(30, [&] { Line.Unplug(); });
   EXPECT_EQ(FailureOf([&] { Pump.WaitFor([&] { return Port.InBufferCount() > 0; }, 20s); }), 8012);

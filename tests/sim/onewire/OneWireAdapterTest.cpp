@@ -7,7 +7,7 @@
 #include <stdexcept>
 
 #include "sim/line/Crc.h"
-#include "tests/sim/onewire/AdapterHost.h"
+#include "tests/support/AdapterHost.h"
 
 namespace sim {
 namespace {

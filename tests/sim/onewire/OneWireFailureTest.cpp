@@ -5,7 +5,7 @@
 #include <algorithm>
 
 #include "sim/onewire/OneWireAdapter.h"
-#include "tests/sim/onewire/AdapterHost.h"
+#include "tests/support/AdapterHost.h"
 
 namespace sim {
 namespace {

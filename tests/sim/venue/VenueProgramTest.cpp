@@ -10,8 +10,8 @@
 #include "sim/baseunit/BaseUnitAnswer.h"
 #include "sim/game/GameMaker.h"
 #include "sim/radio/RadioAnswer.h"
-#include "tests/sim/onewire/AdapterHost.h"
-#include "tests/sim/radio/RadioLiterals.h"
+#include "tests/support/AdapterHost.h"
+#include "tests/support/RadioLiterals.h"
 #include "tests/support/RawHost.h"
 #include "tests/support/VenueProcess.h"
 
