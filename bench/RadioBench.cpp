@@ -10,8 +10,8 @@
 #include "bench/Goals.h"
 #include "bench/RealLine.h"
 #include "core/data/IniReader.h"
-#include "devices/radio/FrameParser.h"
 #include "devices/radio/RemoteManage.h"
+#include "devices/radio/XBeeFrameParser.h"
 #include "sim/game/GameMaker.h"
 #include "sim/radio/RadioModem.h"
 #include "ui/Look.h"
@@ -50,7 +50,7 @@ bool MeasureParser() {
   constexpr double goal = 100;  // MB/s
   const std::vector<std::uint8_t> bytes = BlockAnswers();
   std::vector<double> speeds;
-  FrameParser parser;
+  XBeeFrameParser parser;
   int frames = 0;
   for (int round = 0; round < rounds; ++round) {
     const auto start = std::chrono::steady_clock::now();

@@ -3,8 +3,8 @@
 #include <cstdint>
 #include <cstdlib>
 
-#include "devices/radio/FrameParser.h"
 #include "devices/radio/GunPacket.h"
+#include "devices/radio/XBeeFrameParser.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -16,7 +16,7 @@ void Require(bool condition) {
 }
 
 /// The parser's result for one byte: a frame's identifier, or -1 if a buffer overflowed (RuntimeError 9).
-int Receive(FrameParser& parser, std::uint8_t byte) {
+int Receive(XBeeFrameParser& parser, std::uint8_t byte) {
   try {
     return parser.Receive(byte);
   } catch (const RuntimeError& error) {
@@ -42,7 +42,7 @@ bool EndsWithFrame(const std::uint8_t* begin, const std::uint8_t* end, int type)
 void RequireReadable(const ReceivedFrame& frame) {
   try {
     const GunPacket packet = ReadGunPacket(frame);
-    Require(packet[0] == frame.Data[0] && packet[0] <= 94);
+    Require(packet.PayloadLength == frame.Data[0] && packet.PayloadLength <= 94);
   } catch (const RuntimeError& error) {
     Require(error.Number() == 9 && frame.Data[0] >= 95);
   }
@@ -53,7 +53,7 @@ void RequireReadable(const ReceivedFrame& frame) {
 /// Whatever the bytes: each reported frame is among them with a valid check byte, no buffer overruns, and the
 /// parser accepts a frame after a reset.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  FrameParser parser;
+  XBeeFrameParser parser;
   for (std::size_t i = 0; i < size; ++i) {
     const int type = Receive(parser, data[i]);
     const ReceivedFrame& frame = parser.Frame();

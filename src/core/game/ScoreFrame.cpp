@@ -1,4 +1,4 @@
-#include "core/game/FrameDecoder.h"
+#include "core/game/ScoreFrame.h"
 
 #include <string>
 

@@ -4,7 +4,7 @@
 #include <cstdlib>
 #include <string>
 
-#include "core/game/FrameDecoder.h"
+#include "core/game/ScoreFrame.h"
 #include "tests/fakes/FakeClock.h"
 
 namespace {
