@@ -62,7 +62,7 @@ class FakeSerialPort : public SerialPort {
 
   void Open(const std::string& device, const std::string& settings) override {
     const std::string entry = "Open " + device + ' ' + settings;
-    const int failure = open_ ? 8005 : openFailure_;
+    const int failure = open_ ? Fault::PortAlreadyOpen : openFailure_;
     openFailure_ = 0;
     FailIf(failure, entry);
     Log.push_back(entry);
@@ -85,7 +85,7 @@ class FakeSerialPort : public SerialPort {
   bool PortOpen() const override { return open_; }
 
   void SetSettings(const std::string& settings) override {
-    const int failure = !open_ ? 8018 : lost_ ? 8012 : settingsFailure_;
+    const int failure = !open_ ? Fault::PortNotOpen : lost_ ? Fault::PortLost : settingsFailure_;
     settingsFailure_ = 0;
     FailIf(failure, "Settings " + settings);
     LetPass();
@@ -95,17 +95,17 @@ class FakeSerialPort : public SerialPort {
 
   std::size_t InBufferCount() override {
     if (!open_) {
-      throw RuntimeError(8018);
+      throw RuntimeError(Fault::PortNotOpen);
     }
     if (lost_ && input_.empty()) {
-      throw RuntimeError(8012);
+      throw RuntimeError(Fault::PortLost);
     }
     return input_.size();
   }
 
   std::uint8_t Input() override {
     if (InBufferCount() == 0) {
-      throw RuntimeError(62);
+      throw RuntimeError(Fault::PastEndOfFile);
     }
     const std::uint8_t byte = input_.front();
     input_.pop_front();
@@ -114,7 +114,7 @@ class FakeSerialPort : public SerialPort {
 
   void Output(std::uint8_t byte) override {
     const std::string entry = "Output " + std::to_string(byte);
-    FailIf(!open_ ? 8018 : lost_ ? 8012 : outputFailure_, entry);
+    FailIf(!open_ ? Fault::PortNotOpen : lost_ ? Fault::PortLost : outputFailure_, entry);
     Log.push_back(entry);
     Sent.push_back(byte);
     if (Pump != nullptr) {
@@ -127,12 +127,12 @@ class FakeSerialPort : public SerialPort {
   }
 
   void Drain() override {
-    FailIf(!open_ ? 8018 : lost_ ? 8012 : 0, "Drain");
+    FailIf(!open_ ? Fault::PortNotOpen : lost_ ? Fault::PortLost : 0, "Drain");
     LetPass();
   }
 
   void ClearInput() override {
-    FailIf(open_ ? 0 : 8018, "ClearInput");
+    FailIf(open_ ? 0 : Fault::PortNotOpen, "ClearInput");
     Log.push_back("ClearInput");
     input_.clear();
   }

@@ -3,20 +3,18 @@
 #include <algorithm>
 #include <iterator>
 
+#include "platform/Letters.h"
+
 namespace {
 
 constexpr std::size_t ButtonDigits = 16;
 
-bool IsDigit(char c) {
-  return c >= '0' && c <= '9';
-}
-
 bool IsHexDigit(char c) {
-  return IsDigit(c) || (c >= 'A' && c <= 'F') || (c >= 'a' && c <= 'f');
+  return IsDigit(c) || (LowerAscii(c) >= 'a' && LowerAscii(c) <= 'f');
 }
 
 bool IsLetterOrDigit(char c) {
-  return IsDigit(c) || (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z');
+  return IsDigit(c) || (LowerAscii(c) >= 'a' && LowerAscii(c) <= 'z');
 }
 
 /// True where something may begin: not in the middle of "photo's" and "Path/File".

@@ -19,8 +19,6 @@ namespace {
 
 using LineClock = std::chrono::steady_clock;
 
-constexpr int invalidPropertyValue = 380;
-
 /// What the system holds back of the output. Of more bytes than that the first ones are already through.
 constexpr int outputBufferBytes = 4096;
 
@@ -67,7 +65,7 @@ QSerialPort::Parity ParityOf(const QString& text) {
   if (text == QStringLiteral("O")) {
     return QSerialPort::OddParity;
   }
-  throw RuntimeError(invalidPropertyValue);
+  throw RuntimeError(Fault::InvalidPropertyValue);
 }
 
 }  // namespace
@@ -90,12 +88,12 @@ std::chrono::nanoseconds QtSerialPort::LineSettings::TimeOfAByte() const {
 QtSerialPort::LineSettings QtSerialPort::Parse(const std::string& settings) {
   const QStringList parts = QString::fromStdString(settings).toUpper().split(QLatin1Char(','));
   if (parts.size() != 4) {
-    throw RuntimeError(invalidPropertyValue);
+    throw RuntimeError(Fault::InvalidPropertyValue);
   }
   const LineSettings parsed{parts[0].toInt(), ParityOf(parts[1]), parts[2].toInt(), parts[3].toInt()};
   if (!QSerialPortInfo::standardBaudRates().contains(parsed.Baud) || parsed.DataBits < 5 ||
       parsed.DataBits > 8 || parsed.StopBits < 1 || parsed.StopBits > 2) {
-    throw RuntimeError(invalidPropertyValue);
+    throw RuntimeError(Fault::InvalidPropertyValue);
   }
   return parsed;
 }
@@ -120,7 +118,8 @@ void QtSerialPort::Open(const std::string& device, const std::string& settings) 
   }
   if (!port_.open(QIODevice::ReadWrite)) {
     // "Permission" means a device in use, a locked one, and one that this user may not touch.
-    throw RuntimeError(port_.error() == QSerialPort::PermissionError ? 8005 : 8002);
+    throw RuntimeError(port_.error() == QSerialPort::PermissionError ? Fault::PortAlreadyOpen
+                                                                     : Fault::InvalidPortNumber);
   }
   TakeExclusively();
   idleAt_ = LineClock::now();
@@ -137,7 +136,7 @@ void QtSerialPort::SetSettings(const std::string& settings) {
       throw RuntimeError(Fault::PortLost);
     }
     Apply(old);
-    throw RuntimeError(invalidPropertyValue);
+    throw RuntimeError(Fault::InvalidPropertyValue);
   }
 }
 

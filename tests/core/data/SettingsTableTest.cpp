@@ -2,13 +2,12 @@
 
 #include <gmock/gmock.h>
 
-#include <fstream>
-#include <iterator>
 #include <set>
 #include <string>
 
 #include "core/data/IniReader.h"
-#include "platform/linux/LinuxFiles.h"
+#include "tests/fakes/FakeFiles.h"
+#include "tests/support/TemporaryFolder.h"
 
 namespace {
 
@@ -26,10 +25,7 @@ std::string ManualRows() {
 }
 
 TEST(SettingsTable, IsTheListOfTheManual) {
-  std::ifstream file(TESSARINE_MANUAL);
-  ASSERT_TRUE(file);
-  const std::string manual{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-  EXPECT_THAT(manual, HasSubstr("\n" + ManualRows() + "\n"));
+  EXPECT_THAT(ReadFile(TESSARINE_MANUAL), HasSubstr("\n" + ManualRows() + "\n"));
 }
 
 TEST(SettingsTable, NamesEachSettingOnce) {
@@ -41,8 +37,9 @@ TEST(SettingsTable, NamesEachSettingOnce) {
 }
 
 TEST(SettingsTable, HasTheDefaultsOfTheFileThatANewInstallationGets) {
-  LinuxFiles disk;
-  const IniReader ini(disk, TESSARINE_RESOURCES "/tessarine.ini");
+  FakeFiles disk;
+  disk.Put("/tessarine.ini", ReadFile(TESSARINE_RESOURCES "/tessarine.ini"));
+  const IniReader ini(disk, "/tessarine.ini");
   std::set<std::string> inFile;
   std::set<std::string> sections;
   for (const Setting& setting : AllSettings) {
