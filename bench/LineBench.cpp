@@ -1,6 +1,9 @@
 #include <QApplication>
 #include <chrono>
 #include <cstdio>
+#include <filesystem>
+#include <optional>
+#include <vector>
 
 #include "app/Composition.h"
 #include "app/UploadProgress.h"
@@ -17,7 +20,7 @@ using Seconds = std::chrono::duration<double>;
 constexpr double Baud = 19200;
 constexpr double BitsPerByte = 10;
 
-/// Boxes are answered at once.
+/// Answers every box at once.
 class SilentBoxes : public MessageBoxes {
  public:
   BoxAnswer Show(const std::string&, const std::string&, BoxIcon, BoxButtons) override {
@@ -25,8 +28,9 @@ class SilentBoxes : public MessageBoxes {
   }
 };
 
-/// One download with the real line, event loop and progress window.
-Spent Download(const sim::BaseUnit& unit) {
+/// One download with the real line, event loop and progress window, and with a transcript where there is a
+/// folder for it.
+Spent Download(const sim::BaseUnit& unit, const std::string& logFolder = {}) {
   const StringTable strings(Language::English);
   Game game(strings);
   SilentBoxes boxes;
@@ -36,11 +40,16 @@ Spent Download(const sim::BaseUnit& unit) {
   QtSerialPort port;
   QtEventPump events;
   const QtClock clock;
-  CommPort commPort(port, ini, device, boxes, strings, [] {});
+  std::optional<LoggedPort> logged;
+  if (!logFolder.empty()) {
+    logged.emplace(port, LoggedPort::Parts{files, logFolder, events, clock}, "line");
+  }
+  SerialPort& line = logged ? static_cast<SerialPort&>(*logged) : port;
+  CommPort commPort(line, ini, device, boxes, strings, [] {});
   UploadProgress progress(strings, nullptr);
   const double processor = ProcessorSeconds(RUSAGE_SELF);
   const auto start = std::chrono::steady_clock::now();
-  BaseUnitDownload(port, commPort, events, boxes, clock, progress, game).GetScores();
+  BaseUnitDownload(line, commPort, events, boxes, clock, progress, game).GetScores();
   return {Seconds(std::chrono::steady_clock::now() - start).count(),
           ProcessorSeconds(RUSAGE_SELF) - processor};
 }
@@ -66,6 +75,27 @@ bool MeasureTimeOut(const char* name, std::size_t silentFrom) {
   return ReportGoal(name, spent.Processor / spent.Wall, 0.01, detail);
 }
 
+/// Downloads with and without it in turn, so that whatever else the machine does meets both.
+bool MeasureTranscript() {
+  constexpr int players = 40;
+  constexpr int rounds = 11;
+  const sim::BaseUnit unit({.Answer = sim::MakeBaseUnitAnswer(sim::MakeGame(players, 1))});
+  const std::filesystem::path folder = std::filesystem::temp_directory_path() / "tessarine-bench-logs";
+  std::vector<double> with;
+  std::vector<double> without;
+  for (int round = 0; round < rounds; ++round) {
+    without.push_back(Download(unit).Processor);
+    with.push_back(Download(unit, folder).Processor);
+  }
+  const std::uintmax_t logged = std::filesystem::file_size(folder / "base-unit.log");
+  std::filesystem::remove_all(folder);
+  char detail[80];
+  std::snprintf(detail, sizeof detail, "%.2f ms to %.2f ms, %.0f bytes of log each", Median(with) * 1000,
+                Median(without) * 1000, static_cast<double>(logged) / rounds);
+  return ReportGoal("download with transcript / without, processor time", Median(with) / Median(without),
+                    1.01, detail);
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
@@ -73,5 +103,6 @@ int main(int argc, char** argv) {
   bool met = MeasureDownload();
   met &= MeasureTimeOut("processor time of a time-out before the count", 1);
   met &= MeasureTimeOut("processor time of a time-out in mid-frame", 20);
+  met &= MeasureTranscript();
   return met ? 0 : 1;
 }

@@ -29,16 +29,42 @@ function(tessarine_library name)
   target_link_libraries(${name} PUBLIC tessarine_source)
 endfunction()
 
-# tessarine_test(<name> LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest knows one by one.
+# tessarine_test_label(<label>): fails unless it is one of the four kinds of tests.
+#   logic   no window, no line, no other program: together a matter of seconds
+#   window  windows, offscreen, with mouse and key events
+#   wire    over pseudo terminals: the real serial part, the simulated venue
+#   real    real parts of the platform: files, databases, old installations, the word processor
+function(tessarine_test_label label)
+  if(NOT label MATCHES "^(logic|window|wire|real)$")
+    message(FATAL_ERROR "Tests are logic, window, wire or real, not \"${label}\"")
+  endif()
+endfunction()
+
+# tessarine_test(<name> [LABEL <label>] LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest knows
+# one by one: a process for each costs 8 ms, and a thousand of them are still seconds. Without a label those with the main
+# program of window tests are window tests, and all others logic.
 function(tessarine_test name)
-  cmake_parse_arguments(ARG "" "" "LIBS;SOURCES" ${ARGN})
+  cmake_parse_arguments(ARG "" "LABEL" "LIBS;SOURCES" ${ARGN})
+  if(NOT ARG_LABEL AND "tessarine_test_windows" IN_LIST ARG_LIBS)
+    set(ARG_LABEL window)
+  elseif(NOT ARG_LABEL)
+    set(ARG_LABEL logic)
+  endif()
+  tessarine_test_label(${ARG_LABEL})
   add_executable(${name} ${ARG_SOURCES})
   target_link_libraries(${name} PRIVATE ${ARG_LIBS} tessarine_options GTest::gmock GTest::gtest_main)
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/src)
   # A test's own code runs once: half the time to build it is worth more than its speed.
-  target_compile_options(${name} PRIVATE -O0)
-  target_precompile_headers(${name} PRIVATE <gmock/gmock.h> <gtest/gtest.h>)
+  # One precompiled header serves all, the first program's: so all are compiled with -fPIC, which the toolkit asks for.
+  target_compile_options(${name} PRIVATE -O0 -fPIC)
+  get_property(owner GLOBAL PROPERTY TESSARINE_TEST_HEADERS)
+  if(owner)
+    target_precompile_headers(${name} REUSE_FROM ${owner})
+  else()
+    target_precompile_headers(${name} PRIVATE <gmock/gmock.h> <gtest/gtest.h>)
+    set_property(GLOBAL PROPERTY TESSARINE_TEST_HEADERS ${name})
+  endif()
   include(GoogleTest)
-  gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 120
+  gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 120 LABELS ${ARG_LABEL}
     ENVIRONMENT "QT_QPA_PLATFORM=offscreen;LC_ALL=C.UTF-8")
 endfunction()

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <limits>
 #include <optional>
+#include <string>
 #include <utility>
 
 namespace sim {
@@ -19,24 +20,18 @@ constexpr std::chrono::seconds closingLimit{10};
 }  // namespace
 
 BaseUnit::BaseUnit(BaseUnitSettings settings)
-    : settings_(std::move(settings)),
-      terminal_(lineBaud, settings_.LinePace),
-      log_(settings_.Log, "base-unit"),
-      thread_([this] { Run(); }) {}
-
-BaseUnit::~BaseUnit() {
-  terminal_.Interrupt();
-  thread_.join();
-}
+    : Device({.LogName = "base-unit",
+              .Understood = {{.Baud = lineBaud}},
+              .LinePace = settings.LinePace,
+              .Log = settings.Log}),
+      settings_(std::move(settings)) {}
 
 BaseUnitExchange BaseUnit::LatestExchange() const {
-  const std::scoped_lock lock(mutex_);
-  return latest_;
+  return record_.Copy().Latest;
 }
 
 bool BaseUnit::WaitUntilServed(int requests, std::chrono::milliseconds limit) const {
-  std::unique_lock lock(mutex_);
-  return served_.wait_for(lock, limit, [&] { return requestsServed_ >= requests; });
+  return record_.WaitUntil(limit, [&](const Record& record) { return record.RequestsServed >= requests; });
 }
 
 void BaseUnit::Run() {
@@ -45,16 +40,12 @@ void BaseUnit::Run() {
   while (ending == Ending::AskedAnew || AwaitRequest()) {
     ending = Serve();
     ++served;
-    {
-      const std::scoped_lock lock(mutex_);
-      requestsServed_ = served;
-    }
-    served_.notify_all();
+    record_.Note([&](Record& record) { record.RequestsServed = served; });
     if (ending == Ending::LineGone || served == settings_.Requests) {
       break;
     }
   }
-  terminal_.WaitForClientToClose(closingLimit);
+  Line().WaitForClientToClose(closingLimit);
   if (settings_.OnFinished) {
     settings_.OnFinished();
   }
@@ -62,10 +53,10 @@ void BaseUnit::Run() {
 
 bool BaseUnit::AwaitRequest() {
   bool begun = false;
-  while (const std::optional<std::uint8_t> byte = terminal_.ReadByte()) {
+  while (const std::optional<std::uint8_t> byte = Line().ReadByte()) {
     const bool complete = begun && *byte == requestSecond;
     begun = *byte == requestFirst;
-    log_.FromHost(*byte, complete ? "request" : begun ? "" : "ignored");
+    Log().FromHost(*byte, complete ? "request" : begun ? "" : "ignored");
     if (complete) {
       return true;
     }
@@ -75,19 +66,18 @@ bool BaseUnit::AwaitRequest() {
 
 BaseUnit::Heard BaseUnit::AwaitReply() {
   bool requestBegun = false;
-  while (const std::optional<std::uint8_t> byte = terminal_.ReadByte()) {
+  while (const std::optional<std::uint8_t> byte = Line().ReadByte()) {
     if (requestBegun && *byte == requestSecond) {
-      log_.FromHost(*byte, "request");
+      Log().FromHost(*byte, "request");
       return Heard::Request;
     }
     if (*byte == accepted || *byte == rejected) {
-      log_.FromHost(*byte, *byte == accepted ? "accepted" : "rejected");
-      const std::scoped_lock lock(mutex_);
-      latest_.Replies.push_back(*byte);
+      Log().FromHost(*byte, *byte == accepted ? "accepted" : "rejected");
+      record_.Note([&](Record& record) { record.Latest.Replies.push_back(*byte); });
       return Heard::Reply;
     }
     requestBegun = *byte == requestFirst;
-    log_.FromHost(*byte, requestBegun ? "" : "ignored");
+    Log().FromHost(*byte, requestBegun ? "" : "ignored");
   }
   return Heard::Nothing;
 }
@@ -95,10 +85,7 @@ BaseUnit::Heard BaseUnit::AwaitReply() {
 BaseUnit::Ending BaseUnit::Serve() {
   const BaseUnitAnswer& answer = settings_.Answer;
   bytesUntilCut_ = answer.CutAfter.value_or(std::numeric_limits<std::size_t>::max());
-  {
-    const std::scoped_lock lock(mutex_);
-    latest_ = {};
-  }
+  record_.Note([](Record& record) { record.Latest = {}; });
   if (!Send(answer.Noise, false) || !Send({&answer.Count, 1}, false)) {
     return EndOfCutAnswer();
   }
@@ -120,8 +107,8 @@ BaseUnit::Ending BaseUnit::Serve() {
 
 BaseUnit::Ending BaseUnit::EndOfCutAnswer() {
   if (settings_.Answer.CutBy == BaseUnitAnswer::Cut::HangUp) {
-    log_.Note("line pulled out");
-    terminal_.HangUp();
+    Log().Note("line pulled out");
+    Line().HangUp();
     return Ending::LineGone;
   }
   return Ending::Complete;
@@ -130,19 +117,19 @@ BaseUnit::Ending BaseUnit::EndOfCutAnswer() {
 // False when not all of `bytes` went out: the answer is cut there, or the wait was interrupted.
 bool BaseUnit::Send(std::span<const std::uint8_t> bytes, bool isFrame) {
   const std::span<const std::uint8_t> due = bytes.first(std::min(bytes.size(), bytesUntilCut_));
-  const std::size_t count = settings_.Answer.Torn ? terminal_.WriteTorn(due) : terminal_.Write(due);
+  const std::size_t count = settings_.Answer.Torn ? Line().WriteTorn(due) : Line().Write(due);
   const std::span<const std::uint8_t> sent = bytes.first(count);
   bytesUntilCut_ -= count;
   if (!sent.empty()) {
-    log_.ToHost(sent);
-    const std::scoped_lock lock(mutex_);
-    latest_.Sent.insert(latest_.Sent.end(), sent.begin(), sent.end());
-    if (isFrame) {
-      latest_.Frames.emplace_back(sent.begin(), sent.end());
-      if (settings_.Frames != nullptr) {
-        const std::string text(sent.begin(), sent.end());
-        *settings_.Frames << text << std::flush;
+    Log().ToHost(sent);
+    record_.Note([&](Record& record) {
+      record.Latest.Sent.insert(record.Latest.Sent.end(), sent.begin(), sent.end());
+      if (isFrame) {
+        record.Latest.Frames.emplace_back(sent.begin(), sent.end());
       }
+    });
+    if (isFrame && settings_.Frames != nullptr) {
+      *settings_.Frames << std::string(sent.begin(), sent.end()) << std::flush;
     }
   }
   return count == bytes.size();

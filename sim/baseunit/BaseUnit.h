@@ -1,20 +1,15 @@
 #pragma once
 
 #include <chrono>
-#include <condition_variable>
 #include <cstddef>
 #include <cstdint>
 #include <functional>
-#include <mutex>
 #include <ostream>
 #include <span>
-#include <string>
-#include <thread>
 #include <vector>
 
 #include "sim/baseunit/BaseUnitAnswer.h"
-#include "sim/line/PseudoTerminal.h"
-#include "sim/line/WireLog.h"
+#include "sim/line/Device.h"
 
 namespace sim {
 
@@ -38,16 +33,10 @@ struct BaseUnitExchange {
 /// from its construction until it has answered `Requests` requests, its line has been pulled out, or its
 /// destruction. While it waits for a reply it also takes a new request and begins again, since a host that
 /// gave up asks anew.
-class BaseUnit {
+class BaseUnit : public Device {
  public:
   /// Throws std::system_error when the system grants no pseudo terminal. The streams must outlive the unit.
   explicit BaseUnit(BaseUnitSettings settings);
-  ~BaseUnit();
-  BaseUnit(const BaseUnit&) = delete;
-  BaseUnit& operator=(const BaseUnit&) = delete;
-
-  /// The device that the host opens.
-  const std::string& DevicePath() const { return terminal_.SlavePath(); }
 
   /// What passed the line for the latest request.
   BaseUnitExchange LatestExchange() const;
@@ -59,6 +48,11 @@ class BaseUnit {
   enum class Ending { Complete, AskedAnew, LineGone };
   enum class Heard { Reply, Request, Nothing };
 
+  struct Record {
+    int RequestsServed = 0;
+    BaseUnitExchange Latest;
+  };
+
   void Run();
   bool AwaitRequest();
   Heard AwaitReply();
@@ -67,16 +61,9 @@ class BaseUnit {
   bool Send(std::span<const std::uint8_t> bytes, bool isFrame);
 
   BaseUnitSettings settings_;
-  PseudoTerminal terminal_;
-  WireLog log_;
   std::size_t bytesUntilCut_ = 0;
-
-  mutable std::mutex mutex_;
-  mutable std::condition_variable served_;
-  int requestsServed_ = 0;
-  BaseUnitExchange latest_;
-
-  std::thread thread_;
+  TrafficRecord<Record> record_;
+  Serving serving_{*this, [this] { Run(); }};
 };
 
 }  // namespace sim

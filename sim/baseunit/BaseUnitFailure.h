@@ -1,7 +1,8 @@
 #pragma once
 
 #include <array>
-#include <string_view>
+
+#include "sim/line/DeviceFailure.h"
 
 namespace sim {
 
@@ -20,17 +21,8 @@ enum class BaseUnitFailure {
   HangUp,
 };
 
-/// What the number that goes with a failure counts, from 1.
-enum class FailurePlace { None, Frame, Byte };
+using BaseUnitFailureInfo = FailureInfo<BaseUnitFailure>;
 
-struct BaseUnitFailureInfo {
-  BaseUnitFailure Failure;
-  std::string_view Name;  ///< for command lines and test names
-  FailurePlace Place;
-  std::string_view Meaning;
-};
-
-/// Every failure once, in the order of the enumeration.
 inline constexpr std::array<BaseUnitFailureInfo, 11> BaseUnitFailures{{
     {BaseUnitFailure::None, "none", FailurePlace::None, "a faultless answer"},
     {BaseUnitFailure::WrongCrc, "wrong-crc", FailurePlace::Frame, "frame K ends with a wrong check byte"},
@@ -51,5 +43,6 @@ inline constexpr std::array<BaseUnitFailureInfo, 11> BaseUnitFailures{{
     {BaseUnitFailure::HangUp, "hang-up", FailurePlace::Frame,
      "the line is pulled out in the middle of frame K"},
 }};
+static_assert(IsInOrder(BaseUnitFailures));
 
 }  // namespace sim

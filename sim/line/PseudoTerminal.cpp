@@ -3,7 +3,6 @@
 #include <fcntl.h>
 #include <poll.h>
 #include <stdlib.h>
-#include <termios.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -11,6 +10,7 @@
 #include <cerrno>
 #include <system_error>
 #include <thread>
+#include <utility>
 
 #include "sim/line/PortLock.h"
 
@@ -32,35 +32,42 @@ std::string SlavePathOf(int master) {
   return path.data();
 }
 
-FileDescriptor OpenRaw(const std::string& slavePath) {
+FileDescriptor OpenRaw(const std::string& slavePath, const LineSettings& settings) {
   FileDescriptor slave(::open(slavePath.c_str(), O_RDWR | O_NOCTTY | O_CLOEXEC));
-  termios settings{};
-  if (!slave.IsOpen() || ::tcgetattr(slave.Get(), &settings) != 0) {
+  if (!slave.IsOpen()) {
     ThrowSystemError(slavePath.c_str());
   }
-  ::cfmakeraw(&settings);
-  if (::tcsetattr(slave.Get(), TCSANOW, &settings) != 0) {
-    ThrowSystemError(slavePath.c_str());
-  }
+  SetRawLine(slave.Get(), settings);
   return slave;
 }
 
 }  // namespace
 
 PseudoTerminal::PseudoTerminal(int baud, Pace pace)
-    : master_(::posix_openpt(O_RDWR | O_NOCTTY | O_CLOEXEC | O_NONBLOCK)), baud_(baud), pace_(pace) {
+    : PseudoTerminal(std::vector<LineSettings>{{.Baud = baud}}, pace) {}
+
+PseudoTerminal::PseudoTerminal(std::vector<LineSettings> understood, Pace pace)
+    : master_(::posix_openpt(O_RDWR | O_NOCTTY | O_CLOEXEC | O_NONBLOCK)),
+      understood_(std::move(understood)),
+      current_(understood_.front()),
+      pace_(pace) {
   if (!master_.IsOpen()) {
     ThrowSystemError("pseudo terminal");
   }
   slavePath_ = SlavePathOf(master_.Get());
   AwaitPortUnlocked(slavePath_);
-  slave_ = OpenRaw(slavePath_);
+  slave_ = OpenRaw(slavePath_, current_);
   std::array<int, 2> wake{};
   if (::pipe2(wake.data(), O_CLOEXEC) != 0) {
     ThrowSystemError("pipe");
   }
   wakeReader_ = FileDescriptor(wake[0]);
   wakeWriter_ = FileDescriptor(wake[1]);
+}
+
+void PseudoTerminal::SetUnderstood(std::vector<LineSettings> understood) {
+  understood_ = std::move(understood);
+  current_ = understood_.front();
 }
 
 std::optional<std::uint8_t> PseudoTerminal::ReadByte(std::optional<std::chrono::nanoseconds> timeout) {
@@ -147,8 +154,8 @@ std::chrono::nanoseconds PseudoTerminal::DurationOf(std::size_t bytes) const {
   }
   constexpr std::int64_t nanosecondsOfTenBits = 10'000'000'000;
   // Rounded up once for the whole run of bytes: rounding each byte's share would let the error add up.
-  return std::chrono::nanoseconds((static_cast<std::int64_t>(bytes) * nanosecondsOfTenBits + baud_ - 1) /
-                                  baud_);
+  return std::chrono::nanoseconds(
+      (static_cast<std::int64_t>(bytes) * nanosecondsOfTenBits + current_.Baud - 1) / current_.Baud);
 }
 
 // Notes when the bytes that have come will be through. False when the line has ended.
@@ -159,11 +166,30 @@ bool PseudoTerminal::TakeArrivals() {
     if (count <= 0) {
       return count < 0 && (errno == EAGAIN || errno == EINTR);
     }
-    for (const std::uint8_t byte : std::span(bytes).first(static_cast<std::size_t>(count))) {
+    const std::span<const std::uint8_t> taken = std::span(bytes).first(static_cast<std::size_t>(count));
+    if (!Understands(taken)) {
+      continue;
+    }
+    for (const std::uint8_t byte : taken) {
       inputFree_ = std::max(inputFree_, Clock::now()) + DurationOf(1);
       arrivals_.push_back({byte, inputFree_});
     }
   }
+}
+
+// True when the settings at which `bytes` have come are understood; they are current then.
+bool PseudoTerminal::Understands(std::span<const std::uint8_t> bytes) {
+  const LineSettings host = ReadLineSettings(master_.Get());
+  if (std::find(understood_.begin(), understood_.end(), host) != understood_.end()) {
+    current_ = host;
+    foreign_.reset();
+    return true;
+  }
+  const bool begin = std::exchange(foreign_, host) != host;
+  if (onForeignBytes_) {
+    onForeignBytes_(host, bytes, begin);
+  }
+  return false;
 }
 
 // True when one of `events`, or the client's closing, came before the time-out and no interruption did.

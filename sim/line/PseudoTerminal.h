@@ -5,31 +5,56 @@
 #include <cstddef>
 #include <cstdint>
 #include <deque>
+#include <functional>
 #include <optional>
 #include <span>
 #include <string>
+#include <utility>
+#include <vector>
 
 #include "sim/line/FileDescriptor.h"
+#include "sim/line/LineSettings.h"
 
 namespace sim {
 
 /// How fast bytes pass a line: as its baud rate has it, or as fast as the machine can.
 enum class Pace { AsWired, Fast };
 
-/// A device's end of a serial line (8 data bits, no parity, 1 stop bit, so 10 bits a byte). The other end is
-/// a slave device that a client opens by its path; the client may close and open it again without the line
-/// breaking. One thread uses it; only Interrupt may be called from another.
+/// A device's end of a serial line, 10 bits a byte. The other end is a slave device that a client opens by
+/// its path; the client may close and open it again without the line breaking. One thread uses it; only
+/// Interrupt may be called from another.
+///
+/// Bytes of a client whose settings are none of those understood never arrive. A real line would turn them
+/// into noise; silence has the advantage that no noise can happen to be a request or an answer, so that such
+/// a client fails always and in the same way. The settings are looked at when the bytes are taken, so a
+/// client must not change them before its bytes have had their time on the line. The terminal begins with the
+/// first settings understood: a client that sets none finds those, or what the client before it has left.
 class PseudoTerminal {
  public:
-  /// Throws std::system_error when the system grants no pseudo terminal.
+  /// A device that understands 8 data bits without parity at `baud`. Throws std::system_error when the system
+  /// grants no pseudo terminal.
   PseudoTerminal(int baud, Pace pace);
+  /// A device that understands each of `understood` (one at least) and answers as it was spoken to; the first
+  /// until then. Throws like the other.
+  PseudoTerminal(std::vector<LineSettings> understood, Pace pace);
 
   using Clock = std::chrono::steady_clock;
 
   const std::string& SlavePath() const { return slavePath_; }
 
-  /// Bytes pass at `baud` from now on.
-  void SetBaud(int baud) { baud_ = baud; }
+  /// From now on the device understands `baud` alone, without parity, and bytes pass at that.
+  void SetBaud(int baud) { SetUnderstood({{.Baud = baud}}); }
+  /// As SetBaud, with each of `understood`; bytes pass at the first until the client has spoken.
+  void SetUnderstood(std::vector<LineSettings> understood);
+  const std::vector<LineSettings>& Understood() const { return understood_; }
+  /// Those understood ones at which the client has spoken last; the first of them until it has.
+  const LineSettings& Current() const { return current_; }
+
+  /// `begin`: a run of bytes at these settings of the host begins.
+  using ForeignBytes =
+      std::function<void(const LineSettings& host, std::span<const std::uint8_t> bytes, bool begin)>;
+  /// `told` is called with bytes that did not arrive for their settings' sake.
+  void OnForeignBytes(ForeignBytes told) { onForeignBytes_ = std::move(told); }
 
   /// False after an interruption or the end of the line.
   bool IsUp() const { return !interrupted_ && master_.IsOpen(); }
@@ -73,6 +98,7 @@ class PseudoTerminal {
 
   bool IsPaced() const { return pace_ == Pace::AsWired; }
   bool TakeArrivals();
+  bool Understands(std::span<const std::uint8_t> bytes);
   bool WaitFor(short events, std::optional<std::chrono::nanoseconds> timeout);
   std::size_t WriteAtOnce(std::span<const std::uint8_t> bytes);
 
@@ -81,7 +107,10 @@ class PseudoTerminal {
   FileDescriptor wakeReader_;
   FileDescriptor wakeWriter_;
   std::string slavePath_;
-  int baud_;
+  std::vector<LineSettings> understood_;
+  LineSettings current_;
+  std::optional<LineSettings> foreign_;  // settings of the latest bytes, when they were not understood
+  ForeignBytes onForeignBytes_;
   Pace pace_;
   Clock::time_point inputFree_;
   std::deque<Arrival> arrivals_;

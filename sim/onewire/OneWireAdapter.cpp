@@ -11,8 +11,8 @@ constexpr std::uint64_t identitySerial = 0x0000001E5A37;
 
 OneWireAdapterSettings Checked(OneWireAdapterSettings settings) {
   for (const OneWireFailureInfo& info : OneWireFailures) {
-    const bool isBit = info.Place == OneWireFailurePlace::Bit;
-    if (info.Failure == settings.Failure && info.Place != OneWireFailurePlace::None &&
+    const bool isBit = info.Place == FailurePlace::Bit;
+    if (info.Failure == settings.Failure && info.Place != FailurePlace::None &&
         (settings.FailurePlace == 0 || (isBit && settings.FailurePlace > 64))) {
       throw std::invalid_argument("There is no " + std::string(isBit ? "bit " : "byte ") +
                                   std::to_string(settings.FailurePlace));
@@ -45,17 +45,13 @@ RomId CompanionOf(const RomId& rom) {
 }  // namespace
 
 OneWireAdapter::OneWireAdapter(OneWireAdapterSettings settings)
-    : settings_(Checked(settings)),
-      terminal_(powerUpBaud, settings_.LinePace),
-      log_(settings_.Log, "1-wire"),
+    : Device({.LogName = "1-wire",
+              .Understood = {{.Baud = powerUpBaud}},
+              .LinePace = settings.LinePace,
+              .Log = settings.Log}),
+      settings_(Checked(settings)),
       bus_(BusOf(settings_)),
-      chip_(bus_),
-      thread_([this] { Run(); }) {}
-
-OneWireAdapter::~OneWireAdapter() {
-  terminal_.Interrupt();
-  thread_.join();
-}
+      chip_(bus_) {}
 
 void OneWireAdapter::Touch(const RomId& rom) {
   const std::scoped_lock lock(busMutex_);
@@ -79,10 +75,12 @@ void OneWireAdapter::LeaveAll() {
 }
 
 void OneWireAdapter::Run() {
-  while (const std::optional<std::uint8_t> byte = terminal_.ReadByte()) {
-    log_.FromHost(*byte);
+  while (const std::optional<std::uint8_t> byte = Line().ReadByte()) {
+    Log().FromHost(*byte);
     const std::optional<std::uint8_t> answer = AnswerTo(*byte);
-    terminal_.SetBaud(chip_.Baud());
+    if (chip_.Baud() != Line().Current().Baud) {
+      Line().SetBaud(chip_.Baud());
+    }
     if (answer && !Send(*answer)) {
       break;
     }
@@ -104,17 +102,16 @@ bool OneWireAdapter::Send(std::uint8_t answer) {
     return true;
   }
   if (Fails(OneWireFailure::HangUp) && answers_ == settings_.FailurePlace) {
-    log_.Note("adapter pulled out");
-    terminal_.HangUp();
+    Log().Note("adapter pulled out");
+    Line().HangUp();
     return false;
   }
   std::vector<std::uint8_t> bytes{answer};
   if (Fails(OneWireFailure::NoiseByte) && answers_ == settings_.FailurePlace) {
     bytes.insert(bytes.begin(), noise);
   }
-  const std::size_t sent =
-      Fails(OneWireFailure::TornWrites) ? terminal_.WriteTorn(bytes) : terminal_.Write(bytes);
-  log_.ToHost(bytes);
+  const std::size_t sent = Fails(OneWireFailure::TornWrites) ? Line().WriteTorn(bytes) : Line().Write(bytes);
+  Log().ToHost(bytes);
   return sent == bytes.size();
 }
 

@@ -5,12 +5,9 @@
 #include <mutex>
 #include <optional>
 #include <ostream>
-#include <string>
-#include <thread>
 #include <vector>
 
-#include "sim/line/PseudoTerminal.h"
-#include "sim/line/WireLog.h"
+#include "sim/line/Device.h"
 #include "sim/onewire/Ds2480b.h"
 #include "sim/onewire/OneWireBus.h"
 #include "sim/onewire/OneWireFailure.h"
@@ -29,17 +26,11 @@ struct OneWireAdapterSettings {
 /// that goes and comes back finds the chip as it left it. It serves until its line has been pulled out or its
 /// destruction. On the line it takes and gives bytes in turn, so a block takes up to twice as long as on a
 /// real line.
-class OneWireAdapter {
+class OneWireAdapter : public Device {
  public:
   /// Throws std::invalid_argument when the failure has no such place, std::system_error when the system
   /// grants no pseudo terminal. The log must outlive the adapter.
   explicit OneWireAdapter(OneWireAdapterSettings settings);
-  ~OneWireAdapter();
-  OneWireAdapter(const OneWireAdapter&) = delete;
-  OneWireAdapter& operator=(const OneWireAdapter&) = delete;
-
-  /// The device that the host opens.
-  const std::string& DevicePath() const { return terminal_.SlavePath(); }
 
   /// Holds a button to the reader until it leaves. One that is there already stays.
   void Touch(const RomId& rom);
@@ -55,15 +46,13 @@ class OneWireAdapter {
   std::vector<RomId> OnTheBus(const RomId& rom) const;
 
   OneWireAdapterSettings settings_;
-  PseudoTerminal terminal_;
-  WireLog log_;
   std::size_t answers_ = 0;
 
   std::mutex busMutex_;
   OneWireBus bus_;
   Ds2480b chip_;
 
-  std::thread thread_;
+  Serving serving_{*this, [this] { Run(); }};
 };
 
 }  // namespace sim

@@ -1,7 +1,8 @@
 #pragma once
 
 #include <array>
-#include <string_view>
+
+#include "sim/line/DeviceFailure.h"
 
 namespace sim {
 
@@ -20,39 +21,31 @@ enum class OneWireFailure {
   NoOwnDevice,
 };
 
-/// What the number that goes with a failure counts, from 1.
-enum class OneWireFailurePlace { None, Byte, Bit };
+using OneWireFailureInfo = FailureInfo<OneWireFailure>;
 
-struct OneWireFailureInfo {
-  OneWireFailure Failure;
-  std::string_view Name;  ///< for command lines and test names
-  OneWireFailurePlace Place;
-  std::string_view Meaning;
-};
-
-/// Every failure once, in the order of the enumeration. Answer bytes count from the start of the adapter.
+/// Answer bytes count from the start of the adapter.
 inline constexpr std::array<OneWireFailureInfo, 11> OneWireFailures{{
-    {OneWireFailure::None, "none", OneWireFailurePlace::None, "a faultless adapter"},
-    {OneWireFailure::Silence, "silence", OneWireFailurePlace::Byte,
-     "answer byte K and all behind it stay away"},
-    {OneWireFailure::NoDetection, "no-detection", OneWireFailurePlace::None,
+    {OneWireFailure::None, "none", FailurePlace::None, "a faultless adapter"},
+    {OneWireFailure::Silence, "silence", FailurePlace::Byte, "answer byte K and all behind it stay away"},
+    {OneWireFailure::NoDetection, "no-detection", FailurePlace::None,
      "configuration commands stay unanswered"},
-    {OneWireFailure::ShortCircuit, "short-circuit", OneWireFailurePlace::None,
+    {OneWireFailure::ShortCircuit, "short-circuit", FailurePlace::None,
      "the bus is shorted, as by a slanted button"},
-    {OneWireFailure::ContactLost, "contact-lost", OneWireFailurePlace::Bit,
+    {OneWireFailure::ContactLost, "contact-lost", FailurePlace::Bit,
      "buttons lose their contact after K bits of their number, each time"},
-    {OneWireFailure::WrongCrc, "wrong-crc", OneWireFailurePlace::None,
+    {OneWireFailure::WrongCrc, "wrong-crc", FailurePlace::None,
      "the last bit of each button's number is wrong"},
-    {OneWireFailure::HangUp, "hang-up", OneWireFailurePlace::Byte,
+    {OneWireFailure::HangUp, "hang-up", FailurePlace::Byte,
      "the adapter is pulled out instead of answer byte K"},
-    {OneWireFailure::NoiseByte, "noise-byte", OneWireFailurePlace::Byte,
+    {OneWireFailure::NoiseByte, "noise-byte", FailurePlace::Byte,
      "a byte of line noise before answer byte K"},
-    {OneWireFailure::TornWrites, "torn-writes", OneWireFailurePlace::None,
+    {OneWireFailure::TornWrites, "torn-writes", FailurePlace::None,
      "a pause behind each answer byte, so that answers come late"},
-    {OneWireFailure::TwoButtons, "two-buttons", OneWireFailurePlace::None,
+    {OneWireFailure::TwoButtons, "two-buttons", FailurePlace::None,
      "a second button comes and goes with each"},
-    {OneWireFailure::NoOwnDevice, "no-own-device", OneWireFailurePlace::None,
+    {OneWireFailure::NoOwnDevice, "no-own-device", FailurePlace::None,
      "an adapter without an identity of its own"},
 }};
+static_assert(IsInOrder(OneWireFailures));
 
 }  // namespace sim

@@ -2,8 +2,8 @@
 
 #include <array>
 #include <optional>
-#include <string_view>
 
+#include "sim/line/DeviceFailure.h"
 #include "sim/radio/GunRequest.h"
 
 namespace sim {
@@ -38,48 +38,66 @@ enum class RadioFailure {
   LongAtResponse,
 };
 
-struct RadioFailureInfo {
-  RadioFailure Failure;
-  std::string_view Name;                ///< for command lines and test names
+struct RadioFailureInfo : FailureInfo<RadioFailure> {
   std::optional<GunCommand> Concerned;  ///< the one command whose answers it strikes; none: all
-  std::string_view Meaning;
 };
 
-/// Every failure once, in the order of the enumeration.
 inline constexpr std::array<RadioFailureInfo, 26> RadioFailures{{
-    {RadioFailure::None, "none", std::nullopt, "faultless answers"},
-    {RadioFailure::SilentGun, "silent-gun", std::nullopt, "no answer at all"},
-    {RadioFailure::LostSize, "lost-size", GunCommand::Size, "no answer to command 1"},
-    {RadioFailure::LostBlock, "lost-block", GunCommand::Block, "no answer to command 2"},
-    {RadioFailure::LostClose, "lost-close", GunCommand::Close, "no answer to command 3"},
-    {RadioFailure::BadChecksum, "bad-checksum", std::nullopt, "a wrong checksum in the frame"},
-    {RadioFailure::OtherSlot, "other-slot", GunCommand::Search,
-     "the search answer comes when the next id is searched"},
-    {RadioFailure::OtherBlock, "other-block", GunCommand::Block,
-     "another block than asked for (of a lone block: under the next one's offset)"},
-    {RadioFailure::StaleAnswer, "stale-answer", std::nullopt, "the gun's answer before comes again instead"},
-    {RadioFailure::DoubleAnswer, "double-answer", std::nullopt, "the answer comes twice"},
-    {RadioFailure::StatusFrames, "status-frames", std::nullopt,
-     "a transmit status frame before and a modem status frame behind the answer"},
-    {RadioFailure::TornFrames, "torn-frames", std::nullopt, "bytes in small pieces with pauses"},
-    {RadioFailure::CutFrames, "cut-frames", std::nullopt, "the second half of the frame stays away"},
-    {RadioFailure::StartForChecksum, "start-for-checksum", std::nullopt, "0x7E in place of the checksum"},
-    {RadioFailure::LostChecksum, "lost-checksum", std::nullopt,
-     "the frame without its checksum, and at once the whole frame"},
-    {RadioFailure::WrongCrc, "wrong-crc", GunCommand::Block, "a first block that belies the check byte"},
-    {RadioFailure::Noise, "noise", std::nullopt, "line noise before the answer"},
-    {RadioFailure::FalseStart, "false-start", std::nullopt, "line noise that looks like a frame's start"},
-    {RadioFailure::HangUpInSearch, "hang-up-in-search", GunCommand::Search,
-     "the modem is pulled out in the middle of a search answer"},
-    {RadioFailure::HangUpInBlock, "hang-up-in-block", GunCommand::Block,
-     "the modem is pulled out in the middle of a block"},
-    {RadioFailure::TotalZero, "total-zero", GunCommand::Size, "a total of 0 bytes"},
-    {RadioFailure::TotalAbove270, "total-above-270", std::nullopt, "scores of more than 270 bytes"},
-    {RadioFailure::LowPlayerId, "low-player-id", std::nullopt, "an answer from a player id below 32"},
-    {RadioFailure::LongData, "long-data", std::nullopt, "300 data bytes in the frame"},
-    {RadioFailure::LongPayload, "long-payload", std::nullopt, "a packet that claims 255 payload bytes"},
-    {RadioFailure::LongAtResponse, "long-at-response", std::nullopt,
-     "an AT response with 30 value bytes before the answer"},
+    {{RadioFailure::None, "none", FailurePlace::None, "faultless answers"}, std::nullopt},
+    {{RadioFailure::SilentGun, "silent-gun", FailurePlace::Gun, "no answer at all"}, std::nullopt},
+    {{RadioFailure::LostSize, "lost-size", FailurePlace::Gun, "no answer to command 1"}, GunCommand::Size},
+    {{RadioFailure::LostBlock, "lost-block", FailurePlace::Gun, "no answer to command 2"}, GunCommand::Block},
+    {{RadioFailure::LostClose, "lost-close", FailurePlace::Gun, "no answer to command 3"}, GunCommand::Close},
+    {{RadioFailure::BadChecksum, "bad-checksum", FailurePlace::Gun, "a wrong checksum in the frame"},
+     std::nullopt},
+    {{RadioFailure::OtherSlot, "other-slot", FailurePlace::Gun,
+      "the search answer comes when the next id is searched"},
+     GunCommand::Search},
+    {{RadioFailure::OtherBlock, "other-block", FailurePlace::Gun,
+      "another block than asked for (of a lone block: under the next one's offset)"},
+     GunCommand::Block},
+    {{RadioFailure::StaleAnswer, "stale-answer", FailurePlace::Gun,
+      "the gun's answer before comes again instead"},
+     std::nullopt},
+    {{RadioFailure::DoubleAnswer, "double-answer", FailurePlace::Gun, "the answer comes twice"},
+     std::nullopt},
+    {{RadioFailure::StatusFrames, "status-frames", FailurePlace::Gun,
+      "a transmit status frame before and a modem status frame behind the answer"},
+     std::nullopt},
+    {{RadioFailure::TornFrames, "torn-frames", FailurePlace::Gun, "bytes in small pieces with pauses"},
+     std::nullopt},
+    {{RadioFailure::CutFrames, "cut-frames", FailurePlace::Gun, "the second half of the frame stays away"},
+     std::nullopt},
+    {{RadioFailure::StartForChecksum, "start-for-checksum", FailurePlace::Gun,
+      "0x7E in place of the checksum"},
+     std::nullopt},
+    {{RadioFailure::LostChecksum, "lost-checksum", FailurePlace::Gun,
+      "the frame without its checksum, and at once the whole frame"},
+     std::nullopt},
+    {{RadioFailure::WrongCrc, "wrong-crc", FailurePlace::Gun, "a first block that belies the check byte"},
+     GunCommand::Block},
+    {{RadioFailure::Noise, "noise", FailurePlace::Gun, "line noise before the answer"}, std::nullopt},
+    {{RadioFailure::FalseStart, "false-start", FailurePlace::Gun,
+      "line noise that looks like a frame's start"},
+     std::nullopt},
+    {{RadioFailure::HangUpInSearch, "hang-up-in-search", FailurePlace::Gun,
+      "the modem is pulled out in the middle of a search answer"},
+     GunCommand::Search},
+    {{RadioFailure::HangUpInBlock, "hang-up-in-block", FailurePlace::Gun,
+      "the modem is pulled out in the middle of a block"},
+     GunCommand::Block},
+    {{RadioFailure::TotalZero, "total-zero", FailurePlace::Gun, "a total of 0 bytes"}, GunCommand::Size},
+    {{RadioFailure::TotalAbove270, "total-above-270", FailurePlace::Gun, "scores of more than 270 bytes"},
+     std::nullopt},
+    {{RadioFailure::LowPlayerId, "low-player-id", FailurePlace::Gun, "an answer from a player id below 32"},
+     std::nullopt},
+    {{RadioFailure::LongData, "long-data", FailurePlace::Gun, "300 data bytes in the frame"}, std::nullopt},
+    {{RadioFailure::LongPayload, "long-payload", FailurePlace::Gun, "a packet that claims 255 payload bytes"},
+     std::nullopt},
+    {{RadioFailure::LongAtResponse, "long-at-response", FailurePlace::Gun,
+      "an AT response with 30 value bytes before the answer"},
+     std::nullopt},
 }};
+static_assert(IsInOrder(RadioFailures));
 
 }  // namespace sim

@@ -13,32 +13,23 @@ constexpr int lineBaud = 57600;
 }  // namespace
 
 RadioModem::RadioModem(RadioModemSettings settings)
-    : settings_(std::move(settings)),
+    : Device({.LogName = "radio-modem",
+              .Understood = {{.Baud = lineBaud}},
+              .LinePace = settings.LinePace,
+              .Log = settings.Log}),
+      settings_(std::move(settings)),
       trouble_(settings_.Trouble, settings_.Guns),
-      terminal_(lineBaud, settings_.LinePace),
-      sender_(terminal_, [this](const LinePiece& piece) { NoteSent(piece); }),
-      log_(settings_.Log, "radio-modem"),
-      thread_([this] { Run(); }) {}
-
-RadioModem::~RadioModem() {
-  terminal_.Interrupt();
-  thread_.join();
-}
-
-RadioModemTraffic RadioModem::Traffic() const {
-  const std::scoped_lock lock(mutex_);
-  return traffic_;
-}
+      sender_(Line(), [this](const LinePiece& piece) { NoteSent(piece); }) {}
 
 bool RadioModem::WaitUntilAsked(std::size_t count, std::chrono::milliseconds limit) const {
-  std::unique_lock lock(mutex_);
-  return asked_.wait_for(lock, limit,
-                         [&] { return traffic_.Requests.size() + traffic_.Faults.size() >= count; });
+  return traffic_.WaitUntil(limit, [&](const RadioModemTraffic& traffic) {
+    return traffic.Requests.size() + traffic.Faults.size() >= count;
+  });
 }
 
 void RadioModem::Run() {
-  while (terminal_.IsUp()) {
-    if (const std::optional<std::uint8_t> byte = terminal_.ReadByte(sender_.UntilDue())) {
+  while (Line().IsUp()) {
+    if (const std::optional<std::uint8_t> byte = Line().ReadByte(sender_.UntilDue())) {
       Take(*byte);
     }
     sender_.SendDue();
@@ -47,10 +38,7 @@ void RadioModem::Run() {
 
 void RadioModem::Take(std::uint8_t byte) {
   const auto taken = reader_.Take(byte);
-  {
-    const std::scoped_lock lock(mutex_);
-    ++traffic_.BytesFromHost;
-  }
+  traffic_.Note([](RadioModemTraffic& traffic) { ++traffic.BytesFromHost; });
   if (!taken) {
     return;
   }
@@ -68,17 +56,14 @@ void RadioModem::Take(std::uint8_t byte) {
 
 void RadioModem::Note(const HostFault& fault) {
   const std::string what(fault.What);
-  log_.FromHost(reader_.Bytes(), "fault: " + what);
-  {
-    const std::scoped_lock lock(mutex_);
-    traffic_.Faults.push_back(what);
-  }
-  asked_.notify_all();
+  Log().FromHost(reader_.Bytes(), "fault: " + what);
+  NoteHostFault("the host sent " + what);
+  traffic_.Note([&](RadioModemTraffic& traffic) { traffic.Faults.push_back(what); });
 }
 
 void RadioModem::Serve(const GunRequest& request) {
   const PseudoTerminal::Clock::time_point asked = PseudoTerminal::Clock::now();
-  log_.FromHost(reader_.Bytes(), Describe(request));
+  Log().FromHost(reader_.Bytes(), Describe(request));
   if (request.Command == GunCommand::Search) {
     for (LinePiece& piece : trouble_.KeptBack()) {
       sender_.Add(asked, std::move(piece));
@@ -92,11 +77,7 @@ void RadioModem::Serve(const GunRequest& request) {
       sender_.Add(asked + gun->AnswerTime, std::move(piece));
     }
   }
-  {
-    const std::scoped_lock lock(mutex_);
-    traffic_.Requests.push_back(request);
-  }
-  asked_.notify_all();
+  traffic_.Note([&](RadioModemTraffic& traffic) { traffic.Requests.push_back(request); });
 }
 
 const RadioGun* RadioModem::FindGun(std::uint8_t playerId) const {
@@ -112,12 +93,11 @@ void RadioModem::CopyScores(const RadioGun& gun) {
 }
 
 void RadioModem::NoteSent(const LinePiece& piece) {
-  log_.ToHost(piece.Bytes);
+  Log().ToHost(piece.Bytes);
   if (piece.LineEndsBehind) {
-    log_.Note("line pulled out");
+    Log().Note("line pulled out");
   }
-  const std::scoped_lock lock(mutex_);
-  traffic_.BytesToHost += piece.Bytes.size();
+  traffic_.Note([&](RadioModemTraffic& traffic) { traffic.BytesToHost += piece.Bytes.size(); });
 }
 
 }  // namespace sim

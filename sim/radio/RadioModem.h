@@ -1,19 +1,15 @@
 #pragma once
 
 #include <chrono>
-#include <condition_variable>
 #include <cstddef>
 #include <cstdint>
-#include <mutex>
 #include <ostream>
 #include <set>
 #include <string>
-#include <thread>
 #include <vector>
 
+#include "sim/line/Device.h"
 #include "sim/line/PacedSender.h"
-#include "sim/line/PseudoTerminal.h"
-#include "sim/line/WireLog.h"
 #include "sim/radio/GunRequest.h"
 #include "sim/radio/RadioGun.h"
 #include "sim/radio/RadioTrouble.h"
@@ -40,19 +36,13 @@ struct RadioModemTraffic {
 /// The radio modem, in API mode without escaping on a line of 57600 baud, and the guns in its range. Both
 /// directions run at once: a gun answers its time after the last bit of the request, or later while the line
 /// is busy with another's answer. The guns keep their scores, so a host may close them and fetch them again.
-class RadioModem {
+class RadioModem : public Device {
  public:
   /// Throws std::system_error when the system grants no pseudo terminal, and std::invalid_argument when there
   /// is no gun that the trouble could strike. The streams must outlive the modem.
   explicit RadioModem(RadioModemSettings settings);
-  ~RadioModem();
-  RadioModem(const RadioModem&) = delete;
-  RadioModem& operator=(const RadioModem&) = delete;
 
-  /// The device that the host opens.
-  const std::string& DevicePath() const { return terminal_.SlavePath(); }
-
-  RadioModemTraffic Traffic() const;
+  RadioModemTraffic Traffic() const { return traffic_.Copy(); }
 
   /// Waits until `count` requests and faults have come; false when `limit` passes first.
   bool WaitUntilAsked(std::size_t count, std::chrono::milliseconds limit) const;
@@ -68,17 +58,11 @@ class RadioModem {
 
   RadioModemSettings settings_;
   RadioTrouble trouble_;
-  PseudoTerminal terminal_;
   PacedSender sender_;
-  WireLog log_;
   TransmitRequestReader reader_;
   std::set<std::uint8_t> closed_;
-
-  mutable std::mutex mutex_;
-  mutable std::condition_variable asked_;
-  RadioModemTraffic traffic_;
-
-  std::thread thread_;
+  TrafficRecord<RadioModemTraffic> traffic_;
+  Serving serving_{*this, [this] { Run(); }};
 };
 
 }  // namespace sim

@@ -6,44 +6,24 @@
 #include <array>
 #include <cerrno>
 #include <csignal>
-#include <cstdint>
 #include <exception>
-#include <fstream>
 #include <functional>
 #include <iostream>
-#include <optional>
 #include <stdexcept>
 #include <string>
 #include <system_error>
-#include <utility>
 #include <vector>
 
-#include "sim/baseunit/BaseUnit.h"
-#include "sim/game/GameMaker.h"
-#include "sim/line/DeviceLink.h"
 #include "sim/line/FileDescriptor.h"
 #include "sim/line/LineInput.h"
-#include "sim/onewire/ButtonCommands.h"
-#include "sim/onewire/OneWireAdapter.h"
-#include "sim/radio/RadioGun.h"
-#include "sim/radio/RadioModem.h"
+#include "sim/venue/Venue.h"
 #include "sim/venue/VenueOptions.h"
+#include "sim/venue/VenueUsage.h"
 
 namespace {
 
 constexpr int exitFailure = 1;
 constexpr int exitBadOptions = 2;
-
-std::optional<std::ofstream> OpenOutput(const std::optional<std::string>& path) {
-  if (!path) {
-    return std::nullopt;
-  }
-  std::ofstream file(*path, std::ios::binary | std::ios::trunc);
-  if (!file) {
-    throw std::runtime_error("Cannot write " + *path);
-  }
-  return file;
-}
 
 // Must run before the first thread starts, so that no thread is ended by the signals that end the program.
 sim::FileDescriptor CatchEndSignals() {
@@ -94,9 +74,9 @@ void WaitForEnd(const sim::FileDescriptor& endSignals, const sim::FileDescriptor
   }
 }
 
-void ObeyAndTell(sim::OneWireAdapter& adapter, const std::string& line) {
+void ObeyAndTell(sim::Venue& venue, const std::string& line) {
   try {
-    const std::string done = sim::ObeyButtonCommand(adapter, line);
+    const std::string done = venue.Obey(line);
     if (!done.empty()) {
       std::cout << done << std::endl;
     }
@@ -105,85 +85,20 @@ void ObeyAndTell(sim::OneWireAdapter& adapter, const std::string& line) {
   }
 }
 
-// The radio modem with its link and the copy of its guns' frames.
-class ServedModem {
- public:
-  ServedModem(const sim::VenueOptions& options, sim::Pace pace, std::ostream* log)
-      : frames_(OpenOutput(options.RadioFramesFile)),
-        modem_({.Guns =
-                    sim::MakeRadioGuns(sim::MakeGame(options.Players, options.Seed), options.RadioAnswerTime),
-                .Trouble = options.RadioTrouble,
-                .LinePace = pace,
-                .Log = log,
-                .Frames = frames_ ? &*frames_ : nullptr}) {
-    if (options.RadioLink) {
-      link_.emplace(*options.RadioLink, modem_.DevicePath());
-    }
-  }
-
-  const std::string& DevicePath() const { return modem_.DevicePath(); }
-
-  void TellFaults() const {
-    const std::vector<std::string> faults = modem_.Traffic().Faults;
-    for (const std::string& fault : faults) {
-      std::cerr << "radio modem: the host sent " << fault << '\n';
-    }
-    std::cerr << "radio modem: faults of the host: " << faults.size() << '\n';
-  }
-
- private:
-  std::optional<std::ofstream> frames_;
-  sim::RadioModem modem_;
-  std::optional<sim::DeviceLink> link_;
-};
-
-void Serve(const sim::VenueOptions& options, sim::BaseUnitAnswer answer) {
+void Serve(const sim::VenueOptions& options) {
   const sim::FileDescriptor endSignals = CatchEndSignals();
   const sim::FileDescriptor finished(::eventfd(0, EFD_CLOEXEC));
   if (!endSignals.IsOpen() || !finished.IsOpen()) {
     throw std::system_error(errno, std::generic_category(), "signals");
   }
-  std::optional<std::ofstream> log = OpenOutput(options.LogFile);
-  std::optional<std::ofstream> frames = OpenOutput(options.FramesFile);
-  const sim::Pace pace = options.Fast ? sim::Pace::Fast : sim::Pace::AsWired;
-  sim::BaseUnit baseUnit({.Answer = std::move(answer),
-                          .LinePace = pace,
-                          .Requests = options.Games,
-                          .Log = log ? &*log : nullptr,
-                          .Frames = frames ? &*frames : nullptr,
-                          .OnFinished = [&finished] { ::eventfd_write(finished.Get(), 1); }});
-  std::optional<sim::DeviceLink> link;
-  if (options.Link) {
-    link.emplace(*options.Link, baseUnit.DevicePath());
-  }
-  std::optional<sim::OneWireAdapter> oneWire;
-  std::optional<sim::DeviceLink> oneWireLink;
+  sim::Venue venue(options, [&finished] { ::eventfd_write(finished.Get(), 1); });
   std::function<void(const std::string&)> obey;
-  if (options.OneWire) {
-    oneWire.emplace(sim::OneWireAdapterSettings{.Failure = options.AdapterFailure,
-                                                .FailurePlace = options.AdapterFailurePlace,
-                                                .LinePace = pace,
-                                                .Log = log ? &*log : nullptr});
-    if (options.AdapterLink) {
-      oneWireLink.emplace(*options.AdapterLink, oneWire->DevicePath());
-    }
-    obey = [&adapter = *oneWire](const std::string& line) { ObeyAndTell(adapter, line); };
+  if (venue.TakesCommands()) {
+    obey = [&venue](const std::string& line) { ObeyAndTell(venue, line); };
   }
-  std::optional<ServedModem> modem;
-  if (options.Radio) {
-    modem.emplace(options, pace, log ? &*log : nullptr);
-  }
-  std::cout << "base unit: " << baseUnit.DevicePath() << std::endl;
-  if (oneWire) {
-    std::cout << "1-wire adapter: " << oneWire->DevicePath() << std::endl;
-  }
-  if (modem) {
-    std::cout << "radio modem: " << modem->DevicePath() << std::endl;
-  }
+  venue.TellDevices(std::cout);
   WaitForEnd(endSignals, finished, options.UntilEof, obey);
-  if (modem) {
-    modem->TellFaults();
-  }
+  venue.TellHostFaults(std::cerr);
 }
 
 }  // namespace
@@ -195,8 +110,7 @@ int main(int argc, char** argv) {
       std::cout << sim::VenueUsage();
       return 0;
     }
-    Serve(options, sim::MakeBaseUnitAnswer(sim::MakeGame(options.Players, options.Seed), options.Failure,
-                                           options.FailurePlace));
+    Serve(options);
     return 0;
   } catch (const std::invalid_argument& failure) {
     Complain(failure);

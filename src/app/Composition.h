@@ -4,6 +4,9 @@
 
 #include "app/ConversionWithProgress.h"
 #include "app/Services.h"
+#include "core/data/LoggedBoxes.h"
+#include "core/data/ProgramLog.h"
+#include "core/line/LoggedPort.h"
 #include "core/text/StringTable.h"
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
@@ -16,6 +19,7 @@
 #include "platform/qt/QtSerialDevices.h"
 #include "platform/qt/QtSerialPort.h"
 #include "platform/sqlite/SqliteDatabase.h"
+#include "ui/DialogParent.h"
 
 /// The real parts of the platform, put together for one run of the program. Needs a QApplication.
 class Composition {
@@ -25,9 +29,10 @@ class Composition {
   ::Services Services();
 
   /// Boxes and dialogs belong to `window` while no other window is active.
-  void SetMainWindow(QWidget* window);
+  void SetMainWindow(QWidget* window) { parent_.SetMainWindow(window); }
 
   MessageBoxes& Boxes() { return boxes_; }
+  ProgramLog& Log() { return log_; }
 
  private:
   std::string SwipeButton();
@@ -38,18 +43,30 @@ class Composition {
   SqliteEngine databases_;
   ConversionWithProgress old_{strings_};
   QtEventPump events_;
-  QtFileDialog fileDialog_;
+  DialogParent parent_;
+  QtFileDialog fileDialog_{[this] { return parent_.Window(); }};
   LinuxFiles files_;
   QtFolders folders_;
-  QtMessageBoxes boxes_;
+  ProgramLog log_;
+  QtMessageBoxes shownBoxes_{[this] { return parent_.Window(); }};
+  LoggedBoxes boxes_{shownBoxes_, log_};
   QtSerialDevices devices_;
+  const std::string logFolder_;
   QtSerialPort port_;
+  LoggedPort loggedPort_{port_,
+                         {.Disk = files_,
+                          .Folder = logFolder_,
+                          .Elapsed = events_,
+                          .Time = clock_,
+                          .OnOpening = [this](const std::string& device, const std::string& settings,
+                                              int fault) { log_.PortOpening(device, settings, fault); }},
+                         "line"};
   QtSerialPort readerPort_;
+  LoggedPort loggedReaderPort_{readerPort_,
+                               {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_},
+                               "1-wire",
+                               Transcript::Repeats::Counted};
   IniReader readerSettings_;
-  SerialOneWire wire_{readerPort_, events_, readerSettings_, devices_};
+  SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
-  QWidget* mainWindow_ = nullptr;
 };
-
-/// Name, icon and look of the application; call once before the first window.
-void PrepareApplication();

@@ -1,9 +1,16 @@
 #include "app/Program.h"
 
+#include <QApplication>
+
+#include "app/SystemFacts.h"
 #include "platform/ErrorReport.h"
+#include "ui/CommandEvent.h"
+#include "ui/Look.h"
 
 Program::Program() {
-  PrepareApplication();
+  PrepareLook();
+  composition_.Log().Started(SystemFacts());
+  qApp->installEventFilter(this);
   window_.emplace(composition_.Services());
   composition_.SetMainWindow(&*window_);
 }
@@ -15,4 +22,17 @@ bool Program::Start() {
   }
   window_->show();
   return true;
+}
+
+int Program::Run() {
+  const int exitCode = Start() ? QApplication::exec() : 1;
+  composition_.Log().Ended(exitCode);
+  return exitCode;
+}
+
+bool Program::eventFilter(QObject* watched, QEvent* event) {
+  if (event->type() == CommandEvent::EventType()) {
+    composition_.Log().Command(static_cast<CommandEvent*>(event)->Name().toStdString());
+  }
+  return QObject::eventFilter(watched, event);
 }

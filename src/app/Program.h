@@ -1,12 +1,13 @@
 #pragma once
 
+#include <QObject>
 #include <optional>
 
 #include "app/Composition.h"
 #include "app/frmRx.h"
 
 /// One run of the program with the real platform. Needs a QApplication.
-class Program {
+class Program : public QObject {
  public:
   Program();
 
@@ -14,7 +15,14 @@ class Program {
   /// told, or when the operator chose to end it.
   bool Start();
 
+  /// Starts, and runs until the main window is closed. Returns the process's exit code.
+  int Run();
+
   frmRx& Window() { return *window_; }
+
+ protected:
+  /// Sees the commands of all windows, for the log.
+  bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
   Composition composition_;

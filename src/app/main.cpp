@@ -4,6 +4,5 @@
 
 int main(int argc, char** argv) {
   QApplication application(argc, argv);
-  Program program;
-  return program.Start() ? QApplication::exec() : 1;
+  return Program().Run();
 }

@@ -5,6 +5,7 @@
 #include <memory>
 
 #include "platform/MessageBoxes.h"
+#include "ui/Commands.h"
 
 namespace Ui {
 class BonusPoints;
@@ -23,6 +24,9 @@ class BonusPoints : public QDialog {
   std::int32_t Value() const { return value_; }
 
  private:
+  void TakeValue();
+
   std::unique_ptr<Ui::BonusPoints> ui_;
   std::int32_t value_;
+  Commands commands_;
 };

@@ -5,7 +5,7 @@
 
 #include "core/data/FieldValue.h"
 #include "core/text/Pieces.h"
-#include "ui/Text.h"
+#include "ui/Captions.h"
 #include "ui_MissionResultEntry.h"
 
 MissionResultEntry::MissionResultEntry(Game& game, MissionList& missions, const StringTable& strings,
@@ -15,7 +15,7 @@ MissionResultEntry::MissionResultEntry(Game& game, MissionList& missions, const 
   sets_ = {{{ui_->TeamA, ui_->PrimaryCompleted1, ui_->SecondaryCompleted1},
             {ui_->TeamB, ui_->PrimaryCompleted2, ui_->SecondaryCompleted2},
             {ui_->TeamC, ui_->PrimaryCompleted3, ui_->SecondaryCompleted3}}};
-  SetCaptions(strings);
+  ShowTexts(strings);
   ShowResults();
   ShowObjectives(missions);
   connect(ui_->OK, &QPushButton::clicked, this, [this] {
@@ -26,23 +26,22 @@ MissionResultEntry::MissionResultEntry(Game& game, MissionList& missions, const 
 
 MissionResultEntry::~MissionResultEntry() = default;
 
-void MissionResultEntry::SetCaptions(const StringTable& strings) {
-  setWindowTitle(Text(strings, 142));
-  ui_->Frame1->setTitle(Text(strings, 143));
-  ui_->Frame2->setTitle(Text(strings, 144));
-  ui_->Frame3->setTitle(Text(strings, 145));
-  for (QLabel* label : {ui_->Label2, ui_->Label3, ui_->Label4}) {
-    label->setText(Text(strings, 113));
-  }
+void MissionResultEntry::ShowTexts(const StringTable& strings) {
+  SetCaptions(strings, {{this, 142},
+                        {ui_->Frame1, 143},
+                        {ui_->Frame2, 144},
+                        {ui_->Frame3, 145},
+                        {ui_->Label2, 113},
+                        {ui_->Label3, 113},
+                        {ui_->Label4, 113},
+                        {ui_->Label1, 148},
+                        {ui_->OK, 140}});
   for (const SetControls& set : sets_) {
-    set.PrimaryCompleted->setText(Text(strings, 146));
-    set.SecondaryCompleted->setText(Text(strings, 147));
+    SetCaptions(strings, {{set.PrimaryCompleted, 146}, {set.SecondaryCompleted, 147}});
     for (QCheckBox* box : {set.PrimaryCompleted, set.SecondaryCompleted}) {
       box->installEventFilter(this);
     }
   }
-  ui_->Label1->setText(Text(strings, 148));
-  ui_->OK->setText(Text(strings, 140));
 }
 
 void MissionResultEntry::ShowResults() {

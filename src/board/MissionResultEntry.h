@@ -35,7 +35,7 @@ class MissionResultEntry : public QDialog {
     QCheckBox* SecondaryCompleted;
   };
 
-  void SetCaptions(const StringTable& strings);
+  void ShowTexts(const StringTable& strings);
   void ShowResults();
   void ShowObjectives(MissionList& missions);
   void StoreResults();

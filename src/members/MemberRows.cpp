@@ -2,10 +2,6 @@
 
 #include "platform/RuntimeError.h"
 
-namespace {
-constexpr int RecordIsDeleted = 3167;
-}
-
 MemberRows::MemberRows(Database& dbMembers, BoundControls& controls)
     : dbMembers_(dbMembers), controls_(controls), rows_(dbMembers.OpenRecordset("Members")) {}
 
@@ -85,8 +81,8 @@ void MemberRows::WriteBack() {
     SetChanges(*rows_, shown_, entered);
     Update();
   } catch (const RuntimeError& error) {
-    if (error.Number() == RecordIsDeleted) {
-      shown_ = entered;  // or the cursor could never leave the place
+    if (error.Number() == Fault::RecordDeleted) {
+      shown_ = entered;  // gives up the change, or the cursor could never leave this row
     }
     throw;
   }

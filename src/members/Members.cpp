@@ -47,22 +47,25 @@ void Show(QLineEdit& entry, const std::string& text) {
 
 }  // namespace
 
-Members::Members(Needs needs, QWidget* parent)
-    : QDialog(parent), ui_(std::make_unique<Ui::Members>()), needs_(std::move(needs)) {
+Members::Members(Parts parts, QWidget* parent)
+    : QDialog(parent),
+      ui_(std::make_unique<Ui::Members>()),
+      parts_(std::move(parts)),
+      commands_(*this, parts_.Boxes) {
   ui_->setupUi(this);
   ui_->Dummy->hide();
-  ui_->ChangeID->setEnabled(needs_.ButtonSwipe != nullptr);
+  ui_->ChangeID->setEnabled(parts_.ButtonSwipe != nullptr);
   ui_->SearchText->installEventFilter(this);
   SetCaptions();
   BoundControls& controls = *this;
-  data1_.emplace(needs_.DbMembers, controls);
+  data1_.emplace(parts_.DbMembers, controls);
   ConnectCommands();
 }
 
 Members::~Members() = default;
 
 void Members::SetCaptions() {
-  const StringTable& strings = needs_.Strings;
+  const StringTable& strings = parts_.Strings;
   ui_->SearchText->setPlaceholderText(Text(strings, OwnText::NameToSearchFor));
   ui_->MemberPhoto->setAccessibleName(Text(strings, OwnText::Photo));
   ui_->DOBPicker->SetCalendarName(Text(strings, OwnText::Calendar));
@@ -79,39 +82,21 @@ void Members::SetCaptions() {
 }
 
 void Members::ConnectCommands() {
-  const std::pair<QAbstractButton*, void (Members::*)()> commands[] = {
-      {ui_->Search, &Members::RunSearch},        {ui_->ClearSearch, &Members::RunClearSearch},
-      {ui_->NewMember, &Members::AddMember},     {ui_->Delete, &Members::DeleteMember},
-      {ui_->ChangeID, &Members::ChangeMemberId}, {ui_->ChangePicture, &Members::ChangeMemberPicture},
-      {ui_->OK, &Members::SelectMember},
-  };
-  for (const auto& entry : commands) {
-    const auto command = entry.second;
-    ConnectButton(*entry.first, [this, command] { (this->*command)(); });
-  }
-  const std::pair<QAbstractButton*, void (MemberRows::*)()> arrows[] = {
-      {ui_->DataFirst, &MemberRows::MoveFirst},
-      {ui_->DataPrevious, &MemberRows::MovePrevious},
-      {ui_->DataNext, &MemberRows::MoveNext},
-      {ui_->DataLast, &MemberRows::MoveLast},
-  };
-  for (const auto& entry : arrows) {
-    const auto move = entry.second;
-    ConnectButton(*entry.first, [this, move] { ((*data1_).*move)(); });
-  }
-}
-
-// A button that is pressed by other means than the mouse takes the focus, too: or the search box, left after
-// the command, would go back to the first member.
-void Members::ConnectButton(QAbstractButton& button, const std::function<void()>& command) {
-  connect(&button, &QAbstractButton::clicked, this, [this, &button, command] {
-    button.setFocus();
-    Run(command);
-  });
-}
-
-void Members::Run(const std::function<void()>& command) {
-  ReportErrors(needs_.Boxes, command);
+  commands_.Connect(*this, {
+                               {ui_->Search, &Members::RunSearch},
+                               {ui_->ClearSearch, &Members::RunClearSearch},
+                               {ui_->NewMember, &Members::AddMember},
+                               {ui_->Delete, &Members::DeleteMember},
+                               {ui_->ChangeID, &Members::ChangeMemberId},
+                               {ui_->ChangePicture, &Members::ChangeMemberPicture},
+                               {ui_->OK, &Members::SelectMember},
+                           });
+  commands_.Connect(*data1_, {
+                                 {ui_->DataFirst, &MemberRows::MoveFirst},
+                                 {ui_->DataPrevious, &MemberRows::MovePrevious},
+                                 {ui_->DataNext, &MemberRows::MoveNext},
+                                 {ui_->DataLast, &MemberRows::MoveLast},
+                             });
 }
 
 void Members::RunInFocusChange(const std::function<void()>& command) {
@@ -119,7 +104,7 @@ void Members::RunInFocusChange(const std::function<void()>& command) {
     command();
   } catch (const RuntimeError& error) {
     QTimer::singleShot(0, this, [this, number = error.Number(), text = std::string(error.what())] {
-      ShowErrorReport(needs_.Boxes, number, text);
+      ShowErrorReport(parts_.Boxes, number, text);
     });
   }
 }
@@ -127,7 +112,7 @@ void Members::RunInFocusChange(const std::function<void()>& command) {
 void Members::showEvent(QShowEvent* event) {
   QDialog::showEvent(event);
   if (!event->spontaneous()) {
-    Run([this] { Activate(); });
+    commands_.Run([this] { Activate(); });
   }
 }
 
@@ -135,7 +120,7 @@ void Members::Activate() {
   RunClearSearch();
   if (ContactToShow != 0) {
     data1_->WalkTo(ContactToShow);
-    // Leaving the search box would go back to the first member.
+    // The search box must not get the focus: leaving it would go back to the first member.
     QWidget* const focus = data1_->HasRow() ? static_cast<QWidget*>(ui_->FirstNameEntry) : ui_->DataPrevious;
     focus->setFocus();
   } else {
@@ -143,13 +128,14 @@ void Members::Activate() {
   }
 }
 
-// Escape and the close box unload the window.
+// Called by Escape and the close box.
 void Members::reject() {
-  Run([this] { RunClearSearch(); });
+  commands_.Run([this] { RunClearSearch(); });
   QDialog::reject();
 }
 
-// Who presses Search leaves the box by it, and a text that is no query is told of once.
+// Does not count a click on Search as leaving, since it runs the search itself: a malformed query is then
+// reported once, not twice.
 bool Members::IsLeaving(Qt::FocusReason reason) const {
   const bool toSearch = focusWidget() == ui_->Search && reason != Qt::TabFocusReason;
   return !toSearch && reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
@@ -159,7 +145,7 @@ bool Members::eventFilter(QObject* watched, QEvent* event) {
   if (watched == ui_->SearchText && event->type() == QEvent::KeyPress) {
     const int key = static_cast<QKeyEvent*>(event)->key();
     if (key == Qt::Key_Return || key == Qt::Key_Enter) {
-      Run([this] { RunSearch(); });  // and not OK, which would choose the member in view
+      commands_.Run([this] { RunSearch(); });  // instead of OK, which would choose the member in view
       return true;
     }
   }
@@ -258,9 +244,9 @@ void Members::ReadPhoto() {
 
 void Members::PreviewPhoto(const std::string& file) {
   try {
-    ui_->MemberPhoto->Load(needs_.Disk.Read(file));
+    ui_->MemberPhoto->Load(parts_.Disk.Read(file));
   } catch (const RuntimeError&) {
-    ui_->MemberPhoto->Clear();  // storing it will say why
+    ui_->MemberPhoto->Clear();  // storing the photo will report why
   }
 }
 
@@ -275,14 +261,14 @@ void Members::RunClearSearch() {
 }
 
 void Members::AddMember() {
-  data1_->AddMember(needs_.Time.Now());
+  data1_->AddMember(parts_.Time.Now());
   ui_->FirstNameEntry->setFocus();
   ui_->FirstNameEntry->selectAll();
 }
 
 void Members::DeleteMember() {
   const BoxAnswer answer =
-      needs_.Boxes.Show("This will delete the Member. Are you Sure?", needs_.Strings.Text(124),
+      parts_.Boxes.Show("This will delete the Member. Are you Sure?", parts_.Strings.Text(124),
                         BoxIcon::Question, BoxButtons::OkCancel);
   if (answer == BoxAnswer::Ok) {
     data1_->Delete();
@@ -291,7 +277,7 @@ void Members::DeleteMember() {
 }
 
 void Members::ChangeMemberId() {
-  const std::string dallasId = needs_.ButtonSwipe();
+  const std::string dallasId = parts_.ButtonSwipe();
   if (dallasId != NoDallasId) {
     data1_->SetField("DallasID", dallasId);
     ui_->MemberIDDisplay->setText(QString::fromStdString(dallasId));
@@ -300,20 +286,20 @@ void Members::ChangeMemberId() {
 
 void Members::ChangeMemberPicture() {
   if (!data1_->HasRow()) {
-    throw RuntimeError(3021);
+    throw RuntimeError(Fault::NoCurrentRecord);
   }
   data1_->WriteBack();
-  const std::string file =
-      needs_.CommonDialog1.ShowOpen("Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif", "");
-  if (file.empty()) {
+  const std::optional<std::string> file =
+      parts_.CommonDialog1.ShowOpen({.Filter = "Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif"});
+  if (!file) {
     ShowMemberExtras();
     return;
   }
   Recordset& rows = data1_->Rows();
   try {
-    PreviewPhoto(file);
+    PreviewPhoto(*file);
     rows.Edit();
-    StorePhoto(file, rows, "Photograph", "PhotographLength", needs_.Disk, needs_.Boxes);
+    StorePhoto(*file, rows, "Photograph", "PhotographLength", parts_.Disk, parts_.Boxes);
     rows.Update();
   } catch (const RuntimeError&) {
     if (rows.EditMode() != EditMode::None) {

@@ -13,34 +13,35 @@
 #include "platform/FileDialog.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
-
-class QAbstractButton;
+#include "ui/Commands.h"
 
 namespace Ui {
 class Members;
 }
 
-/// The members: searched, looked through, edited, and one of them chosen with OK. Has a cursor of its own on
-/// the table; the one of the board sees its changes of rows, but not its new rows.
+/// The window in which members are searched, browsed and edited, and one of them chosen with OK. It has its
+/// own cursor on the table; the board's cursor sees rows changed here, but not rows added here.
 class Members : public QDialog, private BoundControls {
   Q_OBJECT
 
  public:
-  struct Needs {
+  /// What the window works with; it outlives it.
+  struct Parts {
     Database& DbMembers;
     MessageBoxes& Boxes;
     FileDialog& CommonDialog1;
     const Files& Disk;
     const Clock& Time;
     const StringTable& Strings;
-    /// Waits for a membership button; its number, or NoDallasId. May be empty where there is no reader.
-    std::function<std::string()> ButtonSwipe;
+    /// Waits for a membership button and returns its number, or NoDallasId. May be empty if there is no
+    /// reader.
+    std::function<std::string()> ButtonSwipe = {};
   };
 
-  Members(Needs needs, QWidget* parent);
+  Members(Parts parts, QWidget* parent);
   ~Members() override;
 
-  std::int32_t ContactToShow = 0;  ///< member to stand on when the window comes up, 0 for none
+  std::int32_t ContactToShow = 0;  ///< member to show when the window opens, 0 for the first
   std::string SelectedContact;     ///< `ContactID` of the member chosen with OK, else empty
 
   void reject() override;
@@ -57,9 +58,8 @@ class Members : public QDialog, private BoundControls {
 
   void SetCaptions();
   void ConnectCommands();
-  void ConnectButton(QAbstractButton& button, const std::function<void()>& command);
-  void Run(const std::function<void()>& command);
-  /// As Run, but a failure is told only when the present event is over.
+  /// Runs a command, but reports a failure only after the current event: a box must not open during a focus
+  /// change.
   void RunInFocusChange(const std::function<void()>& command);
   void SetEntriesEnabled(bool enabled);
   void ShowPlace();
@@ -78,6 +78,7 @@ class Members : public QDialog, private BoundControls {
   void SelectMember();
 
   std::unique_ptr<Ui::Members> ui_;
-  const Needs needs_;
+  const Parts parts_;
+  Commands commands_;
   std::optional<MemberRows> data1_;
 };

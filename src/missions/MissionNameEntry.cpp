@@ -1,16 +1,14 @@
 #include "missions/MissionNameEntry.h"
 
+#include "ui/Captions.h"
+#include "ui/Text.h"
 #include "ui_MissionNameEntry.h"
 
 MissionNameEntry::MissionNameEntry(const StringTable& strings, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::MissionNameEntry>()) {
   ui_->setupUi(this);
-  const auto text = [&strings](int number) { return QString::fromStdString(strings.Text(number)); };
-  ui_->Label1->setText(text(138));
-  setWindowTitle(text(139));
-  ui_->OK->setText(text(140));
-  ui_->Cancel->setText(text(141));
-  ui_->MissionEntry->setText(text(139));
+  SetCaptions(strings, {{ui_->Label1, 138}, {this, 139}, {ui_->OK, 140}, {ui_->Cancel, 141}});
+  ui_->MissionEntry->setText(Text(strings, 139));
   ui_->MissionEntry->selectAll();
 }
 

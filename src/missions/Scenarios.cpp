@@ -8,12 +8,13 @@
 #include "core/data/Rows.h"
 #include "core/text/NumberForms.h"
 #include "missions/MissionNameEntry.h"
-#include "platform/ErrorReport.h"
+#include "ui/Captions.h"
+#include "ui/Text.h"
 #include "ui_Scenarios.h"
 
 namespace {
 
-/// Texts are stored with the line breaks that they always had.
+/// The text with CR LF line breaks, as missions have always been stored.
 std::string TextIn(const QPlainTextEdit& box) {
   return box.toPlainText().replace(QLatin1Char('\n'), QStringLiteral("\r\n")).toStdString();
 }
@@ -27,7 +28,7 @@ void Show(QLineEdit& box, const std::string& text) {
   box.setCursorPosition(0);
 }
 
-/// Read-only entries look like the window behind them.
+/// Read-only entries have the background of the window.
 template <typename Entry>
 void SetReadOnly(Entry& entry, bool flag) {
   entry.setReadOnly(flag);
@@ -43,7 +44,8 @@ Scenarios::Scenarios(Database& dbScenarios, Recordset& rsScenarios, MessageBoxes
       dbScenarios_(dbScenarios),
       rsScenarios_(rsScenarios),
       boxes_(boxes),
-      strings_(strings) {
+      strings_(strings),
+      commands_(*this, boxes) {
   ui_->setupUi(this);
   objectives_ = {{{ui_->PrimaryObjectiveDescription0, ui_->SecondaryObjectiveDescription0,
                    ui_->PrimaryPoints0, ui_->SecondaryPoints0},
@@ -51,7 +53,7 @@ Scenarios::Scenarios(Database& dbScenarios, Recordset& rsScenarios, MessageBoxes
                    ui_->PrimaryPoints1, ui_->SecondaryPoints1},
                   {ui_->PrimaryObjectiveDescription2, ui_->SecondaryObjectiveDescription2,
                    ui_->PrimaryPoints2, ui_->SecondaryPoints2}}};
-  SetCaptions();
+  ShowTexts();
   LoadMissionList();
   SelectMission(0);
   BringToFront(0);
@@ -62,62 +64,55 @@ Scenarios::Scenarios(Database& dbScenarios, Recordset& rsScenarios, MessageBoxes
 
 Scenarios::~Scenarios() = default;
 
-void Scenarios::SetCaptions() {
-  const auto text = [this](int number) { return QString::fromStdString(strings_.Text(number)); };
-  setWindowTitle(text(180));
-  const std::pair<QGroupBox*, int> frames[] = {
-      {ui_->Frame1, 183}, {ui_->Frame2, 184}, {ui_->Frame5, 189}, {ui_->General, 195}};
-  for (const auto& [frame, number] : frames) {
-    frame->setTitle(text(number));
-  }
-  const std::pair<QPushButton*, int> buttons[] = {
-      {ui_->NewButton, 185}, {ui_->Edit, 186}, {ui_->Save, 187}, {ui_->Delete, 188}, {ui_->SelectExit, 140}};
-  for (const auto& [button, number] : buttons) {
-    button->setText(text(number));
-  }
-  const std::pair<QLabel*, int> labels[] = {{ui_->Label2, 190}, {ui_->Label6, 191}, {ui_->Label4, 192},
-                                            {ui_->Label1, 193}, {ui_->Label3, 193}, {ui_->Label5, 194},
-                                            {ui_->Label7, 196}, {ui_->Label8, 197}};
-  for (const auto& [label, number] : labels) {
-    label->setText(text(number));
-  }
+void Scenarios::ShowTexts() {
+  SetCaptions(strings_, {{this, 180},
+                         {ui_->Frame1, 183},
+                         {ui_->Frame2, 184},
+                         {ui_->Frame5, 189},
+                         {ui_->General, 195},
+                         {ui_->NewButton, 185},
+                         {ui_->Edit, 186},
+                         {ui_->Save, 187},
+                         {ui_->Delete, 188},
+                         {ui_->SelectExit, 140},
+                         {ui_->Label2, 190},
+                         {ui_->Label6, 191},
+                         {ui_->Label4, 192},
+                         {ui_->Label1, 193},
+                         {ui_->Label3, 193},
+                         {ui_->Label5, 194},
+                         {ui_->Label7, 196},
+                         {ui_->Label8, 197}});
   for (const int number : {198, 199, 200}) {
-    ui_->ObjectivesTab->addTab(text(number));
+    ui_->ObjectivesTab->addTab(Text(strings_, number));
   }
-  ui_->MissionSelection1->setAccessibleName(text(183));
-  ui_->Description->setAccessibleName(text(184));
-  // A label names its buddy to screen readers only beside it, and these boxes lie on pages of their own.
+  ui_->MissionSelection1->setAccessibleName(Text(strings_, 183));
+  ui_->Description->setAccessibleName(Text(strings_, 184));
+  // Screen readers use a buddy label's text only within the same parent, and these boxes lie on other pages.
   for (const ObjectiveBoxes& boxes : objectives_) {
-    boxes.PrimaryDescription->setAccessibleName(text(192));
-    boxes.PrimaryPoints->setAccessibleName(text(193));
-    boxes.SecondaryDescription->setAccessibleName(text(194));
-    boxes.SecondaryPoints->setAccessibleName(text(193));
-    boxes.PrimaryPoints->setAccessibleDescription(text(192));
-    boxes.SecondaryPoints->setAccessibleDescription(text(194));
+    boxes.PrimaryDescription->setAccessibleName(Text(strings_, 192));
+    boxes.PrimaryPoints->setAccessibleName(Text(strings_, 193));
+    boxes.SecondaryDescription->setAccessibleName(Text(strings_, 194));
+    boxes.SecondaryPoints->setAccessibleName(Text(strings_, 193));
+    boxes.PrimaryPoints->setAccessibleDescription(Text(strings_, 192));
+    boxes.SecondaryPoints->setAccessibleDescription(Text(strings_, 194));
   }
 }
 
 void Scenarios::ConnectCommands() {
-  const std::pair<QPushButton*, void (Scenarios::*)()> commands[] = {
-      {ui_->NewButton, &Scenarios::NewMission},  {ui_->Edit, &Scenarios::EditMission},
-      {ui_->Save, &Scenarios::SaveMission},      {ui_->Delete, &Scenarios::DeleteMission},
-      {ui_->SelectExit, &Scenarios::SelectExit},
-  };
-  for (const auto& entry : commands) {
-    const auto command = entry.second;
-    connect(entry.first, &QPushButton::clicked, this, [this, command] { Run(command); });
-  }
-  connect(ui_->MissionSelection1, &QListWidget::currentRowChanged, this,
-          [this] { Run(&Scenarios::ShowSelectedMission); });
-  // Also on the entry that is current already: what was typed and not saved is replaced.
-  connect(ui_->MissionSelection1, &QListWidget::itemClicked, this,
-          [this] { Run(&Scenarios::ShowSelectedMission); });
+  commands_.Connect(*this, {
+                               {ui_->NewButton, &Scenarios::NewMission},
+                               {ui_->Edit, &Scenarios::EditMission},
+                               {ui_->Save, &Scenarios::SaveMission},
+                               {ui_->Delete, &Scenarios::DeleteMission},
+                               {ui_->SelectExit, &Scenarios::SelectExit},
+                           });
+  const auto show = [this] { commands_.Run([this] { ShowSelectedMission(); }); };
+  connect(ui_->MissionSelection1, &QListWidget::currentRowChanged, this, show);
+  // A click on the entry that is already current also shows its mission again, discarding unsaved changes.
+  connect(ui_->MissionSelection1, &QListWidget::itemClicked, this, show);
   connect(ui_->MissionSelection1, &QListWidget::itemSelectionChanged, this, &Scenarios::FollowSelection);
   connect(ui_->ObjectivesTab, &QTabBar::currentChanged, this, &Scenarios::BringToFront);
-}
-
-void Scenarios::Run(void (Scenarios::*command)()) {
-  ReportErrors(boxes_, [this, command] { (this->*command)(); });
 }
 
 void Scenarios::LoadMissionList() {
@@ -127,7 +122,8 @@ void Scenarios::LoadMissionList() {
   ForEachRow(rsScenarios_, [this] {
     const QString name = QString::fromStdString(TextOf(rsScenarios_.Fields("MissionName")));
     const std::int32_t id = RoundToInt32(NumberOf(rsScenarios_.Fields("ID")));
-    auto entry = std::make_unique<QListWidgetItem>(name);  // a list that holds it already would search it
+    // Added to the list last: setData on an item in a list searches the whole list for it.
+    auto entry = std::make_unique<QListWidgetItem>(name);
     entry->setData(Qt::UserRole, id);
     ui_->MissionSelection1->addItem(entry.release());
   });
@@ -149,7 +145,7 @@ void Scenarios::ShowSelectedMission() {
   }
 }
 
-// A screen reader selects an entry without making it the current one.
+// Screen readers select an entry without making it the current one.
 void Scenarios::FollowSelection() {
   const QList<QListWidgetItem*> selected = ui_->MissionSelection1->selectedItems();
   if (!selected.isEmpty()) {
@@ -241,7 +237,7 @@ void Scenarios::NewMission() {
     return;
   }
   {
-    const QSignalBlocker blocker(ui_->MissionSelection1);  // there is no row to show yet
+    const QSignalBlocker blocker(ui_->MissionSelection1);  // the entry has no row to show yet
     ui_->MissionSelection1->addItem(QString::fromStdString(name));
     ui_->MissionSelection1->setCurrentRow(ui_->MissionSelection1->count() - 1);
   }
@@ -298,10 +294,10 @@ void Scenarios::StartRow() {
     rsScenarios_.AddNew();
     isNewRecord_ = false;
   } else if (rsScenarios_.EditMode() != EditMode::Add) {
-    // A row whose insertion failed is still to be added; any other save must meet the row that the list
-    // shows.
+    // After a failed insertion the new row is still pending. Any other save goes to the row selected in the
+    // list.
     if (!FindSelectedMission()) {
-      throw RuntimeError(3021);
+      throw RuntimeError(Fault::NoCurrentRecord);
     }
     rsScenarios_.Edit();
   }

@@ -7,8 +7,11 @@
 #include "platform/MessageBoxes.h"
 #include "platform/RuntimeError.h"
 
+/// The number follows.
+inline constexpr const char* ErrorReportStart = "Run-time error '";
+
 inline void ShowErrorReport(MessageBoxes& boxes, int number, const std::string& text) {
-  boxes.Show("Run-time error '" + std::to_string(number) + "': " + text, DefaultBoxTitle, BoxIcon::Critical);
+  boxes.Show(ErrorReportStart + std::to_string(number) + "': " + text, DefaultBoxTitle, BoxIcon::Critical);
 }
 
 /// Runs a command of the operator. A failure that nothing below has a behaviour for ends the command with a
@@ -21,9 +24,10 @@ bool ReportErrors(MessageBoxes& boxes, Command&& command) {
   } catch (const RuntimeError& error) {
     ShowErrorReport(boxes, error.Number(), error.what());
   } catch (const std::bad_alloc&) {
-    ShowErrorReport(boxes, 7, "Out of memory");
+    ShowErrorReport(boxes, Fault::OutOfMemory, std::string(Fault::TextOf(Fault::OutOfMemory)));
   } catch (const std::exception& error) {
-    ShowErrorReport(boxes, 51, std::string("Internal error: ") + error.what());
+    ShowErrorReport(boxes, Fault::InternalError,
+                    std::string(Fault::TextOf(Fault::InternalError)) + ": " + error.what());
   }
   return false;
 }

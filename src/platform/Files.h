@@ -33,6 +33,13 @@ class Files {
   /// Writes the whole file in place, neither atomic nor durable: for temporary files. Throws as Replace does.
   virtual void Write(const std::string& path, const std::string& bytes) = 0;
 
+  /// Adds bytes at the end of a file, which is made when missing; not durable. Throws as Replace does.
+  virtual void Append(const std::string& path, const std::string& bytes) = 0;
+
+  /// Bytes that this user may still write on the disk that `path`, a file or folder, lies on. Throws
+  /// RuntimeError 76 when there is no such path.
+  virtual std::uint64_t FreeSpace(const std::string& path) const = 0;
+
   /// Names of the files in a folder, in ascending order; none when there is no such folder.
   virtual std::vector<std::string> FileNames(const std::string& folder) const = 0;
 

@@ -18,9 +18,9 @@ struct OneWireState {
 using OneWireRom = std::array<std::int16_t, 8>;
 
 /// The 1-Wire bus behind the reader's adapter. A session has the adapter to itself; only one is open at a
-/// time. A line or an adapter that fails in a session makes the operations find nothing, and the next session
-/// fails to start. Operations take a handle of an open session and do nothing on any other. A driver that
-/// cannot work at all may throw; no operation hangs.
+/// time. A line or an adapter that fails in a session makes the operations fail, and the next session does
+/// not start. Operations take a handle of an open session and do nothing on any other. A driver that cannot
+/// work at all may throw; no operation hangs.
 class OneWire {
  public:
   virtual ~OneWire() = default;
@@ -37,8 +37,15 @@ class OneWire {
   /// Prepares the bus. 1 when done.
   virtual std::int16_t TMSetup(std::int32_t handle) = 0;
 
-  /// Goes on to the next device. 1 when there is one; it is then selected, and its number passed its CRC. 0
-  /// behind the last one, without any device and after a bad read; the next call begins at the first again.
+  /// Results of TMNext.
+  static constexpr std::int16_t DeviceFound = 1;
+  static constexpr std::int16_t EndOfBus = 0;
+  static constexpr std::int16_t BadRead = -1;  ///< drivers may give any negative number
+
+  /// Goes on to the next device. DeviceFound when there is one; it is then selected, and its number passed
+  /// its CRC. EndOfBus at the end of the bus: behind the last one, and at once on a bus without any. Negative
+  /// when nobody can tell: a bad read, a line or an adapter that failed, no session. After anything but 1 the
+  /// next call begins at the first device again.
   virtual std::int16_t TMNext(std::int32_t handle, OneWireState& state) = 0;
 
   /// Reads the number of the device that the walk stands on. Element 0 of `rom` is 0 to ask for that. 1 when

@@ -1,12 +1,8 @@
 #include "settings/Settings.h"
 
-#include <QFocusEvent>
-#include <QTimer>
-
 #include "core/line/EnumPorts.h"
 #include "core/text/NumberForms.h"
-#include "platform/ErrorReport.h"
-#include "ui/Text.h"
+#include "ui/Captions.h"
 #include "ui_Settings.h"
 
 namespace {
@@ -15,18 +11,20 @@ constexpr std::int16_t HighestListedPort = 100;
 
 Settings::Settings(IniReader& ini, const SerialDevices& devices, MessageBoxes& boxes,
                    const StringTable& strings, QWidget* parent)
-    : QDialog(parent), ui_(std::make_unique<Ui::Settings>()), ini_(ini), boxes_(boxes) {
+    : QDialog(parent),
+      ui_(std::make_unique<Ui::Settings>()),
+      ini_(ini),
+      commands_(*this, boxes),
+      checks_(commands_, boxes) {
   ui_->setupUi(this);
-  setWindowTitle(Text(strings, 160));
-  ui_->Frame1->setTitle(Text(strings, 161));
-  ui_->SaveExit->setText(Text(strings, 162));
-  ui_->Cancel->setText(Text(strings, 141));
+  SetCaptions(strings, {{this, 160}, {ui_->Frame1, 161}, {ui_->SaveExit, 162}, {ui_->Cancel, 141}});
   ui_->CommPortNumber->setText(QString::fromStdString(ini_.ReadIni(Keys::CommPort)));
   ui_->CommPortNumber->selectAll();
-  ui_->CommPortNumber->installEventFilter(this);
   ListAvailablePorts(devices);
-  connect(ui_->SaveExit, &QPushButton::clicked, this,
-          [this] { ReportErrors(boxes_, [this] { SaveAndExit(); }); });
+  checks_.Add(*ui_->CommPortNumber, [this] { return FaultOfPortNumber(); });
+  checks_.LeaveFreelyFor(*ui_->SaveExit);
+  checks_.LeaveFreelyFor(*ui_->Cancel);
+  commands_.Connect(*this, {{ui_->SaveExit, &Settings::SaveAndExit}});
 }
 
 Settings::~Settings() = default;
@@ -43,39 +41,19 @@ void Settings::ListAvailablePorts(const SerialDevices& devices) {
   }
 }
 
-bool Settings::eventFilter(QObject* watched, QEvent* event) {
-  if (watched == ui_->CommPortNumber && event->type() == QEvent::FocusOut) {
-    const auto reason = static_cast<QFocusEvent*>(event)->reason();
-    const bool staysInWindow = reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
-    // Save checks by itself, Cancel never does; a box opened in the middle of a focus change would upset
-    // both.
-    const bool leavesForButton = ui_->SaveExit->hasFocus() || ui_->Cancel->hasFocus();
-    if (isVisible() && staysInWindow && !leavesForButton) {
-      QTimer::singleShot(0, this, [this] { ReportErrors(boxes_, [this] { ValidateCommPortNumber(); }); });
-    }
-  }
-  return QDialog::eventFilter(watched, event);
-}
-
-bool Settings::ValidateCommPortNumber() {
+std::optional<EntryFault> Settings::FaultOfPortNumber() const {
   const std::string text = ui_->CommPortNumber->text().toStdString();
-  const char* message = nullptr;
   if (!IsNumeric(text)) {
-    message = "Please enter a valid number";
-  } else if (ToInt16(text) < 1) {
-    message = "Please enter a valid number (greater than 0)";
+    return EntryFault{"Please enter a valid number"};
   }
-  if (message == nullptr) {
-    return true;
+  if (ToInt16(text) < 1) {
+    return EntryFault{"Please enter a valid number (greater than 0)"};
   }
-  boxes_.Show(message, DefaultBoxTitle, BoxIcon::Critical);
-  ui_->CommPortNumber->setFocus();
-  ui_->CommPortNumber->selectAll();
-  return false;
+  return std::nullopt;
 }
 
 void Settings::SaveAndExit() {
-  if (ValidateCommPortNumber()) {
+  if (checks_.Holds(*ui_->CommPortNumber)) {
     ini_.WriteIni(Keys::CommPort, Str(std::int32_t{ToInt16(ui_->CommPortNumber->text().toStdString())}));
     accept();
   }

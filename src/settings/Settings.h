@@ -2,11 +2,14 @@
 
 #include <QDialog>
 #include <memory>
+#include <optional>
 
 #include "core/data/IniReader.h"
 #include "core/text/StringTable.h"
 #include "platform/MessageBoxes.h"
 #include "platform/SerialDevices.h"
+#include "ui/Commands.h"
+#include "ui/EntryChecks.h"
 
 namespace Ui {
 class Settings;
@@ -21,16 +24,13 @@ class Settings : public QDialog {
            QWidget* parent);
   ~Settings() override;
 
- protected:
-  bool eventFilter(QObject* watched, QEvent* event) override;
-
  private:
   void ListAvailablePorts(const SerialDevices& devices);
-  /// The check made when the entry is left: says what is wrong, keeps the focus there, and returns false.
-  bool ValidateCommPortNumber();
+  std::optional<EntryFault> FaultOfPortNumber() const;
   void SaveAndExit();
 
   std::unique_ptr<Ui::Settings> ui_;
   IniReader& ini_;
-  MessageBoxes& boxes_;
+  Commands commands_;
+  EntryChecks checks_;
 };

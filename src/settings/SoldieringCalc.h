@@ -20,7 +20,6 @@ class SoldieringCalc : public QDialog {
   ~SoldieringCalc() override;
 
  private:
-  void SetCaptions(const StringTable& strings);
   void SaveAndExit();
 
   std::unique_ptr<Ui::SoldieringCalc> ui_;

@@ -3,12 +3,28 @@
 #include "core/game/PlayerId.h"
 #include "core/text/NumberForms.h"
 #include "platform/ErrorReport.h"
+#include "ui/Captions.h"
 #include "ui_PrintOptions.h"
 
 PrintOptions::PrintOptions(const StringTable& strings, MessageBoxes& boxes, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::PrintOptions>()), boxes_(boxes) {
   ui_->setupUi(this);
-  SetCaptions(strings);
+  SetCaptions(strings, {{this, 159},
+                        {ui_->Frame1, 149},
+                        {ui_->Frame2, 150},
+                        {ui_->Frame3, 151},
+                        {ui_->PrintActive, 152},
+                        {ui_->PrintAll, 153},
+                        {ui_->PrintTeam, 154},
+                        {ui_->PrintOne, 155},
+                        {ui_->PrintPrinter, 156},
+                        {ui_->PrintFile, 157},
+                        {ui_->HideRank, 158},
+                        {ui_->OK, 140},
+                        {ui_->Cancel, 141},
+                        {ui_->TeamLabel, 113},
+                        {ui_->TeamLabel2, 113},
+                        {ui_->PlayerLabel, 104}});
   FillLists(strings);
   for (const QRadioButton* option : {ui_->PrintActive, ui_->PrintAll, ui_->PrintTeam, ui_->PrintOne}) {
     connect(option, &QRadioButton::toggled, this, &PrintOptions::EnableLists);
@@ -17,26 +33,6 @@ PrintOptions::PrintOptions(const StringTable& strings, MessageBoxes& boxes, QWid
 }
 
 PrintOptions::~PrintOptions() = default;
-
-void PrintOptions::SetCaptions(const StringTable& strings) {
-  const auto text = [&strings](int number) { return QString::fromStdString(strings.Text(number)); };
-  setWindowTitle(text(159));
-  ui_->Frame1->setTitle(text(149));
-  ui_->Frame2->setTitle(text(150));
-  ui_->Frame3->setTitle(text(151));
-  ui_->PrintActive->setText(text(152));
-  ui_->PrintAll->setText(text(153));
-  ui_->PrintTeam->setText(text(154));
-  ui_->PrintOne->setText(text(155));
-  ui_->PrintPrinter->setText(text(156));
-  ui_->PrintFile->setText(text(157));
-  ui_->HideRank->setText(text(158));
-  ui_->OK->setText(text(140));
-  ui_->Cancel->setText(text(141));
-  ui_->TeamLabel->setText(text(113));
-  ui_->TeamLabel2->setText(text(113));
-  ui_->PlayerLabel->setText(text(104));
-}
 
 void PrintOptions::FillLists(const StringTable& strings) {
   constexpr std::int16_t teams = 3;

@@ -3,15 +3,11 @@
 #include <QPainter>
 #include <array>
 
+#include "core/game/TeamColour.h"
+
 QColor TeamColour(int team) {
-  switch (team) {
-    case 1:
-      return {0xd9, 0x3a, 0x3a};
-    case 2:
-      return {0x2f, 0x6f, 0xd6};
-    default:
-      return {0xe6, 0xb0, 0x0f};
-  }
+  const Rgb& colour = TeamRgb.at(static_cast<std::size_t>(team - 1));
+  return {colour.Red, colour.Green, colour.Blue};
 }
 
 QColor TeamTint(int team, const QColor& base) {

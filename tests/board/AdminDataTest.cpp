@@ -5,7 +5,7 @@
 #include <QClipboard>
 #include <QTableWidget>
 
-#include "tests/support/Venue.h"
+#include "tests/support/Controls.h"
 #include "tests/support/WhileModal.h"
 
 namespace {
@@ -18,16 +18,17 @@ class Admin : public testing::Test {
       ::Press(window, "Command1");
       EXPECT_FALSE(window.isVisible());
     });
-    venue.Trigger("mnuAdminData");
+    AdminData(game, strings, nullptr).exec();
     EXPECT_EQ(open.Runs(), 1);
   }
 
-  Venue venue;
+  const StringTable strings{Language::English};
+  Game game{strings};
 };
 
 TEST_F(Admin, ListsRunTimeAndKillsOfAllGuns) {
-  venue.Start();
-  venue.LoadGame(GameFile(PlayerOf(2, "<RunCounter>125</RunCounter><AdminKillCount>3</AdminKillCount>")));
+  game.Players(2).RunCounter = 125;
+  game.Players(2).AdminKillCount = 3;
   Open([](AdminData& window, QTableWidget& list) {
     EXPECT_EQ(window.windowTitle(), QStringLiteral("Administration Data"));
     ASSERT_EQ(list.rowCount(), 224);
@@ -41,7 +42,6 @@ TEST_F(Admin, ListsRunTimeAndKillsOfAllGuns) {
 }
 
 TEST_F(Admin, CopiesTheSelectedRowsAsTextWithTabs) {
-  venue.Start();
   Open([](AdminData& window, QTableWidget& list) {
     Show(window);
     list.selectRow(1);

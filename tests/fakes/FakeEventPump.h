@@ -9,10 +9,11 @@
 #include <vector>
 
 #include "platform/EventPump.h"
+#include "platform/MonotonicClock.h"
 
 /// Event pump, timers and passing of time in one: a wait of a minute takes no time. Time stands still while
-/// code runs and goes on in waits and pauses only.
-class FakeEventPump : public EventPump {
+/// code runs and goes on in waits, in pauses, and in what blocks (Pass).
+class FakeEventPump : public EventPump, public MonotonicClock {
  public:
   using Time = std::chrono::milliseconds;
 
@@ -26,8 +27,13 @@ class FakeEventPump : public EventPump {
   /// one instant run in the order in which they were scheduled. May be called by an event.
   void At(Time delay, std::function<void()> event) { events_.emplace(now_ + delay, std::move(event)); }
 
-  /// Time since the start.
-  Time Now() const { return now_; }
+  /// Time since the start, in whole milliseconds.
+  Time Now() const { return std::chrono::floor<Time>(now_); }
+
+  std::chrono::microseconds Elapsed() const override { return now_; }
+
+  /// Time passes while a call blocks: no event is served.
+  void Pass(std::chrono::microseconds time) { now_ += time; }
 
   /// Number of waits and long pauses that are on the stack.
   int Depth() const { return depth_; }
@@ -46,7 +52,8 @@ class FakeEventPump : public EventPump {
   }
 
   WaitResult WaitFor(const std::function<bool()>& condition, Time limit) override {
-    const Time deadline = limit > Time::max() - now_ ? Time::max() : now_ + limit;
+    const bool endless = limit > std::chrono::floor<Time>(Instant::max() - now_);
+    const Instant deadline = endless ? Instant::max() : now_ + limit;
     const OnStack onStack(depth_);
     while (true) {
       if (ended_) {
@@ -56,7 +63,7 @@ class FakeEventPump : public EventPump {
         return WaitResult::Met;
       }
       if (events_.empty() || events_.begin()->first > deadline) {
-        if (deadline == Time::max()) {
+        if (endless) {
           throw std::logic_error("An endless wait, and no event that could end it");
         }
         now_ = std::max(now_, deadline);
@@ -79,6 +86,8 @@ class FakeEventPump : public EventPump {
   }
 
  private:
+  using Instant = std::chrono::microseconds;
+
   class OnStack {
    public:
     explicit OnStack(int& depth) : depth_(depth) { ++depth_; }
@@ -98,8 +107,8 @@ class FakeEventPump : public EventPump {
     return event;
   }
 
-  Time now_{0};
+  Instant now_{0};
   int depth_ = 0;
   bool ended_ = false;
-  std::multimap<Time, std::function<void()>> events_;
+  std::multimap<Instant, std::function<void()>> events_;
 };

@@ -4,6 +4,7 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "platform/FileDialog.h"
@@ -14,7 +15,9 @@ class FakeFileDialog : public FileDialog {
   struct Call {
     bool Save = false;
     std::string Filter;
-    std::string FileName;
+    std::string Name;
+    std::string Folder = {};
+    std::string Title = {};
 
     bool operator==(const Call&) const = default;
   };
@@ -28,24 +31,20 @@ class FakeFileDialog : public FileDialog {
   /// Run while a dialog is open.
   std::function<void()> WhileOpen;
 
-  std::string ShowOpen(const std::string& filter, const std::string& fileName) override {
-    return Ask(false, filter, fileName);
-  }
-  std::string ShowSave(const std::string& filter, const std::string& fileName) override {
-    return Ask(true, filter, fileName);
-  }
+  std::optional<std::string> ShowOpen(const FileRequest& request) override { return Ask(false, request); }
+  std::optional<std::string> ShowSave(const FileRequest& request) override { return Ask(true, request); }
 
  private:
-  std::string Ask(bool save, const std::string& filter, const std::string& fileName) {
-    Calls.push_back({save, filter, fileName});
+  std::optional<std::string> Ask(bool save, const FileRequest& request) {
+    Calls.push_back({save, request.Filter, request.Name, request.Folder, request.Title});
     if (const auto whileOpen = WhileOpen) {
       whileOpen();
     }
     if (Answers.empty()) {
-      return fileName;
+      return std::nullopt;
     }
-    const std::optional<std::string> answer = Answers.front();
+    std::optional<std::string> answer = std::move(Answers.front());
     Answers.pop_front();
-    return answer.value_or(fileName);
+    return answer;
   }
 };

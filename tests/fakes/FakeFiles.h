@@ -26,6 +26,12 @@ class FakeFiles : public Files {
   /// All calls of CreateFolder, also those that failed.
   std::vector<std::string> Created;
 
+  /// Number of calls of Append, also of those that failed.
+  int Appends = 0;
+
+  /// What FreeSpace answers.
+  std::uint64_t FreeBytes = std::uint64_t{1} << 40U;
+
   /// Adds a folder and those above it.
   void AddFolder(const std::string& path) {
     for (std::string folder = path; !FolderExists(folder); folder = ParentOf(folder)) {
@@ -43,7 +49,7 @@ class FakeFiles : public Files {
 
   const std::map<std::string, std::string>& Contents() const { return contents_; }
 
-  /// Every read, replacement or making of `path` fails from now on.
+  /// Every read, replacement (also Write and Append) or making of `path` fails from now on.
   void FailRead(const std::string& path, const RuntimeError& error) {
     readFailures_.insert_or_assign(path, error);
   }
@@ -72,10 +78,10 @@ class FakeFiles : public Files {
     Created.push_back(path);
     ThrowIfTold(createFailures_, path);
     if (!FolderExists(ParentOf(path))) {
-      throw RuntimeError(76);
+      throw RuntimeError(Fault::PathNotFound);
     }
     if (FolderExists(path) || FileExists(WithoutSeparator(path))) {
-      throw RuntimeError(75);
+      throw RuntimeError(Fault::PathAccess);
     }
     folders_.insert(WithoutSeparator(path));
   }
@@ -95,10 +101,10 @@ class FakeFiles : public Files {
     Replaced.push_back({path, bytes});
     ThrowIfTold(replaceFailures_, path);
     if (!FolderExists(ParentOf(path))) {
-      throw RuntimeError(76, "Path not found: " + path);
+      throw RuntimeError(Fault::PathNotFound, "Path not found: " + path);
     }
     if (FolderExists(path)) {
-      throw RuntimeError(75, "Path/File access error: " + path);
+      throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
     }
     contents_[path] = bytes;
   }
@@ -115,6 +121,25 @@ class FakeFiles : public Files {
     contents_[path] = bytes;
   }
 
+  void Append(const std::string& path, const std::string& bytes) override {
+    ++Appends;
+    ThrowIfTold(replaceFailures_, path);
+    if (!FolderExists(ParentOf(path))) {
+      throw RuntimeError(Fault::PathNotFound, "Path not found: " + path);
+    }
+    if (FolderExists(path)) {
+      throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
+    }
+    contents_[path] += bytes;
+  }
+
+  std::uint64_t FreeSpace(const std::string& path) const override {
+    if (!FileExists(path) && !FolderExists(path)) {
+      throw RuntimeError(Fault::PathNotFound, "Path not found: " + path);
+    }
+    return FreeBytes;
+  }
+
   std::vector<std::string> FileNames(const std::string& folder) const override {
     std::vector<std::string> names;
     for (const auto& [path, bytes] : contents_) {
@@ -128,7 +153,7 @@ class FakeFiles : public Files {
   void Rename(const std::string& path, const std::string& newPath) override {
     ThrowIfTold(replaceFailures_, newPath);
     if (!FileExists(path)) {
-      throw RuntimeError(53);
+      throw RuntimeError(Fault::FileNotFound);
     }
     contents_[newPath] = contents_[path];
     contents_.erase(path);
@@ -137,7 +162,7 @@ class FakeFiles : public Files {
   void Delete(const std::string& path) override {
     ThrowIfTold(deleteFailures_, path);
     if (contents_.erase(path) == 0) {
-      throw RuntimeError(53);
+      throw RuntimeError(Fault::FileNotFound);
     }
   }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <deque>
 #include <functional>
 #include <ostream>
@@ -22,7 +23,7 @@ class FakeMessageBoxes : public MessageBoxes {
     friend std::ostream& operator<<(std::ostream& out, const Box& box) {
       static constexpr const char* icons[] = {"no icon", "information", "question", "exclamation",
                                               "critical"};
-      static constexpr const char* buttons[] = {"OK", "OK+Cancel", "Yes+No"};
+      static constexpr const char* buttons[] = {"OK", "OK+Cancel", "Yes+No", "Yes+No+Cancel"};
       return out << '"' << box.Text << "\" (title \"" << box.Title << "\", " << icons[int(box.Icon)] << ", "
                  << buttons[int(box.Buttons)] << ')';
     }
@@ -38,8 +39,14 @@ class FakeMessageBoxes : public MessageBoxes {
   /// Run while a box is open, with the box; may press buttons, open further boxes or add answers.
   std::function<void(const Box&)> WhileOpen;
 
+  /// More boxes than any test opens: a box that is asked again for ever then ends its test.
+  static constexpr std::size_t MostBoxes = 1000;
+
   BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,
                  BoxButtons buttons = BoxButtons::Ok) override {
+    if (Boxes.size() >= MostBoxes) {
+      throw std::logic_error("There is no end of boxes: \"" + text + "\"");
+    }
     const Box box{text, title, icon, buttons};
     Boxes.push_back(box);
     if (const auto whileOpen = WhileOpen) {
@@ -48,15 +55,26 @@ class FakeMessageBoxes : public MessageBoxes {
     if (buttons == BoxButtons::Ok) {
       return BoxAnswer::Ok;
     }
-    const bool yesNo = buttons == BoxButtons::YesNo;
     if (Answers.empty()) {
-      return yesNo ? BoxAnswer::Yes : BoxAnswer::Ok;
+      return buttons == BoxButtons::OkCancel ? BoxAnswer::Ok : BoxAnswer::Yes;
     }
     const BoxAnswer answer = Answers.front();
     Answers.pop_front();
-    if (yesNo != (answer == BoxAnswer::Yes || answer == BoxAnswer::No)) {
+    if (!HasButton(buttons, answer)) {
       throw std::logic_error("The scripted answer is no button of the box \"" + text + "\"");
     }
     return answer;
+  }
+
+ private:
+  static bool HasButton(BoxButtons buttons, BoxAnswer answer) {
+    switch (answer) {
+      case BoxAnswer::Ok:
+        return buttons == BoxButtons::Ok || buttons == BoxButtons::OkCancel;
+      case BoxAnswer::Cancel:
+        return buttons == BoxButtons::OkCancel || buttons == BoxButtons::YesNoCancel;
+      default:
+        return buttons == BoxButtons::YesNo || buttons == BoxButtons::YesNoCancel;
+    }
   }
 };

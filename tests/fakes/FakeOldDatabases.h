@@ -23,7 +23,7 @@ class FakeOldDatabases : public OldDatabases {
     call.append(" ").append(table).append(" ").append(emptyDatabase);
     Converted.push_back(call);
     if (!Failure.empty()) {
-      throw RuntimeError(3343, Failure);
+      throw RuntimeError(Fault::UnrecognizedDatabase, Failure);
     }
     OldPaths.erase(path);
     return Report;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <algorithm>
+#include <deque>
 #include <functional>
 #include <optional>
 #include <string>
@@ -27,6 +28,9 @@ class FakeOneWire : public OneWire {
 
   /// Devices on the bus in the order in which a walk meets them.
   std::vector<Rom> Devices;
+
+  /// The next calls of TMNext give these instead, oldest first: BadRead, mostly.
+  std::deque<std::int16_t> NextResults;
 
   /// This operation throws.
   std::string Broken;
@@ -63,8 +67,18 @@ class FakeOneWire : public OneWire {
   /// The walk counts in `Branch`.
   std::int16_t TMNext(std::int32_t handle, OneWireState& state) override {
     Begin("TMNext");
+    if (!NextResults.empty()) {
+      const std::int16_t result = NextResults.front();
+      NextResults.pop_front();
+      state = {};
+      return result;
+    }
+    if (!open_ || handle != Handle) {
+      state = {};
+      return BadRead;
+    }
     const auto next = static_cast<std::size_t>(state.Branch - OneWireState::None);
-    if (!open_ || handle != Handle || next >= Devices.size()) {
+    if (next >= Devices.size()) {
       state = {};
       return 0;
     }
@@ -113,7 +127,7 @@ class FakeOneWire : public OneWire {
       onCall(operation);
     }
     if (operation == Broken) {
-      throw RuntimeError(53);
+      throw RuntimeError(Fault::FileNotFound);
     }
   }
 

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <algorithm>
+#include <chrono>
 #include <deque>
 #include <functional>
 #include <string>
@@ -7,20 +9,36 @@
 
 #include "platform/RuntimeError.h"
 #include "platform/SerialPort.h"
+#include "tests/fakes/FakeEventPump.h"
 
 /// A serial line whose far end is the test.
 class FakeSerialPort : public SerialPort {
  public:
   /// All operations that change something, in order: "Open /dev/x 19200,N,8,1", "Output 170", "ClearInput",
-  /// "Close"; a failed one ends with " failed 8002".
+  /// "Settings 9600,N,8,1", "Close"; a failed one ends with " failed 8002".
   std::vector<std::string> Log;
 
   /// All bytes put on the line.
   std::vector<std::uint8_t> Sent;
 
-  /// Of the last successful open.
+  /// Of the last successful open; the settings as they were changed since.
   std::string Device;
   std::string Settings;
+
+  /// A drain of the open line, also that of a close.
+  struct DrainCall {
+    std::size_t BytesSent;           ///< before it
+    std::chrono::microseconds Time;  ///< of its end, when there is a `Pump`
+
+    bool operator==(const DrainCall&) const = default;
+  };
+  std::vector<DrainCall> Drains;
+
+  /// As last told.
+  std::string Instrument;
+
+  /// With it the line has the rate of its settings: each byte needs its time, which a drain lets pass.
+  FakeEventPump* Pump = nullptr;
 
   /// Run with each byte put on the line, so that a test can answer.
   std::function<void(std::uint8_t)> OnOutput;
@@ -32,6 +50,9 @@ class FakeSerialPort : public SerialPort {
 
   /// The next open fails with this number.
   void FailNextOpen(int number) { openFailure_ = number; }
+
+  /// The next change of settings fails with this number.
+  void FailNextSettings(int number) { settingsFailure_ = number; }
 
   /// Every output fails with this number, until 0 is given.
   void FailOutput(int number) { outputFailure_ = number; }
@@ -54,6 +75,7 @@ class FakeSerialPort : public SerialPort {
 
   void Close() override {
     if (open_) {
+      LetPass();
       Log.push_back("Close");
     }
     open_ = false;
@@ -61,6 +83,15 @@ class FakeSerialPort : public SerialPort {
   }
 
   bool PortOpen() const override { return open_; }
+
+  void SetSettings(const std::string& settings) override {
+    const int failure = !open_ ? 8018 : lost_ ? 8012 : settingsFailure_;
+    settingsFailure_ = 0;
+    FailIf(failure, "Settings " + settings);
+    LetPass();
+    Log.push_back("Settings " + settings);
+    Settings = settings;
+  }
 
   std::size_t InBufferCount() override {
     if (!open_) {
@@ -86,9 +117,18 @@ class FakeSerialPort : public SerialPort {
     FailIf(!open_ ? 8018 : lost_ ? 8012 : outputFailure_, entry);
     Log.push_back(entry);
     Sent.push_back(byte);
+    if (Pump != nullptr) {
+      constexpr std::chrono::microseconds bitsOfAByte{10'000'000};
+      idleAt_ = std::max(idleAt_, Pump->Elapsed()) + bitsOfAByte / std::stoi(Settings);
+    }
     if (const auto onOutput = OnOutput) {
       onOutput(byte);
     }
+  }
+
+  void Drain() override {
+    FailIf(!open_ ? 8018 : lost_ ? 8012 : 0, "Drain");
+    LetPass();
   }
 
   void ClearInput() override {
@@ -97,7 +137,16 @@ class FakeSerialPort : public SerialPort {
     input_.clear();
   }
 
+  void SetInstrument(const std::string& name) override { Instrument = name; }
+
  private:
+  void LetPass() {
+    if (Pump != nullptr && idleAt_ > Pump->Elapsed()) {
+      Pump->Pass(idleAt_ - Pump->Elapsed());
+    }
+    Drains.push_back({Sent.size(), Pump != nullptr ? Pump->Elapsed() : std::chrono::microseconds(0)});
+  }
+
   void FailIf(int number, const std::string& entry) {
     if (number != 0) {
       Log.push_back(entry + " failed " + std::to_string(number));
@@ -108,6 +157,8 @@ class FakeSerialPort : public SerialPort {
   bool open_ = false;
   bool lost_ = false;
   int openFailure_ = 0;
+  int settingsFailure_ = 0;
   int outputFailure_ = 0;
+  std::chrono::microseconds idleAt_{0};
   std::deque<std::uint8_t> input_;
 };

@@ -52,7 +52,7 @@ class FakeWordProcessor : public WordProcessor {
   std::unique_ptr<WordDocument> Add(const std::string& path) override {
     Note("Add " + path);
     if (Now != WordState::Ready) {
-      throw RuntimeError(429);
+      throw RuntimeError(Fault::CannotCreateObject);
     }
     Documents.push_back(std::make_unique<Document>());
     Documents.back()->Template = path;
@@ -117,7 +117,7 @@ class FakeWordProcessor : public WordProcessor {
       onOperation(operation);
     }
     if (!FailAt.empty() && operation.rfind(FailAt, 0) == 0) {
-      throw RuntimeError(440, "Told to fail");
+      throw RuntimeError(Fault::AutomationError, "Told to fail");
     }
   }
 };

@@ -245,9 +245,13 @@ TEST_F(MembersWindow, ChoosesNobodyWhenItIsClosed) {
 class MembersWindowOn : public MembersWindow {
  protected:
   Members& OpenOn(std::int32_t contactToShow) {
-    opened = std::make_unique<Members>(
-        Members::Needs{*database, venue.Boxes, venue.Dialog, venue.Disk, venue.Time, venue.Strings, {}},
-        nullptr);
+    opened = std::make_unique<Members>(Members::Parts{.DbMembers = *database,
+                                                      .Boxes = venue.Boxes,
+                                                      .CommonDialog1 = venue.Dialog,
+                                                      .Disk = venue.Disk,
+                                                      .Time = venue.Time,
+                                                      .Strings = venue.Strings},
+                                       nullptr);
     opened->ContactToShow = contactToShow;
     window = opened.get();
     Show(*window);
@@ -255,7 +259,6 @@ class MembersWindowOn : public MembersWindow {
     return *window;
   }
 
-  std::unique_ptr<Database> database = venue.Databases.OpenDatabase(venue.DataFile("members.mdb"));
   std::unique_ptr<Members> opened;
 };
 

@@ -1,96 +1,19 @@
 #pragma once
 
-#include <gmock/gmock.h>
+#include <memory>
 
-#include <QLabel>
-#include <QLineEdit>
+#include "tests/members/MembersSteps.h"
+#include "tests/support/DataSite.h"
 
-#include "core/game/Game.h"
-#include "members/Members.h"
-#include "members/PictureBox.h"
-#include "tests/support/Venue.h"
-#include "tests/support/WhileModal.h"
-
-/// The window of the members, opened from the main window on Rhys Morgan (1), Alice "Mole" Belmont (2), Sean
-/// "Shamrock" O'Brien (5) and 王小明 (9).
-class MembersWindow : public testing::Test {
+/// The window of the members by itself.
+class MembersWindow : public MembersSteps<DataSite> {
  protected:
-  MembersWindow() {
-    venue.PutDefaultFiles();
-    Sql("INSERT INTO Members (ContactID, FirstName, LastName, NickName, Clan, Birthdate, DateJoined, City) "
-        "VALUES (1, 'Rhys', 'Morgan', NULL, 'Red Dragons', '1961-04-12 00:00:00', '2010-03-01 09:05:00', "
-        "'Cardiff'), "
-        "(2, 'Alice', 'Belmont', 'Mole', '', NULL, NULL, NULL), "
-        "(5, 'Sean', 'O''Brien', 'Shamrock', NULL, NULL, NULL, NULL), "
-        "(9, '小明', '王', NULL, NULL, NULL, NULL, NULL)");
-    venue.ButtonSwipe = [this] { return swiped; };
-    venue.Start();
+  void Execute() override { ShowMembers(venue, *database); }
+
+  static void ShowMembers(DataSite& site, Database& members) {
+    Members({members, site.Boxes, site.Dialog, site.Disk, site.Time, site.Strings, site.ButtonSwipe}, nullptr)
+        .exec();
   }
 
-  void Sql(const std::string& sql) { venue.ChangeDatabase("members.mdb", sql); }
-  std::string Query(const std::string& sql) { return venue.QueryDatabase("members.mdb", sql); }
-
-  /// A column of one member, read by another program.
-  std::string Stored(const std::string& column, int member) {
-    return Query("SELECT " + column + " FROM Members WHERE ContactID = " + std::to_string(member));
-  }
-
-  /// Opens the window, does `act` in it, and closes it by its close box where `act` did not.
-  void Open(const std::function<void()>& act) {
-    const WhileModal<Members> open([&](Members& opened) {
-      window = &opened;
-      EXPECT_TRUE(QTest::qWaitFor([this] { return QApplication::activeWindow() == window; }));
-      act();
-      opened.close();
-    });
-    venue.Trigger("mnuManageMembers");
-    EXPECT_EQ(open.Runs(), 1);
-    window = nullptr;
-  }
-
-  void Press(const char* button) { ::Press(*window, button); }
-  QLineEdit& Line(const std::string& name) { return ::Find<QLineEdit>(*window, name); }
-  std::string Text(const std::string& name) { return Line(name).text().toStdString(); }
-  std::string Shown(const std::string& name) { return ::Find<QLabel>(*window, name).text().toStdString(); }
-  PictureBox& Photo() { return ::Find<PictureBox>(*window, "MemberPhoto"); }
-
-  /// The operator types over what an entry holds.
-  void Enter(const std::string& name, const std::string& text) {
-    Line(name).setFocus();
-    Line(name).selectAll();
-    QTest::keyClick(&Line(name), Qt::Key_Delete);
-    const QString typed = QString::fromStdString(text);
-    if (QString::fromLatin1(typed.toLatin1()) == typed) {
-      QTest::keyClicks(&Line(name), typed);
-    } else {
-      Line(name).insert(typed);  // there are no keys for it
-    }
-  }
-
-  /// Types a name to search for and leaves the box with the Tab key.
-  void SearchFor(const std::string& text) {
-    Enter("SearchText", text);
-    Type(*window, Qt::Key_Tab);
-    QApplication::processEvents();  // a fault is told when the focus has moved
-  }
-
-  /// Last names of all rows that the cursor goes through, each followed by a blank.
-  std::string Found() {
-    std::string names;
-    Press("DataFirst");
-    for (std::string place; place != Shown("DataPlace"); Press("DataNext")) {
-      place = Shown("DataPlace");
-      names += Text("LastNameEntry") + " ";
-    }
-    return names;
-  }
-
-  static FakeMessageBoxes::Box Fault(int number, const std::string& text) {
-    return {"Run-time error '" + std::to_string(number) + "': " + text, "Tessarine", BoxIcon::Critical,
-            BoxButtons::Ok};
-  }
-
-  Venue venue;
-  std::string swiped = NoDallasId;  ///< what the reader reads
-  Members* window = nullptr;
+  std::unique_ptr<Database> database = venue.Databases.OpenDatabase(venue.DataFile("members.mdb"));
 };

@@ -171,45 +171,6 @@ TEST_F(Editor, DeletesNoOtherMissionInPlaceOfOneThatIsGone) {
   EXPECT_THAT(Names(), ElementsAre("One", "Three"));
 }
 
-TEST_F(Editor, StaysUsableWithoutAnyMission) {
-  Open([this] {
-    for (int mission = 0; mission < 3; ++mission) {
-      Press("Delete");
-    }
-    EXPECT_THAT(Entries(), IsEmpty());
-    EXPECT_EQ(ShownName(), "");
-    EXPECT_EQ(ShownDescription(), "");
-    Press("Delete");
-    venue.Boxes.Boxes.clear();
-    Press("Save");
-    EXPECT_THAT(venue.Boxes.Boxes,
-                ElementsAre(EntryError("Mission Description cannot be empty. Save aborted.")));
-    NewMission("First again");
-    EXPECT_THAT(Entries(), ElementsAre("First again"));
-    EXPECT_EQ(ShownDescription(), "Enter Mission Details");
-  });
-  EXPECT_THAT(Names(), ElementsAre("First again"));
-  EXPECT_EQ(venue.ActiveMission().count(), 3);
-}
-
-TEST_F(Editor, OpensWithoutAnyMission) {
-  venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1");
-  Open([this] {
-    EXPECT_THAT(Entries(), IsEmpty());
-    Press("Edit");
-    Press("Delete");
-  });
-  EXPECT_EQ(venue.ActiveMission().count(), 2);
-}
-
-TEST_F(Editor, LeavesTheActiveMissionOnNone) {
-  venue.ActiveMission().setCurrentIndex(3);
-  Open([this] { Press("SelectExit"); });
-  EXPECT_EQ(venue.ActiveMission().currentIndex(), 0);
-  EXPECT_FALSE(venue.Find<QAction>("mnuMissionResults").isEnabled());
-  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
-}
-
 TEST_F(Editor, AsksBeforeItLeavesWhileEditing) {
   venue.Boxes.Answers = {BoxAnswer::No};
   Open([this] {
@@ -233,29 +194,13 @@ TEST_F(Editor, SavesOnTheWayOutWhenToldTo) {
   EXPECT_EQ(Stored("MissionDescription", "One"), "saved at last");
 }
 
-TEST_F(Editor, ClosedByItsCloseBoxAsksNothingInAnyState) {
-  Open([] {});
-  Open([this] {
-    Press("Edit");
-    Describe("never saved");
-  });
-  Open([this] {
-    Press("Edit");
-    QTest::keyClick(window, Qt::Key_Escape);
-    EXPECT_FALSE(window->isVisible());
-  });
-  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
-  EXPECT_EQ(Stored("MissionDescription", "One"), "First text");
-  Open([this] { NewMission("Four"); });
-  EXPECT_THAT(Names(), ElementsAre("One", "Two", "Three", "Four"));
-  EXPECT_EQ(venue.ActiveMission().count(), 6);
-}
-
 class ChineseEditor : public testing::Test {};
 
 TEST_F(ChineseEditor, TakesItsCaptionsFromTheStringTable) {
-  Venue venue(Language::SimplifiedChinese);
-  venue.Start();
+  DataSite venue(Language::SimplifiedChinese);
+  venue.PutDefaultFiles();
+  const std::unique_ptr<Database> database = venue.Databases.OpenDatabase(venue.DataFile("scenarios.mdb"));
+  const std::unique_ptr<Recordset> rows = database->OpenRecordset("Table1");
   const WhileModal<Scenarios> open([&venue](Scenarios& window) {
     const auto text = [&venue](int number) { return QString::fromStdString(venue.Strings.Text(number)); };
     EXPECT_EQ(window.windowTitle(), text(180));
@@ -275,7 +220,7 @@ TEST_F(ChineseEditor, TakesItsCaptionsFromTheStringTable) {
     }
     window.close();
   });
-  venue.Trigger("mnuSetupMissions");
+  Scenarios(*database, *rows, venue.Boxes, venue.Strings, nullptr).exec();
   EXPECT_EQ(open.Runs(), 1);
 }
 

@@ -10,8 +10,9 @@
 #include <optional>
 
 #include "tests/fakes/FakeFiles.h"
-#include "tests/support/Venue.h"
-#include "tests/support/WhileModal.h"
+#include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/fakes/FakeSerialDevices.h"
+#include "tests/support/Controls.h"
 
 namespace {
 
@@ -251,20 +252,6 @@ TEST_F(SettingsWindow, ReportsANumberThatIsTooLarge) {
   LeaveEntryWith("1e300");
   EXPECT_THAT(boxes.Boxes, ElementsAre(overflow, overflow));
   EXPECT_THAT(files.Replaced, IsEmpty());
-}
-
-TEST(SettingsCommand, OpensTheWindowAndLeavesThePortAlone) {
-  Venue venue;
-  venue.Start();
-  const WhileModal<Settings> operatorAtWork([](Settings& window) {
-    Find<QLineEdit>(window, "CommPortNumber").setText(QStringLiteral("3"));
-    Press(window, "SaveExit");
-  });
-  venue.Trigger("mnuCommPort");
-  EXPECT_EQ(operatorAtWork.Runs(), 1);
-  EXPECT_THAT(ReadFile(venue.DataFile("tessarine.ini")), testing::HasSubstr("commport= 3"));
-  EXPECT_THAT(venue.Port.Log, IsEmpty());
-  EXPECT_EQ(venue.Window->findChild<Settings*>(), nullptr);
 }
 
 }  // namespace

@@ -3,7 +3,7 @@
 #include <QApplication>
 #include <QTemporaryDir>
 
-#include "app/Composition.h"
+#include "ui/Look.h"
 
 /// Main program of the window tests: a display in memory with the screens of Screens.json, and no settings of
 /// this machine's user.
@@ -16,6 +16,6 @@ int main(int argc, char** argv) {
     qputenv("QT_QPA_PLATFORM", "offscreen:configfile=" TESSARINE_TEST_SCREENS);
   }
   QApplication application(argc, argv);
-  PrepareApplication();
+  PrepareLook();
   return RUN_ALL_TESTS();
 }

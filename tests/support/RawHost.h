@@ -4,10 +4,12 @@
 #include <cstddef>
 #include <cstdint>
 #include <optional>
+#include <ostream>
 #include <string>
 #include <vector>
 
 #include "sim/line/FileDescriptor.h"
+#include "sim/line/LineSettings.h"
 
 namespace sim {
 
@@ -16,12 +18,20 @@ using Bytes = std::vector<std::uint8_t>;
 /// Longest wait for something that must come; long enough for a busy machine.
 constexpr std::chrono::seconds limit{20};
 
+/// For the messages of failed tests.
+inline void PrintTo(const LineSettings& settings, std::ostream* out) {
+  *out << Text(settings);
+}
+
 /// The host's end of a line, byte by byte and without a protocol.
 class RawHost {
  public:
   /// Fails the running test when `path` cannot be opened.
   explicit RawHost(const std::string& path);
 
+  /// Sets the host's end of the line; without this it has what the device begins with.
+  void Speak(const LineSettings& settings) { SetRawLine(line_.Get(), settings); }
+  LineSettings Settings() const { return ReadLineSettings(line_.Get()); }
   void Write(const Bytes& bytes);
   /// None when `longestWait` passed first or the line hung up.
   std::optional<std::uint8_t> ReadByte(std::chrono::milliseconds longestWait = limit);

@@ -14,7 +14,6 @@ namespace {
 constexpr std::size_t MostCopies = 10;
 constexpr std::string_view Extension = ".mdb";
 constexpr std::string_view DateForm = "0000-00-00-000000";
-constexpr int FileIsLocked = 3050;
 
 /// "members" of "/home/x/members.mdb".
 std::string NameIn(const std::string& path) {
@@ -22,7 +21,7 @@ std::string NameIn(const std::string& path) {
   return file.substr(0, file.size() - Extension.size());
 }
 
-/// "YYYY-MM-DD HH:MM:SS" as part of a file's name, by which the copies sort.
+/// "YYYY-MM-DD HH:MM:SS" as part of a file name; the copies sort by it.
 std::string DateInName(std::string now) {
   std::replace(now.begin(), now.end(), ' ', '-');
   now.erase(std::remove(now.begin(), now.end(), ':'), now.end());
@@ -49,8 +48,8 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
   try {
     Copy(database, NameIn(path));
   } catch (const RuntimeError& error) {
-    // Of a file that another program has locked the change will fail as well; the next one tries again.
-    if (error.Number() == FileIsLocked) {
+    // Another program has locked the file, so the change itself will fail too; the next change tries again.
+    if (error.Number() == Fault::DatabaseLocked) {
       return false;
     }
     failure_ = Filled(strings_.Text(OwnText::BackupFailed), {path, error.what()});

@@ -15,7 +15,7 @@ std::string TextOf(const Value& value) {
     return text.front() == ' ' ? text.substr(1) : text;
   }
   if (std::holds_alternative<Blob>(value)) {
-    throw RuntimeError(13);
+    throw RuntimeError(Fault::TypeMismatch);
   }
   return {};
 }

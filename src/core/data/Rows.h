@@ -3,16 +3,15 @@
 #include "platform/Database.h"
 #include "platform/RuntimeError.h"
 
-/// Walks from the first row to the end and does `act` on each, but for rows that another program has deleted
-/// since the recordset was opened.
+/// Calls `act` on each row from the first to the last, except rows that another program has deleted since the
+/// recordset was opened.
 template <typename Act>
 void ForEachRow(Recordset& rows, const Act& act) {
-  constexpr int recordIsDeleted = 3167;
   for (rows.MoveFirst(); !rows.Eof(); rows.MoveNext()) {
     try {
       act();
     } catch (const RuntimeError& error) {
-      if (error.Number() != recordIsDeleted) {
+      if (error.Number() != Fault::RecordDeleted) {
         throw;
       }
     }

@@ -5,7 +5,6 @@
 
 namespace {
 
-constexpr int UnrecognizedFormat = 3343;
 constexpr const char* Title = "Database status";
 
 std::string TextOf(const NotTakenOver& what, const StringTable& strings) {
@@ -21,21 +20,21 @@ std::string TextOf(const NotTakenOver& what, const StringTable& strings) {
 }
 
 void TellOfConversion(const UserDatabase& database, const OldDatabaseReport& report,
-                      const DatabaseServices& services) {
-  std::string text = Filled(services.Strings.Text(OwnText::OldDatabaseConverted),
+                      const DatabaseParts& parts) {
+  std::string text = Filled(parts.Strings.Text(OwnText::OldDatabaseConverted),
                             {database.Path, std::to_string(report.Rows), report.KeptAs});
   if (!report.NotTaken.empty()) {
-    text += "\n\n" + services.Strings.Text(OwnText::NotTakenOver);
+    text += "\n\n" + parts.Strings.Text(OwnText::NotTakenOver);
     for (const NotTakenOver& what : report.NotTaken) {
-      text += "\n" + TextOf(what, services.Strings);
+      text += "\n" + TextOf(what, parts.Strings);
     }
   }
-  services.Boxes.Show(text, Title, BoxIcon::Information);
+  parts.Boxes.Show(text, Title, BoxIcon::Information);
 }
 
-std::unique_ptr<Database> Open(const std::string& path, const DatabaseServices& services) {
-  std::unique_ptr<Database> database = services.Engine.OpenDatabase(path);
-  services.Copies.Guard(*database, path);
+std::unique_ptr<Database> Open(const std::string& path, const DatabaseParts& parts) {
+  std::unique_ptr<Database> database = parts.Engine.OpenDatabase(path);
+  parts.Copies.Guard(*database, path);
   return database;
 }
 
@@ -46,29 +45,29 @@ std::string FreshPath(const std::string& path) {
 
 }  // namespace
 
-std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseServices& services) {
+std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseParts& parts) {
   std::string reason;
   try {
-    if (services.Old.IsOld(database.Path)) {
-      TellOfConversion(database, services.Old.Convert(database.Path, database.Table, database.DefaultPath),
-                       services);
+    if (parts.Old.IsOld(database.Path)) {
+      TellOfConversion(database, parts.Old.Convert(database.Path, database.Table, database.DefaultPath),
+                       parts);
     }
-    return Open(database.Path, services);
+    return Open(database.Path, parts);
   } catch (const RuntimeError& error) {
-    if (error.Number() != UnrecognizedFormat) {
+    if (error.Number() != Fault::UnrecognizedDatabase) {
       throw;
     }
     reason = error.what();
   }
   const std::string fresh = FreshPath(database.Path);
-  const BoxAnswer answer = services.Boxes.Show(
-      Filled(services.Strings.Text(OwnText::DatabaseUnusable), {database.Path, reason, fresh}), Title,
-      BoxIcon::Exclamation, BoxButtons::OkCancel);
+  const BoxAnswer answer =
+      parts.Boxes.Show(Filled(parts.Strings.Text(OwnText::DatabaseUnusable), {database.Path, reason, fresh}),
+                       Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
   if (answer == BoxAnswer::Cancel) {
     return nullptr;
   }
-  if (!services.Disk.FileExists(fresh)) {
-    services.Disk.Replace(fresh, services.Disk.Read(database.DefaultPath));
+  if (!parts.Disk.FileExists(fresh)) {
+    parts.Disk.Replace(fresh, parts.Disk.Read(database.DefaultPath));
   }
-  return Open(fresh, services);
+  return Open(fresh, parts);
 }

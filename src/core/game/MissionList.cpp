@@ -20,7 +20,7 @@ const std::string& MissionList::Text() const {
 
 void MissionList::Select(int index) {
   if (index < 0 || index >= static_cast<int>(items_.size())) {
-    throw RuntimeError(9);
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
   listIndex_ = index;
 }

@@ -5,7 +5,7 @@
 
 #include "platform/RuntimeError.h"
 
-/// A fixed table counted from 1 to `Size`. An index outside is RuntimeError 9.
+/// A fixed-size table indexed from 1 to `Size`. Any other index throws RuntimeError 9.
 template <typename Element, int Size>
 class OneBased {
  public:
@@ -26,7 +26,7 @@ class OneBased {
  private:
   static constexpr std::size_t Checked(int index) {
     if (!Holds(index)) {
-      throw RuntimeError(9);
+      throw RuntimeError(Fault::SubscriptOutOfRange);
     }
     return static_cast<std::size_t>(index - 1);
   }

@@ -1,7 +1,5 @@
 #include "core/game/PlayerId.h"
 
-#include <algorithm>
-
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
@@ -55,7 +53,7 @@ std::uint8_t IdFromTeamAndNumber(std::uint8_t team, std::uint8_t number) {
     id = number + 96;
   }
   if (id > 255) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<std::uint8_t>(id);
 }
@@ -78,12 +76,4 @@ std::int16_t TeamNumberFromName(const StringTable& texts, std::string_view name)
     }
   }
   return 0;
-}
-
-int IndexFromPlayerText(const StringTable& texts, std::string_view playerText) {
-  const std::string_view withoutName = playerText.substr(0, playerText.find(':'));
-  const std::size_t blank = std::min(withoutName.find(' '), withoutName.size());
-  const std::int16_t team = TeamNumberFromName(texts, withoutName.substr(0, blank));
-  const std::uint8_t number = ToByte(withoutName.substr(blank));
-  return IndexFromId(IdFromTeamAndNumber(static_cast<std::uint8_t>(team), number));
 }

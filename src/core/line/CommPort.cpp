@@ -2,15 +2,12 @@
 
 #include <utility>
 
-#include "core/line/EnumPorts.h"
-#include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
 CommPort::CommPort(SerialPort& port, const IniReader& ini, const SerialDevices& devices, MessageBoxes& boxes,
                    const StringTable& strings, std::function<void()> showSettings)
     : port_(port),
-      ini_(ini),
-      devices_(devices),
+      setting_(ini, devices),
       boxes_(boxes),
       strings_(strings),
       showSettings_(std::move(showSettings)) {}
@@ -19,7 +16,7 @@ bool CommPort::OpenCommPort(const std::string& settings) {
   for (;;) {
     CloseIfOpen();
     try {
-      Open(settings);
+      port_.Open(Device(), settings);
       return true;
     } catch (const RuntimeError&) {
       const BoxAnswer answer =
@@ -31,15 +28,6 @@ bool CommPort::OpenCommPort(const std::string& settings) {
     }
     showSettings_();
   }
-}
-
-void CommPort::Open(const std::string& settings) {
-  const std::int16_t number = ToInt16(ini_.ReadIni(Keys::CommPort));
-  const std::string device = EnumPorts(ini_, devices_).DeviceOf(number);
-  if (device.empty()) {
-    throw RuntimeError(8002);
-  }
-  port_.Open(device, settings);
 }
 
 void CommPort::CloseIfOpen() {

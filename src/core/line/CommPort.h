@@ -3,13 +3,12 @@
 #include <functional>
 #include <string>
 
-#include "core/data/IniReader.h"
+#include "core/line/CommPortSetting.h"
 #include "core/text/StringTable.h"
 #include "platform/MessageBoxes.h"
-#include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
 
-/// The serial line whose number the settings name.
+/// The serial line whose number the settings name, and the question to the operator when it does not open.
 class CommPort {
  public:
   /// `showSettings` shows the settings window modally.
@@ -20,9 +19,8 @@ class CommPort {
   /// settings and another try. Returns false once Cancel was pressed.
   bool OpenCommPort(const std::string& settings);
 
-  /// Opens the line, which must be closed, once and without a question. Throws RuntimeError: as
-  /// SerialPort::Open does, 8002 for a number without a device, 13 or 6 for a setting that is no number.
-  void Open(const std::string& settings);
+  /// The device that the settings name now. Throws as CommPortSetting::Device does.
+  std::string Device() const { return setting_.Device(); }
 
   void CloseIfOpen();
 
@@ -31,8 +29,7 @@ class CommPort {
 
  private:
   SerialPort& port_;
-  const IniReader& ini_;
-  const SerialDevices& devices_;
+  CommPortSetting setting_;
   MessageBoxes& boxes_;
   const StringTable& strings_;
   std::function<void()> showSettings_;

@@ -58,7 +58,7 @@ const std::string& StringTable::Text(int number) const {
       std::lower_bound(std::begin(Entries), std::end(Entries), number,
                        [](const Entry& entry, int wanted) { return entry.Number < wanted; });
   if (found == std::end(Entries) || found->Number != number) {
-    throw RuntimeError(9);
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
   return texts_[static_cast<std::size_t>(found - std::begin(Entries))];
 }

@@ -4,7 +4,6 @@
 #include <span>
 
 #include "core/line/Checksum.h"
-#include "platform/RuntimeError.h"
 
 using std::chrono::milliseconds;
 
@@ -22,13 +21,13 @@ constexpr milliseconds RejectPause{2000};
 BaseUnitDownload::BaseUnitDownload(SerialPort& port, CommPort& commPort, EventPump& events,
                                    MessageBoxes& boxes, const Clock& clock, TransferProgress& progress,
                                    Game& game)
-    : port_(port),
-      commPort_(commPort),
+    : commPort_(commPort),
       events_(events),
       boxes_(boxes),
       clock_(clock),
       progress_(progress),
-      game_(game) {}
+      game_(game),
+      job_(port, events, "base-unit", [&progress] { return progress.ClosedByOperator(); }) {}
 
 void BaseUnitDownload::GetScores() {
   progress_.Open();
@@ -37,12 +36,12 @@ void BaseUnitDownload::GetScores() {
     Transfer();
   }
   progress_.Close();
-  commPort_.CloseIfOpen();
+  job_.Close();
 }
 
 void BaseUnitDownload::Transfer() {
   SendByte(1);
-  events_.Sleep(RequestPause);
+  job_.Pause(RequestPause);
   SendByte(0);
   const auto count = ReceiveByte();
   if (!count) {
@@ -100,14 +99,14 @@ bool BaseUnitDownload::ChecksumFits(std::uint8_t crc) const {
 
 void BaseUnitDownload::AcceptFrame() {
   AnalyseData(buffer_, game_, clock_);
-  events_.Sleep(ReplyPause);
+  job_.Pause(ReplyPause);
   SendByte(FrameAccepted);
 }
 
 void BaseUnitDownload::RejectFrame() {
-  events_.Sleep(ReplyPause);
+  job_.Pause(ReplyPause);
   SendByte(FrameRejected);
-  if (lineLost_) {
+  if (job_.Fault()) {
     return;
   }
   boxes_.Show("Checksum failed", DefaultBoxTitle, BoxIcon::Critical);
@@ -116,38 +115,32 @@ void BaseUnitDownload::RejectFrame() {
 }
 
 void BaseUnitDownload::SendByte(std::uint8_t byte) {
-  if (lineLost_) {
-    return;
-  }
-  try {
-    port_.Output(byte);
-  } catch (const RuntimeError&) {
-    ReportLostLine("Error occured sending data. Please try again.");
+  if (!job_.Send(byte)) {
+    TellOfFault();
   }
 }
 
 std::optional<std::uint8_t> BaseUnitDownload::ReceiveByte() {
-  if (lineLost_) {
-    return std::nullopt;
+  const auto [wait, byte] = job_.WaitForByte(ByteTimeLimit);
+  switch (wait) {
+    case LineWait::Met:
+      return byte;
+    case LineWait::TimedOut:
+      boxes_.Show("Timed out waiting for Data. Please try again.", DefaultBoxTitle, BoxIcon::Exclamation);
+      break;
+    case LineWait::Fault:
+      TellOfFault();
+      break;
+    case LineWait::Stopped:
+      break;
   }
-  try {
-    const WaitResult result = events_.WaitFor(
-        [this] { return progress_.ClosedByOperator() || port_.InBufferCount() >= 1; }, ByteTimeLimit);
-    if (result == WaitResult::Ended || progress_.ClosedByOperator()) {
-      return std::nullopt;
-    }
-    if (result == WaitResult::Met) {
-      return port_.Input();
-    }
-  } catch (const RuntimeError&) {
-    ReportLostLine("Error occured receiving data. Please try again.");
-    return std::nullopt;
-  }
-  boxes_.Show("Timed out waiting for Data. Please try again.", DefaultBoxTitle, BoxIcon::Exclamation);
   return std::nullopt;
 }
 
-void BaseUnitDownload::ReportLostLine(const std::string& text) {
-  lineLost_ = true;
-  boxes_.Show(text, DefaultBoxTitle, BoxIcon::Exclamation);
+void BaseUnitDownload::TellOfFault() {
+  if (const auto fault = job_.FaultToTell()) {
+    boxes_.Show(fault->Sending ? "Error occured sending data. Please try again."
+                               : "Error occured receiving data. Please try again.",
+                DefaultBoxTitle, BoxIcon::Exclamation);
+  }
 }

@@ -5,9 +5,10 @@
 #include <optional>
 #include <string>
 
-#include "core/game/FrameDecoder.h"
 #include "core/game/Game.h"
+#include "core/game/ScoreFrame.h"
 #include "core/line/CommPort.h"
+#include "core/line/SerialJob.h"
 #include "platform/Clock.h"
 #include "platform/EventPump.h"
 #include "platform/MessageBoxes.h"
@@ -57,16 +58,15 @@ class BaseUnitDownload {
   void SendByte(std::uint8_t byte);
   /// The next byte; nothing when the transfer has to end: no byte in 5 s, the line lost, or a window closed.
   std::optional<std::uint8_t> ReceiveByte();
-  void ReportLostLine(const std::string& text);
+  void TellOfFault();
 
-  SerialPort& port_;
   CommPort& commPort_;
   EventPump& events_;
   MessageBoxes& boxes_;
   const Clock& clock_;
   TransferProgress& progress_;
   Game& game_;
+  SerialJob job_;
   ReceiveBuffer buffer_{};
   std::size_t length_ = 0;  ///< L of the frame in hand, 0 to 32767
-  bool lineLost_ = false;
 };

@@ -30,7 +30,7 @@ void ButtonReader::Poll() {
   if (!poll_.Begin()) {
     boxes_.Show("Error loading Membership button driver", "Memberbership Error", BoxIcon::Exclamation);
     finished_ = true;
-  } else if (poll_.Next()) {
+  } else if (poll_.Next() == BusStep::Device) {
     TakeDevice();
   }
   poll_.End();
@@ -51,7 +51,7 @@ void ButtonReader::EndFailedPoll() {
   try {
     poll_.End();
   } catch (const std::exception&) {
-    // The same failure once more; the operator is told of it by the caller.
+    // The same failure again, which the caller reports.
     return;
   }
 }

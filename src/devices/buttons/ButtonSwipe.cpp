@@ -5,18 +5,20 @@
 #include "ui/Text.h"
 #include "ui_ButtonSwipe.h"
 
+namespace {
+constexpr int PollMilliseconds = 100;
+}
+
 ButtonSwipe::ButtonSwipe(OneWire& wire, MessageBoxes& boxes, const StringTable& strings, QWidget* parent)
     : QDialog(parent),
       ui_(std::make_unique<Ui::ButtonSwipe>()),
       reader_(wire, boxes),
-      timer1_(new QTimer(this)) {
+      commands_(*this, boxes),
+      timer1_(new PollTimer(commands_, PollMilliseconds, [this] { Tick(); })) {
   ui_->setupUi(this);
   ui_->Image1->setAccessibleName(Text(strings, OwnText::ButtonPicture));
   ui_->Cancel->setText(Text(strings, 141));
-  constexpr int pollMilliseconds = 100;
   timer1_->setObjectName(QStringLiteral("Timer1"));
-  timer1_->setInterval(pollMilliseconds);
-  connect(timer1_, &QTimer::timeout, this, &ButtonSwipe::Tick);
 }
 
 ButtonSwipe::~ButtonSwipe() = default;

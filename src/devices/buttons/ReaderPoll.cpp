@@ -18,8 +18,15 @@ bool ReaderPoll::Begin() {
   return true;
 }
 
-bool ReaderPoll::Next() {
-  return wire_.TMNext(sessionHandle_, stateBuffer_) == 1;
+BusStep ReaderPoll::Next() {
+  switch (wire_.TMNext(sessionHandle_, stateBuffer_)) {
+    case OneWire::DeviceFound:
+      return BusStep::Device;
+    case OneWire::EndOfBus:
+      return BusStep::End;
+    default:
+      return BusStep::BadRead;
+  }
 }
 
 std::array<std::uint8_t, 8> ReaderPoll::Rom() {

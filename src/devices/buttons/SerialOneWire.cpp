@@ -13,7 +13,7 @@ constexpr const char* LineSettings = "9600,N,8,1";
 constexpr std::uint8_t MatchRom = 0x55;
 constexpr std::uint8_t IdleBus = 0xFF;
 
-/// Runs an operation on the line; a line that is lost in the middle counts as failed.
+/// Runs an operation on the line; if the line is lost meanwhile, the operation has failed.
 template <typename Operation>
 bool Succeeds(Operation&& operation) {
   try {
@@ -66,22 +66,48 @@ std::int16_t SerialOneWire::TMSetup(std::int32_t handle) {
 
 std::int16_t SerialOneWire::TMNext(std::int32_t handle, OneWireState& state) {
   if (!IsOpen(handle)) {
-    return 0;
+    return BadRead;
   }
   const bool behindTheLast = state.Found && state.Branch == OneWireState::None;
-  const bool found = !behindTheLast && Succeeds([&] { return FindNext(state); });
-  if (!found) {
+  std::int16_t result = BadRead;
+  Succeeds([&] {
+    result = behindTheLast ? ConfirmEnd(state) : FindNext(state);
+    return true;
+  });
+  if (result != DeviceFound) {
     state = {};
   }
-  return ResultOf(found);
+  return result;
 }
 
-bool SerialOneWire::FindNext(OneWireState& state) {
-  if (chip_->Reset() != Presence::Devices) {
-    return false;
+std::int16_t SerialOneWire::FindNext(OneWireState& state) {
+  switch (chip_->Reset()) {
+    case Presence::Devices:
+      break;
+    case Presence::None:
+      // In the middle of a walk there were devices a moment ago, so the end was not reached but missed.
+      return chip_->Answers() && !state.Found ? EndOfBus : BadRead;
+    case Presence::Shorted:  // as a button does while it is pressed on
+      return BadRead;
   }
   const auto answer = chip_->Search(PathToNext(state));
-  return answer && TakeFound(*answer, state);
+  return answer && TakeFound(*answer, state) ? DeviceFound : BadRead;
+}
+
+// The bits of a search that tell of devices left have no check byte: one that got lost would end the walk
+// early, and who counts devices would take a resting button for gone. So the last device is asked for once
+// more.
+std::int16_t SerialOneWire::ConfirmEnd(const OneWireState& last) {
+  switch (chip_->Reset()) {
+    case Presence::Devices:
+      break;
+    case Presence::None:
+      return chip_->Answers() ? EndOfBus : BadRead;
+    case Presence::Shorted:
+      return BadRead;
+  }
+  const auto answer = chip_->Search(PathTo(last.Rom));
+  return answer && IsLast(*answer) ? EndOfBus : BadRead;
 }
 
 std::int16_t SerialOneWire::TMRom(std::int32_t handle, OneWireState& state, OneWireRom& rom) {

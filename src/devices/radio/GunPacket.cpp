@@ -24,7 +24,7 @@ GunPacket ReadGunPacket(const ReceivedFrame& frame) {
   GunPacket packet{};
   const std::size_t length = HeaderLength + frame.Data[0] + 1;
   if (length > packet.size()) {
-    throw RuntimeError(9);
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
   std::copy_n(frame.Data.begin(), length, packet.begin());
   return packet;
@@ -32,7 +32,7 @@ GunPacket ReadGunPacket(const ReceivedFrame& frame) {
 
 std::uint8_t ByteOf(int value) {
   if (value < 0 || value > 255) {
-    throw RuntimeError(6);
+    throw RuntimeError(Fault::Overflow);
   }
   return static_cast<std::uint8_t>(value);
 }

@@ -5,7 +5,7 @@
 #include <span>
 #include <vector>
 
-#include "devices/radio/FrameParser.h"
+#include "devices/radio/XBeeFrameParser.h"
 
 /// What goes between us and a gun in the data of a frame, either way:
 ///

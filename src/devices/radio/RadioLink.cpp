@@ -13,25 +13,17 @@ constexpr milliseconds ShortWait{12};
 }  // namespace
 
 RadioLink::RadioLink(SerialPort& port, CommPort& commPort, EventPump& events, std::function<bool()> stopped)
-    : port_(port), commPort_(commPort), events_(events), stopped_(std::move(stopped)) {}
-
-RadioLink::~RadioLink() {
-  XBee_CloseCommPort();
-}
+    : commPort_(commPort), events_(events), job_(port, events, "radio-modem", std::move(stopped)) {}
 
 void RadioLink::OpenXBeePort() {
   parser_ = {};
-  commPort_.CloseIfOpen();
+  job_.Close();
   receivedFrameType_ = 0;
   try {
-    commPort_.Open(LineSettings);
+    job_.Open(commPort_.Device(), LineSettings);
   } catch (const RuntimeError&) {
     return;  // a closed line has its own fault, at the first byte
   }
-}
-
-void RadioLink::XBee_CloseCommPort() {
-  commPort_.CloseIfOpen();
 }
 
 void RadioLink::SendGunPacket(std::uint8_t playerId, const XBeeAddress& address, std::uint8_t byte2,
@@ -48,13 +40,7 @@ void RadioLink::SendAtCommand(std::uint8_t frameId, const AtLetters& letters,
 void RadioLink::Send(std::span<const std::uint8_t> frame) {
   receivedFrameType_ = 0;
   for (const std::uint8_t byte : frame) {
-    if (Stopped()) {
-      return;
-    }
-    try {
-      port_.Output(byte);
-    } catch (const RuntimeError& fault) {
-      lineFault_ = fault;
+    if (!job_.Send(byte)) {
       return;
     }
     ++bytesSent_;
@@ -63,16 +49,14 @@ void RadioLink::Send(std::span<const std::uint8_t> frame) {
 }
 
 bool RadioLink::WaitForFrame(bool longWait) {
-  const WaitResult result =
-      events_.WaitFor([this] { return TakeFrame() || Stopped(); }, longWait ? LongWait : ShortWait);
-  programCloses_ |= result == WaitResult::Ended;
-  return receivedFrameType_ != 0;
+  receivedFrameType_ = 0;
+  return job_.WaitUntil([this] { return TakeFrame(); }, longWait ? LongWait : ShortWait) == LineWait::Met;
 }
 
 bool RadioLink::TakeFrame() {
   receivedFrameType_ = 0;
   while (receivedFrameType_ == 0) {
-    const auto byte = NextByte();
+    const auto byte = job_.Take();
     if (!byte) {
       return false;
     }
@@ -81,24 +65,8 @@ bool RadioLink::TakeFrame() {
   return true;
 }
 
-std::optional<std::uint8_t> RadioLink::NextByte() {
-  if (Stopped()) {
-    return std::nullopt;
-  }
-  try {
-    return port_.InBufferCount() >= 1 ? std::optional(port_.Input()) : std::nullopt;
-  } catch (const RuntimeError& fault) {
-    lineFault_ = fault;
-    return std::nullopt;
-  }
-}
-
-bool RadioLink::Stopped() const {
-  return programCloses_ || lineFault_ || stopped_();
-}
-
 void RadioLink::ThrowIfLineLost() const {
-  if (lineFault_ && !programCloses_ && !stopped_()) {
-    throw RuntimeError(*lineFault_);
+  if (job_.Fault() && !job_.Stopped()) {
+    throw RuntimeError(job_.Fault()->Error);
   }
 }

@@ -2,14 +2,13 @@
 
 #include <cstdint>
 #include <functional>
-#include <optional>
 #include <span>
 
 #include "core/line/CommPort.h"
-#include "devices/radio/FrameParser.h"
+#include "core/line/SerialJob.h"
 #include "devices/radio/GunPacket.h"
+#include "devices/radio/XBeeFrameParser.h"
 #include "platform/EventPump.h"
-#include "platform/RuntimeError.h"
 #include "platform/SerialPort.h"
 
 /// The way to the guns for one job: a radio modem on the serial line of the settings. Leaves the line closed.
@@ -22,15 +21,12 @@ class RadioLink {
 
   /// `stopped` tells in the middle of waits that the job is to end; it must depend on what events change.
   RadioLink(SerialPort& port, CommPort& commPort, EventPump& events, std::function<bool()> stopped);
-  ~RadioLink();
-  RadioLink(const RadioLink&) = delete;
-  RadioLink& operator=(const RadioLink&) = delete;
 
   /// Opens the line and forgets what came before. A line that does not open is not reported here: the first
   /// byte sent finds out.
   void OpenXBeePort();
 
-  void XBee_CloseCommPort();
+  void XBee_CloseCommPort() { job_.Close(); }
 
   /// Sends a packet to the gun `playerId` behind the modem at `address`.
   void SendGunPacket(std::uint8_t playerId, const XBeeAddress& address, std::uint8_t byte2,
@@ -52,7 +48,7 @@ class RadioLink {
   const ReceivedFrame& Frame() const { return parser_.Frame(); }
 
   /// True when the job is to end.
-  bool Stopped() const;
+  bool Stopped() const { return job_.Over(); }
 
   /// Throws what went wrong with the line, unless the job was stopped anyway.
   void ThrowIfLineLost() const;
@@ -61,15 +57,11 @@ class RadioLink {
 
  private:
   void Send(std::span<const std::uint8_t> frame);
-  std::optional<std::uint8_t> NextByte();
 
-  SerialPort& port_;
   CommPort& commPort_;
   EventPump& events_;
-  std::function<bool()> stopped_;
-  FrameParser parser_;
+  SerialJob job_;
+  XBeeFrameParser parser_;
   std::uint8_t receivedFrameType_ = 0;
-  bool programCloses_ = false;
-  std::optional<RuntimeError> lineFault_;
   std::uint32_t bytesSent_ = 0;
 };

@@ -8,7 +8,6 @@
 #include "devices/radio/GunSearch.h"
 #include "devices/radio/RadioLink.h"
 #include "devices/radio/ScoreFetch.h"
-#include "platform/ErrorReport.h"
 #include "ui/Text.h"
 #include "ui/WaitCursor.h"
 #include "ui_RemoteManage.h"
@@ -21,7 +20,11 @@ constexpr std::int16_t MostIds = 224;
 }  // namespace
 
 RemoteManage::RemoteManage(const Parts& parts, QWidget* parent)
-    : QDialog(parent), ui_(std::make_unique<Ui::RemoteManage>()), parts_(parts), maxPlayerId_(FewestIds) {
+    : QDialog(parent),
+      ui_(std::make_unique<Ui::RemoteManage>()),
+      parts_(parts),
+      maxPlayerId_(FewestIds),
+      commands_(*this, parts.Boxes) {
   ui_->setupUi(this);
   SetUpList();
   RemoteManage::SetPlayersFound(0);
@@ -31,15 +34,15 @@ RemoteManage::RemoteManage(const Parts& parts, QWidget* parent)
     place.setRetainSizeWhenHidden(true);
     progress->setSizePolicy(place);
   }
-  connect(ui_->SearchGunsButton, &QPushButton::clicked, this, &RemoteManage::SearchForGuns);
-  connect(ui_->GetScoresButton, &QPushButton::clicked, this, &RemoteManage::GetScores);
+  commands_.Connect(*this, {{ui_->SearchGunsButton, &RemoteManage::SearchForGuns},
+                            {ui_->GetScoresButton, &RemoteManage::GetScores}});
   connect(ui_->Close, &QPushButton::clicked, this, &QDialog::reject);
 }
 
 RemoteManage::~RemoteManage() = default;
 
 void RemoteManage::SetUpList() {
-  list_ = new GunListModel(QString::fromStdString(parts_.Strings.Text(104)), this);
+  list_ = new GunListModel(Text(parts_.Strings, 104), this);
   QFont figures = ui_->DataList->font();
   figures.setPointSizeF(figures.pointSizeF() * 1.25);
   ui_->DataList->setFont(figures);
@@ -72,31 +75,22 @@ void RemoteManage::ShareListWidth() {
 
 void RemoteManage::SearchForGuns() {
   maxPlayerId_ = ui_->Guns128->isChecked() ? FewestIds : MostIds;
-  Run([this](RadioLink& link) {
+  Work([this](RadioLink& link) {
     GunSearch(link, parts_.Events, parts_.Strings, guns_, *this).SearchGuns(maxPlayerId_);
   });
 }
 
 void RemoteManage::GetScores() {
-  Run([this](RadioLink& link) {
+  Work([this](RadioLink& link) {
     ScoreFetch(link, parts_.Events, parts_.Time, parts_.Strings, parts_.Scores, guns_, *this).GetScores();
   });
-}
-
-void RemoteManage::Run(const std::function<void(RadioLink&)>& job) {
-  ++runs_;
-  ReportErrors(parts_.Boxes, [&] { Work(job); });
-  --runs_;
-  if (closing_ && runs_ == 0) {
-    QDialog::reject();
-  }
 }
 
 void RemoteManage::Work(const std::function<void(RadioLink&)>& job) {
   const WaitCursor cursor;
   const int run = ++latestRun_;
   RadioLink link(parts_.MSComm1, parts_.Port, parts_.Events,
-                 [this, run] { return closing_ || run != latestRun_; });
+                 [this, run] { return commands_.CloseRequested() || run != latestRun_; });
   try {
     job(link);
   } catch (const RuntimeError&) {
@@ -107,15 +101,14 @@ void RemoteManage::Work(const std::function<void(RadioLink&)>& job) {
 }
 
 void RemoteManage::reject() {
-  closing_ = true;
-  if (runs_ == 0) {
+  if (commands_.MayClose()) {
     QDialog::reject();
   }
 }
 
 void RemoteManage::SetStatus(const std::string& text) {
   ui_->StatusLabel->setText(QString::fromStdString(text));
-  const bool running = runs_ > 0 && text.ends_with("...");
+  const bool running = commands_.Running() && text.ends_with("...");
   ui_->ProgressLabel->setVisible(running);
   ui_->Progress->setVisible(running);
 }

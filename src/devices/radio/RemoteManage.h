@@ -13,6 +13,7 @@
 #include "platform/EventPump.h"
 #include "platform/MessageBoxes.h"
 #include "platform/SerialPort.h"
+#include "ui/Commands.h"
 
 class GunListModel;
 class RadioLink;
@@ -52,7 +53,6 @@ class RemoteManage : public QDialog, private RadioDisplay {
   void SearchForGuns();
   void GetScores();
   /// Runs a job on a link of its own; whatever ends it, the line is closed and the pointer back.
-  void Run(const std::function<void(RadioLink&)>& job);
   void Work(const std::function<void(RadioLink&)>& job);
 
   void SetStatus(const std::string& text) override;
@@ -67,6 +67,5 @@ class RemoteManage : public QDialog, private RadioDisplay {
   GunTable guns_;
   std::int16_t maxPlayerId_;  ///< 128 or 224: ids that the last search tried
   int latestRun_ = 0;
-  int runs_ = 0;  ///< runs on the stack
-  bool closing_ = false;
+  Commands commands_;
 };

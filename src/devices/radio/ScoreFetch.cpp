@@ -138,7 +138,7 @@ int ScoreFetch::TakeBlock() {
   const std::size_t start = answer_[6];
   const std::size_t length = answer_[7] + 1U;
   if (dataOffset + length > answer_.size()) {
-    throw RuntimeError(9);
+    throw RuntimeError(Fault::SubscriptOutOfRange);
   }
   std::copy_n(answer_.begin() + dataOffset, length, buffer_.begin() + static_cast<std::ptrdiff_t>(start));
   return static_cast<int>(length);

@@ -16,9 +16,7 @@
 
 namespace {
 
-constexpr int UnrecognizedFormat = 3343;
-
-/// A file that goes away unless it was moved.
+/// A file that is deleted at the end unless it has been renamed.
 class NewFile {
  public:
   NewFile(std::string path, const std::string& source) : path_(std::move(path)) {
@@ -49,14 +47,14 @@ void SyncFolderOf(const std::string& path) {
   }
 }
 
-/// Gives the old file a second name that nothing has, so that it is there under one of them at every instant.
+/// Gives the old file a second, unused name, so that it exists under one of the two at every instant.
 std::string KeepOld(const std::string& path) {
   for (int number = 1;; ++number) {
     std::string kept = path + ".jet" + (number == 1 ? "" : std::to_string(number));
     std::error_code error;
     if (std::filesystem::exists(kept)) {
       if (std::filesystem::equivalent(kept, path, error)) {
-        return kept;  // left by a conversion that broke off
+        return kept;  // left by an interrupted conversion
       }
       continue;
     }
@@ -86,7 +84,7 @@ OldDatabaseReport JetConverter::Convert(const std::string& path, const std::stri
   try {
     constexpr std::uintmax_t smallestPage = 2048;
     if (std::filesystem::file_size(path) % smallestPage != 0) {
-      throw RuntimeError(UnrecognizedFormat, "It is cut short.");
+      throw RuntimeError(Fault::UnrecognizedDatabase, "It is cut short.");
     }
     const NewFile newFile(path + ".new", emptyDatabase);
     OldDatabaseReport report = ReadInto(newFile.Path(), path, table);
@@ -96,9 +94,9 @@ OldDatabaseReport JetConverter::Convert(const std::string& path, const std::stri
     SyncFolderOf(path);
     return report;
   } catch (const std::filesystem::filesystem_error& error) {
-    throw RuntimeError(UnrecognizedFormat, error.code().message() + ".");
+    throw RuntimeError(Fault::UnrecognizedDatabase, error.code().message() + ".");
   } catch (const RuntimeError& error) {
-    throw RuntimeError(UnrecognizedFormat, error.what());
+    throw RuntimeError(Fault::UnrecognizedDatabase, error.what());
   }
 }
 
@@ -116,10 +114,10 @@ OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const std::
     onRows_(import.Rows());
   });
   if (end.TimedOut) {
-    throw RuntimeError(UnrecognizedFormat, "It is damaged: reading it did not come to an end.");
+    throw RuntimeError(Fault::UnrecognizedDatabase, "It is damaged: reading it did not come to an end.");
   }
   if (!end.Succeeded || !stream.Ended()) {
-    throw RuntimeError(UnrecognizedFormat, "It is damaged. " + end.Error);
+    throw RuntimeError(Fault::UnrecognizedDatabase, "It is damaged. " + end.Error);
   }
   import.Finish();
   report.Rows = import.Rows();

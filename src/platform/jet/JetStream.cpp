@@ -11,7 +11,7 @@ constexpr std::uint64_t MostColumns = 1024;
 constexpr std::uint64_t MostBytesOfValue = std::uint64_t{1} << 30U;
 
 [[noreturn]] void FailForm() {
-  throw RuntimeError(3343, "It is damaged: its rows make no sense.");
+  throw RuntimeError(Fault::UnrecognizedDatabase, "It is damaged: its rows make no sense.");
 }
 
 }  // namespace

@@ -10,8 +10,8 @@ namespace {
 
 constexpr std::chrono::milliseconds BusyTimeout(1000);
 
-/// A value's share in the checksum of its row. Numbers count by their value, since a column may keep a whole
-/// one as either kind.
+/// A value's share of its row's checksum. An integer and a double of equal value hash alike, since a column
+/// may store a whole number as either.
 std::uint64_t HashOf(const Value& value) {
   if (const auto* integer = std::get_if<std::int64_t>(&value)) {
     return std::hash<double>()(static_cast<double>(*integer)) + 1;
@@ -73,7 +73,8 @@ void TableImport::SetColumns(const std::vector<std::string>& columns) {
     }
   }
   if (targets_.empty()) {
-    throw RuntimeError(3343, "Its table " + table_.Name() + " has none of the columns that are needed.");
+    throw RuntimeError(Fault::UnrecognizedDatabase,
+                       "Its table " + table_.Name() + " has none of the columns that are needed.");
   }
   insert_ = SqliteStatement(connection_, "INSERT INTO [" + table_.Name() + "] (" + names + ") VALUES (" +
                                              values + ") RETURNING " + names);
@@ -93,7 +94,8 @@ void TableImport::AddRow(const std::vector<Value>& row) {
     for (std::size_t i = 0; i < fitting.size(); ++i) {
       insert_.Read(static_cast<int>(i), stored);
       if (!std::holds_alternative<std::monostate>(fitting[i]) && HashOf(stored) != HashOf(fitting[i])) {
-        throw RuntimeError(3343, "A value of its column " + targets_[i].Column.Name + " does not fit.");
+        throw RuntimeError(Fault::UnrecognizedDatabase,
+                           "A value of its column " + targets_[i].Column.Name + " does not fit.");
       }
       hash = Mixed(hash, HashOf(stored));
     }
@@ -140,6 +142,6 @@ void TableImport::Finish() {
     ++count;
   }
   if (count != rows_ || checksum != checksum_) {
-    throw RuntimeError(3343, "The new file does not hold what was written to it.");
+    throw RuntimeError(Fault::UnrecognizedDatabase, "The new file does not hold what was written to it.");
   }
 }

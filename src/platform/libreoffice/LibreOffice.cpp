@@ -1,9 +1,6 @@
 #include "platform/libreoffice/LibreOffice.h"
 
 #include <dlfcn.h>
-#include <fcntl.h>
-#include <spawn.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 #include <chrono>
@@ -17,8 +14,6 @@
 #include "platform/libreoffice/OfficeClient.h"
 
 namespace {
-
-constexpr int CannotStart = 429;
 
 std::string NewPipeName() {
   std::random_device random;
@@ -39,13 +34,13 @@ void LibreOffice::LoadModule() {
   if (client_ != nullptr) {
     return;
   }
-  // A call to a LibreOffice that has just died is to fail, and not to end this program.
+  // A call to a LibreOffice that has just died must fail instead of ending this program.
   std::signal(SIGPIPE, SIG_IGN);
   // Never unloaded: LibreOffice's libraries keep threads of their own.
   void* const module = dlopen((folder_ + "/libtessarine-office.so").c_str(), RTLD_NOW | RTLD_LOCAL);
   void* const symbol = module == nullptr ? nullptr : dlsym(module, NewOfficeClientName);
   if (symbol == nullptr) {
-    throw RuntimeError(CannotStart, dlerror());
+    throw RuntimeError(Fault::CannotCreateObject, dlerror());
   }
   client_.reset(reinterpret_cast<NewOfficeClientFunction*>(symbol)());
 }
@@ -62,37 +57,24 @@ void LibreOffice::StartHost() {
   const std::string office = client_->ProgramFolder() + "/soffice.bin";
   const std::string host = folder_ + "/tessarine-office-host";
   if (access(office.c_str(), X_OK) != 0) {
-    throw RuntimeError(CannotStart, "There is no program " + office);
+    throw RuntimeError(Fault::CannotCreateObject, "There is no program " + office);
   }
   pipe_ = NewPipeName();
-  int leash[2];
-  if (pipe2(leash, O_CLOEXEC) != 0) {
-    throw RuntimeError(CannotStart, "No pipe");
+  try {
+    Pipe leash;
+    host_.emplace(std::vector<std::string>{host, office, pipe_},
+                  StandardStreams{.Input = leash.ReadEnd.Number()});
+    leash_ = std::move(leash.WriteEnd);
+  } catch (const RuntimeError&) {
+    throw RuntimeError(Fault::CannotCreateObject, "The program " + host + " cannot be started");
   }
-  posix_spawn_file_actions_t actions;
-  posix_spawn_file_actions_init(&actions);
-  posix_spawn_file_actions_adddup2(&actions, leash[0], STDIN_FILENO);
-  char* const arguments[] = {const_cast<char*>(host.c_str()), const_cast<char*>(office.c_str()), pipe_.data(),
-                             nullptr};
-  const int failure = posix_spawn(&host_, host.c_str(), &actions, nullptr, arguments, environ);
-  posix_spawn_file_actions_destroy(&actions);
-  close(leash[0]);
-  if (failure != 0) {
-    close(leash[1]);
-    host_ = 0;
-    throw RuntimeError(CannotStart, "The program " + host + " cannot be started");
-  }
-  leash_ = leash[1];
 }
 
 bool LibreOffice::HostRuns() {
-  if (host_ != 0 && waitpid(host_, nullptr, WNOHANG) != 0) {
-    close(leash_);
-    leash_ = -1;
-    host_ = 0;
-    ready_ = false;
+  if (host_ && !host_->Running()) {
+    ForgetHost();
   }
-  return host_ != 0;
+  return host_.has_value();
 }
 
 WordState LibreOffice::State() {
@@ -105,7 +87,7 @@ WordState LibreOffice::State() {
 
 std::unique_ptr<WordDocument> LibreOffice::Add(const std::string& path) {
   if (State() != WordState::Ready) {
-    throw RuntimeError(CannotStart, "The word processor does not run");
+    throw RuntimeError(Fault::CannotCreateObject, "The word processor does not run");
   }
   return client_->Add(path);
 }
@@ -120,13 +102,16 @@ void LibreOffice::Quit() noexcept {
   if (!HostRuns()) {
     return;
   }
-  // It is not asked to end, since one that hangs would not answer; it has nothing to save.
+  // LibreOffice is not asked to quit: it would not answer if it hangs, and it has nothing to save.
   client_->Disconnect();
-  close(leash_);
-  leash_ = -1;
-  // The host lets nothing hold it up for long; waiting for it leaves no process behind this one.
-  while (waitpid(host_, nullptr, 0) < 0 && errno == EINTR) {
-  }
-  host_ = 0;
+  leash_.Close();
+  // The host ends promptly whatever LibreOffice does; waiting for it leaves no process behind.
+  host_->Wait();
+  ForgetHost();
+}
+
+void LibreOffice::ForgetHost() {
+  leash_.Close();
+  host_.reset();
   ready_ = false;
 }

@@ -1,22 +1,22 @@
 #pragma once
 
-#include <sys/types.h>
-
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
 #include "platform/WordProcessor.h"
+#include "platform/linux/ChildProcess.h"
 
 class OfficeClient;
 
 /// LibreOffice Writer as the word processor, with a profile of its own, so that it never disturbs the
-/// operator's. Its libraries are loaded at the first start only. The process runs under a small host program,
-/// which ends it and clears up when this program ends, however that happens.
+/// operator's. Its libraries are not loaded before the first start. The process runs under a small host
+/// program, which kills it and cleans up when this program ends, however that happens.
 class LibreOffice : public WordProcessor {
  public:
-  /// `folder`: where the module and the host program lie.
+  /// `folder` holds the module and the host program.
   explicit LibreOffice(std::string folder);
   ~LibreOffice() override;
 
@@ -30,13 +30,14 @@ class LibreOffice : public WordProcessor {
  private:
   void LoadModule();
   void StartHost();
-  /// True while the host runs; forgets it when it has ended.
+  /// True while the host runs. Once it has ended, resets what belongs to it.
   bool HostRuns();
+  void ForgetHost();
 
   std::string folder_;
   std::unique_ptr<OfficeClient> client_;
   std::string pipe_;  ///< name on which LibreOffice listens
-  pid_t host_ = 0;    ///< 0 when none was started
-  int leash_ = -1;    ///< the host ends when this is closed
+  std::optional<ChildProcess> host_;
+  Descriptor leash_;  ///< the host ends when this is closed
   bool ready_ = false;
 };

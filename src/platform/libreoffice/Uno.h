@@ -12,7 +12,7 @@
 
 #include "platform/RuntimeError.h"
 
-/// Shared by the module's parts: texts, URLs and failures of LibreOffice in the program's terms.
+/// Conversions shared by the module: LibreOffice's texts, URLs and exceptions in the program's terms.
 namespace Uno {
 
 using com::sun::star::beans::PropertyValue;
@@ -33,12 +33,12 @@ inline std::string FromOffice(const OUString& text) {
 inline OUString UrlOf(const std::string& path) {
   OUString url;
   if (osl::FileBase::getFileURLFromSystemPath(ToOffice(path), url) != osl::FileBase::E_None) {
-    throw RuntimeError(75, "Path/File access error: " + path);
+    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
   }
   return url;
 }
 
-/// Arguments by name, as LibreOffice takes them.
+/// Named arguments, as LibreOffice takes them.
 inline Sequence<PropertyValue> Properties(std::initializer_list<std::pair<const char*, Any>> values) {
   Sequence<PropertyValue> properties(static_cast<sal_Int32>(values.size()));
   PropertyValue* next = properties.getArray();
@@ -50,13 +50,13 @@ inline Sequence<PropertyValue> Properties(std::initializer_list<std::pair<const 
   return properties;
 }
 
-/// Runs `operation`; a failure of LibreOffice, or its death, becomes RuntimeError 440.
+/// Runs `operation`; an exception from LibreOffice, or its death, becomes RuntimeError 440.
 template <typename Operation>
 auto Call(Operation&& operation) {
   try {
     return operation();
   } catch (const com::sun::star::uno::Exception& failure) {
-    throw RuntimeError(440, "Automation error: " + FromOffice(failure.Message));
+    throw RuntimeError(Fault::AutomationError, "Automation error: " + FromOffice(failure.Message));
   }
 }
 

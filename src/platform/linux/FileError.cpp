@@ -6,15 +6,15 @@ RuntimeError FileError(int errorNumber, const std::string& path) {
   switch (errorNumber) {
     case ENOSPC:
     case EDQUOT:
-      return {61, "Disk full: " + path};
+      return {Fault::DiskFull, "Disk full: " + path};
     case EACCES:
     case EPERM:
     case EROFS:
-      return {70, "Permission denied: " + path};
+      return {Fault::PermissionDenied, "Permission denied: " + path};
     case ENOENT:
     case ENOTDIR:
-      return {76, "Path not found: " + path};
+      return {Fault::PathNotFound, "Path not found: " + path};
     default:
-      return {75, "Path/File access error: " + path};
+      return {Fault::PathAccess, "Path/File access error: " + path};
   }
 }

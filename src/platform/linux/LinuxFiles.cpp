@@ -13,31 +13,15 @@
 #include <string_view>
 #include <utility>
 
+#include "platform/linux/Descriptor.h"
 #include "platform/linux/FileError.h"
 
 namespace {
 
-class Descriptor {
- public:
-  explicit Descriptor(int number) : number_(number) {}
-  ~Descriptor() {
-    if (number_ >= 0) {
-      close(number_);
-    }
-  }
-  Descriptor(const Descriptor&) = delete;
-  Descriptor& operator=(const Descriptor&) = delete;
-
-  int Number() const { return number_; }
-
- private:
-  int number_;
-};
-
-// What `path` finally names, which need not exist.
+// The path behind all symbolic links at the end of `path`; it need not exist.
 std::string FollowLinks(std::string path) {
-  constexpr int MostLinks = 40;
-  for (int links = 0; links < MostLinks; ++links) {
+  constexpr int mostLinks = 40;
+  for (int links = 0; links < mostLinks; ++links) {
     std::error_code error;
     const std::filesystem::path target = std::filesystem::read_symlink(path, error);
     if (error) {
@@ -48,7 +32,7 @@ std::string FollowLinks(std::string path) {
   throw FileError(ELOOP, path);
 }
 
-// A new, empty file of a name that nothing else has, which goes away unless it is renamed.
+// A new, empty file with a unique name, deleted at the end unless it has been renamed.
 class TemporaryFile {
  public:
   explicit TemporaryFile(const std::string& folder) : path_(NewName(folder)), file_(Create(path_)) {}
@@ -94,13 +78,13 @@ bool WriteAll(int file, std::string_view bytes) {
   return true;
 }
 
-// Gives the new file the permissions of the old one.
+// Gives the new file the old one's permissions and, where allowed, its owner.
 bool TakeOver(int file, const struct stat& old) {
   struct stat own {};
   if (fstat(file, &own) != 0) {
     return false;
   }
-  // Only an administrator may give a file away; for anyone else it becomes the writer's own.
+  // Only root may give a file away; for anyone else the new file belongs to the writer.
   if ((own.st_uid != old.st_uid || own.st_gid != old.st_gid) && fchown(file, old.st_uid, old.st_gid) != 0 &&
       errno != EPERM) {
     return false;
@@ -108,7 +92,7 @@ bool TakeOver(int file, const struct stat& old) {
   return fchmod(file, old.st_mode & 07777) == 0;
 }
 
-// Makes the folder's entries durable; some file systems have no such operation.
+// Makes the folder's entries durable. File systems that do not support this (EINVAL) count as done.
 bool SyncFolder(const std::string& folder) {
   const Descriptor descriptor(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
   return descriptor.Number() >= 0 && (fsync(descriptor.Number()) == 0 || errno == EINVAL);
@@ -129,19 +113,19 @@ bool LinuxFiles::FolderExists(const std::string& path) const {
 void LinuxFiles::CreateFolder(const std::string& path) {
   if (mkdir(path.c_str(), 0777) != 0) {
     if (errno == ENOENT || errno == ENOTDIR) {
-      throw RuntimeError(76, "Path not found: " + path);
+      throw RuntimeError(Fault::PathNotFound, "Path not found: " + path);
     }
-    throw RuntimeError(75, "Path/File access error: " + path);
+    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
   }
 }
 
 std::uint64_t LinuxFiles::FileLen(const std::string& path) const {
   struct stat info {};
   if (stat(path.c_str(), &info) != 0 && (errno == ENOENT || errno == ENOTDIR)) {
-    throw RuntimeError(53, "File not found: " + path);
+    throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
   }
   if (!S_ISREG(info.st_mode) || faccessat(AT_FDCWD, path.c_str(), R_OK, AT_EACCESS) != 0) {
-    throw RuntimeError(75, "Path/File access error: " + path);
+    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
   }
   return static_cast<std::uint64_t>(info.st_size);
 }
@@ -149,11 +133,11 @@ std::uint64_t LinuxFiles::FileLen(const std::string& path) const {
 std::string LinuxFiles::Read(const std::string& path) const {
   const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
   if (file.Number() < 0 && (errno == ENOENT || errno == ENOTDIR)) {
-    throw RuntimeError(53, "File not found: " + path);
+    throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
   }
   struct stat info {};
   if (file.Number() < 0 || fstat(file.Number(), &info) != 0 || !S_ISREG(info.st_mode)) {
-    throw RuntimeError(75, "Path/File access error: " + path);
+    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
   }
   std::string bytes;
   bytes.reserve(static_cast<std::size_t>(info.st_size));
@@ -164,7 +148,7 @@ std::string LinuxFiles::Read(const std::string& path) const {
       return bytes;
     }
     if (count < 0 && errno != EINTR) {
-      throw RuntimeError(75, "Path/File access error: " + path);
+      throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
     }
     bytes.append(buffer.data(), count < 0 ? 0 : static_cast<std::size_t>(count));
   }
@@ -207,6 +191,29 @@ void LinuxFiles::Write(const std::string& path, const std::string& bytes) {
   }
 }
 
+void LinuxFiles::Append(const std::string& path, const std::string& bytes) {
+  const Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC | O_NONBLOCK, 0644));
+  struct stat info {};
+  if (file.Number() < 0 || fstat(file.Number(), &info) != 0) {
+    throw FileError(errno, path);
+  }
+  if (!S_ISREG(info.st_mode)) {
+    throw FileError(EISDIR, path);
+  }
+  if (!WriteAll(file.Number(), bytes)) {
+    throw FileError(errno, path);
+  }
+}
+
+std::uint64_t LinuxFiles::FreeSpace(const std::string& path) const {
+  std::error_code error;
+  const std::filesystem::space_info space = std::filesystem::space(path, error);
+  if (error) {
+    throw FileError(error.value(), path);
+  }
+  return space.available;
+}
+
 std::vector<std::string> LinuxFiles::FileNames(const std::string& folder) const {
   std::vector<std::string> names;
   std::error_code none;
@@ -221,7 +228,7 @@ std::vector<std::string> LinuxFiles::FileNames(const std::string& folder) const 
 
 void LinuxFiles::Rename(const std::string& path, const std::string& newPath) {
   if (!FileExists(path)) {
-    throw RuntimeError(53, "File not found: " + path);
+    throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
   }
   const std::string parent = std::filesystem::path(newPath).parent_path();
   if (rename(path.c_str(), newPath.c_str()) != 0 || !SyncFolder(parent.empty() ? "." : parent)) {
@@ -231,6 +238,7 @@ void LinuxFiles::Rename(const std::string& path, const std::string& newPath) {
 
 void LinuxFiles::Delete(const std::string& path) {
   if (unlink(path.c_str()) != 0) {
-    throw errno == ENOENT ? RuntimeError(53, "File not found: " + path) : FileError(errno, path);
+    throw errno == ENOENT ? RuntimeError(Fault::FileNotFound, "File not found: " + path)
+                          : FileError(errno, path);
   }
 }

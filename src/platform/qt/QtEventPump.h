@@ -1,16 +1,23 @@
 #pragma once
 
 #include "platform/EventPump.h"
+#include "platform/MonotonicClock.h"
 
-/// Waits on the toolkit's event loop, asleep in the operating system until an event comes. Needs a
-/// QCoreApplication.
-class QtEventPump : public EventPump {
+/// Waits on the toolkit's event loop, asleep in the operating system until an event comes, and tells the time
+/// that passes in waits. Needs a QCoreApplication.
+class QtEventPump : public EventPump, public MonotonicClock {
  public:
   void DoEvents() override;
   WaitResult WaitFor(const std::function<bool()>& condition, std::chrono::milliseconds limit) override;
   void Sleep(std::chrono::milliseconds time) override;
   void EndWaits() override { ended_ = true; }
 
+  /// Since the pump was made.
+  std::chrono::microseconds Elapsed() const override {
+    return std::chrono::duration_cast<std::chrono::microseconds>(std::chrono::steady_clock::now() - start_);
+  }
+
  private:
+  const std::chrono::steady_clock::time_point start_ = std::chrono::steady_clock::now();
   bool ended_ = false;
 };

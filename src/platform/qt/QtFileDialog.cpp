@@ -3,10 +3,9 @@
 #include <QDir>
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QPointer>
 #include <QRegularExpression>
 #include <QStandardPaths>
-
-#include "platform/qt/DialogParent.h"
 
 namespace {
 
@@ -26,8 +25,12 @@ QString SuffixOf(const QString& nameFilter) {
   return first.match(nameFilter).captured(1);
 }
 
-QString StartFolder(const QString& fileName, const QString& lastFolder) {
-  const QFileInfo file(fileName);
+QString StartFolder(const FileRequest& request, const QString& lastFolder) {
+  const QString folder = QString::fromStdString(request.Folder);
+  if (!folder.isEmpty() && QDir(folder).exists()) {
+    return folder;
+  }
+  const QFileInfo file(QString::fromStdString(request.Name));
   if (file.isAbsolute() && file.dir().exists()) {
     return file.absolutePath();
   }
@@ -53,27 +56,30 @@ QStringList NameFilters(const std::string& filter) {
   return filters;
 }
 
-std::string QtFileDialog::ShowOpen(const std::string& filter, const std::string& fileName) {
-  return Ask(false, filter, fileName);
+std::optional<std::string> QtFileDialog::ShowOpen(const FileRequest& request) {
+  return Ask(false, request);
 }
 
-std::string QtFileDialog::ShowSave(const std::string& filter, const std::string& fileName) {
-  return Ask(true, filter, fileName);
+std::optional<std::string> QtFileDialog::ShowSave(const FileRequest& request) {
+  return Ask(true, request);
 }
 
-std::string QtFileDialog::Ask(bool save, const std::string& filter, const std::string& fileName) {
-  const QString name = QString::fromStdString(fileName);
+std::optional<std::string> QtFileDialog::Ask(bool save, const FileRequest& request) {
   // Not on the stack: its parent may be destroyed, and the dialog with it, while it is open.
-  const QPointer<QFileDialog> dialog = new QFileDialog(DialogParent(mainWindow_));
+  const QPointer<QFileDialog> dialog = new QFileDialog(parent_());
   dialog->setObjectName(QStringLiteral("CommonDialog1"));
   dialog->setAcceptMode(save ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
   // A name without a file is for the caller to judge, also when opening.
   dialog->setFileMode(QFileDialog::AnyFile);
+  dialog->setOption(QFileDialog::DontUseNativeDialog);
   dialog->setOption(QFileDialog::DontConfirmOverwrite, save);
-  dialog->setNameFilters(NameFilters(filter));
-  dialog->setDirectory(StartFolder(name, lastFolder_));
-  if (!name.isEmpty()) {
-    dialog->selectFile(QFileInfo(name).fileName());
+  if (!request.Title.empty()) {
+    dialog->setWindowTitle(QString::fromStdString(request.Title));
+  }
+  dialog->setNameFilters(NameFilters(request.Filter));
+  dialog->setDirectory(StartFolder(request, lastFolder_));
+  if (!request.Name.empty()) {
+    dialog->selectFile(QFileInfo(QString::fromStdString(request.Name)).fileName());
   }
   if (save) {
     const auto setSuffix = [dialog = dialog.data()](const QString& chosen) {
@@ -86,7 +92,7 @@ std::string QtFileDialog::Ask(bool save, const std::string& filter, const std::s
   const QStringList chosen = accepted ? dialog->selectedFiles() : QStringList();
   delete dialog;
   if (chosen.isEmpty()) {
-    return fileName;
+    return std::nullopt;
   }
   lastFolder_ = QFileInfo(chosen.first()).absolutePath();
   return chosen.first().toStdString();

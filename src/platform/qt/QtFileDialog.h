@@ -1,8 +1,9 @@
 #pragma once
 
-#include <QPointer>
 #include <QStringList>
 #include <QWidget>
+#include <functional>
+#include <utility>
 
 #include "platform/FileDialog.h"
 
@@ -10,19 +11,20 @@
 /// "*.bmp;*.jpg". A pattern list at the end of a description is replaced by the pattern's own.
 QStringList NameFilters(const std::string& filter);
 
-/// Opens in the folder of the file name handed in, else in the folder last chosen from, else in the user's
-/// documents.
+/// The toolkit's own dialogs, not those of a desktop, which look and behave differently from one to the
+/// other. They begin in the folder asked for, else in that of the name, else in the one last chosen from,
+/// else in the user's documents.
 class QtFileDialog : public FileDialog {
  public:
-  /// Window that dialogs belong to while no window of the program is active.
-  void SetMainWindow(QWidget* mainWindow) { mainWindow_ = mainWindow; }
+  /// `parent` tells the window that one opened now belongs to; it may be none.
+  explicit QtFileDialog(std::function<QWidget*()> parent) : parent_(std::move(parent)) {}
 
-  std::string ShowOpen(const std::string& filter, const std::string& fileName) override;
-  std::string ShowSave(const std::string& filter, const std::string& fileName) override;
+  std::optional<std::string> ShowOpen(const FileRequest& request) override;
+  std::optional<std::string> ShowSave(const FileRequest& request) override;
 
  private:
-  std::string Ask(bool save, const std::string& filter, const std::string& fileName);
+  std::optional<std::string> Ask(bool save, const FileRequest& request);
 
-  QPointer<QWidget> mainWindow_;
+  std::function<QWidget*()> parent_;
   QString lastFolder_;
 };

@@ -1,10 +1,32 @@
 #include "platform/qt/QtMessageBoxes.h"
 
+#include <QCloseEvent>
+#include <QKeyEvent>
 #include <QMessageBox>
-
-#include "platform/qt/DialogParent.h"
+#include <QPointer>
 
 namespace {
+
+/// A question that has to be answered: the toolkit would take Escape and the close box for No.
+class QuestionBox : public QMessageBox {
+ public:
+  explicit QuestionBox(QWidget* parent) : QMessageBox(parent) {
+    setWindowFlag(Qt::CustomizeWindowHint);
+    setWindowFlag(Qt::WindowCloseButtonHint, false);
+  }
+
+ protected:
+  void keyPressEvent(QKeyEvent* event) override {
+    if (!event->matches(QKeySequence::Cancel)) {
+      QMessageBox::keyPressEvent(event);
+    }
+  }
+  void closeEvent(QCloseEvent* event) override { event->ignore(); }
+};
+
+QMessageBox* NewBox(BoxButtons buttons, QWidget* parent) {
+  return buttons == BoxButtons::YesNo ? new QuestionBox(parent) : new QMessageBox(parent);
+}
 
 QMessageBox::Icon IconOf(BoxIcon icon) {
   switch (icon) {
@@ -36,6 +58,10 @@ void SetButtons(QMessageBox& box, BoxButtons buttons) {
       box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
       box.setDefaultButton(QMessageBox::Yes);
       break;
+    case BoxButtons::YesNoCancel:
+      box.setStandardButtons(QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel);
+      box.setDefaultButton(QMessageBox::Yes);
+      break;
   }
 }
 
@@ -47,6 +73,10 @@ BoxAnswer AnswerOf(int pressed, BoxButtons buttons) {
       return pressed == QMessageBox::Ok ? BoxAnswer::Ok : BoxAnswer::Cancel;
     case BoxButtons::YesNo:
       return pressed == QMessageBox::Yes ? BoxAnswer::Yes : BoxAnswer::No;
+    case BoxButtons::YesNoCancel:
+      return pressed == QMessageBox::Yes  ? BoxAnswer::Yes
+             : pressed == QMessageBox::No ? BoxAnswer::No
+                                          : BoxAnswer::Cancel;
   }
   return BoxAnswer::Ok;
 }
@@ -56,7 +86,7 @@ BoxAnswer AnswerOf(int pressed, BoxButtons buttons) {
 BoxAnswer QtMessageBoxes::Show(const std::string& text, const std::string& title, BoxIcon icon,
                                BoxButtons buttons) {
   // Not on the stack: its parent may be destroyed, and the box with it, while it is open.
-  const QPointer<QMessageBox> box = new QMessageBox(DialogParent(mainWindow_));
+  const QPointer<QMessageBox> box = NewBox(buttons, parent_());
   box->setTextFormat(Qt::PlainText);
   box->setText(QString::fromStdString(text));
   box->setWindowTitle(QString::fromStdString(title));

@@ -1,18 +1,19 @@
 #pragma once
 
-#include <QPointer>
 #include <QWidget>
+#include <functional>
+#include <utility>
 
 #include "platform/MessageBoxes.h"
 
 class QtMessageBoxes : public MessageBoxes {
  public:
-  /// Window that boxes belong to while no window of the program is active.
-  void SetMainWindow(QWidget* mainWindow) { mainWindow_ = mainWindow; }
+  /// `parent` tells the window that one opened now belongs to; it may be none.
+  explicit QtMessageBoxes(std::function<QWidget*()> parent) : parent_(std::move(parent)) {}
 
   BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,
                  BoxButtons buttons = BoxButtons::Ok) override;
 
  private:
-  QPointer<QWidget> mainWindow_;
+  std::function<QWidget*()> parent_;
 };

@@ -3,21 +3,54 @@
 #include <fcntl.h>
 #include <poll.h>
 #include <sys/file.h>
+#include <sys/ioctl.h>
 #include <termios.h>
 #include <unistd.h>
 
 #include <QSerialPortInfo>
 #include <QStringList>
+#include <algorithm>
 #include <cerrno>
+#include <thread>
 
 #include "platform/RuntimeError.h"
 
 namespace {
 
+using LineClock = std::chrono::steady_clock;
+
 constexpr int invalidPropertyValue = 380;
 
-/// A full output buffer of the system (4096 bytes) takes 2.1 s at 19200 baud.
+/// What the system holds back of the output. Of more bytes than that the first ones are already through.
+constexpr int outputBufferBytes = 4096;
+
+/// A full output buffer takes 2.1 s at 19200 baud.
 constexpr int longestOutputMilliseconds = 3000;
+
+/// A second look at a device while it is opened. The system does not hold root to another program's exclusive
+/// mode, and the toolkit enters that mode itself, so it has to be asked for before. Kept until the toolkit
+/// has opened the device, since letting go of the only descriptor drops the control signals that adapters
+/// live on.
+class Probe {
+ public:
+  explicit Probe(const std::string& device)
+      : descriptor_(::open(device.c_str(), O_RDWR | O_NOCTTY | O_NONBLOCK | O_CLOEXEC)) {}
+  ~Probe() {
+    if (descriptor_ >= 0) {
+      ::close(descriptor_);
+    }
+  }
+  Probe(const Probe&) = delete;
+  Probe& operator=(const Probe&) = delete;
+
+  bool IsExclusive() const {
+    int exclusive = 0;
+    return descriptor_ >= 0 && ::ioctl(descriptor_, TIOCGEXCL, &exclusive) == 0 && exclusive != 0;
+  }
+
+ private:
+  int descriptor_;
+};
 
 bool IsHungUp(int descriptor) {
   pollfd line{descriptor, POLLIN, 0};
@@ -34,7 +67,7 @@ QSerialPort::Parity ParityOf(const QString& text) {
   if (text == QStringLiteral("O")) {
     return QSerialPort::OddParity;
   }
-  throw RuntimeError(invalidPropertyValue, "Invalid property value");
+  throw RuntimeError(invalidPropertyValue);
 }
 
 }  // namespace
@@ -49,39 +82,63 @@ QtSerialPort::~QtSerialPort() {
   Close();
 }
 
-void QtSerialPort::ApplySettings(const std::string& settings) {
+std::chrono::nanoseconds QtSerialPort::LineSettings::TimeOfAByte() const {
+  const int parityBits = Parity == QSerialPort::NoParity ? 0 : 1;
+  return std::chrono::nanoseconds(std::chrono::seconds(1 + DataBits + parityBits + StopBits)) / Baud;
+}
+
+QtSerialPort::LineSettings QtSerialPort::Parse(const std::string& settings) {
   const QStringList parts = QString::fromStdString(settings).toUpper().split(QLatin1Char(','));
   if (parts.size() != 4) {
-    throw RuntimeError(invalidPropertyValue, "Invalid property value");
+    throw RuntimeError(invalidPropertyValue);
   }
-  const int baud = parts[0].toInt();
-  const int dataBits = parts[2].toInt();
-  const int stopBits = parts[3].toInt();
-  if (!QSerialPortInfo::standardBaudRates().contains(baud) || dataBits < 5 || dataBits > 8 || stopBits < 1 ||
-      stopBits > 2) {
-    throw RuntimeError(invalidPropertyValue, "Invalid property value");
+  const LineSettings parsed{parts[0].toInt(), ParityOf(parts[1]), parts[2].toInt(), parts[3].toInt()};
+  if (!QSerialPortInfo::standardBaudRates().contains(parsed.Baud) || parsed.DataBits < 5 ||
+      parsed.DataBits > 8 || parsed.StopBits < 1 || parsed.StopBits > 2) {
+    throw RuntimeError(invalidPropertyValue);
   }
-  port_.setParity(ParityOf(parts[1]));
-  port_.setBaudRate(baud);
-  port_.setDataBits(static_cast<QSerialPort::DataBits>(dataBits));
-  port_.setStopBits(stopBits == 1 ? QSerialPort::OneStop : QSerialPort::TwoStop);
-  port_.setFlowControl(QSerialPort::NoFlowControl);
+  return parsed;
+}
+
+bool QtSerialPort::Apply(const LineSettings& settings) {
+  timeOfAByte_ = settings.TimeOfAByte();
+  return port_.setParity(settings.Parity) && port_.setBaudRate(settings.Baud) &&
+         port_.setDataBits(static_cast<QSerialPort::DataBits>(settings.DataBits)) &&
+         port_.setStopBits(settings.StopBits == 1 ? QSerialPort::OneStop : QSerialPort::TwoStop) &&
+         port_.setFlowControl(QSerialPort::NoFlowControl);
 }
 
 void QtSerialPort::Open(const std::string& device, const std::string& settings) {
   if (PortOpen()) {
-    throw RuntimeError(8005);
+    throw RuntimeError(Fault::PortAlreadyOpen);
   }
-  ApplySettings(settings);
+  Apply(Parse(settings));
   port_.setPortName(QString::fromStdString(device));
+  const Probe probe(device);
+  if (probe.IsExclusive()) {
+    throw RuntimeError(Fault::PortAlreadyOpen);
+  }
   if (!port_.open(QIODevice::ReadWrite)) {
-    // "Permission" means both a device in use and one that this user may not touch.
-    const bool inUse = port_.error() == QSerialPort::PermissionError &&
-                       ::faccessat(AT_FDCWD, device.c_str(), R_OK | W_OK, AT_EACCESS) == 0;
-    throw RuntimeError(inUse ? 8005 : 8002);
+    // "Permission" means a device in use, a locked one, and one that this user may not touch.
+    throw RuntimeError(port_.error() == QSerialPort::PermissionError ? 8005 : 8002);
   }
   TakeExclusively();
+  idleAt_ = LineClock::now();
   ClearInput();
+}
+
+void QtSerialPort::SetSettings(const std::string& settings) {
+  const LineSettings wanted = Parse(settings);
+  Drain();
+  const LineSettings old{port_.baudRate(), port_.parity(), port_.dataBits(),
+                         port_.stopBits() == QSerialPort::OneStop ? 1 : 2};
+  if (!Apply(wanted)) {
+    if (lost_) {
+      throw RuntimeError(Fault::PortLost);
+    }
+    Apply(old);
+    throw RuntimeError(invalidPropertyValue);
+  }
 }
 
 // The toolkit's lock file goes stale after half a minute and knows one name of a device only, and the
@@ -89,31 +146,59 @@ void QtSerialPort::Open(const std::string& device, const std::string& settings) 
 void QtSerialPort::TakeExclusively() {
   if (::flock(port_.handle(), LOCK_EX | LOCK_NB) != 0) {
     port_.close();
-    throw RuntimeError(8005);
+    throw RuntimeError(Fault::PortAlreadyOpen);
   }
 }
 
 void QtSerialPort::Close() {
   if (port_.isOpen()) {
-    ::tcdrain(port_.handle());
+    AwaitIdle();
     port_.close();
   }
   lost_ = false;
 }
 
+void QtSerialPort::Drain() {
+  if (!PortOpen()) {
+    throw RuntimeError(Fault::PortNotOpen);
+  }
+  if (!lost_ && !AwaitIdle()) {
+    Lose();
+  }
+  if (lost_) {
+    throw RuntimeError(Fault::PortLost);
+  }
+}
+
+/// False when the line was lost meanwhile.
+bool QtSerialPort::AwaitIdle() const {
+  int result = 0;
+  do {
+    result = ::tcdrain(port_.handle());
+  } while (result != 0 && errno == EINTR);
+  // That returned at once on a pseudo terminal, and early on adapters with a buffer of their own.
+  std::this_thread::sleep_until(idleAt_);
+  return result == 0;
+}
+
+void QtSerialPort::NoteOutput() {
+  const auto now = LineClock::now();
+  idleAt_ = std::min(std::max(idleAt_, now) + timeOfAByte_, now + outputBufferBytes * timeOfAByte_);
+}
+
 std::size_t QtSerialPort::InBufferCount() {
   if (!PortOpen()) {
-    throw RuntimeError(8018);
+    throw RuntimeError(Fault::PortNotOpen);
   }
   if (lost_ && input_.empty()) {
-    throw RuntimeError(8012);
+    throw RuntimeError(Fault::PortLost);
   }
   return input_.size();
 }
 
 std::uint8_t QtSerialPort::Input() {
   if (InBufferCount() == 0) {
-    throw RuntimeError(62);
+    throw RuntimeError(Fault::PastEndOfFile);
   }
   const std::uint8_t byte = input_.front();
   input_.pop_front();
@@ -123,11 +208,12 @@ std::uint8_t QtSerialPort::Input() {
 // Written past the toolkit's buffer, which would hold a byte back until the event loop runs.
 void QtSerialPort::Output(std::uint8_t byte) {
   if (!PortOpen()) {
-    throw RuntimeError(8018);
+    throw RuntimeError(Fault::PortNotOpen);
   }
   while (!lost_) {
     const auto written = ::write(port_.handle(), &byte, 1);
     if (written == 1) {
+      NoteOutput();
       return;
     }
     const bool full = written == 0 || errno == EAGAIN;
@@ -136,12 +222,12 @@ void QtSerialPort::Output(std::uint8_t byte) {
       Lose();
     }
   }
-  throw RuntimeError(8012);
+  throw RuntimeError(Fault::PortLost);
 }
 
 void QtSerialPort::ClearInput() {
   if (!PortOpen()) {
-    throw RuntimeError(8018);
+    throw RuntimeError(Fault::PortNotOpen);
   }
   if (!lost_) {
     port_.clear(QSerialPort::Input);

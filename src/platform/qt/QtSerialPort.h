@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QSerialPort>
+#include <chrono>
 #include <deque>
 
 #include "platform/SerialPort.h"
@@ -9,8 +10,7 @@
 ///
 /// When the line is lost the device is closed at once, so that nothing spins on it, but the port counts as
 /// open until Close(): received bytes stay readable, then InBufferCount(), Input() and Output() throw
-/// RuntimeError 8012. A line that takes no byte for 3 s is lost too. Open() throws RuntimeError 380 for bad
-/// settings; parity is N, E or O in either case.
+/// RuntimeError 8012. A line that takes no byte for 3 s is lost too. Parity is N, E or O in either case.
 class QtSerialPort final : public SerialPort {
  public:
   QtSerialPort();
@@ -19,19 +19,35 @@ class QtSerialPort final : public SerialPort {
   void Open(const std::string& device, const std::string& settings) override;
   void Close() override;
   bool PortOpen() const override { return lost_ || port_.isOpen(); }
+  void SetSettings(const std::string& settings) override;
   std::size_t InBufferCount() override;
   std::uint8_t Input() override;
   void Output(std::uint8_t byte) override;
+  void Drain() override;
   void ClearInput() override;
 
  private:
-  void ApplySettings(const std::string& settings);
+  struct LineSettings {
+    int Baud;
+    QSerialPort::Parity Parity;
+    int DataBits;
+    int StopBits;
+
+    std::chrono::nanoseconds TimeOfAByte() const;
+  };
+
+  static LineSettings Parse(const std::string& settings);
+  bool Apply(const LineSettings& settings);
   void TakeExclusively();
+  void NoteOutput();
+  bool AwaitIdle() const;
   void TakeReceived();
   void OnError(QSerialPort::SerialPortError error);
   void Lose();
 
   QSerialPort port_;
   std::deque<std::uint8_t> input_;
+  std::chrono::nanoseconds timeOfAByte_{0};
+  std::chrono::steady_clock::time_point idleAt_;  ///< when the bytes put out have had their time on the line
   bool lost_ = false;
 };

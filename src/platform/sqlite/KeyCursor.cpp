@@ -22,7 +22,7 @@ void KeyCursor::MoveBehind() {
 
 void KeyCursor::MoveNext() {
   if (Eof()) {
-    throw RuntimeError(3021);
+    throw RuntimeError(Fault::NoCurrentRecord);
   }
   const std::size_t next = place_ == Place::Gap ? position_ : place_ == Place::Beginning ? 0 : position_ + 1;
   if (next < keys_.Size()) {
@@ -34,7 +34,7 @@ void KeyCursor::MoveNext() {
 
 void KeyCursor::MovePrevious() {
   if (Bof()) {
-    throw RuntimeError(3021);
+    throw RuntimeError(Fault::NoCurrentRecord);
   }
   const std::size_t behind = place_ == Place::End ? keys_.Size() : position_;
   if (behind > 0) {
@@ -44,7 +44,7 @@ void KeyCursor::MovePrevious() {
   }
 }
 
-// A key that was already here belonged to a row that someone else deleted meanwhile.
+// If the key is already in the set, its former row was deleted by someone else and SQLite reused the key.
 void KeyCursor::Append(std::int64_t key) {
   if (const std::optional<std::size_t> stale = keys_.PositionOf(key)) {
     keys_.Erase(*stale);

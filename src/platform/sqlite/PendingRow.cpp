@@ -17,7 +17,7 @@ void PendingRow::Start(::EditMode mode) {
   mode_ = mode;
 }
 
-// Long columns are left to the database, since the first Append has to begin with nothing.
+// Not for long columns: their first Append must start from nothing. The database fills in their defaults.
 void PendingRow::TakeDefaults() {
   std::string defaults;
   for (const SqliteColumn& column : table_.Columns()) {
@@ -43,7 +43,7 @@ void PendingRow::Drop() {
 
 void PendingRow::CheckStarted() const {
   if (mode_ == ::EditMode::None) {
-    throw RuntimeError(3020);
+    throw RuntimeError(Fault::UpdateWithoutEdit);
   }
 }
 
@@ -51,7 +51,7 @@ void PendingRow::Set(std::size_t column, Value value) {
   CheckStarted();
   const SqliteColumn& target = table_.Columns()[column];
   if (target.IsKey && mode_ == ::EditMode::InProgress) {
-    throw RuntimeError(3164, "Field cannot be updated: " + target.Name);
+    throw RuntimeError(Fault::FieldReadOnly, "Field cannot be updated: " + target.Name);
   }
   values_[column] = target.Accept(std::move(value));
 }

@@ -16,7 +16,7 @@ void SkipBlanks(std::string_view& text) {
   text.remove_prefix(first == std::string_view::npos ? text.size() : first);
 }
 
-// Takes the next word, or a name in brackets without these.
+// Takes the next word, or the name between brackets.
 std::string_view TakeWord(std::string_view& text) {
   SkipBlanks(text);
   if (text.starts_with('[')) {
@@ -53,14 +53,14 @@ std::unique_ptr<Recordset> SqliteDatabase::OpenRecordset(const std::string& sour
   const bool limited = TakeKeyword(rest, "WHERE");
   SkipBlanks(rest);
   if (!all || table.empty() || limited == rest.empty()) {
-    throw RuntimeError(3075, "Syntax error in query '" + source + "'.");
+    throw RuntimeError(Fault::QuerySyntax, "Syntax error in query '" + source + "'.");
   }
   return std::make_unique<SqliteRecordset>(connection_, table, std::string(rest));
 }
 
 void SqliteDatabase::CommitTrans() {
   if (!group_) {
-    throw RuntimeError(3034);
+    throw RuntimeError(Fault::NoTransaction);
   }
   group_->Commit();
   group_.reset();

@@ -11,8 +11,8 @@ bool IsNoSpace(int systemError) {
   return systemError == ENOSPC || systemError == EDQUOT || systemError == EFBIG;
 }
 
-// SQLite reports a full disk by number only where the system said ENOSPC; a quota or a limit on the file's
-// size comes as an I/O error, whose cause is kept with the file, or in errno when it met the journal.
+// SQLite reports a full disk as such only for ENOSPC. A quota or file-size limit comes as an I/O error; its
+// cause is kept with the file, or in errno if it hit the journal.
 bool NoSpaceLeft(sqlite3* database, int code) {
   if (code != SQLITE_IOERR) {
     return code == SQLITE_FULL;
@@ -25,22 +25,23 @@ bool NoSpaceLeft(sqlite3* database, int code) {
 RuntimeError ConstraintError(int extendedCode, const std::string& message) {
   switch (extendedCode) {
     case SQLITE_CONSTRAINT_NOTNULL:
-      return {3314, "You must enter a value in this field (" + message + ")."};
+      return {Fault::ValueRequired, "You must enter a value in this field (" + message + ")."};
     case SQLITE_CONSTRAINT_UNIQUE:
     case SQLITE_CONSTRAINT_PRIMARYKEY:
     case SQLITE_CONSTRAINT_ROWID:
-      return {3022, "The change would create duplicate values (" + message + ")."};
+      return {Fault::DuplicateKey, "The change would create duplicate values (" + message + ")."};
     case SQLITE_CONSTRAINT_DATATYPE:
-      return {3421, "Data type conversion error."};
+      return {Fault::DataConversion, "Data type conversion error."};
     default:
-      return {3317, "One or more values are prohibited by the validation rule (" + message + ")."};
+      return {Fault::ValueProhibited,
+              "One or more values are prohibited by the validation rule (" + message + ")."};
   }
 }
 
 }  // namespace
 
 RuntimeError UnrecognizedFormat(const std::string& path) {
-  return {3343, "Unrecognized database format '" + path + "'."};
+  return {Fault::UnrecognizedDatabase, "Unrecognized database format '" + path + "'."};
 }
 
 RuntimeError SqliteError(sqlite3* database, const std::string& path) {
@@ -48,25 +49,26 @@ RuntimeError SqliteError(sqlite3* database, const std::string& path) {
   const int code = extendedCode & 0xFF;
   const std::string message = sqlite3_errmsg(database);
   if (extendedCode == SqliteInvalidPattern) {
-    return {93, message};
+    return {Fault::InvalidPattern, message};
   }
   if (NoSpaceLeft(database, code)) {
-    return {3026, "Not enough space on disk: " + path};
+    return {Fault::DatabaseDiskFull, "Not enough space on disk: " + path};
   }
   switch (code) {
     case SQLITE_NOMEM:
       throw std::bad_alloc();
     case SQLITE_BUSY:
     case SQLITE_LOCKED:
-      return {3050, "Could not lock file '" + path + "'."};
+      return {Fault::DatabaseLocked, "Could not lock file '" + path + "'."};
     case SQLITE_READONLY:
-      return {3027, "Cannot update. Database or object is read-only: " + path};
+      return {Fault::DatabaseReadOnly, "Cannot update. Database or object is read-only: " + path};
     case SQLITE_IOERR:
-      return {3043, "Disk error: " + path};
+      return {Fault::DatabaseDiskError, "Disk error: " + path};
     case SQLITE_CANTOPEN:
     case SQLITE_PERM:
     case SQLITE_AUTH:
-      return {3051, "Cannot open the file '" + path + "'. You may lack the permission for it."};
+      return {Fault::DatabaseCannotOpen,
+              "Cannot open the file '" + path + "'. You may lack the permission for it."};
     case SQLITE_CORRUPT:
     case SQLITE_NOTADB:
       return UnrecognizedFormat(path);
@@ -74,8 +76,8 @@ RuntimeError SqliteError(sqlite3* database, const std::string& path) {
       return ConstraintError(extendedCode, message);
     case SQLITE_MISMATCH:
     case SQLITE_TOOBIG:
-      return {3421, "Data type conversion error."};
+      return {Fault::DataConversion, "Data type conversion error."};
     default:
-      return {3000, "Database error: " + message + " (" + path + ")"};
+      return {Fault::DatabaseError, "Database error: " + message + " (" + path + ")"};
   }
 }

@@ -17,7 +17,7 @@ bool Contains(const std::string& type, std::string_view part) {
          }) != type.end();
 }
 
-// SQLite's own rule for a declared type; dates are not among the numbers.
+// SQLite's own rule for a declared type, except that dates are not numbers.
 bool TakesNumbers(const std::string& type) {
   return Contains(type, "INT") || Contains(type, "REAL") || Contains(type, "FLOA") ||
          Contains(type, "DOUB") || Contains(type, "NUMERIC");
@@ -30,7 +30,7 @@ bool IsTextType(const std::string& type) {
 Value NumberFrom(std::string_view text) {
   const std::size_t first = text.find_first_not_of(" \t");
   if (first == std::string_view::npos) {
-    throw RuntimeError(3421, "Data type conversion error.");
+    throw RuntimeError(Fault::DataConversion, "Data type conversion error.");
   }
   text = text.substr(first, text.find_last_not_of(" \t") + 1 - first);
   if (text.starts_with('+')) {
@@ -45,7 +45,7 @@ Value NumberFrom(std::string_view text) {
   double real = 0;
   const auto [rest, error] = std::from_chars(text.data(), end, real);
   if (error != std::errc() || rest != end || !std::isfinite(real)) {
-    throw RuntimeError(3421, "Data type conversion error.");
+    throw RuntimeError(Fault::DataConversion, "Data type conversion error.");
   }
   return real;
 }
@@ -71,12 +71,12 @@ SqliteTable::SqliteTable(SqliteConnection& connection, const std::string& name) 
                         columns.Integer(3) != 0, IsTextType(type)});
   }
   if (columns_.empty()) {
-    throw RuntimeError(3078, "Could not find the input table or query '" + name + "'.");
+    throw RuntimeError(Fault::TableNotFound, "Could not find the input table or query '" + name + "'.");
   }
 }
 
 std::size_t SqliteTable::ColumnAt(std::string_view name) const {
-  for (std::size_t i = 0; i < columns_.size(); ++i) {  // as it is usually written
+  for (std::size_t i = 0; i < columns_.size(); ++i) {  // fast path: the exact name
     if (columns_[i].Name == name) {
       return i;
     }
@@ -87,5 +87,5 @@ std::size_t SqliteTable::ColumnAt(std::string_view name) const {
       return i;
     }
   }
-  throw RuntimeError(3265, "Item not found in this collection: " + std::string(name));
+  throw RuntimeError(Fault::ItemNotFound, "Item not found in this collection: " + std::string(name));
 }

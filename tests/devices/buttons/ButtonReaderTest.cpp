@@ -141,6 +141,18 @@ TEST_F(ReadingAButton, EndsAtTheEndOfTheNextTickAfterCancel) {
   EXPECT_THAT(boxes.Boxes, IsEmpty());
 }
 
+TEST_F(ReadingAButton, GoesOnAfterABadRead) {
+  wire.Devices = {button};
+  wire.NextResults = {OneWire::BadRead, OneWire::EndOfBus, -27};
+  for (int tick = 0; tick < 3; ++tick) {
+    EXPECT_TRUE(reader.Tick());
+    EXPECT_EQ(wire.Log.back(), "TMEndSession");
+  }
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+  EXPECT_FALSE(reader.Tick());
+  EXPECT_EQ(reader.DallasID(), "EFCDAB8967452301");
+}
+
 TEST_F(ReadingAButton, StillTakesAButtonInTheTickAfterCancel) {
   ASSERT_TRUE(reader.Tick());
   wire.Devices = {button};

@@ -15,7 +15,7 @@ class OneWireSearch : public SerialAdapter {
   /// The bus answers the search with `answer`, which holds no number.
   void ExpectBadRead(const Bytes& answer) {
     ExpectSearch(zeroPath, answer);
-    EXPECT_EQ(NextInATick(), 0);
+    EXPECT_EQ(NextInATick(), OneWire::BadRead);
     EXPECT_FALSE(state.Found);
     adapter.Verify();
   }
@@ -60,7 +60,7 @@ TEST_F(OneWireSearch, TakesOneByteInATickOnAnEmptyBus) {
 }
 
 TEST_F(OneWireSearch, StopsAtAShortCircuit) {
-  EXPECT_EQ(NextInATick(0xCC), 0);
+  EXPECT_EQ(NextInATick(0xCC), OneWire::BadRead);
   EXPECT_THAT(port.Sent, ElementsAre(0xC1));
 }
 
@@ -86,7 +86,7 @@ TEST_F(OneWireSearch, GoesOnFromSessionToSessionAndTellsTheEnd) {
   EXPECT_EQ(state.Rom, reader);
   wire.TMEndSession(handle);
 
-  EXPECT_EQ(NextInATick(), 0);
+  EXPECT_EQ(EndInATick(readerAlone, readerBesideButton), 0);
 
   adapter.Expect({0xC1}, {0xCD});
   ExpectSearch(zeroPath, readerAlone);
@@ -130,6 +130,9 @@ TEST_F(OneWireSearch, FindsTwoButtonsAndTheReader) {
   ExpectSearch(pathToReader, answer);
   ASSERT_EQ(wire.TMNext(handle, state), 1);
   EXPECT_EQ(state.Rom, reader);
+  adapter.Expect({0xC1}, {0xCD});
+  answer[0] = 0x03;
+  ExpectSearch(readerAlone, answer);
   EXPECT_EQ(wire.TMNext(handle, state), 0);
   adapter.Verify();
 }
@@ -142,7 +145,7 @@ TEST_F(OneWireSearch, FindsANewButtonInTheSecondLookAtTheLatest) {
   std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
   ASSERT_EQ(wire.TMNext(handle, state), 1);
   wire.TMEndSession(handle);
-  EXPECT_EQ(NextInATick(), 0);
+  EXPECT_EQ(EndInATick(readerAlone, readerBesideButton), 0);
   adapter.Expect({0xC1}, {0xCD});
   ExpectSearch(zeroPath, buttonBesideReader);
   handle = wire.TMExtendedStartSession(1, 5, 0);
@@ -159,7 +162,45 @@ TEST_F(OneWireSearch, GoesOnWithoutTheDeviceThatLeft) {
   ExpectSearch(pathToReader, readerAlone);
   EXPECT_EQ(wire.TMNext(handle, state), 1);
   EXPECT_EQ(state.Rom, reader);
+  adapter.Expect({0xC1}, {0xCD});
+  ExpectSearch(readerAlone, readerAlone);
   EXPECT_EQ(wire.TMNext(handle, state), 0);
+}
+
+/// A bit that told of devices left got lost on the way.
+TEST_F(OneWireSearch, IsNotAtTheEndWhenTheLastDeviceParts) {
+  adapter.Expect({0xC1}, {0xCD});
+  ExpectSearch(zeroPath, buttonAlone);
+  const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
+  ASSERT_EQ(wire.TMNext(handle, state), 1);
+  wire.TMEndSession(handle);
+  EXPECT_EQ(EndInATick(buttonAlone, buttonBesideReader), OneWire::BadRead);
+  EXPECT_FALSE(state.Found);
+  adapter.Verify();
+}
+
+TEST_F(OneWireSearch, IsAtTheEndOnceTheLastDeviceHasLeft) {
+  adapter.Expect({0xC1}, {0xCD});
+  ExpectSearch(zeroPath, buttonAlone);
+  const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
+  ASSERT_EQ(wire.TMNext(handle, state), 1);
+  wire.TMEndSession(handle);
+  EXPECT_EQ(NextInATick(0xCF), 0);
+  EXPECT_FALSE(state.Found);
+  adapter.Verify();
+}
+
+TEST_F(OneWireSearch, DoesNotKnowTheEndFromABadReadOfTheLastDevice) {
+  const Bytes nobody(16, 0xFF);
+  for (const Bytes& answer : {nobody, zeroPath}) {
+    adapter.Expect({0xC1}, {0xCD});
+    ExpectSearch(zeroPath, buttonAlone);
+    const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
+    ASSERT_EQ(wire.TMNext(handle, state), 1);
+    wire.TMEndSession(handle);
+    EXPECT_EQ(EndInATick(buttonAlone, answer), OneWire::BadRead);
+    EXPECT_FALSE(state.Found);
+  }
 }
 
 TEST_F(OneWireSearch, BeginsAnewAfterABusWithoutDevices) {
@@ -168,6 +209,7 @@ TEST_F(OneWireSearch, BeginsAnewAfterABusWithoutDevices) {
   const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
   ASSERT_EQ(wire.TMNext(handle, state), 1);
   wire.TMEndSession(handle);
+  EXPECT_EQ(NextInATick(0xCF), OneWire::BadRead);  // it stood on the first of two
   EXPECT_EQ(NextInATick(0xCF), 0);
   EXPECT_FALSE(state.Found);
   EXPECT_EQ(state.Branch, OneWireState::None);
@@ -179,7 +221,7 @@ TEST_F(OneWireSearch, ReadsNothingFromAButtonThatLeavesInTheMiddle) {
   Bytes answer = buttonAlone;
   std::fill(answer.begin() + 9, answer.end(), std::uint8_t{0xFF});
   ExpectSearch(zeroPath, answer);
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
   EXPECT_FALSE(state.Found);
   adapter.Expect({0xC1}, {0xCD});
   ExpectSearch(zeroPath, buttonAlone);
@@ -192,19 +234,19 @@ TEST_F(OneWireSearch, ReadsNothingWithAWrongCheckByte) {
   Bytes answer = buttonAlone;
   answer[15] = 0x08;
   ExpectSearch(zeroPath, answer);
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
 }
 
 TEST_F(OneWireSearch, ReadsNothingFromABusThatIsShortedMeanwhile) {
   const std::int32_t handle = Start();
   ExpectSearch(zeroPath, zeroPath);
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
 }
 
 TEST_F(OneWireSearch, ReadsNothingWhenNobodyAnswersIt) {
   const std::int32_t handle = Start();
   ExpectSearch(zeroPath, Bytes(16, 0xFF));
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
 }
 
 /// After the session the chip is back in command mode with the accelerator off, whatever it was sent.
@@ -213,10 +255,10 @@ TEST_F(OneWireSearch, GivesUpOnAChipThatFallsSilent) {
   adapter.Expect({0xE1, 0xF0, 0xE3, 0xB1, 0xE1}, {});
   adapter.Expect(zeroPath, {});
   adapter.Expect({0xE3, 0xA1}, {});
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
   EXPECT_THAT(events.Now(), Le(230ms));
   const auto given = events.Now();
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
   EXPECT_EQ(wire.TMTouchByte(handle, 0xFF), 255);
   EXPECT_EQ(events.Now(), given);
   adapter.Expect({0xE3, 0xA1}, {});
@@ -227,7 +269,7 @@ TEST_F(OneWireSearch, GivesUpOnAChipThatFallsSilent) {
 TEST_F(OneWireSearch, ReadsNothingFromAnAnswerThatIsCutShort) {
   const std::int32_t handle = Start();
   ExpectSearch(zeroPath, Bytes(buttonAlone.begin(), buttonAlone.end() - 1));
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
 }
 
 TEST_F(OneWireSearch, ReadsNothingFromAnAnswerThatIsOutOfStep) {
@@ -236,7 +278,7 @@ TEST_F(OneWireSearch, ReadsNothingFromAnAnswerThatIsOutOfStep) {
   adapter.Expect({0xE3, 0xB1, 0xE1}, {});
   adapter.Expect(zeroPath, buttonAlone);
   adapter.Expect({0xE3, 0xA1}, {});
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
   adapter.Expect({0xE3, 0xA1}, {});
   wire.TMEndSession(handle);
   adapter.Verify();
@@ -269,7 +311,7 @@ TEST_F(OneWireSearch, FindsNothingOnALineThatIsPulledOutAtAnyByte) {
     ASSERT_GT(handle, 0);
     state = {};
     // All answers are here once the path was sent, so only the two last bytes do not matter any more.
-    EXPECT_EQ(driver.TMNext(handle, state), left == 24 ? 1 : 0) << left;
+    EXPECT_EQ(driver.TMNext(handle, state), left == 24 ? OneWire::DeviceFound : OneWire::BadRead) << left;
     EXPECT_EQ(driver.TMEndSession(handle), 1);
     EXPECT_FALSE(line.PortOpen());
     line.FailNextOpen(8002);

@@ -184,7 +184,7 @@ TEST_F(OneWireSession, DoesNothingOnceEnded) {
   OneWireRom rom{};
   Bytes block = {1, 2};
   EXPECT_EQ(wire.TMSetup(handle), 0);
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
   EXPECT_EQ(wire.TMRom(handle, state, rom), 0);
   EXPECT_EQ(wire.TMAccess(handle, state), 0);
   EXPECT_EQ(wire.TMTouchByte(handle, 0x33), 255);
@@ -199,7 +199,7 @@ TEST_F(OneWireSession, StartsOnAnEmptyBusWhenTheProgramCloses) {
   const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
   EXPECT_GT(handle, 0);
   EXPECT_THAT(port.Sent, ElementsAre(0xC1));
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
   EXPECT_EQ(wire.TMEndSession(handle), 1);
   EXPECT_FALSE(port.PortOpen());
   EXPECT_EQ(events.Now(), 0ms);

@@ -38,6 +38,7 @@ TEST(RomSearch, TurnsOffAtTheHighestConflictNext) {
 
 TEST(RomSearch, IsAtTheLastDeviceWhenAllConflictsWereTakenUpwards) {
   OneWireState state;
+  ASSERT_TRUE(TakeFound(ButtonBesideReader, state));
   ASSERT_TRUE(TakeFound(ReaderBesideButton, state));
   EXPECT_THAT(state.Rom, ElementsAre(0x81, 0xE3, 0x10, 0x20, 0x30, 0x00, 0x00, 0x08));
   EXPECT_EQ(state.Branch, OneWireState::None);
@@ -50,6 +51,29 @@ TEST(RomSearch, KeepsItsPathBelowTheBranch) {
   state.Branch = 63;
   EXPECT_THAT(PathToNext(state), ElementsAre(0xA0, 0x00, 0x02, 0x00, 0x08, 0x00, 0x0A, 0x00, 0x20, 0x00, 0x22,
                                              0x00, 0x88, 0x00, 0x28, 0x88));
+}
+
+TEST(RomSearch, TakesNoDeviceOnAnotherWayThanTheOneAskedFor) {
+  OneWireState state;
+  EXPECT_FALSE(TakeFound(ReaderBesideButton, state));
+  EXPECT_FALSE(state.Found);
+  ASSERT_TRUE(TakeFound(ButtonBesideReader, state));
+  EXPECT_FALSE(TakeFound(ButtonBesideReader, state));
+}
+
+TEST(RomSearch, KnowsTheLastDevice) {
+  EXPECT_TRUE(IsLast(ReaderBesideButton));
+  EXPECT_TRUE(IsLast(ButtonAlone));
+  EXPECT_FALSE(IsLast(ButtonBesideReader));
+  SearchBlock nobody{};
+  EXPECT_FALSE(IsLast(nobody));
+  nobody.fill(0xFF);
+  EXPECT_FALSE(IsLast(nobody));
+}
+
+TEST(RomSearch, AsksForADeviceByAllOfItsNumber) {
+  EXPECT_EQ(PathTo({0x01, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0x00, 0xA3}), ButtonAlone);
+  EXPECT_THAT(PathTo({}), Each(0));
 }
 
 /// Paths never hold the byte that would have to be sent twice in data mode (0xE3): only upper bits are set.

@@ -40,6 +40,15 @@ class SerialAdapter : public testing::Test {
     return result;
   }
 
+  /// One tick of a poll whose walk stands on the last device, `path`, and asks for it once more.
+  std::int16_t EndInATick(const Bytes& path, const Bytes& answer) {
+    const std::int32_t handle = Start();
+    ExpectSearch(path, answer);
+    const std::int16_t result = wire.TMNext(handle, state);
+    EXPECT_EQ(wire.TMEndSession(handle), 1);
+    return result;
+  }
+
   FakeFiles files;
   IniReader ini{files, "/tessarine.ini"};
   FakeSerialDevices devices;

@@ -125,7 +125,7 @@ class ReaderInTrouble : public testing::TestWithParam<sim::OneWireFailureInfo> {
 TEST_P(ReaderInTrouble, NeverReadsAWrongNumber) {
   for (const int place : {1, 2, 9, 20, 40}) {
     VenueReader venue({"--fast", "--onewire-failure", std::string(GetParam().Name), "--onewire-at",
-                       std::to_string(GetParam().Place == sim::OneWireFailurePlace::None ? 1 : place)});
+                       std::to_string(GetParam().Place == sim::FailurePlace::None ? 1 : place)});
     venue.Command(std::string("touch ") + Button);
     venue.Poll(6);
     const std::string id = venue.Reader.DallasID();

@@ -1,5 +1,8 @@
 #include "platform/linux/LinuxFiles.h"
 
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -9,8 +12,6 @@
 #include <filesystem>
 #include <string>
 
-#include "gmock/gmock.h"
-#include "gtest/gtest.h"
 #include "platform/linux/FileError.h"
 #include "tests/support/FileSizeLimit.h"
 #include "tests/support/OrdinaryUser.h"
@@ -309,6 +310,56 @@ TEST(LinuxFilesWrite, ReplacesTheContentsInPlace) {
   EXPECT_EQ(NumberThrownBy([&] { files.Write("/dev/full", "x"); }), 61);
 }
 
+TEST(LinuxFilesAppend, AddsAtTheEndOfAFileAndMakesAMissingOne) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  files.Append(folder / "log", "one\n");
+  files.Append(folder / "log", "");
+  files.Append(folder / "log", std::string("t\0o\n", 4));
+  EXPECT_EQ(files.Read(folder / "log"), std::string("one\nt\0o\n", 8));
+  EXPECT_EQ(EntriesOf(folder.Path()), 1U);
+}
+
+TEST(LinuxFilesAppend, AddsToTheTargetOfALink) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "target", "one ");
+  std::filesystem::create_symlink("target", folder / "link");
+  LinuxFiles().Append(folder / "link", "two");
+  EXPECT_EQ(LinuxFiles().Read(folder / "target"), "one two");
+}
+
+TEST(LinuxFilesAppend, OfWhatIsNoFileOrNowhereFails) {
+  const TemporaryFolder folder;
+  ASSERT_EQ(mkfifo((folder / "pipe").c_str(), 0644), 0);
+  LinuxFiles files;
+  const Thrown thrown = ThrownBy([&] { files.Append(folder / "none/log", "one"); });
+  EXPECT_EQ(thrown.Number, 76);
+  EXPECT_THAT(thrown.Text, HasSubstr(folder / "none/log"));
+  EXPECT_EQ(NumberThrownBy([&] { files.Append(folder.Path(), "one"); }), 75);
+  EXPECT_EQ(NumberThrownBy([&] { files.Append(folder / "pipe", "one"); }), 75);
+  EXPECT_EQ(NumberThrownBy([&] { files.Append("/dev/null", "one"); }), 75);
+}
+
+TEST(LinuxFilesAppend, ToAFileWithoutWritePermissionIs70AndLeavesIt) {
+  const TemporaryFolder folder;
+  std::filesystem::permissions(folder.Path(), std::filesystem::perms(0777));
+  WriteFile(folder / "log", "one");
+  std::filesystem::permissions(folder / "log", std::filesystem::perms(0444));
+  const OrdinaryUser user;
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().Append(folder / "log", "two"); }), 70);
+  EXPECT_EQ(ReadFile(folder / "log"), "one");
+}
+
+TEST(FreeSpace, IsThatOfTheDiskAPathLiesOn) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "one");
+  const LinuxFiles files;
+  EXPECT_GT(files.FreeSpace(folder.Path()), 0U);
+  EXPECT_GT(files.FreeSpace(folder / "file"), 0U);
+  EXPECT_EQ(files.FreeSpace("/proc"), 0U) << "a disk that holds no files has no room";
+  EXPECT_EQ(NumberThrownBy([&] { (void)files.FreeSpace(folder / "none"); }), 76);
+}
+
 TEST(LinuxFilesDelete, ReportsAFileThatIsNotThere) {
   const TemporaryFolder folder;
   LinuxFiles files;
@@ -347,7 +398,7 @@ TEST(FileLen, CountsTheBytesOfAFile) {
   EXPECT_EQ(LinuxFiles().FileLen(folder / "empty"), 0U);
 }
 
-TEST(FileLen, OfWhatCannotBeReadFails) {
+TEST(FileLen, FailsForWhatCannotBeRead) {
   const TemporaryFolder folder;
   WriteFile(folder / "file", "x");
   std::filesystem::permissions(folder / "file", std::filesystem::perms(0));
@@ -377,7 +428,7 @@ TEST(Rename, PutsAFileInPlaceOfAnother) {
   EXPECT_FALSE(LinuxFiles().FileExists(folder / "new"));
 }
 
-TEST(Rename, OfWhatIsNotThereOrToWhereNothingCanBeFails) {
+TEST(Rename, FailsForAMissingFileOrAnImpossibleTarget) {
   const TemporaryFolder folder;
   WriteFile(folder / "file", "x");
   EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().Rename(folder / "gone", folder / "other"); }), 53);

@@ -18,7 +18,7 @@ class TimedQtEventPump : public QtEventPump {
   }
 };
 
-/// What the real pump and its fake have in common.
+/// Behaviour shared by the real pump and its fake.
 template <typename Pump>
 class EventPumpTest : public testing::Test {
  protected:
@@ -142,6 +142,29 @@ TYPED_TEST(EventPumpTest, AFailureInTheConditionEndsTheWait) {
   };
   EXPECT_EQ(FailureOf([&] { this->Pump_.WaitFor(condition, 60s); }), 8012);
   EXPECT_EQ(this->Pump_.WaitFor([] { return false; }, 1ms), WaitResult::TimedOut);
+}
+
+TYPED_TEST(EventPumpTest, TellsTheTimeThatPassesInWaitsAndPauses) {
+  const auto start = this->Pump_.Elapsed();
+  EXPECT_GE(start, 0us);
+  this->Pump_.Sleep(20ms);
+  const auto afterPause = this->Pump_.Elapsed();
+  EXPECT_GE(afterPause - start, 20ms);
+  this->Pump_.WaitFor([] { return false; }, 30ms);
+  EXPECT_GE(this->Pump_.Elapsed() - afterPause, 29ms);
+  EXPECT_LT(this->Pump_.Elapsed() - start, 20s);
+}
+
+TEST(FakeEventPump, TimeThatPassesInABlockingCallServesNoEvent) {
+  FakeEventPump pump;
+  bool served = false;
+  pump.At(1ms, [&] { served = true; });
+  pump.Pass(1500us);
+  EXPECT_FALSE(served);
+  EXPECT_EQ(pump.Elapsed(), 1500us);
+  EXPECT_EQ(pump.Now(), 1ms);
+  pump.DoEvents();
+  EXPECT_TRUE(served);
 }
 
 TEST(FakeEventPump, AMinuteTakesNoTimeAndCanBeReadFromItsClock) {

@@ -15,13 +15,13 @@
 
 namespace {
 
-constexpr const char* gameFilter = "XML Files & (*.xml) |*.xml";
+constexpr const char* GameFilter = "XML Files & (*.xml) |*.xml";
 
 TEST(NameFilters, AreMadeOfDescriptionAndPatterns) {
   const auto filters = [](const char* text) {
     return NameFilters(text).join(QLatin1Char('|')).toStdString();
   };
-  EXPECT_EQ(filters(gameFilter), "XML Files & (*.xml)");
+  EXPECT_EQ(filters(GameFilter), "XML Files & (*.xml)");
   EXPECT_EQ(filters("Text documents (*.txt) |*.txt"), "Text documents (*.txt)");
   EXPECT_EQ(filters("Playlist Files|*.txt|All Files|*.*"), "Playlist Files (*.txt)|All Files (*)");
   EXPECT_EQ(filters("Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif"), "Photo Files (*.bmp *.jpg *.gif)");
@@ -34,16 +34,26 @@ class QtFileDialogTest : public testing::Test {
  protected:
   using Act = std::function<void(QFileDialog&)>;
 
-  std::string Open(const std::string& fileName, const Act& act, const std::string& filter = gameFilter) {
+  std::optional<std::string> Open(const std::string& name, const Act& act,
+                                  const std::string& filter = GameFilter) {
+    return Open({.Filter = filter, .Name = name}, act);
+  }
+
+  std::optional<std::string> Open(const FileRequest& request, const Act& act) {
     const WhileModal<QFileDialog> operatorAtWork(act);
-    std::string result = Dialog.ShowOpen(filter, fileName);
+    std::optional<std::string> result = Dialog.ShowOpen(request);
     EXPECT_EQ(operatorAtWork.Runs(), 1);
     return result;
   }
 
-  std::string Save(const std::string& fileName, const Act& act, const std::string& filter = gameFilter) {
+  std::optional<std::string> Save(const std::string& name, const Act& act,
+                                  const std::string& filter = GameFilter) {
+    return Save({.Filter = filter, .Name = name}, act);
+  }
+
+  std::optional<std::string> Save(const FileRequest& request, const Act& act) {
     const WhileModal<QFileDialog> operatorAtWork(act);
-    std::string result = Dialog.ShowSave(filter, fileName);
+    std::optional<std::string> result = Dialog.ShowSave(request);
     EXPECT_EQ(operatorAtWork.Runs(), 1);
     return result;
   }
@@ -72,7 +82,7 @@ class QtFileDialogTest : public testing::Test {
     };
   }
 
-  QtFileDialog Dialog;
+  QtFileDialog Dialog{[] { return QApplication::activeModalWidget(); }};
 
  private:
   QTemporaryDir folder_;
@@ -129,16 +139,16 @@ TEST_F(QtFileDialogTest, TheSuffixFollowsTheFilterThatIsPicked) {
             Path("shot.raw"));
 }
 
-TEST_F(QtFileDialogTest, CancelLeavesTheName) {
+TEST_F(QtFileDialogTest, CancelGivesNoName) {
   MakeFile("last.xml");
   const auto cancel = [](QFileDialog& dialog) { Press(dialog, QDialogButtonBox::Cancel); };
   const auto escape = [](QFileDialog& dialog) { QTest::keyClick(&dialog, Qt::Key_Escape); };
   const auto close = [](QFileDialog& dialog) { dialog.close(); };
   for (const auto& act : std::vector<Act>{cancel, escape, close}) {
-    EXPECT_EQ(Open("", act), "");
-    EXPECT_EQ(Save("", act), "");
-    EXPECT_EQ(Save(Path("last.xml"), act), Path("last.xml"));
-    EXPECT_EQ(Save("bare name", act), "bare name");
+    EXPECT_EQ(Open("", act), std::nullopt);
+    EXPECT_EQ(Save("", act), std::nullopt);
+    EXPECT_EQ(Save(Path("last.xml"), act), std::nullopt);
+    EXPECT_EQ(Save("bare name", act), std::nullopt);
   }
 }
 
@@ -163,7 +173,43 @@ TEST_F(QtFileDialogTest, StartsInTheFolderLastChosenFrom) {
   });
 }
 
-TEST_F(QtFileDialogTest, LeavesTheNameWhenItsWindowIsDestroyed) {
+TEST_F(QtFileDialogTest, StartsInTheFolderAskedFor) {
+  MakeFile("last.xml");
+  const QTemporaryDir other;
+  const auto look = [&](QFileDialog& dialog) {
+    EXPECT_EQ(dialog.directory().absolutePath(), other.path());
+    EXPECT_EQ(Entry(dialog).text(), QStringLiteral("last.xml"));
+    dialog.reject();
+  };
+  const std::string folder = other.path().toStdString();
+  Open(FileRequest{.Filter = GameFilter, .Name = Path("last.xml"), .Folder = folder}, look);
+  Save(FileRequest{.Filter = GameFilter, .Name = "last.xml", .Folder = folder}, look);
+}
+
+TEST_F(QtFileDialogTest, PassesOverAFolderThatDoesNotExist) {
+  MakeFile("last.xml");
+  Open(FileRequest{.Filter = GameFilter, .Name = Path("last.xml"), .Folder = Path("none")},
+       [&](QFileDialog& dialog) {
+         EXPECT_EQ(dialog.directory().filePath(QStringLiteral("last.xml")).toStdString(), Path("last.xml"));
+         dialog.reject();
+       });
+}
+
+TEST_F(QtFileDialogTest, ShowsTheTitleAskedForInADialogOfTheToolkit) {
+  const auto look = [](QFileDialog& dialog) {
+    EXPECT_EQ(dialog.windowTitle(), QStringLiteral("Open 得分"));
+    EXPECT_TRUE(dialog.testOption(QFileDialog::DontUseNativeDialog));
+    dialog.reject();
+  };
+  Open(FileRequest{.Filter = GameFilter, .Title = "Open 得分"}, look);
+  Save(FileRequest{.Filter = GameFilter, .Title = "Open 得分"}, look);
+  Open("", [](QFileDialog& dialog) {
+    EXPECT_NE(dialog.windowTitle(), QString());
+    dialog.reject();
+  });
+}
+
+TEST_F(QtFileDialogTest, GivesNoNameWhenItsWindowIsDestroyed) {
   auto* window = new QDialog;
   window->setModal(true);
   window->show();
@@ -172,7 +218,7 @@ TEST_F(QtFileDialogTest, LeavesTheNameWhenItsWindowIsDestroyed) {
                    EXPECT_EQ(dialog.parentWidget(), window);
                    delete window;
                  }),
-            "name.xml");
+            std::nullopt);
 }
 
 }  // namespace

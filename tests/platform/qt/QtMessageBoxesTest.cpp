@@ -30,7 +30,7 @@ class QtMessageBoxesTest : public testing::Test {
     return [key](QMessageBox& box) { QTest::keyClick(&box, key); };
   }
 
-  QtMessageBoxes Boxes;
+  QtMessageBoxes Boxes{[] { return QApplication::activeModalWidget(); }};
 };
 
 TEST_F(QtMessageBoxesTest, ShowsTextAndTitleToTheLetter) {
@@ -80,65 +80,65 @@ TEST_F(QtMessageBoxesTest, OffersTheButtonsAndAnswersTheOnePressed) {
   EXPECT_EQ(
       Show(BoxButtons::YesNo, std::bind(offers, _1, QMessageBox::Yes | QMessageBox::No, QMessageBox::Yes)),
       BoxAnswer::Yes);
+  EXPECT_EQ(
+      Show(BoxButtons::YesNoCancel,
+           std::bind(offers, _1, QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel, QMessageBox::Yes)),
+      BoxAnswer::Yes);
   EXPECT_EQ(Show(BoxButtons::OkCancel, Press(QMessageBox::Cancel)), BoxAnswer::Cancel);
   EXPECT_EQ(Show(BoxButtons::YesNo, Press(QMessageBox::No)), BoxAnswer::No);
+  EXPECT_EQ(Show(BoxButtons::YesNoCancel, Press(QMessageBox::No)), BoxAnswer::No);
+  EXPECT_EQ(Show(BoxButtons::YesNoCancel, Press(QMessageBox::Cancel)), BoxAnswer::Cancel);
 }
 
 TEST_F(QtMessageBoxesTest, ReturnPressesTheFirstButton) {
   EXPECT_EQ(Show(BoxButtons::Ok, Type(Qt::Key_Return)), BoxAnswer::Ok);
   EXPECT_EQ(Show(BoxButtons::OkCancel, Type(Qt::Key_Return)), BoxAnswer::Ok);
   EXPECT_EQ(Show(BoxButtons::YesNo, Type(Qt::Key_Return)), BoxAnswer::Yes);
+  EXPECT_EQ(Show(BoxButtons::YesNoCancel, Type(Qt::Key_Return)), BoxAnswer::Yes);
 }
 
-TEST_F(QtMessageBoxesTest, EscapeAndTheCloseBoxAnswerTheSecondButton) {
+TEST_F(QtMessageBoxesTest, EscapeAndTheCloseBoxAnswerOkOrCancel) {
   const auto close = [](QMessageBox& box) { EXPECT_TRUE(box.close()); };
   EXPECT_EQ(Show(BoxButtons::Ok, Type(Qt::Key_Escape)), BoxAnswer::Ok);
   EXPECT_EQ(Show(BoxButtons::OkCancel, Type(Qt::Key_Escape)), BoxAnswer::Cancel);
-  EXPECT_EQ(Show(BoxButtons::YesNo, Type(Qt::Key_Escape)), BoxAnswer::No);
+  EXPECT_EQ(Show(BoxButtons::YesNoCancel, Type(Qt::Key_Escape)), BoxAnswer::Cancel);
   EXPECT_EQ(Show(BoxButtons::Ok, close), BoxAnswer::Ok);
   EXPECT_EQ(Show(BoxButtons::OkCancel, close), BoxAnswer::Cancel);
-  EXPECT_EQ(Show(BoxButtons::YesNo, close), BoxAnswer::No);
+  EXPECT_EQ(Show(BoxButtons::YesNoCancel, close), BoxAnswer::Cancel);
 }
 
-TEST_F(QtMessageBoxesTest, BelongsToTheModalWindowThatIsOpen) {
-  QWidget mainWindow;
-  mainWindow.show();
-  Boxes.SetMainWindow(&mainWindow);
-  QDialog dialog(&mainWindow);
-  dialog.setModal(true);
-  dialog.show();
-  Show(BoxButtons::Ok, [&](QMessageBox& box) {
-    EXPECT_EQ(box.parentWidget(), &dialog);
-    box.close();
-  });
+TEST_F(QtMessageBoxesTest, AQuestionOfYesAndNoIsClosedByItsButtonsAlone) {
+  for (const auto& [button, answer] :
+       {std::pair{QMessageBox::Yes, BoxAnswer::Yes}, {QMessageBox::No, BoxAnswer::No}}) {
+    EXPECT_EQ(Show(BoxButtons::YesNo,
+                   [button = button](QMessageBox& box) {
+                     EXPECT_FALSE(box.windowFlags() & Qt::WindowCloseButtonHint);
+                     EXPECT_TRUE(box.windowFlags() & Qt::WindowTitleHint);
+                     QTest::keyClick(&box, Qt::Key_Escape);
+                     QTest::keyClick(box.button(QMessageBox::No), Qt::Key_Escape);
+                     EXPECT_FALSE(box.close());
+                     QCoreApplication::processEvents();
+                     EXPECT_TRUE(box.isVisible());
+                     QTest::mouseClick(box.button(button), Qt::LeftButton);
+                   }),
+              answer);
+  }
 }
 
-TEST_F(QtMessageBoxesTest, BelongsToTheMainWindowWhenItIsVisibleAndNothingElseIsActive) {
-  QWidget mainWindow;
-  Boxes.SetMainWindow(&mainWindow);
-  ASSERT_EQ(QApplication::activeWindow(), nullptr);
-  Show(BoxButtons::Ok, [&](QMessageBox& box) {
-    EXPECT_EQ(box.parentWidget(), nullptr);
-    box.close();
-  });
-  mainWindow.setAttribute(Qt::WA_ShowWithoutActivating);
-  mainWindow.show();
-  Show(BoxButtons::Ok, [&](QMessageBox& box) {
-    EXPECT_EQ(box.parentWidget(), &mainWindow);
-    box.close();
-  });
-}
-
-TEST_F(QtMessageBoxesTest, AnswersTheSecondButtonWhenItsWindowIsDestroyed) {
-  auto* dialog = new QDialog;
-  dialog->setModal(true);
-  dialog->show();
-  EXPECT_EQ(Show(BoxButtons::YesNo,
-                 [&](QMessageBox& box) {
-                   EXPECT_EQ(box.parentWidget(), dialog);
-                   delete dialog;
-                 }),
-            BoxAnswer::No);
+TEST_F(QtMessageBoxesTest, AnswersTheLastButtonWhenItsWindowIsDestroyed) {
+  for (const auto& [buttons, answer] : {std::pair{BoxButtons::OkCancel, BoxAnswer::Cancel},
+                                        {BoxButtons::YesNo, BoxAnswer::No},
+                                        {BoxButtons::YesNoCancel, BoxAnswer::Cancel}}) {
+    auto* dialog = new QDialog;
+    dialog->setModal(true);
+    dialog->show();
+    EXPECT_EQ(Show(buttons,
+                   [&](QMessageBox& box) {
+                     EXPECT_EQ(box.parentWidget(), dialog);
+                     delete dialog;
+                   }),
+              answer);
+  }
 }
 
 TEST_F(QtMessageBoxesTest, WrapsALongTextToAReadableWidth) {

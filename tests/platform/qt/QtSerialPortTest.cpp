@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 #include <sys/file.h>
+#include <sys/ioctl.h>
 #include <sys/stat.h>
 
 #include <QSocketNotifier>
@@ -23,7 +24,7 @@ namespace {
 
 using Bytes = std::vector<std::uint8_t>;
 
-/// A further descriptor of a terminal's near end.
+/// A second descriptor for a terminal's near end.
 class SecondOpener {
  public:
   explicit SecondOpener(const std::string& device)
@@ -32,8 +33,13 @@ class SecondOpener {
   SecondOpener(const SecondOpener&) = delete;
   SecondOpener& operator=(const SecondOpener&) = delete;
 
+  bool SetExclusive(bool on) const { return ::ioctl(descriptor_, on ? TIOCEXCL : TIOCNXCL) == 0; }
+  bool IsExclusive() const {
+    int exclusive = 0;
+    return ::ioctl(descriptor_, TIOCGEXCL, &exclusive) == 0 && exclusive != 0;
+  }
   bool Lock() const { return ::flock(descriptor_, LOCK_EX | LOCK_NB) == 0; }
-  /// True once the line has taken nothing more for 100 ms.
+  /// True once the line has accepted no more bytes for 100 ms.
   bool AwaitFull() const {
     pollfd writable{descriptor_, POLLOUT, 0};
     const auto limit = std::chrono::steady_clock::now() + 2s;
@@ -61,6 +67,12 @@ class QtSerialPortTest : public testing::Test {
 
   int OpenFailure(const std::string& device, const std::string& settings = "19200,N,8,1") {
     return FailureOf([&] { Port.Open(device, settings); });
+  }
+
+  void PutOut(int count) {
+    for (int i = 0; i < count; ++i) {
+      Port.Output(85);
+    }
   }
 
   bool Await(std::size_t count) {
@@ -202,7 +214,7 @@ TEST_F(QtSerialPortTest, GoesOnReceivingWhenInputIsClearedAfterTheSystemAnnounce
     ++cleared;
     Port.ClearInput();
     early.setEnabled(false);
-    errno = EAGAIN;  // as any call before the read of nothing may leave it
+    errno = EAGAIN;  // a leftover value, which an empty read must not be judged by
   });
   Line.Write({1, 2, 3});
   ASSERT_TRUE(probe.AwaitInput());
@@ -241,6 +253,91 @@ TEST_F(QtSerialPortTest, AppliesTheSettingsToTheLine) {
   EXPECT_NE(applied.c_cflag & CSTOPB, 0U);
 }
 
+TEST_F(QtSerialPortTest, ChangesTheSettingsOfTheOpenLine) {
+  Open("19200,N,8,1");
+  Port.SetSettings("115200,n,8,2");
+  const termios applied = Line.Settings();
+  EXPECT_EQ(cfgetospeed(&applied), static_cast<speed_t>(B115200));
+  EXPECT_NE(applied.c_cflag & CSTOPB, 0U);
+  Port.SetSettings("19200,N,8,1");
+  Line.Write({1, 2});
+  EXPECT_EQ(Take(2), (Bytes{1, 2}));
+}
+
+/// The last ones can be read, but a pseudo terminal has 8 data bits only.
+TEST_F(QtSerialPortTest, KeepsItsSettingsWhenTheNewOnesCannotBeHad) {
+  Open("19200,N,8,1");
+  for (const char* settings : {"", "19200,X,8,1", "0,N,8,1", "115200,N,9,1", "115200,N,7,1"}) {
+    EXPECT_EQ(FailureOf([&] { Port.SetSettings(settings); }), 380) << settings;
+  }
+  const termios applied = Line.Settings();
+  EXPECT_EQ(cfgetospeed(&applied), static_cast<speed_t>(B19200));
+  EXPECT_TRUE(Port.PortOpen());
+}
+
+TEST_F(QtSerialPortTest, ChangesTheSettingsOnceWhatIsUnderWayIsThrough) {
+  Open("19200,N,8,1");
+  const auto start = std::chrono::steady_clock::now();
+  PutOut(100);
+  Port.SetSettings("115200,N,8,1");
+  EXPECT_GE(std::chrono::steady_clock::now() - start, 52ms);
+}
+
+// The system's own drain returns at once on these lines, since they pass bytes on faster than any real one.
+
+TEST_F(QtSerialPortTest, DrainsUntilTheBytesHaveHadTheirTimeOnTheLine) {
+  const std::vector<std::pair<std::string, std::chrono::microseconds>> timesOf40Bytes{
+      {"19200,N,8,1", 20833us}, {"9600,N,8,1", 41666us}, {"9600,E,8,2", 50000us}, {"57600,N,8,1", 6944us}};
+  for (const auto& [settings, time] : timesOf40Bytes) {
+    Open(settings);
+    const auto start = std::chrono::steady_clock::now();
+    PutOut(40);
+    Port.Drain();
+    EXPECT_GE(std::chrono::steady_clock::now() - start, time) << settings;
+    Port.Close();
+  }
+}
+
+TEST_F(QtSerialPortTest, DrainCountsFromWhereTheLineWasLastIdle) {
+  Open("9600,N,8,1");
+  PutOut(20);
+  Port.Drain();
+  std::this_thread::sleep_for(20ms);
+  const auto start = std::chrono::steady_clock::now();
+  PutOut(20);
+  std::this_thread::sleep_for(5ms);
+  PutOut(20);
+  Port.Drain();
+  EXPECT_GE(std::chrono::steady_clock::now() - start, 41666us);
+}
+
+TEST_F(QtSerialPortTest, DrainOfAnIdleLineReturnsAtOnce) {
+  Open("9600,N,8,1");
+  PutOut(96);
+  Port.Drain();
+  const auto processor = ProcessorTime();
+  for (int i = 0; i < 1000; ++i) {
+    Port.Drain();  // 100 s, were the old bytes counted again
+  }
+  EXPECT_LT(ProcessorTime() - processor, 100ms);
+}
+
+TEST_F(QtSerialPortTest, DrainsBeforeItCloses) {
+  Open("9600,N,8,1");
+  const auto start = std::chrono::steady_clock::now();
+  PutOut(40);
+  Port.Close();
+  EXPECT_GE(std::chrono::steady_clock::now() - start, 41666us);
+}
+
+TEST_F(QtSerialPortTest, ALossIsNoticedByADrainBeforeAnyEvent) {
+  Open();
+  Line.Unplug();
+  EXPECT_EQ(FailureOf([&] { Port.Drain(); }), 8012);
+  EXPECT_EQ(FailureOf([&] { Port.SetSettings("9600,N,8,1"); }), 8012);
+  EXPECT_EQ(FailureOf([&] { Port.InBufferCount(); }), 8012);
+}
+
 TEST_F(QtSerialPortTest, RefusesSettingsThatCannotBeRead) {
   for (const char* settings :
        {"", "19200", "19200,N,8", "19200,N,8,1,0", "19200,X,8,1", "19200,,8,1", "19200,N,9,1", "19200,N,4,1",
@@ -270,7 +367,8 @@ TEST_F(QtSerialPortTest, ADeviceThatThisUserMayNotTouchRefuses) {
   }
   const int failure = OpenFailure(Line.Device());
   ASSERT_EQ(::seteuid(user), 0);
-  EXPECT_EQ(failure, 8002);
+  EXPECT_EQ(failure, 8005);
+  EXPECT_FALSE(Port.PortOpen());
 }
 
 TEST_F(QtSerialPortTest, IsNotOpenedTwice) {
@@ -309,8 +407,31 @@ TEST_F(QtSerialPortTest, ADeviceThatAnotherProgramHoldsIsAlreadyOpen) {
   EXPECT_TRUE(Port.PortOpen());
 }
 
+/// As programs do that know of no lock; the system holds everyone to it but root.
+TEST_F(QtSerialPortTest, ADeviceInAnotherProgramsExclusiveModeIsAlreadyOpen) {
+  {
+    const SecondOpener program(Line.Device());
+    ASSERT_TRUE(program.SetExclusive(true));
+    EXPECT_EQ(OpenFailure(Line.Device()), 8005);
+    EXPECT_FALSE(Port.PortOpen());
+    ASSERT_TRUE(program.SetExclusive(false));
+  }
+  Open();
+  EXPECT_TRUE(Port.PortOpen());
+}
+
+TEST_F(QtSerialPortTest, HoldsTheDeviceInExclusiveModeWhileItIsOpen) {
+  Open();
+  const SecondOpener program(Line.Device());
+  EXPECT_TRUE(program.IsExclusive());
+  Port.Close();
+  EXPECT_FALSE(program.IsExclusive());
+}
+
 TEST_F(QtSerialPortTest, FailsInAllOperationsWhileClosed) {
   EXPECT_FALSE(Port.PortOpen());
+  EXPECT_EQ(FailureOf([&] { Port.Drain(); }), 8018);
+  EXPECT_EQ(FailureOf([&] { Port.SetSettings("9600,N,8,1"); }), 8018);
   EXPECT_EQ(FailureOf([&] { Port.InBufferCount(); }), 8018);
   EXPECT_EQ(FailureOf([&] { Port.Input(); }), 8018);
   EXPECT_EQ(FailureOf([&] { Port.Output(1); }), 8018);
@@ -323,7 +444,7 @@ TEST_F(QtSerialPortTest, ReadingPastTheInputFails) {
   EXPECT_EQ(FailureOf([&] { Port.Input(); }), 62);
 }
 
-TEST_F(QtSerialPortTest, ALostLineWakesWhoWaitsForIt) {
+TEST_F(QtSerialPortTest, ALostLineWakesAWaitForInput) {
   Open();
   QTimer::singleShot(30, [&] { Line.Unplug(); });
   EXPECT_EQ(FailureOf([&] { Pump.WaitFor([&] { return Port.InBufferCount() > 0; }, 20s); }), 8012);

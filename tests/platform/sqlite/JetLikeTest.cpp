@@ -1,8 +1,9 @@
 #include "platform/sqlite/JetLike.h"
 
+#include <gtest/gtest.h>
+
 #include <string>
 
-#include "gtest/gtest.h"
 #include "tests/support/Thrown.h"
 
 namespace {

@@ -1,9 +1,9 @@
 #include "platform/sqlite/KeySet.h"
 
+#include <gtest/gtest.h>
+
 #include <cstdint>
 #include <optional>
-
-#include "gtest/gtest.h"
 
 namespace {
 

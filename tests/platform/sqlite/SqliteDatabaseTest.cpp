@@ -1,12 +1,13 @@
 #include "platform/sqlite/SqliteDatabase.h"
 
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
 #include <sys/stat.h>
 
 #include <filesystem>
 #include <string>
 
-#include "gmock/gmock.h"
-#include "gtest/gtest.h"
 #include "tests/support/OrdinaryUser.h"
 #include "tests/support/TestDatabase.h"
 #include "tests/support/Thrown.h"

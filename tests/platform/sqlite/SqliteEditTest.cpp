@@ -1,9 +1,10 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
 #include <cstddef>
 #include <cstdint>
 #include <string>
 
-#include "gmock/gmock.h"
-#include "gtest/gtest.h"
 #include "tests/platform/sqlite/EditedMembers.h"
 #include "tests/support/Thrown.h"
 
@@ -286,7 +287,7 @@ TEST_F(Editing, NewRowIsFoundByEveryMeans) {
   EXPECT_FALSE(rows->NoMatch());
 }
 
-TEST_F(Editing, NewRowThatGetsTheNumberOfADeletedOneStandsOnceAndLast) {
+TEST_F(Editing, NewRowThatReusesTheKeyOfADeletedOneIsListedOnceAndLast) {
   rows->MoveLast();
   file.Execute("DELETE FROM Members WHERE ContactID = 2");
   rows->AddNew();

@@ -1,9 +1,10 @@
 #include "platform/sqlite/SqliteRecordset.h"
 
+#include <gtest/gtest.h>
+
 #include <cstdint>
 #include <string>
 
-#include "gtest/gtest.h"
 #include "tests/support/TestDatabase.h"
 #include "tests/support/Thrown.h"
 

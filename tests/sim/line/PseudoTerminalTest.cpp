@@ -81,6 +81,7 @@ TEST(PseudoTerminal, KeepsToANewSpeedFromItsChangeOn) {
   const Clock::time_point start = Clock::now();
   line.Write(Bytes(6, 0x55));
   EXPECT_GE(Clock::now() - start, WireTime(6, 1200));
+  host.Speak({.Baud = 1200});
   host.Write(Bytes(6, 0x55));
   for (std::size_t i = 7; i <= 12; ++i) {
     EXPECT_EQ(line.ReadByte(limit), 0x55);

@@ -4,7 +4,7 @@
 
 #include <stdexcept>
 
-#include "tests/sim/onewire/AdapterHost.h"
+#include "tests/support/AdapterHost.h"
 
 namespace sim {
 namespace {

@@ -7,7 +7,7 @@
 #include <stdexcept>
 
 #include "sim/line/Crc.h"
-#include "tests/sim/onewire/AdapterHost.h"
+#include "tests/support/AdapterHost.h"
 
 namespace sim {
 namespace {
@@ -52,8 +52,22 @@ TEST(OneWireAdapter, IsAsItWasLeftWhenAHostComesBack) {
     EXPECT_EQ(host.Ask({0x45, 0x75, 0xE1, 0x33}, 3), (Bytes{0x44, 0x74, 0x33}));
   }
   RawHost host(adapter.DevicePath());
+  host.Speak({.Baud = 57600});
   host.Write({0xE3, 0x09, 0x0F});
   EXPECT_EQ(host.Read(2), (Bytes{0x04, 0x04}));
+}
+
+TEST(OneWireAdapter, HearsTheHostAtTheSpeedThatItWasTold) {
+  OneWireAdapter adapter({.LinePace = Pace::Fast});
+  AdapterHost host(adapter.DevicePath());
+  EXPECT_EQ(host.Ask({0x75}, 1), Bytes{0x74});
+  host.Write({0x17});
+  ASSERT_TRUE(adapter.WaitUntilHostFaults(1, limit));
+  EXPECT_EQ(adapter.HostFaults(), std::vector<std::string>{"the host speaks 9600,8N1 instead of 57600,8N1"});
+  host.Speak({.Baud = 57600});
+  EXPECT_EQ(host.Ask({0x0F, 0x71}, 2), (Bytes{0x04, 0x70}));
+  host.Speak({.Baud = 9600});
+  EXPECT_EQ(host.Ask({0x0F}, 1), Bytes{0x00});
 }
 
 TEST(OneWireAdapter, KeepsToTheSpeedOfTheLineUnlessTold) {
@@ -83,11 +97,11 @@ TEST(OneWireAdapter, EndsInTheMiddleOfAnExchange) {
 
 TEST(OneWireAdapter, RefusesPlacesThatDoNotExist) {
   for (const OneWireFailureInfo& info : OneWireFailures) {
-    const bool hasPlace = info.Place != OneWireFailurePlace::None;
+    const bool hasPlace = info.Place != FailurePlace::None;
     for (const auto& [place, refused] : {std::pair<std::size_t, bool>{0, hasPlace},
                                          {1, false},
                                          {64, false},
-                                         {65, info.Place == OneWireFailurePlace::Bit}}) {
+                                         {65, info.Place == FailurePlace::Bit}}) {
       const OneWireAdapterSettings settings{.Failure = info.Failure, .FailurePlace = place};
       if (refused) {
         EXPECT_THROW(OneWireAdapter{settings}, std::invalid_argument) << info.Name << ' ' << place;

@@ -5,7 +5,7 @@
 #include <algorithm>
 
 #include "sim/onewire/OneWireAdapter.h"
-#include "tests/sim/onewire/AdapterHost.h"
+#include "tests/support/AdapterHost.h"
 
 namespace sim {
 namespace {
@@ -36,7 +36,7 @@ class FailureOfTheAdapter : public testing::TestWithParam<OneWireFailureInfo> {
  protected:
   FailureOfTheAdapter()
       : adapter_({.Failure = GetParam().Failure,
-                  .FailurePlace = GetParam().Place == OneWireFailurePlace::Bit ? lastBit : faultyAnswer,
+                  .FailurePlace = GetParam().Place == FailurePlace::Bit ? lastBit : faultyAnswer,
                   .LinePace = Pace::Fast}),
         host_(adapter_.DevicePath()) {
     adapter_.Touch({0x02, 0x1C, 0xB8, 0x01, 0x00, 0x00, 0x00, 0xA2});

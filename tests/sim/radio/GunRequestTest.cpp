@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "tests/sim/radio/RadioLiterals.h"
+#include "tests/support/RadioLiterals.h"
 
 namespace sim {
 namespace {

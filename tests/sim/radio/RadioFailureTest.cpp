@@ -6,7 +6,7 @@
 #include <set>
 
 #include "sim/radio/RadioModem.h"
-#include "tests/sim/radio/RadioLiterals.h"
+#include "tests/support/RadioLiterals.h"
 
 namespace sim {
 namespace {

@@ -8,7 +8,7 @@
 #include "sim/game/GameMaker.h"
 #include "sim/game/ScoreFrame.h"
 #include "sim/radio/RadioAnswer.h"
-#include "tests/sim/radio/RadioLiterals.h"
+#include "tests/support/RadioLiterals.h"
 
 namespace sim {
 namespace {

@@ -4,7 +4,7 @@
 
 #include <string>
 
-#include "tests/sim/radio/RadioLiterals.h"
+#include "tests/support/RadioLiterals.h"
 
 namespace sim {
 namespace {

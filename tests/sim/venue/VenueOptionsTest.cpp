@@ -5,33 +5,51 @@
 
 #include <stdexcept>
 
+#include "sim/baseunit/BaseUnitFailure.h"
+#include "sim/onewire/OneWireFailure.h"
+#include "sim/radio/RadioFailure.h"
+#include "sim/venue/VenueUsage.h"
+
 namespace sim {
 namespace {
 
 using testing::HasSubstr;
 
+DeviceOptions BaseUnitIn(const std::vector<std::string>& arguments) {
+  return ParseVenueOptions(arguments).Of("base-unit");
+}
+DeviceOptions OneWireIn(const std::vector<std::string>& arguments) {
+  return ParseVenueOptions(arguments).Of("onewire");
+}
+DeviceOptions RadioIn(const std::vector<std::string>& arguments) {
+  return ParseVenueOptions(arguments).Of("radio");
+}
+
 TEST(VenueOptions, StandForAFaultlessGameOfFortyWhenNoneIsGiven) {
   const VenueOptions options = ParseVenueOptions({});
+  const DeviceOptions& unit = options.Of("base-unit");
+  const DeviceOptions& reader = options.Of("onewire");
+  const DeviceOptions& modem = options.Of("radio");
   EXPECT_EQ(options.Players, 40);
   EXPECT_EQ(options.Seed, 1U);
   EXPECT_FALSE(options.Fast);
-  EXPECT_EQ(options.Failure, BaseUnitFailure::None);
-  EXPECT_EQ(options.FailurePlace, 1U);
-  EXPECT_EQ(options.Games, 0);
+  EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::None);
+  EXPECT_EQ(unit.Place, 1U);
+  EXPECT_EQ(unit.Number("games"), 0U);
   EXPECT_EQ(options.LogFile, std::nullopt);
-  EXPECT_EQ(options.FramesFile, std::nullopt);
-  EXPECT_EQ(options.Link, std::nullopt);
-  EXPECT_FALSE(options.OneWire);
-  EXPECT_EQ(options.AdapterFailure, OneWireFailure::None);
-  EXPECT_EQ(options.AdapterFailurePlace, 1U);
-  EXPECT_EQ(options.AdapterLink, std::nullopt);
-  EXPECT_FALSE(options.Radio);
-  EXPECT_EQ(options.RadioTrouble.Failure, RadioFailure::None);
-  EXPECT_EQ(options.RadioTrouble.Gun, 1U);
-  EXPECT_EQ(options.RadioTrouble.Times, 0);
-  EXPECT_EQ(options.RadioAnswerTime, std::chrono::milliseconds(5));
-  EXPECT_EQ(options.RadioFramesFile, std::nullopt);
-  EXPECT_EQ(options.RadioLink, std::nullopt);
+  EXPECT_EQ(unit.File("frames"), std::nullopt);
+  EXPECT_EQ(unit.Link, std::nullopt);
+  EXPECT_FALSE(reader.Served);
+  EXPECT_EQ(reader.FailureAs<OneWireFailure>(), OneWireFailure::None);
+  EXPECT_EQ(reader.Place, 1U);
+  EXPECT_EQ(reader.Link, std::nullopt);
+  EXPECT_FALSE(modem.Served);
+  EXPECT_EQ(modem.FailureAs<RadioFailure>(), RadioFailure::None);
+  EXPECT_EQ(modem.Place, 1U);
+  EXPECT_EQ(modem.Number("times"), 0U);
+  EXPECT_EQ(modem.Number("answer-time"), 5U);
+  EXPECT_EQ(modem.File("frames"), std::nullopt);
+  EXPECT_EQ(modem.Link, std::nullopt);
   EXPECT_FALSE(options.UntilEof);
   EXPECT_FALSE(options.Help);
 }
@@ -40,53 +58,75 @@ TEST(VenueOptions, TakeEveryOption) {
   const VenueOptions options = ParseVenueOptions(
       {"--players", "224", "--seed", "4294967295", "--fast", "--failure", "wrong-crc", "--at", "7", "--log",
        "wire.log", "--frames", "f.bin", "--link", "port", "--games", "3", "--until-eof", "--help"});
+  const DeviceOptions& unit = options.Of("base-unit");
   EXPECT_EQ(options.Players, 224);
   EXPECT_EQ(options.Seed, 4294967295U);
   EXPECT_TRUE(options.Fast);
-  EXPECT_EQ(options.Failure, BaseUnitFailure::WrongCrc);
-  EXPECT_EQ(options.FailurePlace, 7U);
-  EXPECT_EQ(options.Games, 3);
+  EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::WrongCrc);
+  EXPECT_EQ(unit.Place, 7U);
+  EXPECT_EQ(unit.Number("games"), 3U);
   EXPECT_EQ(options.LogFile, "wire.log");
-  EXPECT_EQ(options.FramesFile, "f.bin");
-  EXPECT_EQ(options.Link, "port");
+  EXPECT_EQ(unit.File("frames"), "f.bin");
+  EXPECT_EQ(unit.Link, "port");
   EXPECT_TRUE(options.UntilEof);
   EXPECT_TRUE(options.Help);
 }
 
 TEST(VenueOptions, TakeEveryOptionOfTheOneWireAdapter) {
-  const VenueOptions options = ParseVenueOptions(
+  const DeviceOptions reader = OneWireIn(
       {"--onewire", "--onewire-failure", "contact-lost", "--onewire-at", "12", "--onewire-link", "reader"});
-  EXPECT_TRUE(options.OneWire);
-  EXPECT_EQ(options.AdapterFailure, OneWireFailure::ContactLost);
-  EXPECT_EQ(options.AdapterFailurePlace, 12U);
-  EXPECT_EQ(options.AdapterLink, "reader");
+  EXPECT_TRUE(reader.Served);
+  EXPECT_EQ(reader.FailureAs<OneWireFailure>(), OneWireFailure::ContactLost);
+  EXPECT_EQ(reader.Place, 12U);
+  EXPECT_EQ(reader.Link, "reader");
 }
 
 TEST(VenueOptions, TakeEveryOptionOfTheRadioModem) {
   const VenueOptions options =
       ParseVenueOptions({"--radio", "--radio-failure", "wrong-crc", "--radio-at", "0", "--radio-times", "2",
                          "--radio-answer-time", "8", "--radio-frames", "guns.bin", "--radio-link", "modem"});
-  EXPECT_TRUE(options.Radio);
-  EXPECT_EQ(options.RadioTrouble.Failure, RadioFailure::WrongCrc);
-  EXPECT_EQ(options.RadioTrouble.Gun, 0U);
-  EXPECT_EQ(options.RadioTrouble.Times, 2);
-  EXPECT_EQ(options.RadioAnswerTime, std::chrono::milliseconds(8));
-  EXPECT_EQ(options.RadioFramesFile, "guns.bin");
-  EXPECT_EQ(options.RadioLink, "modem");
-  EXPECT_EQ(options.Failure, BaseUnitFailure::None);
+  const DeviceOptions& unit = options.Of("base-unit");
+  const DeviceOptions& modem = options.Of("radio");
+  EXPECT_TRUE(modem.Served);
+  EXPECT_EQ(modem.FailureAs<RadioFailure>(), RadioFailure::WrongCrc);
+  EXPECT_EQ(modem.Place, 0U);
+  EXPECT_EQ(modem.Number("times"), 2U);
+  EXPECT_EQ(modem.Number("answer-time"), 8U);
+  EXPECT_EQ(modem.File("frames"), "guns.bin");
+  EXPECT_EQ(modem.Link, "modem");
+  EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::None);
 }
 
 TEST(VenueOptions, KnowEveryFailureByItsName) {
   for (const RadioFailureInfo& info : RadioFailures) {
-    EXPECT_EQ(ParseVenueOptions({"--radio-failure", std::string(info.Name)}).RadioTrouble.Failure,
-              info.Failure);
+    EXPECT_EQ(RadioIn({"--radio-failure", std::string(info.Name)}).FailureAs<RadioFailure>(), info.Failure);
   }
   for (const BaseUnitFailureInfo& info : BaseUnitFailures) {
-    EXPECT_EQ(ParseVenueOptions({"--failure", std::string(info.Name)}).Failure, info.Failure);
+    EXPECT_EQ(BaseUnitIn({"--failure", std::string(info.Name)}).FailureAs<BaseUnitFailure>(), info.Failure);
   }
   for (const OneWireFailureInfo& info : OneWireFailures) {
-    EXPECT_EQ(ParseVenueOptions({"--onewire-failure", std::string(info.Name)}).AdapterFailure, info.Failure);
+    EXPECT_EQ(OneWireIn({"--onewire-failure", std::string(info.Name)}).FailureAs<OneWireFailure>(),
+              info.Failure);
   }
+}
+
+TEST(VenueOptions, TakeTheOptionsOfTheBaseUnitUnderItsNameToo) {
+  const DeviceOptions unit =
+      BaseUnitIn({"--base-unit-failure", "silence", "--base-unit-at", "9", "--base-unit-link", "port",
+                  "--base-unit-frames", "f.bin", "--base-unit-games", "2"});
+  EXPECT_TRUE(unit.Served);
+  EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::Silence);
+  EXPECT_EQ(unit.Place, 9U);
+  EXPECT_EQ(unit.Link, "port");
+  EXPECT_EQ(unit.File("frames"), "f.bin");
+  EXPECT_EQ(unit.Number("games"), 2U);
+}
+
+TEST(VenueOptions, ServeTheBaseUnitUnlessTold) {
+  EXPECT_TRUE(BaseUnitIn({}).Served);
+  EXPECT_TRUE(BaseUnitIn({"--radio", "--onewire"}).Served);
+  EXPECT_FALSE(BaseUnitIn({"--radio", "--no-base-unit"}).Served);
+  EXPECT_TRUE(BaseUnitIn({"--no-base-unit", "--base-unit"}).Served);
 }
 
 TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
@@ -117,7 +157,10 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--radio-answer-time", "10001"},
                                                       {"--radio-frames", ""},
                                                       {"--radio-link", ""},
-                                                      {"--link", ""}};
+                                                      {"--link", ""},
+                                                      {"--no-base-unit"},
+                                                      {"--no-radio"},
+                                                      {"--onewire-games", "1"}};
   for (const std::vector<std::string>& arguments : refused) {
     EXPECT_THROW(ParseVenueOptions(arguments), std::invalid_argument) << testing::PrintToString(arguments);
   }
@@ -129,6 +172,22 @@ TEST(VenueOptions, SayWhatIsWrong) {
     FAIL();
   } catch (const std::invalid_argument& failure) {
     EXPECT_STREQ(failure.what(), "--players wants a number from 0 to 224, not \"300\"");
+  }
+}
+
+TEST(VenueOptions, SayWhichFailureIsNotKnown) {
+  const std::vector<std::pair<std::vector<std::string>, std::string>> unknown{
+      {{"--failure", "fire"}, "There is no failure \"fire\""},
+      {{"--base-unit-failure", "fire"}, "There is no failure \"fire\""},
+      {{"--onewire-failure", "fire"}, "The 1-wire adapter has no failure \"fire\""},
+      {{"--radio-failure", "fire"}, "The radio has no failure \"fire\""}};
+  for (const auto& [arguments, complaint] : unknown) {
+    try {
+      ParseVenueOptions(arguments);
+      ADD_FAILURE() << arguments.front();
+    } catch (const std::invalid_argument& failure) {
+      EXPECT_EQ(failure.what(), complaint);
+    }
   }
 }
 

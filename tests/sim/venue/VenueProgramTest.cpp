@@ -5,12 +5,13 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <thread>
 
 #include "sim/baseunit/BaseUnitAnswer.h"
 #include "sim/game/GameMaker.h"
 #include "sim/radio/RadioAnswer.h"
-#include "tests/sim/onewire/AdapterHost.h"
-#include "tests/sim/radio/RadioLiterals.h"
+#include "tests/support/AdapterHost.h"
+#include "tests/support/RadioLiterals.h"
 #include "tests/support/RawHost.h"
 #include "tests/support/VenueProcess.h"
 
@@ -33,6 +34,18 @@ class VenueProgram : public testing::Test {
   static std::string Content(const std::string& path) {
     std::ifstream file(path, std::ios::binary);
     return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  }
+
+  // False when `text` does not come into the file within the limit.
+  static bool AwaitContent(const std::string& path, const std::string& text) {
+    const auto end = std::chrono::steady_clock::now() + limit;
+    while (Content(path).find(text) == std::string::npos) {
+      if (std::chrono::steady_clock::now() > end) {
+        return false;
+      }
+      std::this_thread::sleep_for(std::chrono::milliseconds(1));
+    }
+    return true;
   }
 
   // Every frame must be as `answer` has it.
@@ -133,6 +146,37 @@ TEST_F(VenueProgram, ExitsWhenItsLineHasBeenPulledOut) {
   EXPECT_FALSE(fs::is_symlink(fs::symlink_status(File("port"))));
 }
 
+TEST_F(VenueProgram, DoesNotAnswerAHostAtOtherSettingsAndTellsSo) {
+  const BaseUnitAnswer answer = MakeBaseUnitAnswer(MakeGame(2, 1));
+  for (const std::vector<std::string>& pace : {std::vector<std::string>{}, {"--fast"}}) {
+    std::vector<std::string> arguments{"--players", "2", "--log", File("log")};
+    arguments.insert(arguments.end(), pace.begin(), pace.end());
+    VenueProcess venue(arguments);
+    const std::string device = venue.ReadDevice();
+    RawHost host(device);
+    host.Speak({.Baud = 9600, .DataBits = 7, .Parity = 'E', .StopBits = 2});
+    const std::string heard = Text(host.Settings());
+    host.Write({1, 0});
+    EXPECT_TRUE(AwaitContent(File("log"), "fault: the host speaks " + heard));
+    EXPECT_TRUE(host.IsSilent());
+    host.Speak({.Baud = 19200});
+    Download(device, answer);
+    venue.Signal(SIGTERM);
+    EXPECT_EQ(venue.WaitForExit(), 0);
+    EXPECT_EQ(venue.RestOfErrors(), "base unit: the host speaks " + heard +
+                                        " instead of 19200,8N1\nbase unit: faults of the host: 1\n");
+  }
+}
+
+TEST_F(VenueProgram, ServesOthersWithoutTheBaseUnitWhenTold) {
+  VenueProcess venue({"--fast", "--no-base-unit", "--onewire"});
+  AdapterHost host(venue.ReadDevice("1-wire adapter"));
+  EXPECT_EQ(host.Ask({0x17}, 1), Bytes{0x16});
+  venue.Signal(SIGTERM);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_EQ(venue.RestOfOutput(), "");
+}
+
 const Bytes readRom{0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3};
 
 TEST_F(VenueProgram, HoldsButtonsToTheReaderAndTakesThemAwayOnCommand) {
@@ -143,6 +187,8 @@ TEST_F(VenueProgram, HoldsButtonsToTheReaderAndTakesThemAwayOnCommand) {
   venue.WriteInput("touch EFCDAB8967452301\n");
   EXPECT_EQ(venue.ReadLine(), "touched EFCDAB8967452301");
   EXPECT_EQ(host.Ask(readRom, 10), (Bytes{0xCD, 0x33, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF}));
+  venue.WriteInput("onewire leave EFCDAB8967452301\n");
+  EXPECT_EQ(venue.ReadLine(), "left EFCDAB8967452301");
   venue.WriteInput("nonsense\n\nleave\n");
   EXPECT_EQ(venue.ReadLine(), "left");
   EXPECT_EQ(host.Ask({0xC1}, 1), Bytes{0xCF});
@@ -280,7 +326,8 @@ TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
       {"--onewire", "--onewire-failure", "contact-lost", "--onewire-at", "65"},
       {"--failure", "hang-up", "--players", "0"},
       {"--failure", "silence", "--players", "0", "--at", "2"},
-      {"--radio", "--radio-failure", "silent-gun", "--radio-at", "41"}};
+      {"--radio", "--radio-failure", "silent-gun", "--radio-at", "41"},
+      {"--no-base-unit"}};
   for (const std::vector<std::string>& arguments : refused) {
     VenueProcess venue(arguments);
     EXPECT_EQ(venue.WaitForExit(), 2) << testing::PrintToString(arguments);

@@ -1,0 +1,10 @@
+#include "sim/venue/Devices.h"
+
+namespace sim {
+
+const std::vector<DeviceEntry>& Devices() {
+  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(), RadioEntry()};
+  return devices;
+}
+
+}  // namespace sim

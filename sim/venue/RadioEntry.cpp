@@ -1,0 +1,43 @@
+#include <chrono>
+
+#include "sim/radio/RadioGun.h"
+#include "sim/radio/RadioModem.h"
+#include "sim/venue/Devices.h"
+
+namespace sim {
+namespace {
+
+StartedDevice Start(const DeviceStart& start) {
+  const DeviceOptions& options = start.Options;
+  const std::chrono::milliseconds answerTime(options.Number("answer-time"));
+  return {std::make_unique<RadioModem>(
+      RadioModemSettings{.Guns = MakeRadioGuns(start.Game, answerTime),
+                         .Trouble = {.Failure = options.FailureAs<RadioFailure>(),
+                                     .Gun = options.Place,
+                                     .Times = static_cast<int>(options.Number("times"))},
+                         .LinePace = start.LinePace,
+                         .Log = start.Log(),
+                         .Frames = start.File("frames")})};
+}
+
+}  // namespace
+
+DeviceEntry RadioEntry() {
+  return {.Name = "radio",
+          .Title = "radio modem",
+          .Purpose = "the radio modem and the guns of the game",
+          .Failures = FailureRows(RadioFailures),
+          .NoSuchFailure = "The radio has no failure",
+          .PlaceMeaning = "the gun that the failure strikes, from 1 by player ids; 0: every gun (1)",
+          .HighestPlace = 224,
+          .Options = {{"times", "N", "how many of a gun's answers the failure strikes; 0: all (0)",
+                       NumberValue{.Highest = 1'000'000}},
+                      {"answer-time", "MS", "milliseconds in which a gun answers (5)",
+                       NumberValue{.Highest = 10'000, .Default = 5}},
+                      {"frames", "FILE", "the frame of each gun whose transfer was closed, when it first was",
+                       FileValue{}}},
+          .FaultCount = TellFaultCount::Always,
+          .Start = Start};
+}
+
+}  // namespace sim

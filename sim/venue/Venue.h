@@ -1,0 +1,58 @@
+#pragma once
+
+#include <fstream>
+#include <functional>
+#include <map>
+#include <memory>
+#include <optional>
+#include <ostream>
+#include <string>
+#include <vector>
+
+#include "sim/line/DeviceLink.h"
+#include "sim/venue/DeviceEntry.h"
+#include "sim/venue/VenueOptions.h"
+
+namespace sim {
+
+/// The devices that a command line asks for, served from its construction to its destruction.
+class Venue {
+ public:
+  /// `endVenue` may be called on any thread, as soon as there is nothing left to serve. Throws what the
+  /// starts of the devices throw, and std::runtime_error when a file cannot be written. `devices` must
+  /// outlive it.
+  Venue(const VenueOptions& options, std::function<void()> endVenue,
+        const std::vector<DeviceEntry>& devices = Devices());
+  Venue(const Venue&) = delete;
+  Venue& operator=(const Venue&) = delete;
+
+  /// "TITLE: DEVICE", a line each.
+  void TellDevices(std::ostream& out) const;
+  /// What the hosts must not have done.
+  void TellHostFaults(std::ostream& out) const;
+
+  bool TakesCommands() const;
+  /// Hands `line` to the device that has such a command; of several to the first of the table, unless the
+  /// line begins with another's name. Returns what is to be printed of it, nothing for an empty line. Throws
+  /// std::invalid_argument with a text for the user.
+  std::string Obey(const std::string& line);
+
+ private:
+  struct ServedDevice {
+    explicit ServedDevice(const DeviceEntry& entry) : Entry(entry) {}
+
+    const DeviceEntry& Entry;
+    std::map<std::string, std::ofstream, std::less<>> Files;
+    StartedDevice Started;
+    std::optional<DeviceLink> Link;
+  };
+
+  void Start(ServedDevice& device, const VenueOptions& options, const std::vector<GunScores>& game);
+  std::ostream* Log(const std::optional<std::string>& path);
+
+  std::function<void()> endVenue_;
+  std::optional<std::ofstream> log_;
+  std::vector<std::unique_ptr<ServedDevice>> devices_;
+};
+
+}  // namespace sim

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <string>
+
+#include "core/data/ProgramLog.h"
+#include "platform/MessageBoxes.h"
+
+/// Message boxes that the program's log tells of, with what the operator answered. An error report is logged
+/// as a fault.
+class LoggedBoxes : public MessageBoxes {
+ public:
+  /// Both outlive this.
+  LoggedBoxes(MessageBoxes& boxes, ProgramLog& log) : boxes_(boxes), log_(log) {}
+
+  BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,
+                 BoxButtons buttons = BoxButtons::Ok) override;
+
+ private:
+  MessageBoxes& boxes_;
+  ProgramLog& log_;
+};

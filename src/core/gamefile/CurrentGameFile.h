@@ -1,0 +1,34 @@
+#pragma once
+
+#include <functional>
+#include <string>
+
+#include "core/game/Game.h"
+#include "platform/FileDialog.h"
+#include "platform/Files.h"
+#include "platform/MessageBoxes.h"
+
+/// The file last used by Load Game and Save Game, which both remember its name.
+class CurrentGameFile {
+ public:
+  CurrentGameFile(FileDialog& dialog, Files& files, MessageBoxes& boxes)
+      : dialog_(dialog), files_(files), boxes_(boxes) {}
+
+  /// Asks for a name and saves there, replacing an existing file. Cancel saves under the name of the last
+  /// load or save, if there was one. Returns true if the game was saved. A failure throws RuntimeError and
+  /// leaves the old file.
+  bool SaveGame(const Game& game, const std::string& missionName);
+
+  /// Asks for a game to load. Returns false, and forgets the file, if the operator cancels.
+  bool AskForGame();
+
+  /// Reads the chosen file into `game`, which the caller has cleared. If it is not a game file, shows a box
+  /// and returns false. Otherwise behaves like ReadGameFile.
+  bool LoadGame(Game& game, const std::function<void(const std::string&)>& selectMission);
+
+ private:
+  FileDialog& dialog_;
+  Files& files_;
+  MessageBoxes& boxes_;
+  std::string fileName_;
+};

@@ -1,0 +1,33 @@
+#include "ui/Look.h"
+
+#include <QApplication>
+#include <QIcon>
+
+namespace {
+
+constexpr const char* StyleSheet = R"(
+#Banner { background: #1b2233; }
+#Banner QLabel { color: #e8ecf4; font-weight: bold; }
+#Banner QComboBox { min-height: 30px; }
+#GetScores, #RemoteManageButton { min-height: 30px; padding: 2px 18px; border-radius: 5px; border: 1px solid #3c4a68;
+  background: #2a344c; color: #e8ecf4; font-weight: bold; }
+#GetScores { background: #2f6fd6; border-color: #5b92ea; color: white; }
+#GetScores:hover { background: #3d7de4; }
+#GetScores:pressed { background: #245bb4; }
+#GetScores:focus, #RemoteManageButton:focus { border: 2px solid white; }
+#RemoteManageButton:disabled { background: #222a3d; border-color: #2c3650; color: #7d879b; }
+#centralwidget > #Label1, #centralwidget > #Label2 { font-weight: bold; }
+ScoreListView, #DataList { border: 1px solid #c3c9d6; selection-background-color: #2f6fd6; selection-color: white; }
+ScoreListView QHeaderView::section, #DataList QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid #c3c9d6;
+  background: #e9edf4; color: #1b2233; }
+#DataList QHeaderView::section { padding: 5px 3px; font-weight: bold; }
+)";
+
+}  // namespace
+
+void PrepareLook() {
+  Q_INIT_RESOURCE(pictures);  // a static library's resources are not registered by themselves
+  QApplication::setDesktopFileName(QStringLiteral("tessarine"));
+  QApplication::setWindowIcon(QIcon(QStringLiteral(":/pictures/tessarine-256.png")));
+  qApp->setStyleSheet(QString::fromUtf8(StyleSheet));
+}
