@@ -3,13 +3,11 @@
 #include <algorithm>
 #include <iterator>
 
+#include "platform/Letters.h"
+
 namespace {
 
 constexpr std::size_t ButtonDigits = 16;
-
-bool IsDigit(char c) {
-  return c >= '0' && c <= '9';
-}
 
 bool IsHexDigit(char c) {
   return IsDigit(c) || (c >= 'A' && c <= 'F') || (c >= 'a' && c <= 'f');
