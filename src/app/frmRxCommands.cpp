@@ -147,7 +147,7 @@ std::string frmRx::ShowMembers(std::int32_t contactToShow) {
                  this);
   window.ContactToShow = contactToShow;
   window.exec();
-  return window.SelectedContact;
+  return window.SelectedContact();
 }
 
 void frmRx::ShowAdminData() {

@@ -314,6 +314,6 @@ void Members::ChangeMemberPicture() {
 void Members::SelectMember() {
   data1_->Refresh(
       NameQuery(ui_->FirstNameEntry->text().toStdString(), ui_->LastNameEntry->text().toStdString()));
-  SelectedContact = TextOf(data1_->Rows().Fields("ContactID"));
+  selectedContact_ = TextOf(data1_->Rows().Fields("ContactID"));
   accept();
 }

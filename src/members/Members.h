@@ -42,7 +42,9 @@ class Members : public QDialog, private BoundControls {
   ~Members() override;
 
   std::int32_t ContactToShow = 0;  ///< member to show when the window opens, 0 for the first
-  std::string SelectedContact;     ///< `ContactID` of the member chosen with OK, else empty
+
+  /// `ContactID` of the member chosen with OK, else empty.
+  const std::string& SelectedContact() const { return selectedContact_; }
 
   void reject() override;
 
@@ -81,4 +83,5 @@ class Members : public QDialog, private BoundControls {
   const Parts parts_;
   Commands commands_;
   std::optional<MemberRows> data1_;
+  std::string selectedContact_;
 };

@@ -42,7 +42,7 @@ bool EndsWithFrame(const std::uint8_t* begin, const std::uint8_t* end, int type)
 void RequireReadable(const ReceivedFrame& frame) {
   try {
     const GunPacket packet = ReadGunPacket(frame);
-    Require(packet[0] == frame.Data[0] && packet[0] <= 94);
+    Require(packet.PayloadLength == frame.Data[0] && packet.PayloadLength <= 94);
   } catch (const RuntimeError& error) {
     Require(error.Number() == 9 && frame.Data[0] >= 95);
   }
