@@ -49,9 +49,11 @@ class Opening : public testing::Test {
     disk.Put("/program/members_default.mdb", "fresh");
   }
 
-  std::unique_ptr<Database> Open() {
+  std::unique_ptr<Database> Open() { return Open(strings); }
+
+  std::unique_ptr<Database> Open(const StringTable& texts) {
     return OpenUserDatabase({"/data/members.mdb", "Members", "/program/members_default.mdb"},
-                            {engine, old, disk, boxes, copies, strings});
+                            {engine, old, disk, boxes, copies, texts});
   }
 
   static FakeMessageBoxes::Box Question(const std::string& reason) {
@@ -92,6 +94,23 @@ TEST_F(Opening, ConvertsAnOldFileAndTellsWhatWasNotTaken) {
           "is "
           "kept as /data/members.mdb.jet.\n\nNot taken over:\ntable Extras (3 rows)\ncolumn Shoe size",
           "Database status", BoxIcon::Information, BoxButtons::Ok}));
+}
+
+TEST_F(Opening, TellsInChineseToo) {
+  const StringTable chinese(Language::SimplifiedChinese);
+  old.OldPaths = {"/data/members.mdb"};
+  old.Report = {40, {{NotTakenOver::TextsOfColumn, "Shoe size"}}, "/data/members.mdb.jet"};
+  Open(chinese);
+  old.OldPaths = {"/data/members.mdb"};
+  old.Failure = "It is damaged.";
+  Open(chinese);
+  ASSERT_EQ(boxes.Boxes.size(), 2U);
+  EXPECT_EQ(boxes.Boxes[0].Text,
+            "旧安装的数据库已转换：/data/members.mdb，共 40 行。旧文件保留为 /data/members.mdb.jet。\n\n"
+            "未转换的内容：\n列 Shoe size 中不是数字的文本（现为 0）");
+  EXPECT_EQ(boxes.Boxes[1].Text,
+            "无法使用数据库 /data/members.mdb。It is damaged.\n\n该文件将保持原样。按“确定”使用新的数据库 "
+            "/data/members-new.mdb 继续，或按“取消”结束程序。");
 }
 
 TEST_F(Opening, HasTheFileCopiedBeforeItChanges) {

@@ -158,7 +158,8 @@ TEST_P(RemoteWindow, ShowsHowASearchGoes) {
     ++looks;
     EXPECT_EQ(TextOf("StatusLabel"), "Searching...");
     EXPECT_EQ(TextOf("PlayerCountLabel"), " 1");
-    EXPECT_EQ(TextOf("ProgressLabel"), "Pass 2 of 2, ID 35");
+    EXPECT_EQ(TextOf("ProgressLabel"),
+              GetParam() == Language::English ? "Pass 2 of 2, ID 35" : "第 2 轮，共 2 轮，ID 35");
     EXPECT_TRUE(Find<QLabel>(window, "ProgressLabel").isVisible());
     EXPECT_EQ(Find<QProgressBar>(window, "Progress").value(), 131);
     EXPECT_EQ(Find<QProgressBar>(window, "Progress").maximum(), 256);
@@ -180,7 +181,7 @@ TEST_P(RemoteWindow, FetchesTheScoresOfTheListedGuns) {
   Meanwhile(500, [&] {
     looked = true;
     EXPECT_EQ(TextOf("StatusLabel"), "Getting Scores...");
-    EXPECT_EQ(TextOf("ProgressLabel"), "Gun 2 of 2");
+    EXPECT_EQ(TextOf("ProgressLabel"), GetParam() == Language::English ? "Gun 2 of 2" : "第 2 支枪，共 2 支");
     EXPECT_THAT(Column(4), ElementsAre("Scores OK", "Scores In Progress"));
   });
   Press("GetScoresButton");
