@@ -18,7 +18,7 @@ double MicrosecondsSince(Clock::time_point start) {
   return std::chrono::duration<double, std::micro>(Clock::now() - start).count();
 }
 
-/// Time that mdb-export takes for the same table.
+/// Time that mdb-export takes on the same table.
 double Export(const std::string& file, const std::string& csv) {
   const std::string command = "exec mdb-export -b hex '" + file + "' Members > '" + csv + "'";
   const auto start = Clock::now();
@@ -43,7 +43,7 @@ double Convert(const std::string& file, const std::string& folder) {
 
 }  // namespace
 
-/// bench-conversion: needs a members file of an old installation.
+/// bench-conversion: needs a members file from an old installation.
 int main() {
   const std::string file = TESSARINE_OLD_FILES "/members.mdb";
   if (!std::filesystem::exists(file)) {

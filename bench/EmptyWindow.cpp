@@ -3,7 +3,7 @@
 
 #include "bench/FirstIdle.h"
 
-/// The least that a program with a Qt main window can be.
+/// The smallest program with a Qt main window, for comparison.
 int main(int argc, char** argv) {
   QApplication application(argc, argv);
   QMainWindow window;

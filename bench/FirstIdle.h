@@ -5,7 +5,7 @@
 #include <QWidget>
 #include <QWindow>
 
-/// Ends the program at the first idle moment after `window` is on the screen and painted.
+/// Ends the program at the first idle moment after `window` has been shown and painted.
 inline void QuitWhenUsable(QWidget& window) {
   auto* look = new QTimer(&window);
   QObject::connect(look, &QTimer::timeout, look, [&window] {

@@ -28,7 +28,7 @@ std::string DallasIdOf(int member) {
   return text;
 }
 
-/// Every player is some member far from the others.
+/// A player's member; the members of different players are far apart in the table.
 int MemberOf(int index, int members) {
   return index * (members / PlayerCount);
 }
@@ -97,7 +97,7 @@ FullGame::FullGame(int members) : boxes_(std::make_unique<NoBoxes>()) {
   Missions = std::make_unique<MissionList>(*rsScenarios_, Strings, *boxes_);
   Missions->FillMissionList();
   members_ = std::make_unique<MemberLookup>(*rsMembers_, *boxes_);
-  analysis_ = std::make_unique<ScoreAnalysis>(game, factors_, *Missions, *members_, Strings, board_, teams_);
+  analysis_ = std::make_unique<ScoreAnalysis>(game, factors_, *Missions, *members_, players_, teams_);
 }
 
 FullGame::~FullGame() {
@@ -110,6 +110,20 @@ void FullGame::CalculateScores() {
   const ReadScope members(*dbMembers_);
   const ReadScope missions(*dbScenarios_);
   analysis_->CalculateScores();
+}
+
+std::size_t FullGame::ShowLists() const {
+  std::size_t letters = 0;
+  const auto show = [&](const Board& list, int columns) {
+    for (int place = 0; place < list.RowCount(); ++place) {
+      for (int column = 0; column < columns; ++column) {
+        letters += texts_.Cell(list.RowAt(place), static_cast<BoardColumn>(column)).size();
+      }
+    }
+  };
+  show(players_, BoardColumnCount);
+  show(teams_, TeamColumnCount);
+  return letters;
 }
 
 void FullGame::Unassign() {

@@ -4,27 +4,27 @@
 #include <memory>
 #include <string>
 
+#include "core/game/BoardTexts.h"
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
 #include "core/game/MissionList.h"
 #include "core/game/ScoreAnalysis.h"
-#include "core/game/ScoreList.h"
 #include "platform/sqlite/SqliteDatabase.h"
 
 /// The fullest game: all 224 players active, all 50,176 hits above 0.
 void FillCompletely(Game& game);
 
-/// Makes a mission file at `path` with that many missions.
+/// Creates a mission file at `path` with that many missions.
 void MakeMissions(const std::string& path, int missions);
 
-/// Makes a members file at `path` with that many members: First7 Last7, every second with a nickname as
-/// Nick7.
+/// Creates a members file at `path` with that many members, named First7 Last7; every second one has a
+/// nickname like Nick7.
 void MakeMembers(const std::string& path, int members);
 
-/// Scores the fullest game with databases of its own. A box shown is a fault and ends the program.
+/// Scores the fullest game with its own databases. A box is an error and ends the program.
 class FullGame {
  public:
-  /// `members`: how many members the database has; every player is then one of them.
+  /// `members` is the number of members in the database; every player is one of them.
   explicit FullGame(int members);
   ~FullGame();
   FullGame(const FullGame&) = delete;
@@ -32,7 +32,11 @@ class FullGame {
 
   void CalculateScores();
 
-  /// Makes the next calculation look all players up by their buttons.
+  /// Makes the texts of all cells of both lists, as a screen that shows them all does; how many letters they
+  /// have.
+  std::size_t ShowLists() const;
+
+  /// Makes the next calculation look up all players by their buttons.
   void Unassign();
 
   StringTable Strings{Language::English};
@@ -51,7 +55,8 @@ class FullGame {
   std::unique_ptr<Recordset> rsMembers_;
   std::unique_ptr<MemberLookup> members_;
   SoldieringFactors factors_;
-  ScoreList board_;
-  ScoreList teams_;
+  Board players_{[] {}};
+  Board teams_{[] {}};
+  BoardTexts texts_{game, Strings};
   std::unique_ptr<ScoreAnalysis> analysis_;
 };

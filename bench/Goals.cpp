@@ -7,7 +7,7 @@
 
 namespace {
 
-/// Keeps the times and prints nothing.
+/// Collects the times and prints nothing.
 class Collector : public benchmark::BenchmarkReporter {
  public:
   bool ReportContext(const Context& /*context*/) override { return true; }

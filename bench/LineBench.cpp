@@ -20,7 +20,7 @@ using Seconds = std::chrono::duration<double>;
 constexpr double Baud = 19200;
 constexpr double BitsPerByte = 10;
 
-/// Boxes are answered at once.
+/// Answers every box at once.
 class SilentBoxes : public MessageBoxes {
  public:
   BoxAnswer Show(const std::string&, const std::string&, BoxIcon, BoxButtons) override {

@@ -9,7 +9,7 @@
 
 namespace {
 
-/// Loads `file` through the menu and the dialog.
+/// Loads `file` through the menu and the file dialog.
 void LoadThroughMenu(QWidget& window, const QString& file) {
   QTimer answer;
   QObject::connect(&answer, &QTimer::timeout, &answer, [&file] {
@@ -24,8 +24,7 @@ void LoadThroughMenu(QWidget& window, const QString& file) {
 
 }  // namespace
 
-/// bench-main-window [GAME]: the program as it starts, ended once it is usable, with GAME loaded first when
-/// it is named.
+/// bench-main-window [GAME]: starts the program, loads GAME if given, and ends once the window is usable.
 int main(int argc, char** argv) {
   QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
   QApplication application(argc, argv);

@@ -23,7 +23,7 @@
 namespace {
 
 constexpr int ManyMembers = 100'000;
-constexpr int VenueMembers = 1000;  ///< of whom 224 play
+constexpr int VenueMembers = 1000;  ///< 224 of them play
 
 class NoBoxes : public MessageBoxes {
  public:
@@ -39,7 +39,7 @@ class NoDialog : public FileDialog {
   std::optional<std::string> ShowSave(const FileRequest&) override { return std::nullopt; }
 };
 
-/// The files of one run of this program.
+/// The files used by one run of this benchmark.
 class Folder {
  public:
   Folder() {
@@ -60,7 +60,7 @@ class Folder {
   std::filesystem::path path_;
 };
 
-/// The engine itself, durable as ours.
+/// SQLite used directly, as durable as our own layer.
 class Engine {
  public:
   explicit Engine(const std::string& path) {
@@ -147,7 +147,7 @@ void DurableTransaction(benchmark::State& state, const Folder& folder) {
   }
 }
 
-/// A photograph of about 100 KB as a camera makes it.
+/// Creates a photograph of about 100 KB, like one from a camera.
 void MakePhoto(const std::string& path) {
   QImage image(900, 700, QImage::Format_RGB32);
   unsigned noise = 1;
@@ -171,7 +171,7 @@ void MakePhoto(const std::string& path) {
   LinuxFiles().Write(path, bytes.toStdString());
 }
 
-/// Gives the first members this photograph.
+/// Stores the photograph for the first members.
 void StorePhotos(const Folder& folder) {
   NoBoxes boxes;
   SqliteEngine engine;
@@ -186,7 +186,7 @@ void StorePhotos(const Folder& folder) {
   group.Commit();
 }
 
-/// From one member to the next and back, each shown on the screen.
+/// Moves to the next member and back; each is painted.
 void NextMember(benchmark::State& state, const Folder& folder) {
   const StringTable strings(Language::English);
   NoBoxes boxes;

@@ -33,7 +33,8 @@ class SilentBoxes : public MessageBoxes {
   }
 };
 
-/// Median time of a save in the editor, with that many missions: written, list rebuilt, last mission shown.
+/// Median time of a save in the editor with that many missions: row written, list rebuilt, last mission
+/// shown.
 double SaveTime(const std::string& file, int missions) {
   MakeMissions(file, missions);
   SqliteEngine engine;
@@ -54,7 +55,7 @@ double SaveTime(const std::string& file, int missions) {
   return Median(times);
 }
 
-/// Median time of reading the names of that many missions into a list.
+/// Median time for reading the names of that many missions into a list.
 double FillTime(const std::string& file, int missions) {
   MakeMissions(file, missions);
   SqliteEngine engine;
@@ -81,7 +82,7 @@ double FillTime(const std::string& file, int missions) {
 
 }  // namespace
 
-/// bench-missions: a save must not become slow where there are many missions.
+/// bench-missions: saving must not become slow when there are many missions.
 int main(int argc, char** argv) {
   QApplication application(argc, argv);
   const std::string file = (std::filesystem::temp_directory_path() / "tessarine-bench-missions.mdb").string();

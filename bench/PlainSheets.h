@@ -5,10 +5,10 @@
 #include <utility>
 #include <vector>
 
-/// Fills documents as a script would: one call for each bookmark and for each cell.
+/// Fills documents the way a script would, with one call per bookmark and per cell.
 class PlainSheets {
  public:
-  /// Connects to the LibreOffice that listens on `pipe`; waits for it.
+  /// Connects to the LibreOffice that listens on `pipe`, waiting until it does.
   explicit PlainSheets(const std::string& pipe);
   ~PlainSheets();
 

@@ -10,8 +10,8 @@
 #include "bench/Goals.h"
 #include "bench/RealLine.h"
 #include "core/data/IniReader.h"
-#include "devices/radio/FrameParser.h"
 #include "devices/radio/RemoteManage.h"
+#include "devices/radio/XBeeFrameParser.h"
 #include "sim/game/GameMaker.h"
 #include "sim/radio/RadioModem.h"
 #include "ui/Look.h"
@@ -20,11 +20,11 @@ namespace {
 
 using Seconds = std::chrono::duration<double>;
 
-constexpr int Who = RUSAGE_THREAD;  // the modem has a thread of its own
+constexpr int Who = RUSAGE_THREAD;  // without the simulated modem, which has its own thread
 constexpr int Guns = 40;
 constexpr std::chrono::milliseconds AnswerTime(5);
 
-/// Answers with a block of 90 bytes, as fetching scores brings them, a million bytes or a little more.
+/// At least a million bytes of answers that each hold a 90-byte block, as when scores are fetched.
 std::vector<std::uint8_t> BlockAnswers() {
   constexpr std::size_t wanted = 1'000'000;
   std::vector<std::uint8_t> bytes;
@@ -50,7 +50,7 @@ bool MeasureParser() {
   constexpr double goal = 100;  // MB/s
   const std::vector<std::uint8_t> bytes = BlockAnswers();
   std::vector<double> speeds;
-  FrameParser parser;
+  XBeeFrameParser parser;
   int frames = 0;
   for (int round = 0; round < rounds; ++round) {
     const auto start = std::chrono::steady_clock::now();
@@ -66,7 +66,7 @@ bool MeasureParser() {
   return ReportGoal("100 MB/s / speed of the radio's frame parser", goal / speed, 1, detail);
 }
 
-/// The window on a real line with 40 guns behind the modem.
+/// The window on a real line, with 40 guns behind the modem.
 class Site {
  public:
   Site() {
@@ -84,7 +84,7 @@ class Site {
 
   sim::RadioModemTraffic Traffic() const { return modem_.Traffic(); }
 
-  /// Guns of which the list says this.
+  /// Number of guns with this status in the list.
   int CountOf(const QString& status) const {
     const QAbstractItemModel& list = *window_.findChild<QTableView*>(QStringLiteral("DataList"))->model();
     return static_cast<int>(

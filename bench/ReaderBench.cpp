@@ -10,13 +10,13 @@
 
 namespace {
 
-/// The search in the data sheet of the DS2480B: reset, data mode, Search ROM, command mode, accelerator on,
-/// data mode, 16 bytes of path, command mode, accelerator off; answered are the reset, Search ROM and the
+/// The search from the DS2480B data sheet: reset, data mode, Search ROM, command mode, accelerator on, data
+/// mode, 16 bytes of path, command mode, accelerator off. The chip answers the reset, Search ROM and the
 /// path.
 constexpr int SearchBytesSent = 24;
 constexpr int SearchBytesAnswered = 18;
 
-/// Answers by the place of the byte that they answer, for a search that finds button 01-00CDAB896745-A3.
+/// Answers by the index of the byte that they answer, for a search that finds button 01-00CDAB896745-A3.
 const std::map<std::size_t, std::uint8_t> Answers = {
     {0, 0xCD},  {2, 0xF0},  {6, 0x02},  {7, 0x00},  {8, 0x22},  {9, 0x20},
     {10, 0x2A}, {11, 0x28}, {12, 0x82}, {13, 0x80}, {14, 0x8A}, {15, 0x88},
@@ -24,7 +24,7 @@ const std::map<std::size_t, std::uint8_t> Answers = {
 
 }  // namespace
 
-/// Bytes on the reader's line in one tick of the poll that finds a button.
+/// bench-reader: counts the bytes on the reader's line in one poll that finds a button.
 int main() {
   FakeFiles files;
   const IniReader ini(files, "/tessarine.ini");

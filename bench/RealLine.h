@@ -8,13 +8,13 @@
 
 #include "platform/SerialDevices.h"
 
-/// What a job on a real serial line took, in seconds.
+/// Time spent on a job on a real serial line, in seconds.
 struct Spent {
   double Wall;
   double Processor;
 };
 
-/// Processor time of RUSAGE_SELF or RUSAGE_THREAD, in seconds.
+/// Processor time of `who` (RUSAGE_SELF or RUSAGE_THREAD), in seconds.
 inline double ProcessorSeconds(int who) {
   rusage usage{};
   getrusage(who, &usage);

@@ -32,11 +32,11 @@ double MillisecondsSince(Steady::time_point start) {
   return std::chrono::duration<double, std::milli>(Steady::now() - start).count();
 }
 
-/// Where a run's time goes, and how long the event loop had to wait in between, single calls of the word
-/// processor apart.
+/// Where a run's time goes, and the longest time without events processed, not counting single calls to the
+/// word processor.
 struct Times {
   std::map<std::string, double> ByKind;  ///< milliseconds
-  double InCalls = 0;                    ///< since events were served last
+  double InCalls = 0;                    ///< milliseconds in calls since events were last processed
   double LongestGap = 0;
   Steady::time_point Served = Steady::now();
 
@@ -133,7 +133,7 @@ class SilentBoxes : public MessageBoxes {
   bool Failed = false;
 };
 
-/// A photograph as a camera makes it: 480 x 640, some 60 kB.
+/// A photograph like one from a camera: 480 x 640, about 60 kB.
 Blob Photograph(int member) {
   QImage image(480, 640, QImage::Format_RGB32);
   unsigned noise = static_cast<unsigned>(member);
@@ -150,7 +150,8 @@ Blob Photograph(int member) {
   return {bytes.begin(), bytes.end()};
 }
 
-/// The venue's folder with the template and forty members, and a game of 224 of whom each hit so many others.
+/// A data folder with the template and forty members, and a game of 224 players who each hit `hitsPerPlayer`
+/// others.
 struct Evening {
   Evening(const std::filesystem::path& bin, int hitsPerPlayer) {
     std::string pattern = (std::filesystem::temp_directory_path() / "tessarine-bench-XXXXXX").string();
@@ -201,7 +202,7 @@ struct Evening {
   SqliteEngine engine_;
 };
 
-/// All 224 sheets in the program's way; milliseconds.
+/// Time for all 224 sheets made by the program, in milliseconds.
 double OwnRun(Evening& evening, LibreOffice& office, std::int16_t target, Times& times) {
   MemberLookup members(*evening.RsMembers, evening.Boxes);
   const QtClock clock;
@@ -228,7 +229,7 @@ double OwnRun(Evening& evening, LibreOffice& office, std::int16_t target, Times&
   return MillisecondsSince(start);
 }
 
-/// A LibreOffice of its own for the plain way.
+/// A separate LibreOffice for PlainSheets.
 class PlainOffice {
  public:
   explicit PlainOffice(const std::string& host)
@@ -249,7 +250,7 @@ class PlainOffice {
   ChildProcess process_;
 };
 
-/// Some of the 224 sheets in the plain way; milliseconds for all.
+/// Time for all 224 sheets made by PlainSheets, in milliseconds, extrapolated from some of them.
 double PlainRun(Evening& evening, const std::string& host) {
   const PlainOffice office(host);
   PlainSheets plain(office.Name);
@@ -263,8 +264,9 @@ double PlainRun(Evening& evening, const std::string& host) {
       sheet.Bookmarks.insert(sheet.Bookmarks.end(), texts.begin(), texts.end());
     };
     add(ResultTexts(evening.Board, index, WinningTeam(evening.Board)));
-    members.LoadMember(evening.Board.Players(index).MemberIndex);
-    add(MemberTexts(*evening.RsMembers, members));
+    const std::int32_t contactId = evening.Board.Players(index).MemberIndex;
+    const std::optional<Member> member = members.LoadMember(contactId);
+    add(MemberTexts(*member, members.LoadHistory(contactId)));
     sheet.Photo = files.MakeTempFileName();
     ExportPhoto(*evening.RsMembers, "Photograph", "PhotographLength", sheet.Photo, files);
     add(GameTexts(evening.Board.Players(index), "Bench", "15 November 2026", " 1"));
@@ -279,7 +281,7 @@ double PlainRun(Evening& evening, const std::string& host) {
   return time;
 }
 
-/// Starts the word processor with events served; returns the longest time that they were not, in
+/// Starts the word processor while processing events; returns the longest time without events processed, in
 /// milliseconds.
 double StartOffice(LibreOffice& office) {
   const auto start = Steady::now();

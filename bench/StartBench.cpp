@@ -45,7 +45,7 @@ Run RunChild(const std::string& program, const std::string& argument) {
           static_cast<double>(usage.ru_maxrss) / 1024};
 }
 
-/// Whole-process figures of two programs, run in turn.
+/// Whole-process figures of two programs that are run alternately.
 class Pair {
  public:
   Pair(const std::string& program, const std::string& argument, const std::string& empty) {
@@ -81,7 +81,7 @@ class Pair {
 
 }  // namespace
 
-/// bench-start: needs XDG_DATA_HOME to name a folder with the program's data.
+/// bench-start: XDG_DATA_HOME must name a folder with the program's data.
 int main(int /*argc*/, char** argv) {
   const char* const data = std::getenv("XDG_DATA_HOME");
   if (data == nullptr) {

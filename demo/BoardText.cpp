@@ -22,6 +22,11 @@ QVector<QStringList> LinesOf(const QAbstractItemModel& list) {
   return lines;
 }
 
+bool IsLeftAligned(const QAbstractItemModel& list, int column) {
+  const QVariant alignment = list.headerData(column, Qt::Horizontal, Qt::TextAlignmentRole);
+  return (alignment.toInt() & Qt::AlignLeft) != 0;
+}
+
 }  // namespace
 
 QString TabSeparated(const QAbstractItemModel& list) {
@@ -43,7 +48,7 @@ QString Aligned(const QAbstractItemModel& list) {
   QString text;
   for (const QStringList& line : lines) {
     for (qsizetype column = 0; column < line.size(); ++column) {
-      const bool isName = column == 1;
+      const bool isName = IsLeftAligned(list, static_cast<int>(column));
       text +=
           isName ? line[column].leftJustified(widths[column]) : line[column].rightJustified(widths[column]);
       text += column + 1 < line.size() ? QStringLiteral("  ") : QStringLiteral("\n");

@@ -3,7 +3,7 @@
 #include <QAbstractItemModel>
 #include <QString>
 
-/// Header and rows as shown, one line each, cells separated by tabs.
+/// Header and rows as displayed, one line each, with tabs between cells.
 QString TabSeparated(const QAbstractItemModel& list);
 
 /// Header and rows in aligned columns for a terminal.

@@ -48,7 +48,7 @@ QStringList DemoRun::Run() {
   return faults_;
 }
 
-// A click returns when its job has ended: the handler waits inside.
+// click() returns only when the download has ended, since its handler waits.
 void DemoRun::PullGame() {
   if (source_ == DemoSource::BaseUnit) {
     Press<QPushButton>(window_, "GetScores");

@@ -8,29 +8,28 @@
 /// Where the demo's game comes from.
 enum class DemoSource { BaseUnit, Radio };
 
-/// Plays the operator for one game: presses the real buttons of the real windows, waits for the end, saves
-/// the game through the menu and the file dialog, prints the score sheets of the active players to files, and
-/// leaves the board as text and picture.
+/// Acts as the operator for one game: presses the real buttons in the real windows, waits for the download,
+/// saves the game through the menu and the file dialog, prints the active players' score sheets to files, and
+/// leaves the board as text and as a picture.
 class DemoRun : public QObject {
   Q_OBJECT
 
  public:
   DemoRun(QMainWindow& window, DemoSource source, const QDir& folder);
 
-  /// Returns what went wrong, one line each; empty when all of it happened.
+  /// Returns one line for each thing that went wrong; empty on success.
   QStringList Run();
 
  private:
   void PullGame();
-  /// In the window that is open: finds the guns, fetches their scores and closes it.
+  /// In the open radio window, searches for guns, fetches their scores and closes the window.
   void PullByRadio();
   void SaveGame();
   void PrintSheets();
   void WriteBoard();
   void WriteFile(const QString& name, const QString& text);
-  /// Answers whatever is open in front of the main window: the file dialog with `gameFile_`, the print
-  /// options with files as output, a box, which is a fault here unless it tells the end of printing, with its
-  /// default button.
+  /// Answers whatever dialog is open: the file dialog with `gameFile_`, the print options with output to
+  /// files, a box with its default button. Any box except the one at the end of printing counts as an error.
   void AnswerDialogs();
 
   QMainWindow& window_;
@@ -39,5 +38,5 @@ class DemoRun : public QObject {
   QString gameFile_;
   QTimer watch_;
   QStringList faults_;
-  bool sheetsPrinted_ = false;  ///< the box that tells the end of printing came
+  bool sheetsPrinted_ = false;  ///< the box at the end of printing was shown
 };

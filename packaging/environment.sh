@@ -1,4 +1,4 @@
-# For the scripts at the root: installs Debian packages when they are missing, and builds.
+# Functions for the scripts: install missing Debian packages, and build.
 
 BuildPackages=(g++ cmake ninja-build qt6-base-dev qt6-base-dev-tools qt6-serialport-dev libsqlite3-dev sqlite3
   libpugixml-dev mdbtools-dev pkg-config libreoffice-dev libqpdf-dev libgtest-dev libgmock-dev libbenchmark-dev)
@@ -7,7 +7,7 @@ TestPackages=(cups-daemon)
 DisplayPackages=(xvfb xauth poppler-utils)
 CheckPackages=(clang clang-format clang-tidy libclang-rt-14-dev git)
 
-# RequirePackages NAME...: installs those that are not installed; as root, or with sudo.
+# RequirePackages NAME...: installs the missing ones, as root or with sudo.
 RequirePackages() {
   local missing=() package
   for package in "$@"; do
@@ -24,7 +24,7 @@ RequirePackages() {
   "${asRoot[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}" > /dev/null
 }
 
-# Build PRESET [TARGET...]: configures and builds; all targets when none is named.
+# Build PRESET [TARGET...]: configures and builds all targets, or only those named.
 Build() {
   local preset=$1
   shift
@@ -34,7 +34,7 @@ Build() {
 
 HasDisplay() { [ -n "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ]; }
 
-# MakeData BIN FOLDER: the data of a program that has run before, below FOLDER (for XDG_DATA_HOME).
+# MakeData BIN FOLDER: creates below FOLDER (for XDG_DATA_HOME) the data that the program's first run would create.
 MakeData() {
   local data=$2/Orvalin/Tessarine
   mkdir -p "$data"

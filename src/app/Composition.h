@@ -53,10 +53,19 @@ class Composition {
   QtSerialDevices devices_;
   const std::string logFolder_;
   QtSerialPort port_;
-  LoggedPort loggedPort_{port_, {files_, logFolder_, events_, clock_}, "line"};
+  LoggedPort loggedPort_{port_,
+                         {.Disk = files_,
+                          .Folder = logFolder_,
+                          .Elapsed = events_,
+                          .Time = clock_,
+                          .OnOpening = [this](const std::string& device, const std::string& settings,
+                                              int fault) { log_.PortOpening(device, settings, fault); }},
+                         "line"};
   QtSerialPort readerPort_;
-  LoggedPort loggedReaderPort_{
-      readerPort_, {files_, logFolder_, events_, clock_}, "1-wire", Transcript::Repeats::Counted};
+  LoggedPort loggedReaderPort_{readerPort_,
+                               {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_},
+                               "1-wire",
+                               Transcript::Repeats::Counted};
   IniReader readerSettings_;
   SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;

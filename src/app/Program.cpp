@@ -4,11 +4,13 @@
 
 #include "app/SystemFacts.h"
 #include "platform/ErrorReport.h"
+#include "ui/CommandEvent.h"
 #include "ui/Look.h"
 
 Program::Program() {
   PrepareLook();
   composition_.Log().Started(SystemFacts());
+  qApp->installEventFilter(this);
   window_.emplace(composition_.Services());
   composition_.SetMainWindow(&*window_);
 }
@@ -26,4 +28,11 @@ int Program::Run() {
   const int exitCode = Start() ? QApplication::exec() : 1;
   composition_.Log().Ended(exitCode);
   return exitCode;
+}
+
+bool Program::eventFilter(QObject* watched, QEvent* event) {
+  if (event->type() == CommandEvent::EventType()) {
+    composition_.Log().Command(static_cast<CommandEvent*>(event)->Name().toStdString());
+  }
+  return QObject::eventFilter(watched, event);
 }

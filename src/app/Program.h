@@ -1,12 +1,13 @@
 #pragma once
 
+#include <QObject>
 #include <optional>
 
 #include "app/Composition.h"
 #include "app/frmRx.h"
 
 /// One run of the program with the real platform. Needs a QApplication.
-class Program {
+class Program : public QObject {
  public:
   Program();
 
@@ -18,6 +19,10 @@ class Program {
   int Run();
 
   frmRx& Window() { return *window_; }
+
+ protected:
+  /// Sees the commands of all windows, for the log.
+  bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
   Composition composition_;

@@ -2,6 +2,10 @@
 
 #include <optional>
 
+#include "platform/MessageBoxes.h"
+
+class QWidget;
+
 /// How the main window answers to the screen at start-up. Sizes are pixels.
 struct ScreenFit {
   bool Warn = false;  ///< tell that the screen is small
@@ -30,3 +34,7 @@ constexpr ScreenFit FitToScreen(int screenWidth, int screenHeight) {
   }
   return fit;
 }
+
+/// Fits the main window to its screen, whose size counts in the screen's own pixels, and tells in a box that
+/// it is small.
+void FitToScreen(QWidget& window, MessageBoxes& boxes);

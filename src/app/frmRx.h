@@ -8,24 +8,19 @@
 #include <string>
 
 #include "app/Services.h"
-#include "core/data/Backups.h"
+#include "app/WordProcessorStart.h"
 #include "core/data/IniReader.h"
-#include "core/game/Game.h"
-#include "core/game/MemberLookup.h"
-#include "core/game/MissionList.h"
-#include "core/game/ScoreAnalysis.h"
-#include "core/game/ScoreList.h"
-#include "core/game/SoldieringFactors.h"
+#include "core/game/Session.h"
 #include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
 #include "sheets/PrintOptions.h"
+#include "ui/Commands.h"
 
 namespace Ui {
 class frmRx;
 }
 
-/// The main window. Owns the game, both score lists and the open databases; every other window is opened from
-/// here.
+/// The main window: menus, both score lists and the active mission. Every other window is opened from here.
 class frmRx : public QMainWindow {
   Q_OBJECT
 
@@ -41,30 +36,21 @@ class frmRx : public QMainWindow {
   void closeEvent(QCloseEvent* event) override;
 
  private:
-  void SetCaptions();
-  void SetCaption(QAction& action, int textNumber);
-  void FitToScreenSize();
   void SetUpLists();
-  bool OpenDatabases();
   void ConnectCommands();
-  /// Runs a command of the operator; a failure in it is reported and ends the command.
-  void Run(const std::function<void()>& command);
 
   void TellOfMissingBackup();
 
-  void FillMissionList();
-  void SelectMission(int index);
-
-  void ClearPlayerData();
-  void CalculateScores();
-  void CalculateScoresWhenPresent();
+  /// Shows what has changed in the session, as far as the lists do not.
+  void Show(SessionChange change);
+  void ShowMissions();
 
   void LoadGame();
   void SaveGame();
   void ClearGame();
   void GetScoreData();
-  /// Starts the word processor and follows it until it is ready. Where it is missing, says so once and goes
-  /// on without printing.
+  /// Follows the word processor until it is ready. Where it is missing, says so once and goes on without
+  /// printing.
   void FollowWordProcessor();
   void PrintScores();
   void ShowCommPortSettings();
@@ -90,28 +76,15 @@ class frmRx : public QMainWindow {
 
   const Services services_;
   std::unique_ptr<Ui::frmRx> ui_;
-  Game game_;
-  SoldieringFactors factors_;
-  ScoreList scoreDisplay_;
-  ScoreList teamScores_;
+  Session session_;
+  Subscription subscription_;
   CurrentGameFile gameFile_;
+  WordProcessorStart wordProcessor_;
   std::string userDataFolder_;
-
-  // In the order in which start-up makes them.
   std::optional<IniReader> ini_;
   std::optional<CommPort> commPort_;
-  std::optional<Backups> backups_;
-  std::unique_ptr<Database> dbScenarios_;
-  std::unique_ptr<Recordset> rsScenarios_;
-  std::optional<MissionList> missions_;
-  std::unique_ptr<Database> dbMembers_;
-  std::unique_ptr<Recordset> rsMembers_;
-  std::optional<MemberLookup> members_;
-  std::optional<ScoreAnalysis> analysis_;
   int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again
   QTimer wordProcessorTimer_;
-  bool wordProcessorStarted_ = false;
-  int runningCommands_ = 0;      ///< commands on the stack; a wait in one can start another
-  bool closeRequested_ = false;  ///< close as soon as the last of them has unwound
+  Commands commands_;
 };

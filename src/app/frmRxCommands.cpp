@@ -13,8 +13,6 @@
 #include "board/MissionResultEntry.h"
 #include "board/PlayerDetails.h"
 #include "core/data/FieldValue.h"
-#include "core/game/CommitGame.h"
-#include "core/game/PlayerId.h"
 #include "core/text/NumberForms.h"
 #include "devices/baseunit/BaseUnitDownload.h"
 #include "devices/radio/RemoteManage.h"
@@ -33,29 +31,22 @@ void frmRx::LoadGame() {
     return;
   }
   const WaitCursor cursor;
-  ClearPlayerData();
-  const auto selectMission = [this](const std::string& name) {
-    for (int index = 0; index < ui_->ActiveMission->count(); ++index) {
-      if (missions_->Items()[static_cast<std::size_t>(index)].Text == name) {
-        SelectMission(index);
-      }
-    }
-  };
-  if (gameFile_.LoadGame(game_, selectMission)) {
-    game_.DataPresent = true;
-    CalculateScores();
-  }
+  session_.LoadGame([this](Game& game, const Session::MissionChoice& chooseMission) {
+    return gameFile_.LoadGame(game, chooseMission);
+  });
 }
 
 void frmRx::SaveGame() {
-  gameFile_.SaveGame(game_, missions_->Text());
+  session_.SaveGame([this](const Game& game, const std::string& missionName) {
+    return gameFile_.SaveGame(game, missionName);
+  });
 }
 
 void frmRx::ClearGame() {
   const BoxAnswer answer = services_.Boxes.Show(services_.Strings.Text(123), services_.Strings.Text(124),
                                                 BoxIcon::Question, BoxButtons::OkCancel);
   if (answer == BoxAnswer::Ok) {
-    ClearPlayerData();
+    session_.ClearPlayerData();
   }
 }
 
@@ -63,32 +54,22 @@ void frmRx::GetScoreData() {
   {
     UploadProgress progress(services_.Strings, this);
     BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time,
-                     progress, game_)
+                     progress, session_.Game())
         .GetScores();
   }
-  CalculateScores();
+  session_.CalculateScores();
 }
 
 void frmRx::FollowWordProcessor() {
-  try {
-    if (!std::exchange(wordProcessorStarted_, true)) {
-      services_.WordProcessor.Start();
-    }
-    switch (services_.WordProcessor.State()) {
-      case WordState::Starting:
-        return;
-      case WordState::Ready:
-        wordProcessorTimer_.stop();
-        return;
-      case WordState::Ended:
-        break;
-    }
-  } catch (const RuntimeError&) {
-    // Told below, like a word processor that ends while it starts.
+  const WordState state = wordProcessor_.Follow();
+  if (state == WordState::Starting) {
+    return;
   }
   wordProcessorTimer_.stop();
-  ui_->mnuPrintScores->setEnabled(false);
-  services_.Boxes.Show(services_.Strings.Text(117), services_.Strings.Text(118), BoxIcon::Exclamation);
+  if (state == WordState::Ended) {
+    ui_->mnuPrintScores->setEnabled(false);
+    services_.Boxes.Show(services_.Strings.Text(117), services_.Strings.Text(118), BoxIcon::Exclamation);
+  }
 }
 
 void frmRx::PrintScores() {
@@ -100,9 +81,9 @@ void frmRx::PrintScores() {
     return;
   }
   SheetProgressWindow progress(services_.Strings, this);
-  const SheetParts parts{.Board = game_,
-                         .RsMembers = *rsMembers_,
-                         .Members = *members_,
+  const SheetParts parts{.Board = session_.Game(),
+                         .RsMembers = session_.RsMembers(),
+                         .Members = session_.Members(),
                          .Strings = services_.Strings,
                          .Time = services_.Time,
                          .Events = services_.Events,
@@ -111,7 +92,7 @@ void frmRx::PrintScores() {
                          .WordApp = services_.WordProcessor,
                          .Progress = progress,
                          .UserDataFolder = userDataFolder_,
-                         .MissionName = missions_->Text()};
+                         .MissionName = session_.Missions().Text()};
   ScoreSheets(parts, printOptions_->Choice()).GenerateScoreSheets();
 }
 
@@ -120,9 +101,9 @@ void frmRx::ShowCommPortSettings() {
 }
 
 void frmRx::ShowSoldieringCalc() {
-  SoldieringCalc(factors_, services_.Strings, this).exec();
-  WriteSoldieringFactors(*ini_, factors_);
-  CalculateScoresWhenPresent();
+  SoldieringCalc(session_.Factors(), services_.Strings, this).exec();
+  WriteSoldieringFactors(*ini_, session_.Factors());
+  session_.CalculateScoresWhenPresent();
 }
 
 void frmRx::ShowAbout() {
@@ -133,7 +114,7 @@ void frmRx::CommitGame() {
   CommitResult result;
   {
     const WaitCursor cursor;
-    result = CommitPlayers(game_, *dbMembers_, *rsMembers_, *members_, services_.Time);
+    result = session_.CommitGame();
   }
   TellCommitResult(result, services_.Boxes);
 }
@@ -147,7 +128,7 @@ void frmRx::CheckMembershipButton() {
   if (dallasId == NoDallasId) {
     return;
   }
-  const auto found = dbMembers_->OpenRecordset(ButtonQuery(dallasId));
+  const auto found = session_.DbMembers().OpenRecordset(ButtonQuery(dallasId));
   if (found->Eof()) {
     services_.Boxes.Show("Button is not assigned to a member", DefaultBoxTitle, BoxIcon::Information);
   } else {
@@ -156,7 +137,7 @@ void frmRx::CheckMembershipButton() {
 }
 
 std::string frmRx::ShowMembers(std::int32_t contactToShow) {
-  Members window({.DbMembers = *dbMembers_,
+  Members window({.DbMembers = session_.DbMembers(),
                   .Boxes = services_.Boxes,
                   .CommonDialog1 = services_.CommonDialog1,
                   .Disk = services_.Disk,
@@ -166,22 +147,22 @@ std::string frmRx::ShowMembers(std::int32_t contactToShow) {
                  this);
   window.ContactToShow = contactToShow;
   window.exec();
-  return window.SelectedContact;
+  return window.SelectedContact();
 }
 
 void frmRx::ShowAdminData() {
-  AdminData(game_, services_.Strings, this).exec();
+  AdminData(session_.Game(), services_.Strings, this).exec();
 }
 
 void frmRx::EnterMissionResults() {
-  MissionResultEntry(game_, *missions_, services_.Strings, this).exec();
-  CalculateScoresWhenPresent();
+  MissionResultEntry(session_.Game(), session_.Missions(), services_.Strings, this).exec();
+  session_.CalculateScoresWhenPresent();
 }
 
 void frmRx::SetUpMissions() {
-  Scenarios(*dbScenarios_, *rsScenarios_, services_.Boxes, services_.Strings, this).exec();
-  rsScenarios_->MoveFirst();
-  FillMissionList();
+  Scenarios(session_.DbScenarios(), session_.RsScenarios(), services_.Boxes, services_.Strings, this).exec();
+  session_.RsScenarios().MoveFirst();
+  session_.FillMissionList();
 }
 
 void frmRx::ManageRemotely() {
@@ -191,10 +172,10 @@ void frmRx::ManageRemotely() {
                 .Boxes = services_.Boxes,
                 .Time = services_.Time,
                 .Strings = services_.Strings,
-                .Scores = game_},
+                .Scores = session_.Game()},
                this)
       .exec();
-  CalculateScores();
+  session_.CalculateScores();
 }
 
 void frmRx::ShowPopup(const QPoint& position) {
@@ -203,29 +184,29 @@ void frmRx::ShowPopup(const QPoint& position) {
     return;
   }
   const int last = std::max_element(selected.begin(), selected.end())->row();
-  selectedPlayer_ = IndexFromPlayerText(services_.Strings, scoreDisplay_.RowAt(last).Cells[1]);
+  selectedPlayer_ = session_.List(BoardList::Players).RowAt(last).Index;
   ui_->mnuPopup->exec(ui_->ScoreDisplay->viewport()->mapToGlobal(position));
-  CalculateScores();
+  session_.CalculateScores();
   services_.Events.DoEvents();
 }
 
 void frmRx::AssignMember() {
   const std::string contact = ShowMembers(0);
   if (!contact.empty()) {
-    game_.Players(selectedPlayer_).MemberIndex = ToInt32(contact);
+    session_.Game().Players(selectedPlayer_).MemberIndex = ToInt32(contact);
   }
 }
 
 void frmRx::UnassignMember() {
-  game_.Players(selectedPlayer_).MemberIndex = 0;
+  session_.Game().Players(selectedPlayer_).MemberIndex = 0;
 }
 
 void frmRx::ShowDetailed() {
-  PlayerDetails(selectedPlayer_, game_, *members_, this).exec();
+  PlayerDetails(selectedPlayer_, session_.Game(), session_.Members(), this).exec();
 }
 
 void frmRx::EnterBonusPoints() {
-  Player& player = game_.Players(selectedPlayer_);
+  Player& player = session_.Game().Players(selectedPlayer_);
   BonusPoints window(player.BonusPoints, services_.Boxes, this);
   window.exec();
   player.BonusPoints = window.Value();

@@ -3,7 +3,8 @@
 #include <QPainter>
 #include <QStyle>
 #include <QWidget>
-#include <utility>
+
+#include "board/ScoreListModel.h"
 
 namespace {
 
@@ -24,14 +25,14 @@ void PlayerDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option
                            const QModelIndex& index) const {
   QStyleOptionViewItem cell = option;
   initStyleOption(&cell, index);
-  const auto colon = cell.text.indexOf(QLatin1String(": "));
-  if (colon < 0) {
+  const QString memberName = index.data(ScoreListModel::MemberNameRole).toString();
+  if (memberName.isEmpty()) {
     QStyledItemDelegate::paint(painter, option, index);
     return;
   }
   const QStyle& style = *cell.widget->style();
   const QRect place = style.subElementRect(QStyle::SE_ItemViewItemText, &cell, cell.widget);
-  const QString text = std::exchange(cell.text, QString());
+  cell.text.clear();
   style.drawControl(QStyle::CE_ItemViewItem, &cell, painter, cell.widget);
   const bool selected = cell.state.testFlag(QStyle::State_Selected);
   const int margin = style.pixelMetric(QStyle::PM_FocusFrameHMargin, &cell, cell.widget) + 1;
@@ -39,7 +40,8 @@ void PlayerDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option
                     cell.rect.height() - 2);
   painter->save();
   painter->setPen(cell.palette.color(selected ? QPalette::HighlightedText : QPalette::Text));
-  DrawLine(*painter, lines, cell.font, PlayerSize, text.left(colon), Qt::AlignTop);
-  DrawLine(*painter, lines, cell.font, NameSize, text.mid(colon + 2), Qt::AlignBottom);
+  DrawLine(*painter, lines, cell.font, PlayerSize, index.data(ScoreListModel::NameRole).toString(),
+           Qt::AlignTop);
+  DrawLine(*painter, lines, cell.font, NameSize, memberName, Qt::AlignBottom);
   painter->restore();
 }

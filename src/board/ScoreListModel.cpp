@@ -1,29 +1,39 @@
 #include "board/ScoreListModel.h"
 
-#include <QFont>
 #include <QGuiApplication>
 #include <QPalette>
-#include <string_view>
-#include <utility>
 
 #include "ui/TeamColours.h"
 
-ScoreListModel::ScoreListModel(ScoreList& list, const Game& game, QStringList headers, int teamColumn,
-                               QObject* parent)
-    : QAbstractTableModel(parent),
-      list_(list),
-      game_(game),
-      headers_(std::move(headers)),
-      teamColumn_(teamColumn) {
-  list_.Changed = [this] {
-    beginResetModel();
-    shownRows_ = list_.RowCount();
-    endResetModel();
-  };
+namespace {
+
+QVariant AlignmentOf(BoardColumn column) {
+  const auto horizontal = column == BoardColumn::Rank     ? Qt::AlignHCenter
+                          : column == BoardColumn::Player ? Qt::AlignLeft
+                                                          : Qt::AlignRight;
+  return QVariant(Qt::AlignVCenter | horizontal);
 }
 
-ScoreListModel::~ScoreListModel() {
-  list_.Changed = nullptr;
+}  // namespace
+
+ScoreListModel::ScoreListModel(Session& session, BoardList list, const StringTable& strings, QObject* parent)
+    : QAbstractTableModel(parent),
+      kind_(list),
+      list_(session.List(list)),
+      texts_(session.Game(), strings),
+      shownRows_(list_.RowCount()) {
+  const auto ownChange = list == BoardList::Players ? SessionChange::PlayerRows : SessionChange::TeamRows;
+  subscription_ = session.Listen([this, ownChange](SessionChange change) {
+    if (change == ownChange) {
+      ShowRows();
+    }
+  });
+}
+
+void ScoreListModel::ShowRows() {
+  beginResetModel();
+  shownRows_ = list_.RowCount();
+  endResetModel();
 }
 
 int ScoreListModel::rowCount(const QModelIndex& parent) const {
@@ -31,63 +41,53 @@ int ScoreListModel::rowCount(const QModelIndex& parent) const {
 }
 
 int ScoreListModel::columnCount(const QModelIndex& parent) const {
-  return parent.isValid() ? 0 : static_cast<int>(headers_.size());
+  if (parent.isValid()) {
+    return 0;
+  }
+  return kind_ == BoardList::Players ? BoardColumnCount : TeamColumnCount;
 }
 
 QVariant ScoreListModel::data(const QModelIndex& index, int role) const {
   if (!index.isValid() || index.row() >= list_.RowCount()) {
     return {};
   }
-  const ScoreList::Row& shown = list_.RowAt(index.row());
-  const int column = index.column();
+  const BoardRow& row = list_.RowAt(index.row());
+  const auto column = static_cast<BoardColumn>(index.column());
+  const bool isName = column == BoardColumn::Player;
   switch (role) {
     case Qt::DisplayRole:
-      return QString::fromStdString(shown.Cells[static_cast<std::size_t>(column)]);
+      return TextOf(row, column);
     case Qt::ToolTipRole:
-      return column == teamColumn_ ? QString::fromStdString(shown.Cells[static_cast<std::size_t>(column)])
-                                   : QVariant();
+      return isName ? TextOf(row, column) : QVariant();
+    case NameRole:
+      return isName ? QString::fromStdString(texts_.Name(row)) : QVariant();
+    case MemberNameRole:
+      return isName ? QString::fromStdString(row.MemberName) : QVariant();
     case Qt::TextAlignmentRole:
       return AlignmentOf(column);
-    case Qt::DecorationRole: {
-      const int team = TeamOfRow(shown);
-      return column == teamColumn_ && team > 0 ? QVariant(TeamBadge(team)) : QVariant();
-    }
-    case Qt::BackgroundRole: {
-      const int team = TeamOfRow(shown);
-      return team > 0 ? QVariant(TeamTint(team, QGuiApplication::palette().base().color())) : QVariant();
-    }
+    case Qt::DecorationRole:
+      return isName ? QVariant(TeamBadge(row.Team)) : QVariant();
+    case Qt::BackgroundRole:
+      return TeamTint(row.Team, QGuiApplication::palette().base().color());
     default:
       return {};
   }
 }
 
 QVariant ScoreListModel::headerData(int section, Qt::Orientation orientation, int role) const {
-  if (orientation != Qt::Horizontal || section < 0 || section >= headers_.size()) {
+  if (orientation != Qt::Horizontal || section < 0 || section >= columnCount()) {
     return {};
   }
+  const auto column = static_cast<BoardColumn>(section);
   if (role == Qt::DisplayRole) {
-    return headers_[section];
+    return QString::fromStdString(texts_.Header(kind_, column));
   }
   if (role == Qt::TextAlignmentRole) {
-    return AlignmentOf(section);
+    return AlignmentOf(column);
   }
   return {};
 }
 
-QVariant ScoreListModel::AlignmentOf(int column) const {
-  const auto horizontal = column == 0             ? Qt::AlignHCenter
-                          : column == teamColumn_ ? Qt::AlignLeft
-                                                  : Qt::AlignRight;
-  return QVariant(Qt::AlignVCenter | horizontal);
-}
-
-int ScoreListModel::TeamOfRow(const ScoreList::Row& row) const {
-  const std::string_view text = row.Cells[static_cast<std::size_t>(teamColumn_)];
-  const std::string_view word = text.substr(0, text.find(' '));
-  for (int team = 1; team <= TeamCount; ++team) {
-    if (word == game_.TeamNames(team)) {
-      return team;
-    }
-  }
-  return 0;
+QString ScoreListModel::TextOf(const BoardRow& row, BoardColumn column) const {
+  return QString::fromStdString(texts_.Cell(row, column));
 }

@@ -1,19 +1,21 @@
 #pragma once
 
 #include <QAbstractTableModel>
-#include <QStringList>
-#include <vector>
 
-#include "core/game/ScoreList.h"
+#include "core/game/BoardTexts.h"
+#include "core/game/Session.h"
 
-/// Shows a ScoreList to the toolkit, with each row in its team's colour.
+/// Shows one of the lists of a session to the toolkit, with each row in its team's colour. Any number of them
+/// may show the same list.
 class ScoreListModel : public QAbstractTableModel {
   Q_OBJECT
 
  public:
-  /// `teamColumn` is the column whose text begins with the team's name. Takes over `list.Changed`.
-  ScoreListModel(ScoreList& list, const Game& game, QStringList headers, int teamColumn, QObject* parent);
-  ~ScoreListModel() override;
+  /// The text of a cell in two parts.
+  enum Role { NameRole = Qt::UserRole, MemberNameRole };
+
+  /// Both `session` and `strings` outlive the model's views.
+  ScoreListModel(Session& session, BoardList list, const StringTable& strings, QObject* parent);
 
   int rowCount(const QModelIndex& parent = {}) const override;
   int columnCount(const QModelIndex& parent = {}) const override;
@@ -21,13 +23,12 @@ class ScoreListModel : public QAbstractTableModel {
   QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
 
  private:
-  /// Team (1 to 3) of a row, 0 when its text names none.
-  int TeamOfRow(const ScoreList::Row& row) const;
-  QVariant AlignmentOf(int column) const;
+  void ShowRows();
+  QString TextOf(const BoardRow& row, BoardColumn column) const;
 
-  ScoreList& list_;
-  const Game& game_;
-  QStringList headers_;
-  int teamColumn_;
+  const BoardList kind_;
+  const Board& list_;
+  BoardTexts texts_;
   int shownRows_ = 0;  ///< rows that the views know of; the list may be half rebuilt when they ask
+  Subscription subscription_;
 };

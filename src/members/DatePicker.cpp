@@ -43,13 +43,13 @@ DatePicker::DatePicker(QWidget* parent) : QLineEdit(parent) {
   setToolTip(QString::fromStdString(ShortDateText(QLocale::system(), QDate::currentDate())));
   QAction* calendar = addAction(CalendarIcon(palette().color(QPalette::Text)), QLineEdit::TrailingPosition);
   connect(calendar, &QAction::triggered, this, &DatePicker::OpenCalendar);
-  // And not textEdited, which does not tell of a text that an assistive program enters.
+  // textChanged, since textEdited is not emitted when an assistive program enters a text.
   connect(this, &QLineEdit::textChanged, this, &DatePicker::TakeText);
   connect(this, &QLineEdit::editingFinished, this, &DatePicker::Finish);
 }
 
 void DatePicker::SetCalendarName(const QString& name) {
-  findChild<QAbstractButton*>()->setAccessibleName(name);  // shows the action
+  findChild<QAbstractButton*>()->setAccessibleName(name);  // the action's button
 }
 
 void DatePicker::SetStored(const std::string& stored) {
@@ -68,9 +68,10 @@ void DatePicker::ShowStored() {
   setText(date.isValid() ? QString::fromStdString(ShortDateText(QLocale::system(), date)) : QString());
 }
 
-// Half of a text may be a date of its own, "1961-02-3", or none.
+// While the operator types, the text may be a different date ("1961-02-3") or no date at all; in the latter
+// case the last finished date counts.
 void DatePicker::TakeText(const QString& text) {
-  // Two digits of a year are those of the last hundred years: nobody is born tomorrow.
+  // A two-digit year is taken from the last hundred years, since birthdates are not in the future.
   const QDate earliest = QDate::currentDate().addYears(-100).addDays(1);
   const QDate date = DateIn(QLocale::system(), text.trimmed(), earliest);
   if (text.trimmed().isEmpty()) {

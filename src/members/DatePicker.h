@@ -3,22 +3,22 @@
 #include <QLineEdit>
 #include <string>
 
-/// An entry for a date that may be empty, with a calendar behind its arrow (Alt+Down). Shows the system's
-/// short form with all digits of the year; takes that form, with two digits of the year too, and
-/// year-month-day. A text that is no date is given up for the last good one when the entry is left.
+/// An entry for an optional date, with a calendar that its icon or Alt+Down opens. Shows the system's short
+/// date format with a four-digit year; accepts that format, also with a two-digit year, and year-month-day.
+/// When the focus leaves, a text that is not a date is replaced by the last valid one.
 class DatePicker : public QLineEdit {
   Q_OBJECT
 
  public:
   explicit DatePicker(QWidget* parent);
 
-  /// What an assistive program calls the button that opens the calendar.
+  /// The accessible name of the button that opens the calendar.
   void SetCalendarName(const QString& name);
 
-  /// Shows a date as the database keeps it, "YYYY-MM-DD HH:MM:SS"; nothing for any other text.
+  /// Shows a date in the database's form, "YYYY-MM-DD HH:MM:SS"; shows nothing for any other text.
   void SetStored(const std::string& stored);
 
-  /// The date as the database keeps it: what was shown when it was not changed, empty for none.
+  /// The date in the database's form: the one passed to SetStored if unchanged, empty for none.
   const std::string& Stored() const { return stored_; }
 
  protected:
@@ -33,5 +33,5 @@ class DatePicker : public QLineEdit {
   void OpenCalendar();
 
   std::string stored_;
-  std::string finished_;  ///< what stands when the text in the entry is no date
+  std::string finished_;  ///< the last finished date, used while the text is not a date
 };

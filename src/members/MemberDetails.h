@@ -4,7 +4,7 @@
 
 #include "platform/Database.h"
 
-/// What the operator can change of a member by writing into the window. NULL is empty.
+/// The member's details that can be edited in the window. NULL becomes an empty text.
 struct MemberDetails {
   std::string FirstName;
   std::string LastName;
@@ -23,6 +23,6 @@ struct MemberDetails {
 /// The details of the current row. Throws RuntimeError as Recordset::Fields does.
 MemberDetails ReadDetails(Recordset& rows);
 
-/// Sets the columns of the pending row in which `entered` differs from `shown`, and no others: a text that an
-/// entry could only show in part stays whole. An emptied birthdate becomes NULL.
+/// Sets only those columns of the pending row in which `entered` differs from `shown`, so that a text too
+/// long for its entry is not cut short. An emptied birthdate becomes NULL.
 void SetChanges(Recordset& rows, const MemberDetails& shown, const MemberDetails& entered);

@@ -4,12 +4,13 @@
 
 inline constexpr const char* AllMembers = "SELECT * FROM Members";
 
-/// The members one of whose three names begins with `text`, by the database's own matching rules; all of them
-/// for an empty text. The text goes in as it stands, so that an apostrophe makes a query that cannot be read.
+/// Selects the members with a first name, last name or nickname that begins with `text`, by the database's
+/// matching rules; an empty text selects all. The text is not escaped: a single apostrophe makes the query
+/// malformed.
 std::string SearchQuery(const std::string& text);
 
-/// The members with exactly these first and last names.
+/// Selects the members with exactly these first and last names.
 std::string NameQuery(const std::string& firstName, const std::string& lastName);
 
-/// The members with this button.
+/// Selects the members with this button.
 std::string ButtonQuery(const std::string& dallasId);

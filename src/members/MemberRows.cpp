@@ -82,7 +82,7 @@ void MemberRows::WriteBack() {
     Update();
   } catch (const RuntimeError& error) {
     if (error.Number() == Fault::RecordDeleted) {
-      shown_ = entered;  // or the cursor could never leave the place
+      shown_ = entered;  // gives up the change, or the cursor could never leave this row
     }
     throw;
   }

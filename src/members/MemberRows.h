@@ -7,56 +7,56 @@
 #include "members/MemberDetails.h"
 #include "platform/Database.h"
 
-/// The controls that show a row and into which the operator writes.
+/// The controls in which the operator sees and edits a row.
 class BoundControls {
  public:
   /// Shows the current row of `rows`. Throws RuntimeError when it cannot be read.
   virtual void ShowRow(Recordset& rows) = 0;
-  /// There is no row: shows that nothing can be entered.
+  /// Clears and disables the controls, as there is no current row.
   virtual void ShowNoRow() = 0;
-  /// What the controls hold now.
+  /// The current contents of the controls.
   virtual MemberDetails Entered() const = 0;
-  /// Runs after every change of the current row, also to none.
+  /// Called whenever another row, or none, has become the current one.
   virtual void RowChanged() = 0;
 
  protected:
   ~BoundControls() = default;
 };
 
-/// A cursor of its own on the members, with controls bound to it: they show the row on which it stands, and
-/// what was changed in them is written back when it leaves the row and when its source is read anew.
+/// A separate cursor on the members, with controls bound to it: they show the current row, and changes made
+/// in them are written back when the cursor leaves the row or its source is reloaded.
 ///
-/// All operations throw RuntimeError when the database fails. A change that could not be written stays in the
-/// controls and the cursor on its row; only when the row itself is gone is the change given up.
+/// All operations throw RuntimeError if the database fails. A change that could not be written stays in the
+/// controls, and the cursor on its row; it is discarded only if the row no longer exists.
 class MemberRows {
  public:
   MemberRows(Database& dbMembers, BoundControls& controls);
 
-  /// Reads the rows of a query and shows the first one. When the query fails the old rows stay.
+  /// Reads the rows of a query and shows the first one. If the query fails, keeps the old rows.
   void Refresh(const std::string& recordSource);
 
-  /// As the arrows of a data control: before the first row and behind the last one they stop.
+  /// Move like the arrows of a data control, and stop at the first and the last row.
   void MoveFirst();
   void MovePrevious();
   void MoveNext();
   void MoveLast();
 
-  /// Moves to the member with this number, behind the last row when there is none.
+  /// Moves to the member with this ContactID, or past the last row if there is none.
   void WalkTo(std::int64_t contactId);
 
-  /// Adds a member who joined `now` and has no name yet, and shows it.
+  /// Adds a member with join date `now` and a placeholder for the name, and shows it.
   void AddMember(const std::string& now);
 
   /// Deletes the current row and shows the first one.
   void Delete();
 
-  /// Writes the changes of the current row.
+  /// Writes the changes made to the current row.
   void WriteBack();
 
-  /// Writes one column of the current row at once.
+  /// Writes one column of the current row immediately.
   void SetField(const std::string& column, const std::string& text);
 
-  /// True on a row that is shown.
+  /// True if a row is shown.
   bool HasRow() const { return hasRow_; }
 
   Recordset& Rows() { return *rows_; }
@@ -69,5 +69,5 @@ class MemberRows {
   BoundControls& controls_;
   std::unique_ptr<Recordset> rows_;
   bool hasRow_ = false;
-  MemberDetails shown_;  ///< what the controls held when the row had been shown or written
+  MemberDetails shown_;  ///< the controls' contents when the row was last shown or written
 };

@@ -120,7 +120,7 @@ void Members::Activate() {
   RunClearSearch();
   if (ContactToShow != 0) {
     data1_->WalkTo(ContactToShow);
-    // Leaving the search box would go back to the first member.
+    // The search box must not get the focus: leaving it would go back to the first member.
     QWidget* const focus = data1_->HasRow() ? static_cast<QWidget*>(ui_->FirstNameEntry) : ui_->DataPrevious;
     focus->setFocus();
   } else {
@@ -128,13 +128,14 @@ void Members::Activate() {
   }
 }
 
-// Escape and the close box unload the window.
+// Called by Escape and the close box.
 void Members::reject() {
   commands_.Run([this] { RunClearSearch(); });
   QDialog::reject();
 }
 
-// Who presses Search leaves the box by it, and a text that is no query is told of once.
+// Does not count a click on Search as leaving, since it runs the search itself: a malformed query is then
+// reported once, not twice.
 bool Members::IsLeaving(Qt::FocusReason reason) const {
   const bool toSearch = focusWidget() == ui_->Search && reason != Qt::TabFocusReason;
   return !toSearch && reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
@@ -144,7 +145,7 @@ bool Members::eventFilter(QObject* watched, QEvent* event) {
   if (watched == ui_->SearchText && event->type() == QEvent::KeyPress) {
     const int key = static_cast<QKeyEvent*>(event)->key();
     if (key == Qt::Key_Return || key == Qt::Key_Enter) {
-      commands_.Run([this] { RunSearch(); });  // and not OK, which would choose the member in view
+      commands_.Run([this] { RunSearch(); });  // instead of OK, which would choose the member in view
       return true;
     }
   }
@@ -245,7 +246,7 @@ void Members::PreviewPhoto(const std::string& file) {
   try {
     ui_->MemberPhoto->Load(parts_.Disk.Read(file));
   } catch (const RuntimeError&) {
-    ui_->MemberPhoto->Clear();  // storing it will say why
+    ui_->MemberPhoto->Clear();  // storing the photo will report why
   }
 }
 
@@ -313,6 +314,6 @@ void Members::ChangeMemberPicture() {
 void Members::SelectMember() {
   data1_->Refresh(
       NameQuery(ui_->FirstNameEntry->text().toStdString(), ui_->LastNameEntry->text().toStdString()));
-  SelectedContact = TextOf(data1_->Rows().Fields("ContactID"));
+  selectedContact_ = TextOf(data1_->Rows().Fields("ContactID"));
   accept();
 }

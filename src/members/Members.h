@@ -19,8 +19,8 @@ namespace Ui {
 class Members;
 }
 
-/// The members: searched, looked through, edited, and one of them chosen with OK. Has a cursor of its own on
-/// the table; the one of the board sees its changes of rows, but not its new rows.
+/// The window in which members are searched, browsed and edited, and one of them chosen with OK. It has its
+/// own cursor on the table; the board's cursor sees rows changed here, but not rows added here.
 class Members : public QDialog, private BoundControls {
   Q_OBJECT
 
@@ -33,15 +33,18 @@ class Members : public QDialog, private BoundControls {
     const Files& Disk;
     const Clock& Time;
     const StringTable& Strings;
-    /// Waits for a membership button; its number, or NoDallasId. May be empty where there is no reader.
+    /// Waits for a membership button and returns its number, or NoDallasId. May be empty if there is no
+    /// reader.
     std::function<std::string()> ButtonSwipe = {};
   };
 
   Members(Parts parts, QWidget* parent);
   ~Members() override;
 
-  std::int32_t ContactToShow = 0;  ///< member to stand on when the window comes up, 0 for none
-  std::string SelectedContact;     ///< `ContactID` of the member chosen with OK, else empty
+  std::int32_t ContactToShow = 0;  ///< member to show when the window opens, 0 for the first
+
+  /// `ContactID` of the member chosen with OK, else empty.
+  const std::string& SelectedContact() const { return selectedContact_; }
 
   void reject() override;
 
@@ -57,7 +60,8 @@ class Members : public QDialog, private BoundControls {
 
   void SetCaptions();
   void ConnectCommands();
-  /// Runs a command; a failure is told only when the present event is over.
+  /// Runs a command, but reports a failure only after the current event: a box must not open during a focus
+  /// change.
   void RunInFocusChange(const std::function<void()>& command);
   void SetEntriesEnabled(bool enabled);
   void ShowPlace();
@@ -79,4 +83,5 @@ class Members : public QDialog, private BoundControls {
   const Parts parts_;
   Commands commands_;
   std::optional<MemberRows> data1_;
+  std::string selectedContact_;
 };

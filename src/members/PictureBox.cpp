@@ -9,11 +9,10 @@
 
 namespace {
 
-/// Photos of more dots than a screen shows are read smaller, which takes a fraction of the time and memory.
+/// Larger photos are scaled down while being read, which takes a fraction of the time and memory.
 constexpr QSize LargestPicture(1600, 1600);
 
-/// True when the end of the picture is missing, which the toolkit overlooks for these formats. Others it
-/// checks.
+/// True if the end of the picture is missing. Only for the formats in which Qt does not notice this itself.
 bool IsCutShort(std::string_view bytes, const QByteArray& format) {
   using namespace std::string_view_literals;
   if (format == "jpeg") {
@@ -31,7 +30,7 @@ bool IsCutShort(std::string_view bytes, const QByteArray& format) {
   return false;
 }
 
-/// A head and shoulders, where there is no photo.
+/// Draws a head and shoulders in place of a missing photo.
 void DrawSilhouette(QPainter& painter, const QRect& place, const QColor& colour) {
   const double unit = std::min(place.width(), place.height()) / 10.0;
   const QPointF centre = QRectF(place).center();

@@ -4,15 +4,15 @@
 #include <QWidget>
 #include <string>
 
-/// Shows a picture as large as it fits, with its own proportions; an empty frame without one.
+/// Shows a picture as large as fits, keeping its proportions, or a placeholder if there is none.
 class PictureBox : public QWidget {
   Q_OBJECT
 
  public:
   explicit PictureBox(QWidget* parent);
 
-  /// Shows the picture in `bytes`, of any kind that the toolkit reads; none when they hold none. What follows
-  /// the end of the picture is ignored.
+  /// Shows the picture in `bytes`, in any format that Qt reads; shows none if they are not a picture. Bytes
+  /// after the end of the picture are ignored.
   void Load(const std::string& bytes);
   void Clear();
 

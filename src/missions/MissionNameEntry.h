@@ -18,7 +18,7 @@ class MissionNameEntry : public QDialog {
   MissionNameEntry(const StringTable& strings, QWidget* parent);
   ~MissionNameEntry() override;
 
-  /// What was typed; empty unless the operator pressed OK.
+  /// The name typed; empty unless the operator pressed OK.
   std::string EnteredName() const;
 
  private:

@@ -13,9 +13,9 @@ constexpr std::size_t MostOfObjective = 255;
 
 struct DescriptionColumn {
   const char* Name;
-  std::size_t First;     ///< character that it begins with, counted from 0
-  std::size_t Count;     ///< characters that it holds
-  std::size_t IfLonger;  ///< written when the description has more characters than this
+  std::size_t First;     ///< first character of the description in this column, counted from 0
+  std::size_t Count;     ///< number of characters in this column
+  std::size_t IfLonger;  ///< the column is written if the description is longer than this
 };
 
 constexpr DescriptionColumn DescriptionTail[] = {

@@ -6,7 +6,7 @@
 #include "core/game/Game.h"
 #include "platform/Database.h"
 
-/// The objectives of one set. Points are as typed.
+/// The objectives of one set. Points are kept as typed.
 struct MissionObjectives {
   std::string PrimaryDescription;
   std::string SecondaryDescription;
@@ -25,14 +25,14 @@ struct MissionRecord {
   std::array<MissionObjectives, TeamCount> Objectives;  ///< A, B, C
 };
 
-/// Number of the text that tells why `mission` cannot be saved; 0 when it can.
+/// Number of the message that says why `mission` cannot be saved; 0 if it can.
 int FaultOf(const MissionRecord& mission);
 
-/// The mission of the current row. Its description is joined from four columns.
+/// Reads the mission in the current row. Its description is joined from four columns.
 MissionRecord ReadMission(Recordset& row);
 
-/// Puts `mission` into the pending row. The description goes into four columns by fixed positions: characters
-/// 1 to 254, 255 to 509, 511 to 765 and 767 to 1021, so its characters 510 and 766 are lost. A column beyond
-/// the description's end is not written and keeps what it held. Penalties are the leading numeric parts of
-/// their texts.
+/// Writes `mission` to the pending row. The description is split over four columns at fixed positions:
+/// characters 1 to 254, 255 to 509, 511 to 765 and 767 to 1021, so that characters 510 and 766 are lost. A
+/// column beyond the end of the description is not written and keeps its old text. The penalties are the
+/// leading numeric parts of their texts.
 void WriteMission(Recordset& row, const MissionRecord& mission);

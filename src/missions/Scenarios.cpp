@@ -14,7 +14,7 @@
 
 namespace {
 
-/// Texts are stored with the line breaks that they always had.
+/// The text with CR LF line breaks, as missions have always been stored.
 std::string TextIn(const QPlainTextEdit& box) {
   return box.toPlainText().replace(QLatin1Char('\n'), QStringLiteral("\r\n")).toStdString();
 }
@@ -28,7 +28,7 @@ void Show(QLineEdit& box, const std::string& text) {
   box.setCursorPosition(0);
 }
 
-/// Read-only entries look like the window behind them.
+/// Read-only entries have the background of the window.
 template <typename Entry>
 void SetReadOnly(Entry& entry, bool flag) {
   entry.setReadOnly(flag);
@@ -88,7 +88,7 @@ void Scenarios::ShowTexts() {
   }
   ui_->MissionSelection1->setAccessibleName(Text(strings_, 183));
   ui_->Description->setAccessibleName(Text(strings_, 184));
-  // A label names its buddy to screen readers only beside it, and these boxes lie on pages of their own.
+  // Screen readers use a buddy label's text only within the same parent, and these boxes lie on other pages.
   for (const ObjectiveBoxes& boxes : objectives_) {
     boxes.PrimaryDescription->setAccessibleName(Text(strings_, 192));
     boxes.PrimaryPoints->setAccessibleName(Text(strings_, 193));
@@ -109,7 +109,7 @@ void Scenarios::ConnectCommands() {
                            });
   const auto show = [this] { commands_.Run([this] { ShowSelectedMission(); }); };
   connect(ui_->MissionSelection1, &QListWidget::currentRowChanged, this, show);
-  // Also on the entry that is current already: what was typed and not saved is replaced.
+  // A click on the entry that is already current also shows its mission again, discarding unsaved changes.
   connect(ui_->MissionSelection1, &QListWidget::itemClicked, this, show);
   connect(ui_->MissionSelection1, &QListWidget::itemSelectionChanged, this, &Scenarios::FollowSelection);
   connect(ui_->ObjectivesTab, &QTabBar::currentChanged, this, &Scenarios::BringToFront);
@@ -122,7 +122,8 @@ void Scenarios::LoadMissionList() {
   ForEachRow(rsScenarios_, [this] {
     const QString name = QString::fromStdString(TextOf(rsScenarios_.Fields("MissionName")));
     const std::int32_t id = RoundToInt32(NumberOf(rsScenarios_.Fields("ID")));
-    auto entry = std::make_unique<QListWidgetItem>(name);  // a list that holds it already would search it
+    // Added to the list last: setData on an item in a list searches the whole list for it.
+    auto entry = std::make_unique<QListWidgetItem>(name);
     entry->setData(Qt::UserRole, id);
     ui_->MissionSelection1->addItem(entry.release());
   });
@@ -144,7 +145,7 @@ void Scenarios::ShowSelectedMission() {
   }
 }
 
-// A screen reader selects an entry without making it the current one.
+// Screen readers select an entry without making it the current one.
 void Scenarios::FollowSelection() {
   const QList<QListWidgetItem*> selected = ui_->MissionSelection1->selectedItems();
   if (!selected.isEmpty()) {
@@ -236,7 +237,7 @@ void Scenarios::NewMission() {
     return;
   }
   {
-    const QSignalBlocker blocker(ui_->MissionSelection1);  // there is no row to show yet
+    const QSignalBlocker blocker(ui_->MissionSelection1);  // the entry has no row to show yet
     ui_->MissionSelection1->addItem(QString::fromStdString(name));
     ui_->MissionSelection1->setCurrentRow(ui_->MissionSelection1->count() - 1);
   }
@@ -293,8 +294,8 @@ void Scenarios::StartRow() {
     rsScenarios_.AddNew();
     isNewRecord_ = false;
   } else if (rsScenarios_.EditMode() != EditMode::Add) {
-    // A row whose insertion failed is still to be added; any other save must meet the row that the list
-    // shows.
+    // After a failed insertion the new row is still pending. Any other save goes to the row selected in the
+    // list.
     if (!FindSelectedMission()) {
       throw RuntimeError(Fault::NoCurrentRecord);
     }

@@ -17,7 +17,7 @@ namespace Ui {
 class Scenarios;
 }
 
-/// The editor of missions. Works on the cursor that the whole program shares, and leaves it on the first
+/// The mission editor. It works on the cursor shared by the whole program, and leaves it on the first
 /// mission.
 class Scenarios : public QDialog {
   Q_OBJECT
@@ -40,7 +40,7 @@ class Scenarios : public QDialog {
   void ConnectCommands();
 
   void LoadMissionList();
-  /// Selects an entry and shows its mission, as a click on it does.
+  /// Selects an entry and shows its mission, like a click on it.
   void SelectMission(int entry);
   void ShowSelectedMission();
   void FollowSelection();
@@ -69,5 +69,5 @@ class Scenarios : public QDialog {
   Commands commands_;
   bool isNewRecord_ = false;  ///< the next save adds a row
   bool locked_ = true;        ///< the entries are read-only
-  bool silentSave_ = false;   ///< the next save tells nothing
+  bool silentSave_ = false;   ///< the next save shows no box
 };

@@ -31,7 +31,7 @@ constexpr std::size_t LengthOfCharacter(std::string_view text) {
   if (length == 0 || text.size() < length) {
     return 0;
   }
-  // The second byte alone rules out overlong forms, surrogates and what lies above U+10FFFF.
+  // The range of the second byte rules out overlong forms, surrogates and code points above U+10FFFF.
   const unsigned char lowest = lead == 0xE0 ? 0xA0 : lead == 0xF0 ? 0x90 : 0x80;
   const unsigned char highest = lead == 0xED ? 0x9F : lead == 0xF4 ? 0x8F : 0xBF;
   if (byte(1) < lowest || byte(1) > highest) {

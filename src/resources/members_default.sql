@@ -1,11 +1,11 @@
--- The empty member table that a new installation starts with.
+-- The empty members table of a new installation.
 
 PRAGMA user_version = 1;
 
 BEGIN;
 
--- Names and contact details compare without case, DallasID to the letter. Dates are local times
--- 'YYYY-MM-DD HH:MM:SS'. Photograph stands last, so that reading a row's other columns never touches its pages.
+-- Names and contact details compare case-insensitively, DallasID exactly. Dates are local times
+-- 'YYYY-MM-DD HH:MM:SS'. Photograph is last, so that reading the other columns never touches its pages.
 CREATE TABLE Members (
   ContactID INTEGER PRIMARY KEY AUTOINCREMENT,
   DallasID TEXT,

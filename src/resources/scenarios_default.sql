@@ -1,13 +1,12 @@
--- The missions that a new installation starts with. The operator changes, adds and deletes them in Mission Setup.
+-- The missions of a new installation. The operator changes, adds and deletes missions in Mission Setup.
 
 PRAGMA user_version = 1;
 
 BEGIN;
 
--- Short texts are held to the 255 characters of the database format that these files once had; descriptions were memos
--- in some of them. NUMERIC columns turn a text
--- that is a number into that number and leave any other text as it is. Texts compare above all numbers, so the ranges
--- refuse them as well as infinities.
+-- Short texts are limited to the 255 characters of the former file format; descriptions were memos in some of those
+-- files. NUMERIC columns convert a numeric text to a number and leave any other text alone. Texts compare greater than
+-- all numbers, so the range checks refuse them, and infinities too.
 CREATE TABLE Table1 (
   ID INTEGER PRIMARY KEY AUTOINCREMENT,
   MissionName TEXT NOT NULL DEFAULT '' CHECK (length(MissionName) <= 255),
@@ -39,7 +38,7 @@ CREATE TABLE Table1 (
   TeamRatio TEXT NOT NULL DEFAULT '' CHECK (length(TeamRatio) <= 255)
 );
 
--- One mission a row. The first line of a description or objective is its tool tip, so it stands for itself.
+-- One mission per row. The first line of a description or objective is its tool tip, so it must make sense by itself.
 WITH Mission(Name, Description, Duration, Ratio, Respawn, Heal,
              PrimaryA, PrimaryPointsA, SecondaryA, SecondaryPointsA,
              PrimaryB, PrimaryPointsB, SecondaryB, SecondaryPointsB,
@@ -173,7 +172,7 @@ Played in three rounds. The teams change ends after each, and whoever has fallen
    'Win two of the three rounds.', 150,
    'Win a round without losing anybody.', 100)
 ),
--- Lines end in CR LF: there the tool tips are cut.
+-- Lines end in CR LF, where the tool tips are cut.
 Lines AS (
   SELECT *, replace(Description, char(10), char(13, 10)) AS Text FROM Mission
 )

@@ -2,7 +2,7 @@
 
 #include <cstdint>
 
-/// Which sheets are wanted.
+/// Which sheets to make.
 namespace SheetSelection {
 inline constexpr std::int16_t Nothing = 0;
 inline constexpr std::int16_t OnePlayer = 1;
@@ -16,7 +16,7 @@ inline constexpr std::int16_t Printer = 1;
 inline constexpr std::int16_t Files = 2;
 }  // namespace OutputTarget
 
-/// What the operator wants printed; kept from one use of the window to the next.
+/// What the operator last chose to print; kept between uses of the window.
 struct PrintChoice {
   std::int16_t SheetSelection = SheetSelection::Nothing;
   bool RankHidden = false;
@@ -25,9 +25,9 @@ struct PrintChoice {
   std::int16_t SelectedNumber = 0;  ///< 0 to 95
 };
 
-/// What stands in the window's controls when OK is pressed.
+/// The contents of the window's controls when OK is pressed.
 struct PrintEntries {
-  std::int16_t SheetSelection;  ///< of the option button that is set
+  std::int16_t SheetSelection;  ///< of the checked option button
   int PlayersTeamIndex;         ///< of `TeamID`, from 0
   int PlayerIndex;              ///< of `PlayerID`, from 0
   int TeamIndex;                ///< of `TeamID2`, from 0
@@ -35,7 +35,7 @@ struct PrintEntries {
   bool HideRank;
 };
 
-/// Takes over what was entered. Returns false, and leaves output and rank as they were, when the player's
-/// number is too high for the team; the selection stands even so. The test is made for every selection, with
-/// the team and number that earlier uses left.
+/// Copies the entries into `choice`. If the player's number is too high for the team, returns false and
+/// leaves output target and rank unchanged, though the selection is still copied. The check runs for every
+/// selection; where team and number are not used, it sees the values left by earlier uses.
 bool TakeEntries(const PrintEntries& entries, PrintChoice& choice);

@@ -11,8 +11,8 @@ namespace Ui {
 class PrintOptions;
 }
 
-/// Asks which score sheets are wanted and where they go. It is hidden and not closed, so that it shows the
-/// last choices when it is shown again.
+/// Asks which score sheets to make and where to send them. The window is hidden, not closed, so that it shows
+/// the last choices the next time.
 class PrintOptions : public QDialog {
   Q_OBJECT
 
@@ -20,7 +20,7 @@ class PrintOptions : public QDialog {
   PrintOptions(const StringTable& strings, MessageBoxes& boxes, QWidget* parent);
   ~PrintOptions() override;
 
-  /// What was chosen; `SheetSelection` is 0 after Cancel.
+  /// The operator's choice; `SheetSelection` is 0 after Cancel.
   const PrintChoice& Choice() const { return choice_; }
 
   void accept() override;
@@ -28,7 +28,7 @@ class PrintOptions : public QDialog {
 
  private:
   void FillLists(const StringTable& strings);
-  /// Only the lists of the option that is set can be used.
+  /// Enables only the lists that belong to the checked option.
   void EnableLists();
 
   std::unique_ptr<Ui::PrintOptions> ui_;

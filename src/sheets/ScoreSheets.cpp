@@ -14,18 +14,18 @@ using std::chrono::milliseconds;
 
 namespace {
 
-/// The end of a run at one of its stages.
+/// Thrown when a stage of the run fails: the box to show.
 struct StageFailure {
   std::string Text;
   std::string Title;
 };
 
-/// The end of a run because the program closes.
+/// Thrown when the program is closing.
 struct ProgramCloses {};
 
 constexpr const char* FailureTitle = "Print Error";
 
-/// Runs a stage of a sheet; any failure of it ends the run with its text.
+/// Runs one stage of a sheet; a failure in it ends the run with `text` and `title`.
 template <typename Operation>
 void Stage(const std::string& text, const std::string& title, Operation&& operation) {
   try {
@@ -40,7 +40,7 @@ void Stage(const std::string& text, Operation&& operation) {
   Stage(text, FailureTitle, std::forward<Operation>(operation));
 }
 
-/// Throws RuntimeError 75 for a name that some system a sheet is carried to would refuse.
+/// Throws RuntimeError 75 for a file name that is invalid on any system the sheet may be copied to.
 void CheckFileName(const std::string& name) {
   constexpr std::size_t longest = 255;
   bool valid = name.size() <= longest;
@@ -167,9 +167,10 @@ void ScoreSheets::MakeSheet(int index, int number, int count) {
 
 void ScoreSheets::FillPlayer(WordDocument& document, int index, int number, int count) {
   Write(document, ResultTexts(in_.Board, index, winner_));
-  const std::int32_t member = in_.Board.Players(index).MemberIndex;
-  const bool found = member != 0 && in_.Members.LoadMember(member);
-  const BookmarkTexts texts = found ? MemberTexts(in_.RsMembers, in_.Members) : GuestTexts();
+  const std::int32_t contactId = in_.Board.Players(index).MemberIndex;
+  const std::optional<Member> member = contactId == 0 ? std::nullopt : in_.Members.LoadMember(contactId);
+  const BookmarkTexts texts =
+      member ? MemberTexts(*member, in_.Members.LoadHistory(contactId)) : GuestTexts();
   const std::string& name = texts.front().second;
   const std::uint8_t id = IdFromIndex(index);
   const std::string player =
@@ -178,14 +179,16 @@ void ScoreSheets::FillPlayer(WordDocument& document, int index, int number, int 
   in_.Progress.ShowSheet(number, count, player);
   ServeEvents();
   Write(document, texts);
-  if (found) {
-    Stage("Error occured getting Memmber photo.", [&] { AddPhoto(document); });
+  if (member) {
+    Stage("Error occured getting Memmber photo.", [&] { AddPhoto(document, *member); });
   }
 }
 
-void ScoreSheets::AddPhoto(WordDocument& document) {
+void ScoreSheets::AddPhoto(WordDocument& document, const Member& member) {
+  // Events were served since the member was looked up, and a command given meanwhile moves the cursor.
+  in_.RsMembers.WalkTo("ContactID", std::int64_t{member.ContactId});
   const std::string file = in_.Disk.MakeTempFileName();
-  // The file of a member without a photo stays.
+  // The temporary file of a member without a photo is not deleted.
   if (ExportPhoto(in_.RsMembers, "Photograph", "PhotographLength", file, in_.Disk)) {
     document.AddPicture(1, 1, 1, file);
     in_.Disk.Delete(file);

@@ -33,15 +33,15 @@ struct SheetParts {
   std::string MissionName;
 };
 
-/// Makes one document for each chosen player from the template `score_card.doc`, saves it in the folder
-/// `scores`, and prints it when that is wanted; when the output goes to files, all sheets of the run are left
-/// as one PDF too.
+/// Makes one document for each chosen player from the template `score_card.doc` and saves it in the folder
+/// `scores`. Output to the printer also prints each document; output to files also leaves all sheets of the
+/// run in one PDF.
 class ScoreSheets {
  public:
   ScoreSheets(const SheetParts& parts, const PrintChoice& choice);
 
-  /// Runs to the end, which a box tells; to the first failure, which a box tells too; or, without a box,
-  /// until the program closes. Events are served all the while. Sheets that were made stay.
+  /// Runs to the end or to the first failure, either of which a box reports, or until the program closes,
+  /// without a box. Events are processed throughout. Finished sheets are kept in every case.
   void GenerateScoreSheets();
 
  private:
@@ -51,15 +51,14 @@ class ScoreSheets {
   void MakeSheet(int index, int number, int count);
   void StartWordProcessor();
   void FillPlayer(WordDocument& document, int index, int number, int count);
-  void AddPhoto(WordDocument& document);
+  void AddPhoto(WordDocument& document, const Member& member);
   void FillGame(WordDocument& document, int index);
   void Save(WordDocument& document);
-  /// A name in the folder of sheets that is not taken: `base` and the extension, with a number between where
-  /// needed.
+  /// An unused path in the folder of sheets: `base` and the extension, with a number in between if needed.
   std::string FreeName(const std::string& base, const std::string& extension) const;
   void JoinSheets();
   void Write(WordDocument& document, const std::vector<std::pair<const char*, std::string>>& texts);
-  /// Lets events be served. Ends the run when the program closes.
+  /// Processes events. Ends the run if the program is closing.
   void ServeEvents();
 
   const SheetParts& in_;
@@ -67,6 +66,6 @@ class ScoreSheets {
   std::string folder_;
   int winner_ = 0;
   std::string sheetDate_;
-  std::string sheetName_;           ///< of the present sheet
+  std::string sheetName_;           ///< of the current sheet
   std::vector<std::string> pages_;  ///< each sheet of the run as PDF, in temporary files
 };

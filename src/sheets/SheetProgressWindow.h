@@ -12,8 +12,8 @@ namespace Ui {
 class SheetProgressWindow;
 }
 
-/// The small window in front of a run of score sheets. Its button, Escape and the close box stop the run
-/// after the present sheet; the window stays until then, and with it the hourglass.
+/// The small window shown during a run of score sheets. Its button, Escape and the close box stop the run
+/// after the current sheet; until then the window and the hourglass stay.
 class SheetProgressWindow : public QDialog, public SheetProgress {
   Q_OBJECT
 

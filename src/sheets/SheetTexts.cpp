@@ -2,7 +2,6 @@
 
 #include <string_view>
 
-#include "core/data/FieldValue.h"
 #include "core/game/HitLines.h"
 #include "core/text/NumberForms.h"
 #include "core/text/Pieces.h"
@@ -15,7 +14,7 @@ std::string NumberText(int index) {
   return Str(std::int32_t{PlayerNumberFromId(IdFromIndex(index))});
 }
 
-/// Sheets name the other player with one blank between team and number, and a member by the nickname.
+/// Sheets show the other player with one blank between team and number, and a member by the nickname.
 CellTexts TextsOf(const std::vector<Hit>& hits, const Game& game, MemberLookup& members) {
   CellTexts cells;
   for (const Hit& hit : hits) {
@@ -54,7 +53,7 @@ std::string WithoutWeekday(const std::string& longDate) {
   if (comma == std::string::npos) {
     return longDate;
   }
-  // The character behind the comma goes too.
+  // The character after the comma is dropped too.
   return Characters(std::string_view(longDate).substr(comma + 1), 1, longDate.size());
 }
 
@@ -65,19 +64,15 @@ BookmarkTexts ResultTexts(const Game& game, int index, int winner) {
           {"PlayerID", NumberText(index) + " "}};
 }
 
-BookmarkTexts MemberTexts(Recordset& rsMembers, MemberLookup& members) {
-  const auto text = [&rsMembers](const char* column) {
-    std::string value = TextOf(rsMembers.Fields(column));
-    return value.empty() ? "None" : value;
-  };
-  const auto number = [&rsMembers](const char* column) { return NumberOf(rsMembers.Fields(column)); };
-  return {{"PlayerName", members.GetPlayerName(false)},
-          {"NickName", text("NickName")},
-          {"AvgGames", PlainDecimal(number("TotalGamesPlayed"))},
-          {"AvgAccuracy", FormatPercent(number("AveragePrimAccuracy"))},
-          {"AvgDamage", PlainDecimal(Round2(number("AverageDamage")))},
-          {"AvgSoldiering", PlainDecimal(Round2(number("AverageSoldiering")))},
-          {"ClanName", text("Clan")}};
+BookmarkTexts MemberTexts(const Member& member, const MemberHistory& history) {
+  const auto orNone = [](const std::string& text) { return text.empty() ? "None" : text; };
+  return {{"PlayerName", member.GetPlayerName(false)},
+          {"NickName", orNone(member.NickName)},
+          {"AvgGames", PlainDecimal(history.TotalGamesPlayed)},
+          {"AvgAccuracy", FormatPercent(history.AveragePrimAccuracy)},
+          {"AvgDamage", PlainDecimal(Round2(history.AverageDamage))},
+          {"AvgSoldiering", PlainDecimal(Round2(history.AverageSoldiering))},
+          {"ClanName", orNone(history.Clan)}};
 }
 
 BookmarkTexts GuestTexts() {

@@ -6,26 +6,24 @@
 
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
-#include "platform/Database.h"
 
 /// Bookmarks and their texts, in the order in which they are written.
 using BookmarkTexts = std::vector<std::pair<const char*, std::string>>;
 
-/// Cells of a table, down each column.
+/// The cells of a table, column by column.
 using CellTexts = std::vector<std::string>;
 
-/// Team (1 to 3) that has won: the one that achieved a primary objective, of several sets the last; else the
-/// one with the highest total above 0, of equals the lower number; 0 when nobody has won.
+/// The winning team (1 to 3): the one that achieved a primary objective, or the last such set's if there are
+/// several; else the one with the highest total above 0, the lower number in a tie; 0 if nobody has won.
 int WinningTeam(const Game& game);
 
-/// A date in long form without the weekday in front of its first comma.
+/// A long date without the weekday before its first comma.
 std::string WithoutWeekday(const std::string& longDate);
 
-/// Whose sheet it is and how the game ended for the team.
+/// Whose sheet it is, and the game's result for the player's team.
 BookmarkTexts ResultTexts(const Game& game, int index, int winner);
 
-/// The member's name and history, from the current row.
-BookmarkTexts MemberTexts(Recordset& rsMembers, MemberLookup& members);
+BookmarkTexts MemberTexts(const Member& member, const MemberHistory& history);
 
 BookmarkTexts GuestTexts();
 
@@ -33,7 +31,7 @@ BookmarkTexts GuestTexts();
 BookmarkTexts GameTexts(const Player& player, const std::string& missionName, const std::string& date,
                         const std::string& rank);
 
-/// The hits that player `index` scored on others, oneself included. Moves the members' cursor.
+/// The hits that player `index` scored, on themselves too.
 CellTexts HitsScored(const Game& game, int index, MemberLookup& members);
 
 /// The hits that player `index` took, then the special damage.

@@ -1,12 +1,14 @@
 #include "ui/Commands.h"
 
 #include <QAction>
+#include <QCoreApplication>
 #include <QKeyEvent>
 #include <QPushButton>
 #include <QShortcutEvent>
 #include <algorithm>
 
 #include "platform/ErrorReport.h"
+#include "ui/CommandEvent.h"
 
 Commands::Commands(QWidget& window, MessageBoxes& boxes) : window_(window), boxes_(boxes) {
   window.installEventFilter(this);
@@ -26,15 +28,17 @@ bool Commands::Run(const std::function<void()>& command) {
   return done;
 }
 
-void Commands::Start(const std::function<void()>& command, WhileBusy whileBusy) {
+void Commands::Start(const QObject& control, const std::function<void()>& command, WhileBusy whileBusy) {
   if (whileBusy == WhileBusy::Run || !Running()) {
+    CommandEvent event(control.objectName());
+    QCoreApplication::sendEvent(QCoreApplication::instance(), &event);
     Run(command);
   }
 }
 
 void Commands::Connect(QAction& action, std::function<void()> command, WhileBusy whileBusy) {
   connect(&action, &QAction::triggered, this,
-          [this, command = std::move(command), whileBusy] { Start(command, whileBusy); });
+          [this, &action, command = std::move(command), whileBusy] { Start(action, command, whileBusy); });
 }
 
 void Commands::Connect(QAbstractButton& button, std::function<void()> command, WhileBusy whileBusy) {
@@ -53,9 +57,11 @@ void Commands::Press(QAbstractButton& button, const std::function<void()>& comma
   } else {
     // Keys have brought the focus before the click; so this is a screen reader. The command takes what
     // stands, and an entry that would otherwise be left by the command itself is left now.
-    button.setFocus(Qt::NoFocusReason);
+    pressedUnfocused_ = true;
+    button.setFocus();
+    pressedUnfocused_ = false;
   }
-  Start(command, whileBusy);
+  Start(button, command, whileBusy);
 }
 
 bool Commands::TakeFocus(QAbstractButton& button) {

@@ -70,6 +70,9 @@ class Commands : public QObject {
   /// unwound.
   bool MayClose();
 
+  /// True while a button takes the focus that a screen reader pressed: entries are left unchecked then.
+  bool PressedUnfocused() const { return pressedUnfocused_; }
+
   QWidget& Window() const { return window_; }
 
  protected:
@@ -82,7 +85,7 @@ class Commands : public QObject {
       Connect(*control, [&owner, command = command] { (owner.*command)(); });
     }
   }
-  void Start(const std::function<void()>& command, WhileBusy whileBusy);
+  void Start(const QObject& control, const std::function<void()>& command, WhileBusy whileBusy);
   void Press(QAbstractButton& button, const std::function<void()>& command, WhileBusy whileBusy);
   /// Gives the button the focus. Returns false when an entry that is left thereby keeps it.
   bool TakeFocus(QAbstractButton& button);
@@ -94,4 +97,5 @@ class Commands : public QObject {
   std::vector<QPointer<QAbstractButton>> buttons_;
   int running_ = 0;  ///< commands on the stack
   bool closeRequested_ = false;
+  bool pressedUnfocused_ = false;
 };

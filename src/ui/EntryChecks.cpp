@@ -33,13 +33,12 @@ bool EntryChecks::eventFilter(QObject* watched, QEvent* event) {
 }
 
 bool EntryChecks::IsLeft(const QEvent& focusOut) const {
-  // A screen reader that presses a button without moving the focus has it moved without a reason.
   const auto reason = static_cast<const QFocusEvent&>(focusOut).reason();
-  const bool staysInWindow =
-      reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason && reason != Qt::NoFocusReason;
+  const bool staysInWindow = reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
   const bool leavesForFreeButton =
       std::find(freeButtons_.begin(), freeButtons_.end(), QApplication::focusWidget()) != freeButtons_.end();
-  return !returning_ && staysInWindow && !leavesForFreeButton && commands_.Window().isVisible();
+  return !returning_ && !commands_.PressedUnfocused() && staysInWindow && !leavesForFreeButton &&
+         commands_.Window().isVisible();
 }
 
 bool EntryChecks::CheckLeft() {

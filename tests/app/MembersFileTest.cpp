@@ -32,7 +32,7 @@ TEST_F(MembersWindow, ShowsTheMembersOfAReadOnlyFile) {
     Press("ChangeID");
     EXPECT_EQ(Shown("MemberIDDisplay"), "");
   });
-  ASSERT_EQ(venue.Boxes.Boxes.size(), 4U);  // one is the question
+  ASSERT_EQ(venue.Boxes.Boxes.size(), 4U);  // including the question
   for (const std::size_t box : {0, 2, 3}) {
     EXPECT_THAT(venue.Boxes.Boxes[box].Text, testing::StartsWith("Run-time error '3027': "));
   }

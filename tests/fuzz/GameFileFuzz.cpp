@@ -26,7 +26,7 @@ struct Loaded {
   int MissionCalls = 0;
 };
 
-/// Reads `bytes` as a game; none where they are refused or hold one of the three told faults.
+/// Reads `bytes` as a game; nullopt if they are refused or fail with one of the three expected errors.
 std::optional<Loaded> Read(const std::string& bytes) {
   Loaded loaded;
   const auto selectMission = [&loaded](const std::string& mission) {
@@ -65,8 +65,8 @@ void RequireSame(const Player& player, const Player& again) {
 
 }  // namespace
 
-/// Whatever the bytes: a game, no game, or one of the three told faults. What was read survives a save and a
-/// load.
+/// Whatever the bytes, they are a game, not a game, or one of the three expected errors. A game that was read
+/// survives being saved and loaded.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   const std::optional<Loaded> first = Read(std::string(reinterpret_cast<const char*>(data), size));
   if (!first) {
@@ -94,7 +94,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
       RequireSame(player, again);
     }
   }
-  // Accuracies are cut to 7 digits by the first save; from then on nothing changes any more.
+  // The first save rounds accuracies to 7 digits; after that nothing changes any more.
   const std::string savedAgain = WriteGameFile(*second->Contents, second->Mission);
   const std::optional<Loaded> third = Read(savedAgain);
   Require(third && WriteGameFile(*third->Contents, third->Mission) == savedAgain);

@@ -21,7 +21,7 @@ void Require(bool condition) {
   }
 }
 
-/// The lines of `bytes` without mark, breaks and empty ones.
+/// The non-empty lines of `bytes`, without the byte-order mark and line breaks.
 std::vector<std::string> LinesOf(const std::string& bytes) {
   std::vector<std::string> lines;
   std::string line;
@@ -36,7 +36,7 @@ std::vector<std::string> LinesOf(const std::string& bytes) {
   return lines;
 }
 
-/// True when `after` is `before` with one line changed, or one or two lines added, in one place.
+/// True if `after` is `before` with one line changed, or with one or two lines added at one place.
 bool DiffersInOnePlace(const std::vector<std::string>& before, const std::vector<std::string>& after) {
   std::size_t same = 0;
   while (same < before.size() && same < after.size() && before[same] == after[same]) {
@@ -62,7 +62,7 @@ bool ComesBackAsItIs(const std::string& value) {
 
 }  // namespace
 
-/// The first byte says how many of the next ones are the value that is written; the rest is the file.
+/// The first byte is the length of the value to write, which follows; the rest is the file.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   std::string input(data, data + size);
   const std::size_t valueLength = input.empty() ? 0 : static_cast<unsigned char>(input[0]);

@@ -39,7 +39,7 @@ Counts Take(std::string_view bytes, std::size_t piece) {
 
 }  // namespace
 
-// Nothing that comes from the reader can do harm, and how it is cut into pieces makes no difference.
+// No input from the reader does harm, and how it is split into pieces makes no difference.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   const std::string_view bytes(reinterpret_cast<const char*>(data), size);
   const Counts whole = Take(bytes, size + 1);

@@ -18,8 +18,8 @@ void Require(bool condition) {
   }
 }
 
-/// An adapter that answers as the fuzzer says: for each byte from us one byte tells how many follow as its
-/// answer (0 to 17) or that the line is lost (255).
+/// An adapter whose answers come from the fuzzer: for each byte sent to it, one byte gives the number of
+/// bytes that follow as the answer (modulo 18); 255 also loses the line.
 class Answers {
  public:
   Answers(const std::uint8_t* data, std::size_t size, FakeSerialPort& port) : next_(data), left_(size) {
@@ -47,7 +47,7 @@ class Answers {
   std::size_t left_;
 };
 
-/// All operations of one tick, and the limits that they keep whatever the adapter answers.
+/// All operations of one tick, with checks that hold whatever the adapter answers.
 void RunTick(SerialOneWire& wire, FakeSerialPort& port, OneWireState& state) {
   const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
   Require((handle > 0) == port.PortOpen());

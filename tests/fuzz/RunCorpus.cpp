@@ -8,7 +8,7 @@
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size);
 
-/// Runs a fuzz target over every file of the folders named. A folder without a file is a fault.
+/// Runs a fuzz target on every file in the given folders. An empty folder is an error.
 int main(int argc, char** argv) {
   int files = 0;
   for (int i = 1; i < argc; ++i) {

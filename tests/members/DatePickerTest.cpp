@@ -11,7 +11,7 @@
 
 namespace {
 
-/// A date entry with another control beside it, in the forms of the C locale ("12 Apr 1961").
+/// A date entry with another control beside it, in the C locale's date format ("12 Apr 1961").
 class DateEntry : public testing::Test {
  protected:
   DateEntry() {
@@ -106,7 +106,7 @@ TEST_F(DateEntry, TakesDatesBefore1970) {
   }
 }
 
-TEST_F(DateEntry, GivesUpATextThatIsNoDateForTheLastOne) {
+TEST_F(DateEntry, ReplacesATextThatIsNotADateByTheLastDate) {
   picker.SetStored("1961-04-12 00:00:00");
   for (const char* text : {"yesterday", "1961-02-30", "1961-13-01", "12"}) {
     Enter(text);

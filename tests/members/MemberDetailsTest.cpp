@@ -48,7 +48,7 @@ TEST_F(Details, StayAsTheyAreWhereTheyDoNotDiffer) {
   file.Execute("UPDATE Members SET Address = '" + longText + "', NickName = NULL");
   rows->MoveFirst();
   MemberDetails shown = ReadDetails(*rows);
-  shown.Address.resize(255);  // all that the entry takes
+  shown.Address.resize(255);  // the most that the entry holds
   MemberDetails entered = shown;
   entered.City = "Cardiff";
   Change(shown, entered);

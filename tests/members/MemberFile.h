@@ -4,7 +4,7 @@
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/TestDatabase.h"
 
-/// A members file as a new installation has it, with four members.
+/// A new installation's members file with four members added.
 class MemberFile {
  public:
   MemberFile() {
@@ -20,7 +20,7 @@ class MemberFile {
   void Execute(const std::string& sql) const { OtherConnection(Path()).Execute(sql); }
   std::string Query(const std::string& sql) const { return OtherConnection(Path()).Query(sql); }
 
-  /// A column of one member, read by another program.
+  /// A column of one member, read through a separate connection.
   std::string Stored(const std::string& column, int member) const {
     return Query("SELECT " + column + " FROM Members WHERE ContactID = " + std::to_string(member));
   }

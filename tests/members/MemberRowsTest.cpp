@@ -186,7 +186,7 @@ TEST_F(MemberCursor, SaysThatAReadOnlyFileTakesNoChange) {
   EXPECT_EQ(controls.Details.City, "Cardiff");
 }
 
-TEST_F(MemberCursor, KeepsTheOldRowsOfAFullDisk) {
+TEST_F(MemberCursor, KeepsTheOldRowsOnAFullDisk) {
   Open();
   controls.Details.Address = std::string(20000, 'x');
   {

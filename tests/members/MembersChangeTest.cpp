@@ -12,7 +12,7 @@ TEST_F(MembersWindow, WritesBackEveryEntryWhenItLeavesTheRow) {
       Enter(entry, entry);
     }
     Enter("DOBPicker", "1958-02-28");
-    EXPECT_EQ(Stored("FirstName", 1), "Rhys");  // not before
+    EXPECT_EQ(Stored("FirstName", 1), "Rhys");  // not written yet
     Press("DataNext");
   });
   for (const auto& [column, text] : {std::pair{"FirstName", "FirstNameEntry"},
@@ -164,7 +164,7 @@ TEST_F(MembersWindow, GivesTheMemberInViewTheButtonThatWasRead) {
     EXPECT_EQ(Stored("DallasID", 2), "EFCDAB8967452301");
     Press("DataNext");
     EXPECT_EQ(Shown("MemberIDDisplay"), "");
-    Press("ChangeID");  // nobody looks whether another has it
+    Press("ChangeID");  // duplicates are not checked
   });
   EXPECT_EQ(Stored("DallasID", 5), "EFCDAB8967452301");
   EXPECT_EQ(Stored("City", 2), "Swansea");

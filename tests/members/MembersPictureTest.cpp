@@ -10,7 +10,7 @@ using testing::IsEmpty;
 /// The window with picture files for its file dialog.
 class MembersPicture : public MembersWindow {
  protected:
-  /// Makes the file that the next dialogs return.
+  /// Creates the file that file dialogs return from now on.
   void Choose(const std::string& bytes) {
     const std::string path = venue.Folder / "photo";
     WriteFile(path, bytes);

@@ -8,7 +8,7 @@ using testing::IsEmpty;
 TEST_F(MembersWindow, FindsTheStartOfAnyOfTheThreeNames) {
   Open([this] {
     SearchFor("mo");
-    EXPECT_EQ(Found(), "Morgan Belmont ");  // Morgan, and the nickname Mole; not Belmont
+    EXPECT_EQ(Found(), "Morgan Belmont ");  // by the last name Morgan and the nickname Mole
     SearchFor("MOR");
     EXPECT_EQ(Found(), "Morgan ");
     SearchFor("ali");
@@ -98,7 +98,7 @@ TEST_F(MembersWindow, TakesTheDatabasesWildcards) {
     EXPECT_EQ(Found(), "王 ");
     SearchFor("#");
     EXPECT_EQ(Shown("DataPlace"), "0 / 0");
-    SearchFor("%");  // no wildcard here
+    SearchFor("%");  // not a wildcard in Jet
     EXPECT_EQ(Shown("DataPlace"), "0 / 0");
     SearchFor("_");
     EXPECT_EQ(Shown("DataPlace"), "0 / 0");
@@ -106,13 +106,13 @@ TEST_F(MembersWindow, TakesTheDatabasesWildcards) {
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
-TEST_F(MembersWindow, SaysThatATextWithAnApostropheIsNoQueryAndKeepsTheRows) {
+TEST_F(MembersWindow, ReportsASearchWithAnApostropheAsMalformedAndKeepsTheRows) {
   Open([this] {
     Press("DataNext");
     SearchFor("O'B");
     EXPECT_EQ(Text("LastNameEntry"), "Belmont");
     EXPECT_EQ(Shown("DataPlace"), "2 / 4");
-    SearchFor("O''B");  // the text goes in as it stands
+    SearchFor("O''B");  // the text is not escaped
     EXPECT_EQ(Text("LastNameEntry"), "O'Brien");
   });
   ASSERT_EQ(venue.Boxes.Boxes.size(), 1U);
@@ -120,7 +120,7 @@ TEST_F(MembersWindow, SaysThatATextWithAnApostropheIsNoQueryAndKeepsTheRows) {
   EXPECT_EQ(venue.Boxes.Boxes[0].Icon, BoxIcon::Critical);
 }
 
-TEST_F(MembersWindow, SaysOnceThatATextIsNoQueryWhenTheSearchButtonIsPressed) {
+TEST_F(MembersWindow, ReportsAMalformedSearchOnceWhenTheSearchButtonIsPressed) {
   Open([this] {
     Enter("SearchText", "O'B");
     ::Find<QPushButton>(*window, "Search").click();  // as assistive programs do
@@ -133,7 +133,7 @@ TEST_F(MembersWindow, SaysOnceThatATextIsNoQueryWhenTheSearchButtonIsPressed) {
   });
 }
 
-TEST_F(MembersWindow, SaysThatAnOpenBracketIsNoPattern) {
+TEST_F(MembersWindow, ReportsAnUnclosedBracketAsMalformed) {
   Open([this] {
     SearchFor("[a");
     EXPECT_TRUE(window->isVisible());
@@ -169,7 +169,7 @@ TEST_F(MembersWindow, SearchesAnewAfterAMemberWasAdded) {
   Open([this] {
     SearchFor("mole");
     Press("NewMember");
-    EXPECT_EQ(Shown("DataPlace"), "2 / 2");  // the new row joins what was found
+    EXPECT_EQ(Shown("DataPlace"), "2 / 2");  // the new row joins the search result
     SearchFor("enter");
     EXPECT_EQ(Shown("DataPlace"), "1 / 1");
   });

@@ -34,12 +34,12 @@ class MembersSteps : public testing::Test {
   void Sql(const std::string& sql) { venue.ChangeDatabase("members.mdb", sql); }
   std::string Query(const std::string& sql) { return venue.QueryDatabase("members.mdb", sql); }
 
-  /// A column of one member, read by another program.
+  /// A column of one member, read through a separate connection.
   std::string Stored(const std::string& column, int member) {
     return Query("SELECT " + column + " FROM Members WHERE ContactID = " + std::to_string(member));
   }
 
-  /// Opens the window, does `act` in it, and closes it by its close box where `act` did not.
+  /// Opens the window, runs `act` in it, and closes it by its close box if `act` did not.
   void Open(const std::function<void()>& act) {
     const WhileModal<Members> open([&](Members& opened) {
       window = &opened;
@@ -58,7 +58,7 @@ class MembersSteps : public testing::Test {
   std::string Shown(const std::string& name) { return ::Find<QLabel>(*window, name).text().toStdString(); }
   PictureBox& Photo() { return ::Find<PictureBox>(*window, "MemberPhoto"); }
 
-  /// The operator types over what an entry holds.
+  /// Types over the contents of an entry.
   void Enter(const std::string& name, const std::string& text) {
     Line(name).setFocus();
     Line(name).selectAll();
@@ -67,7 +67,7 @@ class MembersSteps : public testing::Test {
     if (QString::fromLatin1(typed.toLatin1()) == typed) {
       QTest::keyClicks(&Line(name), typed);
     } else {
-      Line(name).insert(typed);  // there are no keys for it
+      Line(name).insert(typed);  // has no key on the keyboard
     }
   }
 
@@ -75,10 +75,10 @@ class MembersSteps : public testing::Test {
   void SearchFor(const std::string& text) {
     Enter("SearchText", text);
     Type(*window, Qt::Key_Tab);
-    QApplication::processEvents();  // a fault is told when the focus has moved
+    QApplication::processEvents();  // a failure is reported once the focus has moved
   }
 
-  /// Last names of all rows that the cursor goes through, each followed by a blank.
+  /// The last names of all rows that the arrows go through, each followed by a blank.
   std::string Found() {
     std::string names;
     Press("DataFirst");
@@ -95,6 +95,6 @@ class MembersSteps : public testing::Test {
   }
 
   Place venue;
-  std::string swiped = NoDallasId;  ///< what the reader reads
+  std::string swiped = NoDallasId;  ///< the button on the reader
   Members* window = nullptr;
 };

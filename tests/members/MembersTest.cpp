@@ -163,7 +163,7 @@ TEST_F(MembersWindow, OpensOnAnEmptyTableAndTakesTheFirstMember) {
     Press("ChangePicture");
     Press("Delete");
     EXPECT_TRUE(window->isVisible());
-    EXPECT_EQ(window->SelectedContact, "");
+    EXPECT_EQ(window->SelectedContact(), "");
     Press("NewMember");
     EXPECT_TRUE(Line("FirstNameEntry").isEnabled());
     EXPECT_EQ(Text("FirstNameEntry"), "Enter Name");
@@ -177,7 +177,7 @@ TEST_F(MembersWindow, ChoosesTheMemberInViewByOk) {
   Open([this] {
     Press("DataNext");
     Press("OK");
-    EXPECT_EQ(window->SelectedContact, "2");
+    EXPECT_EQ(window->SelectedContact(), "2");
     EXPECT_FALSE(window->isVisible());
   });
 }
@@ -187,7 +187,7 @@ TEST_F(MembersWindow, ChoosesByReturnInAnEntry) {
     Press("DataNext");
     Line("CityEntry").setFocus();
     Type(*window, Qt::Key_Return);
-    EXPECT_EQ(window->SelectedContact, "2");
+    EXPECT_EQ(window->SelectedContact(), "2");
     EXPECT_FALSE(window->isVisible());
   });
 }
@@ -197,7 +197,7 @@ TEST_F(MembersWindow, ChoosesAMemberWithAnApostrophe) {
     SearchFor("sham");
     Enter("FirstNameEntry", "O'Sean");
     Press("OK");
-    EXPECT_EQ(window->SelectedContact, "5");
+    EXPECT_EQ(window->SelectedContact(), "5");
   });
   EXPECT_EQ(Stored("FirstName || LastName", 5), "O'SeanO'Brien");
 }
@@ -208,7 +208,7 @@ TEST_F(MembersWindow, ChoosesTheFirstOfTwoWithTheSameNames) {
     Press("DataLast");
     EXPECT_EQ(Shown("Dummy"), "12");
     Press("OK");
-    EXPECT_EQ(window->SelectedContact, "2");
+    EXPECT_EQ(window->SelectedContact(), "2");
   });
 }
 
@@ -216,7 +216,7 @@ TEST_F(MembersWindow, ChoosesByTheNamesJustTyped) {
   Open([this] {
     Enter("FirstNameEntry", "Dai");
     Press("OK");
-    EXPECT_EQ(window->SelectedContact, "1");
+    EXPECT_EQ(window->SelectedContact(), "1");
   });
   EXPECT_EQ(Stored("FirstName", 1), "Dai");
 }
@@ -226,7 +226,7 @@ TEST_F(MembersWindow, ChoosesNobodyWhoseNameIsNotStored) {
   Open([this] {
     Press("OK");
     EXPECT_TRUE(window->isVisible());
-    EXPECT_EQ(window->SelectedContact, "");
+    EXPECT_EQ(window->SelectedContact(), "");
   });
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Fault(3021, "No current record.")));
 }
@@ -235,7 +235,7 @@ TEST_F(MembersWindow, ChoosesNobodyWhenItIsClosed) {
   Open([this] {
     Press("DataNext");
     Type(*window, Qt::Key_Escape);
-    EXPECT_EQ(window->SelectedContact, "");
+    EXPECT_EQ(window->SelectedContact(), "");
     EXPECT_FALSE(window->isVisible());
   });
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());

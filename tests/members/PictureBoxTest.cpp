@@ -8,8 +8,8 @@
 
 namespace {
 
-/// One black dot.
-const std::string gif(
+/// One black pixel.
+const std::string Gif(
     "GIF89a\x01\x00\x01\x00\x80\x00\x00\x00\x00\x00\xFF\xFF\xFF\x2C\x00\x00\x00\x00\x01\x00\x01\x00\x00\x02"
     "\x02\x44\x01\x00\x3B",
     35);
@@ -32,7 +32,7 @@ TEST_F(APictureBox, ReadsTheUsualKinds) {
 }
 
 TEST_F(APictureBox, ReadsGif) {
-  box.Load(gif);
+  box.Load(Gif);
   EXPECT_EQ(box.Picture().size(), QSize(1, 1));
 }
 
@@ -45,7 +45,7 @@ TEST_F(APictureBox, IgnoresBytesBehindThePicture) {
 }
 
 TEST_F(APictureBox, FitsThePictureWithItsProportions) {
-  box.Load(PictureFile(Qt::red));  // 4 to 3, in a box of 2 to 1
+  box.Load(PictureFile(Qt::red));  // 4:3, in a 2:1 box
   EXPECT_EQ(At(100, 50), QColor(Qt::red));
   EXPECT_EQ(At(100, 6), QColor(Qt::red));
   EXPECT_NE(At(20, 50), QColor(Qt::red));
@@ -68,7 +68,7 @@ TEST_F(APictureBox, ShowsNoPictureWhoseEndIsMissing) {
     box.Load(whole.substr(0, whole.size() - 30));
     EXPECT_TRUE(box.Picture().isNull()) << format;
   }
-  box.Load(gif.substr(0, gif.size() - 3));
+  box.Load(Gif.substr(0, Gif.size() - 3));
   EXPECT_TRUE(box.Picture().isNull());
 }
 

@@ -15,7 +15,7 @@ inline std::string PictureFile(const QColor& colour, const char* format = "PNG",
   return bytes.toStdString();
 }
 
-/// The same with bytes behind the end of the picture, `size` in all.
+/// The same with bytes after the end of the picture, `size` bytes in all.
 inline std::string PictureFileOf(std::size_t size, const QColor& colour) {
   std::string bytes = PictureFile(colour);
   bytes.resize(size, 'x');

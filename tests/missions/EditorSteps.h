@@ -30,7 +30,7 @@ class EditorSteps : public testing::Test {
   /// Shows the editor and returns when it is closed.
   virtual void Execute() = 0;
 
-  /// Opens the editor, does `act` in it, and closes it by its close box where `act` did not.
+  /// Opens the editor, runs `act` in it, and closes it by its close box if `act` did not.
   void Open(const std::function<void()>& act) {
     const WhileModal<Scenarios> open([&](Scenarios& opened) {
       window = &opened;

@@ -21,7 +21,7 @@ std::string Repeated(const std::string& text, int times) {
   return repeated;
 }
 
-/// A text of `length` characters in which each tells its place: 1, 2, ... 9, 0, 1, ...
+/// A text of `length` characters that show their position: 1, 2, ... 9, 0, 1, ...
 std::string Numbered(int length) {
   std::string text;
   for (int place = 1; place <= length; ++place) {
@@ -60,7 +60,7 @@ class MissionRow : public testing::Test {
     rows->Update();
   }
 
-  /// A column of the current row as it stands in the file.
+  /// A column of the current row as stored in the file.
   std::string Stored(const std::string& column) {
     return OtherConnection(folder_ / "scenarios.mdb")
         .Query("SELECT " + column + " FROM Table1 ORDER BY ID DESC LIMIT 1");

@@ -9,7 +9,7 @@ namespace {
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-/// Another program that writes into a database and does not come to an end.
+/// Another program with an open write transaction on a database.
 class Writer {
  public:
   explicit Writer(const std::string& path) : connection_(path) { connection_.Execute("BEGIN EXCLUSIVE"); }
@@ -21,7 +21,7 @@ class Writer {
   OtherConnection connection_;
 };
 
-/// No file of this process can grow while it lives: a full disk.
+/// Simulates a full disk: while it exists, no file of this process can grow.
 class FullDisk {
  public:
   explicit FullDisk(rlim_t bytes) {

@@ -5,12 +5,12 @@
 #include <iterator>
 #include <string>
 
-/// Path of a data file as it lies beside the built program.
+/// Path of a data file beside the built program.
 inline std::filesystem::path DefaultFile(const std::string& name) {
   return std::filesystem::path(TESSARINE_PROGRAM_FOLDER) / name;
 }
 
-/// All bytes of a data file beside the built program; empty when it is missing.
+/// All bytes of a data file beside the built program; empty if it is missing.
 inline std::string DefaultFileBytes(const std::string& name) {
   std::ifstream file(DefaultFile(name), std::ios::binary);
   return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};

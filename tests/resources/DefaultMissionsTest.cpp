@@ -40,7 +40,7 @@ const std::set<std::string> MayBeNull = {"MissionDescription2", "MissionDescript
 
 class DefaultMissions : public testing::Test {
  protected:
-  /// True when the first mission takes `value`, an SQL expression, in `column`.
+  /// True if the first mission accepts `value`, an SQL expression, in `column`.
   bool Accepts(const std::string& column, const std::string& value) {
     return database.Run("UPDATE Table1 SET " + column + " = " + value + " WHERE ID = 1");
   }
@@ -108,7 +108,7 @@ TEST_F(DefaultMissions, CutLongDescriptionsBehind254Characters) {
   EXPECT_EQ(database.Single("SELECT count(*) FROM Table1 WHERE length(MissionDescription) > 254 "
                             "OR MissionDescription2 = ''"),
             "0");
-  // The character at position 510 would be lost, so no delivered description reaches it.
+  // Character 510 would be lost on saving, so no default description is that long.
   EXPECT_EQ(database.Single("SELECT count(*) FROM Table1 WHERE MissionDescription3 IS NOT NULL "
                             "OR MissionDescription4 IS NOT NULL"),
             "0");
@@ -179,7 +179,7 @@ TEST_F(DefaultMissions, PenaltiesRefuseATextThatIsNoNumber) {
 TEST_F(DefaultMissions, ShortTextsHold255CharactersAndNoMore) {
   for (const std::string& column : Columns) {
     if (column.starts_with("MissionDescription")) {
-      continue;  // memos of an old installation may be longer
+      continue;  // memo columns in old files may be longer
     }
     if (database.Single("SELECT type FROM pragma_table_info('Table1') WHERE name = '" + column + "'") !=
         "TEXT") {

@@ -6,8 +6,7 @@
 
 namespace {
 
-/// `text` as the word processor's binary format stores names: length and characters in 16 bits, low byte
-/// first.
+/// `text` as the binary document format stores names: length and characters, 16 bits each, little-endian.
 std::string StoredName(const std::string& text) {
   std::string stored = {static_cast<char>(text.size()), '\0'};
   for (const char c : text) {

@@ -27,7 +27,7 @@ const Text& TextOf(int number) {
 }
 
 bool HasHanCharacter(std::string_view text) {
-  // U+4E00 to U+9FFF begin with the bytes E4 to E9 in UTF-8.
+  // In UTF-8, U+4E00 to U+9FFF begin with a byte from E4 to E9.
   return std::any_of(text.begin(), text.end(), [](char c) {
     const auto byte = static_cast<unsigned char>(c);
     return byte >= 0xE4 && byte <= 0xE9;

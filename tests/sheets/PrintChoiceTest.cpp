@@ -4,7 +4,7 @@
 
 namespace {
 
-/// Entries of a window that was just opened, with another selection.
+/// The entries of a freshly opened window, but with this selection.
 PrintEntries Entries(std::int16_t selection) {
   return {selection, 0, 0, 0, false, false};
 }

@@ -108,7 +108,7 @@ TEST_P(PrintOptionsWindow, WarnsOfANumberThatTheTeamDoesNotHaveAndCloses) {
   EXPECT_EQ(window.Choice().OutputTarget, 0);
 }
 
-TEST_P(PrintOptionsWindow, WantsNothingAfterCancelOrEscape) {
+TEST_P(PrintOptionsWindow, ChoosesNothingAfterCancelOrEscape) {
   for (const bool byKey : {false, true}) {
     window.show();
     Press(window, "OK");
@@ -138,7 +138,7 @@ TEST_P(PrintOptionsWindow, OfTheProgressShowsSheetAndName) {
   EXPECT_FALSE(progress.isVisible());
 }
 
-TEST_P(PrintOptionsWindow, OfTheProgressHasTheHourglassButLeavesNoneForTheBoxesBehindIt) {
+TEST_P(PrintOptionsWindow, OfTheProgressShowsAnHourglassButNotInTheBoxesAfterIt) {
   SheetProgressWindow progress(strings, nullptr);
   progress.Open();
   ASSERT_NE(QGuiApplication::overrideCursor(), nullptr);

@@ -60,7 +60,7 @@ class Sheets : public testing::Test {
 
   const FakeWordProcessor::Document& Sheet(std::size_t at) const { return *word.Documents.at(at); }
 
-  /// The names under which the sheets were saved.
+  /// The file names of the saved sheets.
   std::vector<std::string> Names() const {
     std::vector<std::string> names;
     for (const auto& document : word.Documents) {
@@ -69,7 +69,7 @@ class Sheets : public testing::Test {
     return names;
   }
 
-  /// The run ends at `operation` with `text`, the sheet under work being left as it is.
+  /// Expects the run to end when `operation` fails, with `text`, leaving the current sheet as it is.
   void ExpectFailure(const std::string& operation, const std::string& text) {
     word.FailAt = operation;
     Run();
@@ -185,7 +185,7 @@ TEST_F(Sheets, OfOnePlayerAreOne) {
   EXPECT_THAT(Names(), ElementsAre("/data/scores/Blue 40-Guest-21 May 2013-Sniper Hunt.doc"));
 }
 
-TEST_F(Sheets, OfAPlayerWhoDoesNotExistAreNoneAndTheRunEndsAtOnce) {
+TEST_F(Sheets, OfAPlayerWhoDoesNotExistAreNotMadeAndTheRunEndsAtOnce) {
   choice.SheetSelection = SheetSelection::OnePlayer;
   choice.OutputTarget = 0;
   choice.SelectedTeam = 3;

@@ -71,13 +71,12 @@ TEST_F(Texts, OfAMemberTellTheHistory) {
       "(1, 'Ann', 'Lee', 'Mole', 'Owls', 12, 0.5, 12.345, 0.125), (2, 'Bo', 'Ray', NULL, '', 0, 0, 0, 0)");
   venue.Open();
   EXPECT_THAT(
-      MemberTexts(*venue.RsMembers, *venue.Members),
+      MemberTexts(*venue.Members->LoadMember(1), venue.Members->LoadHistory(1)),
       ElementsAre(Pair(testing::StrEq("PlayerName"), "Ann Lee"), Pair(testing::StrEq("NickName"), "Mole"),
                   Pair(testing::StrEq("AvgGames"), "12"), Pair(testing::StrEq("AvgAccuracy"), "50.00%"),
                   Pair(testing::StrEq("AvgDamage"), "12.34"), Pair(testing::StrEq("AvgSoldiering"), "0.12"),
                   Pair(testing::StrEq("ClanName"), "Owls")));
-  venue.RsMembers->MoveNext();
-  const BookmarkTexts unnamed = MemberTexts(*venue.RsMembers, *venue.Members);
+  const BookmarkTexts unnamed = MemberTexts(*venue.Members->LoadMember(2), venue.Members->LoadHistory(2));
   EXPECT_EQ(unnamed[1].second, "None");
   EXPECT_EQ(unnamed[6].second, "None");
   EXPECT_EQ(unnamed[3].second, "0.00%");

@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <optional>
+#include <ostream>
 #include <string>
 #include <vector>
 
@@ -16,6 +17,11 @@ using Bytes = std::vector<std::uint8_t>;
 
 /// Longest wait for something that must come; long enough for a busy machine.
 constexpr std::chrono::seconds limit{20};
+
+/// For the messages of failed tests.
+inline void PrintTo(const LineSettings& settings, std::ostream* out) {
+  *out << Text(settings);
+}
 
 /// The host's end of a line, byte by byte and without a protocol.
 class RawHost {

@@ -5,8 +5,8 @@
 #include <memory>
 #include <vector>
 
+#include "core/game/Board.h"
 #include "core/game/Game.h"
-#include "core/game/ScoreList.h"
 #include "core/game/SoldieringFactors.h"
 #include "core/text/NumberForms.h"
 #include "tests/support/Described.h"

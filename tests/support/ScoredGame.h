@@ -2,16 +2,17 @@
 
 #include <sqlite3.h>
 
+#include <functional>
 #include <memory>
 #include <stdexcept>
 #include <string>
 #include <vector>
 
+#include "core/game/BoardTexts.h"
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
 #include "core/game/MissionList.h"
 #include "core/game/ScoreAnalysis.h"
-#include "core/game/ScoreList.h"
 #include "platform/sqlite/SqliteDatabase.h"
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/support/TemporaryFolder.h"
@@ -61,7 +62,7 @@ class ScoredGame {
     Missions = std::make_unique<MissionList>(*RsScenarios, Strings, Boxes);
     Missions->FillMissionList();
     Members = std::make_unique<MemberLookup>(*RsMembers, Boxes);
-    analysis_ = std::make_unique<ScoreAnalysis>(game, Factors, *Missions, *Members, Strings, Board, Teams);
+    analysis_ = std::make_unique<ScoreAnalysis>(game, Factors, *Missions, *Members, Board, Teams);
   }
 
   Database& DbMembers() { return *dbMembers_; }
@@ -83,7 +84,7 @@ class ScoredGame {
   std::vector<std::string> Column(BoardColumn column) const {
     std::vector<std::string> cells;
     for (int place = 0; place < Board.RowCount(); ++place) {
-      cells.push_back(Board.RowAt(place).Cells[static_cast<std::size_t>(column)]);
+      cells.push_back(Texts.Cell(Board.RowAt(place), column));
     }
     return cells;
   }
@@ -92,19 +93,27 @@ class ScoredGame {
   std::vector<std::vector<std::string>> TeamCells() const { return CellsOf(Teams, TeamColumnCount); }
 
   std::string Cell(std::size_t row, BoardColumn column) const {
-    return Board.RowAt(static_cast<int>(row)).Cells[static_cast<std::size_t>(column)];
+    return Texts.Cell(Board.RowAt(static_cast<int>(row)), column);
   }
 
   TemporaryFolder Folder;
 
  private:
-  static std::vector<std::vector<std::string>> CellsOf(const ScoreList& list, int columns) {
+  std::vector<std::vector<std::string>> CellsOf(const ::Board& list, int columns) const {
     std::vector<std::vector<std::string>> cells;
     for (int place = 0; place < list.RowCount(); ++place) {
-      const auto& row = list.RowAt(place).Cells;
-      cells.emplace_back(row.begin(), row.begin() + columns);
+      std::vector<std::string>& row = cells.emplace_back();
+      for (int column = 0; column < columns; ++column) {
+        row.push_back(Texts.Cell(list.RowAt(place), static_cast<BoardColumn>(column)));
+      }
     }
     return cells;
+  }
+
+  static void Call(const std::function<void()>& function) {
+    if (function) {
+      function();
+    }
   }
 
   SqliteEngine engine_;
@@ -117,8 +126,11 @@ class ScoredGame {
   FakeMessageBoxes Boxes;
   Game game;
   SoldieringFactors Factors;
-  ScoreList Board;
-  ScoreList Teams;
+  BoardTexts Texts{game, Strings};
+  std::function<void()> BoardChanged;
+  std::function<void()> TeamsChanged;
+  ::Board Board{[this] { Call(BoardChanged); }};
+  ::Board Teams{[this] { Call(TeamsChanged); }};
   std::unique_ptr<Recordset> RsScenarios;
   std::unique_ptr<Recordset> RsMembers;
   std::unique_ptr<MissionList> Missions;

@@ -3,7 +3,7 @@
 #include <QApplication>
 #include <QTemporaryDir>
 
-/// Main program of tests that need the toolkit: no display, and no settings of this machine's user.
+/// Main program of the tests that need Qt: without a display and without the settings of this machine's user.
 int main(int argc, char** argv) {
   testing::InitGoogleTest(&argc, argv);
   const QTemporaryDir settings;

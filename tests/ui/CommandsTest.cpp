@@ -214,6 +214,14 @@ TEST_F(CommandTable, StopsACommandWhoseButtonTookTheFocusFromAnEntryThatKeepsIt)
   EXPECT_EQ(window.Log.size(), 3U);
 }
 
+TEST_F(CommandTable, LetsAnEntryKnowThatItIsLeftAlsoByAScreenReader) {
+  int finished = 0;
+  QObject::connect(&window.Entry, &QLineEdit::editingFinished, &window, [&] { ++finished; });
+  OnGo([&] { EXPECT_EQ(finished, 1); });
+  window.Go.click();
+  EXPECT_EQ(finished, 1);
+}
+
 TEST_F(CommandTable, AsksNoEntryAboutAPressThroughAScreenReader) {
   window.Table.EntriesHold = [] { return false; };
   OnGo([this] { window.LogOne(); });

@@ -173,6 +173,7 @@ TEST_F(CheckedEntries, LetNoOtherCommandRunUnderTheirBox) {
 TEST_F(CheckedEntries, AreNotAskedByAScreenReader) {
   window.First.setText(QStringLiteral("three"));
   window.Send.click();
+  EXPECT_TRUE(window.Send.hasFocus());
   QApplication::processEvents();
   EXPECT_EQ(window.Sent, 1);
   EXPECT_THAT(boxes.Boxes, IsEmpty());

@@ -1,13 +1,13 @@
 #!/usr/bin/python3
-"""Makes src/resources/score_card_default.doc, the template of the score sheets.
+"""Creates src/resources/score_card_default.doc, the template for the score sheets.
 
     tools/score_card/make_score_card.py src/resources/score_card_default.doc
 
 Needs LibreOffice Writer and its Python bridge (libreoffice-writer-nogui, python3-uno). The document is built from
-nothing, stored as "MS Word 97", opened again and checked; a file that breaks the contract with the sheet printing
-(bookmarks, number and size of the tables) is reported and the exit code is 1.
+scratch, saved as "MS Word 97", opened again and checked. If it lacks what the sheet printing relies on (bookmarks,
+number and size of the tables), that is reported and the exit code is 1.
 
-The hit tables must stay without merged cells: their rows 2 to 21 are written as one block.
+The hit tables must not have merged cells: their rows 2 to 21 are written as one block.
 """
 
 import os
@@ -41,14 +41,14 @@ STRIPE = 0xF3F5F8
 WHITE = 0xFFFFFF
 RED, BLUE, YELLOW = 0xD8343C, 0x2468D2, 0xF2B61C
 
-# A sheet lists 20 opponents in a column. Up to 40 are usual: the first two columns are wide enough for a full name on
-# one line, so that the sheet stays one page; the rest share what is left, in smaller print.
+# A column lists 20 opponents. Up to 40 are usual, so the first two columns are wide enough for a full name on one line,
+# which keeps the sheet to one page; the others share the remaining width, in smaller print.
 HIT_COLUMNS = [4900, 4900, 1560] + [848] * 8 + [856]
 WIDE_HIT_COLUMNS = 2
 HIT_ROWS = 21
 
-# The height of a line is fixed where a Chinese line would be higher than a Latin one and push the sheet onto a second
-# page; 0 leaves it to the font.
+# The line height is fixed where a Chinese line would be taller than a Latin one and push the sheet onto a second page;
+# 0 leaves it to the font.
 STYLES = {
     # name: (points, bold, colour, alignment, space above, space below, line height)
     "Card Banner": (13, True, WHITE, LEFT, 0, 0, 0),
@@ -80,14 +80,14 @@ def prop(name, value):
 
 
 def line(colour, width):
-    """Border line `width` wide; width 0 is none."""
+    """A border line of this width; 0 is no line."""
     result = BorderLine2()
     result.Color, result.LineWidth, result.OuterLineWidth = colour, width, width
     return result
 
 
 class Card:
-    """The document under construction; text goes to the end of the body or of a cell."""
+    """The document under construction; text is added at the end of the body or of a cell."""
 
     def __init__(self, document):
         self.document = document
@@ -124,7 +124,7 @@ class Card:
                 style.ParaLineSpacing = spacing
 
     def write(self, text, style, *parts):
-        """Writes into an empty last paragraph of `text`: labels, and pairs (bookmark, placeholder)."""
+        """Fills the empty last paragraph of `text` with labels and (bookmark, placeholder) pairs."""
         cursor = text.createTextCursor()
         cursor.gotoEnd(False)
         cursor.ParaStyleName = style
@@ -147,7 +147,7 @@ class Card:
         text.insertControlCharacter(cursor, PARAGRAPH_BREAK, False)
 
     def table(self, name, rows, widths):
-        """A table without lines at the end of the body, its cells in the middle of their height."""
+        """Adds a borderless table at the end of the body, with vertically centred cells."""
         table = self.document.createInstance("com.sun.star.text.TextTable")
         table.initialize(rows, len(widths))
         self.cursor.gotoEnd(False)
@@ -190,12 +190,12 @@ def add_banner(card):
 
 
 def spacer(card):
-    """The paragraph that has to stand between two tables, and behind the last."""
+    """Adds the paragraph required between two tables and after the last one."""
     card.write(card.body, "Card Gap")
 
 
 def add_player(card):
-    """Table 1: photograph, who the player is, and how the game ended."""
+    """Table 1: photograph, the player, and the result of the game."""
     table = card.table("Player", 1, [3600, 10400, 5000])
     photo, who, result = cells(table)
     for cell, colour in ((photo, RED), (who, BLUE), (result, YELLOW)):
@@ -222,7 +222,7 @@ def add_player(card):
 
 
 def add_figures(card, name, heading, style, figures):
-    """A heading, and a table with a figure for each (bookmark, label) above its label."""
+    """A heading, and a table with a figure above its label for each (bookmark, label) pair."""
     card.write(card.body, "Card Heading", heading)
     table = card.table(name, 2, [1] * len(figures))
     for column, (bookmark, label) in enumerate(figures):
@@ -271,7 +271,7 @@ def build(document):
 
 
 def faults(document):
-    """What a reopened template lacks, as texts."""
+    """Messages about what a reopened template lacks."""
     found = []
     names = set(document.Bookmarks.ElementNames)
     if names != BOOKMARKS:

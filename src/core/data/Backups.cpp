@@ -21,7 +21,7 @@ std::string NameIn(const std::string& path) {
   return file.substr(0, file.size() - Extension.size());
 }
 
-/// "YYYY-MM-DD HH:MM:SS" as part of a file's name, by which the copies sort.
+/// "YYYY-MM-DD HH:MM:SS" as part of a file name; the copies sort by it.
 std::string DateInName(std::string now) {
   std::replace(now.begin(), now.end(), ' ', '-');
   now.erase(std::remove(now.begin(), now.end(), ':'), now.end());
@@ -48,7 +48,7 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
   try {
     Copy(database, NameIn(path));
   } catch (const RuntimeError& error) {
-    // Of a file that another program has locked the change will fail as well; the next one tries again.
+    // Another program has locked the file, so the change itself will fail too; the next change tries again.
     if (error.Number() == Fault::DatabaseLocked) {
       return false;
     }

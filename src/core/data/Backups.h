@@ -7,19 +7,19 @@
 #include "platform/Database.h"
 #include "platform/Files.h"
 
-/// Copies of databases as they were before the first change of a run of the program, in a folder that is made
-/// when it is needed: "members-2026-11-21-201500.mdb" for "members.mdb". The last ten of each are kept. Has
-/// to outlive the databases that it guards.
+/// Copies of databases as they were before the program run's first change, in a folder that is created when
+/// needed: "members-2026-11-21-201500.mdb" for "members.mdb". The last ten of each are kept. Must outlive the
+/// databases that it guards.
 class Backups {
  public:
   Backups(std::string folder, Files& disk, const Clock& time, const StringTable& strings)
       : folder_(std::move(folder)), disk_(disk), time_(time), strings_(strings) {}
 
-  /// Has `database`, whose file is at `path` and ends in ".mdb", copied before its first change. A copy that
-  /// cannot be made does not hold up the change.
+  /// From now on copies `database`, whose file is at `path` and ends in ".mdb", before its first change. The
+  /// change goes ahead even if the copy fails.
   void Guard(Database& database, const std::string& path);
 
-  /// What the operator should know of a copy that could not be made; empty for nothing new.
+  /// Returns the operator's message about a copy that failed since the last call, or an empty text.
   std::string TakeFailure();
 
  private:

@@ -9,7 +9,7 @@
 /// Path of the user's data folder inside the application data folder.
 inline constexpr const char* UserDataSubfolder = "/Orvalin/Tessarine";
 
-/// Finds the user's data folder, makes it when absent, and puts the default copies there that are missing,
-/// telling the operator of each but the ini file. Returns the folder, without a separator at its end. Throws
-/// RuntimeError when the folder or a copy cannot be made.
+/// Finds or creates the user's data folder and copies missing default files into it, with a box for each
+/// except the ini file. Returns the folder, without a trailing separator. Throws RuntimeError if the folder
+/// or a copy cannot be created.
 std::string PrepareUserDataFolder(const Folders& folders, Files& files, MessageBoxes& boxes);

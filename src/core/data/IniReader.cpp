@@ -11,13 +11,13 @@
 
 namespace {
 
-/// The buffer of 255 bytes that callers have always passed, less its terminator.
+/// The 255-byte buffer that callers have always passed, less its terminator.
 constexpr std::size_t MostBytesOfValue = 254;
 
 constexpr std::string_view ByteOrderMark = "\xEF\xBB\xBF";
 
-/// Decoded name by name and value by value, since a value that this program writes into an old file is UTF-8
-/// among others that are not.
+/// Each name and value is decoded by itself, since the values that this program writes into an old file are
+/// UTF-8 among others in code page 1252.
 std::string Decoded(std::string_view bytes) {
   return IsUtf8(bytes) ? std::string(bytes) : Windows1252ToUtf8(bytes);
 }
@@ -39,16 +39,16 @@ std::string ShownValue(std::string_view bytes) {
   return value;
 }
 
-/// Walks over the lines of an ini file; offsets are those into its bytes.
+/// Iterates over the lines of an ini file. Offsets are into the file's bytes.
 class Lines {
  public:
   enum class Kind { Other, Section, Entry };
 
   Kind LineKind = Kind::Other;
   std::string_view Name;       ///< of the section or key
-  std::string_view Value;      ///< of an entry: all that stands behind the "="
+  std::string_view Value;      ///< of an entry: everything after the "="
   std::size_t ValueStart = 0;  ///< of an entry
-  std::size_t End = 0;         ///< where the line's own bytes end
+  std::size_t End = 0;         ///< where the line ends, without its line break
   std::size_t Next = 0;        ///< where the next line begins
 
   explicit Lines(std::string_view bytes)
@@ -87,8 +87,7 @@ std::string_view LineBreakOf(std::string_view bytes) {
   return first != std::string_view::npos && bytes.substr(first, 2) == "\r\n" ? "\r\n" : "\n";
 }
 
-/// `bytes` with the value of one key changed in its line, or the key added behind the last one of its
-/// section.
+/// `bytes` with the value of one key changed in place, or the key added after the last one of its section.
 std::string WithValue(std::string bytes, std::string_view section, std::string_view key,
                       std::string_view value) {
   std::optional<std::size_t> insertAt;
@@ -169,7 +168,7 @@ void IniReader::WriteIni(const std::string& section, const Values& values) {
     }
     files_.Replace(path_, bytes);
   } catch (const RuntimeError&) {
-    // Callers carry on with the value in memory; the file is as it was.
+    // Callers carry on with the value in memory; the file is unchanged.
     return;
   }
 }

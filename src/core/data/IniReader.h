@@ -7,9 +7,9 @@
 #include "core/data/SettingsTable.h"
 #include "platform/Files.h"
 
-/// Settings in an ini file, read and written key by key at the moment of use. Sections and keys are found in
-/// any case, the first one with a given name counts, and only ";" begins a comment. Texts are UTF-8; a value
-/// that is not is taken as code page 1252.
+/// Settings in an ini file, read and written key by key when used. Section and key names ignore case, the
+/// first one with a given name counts, and only ";" begins a comment. Texts are UTF-8; a value that is not
+/// valid UTF-8 is read as code page 1252.
 ///
 /// Not a library's reader, for none keeps these rules: the first of two keys counts, a value ends after 254
 /// bytes, names and values are decoded one by one, and a write leaves every other line as it is to the byte,
@@ -21,8 +21,9 @@ class IniReader {
   /// `files` must outlive the reader. The file at `path` need not exist.
   IniReader(Files& files, std::string path);
 
-  /// The value without blanks and without one pair of quotes around it, at most 254 bytes; `defaultText` as
-  /// it stands when the file, the section or the key is missing. Never throws on any content of the file.
+  /// The value without surrounding blanks and without one pair of quotes around it, at most 254 bytes;
+  /// `defaultText` unchanged if the file, the section or the key is missing. No content of the file makes it
+  /// throw.
   std::string ReadIni(const std::string& section, const std::string& key,
                       const std::string& defaultText) const;
 
@@ -31,11 +32,11 @@ class IniReader {
     return ReadIni(setting.Section, setting.Key, setting.Default);
   }
 
-  /// Keys and values of all parts of a section in the order of the file, each value as ReadIni gives it.
+  /// Keys and values of all sections with this name, in file order, each value as ReadIni returns it.
   Values ReadSection(const std::string& section) const;
 
-  /// Changes or adds one value; every other line stays as it is. When the file cannot be read or written, or
-  /// `value` has a line break, the file stays as it was and nothing is reported.
+  /// Changes or adds one value; every other line is left as it is. If the file cannot be read or written, or
+  /// `value` contains a line break, the file is left unchanged and nothing is reported.
   void WriteIni(const std::string& section, const std::string& key, const std::string& value);
 
   void WriteIni(const Setting& setting, const std::string& value) {

@@ -10,10 +10,10 @@
 
 namespace {
 
-/// No column is longer, whatever its length column says.
+/// Limit for an absurd value in the length column; no photo is longer.
 constexpr double LongestPhoto = std::numeric_limits<std::int32_t>::max();
 
-/// Bytes of the photo without padding; 0 also for a column that cannot be read.
+/// Bytes of the photo without padding; 0 also if the column cannot be read.
 std::size_t SizeOf(Recordset& recordset, const std::string& lengthColumn) {
   try {
     const double size = NumberOf(recordset.Fields(lengthColumn));
@@ -23,7 +23,7 @@ std::size_t SizeOf(Recordset& recordset, const std::string& lengthColumn) {
   }
 }
 
-/// One piece; empty when it cannot be read.
+/// One piece; empty if it cannot be read.
 Blob Piece(Recordset& recordset, const std::string& blobColumn, std::size_t offset, std::size_t count) {
   try {
     return recordset.GetChunk(blobColumn, offset, count);
@@ -39,7 +39,7 @@ bool WantsLargePhoto(MessageBoxes& boxes) {
                     "Photo Warning", BoxIcon::Question, BoxButtons::OkCancel) == BoxAnswer::Ok;
 }
 
-/// The photo file's bytes; empty when they are not to be stored.
+/// The photo file's bytes; empty if the operator declines or the file cannot be read.
 std::string BytesToStore(const std::string& path, const Files& files, MessageBoxes& boxes) {
   try {
     if (files.FileLen(path) > LargePhoto && !WantsLargePhoto(boxes)) {
@@ -103,7 +103,7 @@ bool ExportPhoto(Recordset& recordset, const std::string& blobColumn, const std:
   try {
     files.Write(path, bytes);
   } catch (const RuntimeError&) {
-    // The caller finds a short file, as with a column that cannot be read.
+    // The file is then missing or short, as after a column that cannot be read.
     return true;
   }
   return true;

@@ -3,8 +3,8 @@
 #include "platform/Database.h"
 #include "platform/RuntimeError.h"
 
-/// Walks from the first row to the end and does `act` on each, but for rows that another program has deleted
-/// since the recordset was opened.
+/// Calls `act` on each row from the first to the last, except rows that another program has deleted since the
+/// recordset was opened.
 template <typename Act>
 void ForEachRow(Recordset& rows, const Act& act) {
   for (rows.MoveFirst(); !rows.Eof(); rows.MoveNext()) {

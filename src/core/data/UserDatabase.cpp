@@ -49,7 +49,8 @@ std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const D
   std::string reason;
   try {
     if (parts.Old.IsOld(database.Path)) {
-      TellOfConversion(database, parts.Old.Convert(database.Path, database.Table, database.DefaultPath), parts);
+      TellOfConversion(database, parts.Old.Convert(database.Path, database.Table, database.DefaultPath),
+                       parts);
     }
     return Open(database.Path, parts);
   } catch (const RuntimeError& error) {

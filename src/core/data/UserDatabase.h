@@ -12,12 +12,12 @@
 
 /// One of the two databases in the user's data folder.
 struct UserDatabase {
-  std::string Path;         ///< of the file, ending in ".mdb"
-  std::string Table;        ///< the one that it is about
-  std::string DefaultPath;  ///< of the file that a new installation starts with
+  std::string Path;         ///< ends in ".mdb"
+  std::string Table;        ///< its main table, the one converted from an old file
+  std::string DefaultPath;  ///< the file that a new installation starts with
 };
 
-/// What is needed to open one.
+/// What OpenUserDatabase works with.
 struct DatabaseParts {
   DatabaseEngine& Engine;
   OldDatabases& Old;
@@ -27,9 +27,9 @@ struct DatabaseParts {
   const StringTable& Strings;
 };
 
-/// Opens a database, of which a backup copy will be made before its first change. A file of an old
-/// installation is converted first, which is told. One that cannot be read stays untouched: the operator is
-/// asked whether to go on with a fresh copy beside it, named "...-new.mdb", which is kept for the next such
-/// start. Returns nullptr when the operator chose to end the program. Throws RuntimeError as
-/// DatabaseEngine::OpenDatabase does for all but an unrecognized format.
+/// Opens a database and has it backed up before its first change. A file from an old installation is
+/// converted first, which a box reports. A file that cannot be read is left untouched: the operator is asked
+/// whether to go on with a fresh copy beside it, named "...-new.mdb", which later starts will use again.
+/// Returns nullptr if the operator chooses to end the program. Throws RuntimeError as
+/// DatabaseEngine::OpenDatabase does, except for an unrecognized format.
 std::unique_ptr<Database> OpenUserDatabase(const UserDatabase& database, const DatabaseParts& parts);

@@ -20,8 +20,8 @@ double Quotient(double sum, double count) {
   return sum / count;
 }
 
-/// Sets the figures of the current row, which is in edit mode, as they are with this player's game. Each one
-/// takes in those before it.
+/// Adds this player's game to the figures of the current row, which is in edit mode. Later figures use the
+/// new values of earlier ones.
 void AddFigures(Recordset& row, const Player& player, const Clock& clock) {
   const auto number = [&row](const char* column) { return NumberOf(row.Fields(column)); };
   const auto count = [&row](const char* column) {
@@ -50,24 +50,24 @@ class GameCommit {
   GameCommit(Game& game, Database& dbMembers, Recordset& rsMembers, MemberLookup& members, const Clock& clock)
       : game_(game), dbMembers_(dbMembers), rsMembers_(rsMembers), members_(members), clock_(clock) {}
 
-  /// Commits all players. Throws RuntimeError at the one that fails.
+  /// Commits all players. Throws RuntimeError at the first one that fails.
   void Run() {
     for (int index = 1; index <= PlayerCount; ++index) {
       if (!CommitTogether(index)) {
-        // Nothing of the group was written. One by one, those before the faulty row get in.
+        // Nothing of the group was written. One by one, the players before the faulty row still get in.
         for (; index <= PlayerCount; ++index) {
           CommitOne(index);
         }
       } else if (index <= PlayerCount) {
-        CommitOne(index);  // tells that the member is gone
+        CommitOne(index);  // shows the box that the member is gone
       }
     }
   }
 
  private:
-  /// Commits the players from `index` up to the first whose member is gone, which `index` then stands for. A
-  /// box about that must not hold up the disk, and so ends the group. Returns false when the database failed;
-  /// then nothing is written or marked, and `index` stands for the first of them.
+  /// Commits the players from `index` up to the first whose member is gone, and sets `index` to that one. The
+  /// group ends there since the box about it must not keep the file locked. Returns false if the database
+  /// failed; then nothing is written or marked, and `index` is the first player of the group.
   bool CommitTogether(int& index) {
     while (index <= PlayerCount && !IsDue(game_.Players(index))) {
       ++index;
@@ -103,11 +103,13 @@ class GameCommit {
 
   void CommitOne(int index) {
     const Player& player = game_.Players(index);
-    if (IsDue(player) && members_.LoadMember(player.MemberIndex)) {
+    if (IsDue(player) && members_.LoadMember(player.MemberIndex) &&
+        rsMembers_.WalkTo("ContactID", std::int64_t{player.MemberIndex})) {
       AddGame(index);
     }
   }
 
+  /// Adds a player's game to the member on whose row the cursor stands.
   void AddGame(int index) {
     rsMembers_.Edit();
     game_.Players(index).Committed = true;

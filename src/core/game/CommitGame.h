@@ -9,15 +9,15 @@
 enum class CommitResult {
   Committed,
   SomeWereAlready,  ///< players were left out because their game counts already
-  Failed            ///< the database refused a player; those before are committed, those behind are not
+  Failed            ///< the database refused a player; those before it are committed, those after it are not
 };
 
 /// Adds the game of each active player with a member to that member's lifetime figures, and marks the player
-/// `Committed`. A player whose member is gone is said in a box and left out. All rows that were written are
-/// durable on return, mostly after one wait for the disk. The player on whose row the database failed is
-/// marked although the row is the old one, so that a write of unknown outcome can never count twice.
+/// `Committed`. A player whose member is gone is reported in a box and left out. All rows written are durable
+/// on return, usually after a single wait for the disk. If the database fails on a player's row, the player
+/// is marked although the row is unchanged, so that a write of unknown outcome can never count twice.
 CommitResult CommitPlayers(Game& game, Database& dbMembers, Recordset& rsMembers, MemberLookup& members,
                            const Clock& clock);
 
-/// Tells the operator how it went.
+/// Shows the operator the result.
 void TellCommitResult(CommitResult result, MessageBoxes& boxes);

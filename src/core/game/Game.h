@@ -8,7 +8,7 @@
 #include "core/game/PlayerId.h"
 #include "core/text/StringTable.h"
 
-/// One gun's game. "Calculated" fields are written by the score analysis alone.
+/// One gun's game. Only the score analysis writes the "calculated" fields.
 struct Player {
   /// Damage this player took from player q; self-hits included.
   OneBased<std::int32_t, PlayerCount> HitByPlayer;
@@ -42,18 +42,18 @@ struct Player {
   std::int32_t StunCount = 0;
   std::uint8_t PowerCheatFlag = 0;
 
-  /// Back to an empty record; `AbsoluteDamage` and `Accuracy` stay, the score analysis rewrites them.
+  /// Empties the record, except `AbsoluteDamage` and `Accuracy`, which the score analysis rewrites.
   void Clear();
 };
 
-/// Who plays one of the mission's objective sets A, B, C, and what they achieved.
+/// The team that plays one of the mission's objective sets A, B, C, and what it achieved.
 struct ObjectiveTeam {
   std::string Name;  ///< one of `TeamNames`
   bool PrimaryAchieved = false;
   bool SecondaryAchieved = false;
 };
 
-/// The game on the board. The table of players always exists whole; who took no part is not `Active`.
+/// The game on the board. The table of players is always complete; those who took no part are not `Active`.
 struct Game {
   explicit Game(const StringTable& strings);
 
@@ -67,7 +67,7 @@ struct Game {
   /// True once a frame was decoded or a file loaded.
   bool DataPresent = false;
 
-  /// Forgets the players and the date. Team names and objective results stay for the next game.
+  /// Clears the players and the date. Team names and objective results stay for the next game.
   void Clear();
 
   /// Name of the team of the player at record `index`.

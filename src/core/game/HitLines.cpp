@@ -1,5 +1,7 @@
 #include "core/game/HitLines.h"
 
+#include <optional>
+
 #include "core/text/NumberForms.h"
 
 namespace {
@@ -31,9 +33,10 @@ std::vector<Hit> HitsTakenBy(int index, const Game& game) {
 std::string HitText(const std::string& playerName, const Hit& hit, const Game& game, MemberLookup& members,
                     bool useNickName) {
   std::string text = playerName + ": " + Str(hit.Amount);
-  const std::int32_t member = game.Players(hit.Index).MemberIndex;
-  if (member != 0 && members.LoadMember(member)) {
-    text += "  (" + members.GetPlayerName(useNickName) + ")";
+  if (const std::int32_t contactId = game.Players(hit.Index).MemberIndex; contactId != 0) {
+    if (const std::optional<Member> member = members.LoadMember(contactId)) {
+      text += "  (" + member->GetPlayerName(useNickName) + ")";
+    }
   }
   return text;
 }

@@ -7,24 +7,24 @@
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
 
-/// Damage between one player and another.
+/// Damage that a player dealt to, or took from, another one.
 struct Hit {
   int Index;            ///< record of the other player
   std::int32_t Amount;  ///< damage, above 0
 };
 
-/// What the player at record `index` did to each player, oneself included, by ascending record.
+/// The damage that the player at record `index` did to each player, themselves included, by ascending record.
 std::vector<Hit> HitsGivenBy(int index, const Game& game);
 
-/// What each player did to the player at record `index`.
+/// The damage that each player did to the player at record `index`.
 std::vector<Hit> HitsTakenBy(int index, const Game& game);
 
-/// A line of "who hit whom": `playerName`, damage, and for a member the name, as "Red  4:  40  (Mole)". A
-/// member who cannot be found is told in a box, and the line has no name.
+/// One line of the hit list: `playerName`, damage, and the name if the player is a member: "Red  4:  40
+/// (Mole)". If the member cannot be found, a box says so and the line has no name.
 std::string HitText(const std::string& playerName, const Hit& hit, const Game& game, MemberLookup& members,
                     bool useNickName);
 
-/// What hit a player without a shooter.
+/// Damage taken that has no shooter.
 struct SpecialHit {
   const char* Caption;  ///< "Explosive: " and the like
   std::int32_t Amount;  ///< above 0

@@ -3,12 +3,24 @@
 #include "core/data/FieldValue.h"
 #include "core/text/NumberForms.h"
 
-bool MemberLookup::LoadMember(std::int32_t contactId) {
-  if (rsMembers_.WalkTo("ContactID", std::int64_t{contactId})) {
-    return true;
+std::string Member::GetPlayerName(bool useNickName) const {
+  return useNickName && !NickName.empty() ? NickName : FirstName + " " + LastName;
+}
+
+std::optional<Member> MemberLookup::LoadMember(std::int32_t contactId) {
+  if (!rsMembers_.WalkTo("ContactID", std::int64_t{contactId})) {
+    boxes_.Show("Could not locate specified Member in database!", "Member Error", BoxIcon::Exclamation);
+    return std::nullopt;
   }
-  boxes_.Show("Could not locate specified Member in database!", "Member Error", BoxIcon::Exclamation);
-  return false;
+  const auto text = [this](const char* column) { return TextOf(rsMembers_.Fields(column)); };
+  return Member{contactId, text("FirstName"), text("LastName"), text("NickName")};
+}
+
+MemberHistory MemberLookup::LoadHistory(std::int32_t contactId) {
+  rsMembers_.WalkTo("ContactID", std::int64_t{contactId});
+  const auto number = [this](const char* column) { return NumberOf(rsMembers_.Fields(column)); };
+  return {TextOf(rsMembers_.Fields("Clan")), number("TotalGamesPlayed"), number("AveragePrimAccuracy"),
+          number("AverageDamage"), number("AverageSoldiering")};
 }
 
 std::int32_t MemberLookup::FindByDallasId(const std::string& dallasId) {
@@ -18,14 +30,4 @@ std::int32_t MemberLookup::FindByDallasId(const std::string& dallasId) {
   const std::int32_t contactId = RoundToInt32(NumberOf(rsMembers_.Fields("ContactID")));
   rsMembers_.MoveNext();
   return contactId;
-}
-
-std::string MemberLookup::GetPlayerName(bool useNickName) {
-  if (useNickName) {
-    std::string nickName = TextOf(rsMembers_.Fields("NickName"));
-    if (!nickName.empty()) {
-      return nickName;
-    }
-  }
-  return TextOf(rsMembers_.Fields("FirstName")) + " " + TextOf(rsMembers_.Fields("LastName"));
 }

@@ -8,8 +8,8 @@
 #include "platform/Database.h"
 #include "platform/MessageBoxes.h"
 
-/// The missions to play: "None", "Free For All", then the rows of the mission table; and which of them is
-/// active.
+/// The missions to choose from: "None", "Free For All", then the rows of the mission table; and the active
+/// one.
 class MissionList {
  public:
   struct Item {
@@ -23,7 +23,7 @@ class MissionList {
   MissionList(Recordset& rsScenarios, const StringTable& strings, MessageBoxes& boxes)
       : rsScenarios_(rsScenarios), strings_(strings), boxes_(boxes) {}
 
-  /// Reads the list anew. The active mission is "None" afterwards.
+  /// Reloads the list. The active mission is "None" afterwards.
   void FillMissionList();
 
   const std::vector<Item>& Items() const { return items_; }
@@ -31,11 +31,11 @@ class MissionList {
   int ListIndex() const { return listIndex_; }
   /// Text of the active entry.
   const std::string& Text() const;
-  /// Makes entry `index` (0 to the number of entries - 1, else RuntimeError 9) the active one.
+  /// Makes entry `index`, counted from 0, the active one. Throws RuntimeError 9 if there is no such entry.
   void Select(int index);
 
-  /// Moves the mission cursor to the active mission's row. False when the active entry is a fixed one, or
-  /// when the row is gone, which is said in a box.
+  /// Moves the mission cursor to the active mission's row. False if the active entry is one of the two fixed
+  /// ones, or if the row is gone, which a box reports.
   bool ActivateCurrentMissionRecord();
 
   Recordset& Row() { return rsScenarios_; }

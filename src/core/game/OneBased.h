@@ -5,7 +5,7 @@
 
 #include "platform/RuntimeError.h"
 
-/// A fixed table counted from 1 to `Size`. An index outside is RuntimeError 9.
+/// A fixed-size table indexed from 1 to `Size`. Any other index throws RuntimeError 9.
 template <typename Element, int Size>
 class OneBased {
  public:

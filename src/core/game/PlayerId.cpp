@@ -1,7 +1,5 @@
 #include "core/game/PlayerId.h"
 
-#include <algorithm>
-
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
@@ -78,12 +76,4 @@ std::int16_t TeamNumberFromName(const StringTable& texts, std::string_view name)
     }
   }
   return 0;
-}
-
-int IndexFromPlayerText(const StringTable& texts, std::string_view playerText) {
-  const std::string_view withoutName = playerText.substr(0, playerText.find(':'));
-  const std::size_t blank = std::min(withoutName.find(' '), withoutName.size());
-  const std::int16_t team = TeamNumberFromName(texts, withoutName.substr(0, blank));
-  const std::uint8_t number = ToByte(withoutName.substr(blank));
-  return IndexFromId(IdFromTeamAndNumber(static_cast<std::uint8_t>(team), number));
 }

@@ -15,8 +15,17 @@ void AddTo(std::int32_t& sum, std::int32_t amount) {
   }
 }
 
-/// Shooters stand in blocks of 32 that belong to one team each.
+/// Players stand in blocks of 32 that belong to one team each.
 constexpr int BlockSize = 32;
+constexpr int BlockCount = PlayerCount / BlockSize;
+
+std::array<int, BlockCount> TeamsOfBlocks() {
+  std::array<int, BlockCount> teams{};
+  for (int block = 0; block < BlockCount; ++block) {
+    teams[block] = TeamFromId(IdFromIndex(block * BlockSize + 1));
+  }
+  return teams;
+}
 
 /// Damage that each player dealt to foes and to the own team, by record index less 1.
 struct DealtDamage {
@@ -36,11 +45,18 @@ bool AddHits(std::int32_t* sums, const std::int32_t* hits) {
   return signs <= std::numeric_limits<std::int32_t>::max();
 }
 
+AccuracyKind KindOfAccuracy(const Player& player) {
+  if (player.PrimaryDamage == 0) {
+    return AccuracyKind::NoPrimaryDamage;
+  }
+  return player.ShotCount > 0 ? AccuracyKind::Known : AccuracyKind::NoShots;
+}
+
 }  // namespace
 
 void ScoreAnalysis::CalculateScores() {
-  scoreDisplay_.Clear();
-  teamScores_.Clear();
+  players_.Clear();
+  teams_.Clear();
   for (std::int32_t& total : game_.TeamTotals) {
     total = 0;
   }
@@ -52,8 +68,8 @@ void ScoreAnalysis::CalculateScores() {
     }
   }
   ListTeams();
-  SortListNumeric(scoreDisplay_, static_cast<int>(BoardColumn::Soldiering), true, game_);
-  SortListNumeric(teamScores_, static_cast<int>(BoardColumn::Soldiering), true, game_);
+  SortListNumeric(players_, BoardColumn::Soldiering, true, game_);
+  SortListNumeric(teams_, BoardColumn::Soldiering, true, game_);
 }
 
 void ScoreAnalysis::AddUpDamage() {
@@ -66,13 +82,16 @@ bool ScoreAnalysis::AddUpDamageAtOnce() {
   // Whole factors need no rounding, so the order of the hits does not matter unless a sum on the way could
   // leave the range.
   const bool isWhole = std::trunc(factors_.FriendlyFire) == factors_.FriendlyFire;
+  const bool countsFriendlyFire = missions_.ListIndex() != MissionList::FreeForAll;
+  const std::array<int, BlockCount> teams = TeamsOfBlocks();
   DealtDamage dealt;
   bool inRange = isWhole && std::abs(factors_.FriendlyFire) <= std::numeric_limits<std::int32_t>::max();
   for (int victim = 0; victim < PlayerCount && inRange; ++victim) {
     const std::int32_t* hits = &*game_.Players(victim + 1).HitByPlayer.begin();
-    for (int first = 0; first < PlayerCount; first += BlockSize) {
-      auto& sums = IsOwnTeamHit(victim + 1, first + 1) ? dealt.ToOwnTeam : dealt.ToFoes;
-      inRange &= AddHits(&sums[first], hits + first);
+    const int team = teams[victim / BlockSize];
+    for (int block = 0; block < BlockCount; ++block) {
+      auto& sums = countsFriendlyFire && teams[block] == team ? dealt.ToOwnTeam : dealt.ToFoes;
+      inRange &= AddHits(&sums[block * BlockSize], hits + block * BlockSize);
     }
   }
   const auto factor = inRange ? static_cast<std::int64_t>(factors_.FriendlyFire) : 0;
@@ -118,33 +137,34 @@ void ScoreAnalysis::ScorePlayer(int index) {
   Player& player = game_.Players(index);
   const int team = TeamFromId(IdFromIndex(index));
   // What may show a box comes before the row: a command given meanwhile can rebuild the lists.
-  std::string playerText = PlayerText(index);
+  std::string memberName = NameOfMember(player);
   CalculateAccuracy(player);
   CalculateSoldiering(player);
   AddMissionPoints(player, game_.TeamNames(team));
-  ScoreList::Row& row = scoreDisplay_.AddRow();
-  row.Cells[1] = std::move(playerText);
-  row.Cells[0] = Str(std::int32_t{player.Rank});
-  row.Cells[2] = Str(player.Soldiering);
-  row.Cells[3] = AccuracyText(player);
-  row.Cells[4] = Str(player.TotalDamage);
-  row.Cells[5] = Str(player.ShotCount);
-  row.Cells[6] = Str(player.HealCount);
-  row.Cells[7] = Str(player.DeathCount);
-  row.Cells[8] = Str(player.AmmoAddCount);
+  players_.AddRow({.Index = index,
+                   .Team = team,
+                   .Rank = player.Rank,
+                   .MemberName = std::move(memberName),
+                   .Soldiering = player.Soldiering,
+                   .HasAccuracy = KindOfAccuracy(player),
+                   .Accuracy = player.Accuracy,
+                   .Damage = player.TotalDamage,
+                   .ShotsFired = player.ShotCount,
+                   .Wia = player.HealCount,
+                   .Kia = player.DeathCount,
+                   .AmmoAdds = player.AmmoAddCount});
   AddTo(game_.TeamTotals(team), player.Soldiering);
 }
 
-std::string ScoreAnalysis::PlayerText(int index) {
-  Player& player = game_.Players(index);
+std::string ScoreAnalysis::NameOfMember(Player& player) {
   if (player.MemberIndex == 0 && player.DallasID != NoDallasId) {
     player.MemberIndex = members_.FindByDallasId(player.DallasID);
   }
-  std::string text = game_.DisplayName(index);
-  if (player.MemberIndex != 0 && members_.LoadMember(player.MemberIndex)) {
-    text += ": " + members_.GetPlayerName(true);
+  if (player.MemberIndex == 0) {
+    return {};
   }
-  return text;
+  const std::optional<Member> member = members_.LoadMember(player.MemberIndex);
+  return member ? member->GetPlayerName(true) : std::string();
 }
 
 void ScoreAnalysis::CalculateAccuracy(Player& player) const {
@@ -175,7 +195,9 @@ void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName
     missionPoints_ = ReadMissionPoints();
   }
   const auto add = [&player](long double points) {
-    player.Soldiering = RoundToInt32(player.Soldiering + points);
+    if (points != 0) {
+      player.Soldiering = RoundToInt32(player.Soldiering + points);
+    }
   };
   for (int set = 0; set < TeamCount; ++set) {
     const ObjectiveTeam& objective = game_.ObjectiveTeams(set + 1);
@@ -206,18 +228,8 @@ ScoreAnalysis::MissionPoints ScoreAnalysis::ReadMissionPoints() {
   return points;
 }
 
-std::string ScoreAnalysis::AccuracyText(const Player& player) const {
-  if (player.PrimaryDamage == 0) {
-    return strings_.Text(126);
-  }
-  return player.ShotCount > 0 ? FormatPercent(player.Accuracy) : strings_.Text(129);
-}
-
 void ScoreAnalysis::ListTeams() {
   for (int team = 1; team <= TeamCount; ++team) {
-    ScoreList::Row& row = teamScores_.AddRow();
-    row.Cells[0] = Str(0);
-    row.Cells[1] = game_.TeamNames(team);
-    row.Cells[2] = Str(game_.TeamTotals(team));
+    teams_.AddRow({.Team = team, .Soldiering = game_.TeamTotals(team)});
   }
 }

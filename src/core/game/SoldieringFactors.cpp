@@ -10,7 +10,7 @@ struct FactorSetting {
   double SoldieringFactors::*Factor;
 };
 
-/// In the order in which they are written.
+/// In the order in which they are written to the file.
 constexpr std::array<FactorSetting, 6> FactorSettings = {{
     {Keys::TotalDamage, &SoldieringFactors::Damage},
     {Keys::Respawns, &SoldieringFactors::Death},

@@ -4,8 +4,8 @@
 #include "core/data/SettingsTable.h"
 #include "core/text/NumberForms.h"
 
-/// What one point of each quantity adds to a player's soldiering score; FriendlyFire weighs damage to the own
-/// team.
+/// What one unit of each quantity adds to a player's soldiering score. FriendlyFire weights damage done to
+/// one's own team.
 struct SoldieringFactors {
   double Damage = ToDouble(Keys::TotalDamage.Default);
   double Death = ToDouble(Keys::Respawns.Default);
@@ -15,9 +15,9 @@ struct SoldieringFactors {
   double FriendlyFire = ToDouble(Keys::FriendlyFire.Default);
 };
 
-/// A missing key gives its default. Throws RuntimeError 13 for a text that is no
-/// number, 6 for a number that is too large.
+/// A missing key has its default. Throws RuntimeError 13 for a text that is not a number, 6 for a number that
+/// is too large.
 SoldieringFactors ReadSoldieringFactors(const IniReader& ini);
 
-/// Writes all six factors in one replacement of the file; failure is not reported.
+/// Writes all six factors, replacing the file once; a failure is not reported.
 void WriteSoldieringFactors(IniReader& ini, const SoldieringFactors& factors);

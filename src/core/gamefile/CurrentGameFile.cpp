@@ -7,7 +7,7 @@ namespace {
 
 constexpr const char* Filter = "XML Files & (*.xml) |*.xml";
 
-/// The file's bytes; none when it cannot be read, which is no game file either.
+/// The file's bytes; empty if it cannot be read, which then fails like any file that is not a game file.
 std::string ReadOrNothing(const Files& files, const std::string& path) {
   try {
     return files.Read(path);
@@ -18,11 +18,13 @@ std::string ReadOrNothing(const Files& files, const std::string& path) {
 
 }  // namespace
 
-void CurrentGameFile::SaveGame(const Game& game, const std::string& missionName) {
+bool CurrentGameFile::SaveGame(const Game& game, const std::string& missionName) {
   fileName_ = dialog_.ShowSave({.Filter = Filter, .Name = fileName_}).value_or(fileName_);
-  if (!fileName_.empty()) {
-    files_.Replace(fileName_, WriteGameFile(game, missionName));
+  if (fileName_.empty()) {
+    return false;
   }
+  files_.Replace(fileName_, WriteGameFile(game, missionName));
+  return true;
 }
 
 bool CurrentGameFile::AskForGame() {

@@ -8,21 +8,22 @@
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
 
-/// The file that Load Game and Save Game were last about, whose name both keep for the next time.
+/// The file last used by Load Game and Save Game, which both remember its name.
 class CurrentGameFile {
  public:
   CurrentGameFile(FileDialog& dialog, Files& files, MessageBoxes& boxes)
       : dialog_(dialog), files_(files), boxes_(boxes) {}
 
-  /// Asks for a name and saves there, replacing the file. Cancel saves under the name of the last load or
-  /// save, and does nothing when there is none. A failure throws RuntimeError and leaves the old file.
-  void SaveGame(const Game& game, const std::string& missionName);
+  /// Asks for a name and saves there, replacing an existing file. Cancel saves under the name of the last
+  /// load or save, if there was one. Returns true if the game was saved. A failure throws RuntimeError and
+  /// leaves the old file.
+  bool SaveGame(const Game& game, const std::string& missionName);
 
-  /// Asks for a game to load. False when the operator cancels, which also forgets the file.
+  /// Asks for a game to load. Returns false, and forgets the file, if the operator cancels.
   bool AskForGame();
 
-  /// Reads the chosen file into the cleared `game`. Returns false after a box when it is no game file;
-  /// otherwise as ReadGameFile does.
+  /// Reads the chosen file into `game`, which the caller has cleared. If it is not a game file, shows a box
+  /// and returns false. Otherwise behaves like ReadGameFile.
   bool LoadGame(Game& game, const std::function<void(const std::string&)>& selectMission);
 
  private:

@@ -10,7 +10,7 @@
 
 namespace {
 
-/// Text of the first child element `name`, comments left out, or `fallback` when there is none.
+/// Text of the first child element `name`, without comments, or `fallback` if there is none.
 std::string GetChildText(pugi::xml_node node, const char* name, const char* fallback) {
   const pugi::xml_node child = node.child(name);
   if (!child) {
@@ -22,7 +22,8 @@ std::string GetChildText(pugi::xml_node node, const char* name, const char* fall
       text += part.value();
     }
   }
-  // Also for the sake of the next save: a reference such as "&#xD800;" gives bytes that are no character.
+  // Besides old encodings this repairs references such as "&#xD800;", whose bytes are not UTF-8 and would
+  // spoil the next save.
   return IsUtf8(text) ? text : Windows1252ToUtf8(text);
 }
 
@@ -34,7 +35,7 @@ bool GetFlag(pugi::xml_node node, const char* name, const char* fallback) {
   return ToDouble(GetChildText(node, name, fallback)) == 1;
 }
 
-/// True for a document of one element, with nothing but comments and the like around it.
+/// True for a document with one root element and no text beside it.
 bool IsWellFormed(const pugi::xml_document& document) {
   int elements = 0;
   for (const pugi::xml_node node : document.children()) {
@@ -47,9 +48,10 @@ bool IsWellFormed(const pugi::xml_document& document) {
   return elements == 1;
 }
 
-/// Parses in place. The document refers to `bytes` from then on.
+/// Parses in place: the document points into `bytes`.
 bool Parse(std::string& bytes, pugi::xml_document& document) {
-  // A leaf's text lies in its element: a hit is then 4 nodes instead of 7, of up to 50,176 hits.
+  // embed_pcdata keeps a leaf's text in its element: a hit takes 4 nodes instead of 7, and a game can hold
+  // 50,176 hits.
   constexpr unsigned int options =
       pugi::parse_default | pugi::parse_ws_pcdata_single | pugi::parse_fragment | pugi::parse_embed_pcdata;
   const bool isWide = bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF");
@@ -61,8 +63,9 @@ bool Parse(std::string& bytes, pugi::xml_document& document) {
          IsWellFormed(document);
 }
 
-/// The "Player" elements of a file as far as its text tells. The tree of a full game takes several times the
-/// memory of its text, so players are parsed one by one where that gives the same.
+/// The "Player" elements of a file, as far as a plain text search can find them. The tree of a full game
+/// takes several times the memory of its text, so players are parsed one by one where that gives the same
+/// result.
 std::vector<std::string_view> CutPlayers(std::string_view bytes) {
   constexpr std::string_view start = "<Player>";
   constexpr std::string_view end = "</Player>";
@@ -80,14 +83,14 @@ std::vector<std::string_view> CutPlayers(std::string_view bytes) {
   return players;
 }
 
-/// Parses one of CutPlayers. `text` is its work space.
+/// Parses one of the texts from CutPlayers, with `text` as work space.
 bool ParsePlayer(std::string_view player, std::string& text, pugi::xml_document& document) {
   text = player;
   return Parse(text, document) && document.child("Player");
 }
 
-/// Parses what is around the players. Returns false unless they are, one by one, what the whole tree would
-/// hold.
+/// Parses the file without its players. Returns false unless parsing these one by one gives the same players
+/// as the whole tree would.
 bool ParseAround(std::string_view bytes, const std::vector<std::string_view>& players, std::string& text,
                  pugi::xml_document& document) {
   if (players.empty()) {
@@ -151,7 +154,7 @@ void ReadFields(pugi::xml_node node, Player& player) {
   player.BonusPoints = GetNumber(node, "BonusPoints");
 }
 
-/// Reads every hit of every "HitData" at any depth below a player.
+/// Reads the hits of every "HitData" element at any depth below a player.
 struct HitReader : pugi::xml_tree_walker {
   explicit HitReader(Player& target) : Target(target) {}
 

@@ -5,8 +5,8 @@
 
 namespace {
 
-/// Builds the text of a file whose tree is always the same: leaves indented on lines of their own, containers
-/// without any white space around them.
+/// Builds the file's text: leaves indented, each on its own line; containers without any white space around
+/// their tags.
 class TreeWriter {
  public:
   std::string Bytes;
@@ -49,7 +49,7 @@ class TreeWriter {
           break;
         default:
           Bytes += "&#13;";
-          break;  // a reader would make a plain line feed of it
+          break;  // XML readers turn a literal carriage return into a line feed
       }
       text.remove_prefix(plain + 1);
     }

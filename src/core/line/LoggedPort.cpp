@@ -53,12 +53,20 @@ void LoggedPort::Open(const std::string& device, const std::string& settings) {
   try {
     port_.Open(device, settings);
     log_->Note("opened " + line, parts_.Time.Now());
+    TellOpening(device, settings, 0);
   } catch (const RuntimeError& fault) {
     log_->Note("not opened " + line + ": " + TextOf(fault), parts_.Time.Now());
+    TellOpening(device, settings, fault.Number());
     if (!wasOpen) {
       log_->End();
     }
     throw;
+  }
+}
+
+void LoggedPort::TellOpening(const std::string& device, const std::string& settings, int fault) const {
+  if (parts_.OnOpening) {
+    parts_.OnOpening(device, settings, fault);
   }
 }
 

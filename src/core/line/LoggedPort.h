@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <map>
 #include <string>
 
@@ -21,6 +22,8 @@ class LoggedPort final : public SerialPort {
     std::string Folder;  ///< of the logs; made when needed, but not the one above it
     const MonotonicClock& Elapsed;
     const Clock& Time;
+    /// Called after each try to open the line; `fault` is 0 or the number of what went wrong. May be empty.
+    std::function<void(const std::string& device, const std::string& settings, int fault)> OnOpening = {};
   };
 
   /// `port` must outlive this object. `instrument` is at its far end until told otherwise.
@@ -43,6 +46,7 @@ class LoggedPort final : public SerialPort {
   auto Logged(const Operation& operation);
   Transcript& TranscriptOf(const std::string& instrument);
   void NoteFault(const RuntimeError& fault);
+  void TellOpening(const std::string& device, const std::string& settings, int fault) const;
   void LogUnread();
 
   SerialPort& port_;

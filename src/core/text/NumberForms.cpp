@@ -14,7 +14,7 @@
 
 namespace {
 
-/// Beyond this the number form of a double rounds up to a text that is out of range.
+/// Above this, a double's number form rounds up to a text that no double can hold.
 constexpr double LargestReadable = 1.79769313486231E+308;
 
 std::size_t EndOfDigits(std::string_view text, std::size_t at) {
@@ -24,8 +24,8 @@ std::size_t EndOfDigits(std::string_view text, std::size_t at) {
   return at;
 }
 
-/// Length of the number that `text` begins with: sign, digits with at most one point, exponent; 0 when there
-/// is none.
+/// Length of the number at the start of `text`: sign, digits with at most one point, exponent; 0 if there is
+/// none.
 std::size_t LengthOfNumber(std::string_view text) {
   const auto isSign = [text](std::size_t at) {
     return at < text.size() && (text[at] == '+' || text[at] == '-');
@@ -51,8 +51,8 @@ std::size_t LengthOfNumber(std::string_view text) {
   return end;
 }
 
-/// True when the number in `text`, which no double can hold, is too large and not too small. Only the place
-/// of its first digit above 0 counts: a power of ten is far from 0 in both cases.
+/// For a number in `text` that no double can hold: true if it is too large, false if too small. The power of
+/// ten of its first non-zero digit decides, being far from 0 in both cases.
 bool IsTooLarge(std::string_view text) {
   const std::size_t letterE = std::min(text.find_first_of("Ee"), text.size());
   const std::string_view mantissa = text.substr(0, letterE);
@@ -72,13 +72,13 @@ bool IsTooLarge(std::string_view text) {
   return point - firstDigit + (negative ? -exponent : exponent) > 0;
 }
 
-/// Value of a text that is wholly a number: an infinity when it is too large, 0 when too small.
+/// Value of a text that is a number as a whole: an infinity if too large, 0 if too small.
 double ValueOfNumber(std::string_view text) {
   if (text.starts_with('+')) {
     text.remove_prefix(1);
   }
   constexpr std::size_t exactDigits = 15;
-  if (text.size() <= exactDigits) {  // the usual case, and several times faster
+  if (text.size() <= exactDigits) {  // usually an integer, which parses several times faster
     long long whole = 0;
     if (std::from_chars(text.data(), text.data() + text.size(), whole).ptr == text.data() + text.size()) {
       return static_cast<double>(whole);
@@ -92,8 +92,8 @@ double ValueOfNumber(std::string_view text) {
   if (!IsTooLarge(text)) {
     return 0;
   }
-  constexpr double Infinity = std::numeric_limits<double>::infinity();
-  return text.starts_with('-') ? -Infinity : Infinity;
+  constexpr double infinity = std::numeric_limits<double>::infinity();
+  return text.starts_with('-') ? -infinity : infinity;
 }
 
 void RequireFinite(double value) {
@@ -102,7 +102,7 @@ void RequireFinite(double value) {
   }
 }
 
-/// Counts the last digit of a decimal text up, with carry: "-1.99" becomes "-2.00".
+/// Increments the last digit of a decimal text, with carry: "-1.99" becomes "-2.00".
 void AddOneToLastDigit(std::string& number) {
   for (std::size_t at = number.size(); at > 0 && number[at - 1] != '-'; --at) {
     char& digit = number[at - 1];
@@ -134,14 +134,14 @@ std::string HundredthsAsPercent(long long hundredths) {
 
 template <typename Float>
 std::string NumberForm(Float value) {
-  constexpr int MostDigits = std::is_same_v<Float, float> ? 7 : 15;
+  constexpr int mostDigits = std::is_same_v<Float, float> ? 7 : 15;
   RequireFinite(value);
   if (value == 0) {
     return " 0";
   }
   std::array<char, 32> buffer{};
   const auto written = std::to_chars(buffer.data(), buffer.data() + buffer.size(), std::abs(value),
-                                     std::chars_format::scientific, MostDigits - 1);
+                                     std::chars_format::scientific, mostDigits - 1);
   const std::string_view shown(buffer.data(), static_cast<std::size_t>(written.ptr - buffer.data()));
   const std::size_t letterE = shown.find('e');
   const std::string exponentText(shown.substr(letterE + 1));
@@ -152,7 +152,7 @@ std::string NumberForm(Float value) {
   digits.erase(digits.find_last_not_of('0') + 1);
 
   const std::string sign(value < 0 ? "-" : " ");
-  if (exponent < -4 || exponent >= MostDigits) {
+  if (exponent < -4 || exponent >= mostDigits) {
     return sign + digits.substr(0, 1) + (digits.size() > 1 ? "." : "") + digits.substr(1) + "E" +
            exponentText;
   }
@@ -210,7 +210,7 @@ double Val(std::string_view text) {
   std::string dense;
   const std::size_t next = text.find_first_not_of("0123456789+-.Ee");
   if (next != std::string_view::npos && IsWhiteSpace(text[next])) {
-    // Blanks between its parts do not end a number.
+    // Blanks within a number do not end it.
     std::copy_if(text.begin(), text.end(), std::back_inserter(dense),
                  [](char letter) { return !IsWhiteSpace(letter); });
     text = dense;
@@ -286,9 +286,9 @@ double Round2(double value) {
 
 std::string FormatPercent(double value) {
   constexpr double mostPercent = 1e9;
-  if (std::abs(value) < mostPercent && static_cast<float>(value) == value) {
-    // Ten thousand times a float is exact in a double, and so is the tie.
-    return HundredthsAsPercent(std::llround(value * 10'000));
+  const auto single = static_cast<float>(value);
+  if (std::abs(value) < mostPercent && single == value) {
+    return HundredthsAsPercent(static_cast<long long>(PercentHundredths(single)));
   }
   std::string text = FormatFixed(value, 4);
   const std::size_t point = text.find('.');
@@ -304,13 +304,19 @@ std::string RunTimeText(std::int32_t minutes) {
   return Str(hours) + "H " + Str(minutes - hours * 60) + "M";
 }
 
+double PercentHundredths(float value) {
+  // Ten thousand times a float is exact in a double, and so is the tie.
+  return std::round(double{value} * 10'000);
+}
+
 std::string FormatFixed(double value, int decimals) {
   RequireFinite(value);
-  // A tie is an odd multiple of half the last decimal, which for a binary fraction means an odd multiple of
-  // 1 / 2^(decimals + 1). The conversion would take it to the even digit; with one more decimal it is exact.
+  // A tie is an odd multiple of half the last decimal place; for a binary fraction, of 1 / 2^(decimals + 1).
+  // to_chars would round it to the even digit, so it is written exactly, with one more decimal, and then
+  // rounded up.
   const bool tie = std::abs(std::fmod(std::ldexp(value, decimals + 1), 2)) == 1;
-  constexpr int MostBeforeDecimals = 312;
-  std::string text(static_cast<std::size_t>(MostBeforeDecimals + decimals), '\0');
+  constexpr int mostBeforeDecimals = 312;
+  std::string text(static_cast<std::size_t>(mostBeforeDecimals + decimals), '\0');
   const auto written = std::to_chars(text.data(), text.data() + text.size(), value, std::chars_format::fixed,
                                      tie ? decimals + 1 : decimals);
   text.resize(static_cast<std::size_t>(written.ptr - text.data()));

@@ -9,8 +9,8 @@
 /// Languages of the string table.
 enum class Language { English = 1033, SimplifiedChinese = 2052 };
 
-/// Language for a locale name as "zh_CN", "zh-Hans" or "de_DE.UTF-8": Chinese for "zh" in any case, English
-/// for all others.
+/// Language for a locale name such as "zh_CN", "zh-Hans" or "de_DE.UTF-8": Chinese for "zh" in upper or lower
+/// case, English for all others.
 Language LanguageOf(std::string_view localeName);
 
 /// Captions and messages by number, in one language.

@@ -9,18 +9,18 @@
 
 namespace {
 
-/// Unicode of the bytes 0x80 to 0x9F.
+/// Code points of the bytes 0x80 to 0x9F.
 constexpr std::array<std::uint16_t, 32> Windows1252High = {
     0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
     0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
     0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178};
 
 std::size_t LengthOfAsciiRun(std::string_view text, std::size_t from) {
-  constexpr std::uint64_t HighBits = 0x8080808080808080U;
+  constexpr std::uint64_t highBits = 0x8080808080808080U;
   std::size_t at = from;
   for (std::uint64_t eight = 0; at + sizeof eight <= text.size(); at += sizeof eight) {
     std::memcpy(&eight, text.data() + at, sizeof eight);
-    if ((eight & HighBits) != 0) {
+    if ((eight & highBits) != 0) {
       break;
     }
   }

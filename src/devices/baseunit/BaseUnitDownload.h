@@ -5,8 +5,8 @@
 #include <optional>
 #include <string>
 
-#include "core/game/FrameDecoder.h"
 #include "core/game/Game.h"
+#include "core/game/ScoreFrame.h"
 #include "core/line/CommPort.h"
 #include "core/line/SerialJob.h"
 #include "platform/Clock.h"

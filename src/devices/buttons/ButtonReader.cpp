@@ -51,7 +51,7 @@ void ButtonReader::EndFailedPoll() {
   try {
     poll_.End();
   } catch (const std::exception&) {
-    // The same failure once more; the operator is told of it by the caller.
+    // The same failure again, which the caller reports.
     return;
   }
 }

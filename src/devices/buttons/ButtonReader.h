@@ -15,14 +15,14 @@ class ButtonReader {
   /// Forgets the last button and waits for the next one.
   void Activate();
 
-  /// The coming tick is the last one; a button that it reads still counts.
+  /// Makes the next tick the last one; a button that it reads still counts.
   void Cancel() { finished_ = true; }
 
-  /// Looks once for a button. The operator is told of one that was read, of a reader that does not answer and
-  /// of a driver that fails. True while there is more to wait for.
+  /// Looks once for a button. Boxes report a button that was read, a reader that does not answer and a
+  /// failing driver. Returns true while there is more to wait for.
   bool Tick();
 
-  /// The button that was read; NoDallasId without one.
+  /// The button that was read, or NoDallasId.
   const std::string& DallasID() const { return dallasId_; }
 
  private:

@@ -12,8 +12,8 @@ namespace Ui {
 class ButtonSwipe;
 }
 
-/// Asks for a membership button and goes as soon as one was read. Cancel, Escape and the close box let it go
-/// at the end of the next look at the reader.
+/// Asks for a membership button and closes as soon as one has been read. After Cancel, Escape or the close
+/// box it polls the reader once more and then closes.
 class ButtonSwipe : public QDialog {
   Q_OBJECT
 
@@ -22,7 +22,7 @@ class ButtonSwipe : public QDialog {
   ButtonSwipe(OneWire& wire, MessageBoxes& boxes, const StringTable& strings, QWidget* parent);
   ~ButtonSwipe() override;
 
-  /// The button that was read since the window last came up; NoDallasId without one.
+  /// The button read since the window was last opened, or NoDallasId.
   const std::string& DallasID() const { return reader_.DallasID(); }
 
   void reject() override;

@@ -3,14 +3,13 @@
 namespace {
 
 constexpr std::uint8_t DataMode = 0xE1;     // not answered
-constexpr std::uint8_t CommandMode = 0xE3;  // not answered; as data it is sent twice
+constexpr std::uint8_t CommandMode = 0xE3;  // not answered; sent twice when it is data
 constexpr std::uint8_t ResetBus = 0xC1;
 constexpr std::uint8_t AcceleratorOn = 0xB1;   // not answered
 constexpr std::uint8_t AcceleratorOff = 0xA1;  // not answered
-constexpr std::uint8_t SearchRom = 0xF0;       // a command of the devices on the bus
+constexpr std::uint8_t SearchRom = 0xF0;       // a command to the devices on the bus
 
-/// The answer to a reset: two ones, one bit that may be either, chip version 011, and two bits for the
-/// result.
+/// The answer to a reset, from the highest bit: 11, one undefined bit, chip version 011, two bits of result.
 constexpr std::uint8_t ResetAnswerMask = 0xDC;
 constexpr std::uint8_t ResetAnswer = 0xCC;
 
@@ -20,17 +19,16 @@ Presence PresenceOf(std::uint8_t resetAnswer) {
       return Presence::Shorted;
     case 3:
       return Presence::None;
-    default:  // 1 for devices, 2 when one of them has an alarm
+    default:  // 1: devices present, 2: one of them in alarm
       return Presence::Devices;
   }
 }
 
 }  // namespace
 
-// The first reset after power-on only sets the chip's clock and is not answered, and another one can get lost
-// while an adapter that lives on the line's control signals is still charging. A session that was cut short
-// may have left data mode or the accelerator on; both take the reset for data and answer it with something
-// else.
+// The first reset after power-on only calibrates the chip's timing and is not answered, and another can get
+// lost while an adapter powered from the control signals is still charging. An interrupted session may have
+// left data mode or the accelerator on; either takes the reset for data and gives a different answer.
 bool Ds2480b::Detect() {
   for (const std::chrono::milliseconds limit : {AnswerLimit, AnswerLimit, LastLimit}) {
     port_.Output(ResetBus);
@@ -59,8 +57,8 @@ Presence Ds2480b::Reset() {
   return lost_ ? Presence::None : presence_;
 }
 
-// Sent in one go: the line at 9600 baud is slower than the bus, so the chip has done with each byte when the
-// next one arrives, and one wait is enough for all answers.
+// All bytes are sent in one go: a 9600-baud line is slower than the bus, so the chip has finished each byte
+// when the next one arrives, and one wait is enough for all answers.
 std::optional<SearchBlock> Ds2480b::Search(const SearchBlock& path) {
   SendData(SearchRom);
   SendCommand(AcceleratorOn);

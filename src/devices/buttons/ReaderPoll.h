@@ -4,20 +4,20 @@
 
 #include "platform/OneWire.h"
 
-/// What a step along the bus came to. A bad read leaves open who is on the bus.
+/// Result of one step of the search. After a bad read it is unknown what is on the bus.
 enum class BusStep { Device, End, BadRead };
 
-/// How a window polls the reader: one session for each tick of its timer, and nothing held between two ticks
-/// but the place in the walk along the bus. Throws what the driver throws.
+/// Polls the reader for a window: one session per tick of its timer. Between ticks only the position in the
+/// search of the bus is kept. Throws what the driver throws.
 class ReaderPoll {
  public:
   /// `wire` must outlive this object.
   explicit ReaderPoll(OneWire& wire) : wire_(wire) {}
 
-  /// Begins a session on the default adapter. False when it cannot begin. End() is due in either case.
+  /// Begins a session on the default adapter; false if that fails. Call End() in either case.
   bool Begin();
 
-  /// Goes on to the next device. Behind anything but a device the next step begins at the first one.
+  /// Moves on to the next device. After any other result the next call starts again at the first one.
   BusStep Next();
 
   /// ROM number of that device, family code first.

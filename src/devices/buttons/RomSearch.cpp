@@ -6,7 +6,7 @@ namespace {
 
 constexpr int BitCount = 64;
 
-/// Place of the pair for a ROM's bit.
+/// Where the pair for one bit of the ROM is.
 struct Pair {
   explicit Pair(int bit)
       : Byte(static_cast<std::size_t>(bit / 4)),

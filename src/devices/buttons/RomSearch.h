@@ -5,21 +5,21 @@
 
 #include "platform/OneWire.h"
 
-/// One pass of the chip's search accelerator: two bits for each of the ROM's 64, the first one lowest. The
-/// upper bit of a pair is the path, asked for or taken; the lower one of an answer tells that devices
-/// differed there or that none was left. Source: data sheet of the DS2480B, "Search accelerator operation".
+/// One pass of the chip's search accelerator: a pair of bits for each of the ROM's 64, lowest first. The
+/// upper bit of a pair is the path, requested or taken; the lower one, in an answer, is set where devices
+/// differed or none was left. Source: DS2480B data sheet, "Search accelerator operation".
 using SearchBlock = std::array<std::uint8_t, 16>;
 
-/// The path to the device behind the one that `state` stands on, or to the first one.
+/// The path to the device after the one in `state`, or to the first one.
 SearchBlock PathToNext(const OneWireState& state);
 
-/// Puts `state` on the device that the chip found along the path to the next one. False, and a new walk, when
-/// the bytes are no ROM number (wrong CRC, or no family: a bus that is shorted reads as zeros, whose CRC is
-/// right), or when the chip went another way than it was asked where devices differed.
+/// Sets `state` to the device that the chip found along the path to the next one. Returns false, and restarts
+/// the search, if the bytes are not a ROM number (wrong CRC, or family 0: a shorted bus reads as zeros, whose
+/// CRC is right), or if the chip did not follow the requested path where devices differed.
 bool TakeFound(const SearchBlock& answer, OneWireState& state);
 
 /// The path to the device with this number.
 SearchBlock PathTo(const std::array<std::uint8_t, 8>& rom);
 
-/// True when `answer` is a device's number, and no other device comes behind it in the walk.
+/// True if `answer` is a device's number and the search has no further device after it.
 bool IsLast(const SearchBlock& answer);

@@ -13,7 +13,7 @@ constexpr const char* LineSettings = "9600,N,8,1";
 constexpr std::uint8_t MatchRom = 0x55;
 constexpr std::uint8_t IdleBus = 0xFF;
 
-/// Runs an operation on the line; a line that is lost in the middle counts as failed.
+/// Runs an operation on the line; if the line is lost meanwhile, the operation has failed.
 template <typename Operation>
 bool Succeeds(Operation&& operation) {
   try {

@@ -7,9 +7,9 @@
 #include "platform/OneWire.h"
 #include "platform/SerialDevices.h"
 
-/// The bus behind a serial adapter with a DS2480B chip, kind 5. The adapter lives on the line's control
-/// signals, which are on as long as the port is open. Keys "port" and "type" of section "onewire" name it;
-/// without "type" it is kind 5.
+/// The bus behind a serial adapter with a DS2480B chip, adapter type 5. The adapter is powered from the
+/// line's control signals, which are on while the port is open. It is configured by keys "port" and "type" of
+/// section "onewire"; type 5 is the default.
 class SerialOneWire : public OneWire {
  public:
   static constexpr std::int16_t SerialAdapter = 5;

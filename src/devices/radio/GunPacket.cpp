@@ -21,12 +21,16 @@ std::vector<std::uint8_t> MakeGunPacket(std::uint8_t playerId, std::uint8_t byte
 }
 
 GunPacket ReadGunPacket(const ReceivedFrame& frame) {
-  GunPacket packet{};
-  const std::size_t length = HeaderLength + frame.Data[0] + 1;
-  if (length > packet.size()) {
+  GunPacket packet{.PayloadLength = frame.Data[0],
+                   .PlayerId = frame.Data[1],
+                   .Byte2 = frame.Data[2],
+                   .Byte3 = frame.Data[3],
+                   .Type = frame.Data[4]};
+  const std::size_t length = packet.PayloadLength + std::size_t{1};
+  if (length > packet.Payload.size()) {
     throw RuntimeError(Fault::SubscriptOutOfRange);
   }
-  std::copy_n(frame.Data.begin(), length, packet.begin());
+  std::copy_n(frame.Data.begin() + HeaderLength, length, packet.Payload.begin());
   return packet;
 }
 

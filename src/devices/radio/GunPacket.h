@@ -5,7 +5,7 @@
 #include <span>
 #include <vector>
 
-#include "devices/radio/FrameParser.h"
+#include "devices/radio/XBeeFrameParser.h"
 
 /// What goes between us and a gun in the data of a frame, either way:
 ///
@@ -15,7 +15,14 @@
 ///     3   0
 ///     4   type
 ///     5   payload
-using GunPacket = std::array<std::uint8_t, 100>;
+struct GunPacket {
+  std::uint8_t PayloadLength = 0;
+  std::uint8_t PlayerId = 0;
+  std::uint8_t Byte2 = 0;
+  std::uint8_t Byte3 = 0;
+  std::uint8_t Type = 0;
+  std::array<std::uint8_t, 95> Payload{};  ///< zeros behind what came
+};
 
 /// Types of packets.
 namespace GunPacketType {
@@ -28,7 +35,7 @@ inline constexpr std::uint8_t SearchAnswer = 7;
 std::vector<std::uint8_t> MakeGunPacket(std::uint8_t playerId, std::uint8_t byte2, std::uint8_t byte3,
                                         std::uint8_t packetType, std::span<const std::uint8_t> payload);
 
-/// The packet in the data of `frame`, with one byte more than its payload. Throws RuntimeError 9 when a
+/// The packet in the data of `frame`, its payload with the one byte behind it. Throws RuntimeError 9 when a
 /// payload of 95 bytes or more is announced.
 GunPacket ReadGunPacket(const ReceivedFrame& frame);
 

@@ -46,17 +46,17 @@ void GunSearch::Ask(std::uint8_t playerId) {
 
 void GunSearch::TakeAnswer() {
   const GunPacket answer = ReadGunPacket(link_.Frame());
-  if (answer[4] != GunPacketType::SearchAnswer) {
+  if (answer.Type != GunPacketType::SearchAnswer) {
     return;
   }
-  const std::uint8_t playerId = answer[1];
+  const std::uint8_t playerId = answer.PlayerId;
   GunEntry& gun = guns_[ByteOf(playerId - FirstGunId)];
   if (gun.Present) {
     return;
   }
-  gun.Firmware = Str(answer[5]) + "." + Str(answer[6]);
-  gun.Battery = answer[7];
-  gun.WeaponType = answer[8];
+  gun.Firmware = Str(answer.Payload[0]) + "." + Str(answer.Payload[1]);
+  gun.Battery = answer.Payload[2];
+  gun.WeaponType = answer.Payload[3];
   gun.PlayerID = playerId;
   gun.PlayerName = PlayerName(TeamNameFromNumber(strings_, TeamFromId(playerId)), playerId);
   gun.Present = true;

@@ -6,8 +6,8 @@
 
 #include "core/line/CommPort.h"
 #include "core/line/SerialJob.h"
-#include "devices/radio/FrameParser.h"
 #include "devices/radio/GunPacket.h"
+#include "devices/radio/XBeeFrameParser.h"
 #include "platform/EventPump.h"
 #include "platform/SerialPort.h"
 
@@ -61,7 +61,7 @@ class RadioLink {
   CommPort& commPort_;
   EventPump& events_;
   SerialJob job_;
-  FrameParser parser_;
+  XBeeFrameParser parser_;
   std::uint8_t receivedFrameType_ = 0;
   std::uint32_t bytesSent_ = 0;
 };

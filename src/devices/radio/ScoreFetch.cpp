@@ -28,7 +28,7 @@ bool WantsScores(const GunEntry& gun) {
 
 /// The guns split the size by 255, not 256.
 int TotalOf(const GunPacket& answer) {
-  return answer[7] * 255 + answer[6];
+  return answer.Payload[2] * 255 + answer.Payload[1];
 }
 
 int BlocksIn(int total) {
@@ -91,13 +91,13 @@ void ScoreFetch::Attempt(GunEntry& gun, std::uint8_t playerId) {
     return;
   }
   const int total = TotalOf(answer_);
-  const std::uint8_t check = answer_[8];
+  const std::uint8_t check = answer_.Payload[3];
   if (FetchBlocks(gun, playerId, total) < total ||
       Crc8(std::span(buffer_).first(static_cast<std::size_t>(total))) != check) {
     return;
   }
   AnalyseData(buffer_, game_, clock_);
-  if (Command(gun, playerId, std::array{CloseTransfer}) && answer_[5] == CloseTransfer) {
+  if (Command(gun, playerId, std::array{CloseTransfer}) && answer_.Payload[0] == CloseTransfer) {
     gun.ScoreStatus = ScoreStatus::Ok;
   }
 }
@@ -115,7 +115,7 @@ bool ScoreFetch::Command(const GunEntry& gun, std::uint8_t playerId, std::span<c
     // a status frame and the answer came at once: the data that came last count
   }
   answer_ = ReadGunPacket(link_.Frame());
-  return answer_[4] == GunPacketType::CommandAnswer;
+  return answer_.Type == GunPacketType::CommandAnswer;
 }
 
 int ScoreFetch::FetchBlocks(const GunEntry& gun, std::uint8_t playerId, int total) {
@@ -126,7 +126,7 @@ int ScoreFetch::FetchBlocks(const GunEntry& gun, std::uint8_t playerId, int tota
     const int count = std::min(BlockLength, total - position);
     position += count;
     const std::array request = {ReadBlock, ByteOf(block * BlockLength), ByteOf(count)};
-    if (Command(gun, playerId, request) && answer_[5] == ReadBlock) {
+    if (Command(gun, playerId, request) && answer_.Payload[0] == ReadBlock) {
       received += TakeBlock();
     }
   }
@@ -134,12 +134,13 @@ int ScoreFetch::FetchBlocks(const GunEntry& gun, std::uint8_t playerId, int tota
 }
 
 int ScoreFetch::TakeBlock() {
-  constexpr std::size_t dataOffset = 8;
-  const std::size_t start = answer_[6];
-  const std::size_t length = answer_[7] + 1U;
-  if (dataOffset + length > answer_.size()) {
+  constexpr std::size_t dataOffset = 3;  // in the payload
+  const std::size_t start = answer_.Payload[1];
+  const std::size_t length = answer_.Payload[2] + 1U;
+  if (dataOffset + length > answer_.Payload.size()) {
     throw RuntimeError(Fault::SubscriptOutOfRange);
   }
-  std::copy_n(answer_.begin() + dataOffset, length, buffer_.begin() + static_cast<std::ptrdiff_t>(start));
+  std::copy_n(answer_.Payload.begin() + dataOffset, length,
+              buffer_.begin() + static_cast<std::ptrdiff_t>(start));
   return static_cast<int>(length);
 }

@@ -3,8 +3,8 @@
 #include <cstdint>
 #include <span>
 
-#include "core/game/FrameDecoder.h"
 #include "core/game/Game.h"
+#include "core/game/ScoreFrame.h"
 #include "core/text/StringTable.h"
 #include "devices/radio/GunTable.h"
 #include "devices/radio/RadioDisplay.h"

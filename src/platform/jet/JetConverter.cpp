@@ -16,7 +16,7 @@
 
 namespace {
 
-/// A file that goes away unless it was moved.
+/// A file that is deleted at the end unless it has been renamed.
 class NewFile {
  public:
   NewFile(std::string path, const std::string& source) : path_(std::move(path)) {
@@ -47,14 +47,14 @@ void SyncFolderOf(const std::string& path) {
   }
 }
 
-/// Gives the old file a second name that nothing has, so that it is there under one of them at every instant.
+/// Gives the old file a second, unused name, so that it exists under one of the two at every instant.
 std::string KeepOld(const std::string& path) {
   for (int number = 1;; ++number) {
     std::string kept = path + ".jet" + (number == 1 ? "" : std::to_string(number));
     std::error_code error;
     if (std::filesystem::exists(kept)) {
       if (std::filesystem::equivalent(kept, path, error)) {
-        return kept;  // left by a conversion that broke off
+        return kept;  // left by an interrupted conversion
       }
       continue;
     }

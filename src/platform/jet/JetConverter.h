@@ -8,13 +8,14 @@
 
 #include "platform/OldDatabases.h"
 
-/// Turns Jet files into the databases that this program uses now. A program beside the main one reads them.
+/// Converts Jet files to SQLite. A separate program reads them, since a damaged file can hang or crash the
+/// library.
 class JetConverter : public OldDatabases {
  public:
   static constexpr std::chrono::milliseconds LongestSilence = std::chrono::seconds(20);
 
-  /// `reader` is the path of tessarine-jet-reader. A reader that is silent for `silence` has hung. `onRows`
-  /// is told again and again how many rows have come.
+  /// `reader` is the path of tessarine-jet-reader; one that writes nothing for `silence` is taken to have
+  /// hung. `onRows` is called repeatedly with the number of rows read so far.
   explicit JetConverter(
       std::string reader, std::chrono::milliseconds silence = LongestSilence,
       std::function<void(std::int64_t rows)> onRows = [](std::int64_t) {})

@@ -2,6 +2,6 @@
 
 #include <string>
 
-/// "YYYY-MM-DD HH:MM:SS" of a date as a Jet file has it: days since 1899-12-30, the time of day being their
-/// fraction, also of days before that.
+/// Converts a date from a Jet file, in days since 1899-12-30, to "YYYY-MM-DD HH:MM:SS". The fraction is the
+/// time of day, and counts forwards for negative dates too.
 std::string JetDateText(double date);

@@ -1,6 +1,6 @@
-// tessarine-jet-reader FILE TABLE: the rows of one table of a Jet file on standard output, for the main
-// program, which ends this one when it hangs. Ends with 0 when all rows were read. JetStream.h tells the
-// form.
+// tessarine-jet-reader FILE TABLE: writes the rows of one table of a Jet file to standard output, in the
+// format described in JetStream.h. The main program kills this one if it hangs. Exits with 0 when all rows
+// were read.
 
 #include <glib.h>
 #include <mdbtools.h>
@@ -65,7 +65,7 @@ void WriteReal(double value) {
   WriteNumber(bits, 8);
 }
 
-/// A 32-bit float as the double that its shortest decimal says.
+/// A 32-bit float as the double nearest to its shortest decimal form: 0.1f becomes 0.1.
 double Widened(float value) {
   char text[32];
   const auto written = std::to_chars(text, text + sizeof text, value);
@@ -210,7 +210,7 @@ void WriteTable(MdbTableDef* table) {
 
 /// A damaged file can make the library ask for more and more memory.
 void LimitMemory() {
-#if !HAS_FEATURE(address_sanitizer)  // which takes terabytes of addresses for itself
+#if !HAS_FEATURE(address_sanitizer)  // which reserves terabytes of address space
   constexpr rlim_t mostMemory = rlim_t{2} << 30U;
   const rlimit limit{mostMemory, mostMemory};
   setrlimit(RLIMIT_AS, &limit);
@@ -255,6 +255,6 @@ int main(int argc, char** argv) {
   if (std::fflush(stdout) != 0) {
     Fail("The reader of old files has lost its listener.");
   }
-  // The library's own clean-up is not needed, and not safe after a damaged file.
+  // The library's own clean-up is not needed, and is not safe after reading a damaged file.
   std::_Exit(0);
 }

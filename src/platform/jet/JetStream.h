@@ -8,15 +8,15 @@
 
 #include "platform/Database.h"
 
-/// Takes in what the reader of Jet files writes, in pieces of any size. Numbers have their low byte first.
+/// Parses the output of tessarine-jet-reader, in pieces of any size. Numbers are little-endian.
 ///
-///     'O' text, rows (8 bytes)                   a table that was not asked for; any number of these
-///     'T' text, columns (4 bytes), that many texts   the table that was
+///     'O' text, rows (8 bytes)                   another table than the one requested; any number of these
+///     'T' text, columns (4 bytes), that many texts   the requested table
 ///     'R' a value for each column                a row; any number of these
 ///     'E'                                        the end
 ///
-/// A value, and a text among them, is one of: 'N' (NULL), 'I' and 8 bytes, 'D' and the 8 bytes of a double,
-/// 'S' and 'B' with a length (4 bytes) and that many bytes: a text in UTF-8, or bytes.
+/// A value is one of: 'N' (NULL), 'I' and an integer (8 bytes), 'D' and a double (8 bytes), 'S' or 'B' with a
+/// length (4 bytes) and that many bytes: UTF-8 text or binary. Where "text" stands above, it is an 'S' value.
 class JetStream {
  public:
   struct Listener {
@@ -27,10 +27,10 @@ class JetStream {
 
   explicit JetStream(Listener listener) : listener_(std::move(listener)) {}
 
-  /// Throws RuntimeError 3343 for what is not of this form, and what the listener throws.
+  /// Throws RuntimeError 3343 for malformed input, and whatever the listener throws.
   void Take(std::string_view bytes);
 
-  /// True once the end has come.
+  /// True once 'E' was read.
   bool Ended() const { return ended_; }
 
  private:
@@ -43,8 +43,8 @@ class JetStream {
   bool TakeText(std::size_t& at, std::string& text) const;
 
   Listener listener_;
-  std::string waiting_;    ///< bytes of items that are not complete yet
-  std::size_t taken_ = 0;  ///< of them that belong to items that are done
+  std::string waiting_;    ///< received bytes, up to an item that is still incomplete
+  std::size_t taken_ = 0;  ///< how many of these belong to items already processed
   std::size_t columns_ = 0;
   bool inTable_ = false;
   bool ended_ = false;

@@ -10,8 +10,8 @@ namespace {
 
 constexpr std::chrono::milliseconds BusyTimeout(1000);
 
-/// A value's share in the checksum of its row. Numbers count by their value, since a column may keep a whole
-/// one as either kind.
+/// A value's share of its row's checksum. An integer and a double of equal value hash alike, since a column
+/// may store a whole number as either.
 std::uint64_t HashOf(const Value& value) {
   if (const auto* integer = std::get_if<std::int64_t>(&value)) {
     return std::hash<double>()(static_cast<double>(*integer)) + 1;

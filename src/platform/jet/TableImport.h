@@ -9,29 +9,29 @@
 #include "platform/sqlite/SqliteConnection.h"
 #include "platform/sqlite/SqliteTable.h"
 
-/// Fills a table of a new database file, whose rows it replaces. All of it is one transaction.
+/// Replaces the rows of a table in a new database file, in one transaction.
 class TableImport {
  public:
   TableImport(const std::string& path, const std::string& table);
 
-  /// Names of the columns of the rows to come. Columns that the table does not have are left out.
+  /// The column names of the rows that follow. Columns that the table lacks are left out.
   void SetColumns(const std::vector<std::string>& columns);
 
-  /// Throws RuntimeError when the table refuses the row.
+  /// Throws RuntimeError if the table refuses the row.
   void AddRow(const std::vector<Value>& row);
 
-  /// Makes the rows durable, reads them back and compares. Throws RuntimeError 3343 when they differ.
+  /// Commits the rows, reads them back and compares. Throws RuntimeError 3343 if they differ.
   void Finish();
 
   std::int64_t Rows() const { return rows_; }
   /// Columns that were left out.
   const std::vector<std::string>& UnknownColumns() const { return unknown_; }
-  /// Columns in which a text that is no number became 0.
+  /// Number columns in which at least one text was not a number and became 0.
   const std::set<std::string>& ZeroedColumns() const { return zeroed_; }
 
  private:
   struct Target {
-    std::size_t Source;  ///< place in the rows to come
+    std::size_t Source;  ///< index into a row passed to AddRow
     SqliteColumn Column;
   };
 

@@ -34,7 +34,7 @@ void LibreOffice::LoadModule() {
   if (client_ != nullptr) {
     return;
   }
-  // A call to a LibreOffice that has just died is to fail, and not to end this program.
+  // A call to a LibreOffice that has just died must fail instead of ending this program.
   std::signal(SIGPIPE, SIG_IGN);
   // Never unloaded: LibreOffice's libraries keep threads of their own.
   void* const module = dlopen((folder_ + "/libtessarine-office.so").c_str(), RTLD_NOW | RTLD_LOCAL);
@@ -102,10 +102,10 @@ void LibreOffice::Quit() noexcept {
   if (!HostRuns()) {
     return;
   }
-  // It is not asked to end, since one that hangs would not answer; it has nothing to save.
+  // LibreOffice is not asked to quit: it would not answer if it hangs, and it has nothing to save.
   client_->Disconnect();
   leash_.Close();
-  // The host lets nothing hold it up for long; waiting for it leaves no process behind this one.
+  // The host ends promptly whatever LibreOffice does; waiting for it leaves no process behind.
   host_->Wait();
   ForgetHost();
 }

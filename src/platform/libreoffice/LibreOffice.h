@@ -12,11 +12,11 @@
 class OfficeClient;
 
 /// LibreOffice Writer as the word processor, with a profile of its own, so that it never disturbs the
-/// operator's. Its libraries are loaded at the first start only. The process runs under a small host program,
-/// which ends it and clears up when this program ends, however that happens.
+/// operator's. Its libraries are not loaded before the first start. The process runs under a small host
+/// program, which kills it and cleans up when this program ends, however that happens.
 class LibreOffice : public WordProcessor {
  public:
-  /// `folder`: where the module and the host program lie.
+  /// `folder` holds the module and the host program.
   explicit LibreOffice(std::string folder);
   ~LibreOffice() override;
 
@@ -30,7 +30,7 @@ class LibreOffice : public WordProcessor {
  private:
   void LoadModule();
   void StartHost();
-  /// True while the host runs; forgets it when it has ended.
+  /// True while the host runs. Once it has ended, resets what belongs to it.
   bool HostRuns();
   void ForgetHost();
 

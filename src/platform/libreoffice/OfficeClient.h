@@ -7,13 +7,13 @@
 
 #include "platform/WordProcessor.h"
 
-/// What the module that is loaded at run time does: the conversation with one running LibreOffice. Everything
-/// that needs LibreOffice's own libraries lies behind this interface.
+/// The conversation with one running LibreOffice, implemented by a module that is loaded at run time.
+/// Everything that needs LibreOffice's own libraries lies behind this interface.
 class OfficeClient {
  public:
   virtual ~OfficeClient() = default;
 
-  /// Folder of LibreOffice's programs, with soffice.bin in it.
+  /// LibreOffice's program folder, which holds soffice.bin.
   virtual std::string ProgramFolder() const = 0;
 
   /// Connects to the LibreOffice that listens on the pipe `name`. Returns false while nobody listens there.
@@ -25,7 +25,7 @@ class OfficeClient {
   virtual void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
                         const std::function<void()>& onProgress) = 0;
 
-  /// Lets go of the connected LibreOffice, without a word from it.
+  /// Drops the connection without waiting for LibreOffice.
   virtual void Disconnect() noexcept = 0;
 };
 

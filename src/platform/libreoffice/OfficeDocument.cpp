@@ -43,7 +43,7 @@ using Uno::Sequence;
 
 namespace {
 
-/// The bookmark of this name; Word minds no case.
+/// The bookmark of this name, in any case, as Word finds it.
 Any FindBookmark(container::XNameAccess& bookmarks, const OUString& name) {
   try {
     return bookmarks.getByName(name);
@@ -57,9 +57,9 @@ Any FindBookmark(container::XNameAccess& bookmarks, const OUString& name) {
   }
 }
 
-/// A block of cells, its texts down each column.
+/// A block of cells. `Texts` runs down each column in turn.
 struct Block {
-  int FirstColumn;  ///< counted from 0, as the row
+  int FirstColumn;  ///< counted from 0, like the row
   int FirstRow;
   int Columns;
   int Rows;
@@ -82,7 +82,7 @@ void WriteAtOnce(table::XCellRange& range, const Block& block) {
   cells->setDataArray(rows);
 }
 
-/// Tables with merged cells have no ranges, and their cells are known by name: "B3" is the second in row 3.
+/// Tables with merged cells have no ranges; their cells are found by name: "B3" is the second one in row 3.
 Reference<text::XText> CellByName(text::XTextTable& table, int row, int column) {
   constexpr int letters = 26;
   OUString name;
@@ -105,12 +105,12 @@ void WriteBlock(text::XTextTable& table, table::XCellRange& range, const Block& 
   try {
     WriteAtOnce(range, block);
   } catch (const com::sun::star::uno::Exception&) {
-    WriteOneByOne(table, block);  // tells what is missing, if anything is
+    WriteOneByOne(table, block);  // throws if a cell is missing
   }
 }
 
-/// Room for a picture in a cell of a table's first row, in 1/100 mm: as wide as the cell inside, and a
-/// portrait.
+/// Room for a picture in a cell of a table's first row, in 1/100 mm: the cell's inner width, in portrait
+/// format (3:4).
 Size PictureBox(text::XTextTable& table, int column, const Reference<text::XText>& cell) {
   const Reference<XPropertySet> whole(&table, UNO_QUERY_THROW);
   const Reference<XPropertySet> inside(cell, UNO_QUERY_THROW);
@@ -133,7 +133,7 @@ Size PictureBox(text::XTextTable& table, int column, const Reference<text::XText
   return {usable, usable * 4 / 3};
 }
 
-/// The largest size with the proportions of `picture` inside `box`.
+/// The largest size that fits into `box` with the proportions of `picture`.
 Size Fit(const Size& picture, const Size& box) {
   if (picture.Width <= 0 || picture.Height <= 0) {
     return box;
@@ -160,8 +160,8 @@ void AddTable(const Any& part, BodyTables& names) {
   }
 }
 
-/// A table that text flows around stands in the body for Word. Here it is the first thing in a frame, which
-/// hangs on a paragraph behind it, or on a character of that.
+/// Word counts a table that text flows around among the body's tables. LibreOffice puts it first in a frame,
+/// which is anchored to the paragraph after it or to a character of that paragraph.
 void AddFloatingTables(const Any& place, BodyTables& names) {
   const Reference<container::XContentEnumerationAccess> access(place, UNO_QUERY_THROW);
   const Reference<container::XEnumeration> hanging =
@@ -175,7 +175,7 @@ void AddFloatingTables(const Any& place, BodyTables& names) {
   }
 }
 
-/// Hears whether the printer's queue took a document: LibreOffice tells it in no other way.
+/// Learns whether the print queue accepted a document, which LibreOffice reports in no other way.
 class PrintJobWatch : public cppu::WeakImplHelper1<view::XPrintJobListener> {
  public:
   bool Failed() const { return failed_; }
@@ -189,7 +189,7 @@ class PrintJobWatch : public cppu::WeakImplHelper1<view::XPrintJobListener> {
   void SAL_CALL disposing(const com::sun::star::lang::EventObject& /*source*/) override {}
 
  private:
-  std::atomic<bool> failed_ = false;  // set by a thread of LibreOffice's
+  std::atomic<bool> failed_ = false;  // set on one of LibreOffice's threads
 };
 
 }  // namespace
@@ -197,7 +197,7 @@ class PrintJobWatch : public cppu::WeakImplHelper1<view::XPrintJobListener> {
 OfficeDocument::OfficeDocument(const Reference<text::XTextDocument>& document, const OfficeServices& services,
                                std::shared_ptr<BodyTables> bodyTables)
     : document_(document), services_(services), bodyTables_(std::move(bodyTables)) {
-  document_->lockControllers();  // no page is laid out anew after each change
+  document_->lockControllers();  // saves a new layout after each change
 }
 
 void OfficeDocument::SetBookmark(const std::string& name, const std::string& words) {
@@ -274,9 +274,9 @@ void OfficeDocument::Store(const std::string& path, const char* filter) {
 
 void OfficeDocument::PrintOut() {
   Uno::Call([&] {
-    // LibreOffice looks for printers in the background; asking for the list makes it wait until it has them.
+    // LibreOffice looks for printers in the background; asking for the list waits until it has found them.
     services_.Printers->getPrinterNames();
-    // Where the system has no printer, this one stands for it and swallows what it is given.
+    // "Generic Printer" is the stand-in on a system without printers: it discards whatever it is given.
     const OUString printer = services_.Printers->getDefaultPrinterName();
     if (printer.isEmpty() || printer == "Generic Printer") {
       throw RuntimeError(Fault::PrinterError, "Printer error");
@@ -308,7 +308,7 @@ Reference<text::XTextTable> OfficeDocument::Table(int number) {
 }
 
 void OfficeDocument::FindBodyTables() {
-  // The collection of tables is in no told order, and holds those in cells and text boxes too.
+  // The document's own collection has no documented order and includes tables in cells and text boxes.
   BodyTables names;
   const Reference<container::XEnumerationAccess> body(document_->getText(), UNO_QUERY_THROW);
   ForEachPart(body, [&names](const Any& part) {

@@ -13,11 +13,11 @@
 #include "platform/WordProcessor.h"
 #include "platform/libreoffice/Uno.h"
 
-/// Names of the body's tables of a template, in the body's order. Finding them takes many calls, and they are
-/// the same in every document made from it; empty until the first has asked.
+/// Names of a template's body tables, in document order. Finding them takes many calls, and they are the same
+/// in every document made from the template; empty until the first document has needed them.
 using BodyTables = std::vector<Uno::OUString>;
 
-/// What documents need of the LibreOffice they are open in.
+/// LibreOffice's services that documents use.
 struct OfficeServices {
   Uno::Reference<com::sun::star::graphic::XGraphicProvider> Graphics;
   Uno::Reference<com::sun::star::awt::XPrinterServer2> Printers;

@@ -17,11 +17,11 @@
 
 namespace {
 
-/// Exit codes by which LibreOffice asks to be started again, as it does after it has made a new profile.
+/// Exit codes with which LibreOffice asks to be restarted, as it does after creating a new profile.
 constexpr int RestartAfterCrash = 79;
 constexpr int Restart = 81;
 
-/// A folder for LibreOffice's profile and temporary files that goes with everything in it.
+/// A folder for LibreOffice's profile and temporary files, deleted with everything in it at the end.
 class Profile {
  public:
   Profile() {
@@ -44,7 +44,7 @@ class Profile {
   std::string path_;
 };
 
-/// `path` as the path of a file URL.
+/// `path` percent-encoded for a file URL.
 std::string UrlPath(const std::string& path) {
   std::string url;
   for (const char c : path) {
@@ -57,15 +57,15 @@ std::string UrlPath(const std::string& path) {
   return url;
 }
 
-/// LibreOffice finds only files whose names the locale can spell, and names come in every script. This one is
-/// part of the system, whatever locales are installed.
+/// LibreOffice finds only files whose names the locale can encode, and names come in every script. C.UTF-8
+/// exists whatever locales are installed.
 void SpellAllNames() {
   if (std::setlocale(LC_CTYPE, "") == nullptr || std::string_view(nl_langinfo(CODESET)) != "UTF-8") {
     setenv("LC_ALL", "C.UTF-8", 1);
   }
 }
 
-/// Becomes LibreOffice, which dies with this process's parent.
+/// Replaces this process by LibreOffice, which is killed when its parent, the host, dies.
 [[noreturn]] void BecomeOffice(const char* office, const std::string& profile, const std::string& pipe,
                                pid_t host) {
   prctl(PR_SET_PDEATHSIG, SIGKILL);
@@ -82,14 +82,14 @@ void SpellAllNames() {
   const std::string installation = "-env:UserInstallation=file://" + UrlPath(profile);
   const std::string accept = "--accept=pipe,name=" + pipe + ";urp";
   setenv("SAL_USE_VCLPLUGIN", "svp", 1);
-  setenv("TMPDIR", profile.c_str(), 1);  // so that what it leaves goes with the profile
+  setenv("TMPDIR", profile.c_str(), 1);  // so that leftovers are deleted with the profile
   SpellAllNames();
   execl(office, office, installation.c_str(), "--headless", "--norestore", "--nologo", "--nodefault",
         accept.c_str(), nullptr);
   _exit(EXIT_FAILURE);
 }
 
-/// Signals that come while LibreOffice runs: its end, and requests to end this program.
+/// A signalfd for LibreOffice's end and for requests to end this program.
 int WatchedSignals() {
   sigset_t watched;
   sigemptyset(&watched);
@@ -100,8 +100,8 @@ int WatchedSignals() {
   return signalfd(-1, &watched, SFD_CLOEXEC);
 }
 
-/// Waits until the process ends by itself; returns its wait status, or nothing but its death when this
-/// program is to end first, because it was told so or because the other end of its standard input was closed.
+/// Waits until LibreOffice exits and returns its wait status. If a signal asks this program to end, or the
+/// other end of its standard input is closed, kills LibreOffice and returns SIGKILL.
 int WaitForEnd(pid_t office, int signals) {
   pollfd sources[] = {{STDIN_FILENO, 0, 0}, {signals, POLLIN, 0}};
   while (poll(sources, 2, -1) >= 0 && (sources[0].revents & (POLLHUP | POLLERR | POLLNVAL)) == 0) {
@@ -122,13 +122,13 @@ int WaitForEnd(pid_t office, int signals) {
 }  // namespace
 
 /// tessarine-office-host PROGRAM PIPE: runs LibreOffice (soffice.bin) listening on PIPE with a new profile,
-/// until it ends or the standard input is closed. Then neither the process nor the profile is left.
+/// until it exits or standard input is closed. Leaves neither the process nor the profile behind.
 int main(int argc, char** argv) {
   if (argc != 3) {
     std::fprintf(stderr, "usage: tessarine-office-host PROGRAM PIPE\n");
     return 2;
   }
-  // Keys pressed in the terminal of the main program are not for this one.
+  // Ctrl+C in the main program's terminal must not reach this process.
   setsid();
   const int signals = WatchedSignals();
   const Profile profile;
@@ -141,7 +141,7 @@ int main(int argc, char** argv) {
     }
     status = office < 0 ? SIGKILL : WaitForEnd(office, signals);
   } while (WIFEXITED(status) && (WEXITSTATUS(status) == Restart || WEXITSTATUS(status) == RestartAfterCrash));
-  // A killed LibreOffice leaves its pipe, which lies here whatever the temporary folder is.
+  // A killed LibreOffice leaves its pipe behind, always in /tmp whatever TMPDIR says.
   unlink(("/tmp/OSL_PIPE_" + std::to_string(getuid()) + "_" + argv[2]).c_str());
   return WIFEXITED(status) ? WEXITSTATUS(status) : EXIT_FAILURE;
 }

@@ -33,7 +33,7 @@ void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
     QPDF whole;
     whole.emptyPDF();
     QPDFPageDocumentHelper pages(whole);
-    std::vector<std::shared_ptr<QPDF>> sources;  // their streams are copied when the whole is written
+    std::vector<std::shared_ptr<QPDF>> sources;  // kept open: write() copies their streams
     for (const std::string& part : parts) {
       sources.push_back(std::make_shared<QPDF>());
       sources.back()->processFile(part.c_str());
@@ -49,7 +49,7 @@ void JoinPdfs(const std::vector<std::string>& parts, const std::string& target,
     Remove(target);
     throw RuntimeError(Fault::PathAccess, failure.what());
   } catch (...) {
-    Remove(target);  // `onProgress` wants it no more
+    Remove(target);  // `onProgress` threw to cancel
     throw;
   }
 }

@@ -12,7 +12,7 @@
 
 #include "platform/RuntimeError.h"
 
-/// Shared by the module's parts: texts, URLs and failures of LibreOffice in the program's terms.
+/// Conversions shared by the module: LibreOffice's texts, URLs and exceptions in the program's terms.
 namespace Uno {
 
 using com::sun::star::beans::PropertyValue;
@@ -38,7 +38,7 @@ inline OUString UrlOf(const std::string& path) {
   return url;
 }
 
-/// Arguments by name, as LibreOffice takes them.
+/// Named arguments, as LibreOffice takes them.
 inline Sequence<PropertyValue> Properties(std::initializer_list<std::pair<const char*, Any>> values) {
   Sequence<PropertyValue> properties(static_cast<sal_Int32>(values.size()));
   PropertyValue* next = properties.getArray();
@@ -50,7 +50,7 @@ inline Sequence<PropertyValue> Properties(std::initializer_list<std::pair<const 
   return properties;
 }
 
-/// Runs `operation`; a failure of LibreOffice, or its death, becomes RuntimeError 440.
+/// Runs `operation`; an exception from LibreOffice, or its death, becomes RuntimeError 440.
 template <typename Operation>
 auto Call(Operation&& operation) {
   try {

@@ -30,17 +30,17 @@ using Uno::Reference;
 
 namespace {
 
-/// Template files are told apart by path and time of change.
+/// Identifies a version of a template file: path and modification time.
 using TemplateKey = std::pair<std::string, std::filesystem::file_time_type>;
 
-/// What was found out about a template, so that the next document made from it takes fewer calls.
+/// What is known about a template, so that the next document made from it takes fewer calls.
 struct Template {
-  OUString Filter;  ///< by which it is read; empty until it was
+  OUString Filter;  ///< the import filter; empty until the first load
   std::shared_ptr<BodyTables> Tables = std::make_shared<BodyTables>();
 };
 
-/// Whether a text document was read from something better than a file of no known format, which is taken for
-/// a plain text; sets the filter that read it.
+/// True for a text document in a word processor's format; sets `filter` to the import filter used. A file of
+/// unknown format is loaded as plain text, and does not count.
 bool IsTemplate(const Reference<com::sun::star::text::XTextDocument>& document, OUString& filter) {
   if (!document.is()) {
     return false;
@@ -94,7 +94,7 @@ class UnoClient : public OfficeClient {
 };
 
 void UnoClient::CreateLocalContext() {
-  // Without this the client's own start-up finds neither its services nor its types, and crashes.
+  // Without this UNO's start-up in this process finds neither its services nor its types, and crashes.
   const std::string bootstrap = "vnd.sun.star.pathname:" + ProgramFolder() + "/fundamentalrc";
   setenv("URE_BOOTSTRAP", bootstrap.c_str(), 1);
   local_ = cppu::defaultBootstrap_InitialComponentContext();

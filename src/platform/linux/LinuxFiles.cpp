@@ -18,10 +18,10 @@
 
 namespace {
 
-// What `path` finally names, which need not exist.
+// The path behind all symbolic links at the end of `path`; it need not exist.
 std::string FollowLinks(std::string path) {
-  constexpr int MostLinks = 40;
-  for (int links = 0; links < MostLinks; ++links) {
+  constexpr int mostLinks = 40;
+  for (int links = 0; links < mostLinks; ++links) {
     std::error_code error;
     const std::filesystem::path target = std::filesystem::read_symlink(path, error);
     if (error) {
@@ -32,7 +32,7 @@ std::string FollowLinks(std::string path) {
   throw FileError(ELOOP, path);
 }
 
-// A new, empty file of a name that nothing else has, which goes away unless it is renamed.
+// A new, empty file with a unique name, deleted at the end unless it has been renamed.
 class TemporaryFile {
  public:
   explicit TemporaryFile(const std::string& folder) : path_(NewName(folder)), file_(Create(path_)) {}
@@ -78,13 +78,13 @@ bool WriteAll(int file, std::string_view bytes) {
   return true;
 }
 
-// Gives the new file the permissions of the old one.
+// Gives the new file the old one's permissions and, where allowed, its owner.
 bool TakeOver(int file, const struct stat& old) {
   struct stat own {};
   if (fstat(file, &own) != 0) {
     return false;
   }
-  // Only an administrator may give a file away; for anyone else it becomes the writer's own.
+  // Only root may give a file away; for anyone else the new file belongs to the writer.
   if ((own.st_uid != old.st_uid || own.st_gid != old.st_gid) && fchown(file, old.st_uid, old.st_gid) != 0 &&
       errno != EPERM) {
     return false;
@@ -92,7 +92,7 @@ bool TakeOver(int file, const struct stat& old) {
   return fchmod(file, old.st_mode & 07777) == 0;
 }
 
-// Makes the folder's entries durable; some file systems have no such operation.
+// Makes the folder's entries durable. File systems that do not support this (EINVAL) count as done.
 bool SyncFolder(const std::string& folder) {
   const Descriptor descriptor(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
   return descriptor.Number() >= 0 && (fsync(descriptor.Number()) == 0 || errno == EINVAL);

@@ -5,7 +5,7 @@
 #include "platform/Files.h"
 
 /// Files of the local file system. Only regular files are read and replaced, so that a pipe or a device
-/// cannot hold the program up.
+/// cannot block the program.
 class LinuxFiles : public Files {
  public:
   bool FileExists(const std::string& path) const override;
@@ -15,8 +15,7 @@ class LinuxFiles : public Files {
   std::string Read(const std::string& path) const override;
 
   /// Keeps the old file's permissions, and its owner where that is allowed; a new file gets 0644 less the
-  /// process's mask. A file that may not be written is refused (70) although its folder would allow to put
-  /// another in its place.
+  /// umask. A write-protected file is refused (70), even where its folder would allow replacing it.
   void Replace(const std::string& path, const std::string& bytes) override;
   std::string MakeTempFileName() override;
   void Write(const std::string& path, const std::string& bytes) override;

@@ -10,7 +10,7 @@ QString ShortFormatWithFullYear(const QLocale& locale) {
   return format;
 }
 
-/// A form in which a day or a month of one digit may stand without a zero.
+/// The format changed so that one-digit days and months may be written without a zero.
 QString Lenient(QString form) {
   form.replace(QStringLiteral("dd"), QStringLiteral("d"));
   if (!form.contains(QStringLiteral("MMM"))) {

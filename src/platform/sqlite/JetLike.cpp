@@ -13,7 +13,7 @@
 
 namespace {
 
-// Bytes that are no UTF-8 are moved to where no character lies, so that each equals only itself.
+// Bytes that are not UTF-8 map to values above all characters, so that each one equals only itself.
 constexpr char32_t StrayByte = 0x110000;
 
 char32_t TakeCharacter(std::string_view& text) {
@@ -32,18 +32,18 @@ char32_t Fold(char32_t character) {
   if (character < 0x80) {
     return character >= U'A' && character <= U'Z' ? character + (U'a' - U'A') : character;
   }
-  // A locale of its own: the program's may be one that knows no letters beyond ASCII.
+  // A separate locale: the program's own may know no letters beyond ASCII.
   static const locale_t unicode = newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr);
   if (unicode == nullptr || character >= StrayByte) {
     return character;
   }
-  // The Kelvin sign and the capital I with a dot have an ASCII letter as their small form. An index that
-  // knows the case of ASCII letters only could not find them by it.
+  // The Kelvin sign and the dotted capital I have an ASCII letter as their lower case. They are not folded to
+  // it, since an index that folds ASCII letters only would miss them.
   const auto small = static_cast<char32_t>(towlower_l(static_cast<wint_t>(character), unicode));
   return small < 0x80 ? character : small;
 }
 
-// Scripts without case: Hebrew and Arabic to Tibetan, the Chinese, Japanese and Korean ones.
+// True for scripts without case: the blocks from Hebrew to Tibetan, and Chinese, Japanese and Korean.
 bool HasOneForm(char32_t character) {
   return (character >= 0x0590 && character < 0x1000) || (character >= 0x2E80 && character < 0xA000) ||
          (character >= 0xAC00 && character < 0xD7A4);
@@ -124,8 +124,8 @@ bool JetPattern::Fits(const Token& token, char32_t character) {
 }
 
 bool JetPattern::Matches(std::string_view text) const {
-  // Only the last `*` ever needs to take one character more: what stands before it has been matched as early
-  // as it could be, so giving an earlier `*` more would win nothing.
+  // On a mismatch only the last `*` needs to take one more character: everything before it was matched as
+  // early as possible, so extending an earlier `*` cannot help.
   std::size_t token = 0;
   std::size_t afterStar = tokens_.size() + 1;
   std::string_view starText;

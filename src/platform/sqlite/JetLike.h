@@ -4,24 +4,24 @@
 #include <string_view>
 #include <vector>
 
-/// A pattern of Jet's LIKE, ready to be held against many texts.
+/// A pattern of Jet's LIKE, compiled so that many texts can be matched against it.
 ///
-/// `*` stands for any text (also none), `?` for one character, `#` for one digit 0 to 9, `[abc]` and `[a-z]`
-/// for one character of the set, `[!a-z]` for one outside it. Within brackets `*`, `?`, `#` and `[` are
-/// themselves, and so is
-/// `-` at either end; `[]` stands for nothing, `[!]` for an exclamation mark, and `]` outside brackets for
-/// itself. Case does not count, in any script that has one; no letter counts as an ASCII letter but these.
-/// Texts are UTF-8; a byte that is none is a character of its own.
+/// `*` matches any text, including none, `?` one character, `#` one digit 0 to 9, `[abc]` and `[a-z]` one
+/// character of the set, `[!a-z]` one outside it. Within brackets `*`, `?`, `#` and `[` are literal, and so
+/// is `-` at either end; `[]` matches the empty text, `[!]` an exclamation mark; `]` outside brackets is
+/// literal. Case is ignored in every script that has it, but no other letter matches an ASCII letter.
+/// Texts are UTF-8; a byte that is not UTF-8 is a character of its own.
 class JetPattern {
  public:
-  /// Throws RuntimeError 93 for a bracket that is not closed or a range that runs downwards.
+  /// Throws RuntimeError 93 for an unclosed bracket or a descending range.
   explicit JetPattern(std::string_view pattern);
 
-  /// True when the whole of `text` fits. Takes at most time proportional to the product of both lengths.
+  /// True if the pattern matches the whole of `text`. The time is at most proportional to the product of both
+  /// lengths.
   bool Matches(std::string_view text) const;
 
-  /// What every text that fits begins with when the case of ASCII letters does not count: the characters
-  /// before the first that has other forms. Empty when nothing can be said.
+  /// The prefix that all matching texts share, ignoring the case of ASCII letters: the literal characters up
+  /// to the first non-ASCII one with an upper or lower case. Empty when there is none.
   std::u32string FixedStart() const;
 
  private:
@@ -43,5 +43,5 @@ class JetPattern {
   std::vector<Token> tokens_;
 };
 
-/// Holds one text against one pattern. Throws as JetPattern does.
+/// True if `pattern` matches `text`. Throws as JetPattern does.
 bool JetLike(std::string_view text, std::string_view pattern);

@@ -44,7 +44,7 @@ void KeyCursor::MovePrevious() {
   }
 }
 
-// A key that was already here belonged to a row that someone else deleted meanwhile.
+// If the key is already in the set, its former row was deleted by someone else and SQLite reused the key.
 void KeyCursor::Append(std::int64_t key) {
   if (const std::optional<std::size_t> stale = keys_.PositionOf(key)) {
     keys_.Erase(*stale);

@@ -8,8 +8,8 @@
 #include "platform/RuntimeError.h"
 #include "platform/sqlite/KeySet.h"
 
-/// A place among the keys of a dynaset: on a row, before the first, behind the last, or in the gap that a
-/// deleted row leaves. It begins on the first row.
+/// A position among the keys of a dynaset: on a row, before the first, after the last, or in the gap left by
+/// a deleted row. Starts on the first row.
 class KeyCursor {
  public:
   KeyCursor() = default;
@@ -19,9 +19,9 @@ class KeyCursor {
   bool Eof() const { return place_ == Place::End || place_ == Place::BothEnds; }
   bool Bof() const { return place_ == Place::Beginning || place_ == Place::BothEnds; }
   bool OnRow() const { return place_ == Place::Row; }
-  /// Of the row, from 0; for a gap of the row behind it.
+  /// Index of the current row, from 0; in a gap, that of the row after it.
   std::size_t Position() const { return position_; }
-  /// Throws RuntimeError 3021 where there is no row.
+  /// Throws RuntimeError 3021 unless on a row.
   std::int64_t Key() const {
     if (!OnRow()) {
       throw RuntimeError(Fault::NoCurrentRecord);
@@ -36,13 +36,13 @@ class KeyCursor {
   void MoveFirst();
   void MoveLast();
   void MoveBehind();
-  /// These throw RuntimeError 3021 where they cannot go on.
+  /// Both throw RuntimeError 3021 if they cannot move any further.
   void MoveNext();
   void MovePrevious();
 
-  /// Adds the key of a new row behind the last one; the place stays.
+  /// Adds the key of a new row after the last one; the position does not change.
   void Append(std::int64_t key);
-  /// Takes out the key of the row, and leaves a gap.
+  /// Removes the current row's key, leaving a gap.
   void Erase();
 
  private:

@@ -6,13 +6,13 @@
 #include <unordered_map>
 #include <vector>
 
-/// The keys of a dynaset in its order, each at most once. Where they ascend, which only keys added later can
-/// spoil, a key's position is found by halving; otherwise through a table that the first search after a
-/// change makes.
+/// The keys of a dynaset in its order, each at most once. While they ascend, which only keys added later can
+/// break, a key's position is found by binary search; otherwise through a table that the first search after
+/// a change builds.
 class KeySet {
  public:
   KeySet() = default;
-  /// Takes distinct keys and puts them in ascending order.
+  /// Takes distinct keys in any order and sorts them.
   explicit KeySet(std::vector<std::int64_t> keys);
 
   void Append(std::int64_t key);

@@ -27,7 +27,7 @@ bool IsLetter(char character) {
   return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
 }
 
-// What may stand before and behind a comparison that is a whole term.
+// CanPrecede and CanFollow: true if the comparison between them is a whole term of AND, OR, NOT and brackets.
 bool CanPrecede(std::string_view before) {
   const std::size_t last = before.find_last_not_of(Blanks);
   if (last == std::string_view::npos || before[last] == '(') {
@@ -49,7 +49,7 @@ bool CanFollow(std::string_view behind) {
   return behind.empty() || behind.front() == ')' || EqualWords(word, "AND") || EqualWords(word, "OR");
 }
 
-// The length of the text in quotes at the start of `text`, with its quotes; 0 when it does not end.
+// Length of the quoted string at the start of `text`, quotes included; 0 if it is not closed.
 std::size_t QuotedLength(std::string_view text) {
   std::size_t end = 1;
   while ((end = text.find('\'', end)) != std::string_view::npos) {
@@ -79,7 +79,7 @@ std::string Quoted(std::u32string_view text) {
   return quoted + "'";
 }
 
-// The range in which all texts lie that fit `pattern`, as a condition on the column in brackets.
+// The range that holds all texts matching the quoted `pattern`, as a condition on the bracketed `column`.
 std::optional<std::string> RangeOf(const SqliteTable& table, std::string_view column,
                                    std::string_view pattern) {
   const std::string_view name = column.substr(1, column.size() - 2);
@@ -92,7 +92,7 @@ std::optional<std::string> RangeOf(const SqliteTable& table, std::string_view co
   try {
     start = JetPattern(Unquoted(pattern)).FixedStart();
   } catch (const RuntimeError&) {
-    return std::nullopt;  // to be reported by the search itself
+    return std::nullopt;  // an invalid pattern is reported by the search itself
   }
   if (start.empty()) {
     return std::nullopt;
@@ -104,7 +104,7 @@ std::optional<std::string> RangeOf(const SqliteTable& table, std::string_view co
          Quoted(behind) + " COLLATE NOCASE";
 }
 
-// Length of "LIKE 'text'" with the blanks before it, and of its text in quotes; 0 for anything else.
+// Length of "LIKE 'text'" with the blanks before it, and of its quoted string; 0 for anything else.
 struct LikeTerm {
   std::size_t Length = 0;
   std::size_t QuotedText = 0;

@@ -4,8 +4,8 @@
 
 #include "platform/sqlite/SqliteTable.h"
 
-/// `condition` with a range of the column's index added beside each "[Column] LIKE 'text*'" in it, which our
-/// own LIKE does not get by itself. Holds for the same rows. Left as it stands where the column does not keep
-/// texts, the pattern cannot be read or begins with a wildcard, or the comparison is a part of something more
-/// involved than AND, OR, NOT and brackets.
+/// Adds a range on the column beside each "[Column] LIKE 'text*'" in `condition`, so that SQLite can use the
+/// column's index, which it does not do for an overridden LIKE. The result selects the same rows. A
+/// comparison is left alone if its column does not hold text, its pattern is invalid or begins with a
+/// wildcard, or it is part of anything more complex than AND, OR, NOT and brackets.
 std::string WithLikeRanges(const SqliteTable& table, const std::string& condition);

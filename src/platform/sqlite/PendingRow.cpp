@@ -17,7 +17,7 @@ void PendingRow::Start(::EditMode mode) {
   mode_ = mode;
 }
 
-// Long columns are left to the database, since the first Append has to begin with nothing.
+// Not for long columns: their first Append must start from nothing. The database fills in their defaults.
 void PendingRow::TakeDefaults() {
   std::string defaults;
   for (const SqliteColumn& column : table_.Columns()) {

@@ -10,12 +10,12 @@
 
 #include "platform/Database.h"
 
-/// What a recordset has read and found in groups of reads, for as long as no row of the file has changed.
-/// Holds so many rows that a whole game's members fit; beyond that it starts anew.
+/// The rows that a recordset has read and looked up in groups of reads, valid until a row of the file
+/// changes. Large enough for the members of a whole game; when full it is emptied.
 class RowCache {
  public:
-  /// To be called before each use: forgets everything that belongs to another state of the file. States are
-  /// told apart by SqliteConnection::State.
+  /// Call before each use, with SqliteConnection::State: forgets everything read in another state of the
+  /// file.
   void Enter(std::uint64_t state) {
     if (state_ != state) {
       Clear();
@@ -28,13 +28,13 @@ class RowCache {
     found_.clear();
   }
 
-  /// The values of a row, or nullptr when it was not read yet.
+  /// The values of a row, or nullptr if it is not cached.
   const std::vector<Value>* Row(std::int64_t key) const {
     const auto held = rows_.find(key);
     return held == rows_.end() ? nullptr : &held->second;
   }
 
-  /// The reference holds until the next call of another member.
+  /// The reference is valid until the next call on this object.
   std::vector<Value>& AddRow(std::int64_t key) {
     if (rows_.size() >= MostRows) {
       rows_.clear();
@@ -42,7 +42,7 @@ class RowCache {
     return rows_[key];
   }
 
-  /// Position of the first row with `text` in `column`, or nullptr when it was not searched yet.
+  /// Position of the first row with `text` in `column` (nullopt: no such row), or nullptr if not cached.
   const std::optional<std::size_t>* Found(std::size_t column, const std::string& text) const {
     const auto ofColumn = found_.find(column);
     if (ofColumn == found_.end()) {

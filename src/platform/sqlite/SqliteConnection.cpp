@@ -25,14 +25,14 @@ void DeletePattern(void* pattern) {
   delete static_cast<JetPattern*>(pattern);
 }
 
-// "X LIKE Y" comes as like(Y, X).
+// SQLite calls this as like(Y, X) for "X LIKE Y".
 void Like(sqlite3_context* context, int, sqlite3_value** arguments) {
   if (sqlite3_value_type(arguments[0]) == SQLITE_NULL || sqlite3_value_type(arguments[1]) == SQLITE_NULL) {
     sqlite3_result_null(context);
     return;
   }
   try {
-    // A pattern that is the same for all rows is compiled once.
+    // A constant pattern is compiled once for all rows.
     const auto* kept = static_cast<const JetPattern*>(sqlite3_get_auxdata(context, 0));
     if (kept != nullptr) {
       sqlite3_result_int(context, kept->Matches(TextOf(arguments[1])));
@@ -49,10 +49,10 @@ void Like(sqlite3_context* context, int, sqlite3_value** arguments) {
   }
 }
 
-// Asks the file system and does not open the file: closing any descriptor of a database file takes away the
-// locks that this process holds on it through other connections.
+// Uses stat and does not open the file: closing any descriptor of a database file would drop the locks that
+// this process holds on it through other connections.
 void CheckFile(const std::string& path) {
-  constexpr off_t SmallestDatabase = 512;
+  constexpr off_t smallestDatabase = 512;
   struct stat info {};
   if (stat(path.c_str(), &info) != 0) {
     if (errno == ENOENT || errno == ENOTDIR) {
@@ -65,7 +65,7 @@ void CheckFile(const std::string& path) {
     throw RuntimeError(Fault::DatabaseCannotOpen, "Cannot open the file '" + path + "'. It is no file.");
   }
   // An empty file would pass for a database without tables.
-  if (info.st_size < SmallestDatabase) {
+  if (info.st_size < smallestDatabase) {
     throw UnrecognizedFormat(path);
   }
 }
@@ -75,10 +75,10 @@ void CheckFile(const std::string& path) {
 SqliteConnection::SqliteConnection(const std::string& path, std::chrono::milliseconds busyTimeout)
     : path_(path) {
   CheckFile(path);
-  constexpr int Flags =
+  constexpr int flags =
       SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOMUTEX | SQLITE_OPEN_PRIVATECACHE | SQLITE_OPEN_EXRESCODE;
   try {
-    if (sqlite3_open_v2(path.c_str(), &handle_, Flags, nullptr) != SQLITE_OK) {
+    if (sqlite3_open_v2(path.c_str(), &handle_, flags, nullptr) != SQLITE_OK) {
       Fail();
     }
     Configure(busyTimeout);
@@ -94,15 +94,15 @@ void SqliteConnection::Configure(std::chrono::milliseconds busyTimeout) {
                                  nullptr, nullptr, nullptr) != SQLITE_OK) {
     Fail();
   }
-  // The first read meets a file that is no database, is cut short or has a damaged schema.
+  // This first read fails on a file that is not a database, is truncated or has a damaged schema.
   Execute("SELECT count(*) FROM sqlite_master");
   CheckWholePages();
-  // EXTRA also makes the removal of the journal durable; without it a power failure just after a commit could
-  // bring the journal, and with it the old rows, back.
+  // EXTRA also makes the deletion of the journal durable; without it a power failure just after a commit
+  // could bring back the journal, and with it the old rows.
   Execute("PRAGMA synchronous = EXTRA");
 }
 
-// A file that was cut within its last page opens, and would show its fault only once that page is read.
+// A file truncated within its last page opens without error and would fail only when that page is read.
 void SqliteConnection::CheckWholePages() {
   SqliteStatement pageSize(*this, "PRAGMA page_size");
   struct stat info {};
@@ -119,7 +119,7 @@ SqliteConnection::~SqliteConnection() {
 SqliteStatement SqliteConnection::PrepareSearch(const SqliteTable& table, const std::string& condition,
                                                 int syntaxError) {
   // The line break ends a comment in the condition, which would otherwise hide the closing bracket. The plus
-  // keeps the whole table from being walked for the sake of the order where an index would find the rows.
+  // keeps SQLite from scanning the whole table for its order where an index would find the rows.
   const std::string sql = "SELECT rowid FROM [" + table.Name() + "] WHERE (" +
                           WithLikeRanges(table, condition) + "\n) ORDER BY +rowid";
   sqlite3_stmt* prepared = nullptr;
@@ -130,7 +130,7 @@ SqliteStatement SqliteConnection::PrepareSearch(const SqliteTable& table, const 
   if (result != SQLITE_OK && (result & 0xFF) != SQLITE_ERROR) {
     Fail();
   }
-  // What follows a semicolon would be a second statement, and nobody gives values for parameters.
+  // Text after a semicolon would be a second statement, and parameters would have no values.
   const bool whole = result == SQLITE_OK && tail == sql.c_str() + sql.size();
   if (!whole || sqlite3_bind_parameter_count(prepared) != 0) {
     Rollback();
@@ -182,11 +182,11 @@ void SqliteConnection::PrepareChange() {
 
 void SqliteConnection::CopyTo(const std::string& path) {
   sqlite3* copy = nullptr;
-  constexpr int Flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
-  int result = sqlite3_open_v2(path.c_str(), &copy, Flags, nullptr);
+  constexpr int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
+  int result = sqlite3_open_v2(path.c_str(), &copy, flags, nullptr);
   const std::unique_ptr<sqlite3, decltype(&sqlite3_close)> closeAtEnd(copy, sqlite3_close);
   if (result == SQLITE_OK) {
-    // Nobody needs half of a copy, nor the journal that would undo it.
+    // A partial copy is of no use, so it needs no journal to be rolled back by.
     sqlite3_exec(copy, "PRAGMA journal_mode = OFF", nullptr, nullptr, nullptr);
     sqlite3_backup* backup = sqlite3_backup_init(copy, "main", handle_, "main");
     if (backup == nullptr) {

@@ -11,11 +11,10 @@
 class SqliteTable;
 struct sqlite3;
 
-/// One connection to a database file, with Jet's LIKE.
+/// One connection to a database file, on which LIKE follows Jet's rules.
 class SqliteConnection {
  public:
-  /// Opens an existing file, read-only where it may not be written. Throws as DatabaseEngine::OpenDatabase
-  /// does.
+  /// Opens an existing file, read-only if it is write-protected. Throws as DatabaseEngine::OpenDatabase does.
   SqliteConnection(const std::string& path, std::chrono::milliseconds busyTimeout);
   ~SqliteConnection();
   SqliteConnection(const SqliteConnection&) = delete;
@@ -24,25 +23,23 @@ class SqliteConnection {
   sqlite3* Handle() const { return handle_; }
   const std::string& Path() const { return path_; }
 
-  /// The keys of the rows of `table` that `condition` holds for, in table order. Throws RuntimeError
-  /// `syntaxError` when the condition cannot be read.
+  /// A query for the keys of the rows of `table` for which `condition` is true, in table order. Throws
+  /// RuntimeError `syntaxError` if the condition is malformed.
   SqliteStatement PrepareSearch(const SqliteTable& table, const std::string& condition, int syntaxError);
 
   /// See Database::BeginRead.
   void BeginRead() { ++readers_; }
   void EndRead() noexcept;
 
-  /// To be called before each read: inside a group of reads takes the lock where it is not held.
+  /// Call before each read: inside a group of reads, takes the lock if it is not held.
   void PrepareRead();
-  /// True inside a group of reads: then nobody but this connection can change the file after PrepareRead.
+  /// True inside a group of reads: after PrepareRead only this connection can then change the file.
   bool InGroup() const { return readers_ > 0; }
-  /// A number for the state of the file that a group of reads sees; another one whenever a row may have
-  /// changed.
+  /// Identifies the state of the file that a group of reads sees; differs whenever a row may have changed.
   std::uint64_t State() const { return state_; }
-  /// To be called before each write.
+  /// Call before each write.
   void LeaveState() { ++state_; }
-  /// A group of reads lets go of its lock until its next read. Does nothing between the writes of a
-  /// transaction.
+  /// Releases the lock of a group of reads until its next read. Does nothing within a WriteTransaction.
   void Rollback() noexcept;
 
   /// See Database::BeforeChange and CopyTo.
@@ -53,7 +50,7 @@ class SqliteConnection {
   std::int64_t LastInsertedKey() const;
   std::int64_t ChangedRows() const;
 
-  /// Throws what the last call of SQLite reported; the open transaction is rolled back.
+  /// Rolls back the open transaction and throws the error of the last SQLite call.
   [[noreturn]] void Fail();
 
  private:
@@ -69,22 +66,22 @@ class SqliteConnection {
   int readers_ = 0;
   bool writing_ = false;  ///< a WriteTransaction is open
   SqliteStatement dataVersion_;
-  std::int64_t versionRead_ = 0;  ///< counts the changes by others
+  std::int64_t versionRead_ = 0;  ///< last data_version; differs after a change by another connection
   std::uint64_t state_ = 1;
   std::function<bool()> beforeChange_;
 };
 
-/// Writes that reach the file together when Commit returns, or not at all. One inside another is a part of
-/// it; a fault in the part undoes the whole.
+/// Writes that are committed together, or not at all. A nested transaction is part of the outer one; an error
+/// in it rolls back the whole.
 class WriteTransaction {
  public:
-  /// Throws RuntimeError 3034 inside one that was undone.
+  /// Throws RuntimeError 3034 inside a transaction that was rolled back.
   explicit WriteTransaction(SqliteConnection& connection);
   ~WriteTransaction();
   WriteTransaction(const WriteTransaction&) = delete;
   WriteTransaction& operator=(const WriteTransaction&) = delete;
 
-  /// What was written is durable on return, unless this is part of another.
+  /// The writes are durable on return. Does nothing in a nested transaction.
   void Commit();
 
  private:

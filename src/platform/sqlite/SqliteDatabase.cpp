@@ -16,7 +16,7 @@ void SkipBlanks(std::string_view& text) {
   text.remove_prefix(first == std::string_view::npos ? text.size() : first);
 }
 
-// Takes the next word, or a name in brackets without these.
+// Takes the next word, or the name between brackets.
 std::string_view TakeWord(std::string_view& text) {
   SkipBlanks(text);
   if (text.starts_with('[')) {

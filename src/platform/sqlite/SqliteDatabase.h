@@ -9,7 +9,7 @@
 #include "platform/Database.h"
 #include "platform/sqlite/SqliteConnection.h"
 
-/// A database in an SQLite file. Tables need rowids; the keys of a dynaset are these.
+/// A database in an SQLite file. Its tables must have rowids, which are the keys of a dynaset.
 class SqliteDatabase : public Database {
  public:
   SqliteDatabase(const std::string& path, std::chrono::milliseconds busyTimeout)

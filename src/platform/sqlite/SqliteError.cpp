@@ -11,8 +11,8 @@ bool IsNoSpace(int systemError) {
   return systemError == ENOSPC || systemError == EDQUOT || systemError == EFBIG;
 }
 
-// SQLite reports a full disk by number only where the system said ENOSPC; a quota or a limit on the file's
-// size comes as an I/O error, whose cause is kept with the file, or in errno when it met the journal.
+// SQLite reports a full disk as such only for ENOSPC. A quota or file-size limit comes as an I/O error; its
+// cause is kept with the file, or in errno if it hit the journal.
 bool NoSpaceLeft(sqlite3* database, int code) {
   if (code != SQLITE_IOERR) {
     return code == SQLITE_FULL;

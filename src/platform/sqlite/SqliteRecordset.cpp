@@ -9,7 +9,7 @@ namespace {
 
 const Value Null;
 
-// Lets a search go before its last row.
+// Resets a query that may stop before its last row, since it would go on holding the file's lock.
 class ResetAtEnd {
  public:
   explicit ResetAtEnd(SqliteStatement& statement) : statement_(statement) {}
@@ -34,8 +34,8 @@ SqliteRecordset::SqliteRecordset(SqliteConnection& connection, const std::string
   ReadKeys(condition);
 }
 
-// The keys of a whole table are taken in whatever order is cheapest: an index is a small part of the table,
-// and reading it instead makes a cold start several times faster.
+// The keys of a whole table are read in whatever order is cheapest (KeySet sorts them): SQLite can then scan
+// an index, which is much smaller than the table, and a cold start is several times faster.
 void SqliteRecordset::ReadKeys(const std::string& condition) {
   connection_.PrepareRead();
   SqliteStatement search = condition.empty()
@@ -75,7 +75,7 @@ void SqliteRecordset::Move(void (KeyCursor::*move)()) {
 
 void SqliteRecordset::MoveFirst() {
   Move(&KeyCursor::MoveFirst);
-  // A walk begins, which may well ask for other columns than what came before it.
+  // A new pass over the rows may need other columns than the last one did.
   wanted_.assign(wanted_.size(), false);
   read_ = SqliteStatement();
   cache_.Clear();
@@ -89,7 +89,7 @@ std::optional<std::size_t> SqliteRecordset::FirstPosition(SqliteStatement& searc
     const std::optional<std::size_t> position = cursor_.Keys().PositionOf(search.Integer(0));
     if (position && (!first || *position < *first)) {
       first = position;
-      // The search yields keys in ascending order.
+      // The query yields ascending keys, so no later one can come before this.
       if (cursor_.Keys().Ascending()) {
         break;
       }
@@ -100,7 +100,7 @@ std::optional<std::size_t> SqliteRecordset::FirstPosition(SqliteStatement& searc
 
 void SqliteRecordset::FindFirst(const std::string& criterion) {
   pending_.Drop();
-  // Scoring asks for the same mission once for each player.
+  // The query is kept: scoring looks up the same mission once for each player.
   if (!find_ || criterion != findCriterion_) {
     connection_.PrepareRead();
     find_ = connection_.PrepareSearch(table_, criterion, Fault::CriterionSyntax);
@@ -129,7 +129,7 @@ bool SqliteRecordset::WalkTo(const std::string& column, const Value& value) {
   return false;
 }
 
-// The commonest search: finding the row and reading it are one.
+// The most common look-up, for which reading the row also shows that it exists.
 bool SqliteRecordset::WalkToKey(std::int64_t key) {
   const std::optional<std::size_t> position = cursor_.Keys().PositionOf(key);
   if (!position) {
@@ -264,7 +264,8 @@ const Value& SqliteRecordset::Fields(std::string_view column) {
   return (*row_)[i];
 }
 
-// Who asks for many columns of a row that was not looked up shows it whole, and soon asks for the others.
+// A caller that reads many columns of a row it has moved to, not looked up, is showing the whole row and will
+// soon need the rest: read all of them at once.
 void SqliteRecordset::Want(std::size_t column) {
   wanted_[column] = true;
   constexpr std::ptrdiff_t few = 3;

@@ -15,13 +15,12 @@
 #include "platform/sqlite/SqliteConnection.h"
 #include "platform/sqlite/SqliteTable.h"
 
-/// A dynaset over one table. The current row is read at the first Fields after a move, and of it only the
-/// columns that were asked for since the last MoveFirst, which are few where many rows are looked up; all of
-/// them once many were asked for without a look-up. A long binary column (declared type BLOB) is read whole
-/// when the row's is first asked for.
+/// A dynaset over one table. The first Fields after a move reads the current row, but only the columns used
+/// since the last MoveFirst: few when many rows are looked up. Once many columns have been used without a
+/// look-up, all are read. A long binary column (declared type BLOB) is read separately, when first used.
 class SqliteRecordset : public Recordset {
  public:
-  /// The rows of `table` that `condition` holds for (all when it is empty), in table order. Throws as
+  /// The rows of `table` for which `condition` is true (all if it is empty), in table order. Throws as
   /// Database::OpenRecordset does.
   SqliteRecordset(SqliteConnection& connection, const std::string& table, const std::string& condition);
 
@@ -79,14 +78,15 @@ class SqliteRecordset : public Recordset {
   SqliteStatement find_;
   bool noMatch_ = false;
 
-  // By column, as are the other vectors.
+  // Indexed by column, like the other vectors.
   std::vector<SqliteStatement> walks_;
   std::vector<bool> wanted_;
   SqliteStatement read_;
-  std::vector<Value> ownRow_;                ///< a row that was read outside of a group of reads
-  const std::vector<Value>* row_ = nullptr;  ///< the current row once it is read
+  std::vector<Value> ownRow_;                ///< the last row read from the file
+  const std::vector<Value>* row_ = nullptr;  ///< the current row once it has been read
   RowCache cache_;
-  /// The current row was searched by a value, as will be again; a walk reads each row once.
+  /// True if WalkTo found the current row. Such rows are cached, since they will be looked up again; moving
+  /// along the rows reads each one only once.
   bool lookedUp_ = false;
   std::map<std::size_t, Value> longValues_;
 

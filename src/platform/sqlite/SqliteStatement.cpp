@@ -46,7 +46,7 @@ void SqliteStatement::Bind(int parameter, const Value& value) {
     result =
         sqlite3_bind_text64(statement_, parameter, text->data(), text->size(), SQLITE_STATIC, SQLITE_UTF8);
   } else if (const auto* blob = std::get_if<Blob>(&value)) {
-    // An empty vector may have no address, which would bind NULL.
+    // An empty vector's data() may be null, which would bind NULL.
     result = blob->empty()
                  ? sqlite3_bind_zeroblob(statement_, parameter, 0)
                  : sqlite3_bind_blob64(statement_, parameter, blob->data(), blob->size(), SQLITE_STATIC);

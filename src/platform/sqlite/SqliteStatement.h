@@ -9,12 +9,12 @@ struct sqlite3_stmt;
 
 class SqliteConnection;
 
-/// A prepared statement. It is reset by each Bind and when it has run to its end; one left in the midst of
-/// its rows holds a lock on the file, so call Reset.
+/// A prepared statement. Each Bind resets it, and so does reaching the end. Stopped before its last row it
+/// holds a lock on the file, so call Reset.
 class SqliteStatement {
  public:
   SqliteStatement() = default;
-  /// Throws RuntimeError (see SqliteError.h) when `sql` cannot be prepared.
+  /// Throws RuntimeError (see SqliteError.h) if `sql` cannot be prepared.
   SqliteStatement(SqliteConnection& connection, const std::string& sql);
   SqliteStatement(SqliteConnection& connection, sqlite3_stmt* statement);
   ~SqliteStatement();
@@ -23,15 +23,15 @@ class SqliteStatement {
 
   explicit operator bool() const { return statement_ != nullptr; }
 
-  /// Parameters count from 1. A text or blob must live until the statement has run.
+  /// Parameters count from 1. A text or blob must outlive the statement's run.
   void Bind(int parameter, const Value& value);
   void Bind(int parameter, std::int64_t value);
 
-  /// Goes to the next row; false at the end. Throws RuntimeError, the statement being reset then.
+  /// Moves to the next row; false at the end. On failure resets the statement and throws RuntimeError.
   bool Step();
   void Reset();
 
-  /// Columns of the present row, counted from 0. Read keeps the memory that `value` already holds for a text.
+  /// Columns of the current row, counted from 0. Read reuses the memory of a text already in `value`.
   std::int64_t Integer(int column) const;
   std::string Text(int column) const;
   void Read(int column, Value& value) const;

@@ -17,7 +17,7 @@ bool Contains(const std::string& type, std::string_view part) {
          }) != type.end();
 }
 
-// SQLite's own rule for a declared type; dates are not among the numbers.
+// SQLite's own rule for a declared type, except that dates are not numbers.
 bool TakesNumbers(const std::string& type) {
   return Contains(type, "INT") || Contains(type, "REAL") || Contains(type, "FLOA") ||
          Contains(type, "DOUB") || Contains(type, "NUMERIC");
@@ -76,7 +76,7 @@ SqliteTable::SqliteTable(SqliteConnection& connection, const std::string& name) 
 }
 
 std::size_t SqliteTable::ColumnAt(std::string_view name) const {
-  for (std::size_t i = 0; i < columns_.size(); ++i) {  // as it is usually written
+  for (std::size_t i = 0; i < columns_.size(); ++i) {  // fast path: the exact name
     if (columns_[i].Name == name) {
       return i;
     }

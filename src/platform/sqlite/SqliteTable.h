@@ -13,24 +13,24 @@ struct SqliteColumn {
   std::string Default;    ///< SQL expression, empty for none
   bool IsLong = false;    ///< long binary
   bool IsNumber = false;  ///< takes numbers only
-  bool IsKey = false;     ///< given by the database on insertion
-  bool IsText = false;    ///< keeps texts as texts
+  bool IsKey = false;     ///< assigned by the database on insertion
+  bool IsText = false;    ///< does not convert texts that look like numbers
 
-  /// `value` as this column keeps it: a text that goes into a number column becomes the number that it says,
-  /// blanks around it being no fault. Throws RuntimeError 3421 when it says none.
+  /// `value` as this column stores it: in a number column a text becomes the number it spells, blanks around
+  /// it ignored. Throws RuntimeError 3421 if it is not a number.
   Value Accept(Value value) const;
 };
 
-/// A table as its recordsets know it: by name and columns.
+/// Name and columns of a table.
 class SqliteTable {
  public:
-  /// Throws RuntimeError 3078 when there is no such table.
+  /// Throws RuntimeError 3078 if there is no such table.
   SqliteTable(SqliteConnection& connection, const std::string& name);
 
   const std::string& Name() const { return name_; }
   const std::vector<SqliteColumn>& Columns() const { return columns_; }
 
-  /// Position of the column in Columns(); case does not count. Throws RuntimeError 3265 when there is none.
+  /// Index of the column in Columns(), ignoring case. Throws RuntimeError 3265 if there is none.
   std::size_t ColumnAt(std::string_view name) const;
 
  private:

@@ -14,12 +14,12 @@ namespace {
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-/// A members file whose copies go to a folder beside it.
+/// A members file whose backups go to a folder beside it.
 class Backup : public testing::Test {
  protected:
   Backup() { file.AddMembers(); }
 
-  /// Begins a run of the program.
+  /// Opens the database, as at the start of a program run.
   void Open() {
     rows.reset();
     database = file.Open();
@@ -34,7 +34,7 @@ class Backup : public testing::Test {
     rows->Update();
   }
 
-  /// A run at some moment with one change.
+  /// A program run at the time `moment` that makes one change.
   void RunAt(const std::string& moment) {
     clock.DateAndTime = moment;
     Open();
@@ -96,7 +96,7 @@ TEST_F(Backup, IsMadeOfEveryKindOfChange) {
   group.Commit();
   EXPECT_EQ(Copies().size(), 3U);
   EXPECT_EQ(NickNameIn(Copies()[1]), "Shamrock");
-  EXPECT_EQ(NickNameIn(Copies()[2]), "none");  // deleted in the run before
+  EXPECT_EQ(NickNameIn(Copies()[2]), "none");  // deleted in the previous run
 }
 
 TEST_F(Backup, IsMadeWithinAGroupOfReads) {
@@ -166,7 +166,7 @@ TEST_F(Backup, TakesThePlaceOfOneThatACrashLeftHalfWritten) {
   EXPECT_EQ(NickNameIn("members-2013-05-21-143005.mdb"), "Shamrock");
 }
 
-TEST_F(Backup, ThatCannotBeMadeIsToldOnceAndHoldsUpNoChange) {
+TEST_F(Backup, ThatCannotBeMadeIsReportedOnceAndDelaysNoChange) {
   WriteFile(Folder(), "a file in place of the folder");
   Open();
   Change("first");

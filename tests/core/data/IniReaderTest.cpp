@@ -20,7 +20,7 @@ class IniReaderTest : public testing::Test {
     return Ini.ReadIni("comm", "commport", "default");
   }
 
-  /// What a file of these bytes becomes when "comm"/"commport" is written.
+  /// The file's bytes after writing `value` to "comm"/"commport".
   std::string Written(const std::string& bytes, const std::string& value) {
     Store.Put(Path, bytes);
     Ini.WriteIni("comm", "commport", value);

@@ -23,7 +23,7 @@ TEST(PhotoBlocks, AreRoundedToNearestWithTiesToEven) {
 
 class Exporting : public testing::Test {
  protected:
-  /// A member whose photo column holds `stored` bytes of the pattern, and says `length`.
+  /// A member with `stored` bytes of the pattern in the photo column, and `length` in the length column.
   void Store(std::size_t stored, const std::string& length) {
     ExecuteSql(venue.MembersFile(),
                "INSERT INTO Members (ContactID, PhotographLength) VALUES (1, " + length + ")");

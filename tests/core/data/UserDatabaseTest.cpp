@@ -26,7 +26,7 @@ class NoDatabase : public Database {
   std::string CopiedTo;
 };
 
-/// Opens what exists and is not said to be bad.
+/// Opens any file that exists and is not listed as bad.
 class ScriptedEngine : public DatabaseEngine {
  public:
   std::vector<std::string> Opened;

@@ -38,7 +38,7 @@ class Commit : public testing::Test {
 
   void Sql(const std::string& sql) { ExecuteSql(venue.MembersFile(), sql); }
 
-  /// An active player with these figures of the game.
+  /// An active player with these figures in the game.
   Player& Play(int index, std::int32_t member, std::int32_t damage = 10, std::int32_t soldiering = 20,
                float accuracy = 0.5F) {
     Player& player = venue.Activate(index);
@@ -153,7 +153,7 @@ TEST_F(Commit, CountsNullAsZero) {
   EXPECT_EQ(Figure("TotalGamesPlayed || ' ' || TotalDamage || ' ' || AverageSoldiering"), "1 10.0 20.0");
 }
 
-TEST_F(Commit, SkipsWhoHasNoMemberOrDidNotPlay) {
+TEST_F(Commit, SkipsPlayersWithoutAMemberOrWhoDidNotPlay) {
   AddMembers(2);
   Play(1, 0);
   Play(2, 1).Active = false;
@@ -201,7 +201,7 @@ TEST_F(Commit, LeavesThePlayerUncommittedWhenTheMemberIsGone) {
   for (int index = 1; index <= 4; ++index) {
     Play(index, index);
   }
-  // Whoever waits for the box to close can use the file, and has what was committed before it.
+  // While the box is open other programs can write the file, and see what was committed before it.
   venue.Boxes.WhileOpen = [this](const FakeMessageBoxes::Box&) {
     EXPECT_EQ(Figure("TotalGamesPlayed"), "1");
     Sql("UPDATE Members SET City = 'Other'");
@@ -225,7 +225,7 @@ TEST_F(Commit, StopsAtTheRowThatTheDatabaseRefusesAndKeepsThoseBefore) {
   EXPECT_EQ(Figure("TotalGamesPlayed", 2), "1");
   EXPECT_EQ(Figure(AllFigures, 3), Untouched);
   EXPECT_EQ(Figure(AllFigures, 4), Untouched);
-  // It is left out until the game is loaded again; the others can still get in.
+  // The refused player is left out until the game is loaded again; the others can still be committed.
   Sql("DROP TRIGGER Refuse");
   EXPECT_EQ(Run(), CommitResult::SomeWereAlready);
   EXPECT_THAT(CommittedPlayers(), ElementsAre(1, 2, 3, 4, 5));
@@ -277,7 +277,7 @@ TEST_F(Commit, MarksNobodyButTheFirstWhenTheLastFlushFails) {
   EXPECT_EQ(Figure("sum(TotalGamesPlayed)"), "0");
 }
 
-TEST_F(Commit, FailsOnAFigureThatCannotBe) {
+TEST_F(Commit, FailsOnAnImpossibleFigure) {
   AddMembers(1);
   Sql("UPDATE Members SET TotalGamesPlayed = -1");
   Play(1, 1);

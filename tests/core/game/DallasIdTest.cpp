@@ -12,7 +12,7 @@ TEST(DallasId, HasTwoDigitsForEachByte) {
   EXPECT_EQ(DallasIdOf({0x0A, 0x00, 0x0F, 0x10, 0x01, 0x09, 0xA0, 0xFF}), "FFA00901100F000A");
 }
 
-TEST(DallasId, IsNoButtonsWhenAllBytesAreZero) {
+TEST(DallasId, StandsForNoButtonWhenAllBytesAreZero) {
   EXPECT_EQ(DallasIdOf({}), NoDallasId);
 }
 

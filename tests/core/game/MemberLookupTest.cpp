@@ -4,6 +4,7 @@
 
 #include "core/data/FieldValue.h"
 #include "tests/support/ScoredGame.h"
+#include "tests/support/Thrown.h"
 
 namespace {
 
@@ -22,17 +23,49 @@ class Looking : public testing::Test {
   ScoredGame venue;
 };
 
-TEST_F(Looking, StandsOnTheMemberFound) {
-  ASSERT_TRUE(venue.Members->LoadMember(5));
-  EXPECT_EQ(venue.Members->GetPlayerName(true), "Mole");
-  EXPECT_EQ(venue.Members->GetPlayerName(false), "Bo Ray");
+TEST_F(Looking, FindsTheMember) {
+  const auto member = venue.Members->LoadMember(5);
+  ASSERT_TRUE(member);
+  EXPECT_EQ(member->ContactId, 5);
+  EXPECT_EQ(member->GetPlayerName(true), "Mole");
+  EXPECT_EQ(member->GetPlayerName(false), "Bo Ray");
 }
 
 TEST_F(Looking, TakesTheFullNameWithoutANickname) {
-  ASSERT_TRUE(venue.Members->LoadMember(2));
-  EXPECT_EQ(venue.Members->GetPlayerName(true), "Ann Lee");
-  ASSERT_TRUE(venue.Members->LoadMember(6));
-  EXPECT_EQ(venue.Members->GetPlayerName(true), "Cy Fox");
+  const auto ann = venue.Members->LoadMember(2);
+  ASSERT_TRUE(ann);
+  EXPECT_EQ(ann->GetPlayerName(true), "Ann Lee");
+  const auto cy = venue.Members->LoadMember(6);
+  ASSERT_TRUE(cy);
+  EXPECT_EQ(cy->GetPlayerName(true), "Cy Fox");
+}
+
+TEST_F(Looking, KeepsItsAnswerWhereverTheCursorGoes) {
+  const auto bo = venue.Members->LoadMember(5);
+  venue.Members->LoadMember(2);
+  venue.Members->LoadMember(3);
+  ASSERT_TRUE(bo);
+  EXPECT_EQ(bo->GetPlayerName(true), "Mole");
+}
+
+TEST_F(Looking, LeavesTheCursorOnTheMember) {
+  ASSERT_TRUE(venue.Members->LoadMember(5));
+  EXPECT_EQ(TextOf(venue.RsMembers->Fields("ContactID")), "5");
+}
+
+TEST_F(Looking, ReadsTheHistoryOfTheMemberWhereverTheCursorStands) {
+  ExecuteSql(venue.MembersFile(),
+             "UPDATE Members SET Clan = 'Owls', TotalGamesPlayed = 12, AveragePrimAccuracy = 0.5, "
+             "AverageDamage = 12.25, AverageSoldiering = -3 WHERE ContactID = 5");
+  venue.Members->LoadMember(2);
+  const MemberHistory history = venue.Members->LoadHistory(5);
+  EXPECT_EQ(history.Clan, "Owls");
+  EXPECT_EQ(history.TotalGamesPlayed, 12);
+  EXPECT_EQ(history.AveragePrimAccuracy, 0.5);
+  EXPECT_EQ(history.AverageDamage, 12.25);
+  EXPECT_EQ(history.AverageSoldiering, -3);
+  EXPECT_EQ(NumberThrownBy([this] { venue.Members->LoadHistory(3); }), 3021);
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
 TEST_F(Looking, EndsPastTheLastRowWhenThereIsNone) {
@@ -51,8 +84,9 @@ TEST_F(Looking, FindsTheFirstHolderOfAButtonAndStandsBehind) {
 
 TEST_F(Looking, ForANameWithoutValuesGivesTheBlank) {
   ExecuteSql(venue.MembersFile(), "UPDATE Members SET FirstName = NULL, LastName = NULL");
-  ASSERT_TRUE(venue.Members->LoadMember(2));
-  EXPECT_EQ(venue.Members->GetPlayerName(true), " ");
+  const auto member = venue.Members->LoadMember(2);
+  ASSERT_TRUE(member);
+  EXPECT_EQ(member->GetPlayerName(true), " ");
 }
 
 TEST_F(Looking, DoesNotSeeMembersAddedLater) {
@@ -63,8 +97,9 @@ TEST_F(Looking, DoesNotSeeMembersAddedLater) {
 
 TEST_F(Looking, SeesNamesChangedLater) {
   ExecuteSql(venue.MembersFile(), "UPDATE Members SET NickName = 'Owl' WHERE ContactID = 5");
-  ASSERT_TRUE(venue.Members->LoadMember(5));
-  EXPECT_EQ(venue.Members->GetPlayerName(true), "Owl");
+  const auto member = venue.Members->LoadMember(5);
+  ASSERT_TRUE(member);
+  EXPECT_EQ(member->GetPlayerName(true), "Owl");
 }
 
 TEST_F(Looking, DoesNotFindAMemberDeletedLater) {

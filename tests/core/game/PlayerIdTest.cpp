@@ -65,7 +65,7 @@ TEST(IdFromTeamAndNumber, StepsFromBlockToBlock) {
   EXPECT_EQ(Id(3, 31), 127);
 }
 
-TEST(IdFromTeamAndNumber, IsZeroForAGunThatCannotBe) {
+TEST(IdFromTeamAndNumber, IsZeroForAGunThatCannotExist) {
   EXPECT_EQ(Id(3, 32), 0);
   EXPECT_EQ(Id(0, 5), 0);
   EXPECT_EQ(Id(4, 5), 0);

@@ -105,8 +105,8 @@ TEST(CalculateScores, TellsTheViewsOfBothListsInTheEnd) {
   venue.Activate(Red0);
   int boardRows = 99;
   int teamRows = 99;
-  venue.Board.Changed = [&] { boardRows = venue.Board.RowCount(); };
-  venue.Teams.Changed = [&] { teamRows = venue.Teams.RowCount(); };
+  venue.BoardChanged = [&] { boardRows = venue.Board.RowCount(); };
+  venue.TeamsChanged = [&] { teamRows = venue.Teams.RowCount(); };
   venue.CalculateScores();
   EXPECT_EQ(boardRows, 1U);
   EXPECT_EQ(teamRows, 3U);
@@ -323,7 +323,7 @@ TEST(Accuracy, IsNothingWithoutShots) {
   }
 }
 
-TEST(Accuracy, IsStoredWith32BitsAndEntersTheSumSo) {
+TEST(Accuracy, IsRoundedTo32BitsBeforeItEntersTheSum) {
   ScoredGame venue;
   venue.Factors.Accuracy = 1e8;
   venue.Factors.Damage = 0;

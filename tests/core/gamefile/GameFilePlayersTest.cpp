@@ -7,7 +7,7 @@
 #include "core/gamefile/GameFile.h"
 #include "tests/support/Thrown.h"
 
-// Where the players of a game file begin and end, in files that other programs or hands have made.
+// How players are found in game files that were written by other programs or by hand.
 
 namespace {
 
@@ -20,7 +20,7 @@ std::string PlayerOf(int index) {
 
 class Players : public testing::Test {
  protected:
-  /// Indexes of the active players of a file; none when it is refused.
+  /// Indexes of the active players in a file; nullopt if it is refused.
   std::optional<std::vector<int>> ActiveIn(const std::string& bytes) {
     game.Clear();
     if (!ReadGameFile(bytes, game, [](const std::string&) {})) {
@@ -92,7 +92,7 @@ TEST_F(Players, OfSeveralPlayerDatasCountTogether) {
               ElementsAre(3, 5, 9));
 }
 
-TEST_F(Players, OneOfThemMalformedMakesTheFileNone) {
+TEST_F(Players, MakeTheWholeFileInvalidWhenOneIsMalformed) {
   for (const char* fault : {"<Index>5</Inde>", "<Player>", "</Player>", "<A", "</PlayerData>", "<!--"}) {
     EXPECT_FALSE(ActiveIn(InData(PlayerOf(3) + PlayerOf(4) + fault + PlayerOf(7))).has_value()) << fault;
   }

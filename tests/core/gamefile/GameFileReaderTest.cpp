@@ -20,7 +20,7 @@ std::string Repeated(const std::string& text, int times) {
   return repeated;
 }
 
-/// `text` as UTF-16 behind its mark.
+/// `text` as UTF-16 after a byte-order mark.
 std::string InUtf16(const std::u16string& text, bool lowByteFirst) {
   std::string bytes;
   for (const char16_t unit : u'\uFEFF' + text) {
@@ -52,7 +52,7 @@ class Reading : public testing::Test {
     return leaf;
   }
 
-  /// A game with this text within its only player.
+  /// A game file with `contents` inside its only player.
   static std::string WithPlayer(const std::string& contents) {
     return "<GameData><PlayerData><Player>" + contents + "</Player></PlayerData></GameData>";
   }
@@ -61,7 +61,7 @@ class Reading : public testing::Test {
     return WithPlayer("<Index>1</Index><HitData><HitByPlayer>" + contents + "</HitByPlayer></HitData>");
   }
 
-  /// Expects the fault with player 1 whose leaf `name` has `text`.
+  /// Expects RuntimeError `number` for a player 1 with `text` in the leaf `name`.
   void ExpectFault(int number, const std::string& name, const std::string& text) {
     EXPECT_EQ(FaultIn(WithPlayer("<Index>1</Index>" + Leaf(name, text))), number) << name << " is " << text;
   }

@@ -15,7 +15,7 @@ using testing::StartsWith;
 
 class Writing : public testing::Test {
  protected:
-  /// The file as it is to be, line by line: a line ends in CR LF behind each leaf and nowhere else.
+  /// The expected file from its lines: CR LF after each leaf and nowhere else.
   static std::string WithFileBreaks(const std::string& lines) {
     std::string bytes;
     for (const char letter : lines) {

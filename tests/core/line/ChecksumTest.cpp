@@ -28,7 +28,7 @@ TEST(Crc8, GivesThePublishedCheckValue) {
 }
 
 TEST(Crc8, GivesTheCheckByteOfARegistrationNumber) {
-  // The worked example of the 1-Wire literature: family 02, serial number 00000001B81C, check byte A2.
+  // The worked example in the 1-Wire documentation: family 02, serial number 00000001B81C, check byte A2.
   const std::vector<std::uint8_t> number = {0x02, 0x1C, 0xB8, 0x01, 0x00, 0x00, 0x00};
   EXPECT_EQ(Crc8(number), 0xA2);
 }

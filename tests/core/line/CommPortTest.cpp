@@ -95,7 +95,7 @@ TEST_F(OpeningThePort, AsksAgainUntilCancel) {
   EXPECT_TRUE(commPort.CommDisabled());
 }
 
-TEST_F(OpeningThePort, AsksForANumberThatIsNone) {
+TEST_F(OpeningThePort, AsksWhenTheNumberIsInvalid) {
   for (const char* number :
        {"abc", "2abc", "", "0", "-3", "3", "32767", "32768", "-32769", "65538", "99999", "1e99"}) {
     PutIni(std::string("[comm]\ncommport=") + number + "\n");

@@ -13,7 +13,7 @@ namespace {
 constexpr double Infinity = std::numeric_limits<double>::infinity();
 constexpr double NotANumber = std::numeric_limits<double>::quiet_NaN();
 
-/// Number of the RuntimeError that `action` throws, 0 when it throws none.
+/// Number of the RuntimeError that `action` throws, 0 if it throws none.
 template <typename Action>
 int ErrorOf(const Action& action) {
   try {
@@ -278,7 +278,7 @@ TEST(Round2, TakesTiesToTheEvenHundredth) {
 }
 
 TEST(Round2, SeesTheProductInDoublePrecision) {
-  // Both lie a little below their texts; the products with 100 are 111.5 and 100.49999999999999.
+  // Both doubles are a little below the decimals; times 100 they give 111.5 and 100.49999999999999.
   EXPECT_EQ(Round2(1.115), 1.12);
   EXPECT_EQ(Round2(1.005), 1.0);
 }
@@ -304,8 +304,8 @@ TEST(FormatPercent, RoundsAnExactTieAwayFromZero) {
 }
 
 TEST(FormatPercent, RoundsTheExactValueAndNotAProduct) {
-  // A little above 0.00125, a little below 0.00115, and one whose product with 100 in double is the
-  // tie 1.005.
+  // A little above 0.00125, a little below 0.00115, and one that times 100 gives exactly the tie 1.005 in
+  // double precision.
   EXPECT_EQ(FormatPercent(0.00125), "0.13%");
   EXPECT_EQ(FormatPercent(0.00115), "0.11%");
   EXPECT_EQ(FormatPercent(0.01005), "1.00%");

@@ -46,7 +46,7 @@ TEST(StringTable, HasEveryTextInBothLanguages) {
   EXPECT_EQ(chinese.Text(114), "红队");
 }
 
-TEST(StringTable, HasTeamNamesThatThePlayerTextsCanBeTakenApartBy) {
+TEST(StringTable, HasTeamNamesByWhichPlayerTextsCanBeParsed) {
   for (const Language language : {Language::English, Language::SimplifiedChinese}) {
     const StringTable texts(language);
     for (int number = 114; number <= 116; ++number) {

@@ -19,7 +19,7 @@ TEST(IsUtf8, AcceptsWellFormedTexts) {
 
 TEST(IsUtf8, RefusesMalformedSequences) {
   for (const char* text : {"\x80", "\xBF", "\xC3", "\xC3(", "\xE2\x82", "\xE2\x82(", "\xF0\x9F\x98",
-                           "\xF0\x9F\x98(",                                             // broken off
+                           "\xF0\x9F\x98(",                                             // truncated
                            "\xC0\x80", "\xC1\xBF", "\xE0\x9F\xBF", "\xF0\x8F\xBF\xBF",  // overlong
                            "\xED\xA0\x80", "\xED\xBF\xBF",                              // surrogates
                            "\xF4\x90\x80\x80", "\xF5\x80\x80\x80", "\xFF", "\xFE"}) {

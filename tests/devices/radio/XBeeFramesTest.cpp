@@ -71,19 +71,20 @@ class ReadPacket : public testing::Test {
 TEST_F(ReadPacket, TakesTheHeaderAndOneByteMoreThanThePayload) {
   frame.Data[0] = 2;
   const GunPacket packet = ReadGunPacket(frame);
-  EXPECT_THAT(Bytes(packet.begin(), packet.begin() + 10),
-              ElementsAre(2, 101, 102, 103, 104, 105, 106, 107, 0, 0));
+  EXPECT_THAT((Bytes{packet.PayloadLength, packet.PlayerId, packet.Byte2, packet.Byte3, packet.Type}),
+              ElementsAre(2, 101, 102, 103, 104));
+  EXPECT_THAT(Bytes(packet.Payload.begin(), packet.Payload.begin() + 5), ElementsAre(105, 106, 107, 0, 0));
 }
 
 TEST_F(ReadPacket, GoesByTheAnnouncedLengthAndNotByTheFrames) {
   frame.Data[0] = 3;
   frame.DataLength = 0;
-  EXPECT_EQ(ReadGunPacket(frame)[8], 108);
+  EXPECT_EQ(ReadGunPacket(frame).Payload[3], 108);
 }
 
 TEST_F(ReadPacket, HasRoomFor94BytesOfPayload) {
   frame.Data[0] = 94;
-  EXPECT_EQ(ReadGunPacket(frame)[99], 199);
+  EXPECT_EQ(ReadGunPacket(frame).Payload[94], 199);
   for (const std::uint8_t length : Bytes{95, 96, 255}) {
     frame.Data[0] = length;
     try {

@@ -21,14 +21,14 @@ Ran RunShell(const std::string& script, std::chrono::milliseconds silence = 10s)
   return ran;
 }
 
-TEST(ChildProgram, HandsItsOutputOver) {
+TEST(ChildProgram, PassesItsOutputOn) {
   const Ran ran = RunShell("printf 'one\\ntwo'");
   EXPECT_TRUE(ran.End.Succeeded);
   EXPECT_EQ(ran.Output, "one\ntwo");
   EXPECT_EQ(ran.End.Error, "");
 }
 
-TEST(ChildProgram, HandsMoreOverThanAPipeHolds) {
+TEST(ChildProgram, PassesOnMoreThanAPipeHolds) {
   const Ran ran = RunShell("head -c 3000000 /dev/zero; head -c 200000 /dev/zero >&2");
   EXPECT_TRUE(ran.End.Succeeded);
   EXPECT_EQ(ran.Output.size(), 3000000U);
@@ -63,7 +63,7 @@ TEST(ChildProgram, IsEndedWhenItsOutputIsRefused) {
   EXPECT_EQ(NumberThrownBy([&] { RunChild("/bin/sh", {"-c", "echo x; exec sleep 60"}, 10s, refuse); }), 3343);
 }
 
-TEST(ChildProgram, ThatIsMissingIsTold) {
+TEST(ChildProgram, ThatIsMissingIsReported) {
   EXPECT_EQ(NumberThrownBy([] { RunChild("/nowhere/program", {}, 1s, [](std::string_view) {}); }), 53);
 }
 

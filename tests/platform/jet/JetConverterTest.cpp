@@ -29,7 +29,7 @@ class Conversion : public testing::Test {
  protected:
   void SetUp() override { SKIP_WITHOUT_OLD_FILES(); }
 
-  /// A copy of an old file that may be written.
+  /// A writable copy of an old file.
   std::string Copy(const char* name) const {
     const std::string copy = folder / (std::string(name) + ".mdb");
     WriteFile(copy, ReadFile(std::string(TESSARINE_OLD_FILES "/") + name + ".mdb"));
@@ -45,7 +45,7 @@ class Conversion : public testing::Test {
                                                   std::filesystem::directory_iterator()));
   }
 
-  /// Number of values of the converted file that differ from the JSON, which is `json`.
+  /// Number of values in the converted file that differ from the expected ones in `json`.
   static std::string Differences(const std::string& path, const OldFile& old, const std::string& json) {
     OtherConnection connection(path);
     connection.Execute("CREATE TEMP TABLE Json (Text)");
@@ -80,7 +80,7 @@ class Conversion : public testing::Test {
   JetConverter converter{JetReaderPath(), 1s};
 };
 
-TEST_F(Conversion, TakesEveryValueOver) {
+TEST_F(Conversion, ConvertsEveryValue) {
   for (const OldFile& old : OldFiles) {
     const std::string path = Copy(old.Name);
     EXPECT_TRUE(converter.IsOld(path));
@@ -92,7 +92,7 @@ TEST_F(Conversion, TakesEveryValueOver) {
   }
 }
 
-TEST_F(Conversion, KeepsTheOldFileUnderANameThatNothingHas) {
+TEST_F(Conversion, KeepsTheOldFileUnderAnUnusedName) {
   const std::string path = Copy("members");
   const std::string before = ReadFile(path);
   WriteFile(path + ".jet", "an older one");
@@ -139,9 +139,9 @@ TEST_F(Conversion, WithoutItsTableFails) {
   EXPECT_EQ(FilesInFolder(), 1U);
 }
 
-TEST_F(Conversion, TellsOfTablesThatItDoesNotTake) {
+TEST_F(Conversion, IntoADatabaseWithoutTheTableFails) {
   const std::string path = Copy("members");
-  // The same file asked for under a new file that has the other table only: all of its columns are unknown.
+  // The new file is a copy of the other empty database, which has no such table.
   EXPECT_EQ(NumberThrownBy([&] { converter.Convert(path, "Members", Empty("scenarios")); }), 3343);
   EXPECT_TRUE(converter.IsOld(path));
 }
@@ -163,7 +163,7 @@ TEST(OldFormat, IsKnownByItsMark) {
   EXPECT_FALSE(converter.IsOld(folder / "none.mdb"));
 }
 
-TEST(OldFormat, ThatCannotBeReadForLackOfTheReaderIsTold) {
+TEST(OldFormat, ThatCannotBeReadWithoutTheReaderIsReported) {
   const TemporaryFolder folder;
   WriteFile(folder / "x.mdb", std::string("\0\1\0\0", 4) + "Standard Jet DB" + std::string(4096 - 19, '\0'));
   JetConverter converter("/nowhere/tessarine-jet-reader");

@@ -13,7 +13,7 @@ std::string Text(const std::string& text) {
   return 'S' + std::string{static_cast<char>(text.size()), 0, 0, 0} + text;
 }
 
-/// One other table, a table of columns A and B, two rows.
+/// One other table, then the requested one with columns A and B and two rows.
 std::string WholeStream() {
   std::string bytes = "O" + Text("Extras") + std::string("\x03\0\0\0\0\0\0\0", 8);
   bytes += "T" + Text("Members") + std::string("\x02\0\0\0", 4) + Text("A") + Text("B");
@@ -60,7 +60,7 @@ TEST_F(Stream, GivesBytes) {
   EXPECT_FALSE(stream.Ended());
 }
 
-TEST_F(Stream, RefusesWhatIsNotOfItsForm) {
+TEST_F(Stream, RefusesMalformedInput) {
   const std::string table = "T" + Text("M") + std::string("\x01\0\0\0", 4) + Text("P");
   for (const std::string& bytes :
        {std::string("x"), std::string("R"), std::string("E"), table + "O", table + table, table + "Rx",

@@ -33,7 +33,7 @@ TEST_F(Import, PutsRowsIntoTheColumnsOfTheirNames) {
   EXPECT_EQ(Stored("TotalDamage"), "12.5");
 }
 
-TEST_F(Import, KeepsNullsButWhereTheTableForbidsThem) {
+TEST_F(Import, KeepsNullsExceptWhereTheTableForbidsThem) {
   TableImport import(file.Path(), "Members");
   import.SetColumns({"ContactID", "FirstName", "TotalGamesPlayed", "PhotographLength"});
   import.AddRow({std::int64_t{1}, std::monostate(), std::monostate(), std::monostate()});
@@ -66,7 +66,7 @@ TEST_F(Import, GoesOnCountingKeysBehindTheLargest) {
   EXPECT_EQ(Stored("max(ContactID)"), "91");
 }
 
-TEST_F(Import, FailsAtAKeyTwiceAndChangesNothing) {
+TEST_F(Import, FailsOnADuplicateKeyAndChangesNothing) {
   {
     TableImport import(file.Path(), "Members");
     import.SetColumns({"ContactID"});

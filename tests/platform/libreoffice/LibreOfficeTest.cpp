@@ -30,7 +30,7 @@ std::vector<pid_t> Hosts(pid_t parent = getpid()) {
   return ChildrenOf(parent, "tessarine-office-host");
 }
 
-/// Names in the temporary folder that profiles have.
+/// Number of LibreOffice profiles in the temporary folder.
 std::size_t Profiles() {
   std::size_t count = 0;
   for (const auto& entry : std::filesystem::directory_iterator(std::filesystem::temp_directory_path())) {
@@ -39,7 +39,7 @@ std::size_t Profiles() {
   return count;
 }
 
-/// A running LibreOffice, with a temporary folder of its own, that all tests share: its start takes a second.
+/// A running LibreOffice with its own temporary folder. All tests share it, since starting takes a second.
 class Writer : public testing::Test {
  protected:
   static void SetUpTestSuite() {
@@ -56,7 +56,7 @@ class Writer : public testing::Test {
     delete temporary_;
   }
 
-  /// A saved sheet, or a template, as another LibreOffice reads it: all of its text.
+  /// All text of a saved sheet or template, as read by another LibreOffice.
   std::string TextOf(const std::string& document) const {
     const std::string command = "soffice -env:UserInstallation=file://" + (folder / "profile") +
                                 " --headless --convert-to txt:Text --outdir '" + folder.Path() + "' '" +
@@ -94,7 +94,7 @@ TEST_F(Writer, FillsATemplateAndSavesItForWord) {
   for (const char* part : {"Zoë 李雷", " 7", "Hit 1.", "Hit 224.", "Taken 2."}) {
     EXPECT_THAT(text, HasSubstr(part));
   }
-  // A column is filled before the next begins: beside the first entry of column 1 stands that of column 2.
+  // Columns are filled one after the other, so the first entries of columns 1 and 2 are in the same row.
   EXPECT_LT(text.find("Hit 1."), text.find("Hit 21."));
   EXPECT_LT(text.find("Hit 21."), text.find("Hit 2."));
 }
@@ -162,7 +162,7 @@ TEST_F(Writer, CountsTablesThatTextFlowsAround) {
   document->Close();
 }
 
-TEST_F(Writer, TakesNothingButPicturesAsPictures) {
+TEST_F(Writer, AddsPicturesWithPaddingAndRefusesOtherFiles) {
   const auto document = Office().Add(Template);
   WriteFile(folder / "no-picture", "bytes");
   EXPECT_EQ(NumberThrownBy([&] { document->AddPicture(1, 1, 1, folder / "no-picture"); }), 440);

@@ -8,14 +8,14 @@
 #include <string>
 #include <vector>
 
-/// A process of this machine.
+/// A process on this machine.
 struct ProcessInfo {
   pid_t Id;
   pid_t Parent;
   std::string Command;  ///< its arguments, separated by NUL
 };
 
-/// A file below /proc; empty when its process has ended meanwhile.
+/// Contents of a file below /proc; empty if its process has ended meanwhile.
 inline std::string TextOfProcessFile(const std::filesystem::path& path) {
   std::ostringstream text;
   text << std::ifstream(path).rdbuf();
@@ -40,7 +40,7 @@ inline std::vector<ProcessInfo> Processes() {
   return processes;
 }
 
-/// Children of `parent` whose command has `part` in it.
+/// Children of `parent` whose command line contains `part`.
 inline std::vector<pid_t> ChildrenOf(pid_t parent, const std::string& part) {
   std::vector<pid_t> children;
   for (const ProcessInfo& process : Processes()) {

@@ -4,8 +4,8 @@
 
 #include "platform/libreoffice/LibreOffice.h"
 
-/// office-runner FOLDER DESCRIPTOR: starts LibreOffice, writes one byte when it is ready, and then does
-/// nothing.
+/// office-runner FOLDER DESCRIPTOR: starts LibreOffice, writes one byte to DESCRIPTOR when it is ready, and
+/// then does nothing.
 int main(int argc, char** argv) {
   if (argc != 3) {
     return 2;

@@ -6,7 +6,7 @@
 
 #include "platform/libreoffice/LibreOffice.h"
 
-/// Asks again and again until `condition` holds; false when a minute was not enough.
+/// Polls `condition` until it is true; returns false after a minute.
 inline bool WaitUntil(const std::function<bool()>& condition) {
   const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(60);
   while (!condition()) {

@@ -11,7 +11,7 @@
 #include "tests/platform/libreoffice/OfficeStart.h"
 #include "tests/support/TemporaryFolder.h"
 
-/// A CUPS server of the test's own with one printer, the default one, that keeps each job as a file.
+/// A private CUPS server for the test. Its one printer, the default, stores each job as a file.
 class PrintQueue {
  public:
   enum class Takes { Jobs, Nothing };
@@ -44,7 +44,7 @@ class PrintQueue {
 
   bool IsUp() const { return isUp_; }
 
-  /// What has been printed to the end, a file for each job.
+  /// The contents of the completed jobs' files.
   std::vector<std::string> Printed() const {
     std::vector<std::string> files;
     for (const auto& entry : std::filesystem::directory_iterator(folder_ / "printed")) {

@@ -18,7 +18,7 @@ class TimedQtEventPump : public QtEventPump {
   }
 };
 
-/// What the real pump and its fake have in common.
+/// Behaviour shared by the real pump and its fake.
 template <typename Pump>
 class EventPumpTest : public testing::Test {
  protected:

@@ -13,7 +13,7 @@
 
 #include "sim/line/PortLock.h"
 
-/// A serial line whose far end is in the test's hand.
+/// A serial line whose far end the test controls.
 class PseudoTerminal {
  public:
   PseudoTerminal() : master_(::posix_openpt(O_RDWR | O_NOCTTY | O_CLOEXEC)) {
@@ -34,7 +34,7 @@ class PseudoTerminal {
 
   const std::string& Device() const { return device_; }
 
-  /// As the near end has set them.
+  /// The settings made at the near end.
   termios Settings() const {
     termios settings{};
     ::tcgetattr(master_, &settings);
@@ -47,7 +47,7 @@ class PseudoTerminal {
     }
   }
 
-  /// The next `count` bytes from the near end; fewer when they do not come within 2 s.
+  /// The next `count` bytes from the near end; fewer if they do not arrive within 2 s.
   std::vector<std::uint8_t> Read(std::size_t count) {
     std::vector<std::uint8_t> bytes;
     pollfd readable{master_, POLLIN, 0};
@@ -61,7 +61,7 @@ class PseudoTerminal {
     return bytes;
   }
 
-  /// The far end goes away for good.
+  /// Closes the far end for good.
   void Unplug() {
     if (master_ >= 0) {
       ::close(master_);

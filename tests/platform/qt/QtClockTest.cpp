@@ -4,15 +4,15 @@
 
 namespace {
 
-const QDate date(2013, 5, 9);
-const QTime afternoon(14, 30, 5);
+const QDate Date(2013, 5, 9);
+const QTime Afternoon(14, 30, 5);
 
 TEST(ShortDateText, IsTheLocalesFormWithAllDigitsOfTheYear) {
-  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::UnitedStates), date), "5/9/2013");
-  EXPECT_EQ(ShortDateText(QLocale(QLocale::German, QLocale::Germany), date), "09.05.2013");
-  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::Australia), date), "9/5/2013");
-  EXPECT_EQ(ShortDateText(QLocale(QLocale::Chinese, QLocale::China), date), "2013/5/9");
-  EXPECT_EQ(ShortDateText(QLocale::c(), date), "9 May 2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::UnitedStates), Date), "5/9/2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::German, QLocale::Germany), Date), "09.05.2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::English, QLocale::Australia), Date), "9/5/2013");
+  EXPECT_EQ(ShortDateText(QLocale(QLocale::Chinese, QLocale::China), Date), "2013/5/9");
+  EXPECT_EQ(ShortDateText(QLocale::c(), Date), "9 May 2013");
 }
 
 TEST(ShortDateText, ShowsTheYearInEveryLocaleWithWesternDigits) {
@@ -20,7 +20,7 @@ TEST(ShortDateText, ShowsTheYearInEveryLocaleWithWesternDigits) {
   for (const QLocale& locale :
        QLocale::matchingLocales(QLocale::AnyLanguage, QLocale::AnyScript, QLocale::AnyTerritory)) {
     if (locale.zeroDigit() == QStringLiteral("0")) {
-      const std::string text = ShortDateText(locale, date);
+      const std::string text = ShortDateText(locale, Date);
       EXPECT_NE(text.find("2013"), std::string::npos) << locale.name().toStdString() << ": " << text;
       EXPECT_EQ(text.find("20132013"), std::string::npos) << locale.name().toStdString() << ": " << text;
       ++checked;
@@ -30,10 +30,10 @@ TEST(ShortDateText, ShowsTheYearInEveryLocaleWithWesternDigits) {
 }
 
 TEST(ShortTimeText, IsTheLocalesForm) {
-  EXPECT_EQ(ShortTimeText(QLocale(QLocale::English, QLocale::UnitedStates), afternoon), "2:30 PM");
-  EXPECT_EQ(ShortTimeText(QLocale(QLocale::German, QLocale::Germany), afternoon), "14:30");
-  EXPECT_EQ(ShortTimeText(QLocale(QLocale::Chinese, QLocale::China), afternoon), "14:30");
-  EXPECT_EQ(ShortTimeText(QLocale::c(), afternoon), "14:30:05");
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::English, QLocale::UnitedStates), Afternoon), "2:30 PM");
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::German, QLocale::Germany), Afternoon), "14:30");
+  EXPECT_EQ(ShortTimeText(QLocale(QLocale::Chinese, QLocale::China), Afternoon), "14:30");
+  EXPECT_EQ(ShortTimeText(QLocale::c(), Afternoon), "14:30:05");
 }
 
 TEST(LongDateText, IsTheLocalesFormOfAShortDateWithOrWithoutATime) {
@@ -66,9 +66,9 @@ TEST(LongDateText, ReadsWhatTheClockWritesInEveryLocaleWithWesternDigits) {
   for (const QLocale& locale :
        QLocale::matchingLocales(QLocale::AnyLanguage, QLocale::AnyScript, QLocale::AnyTerritory)) {
     if (locale.zeroDigit() == QStringLiteral("0")) {
-      const std::string text = ShortDateText(locale, date) + ' ' + ShortTimeText(locale, afternoon);
+      const std::string text = ShortDateText(locale, Date) + ' ' + ShortTimeText(locale, Afternoon);
       EXPECT_EQ(LongDateText(locale, QString::fromStdString(text)),
-                locale.toString(date, QLocale::LongFormat).toStdString())
+                locale.toString(Date, QLocale::LongFormat).toStdString())
           << locale.name().toStdString() << ": " << text;
       ++checked;
     }

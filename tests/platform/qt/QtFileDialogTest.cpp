@@ -15,13 +15,13 @@
 
 namespace {
 
-constexpr const char* gameFilter = "XML Files & (*.xml) |*.xml";
+constexpr const char* GameFilter = "XML Files & (*.xml) |*.xml";
 
 TEST(NameFilters, AreMadeOfDescriptionAndPatterns) {
   const auto filters = [](const char* text) {
     return NameFilters(text).join(QLatin1Char('|')).toStdString();
   };
-  EXPECT_EQ(filters(gameFilter), "XML Files & (*.xml)");
+  EXPECT_EQ(filters(GameFilter), "XML Files & (*.xml)");
   EXPECT_EQ(filters("Text documents (*.txt) |*.txt"), "Text documents (*.txt)");
   EXPECT_EQ(filters("Playlist Files|*.txt|All Files|*.*"), "Playlist Files (*.txt)|All Files (*)");
   EXPECT_EQ(filters("Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif"), "Photo Files (*.bmp *.jpg *.gif)");
@@ -35,7 +35,7 @@ class QtFileDialogTest : public testing::Test {
   using Act = std::function<void(QFileDialog&)>;
 
   std::optional<std::string> Open(const std::string& name, const Act& act,
-                                  const std::string& filter = gameFilter) {
+                                  const std::string& filter = GameFilter) {
     return Open({.Filter = filter, .Name = name}, act);
   }
 
@@ -47,7 +47,7 @@ class QtFileDialogTest : public testing::Test {
   }
 
   std::optional<std::string> Save(const std::string& name, const Act& act,
-                                  const std::string& filter = gameFilter) {
+                                  const std::string& filter = GameFilter) {
     return Save({.Filter = filter, .Name = name}, act);
   }
 
@@ -182,13 +182,13 @@ TEST_F(QtFileDialogTest, StartsInTheFolderAskedFor) {
     dialog.reject();
   };
   const std::string folder = other.path().toStdString();
-  Open(FileRequest{.Filter = gameFilter, .Name = Path("last.xml"), .Folder = folder}, look);
-  Save(FileRequest{.Filter = gameFilter, .Name = "last.xml", .Folder = folder}, look);
+  Open(FileRequest{.Filter = GameFilter, .Name = Path("last.xml"), .Folder = folder}, look);
+  Save(FileRequest{.Filter = GameFilter, .Name = "last.xml", .Folder = folder}, look);
 }
 
 TEST_F(QtFileDialogTest, PassesOverAFolderThatDoesNotExist) {
   MakeFile("last.xml");
-  Open(FileRequest{.Filter = gameFilter, .Name = Path("last.xml"), .Folder = Path("none")},
+  Open(FileRequest{.Filter = GameFilter, .Name = Path("last.xml"), .Folder = Path("none")},
        [&](QFileDialog& dialog) {
          EXPECT_EQ(dialog.directory().filePath(QStringLiteral("last.xml")).toStdString(), Path("last.xml"));
          dialog.reject();
@@ -201,8 +201,8 @@ TEST_F(QtFileDialogTest, ShowsTheTitleAskedForInADialogOfTheToolkit) {
     EXPECT_TRUE(dialog.testOption(QFileDialog::DontUseNativeDialog));
     dialog.reject();
   };
-  Open(FileRequest{.Filter = gameFilter, .Title = "Open 得分"}, look);
-  Save(FileRequest{.Filter = gameFilter, .Title = "Open 得分"}, look);
+  Open(FileRequest{.Filter = GameFilter, .Title = "Open 得分"}, look);
+  Save(FileRequest{.Filter = GameFilter, .Title = "Open 得分"}, look);
   Open("", [](QFileDialog& dialog) {
     EXPECT_NE(dialog.windowTitle(), QString());
     dialog.reject();

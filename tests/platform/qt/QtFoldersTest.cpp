@@ -54,7 +54,7 @@ TEST_F(QtFoldersTest, ProgramIsTheExecutablesFolderWhereTheDefaultDataFilesLie) 
   EXPECT_EQ(ProgramFolder(bin), bin);
 }
 
-TEST_F(QtFoldersTest, ProgramIsElseTheSharedFolderBesideTheExecutables) {
+TEST_F(QtFoldersTest, ProgramIsOtherwiseTheSharedFolderBesideTheExecutables) {
   const QString bin = Path(QStringLiteral("usr/bin"));
   const QString share = Path(QStringLiteral("usr/share/tessarine"));
   ASSERT_TRUE(QDir().mkpath(bin));

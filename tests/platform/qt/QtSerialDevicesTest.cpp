@@ -15,7 +15,7 @@ TEST(NaturalLess, OrdersNamesByTheNumbersInThem) {
                                          "/dev/ttyS100", "/dev/ttyUSB0", "/dev/ttyUSB12"};
   std::vector<std::string> names(inOrder.rbegin(), inOrder.rend());
   std::sort(names.begin(), names.end(), NaturalLess);
-  // "ttyS02" and "ttyS2" are the same number; plain order of the texts then decides.
+  // "ttyS02" and "ttyS2" have the same number, so plain text order decides.
   std::vector<std::string> expected = inOrder;
   std::swap(expected[2], expected[3]);
   EXPECT_EQ(names, expected);

@@ -7,7 +7,7 @@
 
 #include "tests/support/TestDatabase.h"
 
-/// A cursor on the first of the members.
+/// A recordset on the first member.
 class EditedMembers : public testing::Test {
  protected:
   EditedMembers() {

@@ -106,7 +106,7 @@ TEST_F(PrefixSearch, FindsWhatTheMatchingRulesFind) {
   EXPECT_EQ(Found("a\x7f*"), "20 ");
 }
 
-TEST_F(PrefixSearch, ReportsAPatternThatIsNoneAndAnApostropheWithTheOriginalText) {
+TEST_F(PrefixSearch, ReportsAnInvalidPatternOrAnApostropheWithTheOriginalText) {
   EXPECT_EQ(NumberThrownBy([&] { Found("mo[*"); }), 93);
   const Thrown thrown = ThrownBy([&] {
     database->OpenRecordset(

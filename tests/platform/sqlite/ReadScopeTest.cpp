@@ -68,7 +68,7 @@ TEST_F(Reading, EndsAlsoByAnException) {
   EXPECT_TRUE(OthersCanWrite());
 }
 
-TEST_F(Reading, SearchThatFindsNothingLetsGoOfTheLock) {
+TEST_F(Reading, SearchThatFindsNothingReleasesTheLock) {
   const ReadScope scope(*database);
   const auto hold = [&] {
     rows->WalkTo("ContactID", std::int64_t{5});
@@ -87,7 +87,7 @@ TEST_F(Reading, SearchThatFindsNothingLetsGoOfTheLock) {
   EXPECT_TRUE(hold());
 }
 
-TEST_F(Reading, FailureLetsGoOfTheLock) {
+TEST_F(Reading, FailureReleasesTheLock) {
   file.Execute("DELETE FROM Members WHERE ContactID = 2");
   const ReadScope scope(*database);
   EXPECT_EQ(TextOf(*rows, "FirstName"), "Sean");
@@ -167,7 +167,7 @@ TEST_F(Reading, SeesWhatAnotherRecordsetOfTheDatabaseChanged) {
   EXPECT_EQ(TextOf(*rows, "FirstName"), "Changed");
 }
 
-TEST_F(Reading, ReadsAColumnThatNobodyHadAskedForYetOfARowReadBefore) {
+TEST_F(Reading, ReadsAFurtherColumnOfARowReadBefore) {
   const ReadScope scope(*database);
   rows->WalkTo("ContactID", std::int64_t{2});
   EXPECT_EQ(TextOf(*rows, "DallasID"), "BB");

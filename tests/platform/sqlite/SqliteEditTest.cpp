@@ -287,7 +287,7 @@ TEST_F(Editing, NewRowIsFoundByEveryMeans) {
   EXPECT_FALSE(rows->NoMatch());
 }
 
-TEST_F(Editing, NewRowThatGetsTheNumberOfADeletedOneStandsOnceAndLast) {
+TEST_F(Editing, NewRowThatReusesTheKeyOfADeletedOneIsListedOnceAndLast) {
   rows->MoveLast();
   file.Execute("DELETE FROM Members WHERE ContactID = 2");
   rows->AddNew();

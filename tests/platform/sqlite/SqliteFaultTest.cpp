@@ -112,7 +112,8 @@ TEST(ReadOnlyFolder, CanBeReadButWritesAre3027) {
   EXPECT_EQ(NumberThrownBy([&] { rows->Delete(); }), 3027);
 }
 
-// The journal is written before the file grows, so the smaller limit is met there.
+// Parameter: the file-size limit. The journal is written before the file grows, so the smaller limit fails
+// there.
 class FullDisk : public testing::TestWithParam<int> {};
 
 TEST_P(FullDisk, Is3026AndLeavesTheOldRowAndTheEdit) {
@@ -139,14 +140,14 @@ TEST_P(FullDisk, Is3026AndLeavesTheOldRowAndTheEdit) {
 
 INSTANTIATE_TEST_SUITE_P(JournalOrFile, FullDisk, testing::Values(1024, 40'960));
 
-TEST(DamagedPage, IsMetAs3343WhenItsRowIsRead) {
+TEST(DamagedPage, FailsWith3343WhenItsRowIsRead) {
   const TestDatabase file;
   file.Execute(
       "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 5000) "
       "INSERT INTO Members (ContactID, FirstName) SELECT i, printf('%0200d', i) FROM n");
   const std::size_t page = 4096;
   std::string bytes = ReadFile(file.Path());
-  // The leaf that holds a row in the middle of the table.
+  // The leaf page with a row from the middle of the table.
   const std::size_t leaf = bytes.find(std::string(196, '0') + "2500") / page * page;
   ASSERT_LT(leaf, bytes.size());
   bytes.replace(leaf, page, std::string(page, '\xFF'));
@@ -163,8 +164,8 @@ TEST(DamagedPage, IsMetAs3343WhenItsRowIsRead) {
 
 constexpr std::size_t PhotoSize = 60'000;
 
-// What a writer that is going to be killed does: row 1 gets n in three columns at once, and each n is
-// reported when its write is said to be done.
+// The writer that will be killed: writes n = 1, 2, ... to three columns of row 1 in one update each, and
+// reports each n once its update has returned.
 [[noreturn]] void WriteForEver(const std::string& path, int reports) {
   try {
     const auto database = SqliteEngine().OpenDatabase(path);
@@ -184,8 +185,8 @@ constexpr std::size_t PhotoSize = 60'000;
   }
 }
 
-// Lets a writer report `writes` writes and kills it in the midst of its next one. Returns the last number
-// that it had reported by then.
+// Waits until a writer has reported `writes` updates and kills it during the next one. Returns the last
+// number reported by then.
 std::int64_t KillAfter(int writes, const std::string& path) {
   int reports[2];
   if (pipe(reports) != 0) {

@@ -31,7 +31,6 @@ TEST(Device, DoesNotAnswerAHostAtOtherSettingsAndNotesEachRunOfItsBytes) {
   host.Speak({.Baud = 9600});
   host.Write({1});
   ASSERT_TRUE(device.WaitUntilHostFaults(1, limit));
-  host.Write({2});
   host.Speak({.Baud = 19200, .StopBits = 2});
   host.Write({3});
   ASSERT_TRUE(device.WaitUntilHostFaults(2, limit));

@@ -13,6 +13,12 @@
 #include "tests/support/RawHost.h"
 
 namespace sim {
+
+// For the messages of failed tests.
+static void PrintTo(const DeviceEntry& entry, std::ostream* out) {
+  *out << entry.Name;
+}
+
 namespace {
 
 using testing::HasSubstr;
@@ -151,10 +157,5 @@ TEST(Devices, HaveOptionsOfDistinctSpellings) {
 }
 
 }  // namespace
-
-// For the names of failed tests.
-void PrintTo(const DeviceEntry& entry, std::ostream* out) {
-  *out << entry.Name;
-}
 
 }  // namespace sim

@@ -3,8 +3,8 @@
 #include <cstdint>
 #include <cstdlib>
 
-#include "devices/radio/FrameParser.h"
 #include "devices/radio/GunPacket.h"
+#include "devices/radio/XBeeFrameParser.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -15,8 +15,8 @@ void Require(bool condition) {
   }
 }
 
-/// What a byte makes of the parser: the frame's identifier, or -1 for the fault of a full buffer.
-int Receive(FrameParser& parser, std::uint8_t byte) {
+/// The parser's result for one byte: a frame's identifier, or -1 if a buffer overflowed (RuntimeError 9).
+int Receive(XBeeFrameParser& parser, std::uint8_t byte) {
   try {
     return parser.Receive(byte);
   } catch (const RuntimeError& error) {
@@ -25,7 +25,7 @@ int Receive(FrameParser& parser, std::uint8_t byte) {
   }
 }
 
-/// True when the bytes up to `end` (its check byte included) close with a frame of this identifier.
+/// True if the bytes before `end` finish with a frame of this identifier, check byte included.
 bool EndsWithFrame(const std::uint8_t* begin, const std::uint8_t* end, int type) {
   unsigned int sum = *(end - 1);
   for (const std::uint8_t* body = end - 2; body - begin >= 3; --body) {
@@ -42,7 +42,7 @@ bool EndsWithFrame(const std::uint8_t* begin, const std::uint8_t* end, int type)
 void RequireReadable(const ReceivedFrame& frame) {
   try {
     const GunPacket packet = ReadGunPacket(frame);
-    Require(packet[0] == frame.Data[0] && packet[0] <= 94);
+    Require(packet.PayloadLength == frame.Data[0] && packet.PayloadLength <= 94);
   } catch (const RuntimeError& error) {
     Require(error.Number() == 9 && frame.Data[0] >= 95);
   }
@@ -50,10 +50,10 @@ void RequireReadable(const ReceivedFrame& frame) {
 
 }  // namespace
 
-/// Whatever the bytes: each frame that is told of stands among them with a right check byte, buffers keep
-/// their bounds, and a parser that is reset takes the next frame.
+/// Whatever the bytes: each reported frame is among them with a valid check byte, no buffer overruns, and the
+/// parser accepts a frame after a reset.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  FrameParser parser;
+  XBeeFrameParser parser;
   for (std::size_t i = 0; i < size; ++i) {
     const int type = Receive(parser, data[i]);
     const ReceivedFrame& frame = parser.Frame();

@@ -1,4 +1,4 @@
-#include "devices/radio/FrameParser.h"
+#include "devices/radio/XBeeFrameParser.h"
 
 #include <gmock/gmock.h>
 
@@ -68,7 +68,7 @@ class Parser : public testing::Test {
     return frame;
   }
 
-  FrameParser parser;
+  XBeeFrameParser parser;
   const ReceivedFrame& frame = parser.Frame();
 };
 

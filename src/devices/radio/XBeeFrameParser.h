@@ -24,7 +24,7 @@ struct ReceivedFrame {
 /// Takes the modem's bytes one at a time. Received data (64-bit addresses) and AT responses are kept, other
 /// known frames are only checked. What belongs to no known frame, and frames with a wrong check byte, are
 /// dropped without a word.
-class FrameParser {
+class XBeeFrameParser {
  public:
   /// API identifier of the good frame that `byte` completes, otherwise 0. Throws RuntimeError 9 for the byte
   /// that `Frame()` has no room for, and drops that frame.

@@ -1,4 +1,4 @@
-#include "core/game/FrameDecoder.h"
+#include "core/game/ScoreFrame.h"
 
 #include <string>
 
@@ -13,14 +13,14 @@ void AddUnlessOverflow(std::int32_t& sum, std::int32_t amount) {
   }
 }
 
-/// Reads a frame from front to back.
+/// Reads a frame from start to end.
 class FrameReader {
  public:
   explicit FrameReader(const ReceiveBuffer& buffer) : buffer_(buffer) {}
 
   void MoveTo(std::size_t offset) { offset_ = offset; }
 
-  /// The next byte; nothing past the buffer's end.
+  /// The next byte; nullopt past the buffer's end.
   std::optional<std::uint8_t> Byte() {
     const std::size_t offset = offset_++;
     return offset < buffer_.size() ? std::optional(buffer_[offset]) : std::nullopt;

@@ -4,7 +4,7 @@
 #include <cstdlib>
 #include <string>
 
-#include "core/game/FrameDecoder.h"
+#include "core/game/ScoreFrame.h"
 #include "tests/fakes/FakeClock.h"
 
 namespace {
@@ -41,7 +41,7 @@ bool IsInRange(const Player& player) {
 
 }  // namespace
 
-/// The bytes are the receive buffer's, with zeros behind them.
+/// The bytes are the start of the receive buffer; the rest of it is zero.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   static const StringTable strings(Language::English);
   static Game game(strings);

@@ -1,4 +1,4 @@
-#include "core/game/FrameDecoder.h"
+#include "core/game/ScoreFrame.h"
 
 #include <gtest/gtest.h>
 
@@ -98,7 +98,7 @@ TEST_F(Decoding, AddsCountersAndHitsAndReplacesTheRest) {
   EXPECT_EQ(Red1().PowerCheatFlag, 3);
 }
 
-TEST_F(Decoding, LeavesWhatIsNotTheGunsToTell) {
+TEST_F(Decoding, LeavesFieldsThatAFrameDoesNotHold) {
   Red1().TotalDamage = 1;
   Red1().AbsoluteDamage = 2;
   Red1().Soldiering = 3;
@@ -153,8 +153,8 @@ TEST_F(Decoding, Takes255Hits) {
 
 TEST_F(Decoding, SkipsWhatALongerStatisticsBlockAddsAndWhatFollowsTheFlag) {
   Bytes frame = FrameOfRed1();
-  frame.insert(frame.begin() + 45, {0xEE, 0xEE});        // behind the flag
-  frame.insert(frame.begin() + 24, {0xDD, 0xDD, 0xDD});  // behind the counters
+  frame.insert(frame.begin() + 45, {0xEE, 0xEE});        // after the flag
+  frame.insert(frame.begin() + 24, {0xDD, 0xDD, 0xDD});  // after the counters
   frame[0] += 5;
   frame[2] += 5;
   frame[5] += 3;
@@ -167,7 +167,7 @@ TEST_F(Decoding, SkipsWhatALongerStatisticsBlockAddsAndWhatFollowsTheFlag) {
 
 TEST_F(Decoding, TakesAShorterStatisticsBlockAsItComes) {
   Bytes frame = FrameOfRed1();
-  frame[5] = 0;  // the button's place is then that of the first four counters
+  frame[5] = 0;  // the button is then read where the first four counters are
   Decode(frame);
   EXPECT_EQ(Red1().ShotCount, 258);
   EXPECT_EQ(Red1().StunCount, 10);
@@ -250,7 +250,7 @@ TEST_F(Decoding, TakesARecordLengthThatOverflowsForNothing) {
 }
 
 TEST_F(Decoding, FindsNoHitsBehindTheBuffer) {
-  const Bytes lengths[] = {{0xE5, 0x03}, {0xFF, 0x7F}};  // the number of hits at 1001, at 32771
+  const Bytes lengths[] = {{0xE5, 0x03}, {0xFF, 0x7F}};  // hit count at offset 1001 or 32771
   for (const Bytes& length : lengths) {
     Bytes frame = FrameOfRed1();
     frame[2] = length[0];
@@ -265,7 +265,7 @@ TEST_F(Decoding, FindsNoHitsBehindTheBuffer) {
 
 TEST_F(Decoding, TakesAHitCountInTheBuffersLastByteForNothing) {
   Bytes frame(1001, 0);
-  frame[2] = 0xE4;  // M = 996: the number of hits stands at 1000
+  frame[2] = 0xE4;  // M = 996: the hit count is at offset 1000
   frame[3] = 0x03;
   frame[4] = 33;
   frame[5] = 18;
@@ -278,7 +278,7 @@ TEST_F(Decoding, TakesAHitCountInTheBuffersLastByteForNothing) {
 
 TEST_F(Decoding, LeavesOutHitEntriesBehindTheBuffer) {
   Bytes frame(1001, 0);
-  frame[2] = 0xE0;  // M = 992: the count stands at 996
+  frame[2] = 0xE0;  // M = 992: the hit count is at offset 996
   frame[3] = 0x03;
   frame[4] = 33;
   frame[5] = 18;

@@ -1,10 +1,10 @@
-#include "devices/radio/FrameParser.h"
+#include "devices/radio/XBeeFrameParser.h"
 
 #include <cstddef>
 
 #include "platform/RuntimeError.h"
 
-std::uint8_t FrameParser::Receive(std::uint8_t byte) {
+std::uint8_t XBeeFrameParser::Receive(std::uint8_t byte) {
   switch (state_) {
     case State::Start:
       if (byte == FrameStart) {
@@ -36,13 +36,13 @@ std::uint8_t FrameParser::Receive(std::uint8_t byte) {
   return 0;
 }
 
-void FrameParser::BeginFrame() {
+void XBeeFrameParser::BeginFrame() {
   frameLength_ = 0;
   lengthBytes_ = 0;
   state_ = State::Length;
 }
 
-void FrameParser::TakeLength(std::uint8_t byte) {
+void XBeeFrameParser::TakeLength(std::uint8_t byte) {
   frameLength_ = frameLength_ * 256 + byte;
   if (++lengthBytes_ == 2) {
     position_ = 0;
@@ -51,7 +51,7 @@ void FrameParser::TakeLength(std::uint8_t byte) {
   }
 }
 
-void FrameParser::TakeIdentifier(std::uint8_t byte) {
+void XBeeFrameParser::TakeIdentifier(std::uint8_t byte) {
   frameType_ = byte;
   sum_ += byte;
   ++position_;
@@ -82,7 +82,7 @@ void FrameParser::TakeIdentifier(std::uint8_t byte) {
   }
 }
 
-void FrameParser::TakeAtResponse(std::uint8_t byte) {
+void XBeeFrameParser::TakeAtResponse(std::uint8_t byte) {
   switch (position_) {
     case 1:
       frame_.AtFrameId = byte;
@@ -99,7 +99,7 @@ void FrameParser::TakeAtResponse(std::uint8_t byte) {
   }
 }
 
-void FrameParser::TakeReceive64(std::uint8_t byte) {
+void XBeeFrameParser::TakeReceive64(std::uint8_t byte) {
   constexpr std::uint32_t addressEnd = 8;
   if (position_ > addressEnd + 2) {
     Append(frame_.Data, frame_.DataLength, byte);
@@ -113,7 +113,7 @@ void FrameParser::TakeReceive64(std::uint8_t byte) {
 }
 
 // Compared behind the identifier only: a body of 0 or 1 bytes never ends.
-void FrameParser::CountBody(std::uint8_t byte) {
+void XBeeFrameParser::CountBody(std::uint8_t byte) {
   sum_ += byte;
   ++position_;
   if (position_ == frameLength_) {
@@ -121,7 +121,7 @@ void FrameParser::CountBody(std::uint8_t byte) {
   }
 }
 
-std::uint8_t FrameParser::TakeChecksum(std::uint8_t byte) {
+std::uint8_t XBeeFrameParser::TakeChecksum(std::uint8_t byte) {
   sum_ = (sum_ + byte) & 255;
   state_ = State::Start;
   if (sum_ == 255) {
@@ -134,7 +134,7 @@ std::uint8_t FrameParser::TakeChecksum(std::uint8_t byte) {
 }
 
 template <std::size_t Size>
-void FrameParser::Append(std::array<std::uint8_t, Size>& data, std::uint8_t& length, std::uint8_t byte) {
+void XBeeFrameParser::Append(std::array<std::uint8_t, Size>& data, std::uint8_t& length, std::uint8_t byte) {
   if (length == Size) {
     state_ = State::Start;
     throw RuntimeError(Fault::SubscriptOutOfRange);

@@ -1,0 +1,83 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "core/game/Game.h"
+
+/// Columns of the list of players; those behind `Player` hold numbers. The list of teams has the first three,
+/// with the team in the second.
+enum class BoardColumn { Rank, Player, Soldiering, Accuracy, Damage, ShotsFired, Wia, Kia, AmmoAdds };
+inline constexpr int BoardColumnCount = 9;
+inline constexpr int TeamColumnCount = 3;
+
+/// The two lists of a game.
+enum class BoardList { Players, Teams };
+
+enum class SortOrder { Ascending, Descending };
+
+/// Why a row has an accuracy or none.
+enum class AccuracyKind { Known, NoShots, NoPrimaryDamage };
+
+/// A player or a team, with the figures as they were when the scores were calculated.
+struct BoardRow {
+  int Index = 0;                ///< record of the player, 1 to 224; 0 for a team
+  int Team = 0;                 ///< 1 to 3
+  std::int32_t Rank = 0;        ///< the one that the record had, or a team's 0; with `Placed` the place
+  bool Placed = false;          ///< a sort has given the row its place
+  std::string MemberName = {};  ///< empty for a player who is no member
+  std::int32_t Soldiering = 0;
+  AccuracyKind HasAccuracy = AccuracyKind::Known;
+  float Accuracy = 0;  ///< fraction, 1.0 = all shots hit
+  std::int32_t Damage = 0;
+  std::int32_t ShotsFired = 0;
+  std::int32_t Wia = 0;
+  std::int32_t Kia = 0;
+  std::int32_t AmmoAdds = 0;
+};
+
+/// The rows of a score list in the order in which the operator sees them.
+class Board {
+ public:
+  /// `changed` is called when the rows have new contents or a new order. Rows that were only added are told
+  /// with the next sort.
+  explicit Board(std::function<void()> changed) : changed_(std::move(changed)) {}
+  Board(const Board&) = delete;
+  Board& operator=(const Board&) = delete;
+
+  ::SortOrder SortOrder = ::SortOrder::Descending;
+
+  int RowCount() const { return static_cast<int>(order_.size()); }
+
+  /// The row at a place from the top, counted from 0.
+  const BoardRow& RowAt(int place) const { return rows_[order_.at(static_cast<std::size_t>(place))]; }
+
+  void Clear();
+  void AddRow(BoardRow row);
+
+ private:
+  friend void SortListNumeric(Board& list, BoardColumn column, bool assignRanks, Game& game);
+
+  void Sort(BoardColumn column);
+
+  const std::function<void()> changed_;
+  std::vector<BoardRow> rows_;      ///< in the order of adding
+  std::vector<std::size_t> order_;  ///< indexes into `rows_` as shown
+};
+
+/// Sorts by the numbers that `column` shows, in the list's present direction: an accuracy counts with its two
+/// decimals. A cell that shows no number sorts below all numbers, and equal cells keep the order in which
+/// their rows were added.
+///
+/// Column 0 writes each place into the record of the same number, whichever player stands there. For other
+/// columns, `assignRanks` numbers the rows from 1 and stores the places in the players' records. The record
+/// is found from team and number alone, 32 to a team, so the place of a player numbered 32 or above goes into
+/// another record. An index outside the table is RuntimeError 9.
+void SortListNumeric(Board& list, BoardColumn column, bool assignRanks, Game& game);
+
+/// The board's answer to a click on column header `header` (counted from 1).
+void SortByHeader(Board& players, int header, Game& game);

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <string>
+
+#include "core/game/Board.h"
+#include "core/text/StringTable.h"
+
+/// The lists of the board in the words and figures that the operator reads. All of their texts are made here,
+/// and none is ever read back: who needs a player or a number takes it from the row.
+class BoardTexts {
+ public:
+  BoardTexts(const Game& game, const StringTable& strings) : game_(game), strings_(strings) {}
+
+  std::string Header(BoardList list, BoardColumn column) const;
+
+  std::string Cell(const BoardRow& row, BoardColumn column) const;
+
+  /// The cell of the second column without a member's name: "Blue  7", or the team "Blue".
+  std::string Name(const BoardRow& row) const;
+
+ private:
+  std::string AccuracyText(const BoardRow& row) const;
+
+  const Game& game_;
+  const StringTable& strings_;
+};

@@ -1,0 +1,134 @@
+#include "core/game/Session.h"
+
+#include <utility>
+
+#include "core/data/FieldValue.h"
+#include "core/data/UserDatabase.h"
+#include "core/text/Pieces.h"
+
+Session::Session(const StringTable& strings, const Clock& time, MessageBoxes& boxes)
+    : strings_(strings), time_(time), boxes_(boxes), game_(strings) {}
+
+Subscription Session::Listen(std::function<void(SessionChange)> listener) {
+  return listeners_.Listen(std::move(listener));
+}
+
+bool Session::Open(const Sources& sources) {
+  backups_.emplace(sources.UserDataFolder + "/backups", sources.Disk, time_, strings_);
+  const auto open = [&](const std::string& name, const std::string& table) {
+    return OpenUserDatabase({sources.UserDataFolder + "/" + name + ".mdb", table,
+                             sources.ProgramFolder + "/" + name + "_default.mdb"},
+                            {.Engine = sources.Engine,
+                             .Old = sources.Old,
+                             .Disk = sources.Disk,
+                             .Boxes = boxes_,
+                             .Copies = *backups_,
+                             .Strings = strings_});
+  };
+  dbScenarios_ = open("scenarios", "Table1");
+  if (!dbScenarios_) {
+    return false;
+  }
+  rsScenarios_ = dbScenarios_->OpenRecordset("Table1");
+  missions_.emplace(*rsScenarios_, strings_, boxes_);
+  FillMissionList();
+  rsScenarios_->MoveFirst();
+  dbMembers_ = open("members", "Members");
+  if (!dbMembers_) {
+    return false;
+  }
+  rsMembers_ = dbMembers_->OpenRecordset("Members");
+  members_.emplace(*rsMembers_, boxes_);
+  analysis_.emplace(game_, factors_, *missions_, *members_, players_, teams_);
+  return true;
+}
+
+void Session::Close() {
+  analysis_.reset();
+  members_.reset();
+  missions_.reset();
+  rsScenarios_.reset();
+  rsMembers_.reset();
+  dbScenarios_.reset();
+  dbMembers_.reset();
+}
+
+std::string Session::TakeBackupFailure() {
+  return backups_ ? backups_->TakeFailure() : std::string();
+}
+
+void Session::CalculateScores() {
+  {
+    const ReadScope members(*dbMembers_);
+    const ReadScope missions(*dbScenarios_);
+    analysis_->CalculateScores();
+  }
+  listeners_.Tell(SessionChange::Scores);
+}
+
+void Session::CalculateScoresWhenPresent() {
+  if (game_.DataPresent && analysis_) {
+    CalculateScores();
+  }
+}
+
+void Session::ClearPlayerData() {
+  players_.Clear();
+  teams_.Clear();
+  game_.Clear();
+  listeners_.Tell(SessionChange::Cleared);
+}
+
+void Session::SortByHeader(int header) {
+  ::SortByHeader(players_, header, game_);
+}
+
+void Session::FillMissionList() {
+  {
+    const ReadScope scope(*dbScenarios_);
+    missions_->FillMissionList();
+  }
+  listeners_.Tell(SessionChange::Missions);
+  SelectMission(missions_->ListIndex());
+}
+
+void Session::SelectMission(int index) {
+  missions_->Select(index);
+  listeners_.Tell(SessionChange::Mission);
+  missionIsActive_ = missions_->ActivateCurrentMissionRecord();
+  missionDescription_.clear();
+  if (missionIsActive_) {
+    missionDescription_ = FirstLineOf(TextOf(missions_->Row().Fields("MissionDescription")));
+  }
+  listeners_.Tell(SessionChange::MissionRow);
+  CalculateScoresWhenPresent();
+}
+
+void Session::ChooseMission(const std::string& name) {
+  for (int index = 0; index < static_cast<int>(missions_->Items().size()); ++index) {
+    if (missions_->Items()[static_cast<std::size_t>(index)].Text == name) {
+      SelectMission(index);
+    }
+  }
+}
+
+void Session::LoadGame(const GameReader& read) {
+  ClearPlayerData();
+  if (read(game_, [this](const std::string& name) { ChooseMission(name); })) {
+    game_.DataPresent = true;
+    listeners_.Tell(SessionChange::Loaded);
+    CalculateScores();
+  }
+}
+
+void Session::SaveGame(const GameWriter& write) {
+  if (write(game_, missions_->Text())) {
+    listeners_.Tell(SessionChange::Saved);
+  }
+}
+
+CommitResult Session::CommitGame() {
+  const CommitResult result = CommitPlayers(game_, *dbMembers_, *rsMembers_, *members_, time_);
+  listeners_.Tell(SessionChange::Committed);
+  return result;
+}

@@ -1,0 +1,23 @@
+#pragma once
+
+#include <QEvent>
+#include <QString>
+#include <utility>
+
+/// Sent to the application when the operator gives a command of any window, before it runs; an event filter
+/// of the application sees all of them.
+class CommandEvent : public QEvent {
+ public:
+  /// `name` is the object name of the menu item or button.
+  explicit CommandEvent(QString name) : QEvent(EventType()), name_(std::move(name)) {}
+
+  static QEvent::Type EventType() {
+    static const int type = QEvent::registerEventType();
+    return static_cast<QEvent::Type>(type);
+  }
+
+  const QString& Name() const { return name_; }
+
+ private:
+  QString name_;
+};

@@ -1,0 +1,61 @@
+#pragma once
+
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "core/game/BoardTexts.h"
+#include "core/game/Session.h"
+#include "platform/linux/LinuxFiles.h"
+#include "platform/sqlite/SqliteDatabase.h"
+#include "tests/fakes/FakeClock.h"
+#include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/fakes/FakeOldDatabases.h"
+#include "tests/support/ScoredGame.h"
+#include "tests/support/TemporaryFolder.h"
+
+/// A session on a data folder of its own, with real databases and files; no mission and no member until a
+/// test adds them.
+class OpenSession {
+ public:
+  OpenSession() {
+    const auto script = [](const char* name) { return ReadFile(std::string(TESSARINE_RESOURCES) + name); };
+    ExecuteSql(ScenariosFile(), script("/scenarios_default.sql"));
+    ExecuteSql(ScenariosFile(), "DELETE FROM Table1; DELETE FROM sqlite_sequence");
+    ExecuteSql(MembersFile(), script("/members_default.sql"));
+  }
+
+  std::string ScenariosFile() const { return Folder / "scenarios.mdb"; }
+  std::string MembersFile() const { return Folder / "members.mdb"; }
+
+  bool Open() { return session.Open({Databases, Old, Disk, Folder.Path(), Folder / "program"}); }
+
+  /// Puts a player into the game with that many bonus points.
+  Player& Play(int index, int points) {
+    session.Game().DataPresent = true;
+    Player& player = session.Game().Players(index);
+    player.Active = true;
+    player.BonusPoints = points;
+    return player;
+  }
+
+  /// Cells of one column of a list as a view shows them.
+  std::vector<std::string> Column(BoardList list, BoardColumn column) const {
+    std::vector<std::string> cells;
+    const Board& rows = session.List(list);
+    for (int place = 0; place < rows.RowCount(); ++place) {
+      cells.push_back(Texts.Cell(rows.RowAt(place), column));
+    }
+    return cells;
+  }
+
+  TemporaryFolder Folder;
+  StringTable Strings{Language::English};
+  FakeClock Time;
+  FakeMessageBoxes Boxes;
+  SqliteEngine Databases;
+  FakeOldDatabases Old;
+  LinuxFiles Disk;
+  Session session{Strings, Time, Boxes};
+  BoardTexts Texts{session.Game(), Strings};
+};
