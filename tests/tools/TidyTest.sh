@@ -44,7 +44,10 @@ good='inline int* Nothing() { return nullptr; }'
 mkdir -p "$house/tools" "$house/build/asan"
 cp "$source"/tools/{tidy,files.sh} "$house/tools"
 cp "$source/.clang-tidy" "$house"
-printf '/build/\n' > "$house/.gitignore"
+Put bin/cmake '#!/bin/sh'  # nothing is to be made here
+chmod +x "$house/bin/cmake"
+PATH=$house/bin:$PATH
+printf '/build/\n/bin/\n' > "$house/.gitignore"
 Put src/core/Game.cpp '#include "core/new.room/Deep.h"
 #include "ui_Form.h"'
 Put build/made/ui_Form.h 'inline int* FromTheForm() { return 0; }'
