@@ -65,4 +65,3 @@ std::string Composition::SwipeButton() {
   window.exec();
   return window.DallasID();
 }
-}
