@@ -8,6 +8,8 @@
 
 namespace {
 
+using testing::IsEmpty;
+
 /// The window of the members, opened from the main window on a file that the program cannot use as it likes.
 class MembersWindow : public MembersSteps<Venue> {
  protected:

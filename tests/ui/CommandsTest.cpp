@@ -218,6 +218,7 @@ TEST_F(CommandTable, LetsAnEntryKnowThatItIsLeftAlsoByAScreenReader) {
   int finished = 0;
   QObject::connect(&window.Entry, &QLineEdit::editingFinished, &window, [&] { ++finished; });
   OnGo([&] { EXPECT_EQ(finished, 1); });
+  QTest::keyClicks(&window.Entry, QStringLiteral("typed"));
   window.Go.click();
   EXPECT_EQ(finished, 1);
 }
