@@ -95,7 +95,7 @@ class Site {
   sim::RadioModem modem_{{.Guns = sim::MakeRadioGuns(sim::MakeGame(Guns, 1), AnswerTime)}};
   StringTable strings_{Language::English};
   Game game_{strings_};
-  QtMessageBoxes boxes_;
+  QtMessageBoxes boxes_{[this] { return &window_; }};
   LinuxFiles files_;
   IniReader ini_{files_, "/nowhere/tessarine.ini"};
   OneDevice device_{modem_.DevicePath()};
