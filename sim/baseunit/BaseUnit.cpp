@@ -9,19 +9,19 @@
 namespace sim {
 namespace {
 
-constexpr int lineBaud = 19200;
-constexpr std::uint8_t requestFirst = 1;
-constexpr std::uint8_t requestSecond = 0;
-constexpr std::uint8_t accepted = 170;
-constexpr std::uint8_t rejected = 0;
+constexpr int LineBaud = 19200;
+constexpr std::uint8_t RequestFirst = 1;
+constexpr std::uint8_t RequestSecond = 0;
+constexpr std::uint8_t Accepted = 170;
+constexpr std::uint8_t Rejected = 0;
 // A host closes its port soon after the last reply; one that does not is left with a dead line.
-constexpr std::chrono::seconds closingLimit{10};
+constexpr std::chrono::seconds ClosingLimit{10};
 
 }  // namespace
 
 BaseUnit::BaseUnit(BaseUnitSettings settings)
     : Device({.LogName = "base-unit",
-              .Understood = {{.Baud = lineBaud}},
+              .Understood = {{.Baud = LineBaud}},
               .LinePace = settings.LinePace,
               .Log = settings.Log}),
       settings_(std::move(settings)) {}
@@ -45,7 +45,7 @@ void BaseUnit::Run() {
       break;
     }
   }
-  Line().WaitForClientToClose(closingLimit);
+  Line().WaitForClientToClose(ClosingLimit);
   if (settings_.OnFinished) {
     settings_.OnFinished();
   }
@@ -54,8 +54,8 @@ void BaseUnit::Run() {
 bool BaseUnit::AwaitRequest() {
   bool begun = false;
   while (const std::optional<std::uint8_t> byte = Line().ReadByte()) {
-    const bool complete = begun && *byte == requestSecond;
-    begun = *byte == requestFirst;
+    const bool complete = begun && *byte == RequestSecond;
+    begun = *byte == RequestFirst;
     Log().FromHost(*byte, complete ? "request" : begun ? "" : "ignored");
     if (complete) {
       return true;
@@ -67,16 +67,16 @@ bool BaseUnit::AwaitRequest() {
 BaseUnit::Heard BaseUnit::AwaitReply() {
   bool requestBegun = false;
   while (const std::optional<std::uint8_t> byte = Line().ReadByte()) {
-    if (requestBegun && *byte == requestSecond) {
+    if (requestBegun && *byte == RequestSecond) {
       Log().FromHost(*byte, "request");
       return Heard::Request;
     }
-    if (*byte == accepted || *byte == rejected) {
-      Log().FromHost(*byte, *byte == accepted ? "accepted" : "rejected");
+    if (*byte == Accepted || *byte == Rejected) {
+      Log().FromHost(*byte, *byte == Accepted ? "accepted" : "rejected");
       record_.Note([&](Record& record) { record.Latest.Replies.push_back(*byte); });
       return Heard::Reply;
     }
-    requestBegun = *byte == requestFirst;
+    requestBegun = *byte == RequestFirst;
     Log().FromHost(*byte, requestBegun ? "" : "ignored");
   }
   return Heard::Nothing;

@@ -9,10 +9,10 @@
 namespace sim {
 namespace {
 
-constexpr std::size_t mostFrames = 255;
-constexpr std::size_t extraStatisticsBytes = 6;
+constexpr std::size_t MostFrames = 255;
+constexpr std::size_t ExtraStatisticsBytes = 6;
 // A gun's own frame has at most 811 bytes, so every frame passes 1001 with these.
-constexpr std::size_t extraBytesOfAnOverlongFrame = 1000;
+constexpr std::size_t ExtraBytesOfAnOverlongFrame = 1000;
 
 std::vector<std::vector<std::uint8_t>> EncodeAll(const std::vector<GunScores>& game,
                                                  const FrameExtras& extras) {
@@ -82,13 +82,13 @@ BaseUnitAnswer MakeBaseUnitAnswer(std::vector<GunScores> game, BaseUnitFailure f
   if (failure == BaseUnitFailure::CountZero) {
     game.clear();
   } else if (failure == BaseUnitFailure::LongerStatisticsBlock) {
-    extras.StatisticsBytes = extraStatisticsBytes;
+    extras.StatisticsBytes = ExtraStatisticsBytes;
   } else if (failure == BaseUnitFailure::HighBitWords) {
     SetHighBits(game[index]);
   } else if (failure == BaseUnitFailure::SameGunTwice) {
     game.push_back(SecondRun(game, index));
   }
-  if (game.size() > mostFrames) {
+  if (game.size() > MostFrames) {
     throw std::invalid_argument("The count byte cannot tell more than 255 frames");
   }
 
@@ -98,7 +98,7 @@ BaseUnitAnswer MakeBaseUnitAnswer(std::vector<GunScores> game, BaseUnitFailure f
   if (failure == BaseUnitFailure::WrongCrc) {
     answer.Frames[index].back() ^= 0xFFU;
   } else if (failure == BaseUnitFailure::LengthAbove1001) {
-    answer.Frames[index] = EncodeScoreFrame(game[index], {.RecordBytes = extraBytesOfAnOverlongFrame});
+    answer.Frames[index] = EncodeScoreFrame(game[index], {.RecordBytes = ExtraBytesOfAnOverlongFrame});
   } else if (failure == BaseUnitFailure::NoiseBeforeCount) {
     answer.Noise = {0xFE, 0xF0, 0x7F};
   } else if (failure == BaseUnitFailure::TornWrites) {

@@ -13,8 +13,8 @@
 namespace sim {
 namespace {
 
-constexpr int mostPlayers = 224;
-constexpr std::size_t gunsOfThirdTeam = 32;
+constexpr int MostPlayers = 224;
+constexpr std::size_t GunsOfThirdTeam = 32;
 
 // The standard fixes the numbers of mt19937 but not those of its distributions or of shuffle.
 class Dice {
@@ -60,7 +60,7 @@ std::vector<Gun> AllGunsOf(std::size_t team) {
 }
 
 std::vector<Gun> DrawGuns(std::size_t players, Dice& dice) {
-  const std::size_t third = std::min(players / 3, gunsOfThirdTeam);
+  const std::size_t third = std::min(players / 3, GunsOfThirdTeam);
   const std::size_t second = (players - third) / 2;
   const std::array<std::size_t, 3> sizes{players - third - second, second, third};
   std::vector<Gun> drawn;
@@ -171,7 +171,7 @@ void TellHits(const std::vector<int>& taken, const std::vector<Gun>& guns, GunSc
 }  // namespace
 
 std::vector<GunScores> MakeGame(int players, std::uint32_t seed) {
-  if (players < 0 || players > mostPlayers) {
+  if (players < 0 || players > MostPlayers) {
     throw std::invalid_argument("A game has 0 to 224 players");
   }
   Dice dice(seed);

@@ -7,15 +7,15 @@
 namespace sim {
 namespace {
 
-constexpr std::size_t counterBytes = 18;
+constexpr std::size_t CounterBytes = 18;
 // Player id and the byte that tells the length of the statistics block.
-constexpr std::size_t recordHeadBytes = 2;
+constexpr std::size_t RecordHeadBytes = 2;
 // Button id, six words and the flag.
-constexpr std::size_t closingBytes = 8 + 12 + 1;
-constexpr std::size_t lengthWordsBytes = 4;
-constexpr std::size_t hitBytes = 3;
+constexpr std::size_t ClosingBytes = 8 + 12 + 1;
+constexpr std::size_t LengthWordsBytes = 4;
+constexpr std::size_t HitBytes = 3;
 // Neither 0 nor a likely count, so that a reader that takes it for data is noticed.
-constexpr std::uint8_t filler = 0xEE;
+constexpr std::uint8_t Filler = 0xEE;
 
 std::uint8_t LowByte(std::size_t word) {
   return static_cast<std::uint8_t>(word & 0xFFU);
@@ -35,7 +35,7 @@ class FrameBytes {
     Byte(HighByte(word));
     Byte(LowByte(word));
   }
-  void Fill(std::size_t count) { bytes_.insert(bytes_.end(), count, filler); }
+  void Fill(std::size_t count) { bytes_.insert(bytes_.end(), count, Filler); }
   std::vector<std::uint8_t> CloseWithCrc() {
     Byte(Crc8(bytes_));
     return std::move(bytes_);
@@ -48,9 +48,9 @@ class FrameBytes {
 }  // namespace
 
 std::vector<std::uint8_t> EncodeScoreFrame(const GunScores& scores, const FrameExtras& extras) {
-  const std::size_t statisticsLength = counterBytes + extras.StatisticsBytes;
-  const std::size_t recordLength = recordHeadBytes + statisticsLength + closingBytes + extras.RecordBytes;
-  const std::size_t frameLength = lengthWordsBytes + recordLength + 1 + hitBytes * scores.Hits.size();
+  const std::size_t statisticsLength = CounterBytes + extras.StatisticsBytes;
+  const std::size_t recordLength = RecordHeadBytes + statisticsLength + ClosingBytes + extras.RecordBytes;
+  const std::size_t frameLength = LengthWordsBytes + recordLength + 1 + HitBytes * scores.Hits.size();
   if (statisticsLength > 0xFF || scores.Hits.size() > 0xFF || frameLength > 0x7FFF) {
     throw std::length_error("A score frame cannot hold this many bytes");
   }

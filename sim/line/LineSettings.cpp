@@ -18,7 +18,7 @@ struct SpeedCode {
   unsigned int Code;
 };
 
-constexpr std::array<SpeedCode, 11> speedCodes{{{300, B300},
+constexpr std::array<SpeedCode, 11> SpeedCodes{{{300, B300},
                                                 {600, B600},
                                                 {1200, B1200},
                                                 {2400, B2400},
@@ -31,9 +31,9 @@ constexpr std::array<SpeedCode, 11> speedCodes{{{300, B300},
                                                 {230400, B230400}}};
 
 unsigned int SpeedCodeOf(int baud) {
-  const auto* found = std::find_if(speedCodes.begin(), speedCodes.end(),
+  const auto* found = std::find_if(SpeedCodes.begin(), SpeedCodes.end(),
                                    [&](const SpeedCode& candidate) { return candidate.Baud == baud; });
-  if (found == speedCodes.end()) {
+  if (found == SpeedCodes.end()) {
     throw std::invalid_argument("Terminals do not run at " + std::to_string(baud) + " bits per second");
   }
   return found->Code;

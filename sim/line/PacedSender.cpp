@@ -6,7 +6,7 @@
 namespace sim {
 namespace {
 
-constexpr std::chrono::milliseconds tearPause{3};
+constexpr std::chrono::milliseconds TearPause{3};
 
 // Pieces of one, two and three bytes in turn.
 bool IsTornBehind(std::size_t bytes) {
@@ -67,7 +67,7 @@ void PacedSender::SendByte() {
   }
   due_ += line_.DurationOf(1);
   if (piece_.Torn && IsTornBehind(sent_)) {
-    due_ += tearPause;
+    due_ += TearPause;
   }
 }
 

@@ -17,7 +17,7 @@
 namespace sim {
 namespace {
 
-constexpr std::chrono::milliseconds tearPause{3};
+constexpr std::chrono::milliseconds TearPause{3};
 
 [[noreturn]] void ThrowSystemError(const char* what) {
   throw std::system_error(errno, std::generic_category(), what);
@@ -126,7 +126,7 @@ std::size_t PseudoTerminal::WriteTorn(std::span<const std::uint8_t> bytes) {
     if (sentNow < piece.size()) {
       break;
     }
-    std::this_thread::sleep_for(tearPause);
+    std::this_thread::sleep_for(TearPause);
   }
   return sent;
 }

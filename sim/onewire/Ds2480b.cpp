@@ -5,24 +5,24 @@
 namespace sim {
 namespace {
 
-constexpr std::uint8_t dataMode = 0xE1;
-constexpr std::uint8_t commandMode = 0xE3;
-constexpr std::uint8_t endOfPulse = 0xF1;
+constexpr std::uint8_t DataMode = 0xE1;
+constexpr std::uint8_t CommandMode = 0xE3;
+constexpr std::uint8_t EndOfPulse = 0xF1;
 
 // Commands that make bus cycles are 1ffp ss?1: function f, polarity or parameter p, speed s.
-constexpr unsigned functionMask = 0xE1;
-constexpr unsigned singleBit = 0x81;
-constexpr unsigned searchAccelerator = 0xA1;
-constexpr unsigned reset = 0xC1;
-constexpr unsigned polarity = 0x10;
-constexpr unsigned pullUp = 0x02;
-constexpr unsigned pulseMask = 0xED;
-constexpr unsigned pulse = 0xED;
+constexpr unsigned FunctionMask = 0xE1;
+constexpr unsigned SingleBitFunction = 0x81;
+constexpr unsigned SearchAcceleratorFunction = 0xA1;
+constexpr unsigned ResetFunction = 0xC1;
+constexpr unsigned PolarityBit = 0x10;
+constexpr unsigned PullUpBit = 0x02;
+constexpr unsigned PulseMask = 0xED;
+constexpr unsigned PulseFunction = 0xED;
 
-constexpr std::size_t programmingPulse = 2;
-constexpr std::size_t strongPullUp = 3;
-constexpr std::size_t baudRate = 7;
-constexpr std::uint8_t endless = 7;
+constexpr std::size_t ProgrammingPulse = 2;
+constexpr std::size_t StrongPullUp = 3;
+constexpr std::size_t BaudRate = 7;
+constexpr std::uint8_t Endless = 7;
 
 }  // namespace
 
@@ -32,19 +32,19 @@ std::optional<std::uint8_t> Ds2480b::Receive(std::uint8_t byte) {
     return std::nullopt;
   }
   if (endlessPulse_) {
-    return byte == endOfPulse ? std::exchange(endlessPulse_, std::nullopt) : std::nullopt;
+    return byte == EndOfPulse ? std::exchange(endlessPulse_, std::nullopt) : std::nullopt;
   }
   switch (mode_) {
     case Mode::Command:
       break;
     case Mode::Data:
-      if (byte == commandMode) {
+      if (byte == CommandMode) {
         mode_ = Mode::Check;
         return std::nullopt;
       }
       return Pass(byte);
     case Mode::Check:
-      if (byte == commandMode) {
+      if (byte == CommandMode) {
         mode_ = Mode::Data;
         return Pass(byte);
       }
@@ -56,23 +56,23 @@ std::optional<std::uint8_t> Ds2480b::Receive(std::uint8_t byte) {
 
 int Ds2480b::Baud() const {
   constexpr std::array<int, 4> rates{9600, 19200, 57600, 115200};
-  return rates[parameters_[baudRate] % rates.size()];
+  return rates[parameters_[BaudRate] % rates.size()];
 }
 
 std::optional<std::uint8_t> Ds2480b::Obey(std::uint8_t command) {
   if ((command & 0x81U) == 0x01) {
     return Configure(command);
   }
-  if (command == dataMode) {
+  if (command == DataMode) {
     mode_ = Mode::Data;
-  } else if ((command & pulseMask) == pulse) {
+  } else if ((command & PulseMask) == PulseFunction) {
     return Pulse(command);
-  } else if ((command & functionMask) == singleBit) {
+  } else if ((command & FunctionMask) == SingleBitFunction) {
     return SingleBit(command);
-  } else if ((command & functionMask) == searchAccelerator) {
-    accelerating_ = (command & polarity) != 0;
+  } else if ((command & FunctionMask) == SearchAcceleratorFunction) {
+    accelerating_ = (command & PolarityBit) != 0;
     searchFailed_ = false;
-  } else if ((command & functionMask) == reset) {
+  } else if ((command & FunctionMask) == ResetFunction) {
     return Reset(command);
   }
   return std::nullopt;
@@ -106,20 +106,20 @@ std::uint8_t Ds2480b::Reset(std::uint8_t command) {
 }
 
 std::uint8_t Ds2480b::SingleBit(std::uint8_t command) {
-  const bool heard = bus_.Slot((command & polarity) != 0);
-  if ((command & pullUp) != 0) {
+  const bool heard = bus_.Slot((command & PolarityBit) != 0);
+  if ((command & PullUpBit) != 0) {
     PullUp();
   }
   return static_cast<std::uint8_t>((command & 0xFCU) | (heard ? 3U : 0U));
 }
 
 std::optional<std::uint8_t> Ds2480b::Pulse(std::uint8_t command) {
-  const bool programs = (command & polarity) != 0;
+  const bool programs = (command & PolarityBit) != 0;
   const std::uint8_t answer = command & 0xFCU;
   if (!programs) {
-    pullUpArmed_ = (command & pullUp) != 0;
+    pullUpArmed_ = (command & PullUpBit) != 0;
   }
-  if (parameters_[programs ? programmingPulse : strongPullUp] == endless) {
+  if (parameters_[programs ? ProgrammingPulse : StrongPullUp] == Endless) {
     endlessPulse_ = answer;
     return std::nullopt;
   }
@@ -158,8 +158,8 @@ std::uint8_t Ds2480b::PassSearch(std::uint8_t directions) {
 
 // Behind a bit or byte: its own answer is out already, and only an endless pull-up has one of its own.
 void Ds2480b::PullUp() {
-  if (parameters_[strongPullUp] == endless) {
-    endlessPulse_ = static_cast<std::uint8_t>(pulse & 0xFCU);
+  if (parameters_[StrongPullUp] == Endless) {
+    endlessPulse_ = static_cast<std::uint8_t>(PulseFunction & 0xFCU);
   }
 }
 

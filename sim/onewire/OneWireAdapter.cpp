@@ -5,9 +5,9 @@
 namespace sim {
 namespace {
 
-constexpr int powerUpBaud = 9600;
-constexpr std::uint8_t identityFamily = 0x81;
-constexpr std::uint64_t identitySerial = 0x0000001E5A37;
+constexpr int PowerUpBaud = 9600;
+constexpr std::uint8_t IdentityFamily = 0x81;
+constexpr std::uint64_t IdentitySerial = 0x0000001E5A37;
 
 OneWireAdapterSettings Checked(OneWireAdapterSettings settings) {
   for (const OneWireFailureInfo& info : OneWireFailures) {
@@ -24,7 +24,7 @@ OneWireAdapterSettings Checked(OneWireAdapterSettings settings) {
 OneWireBusSettings BusOf(const OneWireAdapterSettings& settings) {
   OneWireBusSettings bus;
   if (settings.Failure != OneWireFailure::NoOwnDevice) {
-    bus.OwnDevice = MakeRomId(identityFamily, identitySerial);
+    bus.OwnDevice = MakeRomId(IdentityFamily, IdentitySerial);
   }
   bus.Shorted = settings.Failure == OneWireFailure::ShortCircuit;
   if (settings.Failure == OneWireFailure::ContactLost) {
@@ -46,7 +46,7 @@ RomId CompanionOf(const RomId& rom) {
 
 OneWireAdapter::OneWireAdapter(OneWireAdapterSettings settings)
     : Device({.LogName = "1-wire",
-              .Understood = {{.Baud = powerUpBaud}},
+              .Understood = {{.Baud = PowerUpBaud}},
               .LinePace = settings.LinePace,
               .Log = settings.Log}),
       settings_(Checked(settings)),

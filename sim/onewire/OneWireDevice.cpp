@@ -3,11 +3,11 @@
 namespace sim {
 namespace {
 
-constexpr std::size_t romBits = 64;
-constexpr std::uint8_t readRom = 0x33;
-constexpr std::uint8_t matchRom = 0x55;
-constexpr std::uint8_t skipRom = 0xCC;
-constexpr std::uint8_t searchRom = 0xF0;
+constexpr std::size_t RomBits = 64;
+constexpr std::uint8_t ReadRom = 0x33;
+constexpr std::uint8_t MatchRom = 0x55;
+constexpr std::uint8_t SkipRom = 0xCC;
+constexpr std::uint8_t SearchRom = 0xF0;
 
 }  // namespace
 
@@ -73,16 +73,16 @@ bool OneWireDevice::RomBit() const {
 void OneWireDevice::Obey(std::uint8_t command) {
   bit_ = 0;
   switch (command) {
-    case readRom:
+    case ReadRom:
       state_ = State::Read;
       break;
-    case matchRom:
+    case MatchRom:
       state_ = State::Match;
       break;
-    case skipRom:
+    case SkipRom:
       state_ = State::Selected;
       break;
-    case searchRom:
+    case SearchRom:
       state_ = State::SearchBit;
       break;
     default:
@@ -92,7 +92,7 @@ void OneWireDevice::Obey(std::uint8_t command) {
 }
 
 void OneWireDevice::NextBit(State next) {
-  state_ = ++bit_ == romBits ? State::Selected : next;
+  state_ = ++bit_ == RomBits ? State::Selected : next;
 }
 
 }  // namespace sim

@@ -5,12 +5,12 @@
 namespace sim {
 namespace {
 
-constexpr std::size_t headerBytes = 5;
-constexpr std::uint8_t searchType = 6;
-constexpr std::uint8_t commandType = 4;
-constexpr std::uint8_t lowestPlayerId = 32;
+constexpr std::size_t HeaderBytes = 5;
+constexpr std::uint8_t SearchType = 6;
+constexpr std::uint8_t CommandType = 4;
+constexpr std::uint8_t LowestPlayerId = 32;
 // A radio frame holds 100 data bytes; 8 stand before a block.
-constexpr std::uint8_t longestBlock = 92;
+constexpr std::uint8_t LongestBlock = 92;
 
 std::uint64_t Reversed(std::uint64_t address) {
   std::uint64_t reversed = 0;
@@ -32,10 +32,10 @@ std::variant<GunRequest, HostFault> ReadSearch(const TransmitRequest& transmit) 
     return HostFault{transmit.Destination == Reversed(Broadcast) ? "an address in the wrong byte order"
                                                                  : "a search to a single address"};
   }
-  if (transmit.Data.size() != headerBytes) {
+  if (transmit.Data.size() != HeaderBytes) {
     return HostFault{"a search with a payload"};
   }
-  if (transmit.Data[1] < lowestPlayerId) {
+  if (transmit.Data[1] < LowestPlayerId) {
     return HostFault{"a search for a player id below 32"};
   }
   return GunRequest{.Command = GunCommand::Search, .PlayerId = transmit.Data[1]};
@@ -45,7 +45,7 @@ std::variant<GunRequest, HostFault> ReadBlock(std::span<const std::uint8_t> payl
   if (payload.size() != 3) {
     return HostFault{"a wrong number of arguments"};
   }
-  if (payload[2] == 0 || payload[2] > longestBlock) {
+  if (payload[2] == 0 || payload[2] > LongestBlock) {
     return HostFault{"a block that fits no frame"};
   }
   if (payload[1] + payload[2] >= static_cast<int>(gun.Frame.size())) {
@@ -65,7 +65,7 @@ std::variant<GunRequest, HostFault> ReadCommand(const TransmitRequest& transmit,
   if (transmit.Data[1] != gun->PlayerId) {
     return HostFault{"another gun's player id"};
   }
-  const auto payload = std::span(transmit.Data).subspan(headerBytes);
+  const auto payload = std::span(transmit.Data).subspan(HeaderBytes);
   const std::uint8_t command = payload.empty() ? std::uint8_t{0} : payload[0];
   switch (command) {
     case 1:
@@ -87,16 +87,16 @@ std::variant<GunRequest, HostFault> ReadCommand(const TransmitRequest& transmit,
 std::variant<GunRequest, HostFault> ReadGunRequest(const TransmitRequest& transmit,
                                                    std::span<const RadioGun> guns) {
   const std::vector<std::uint8_t>& data = transmit.Data;
-  if (data.size() < headerBytes || data[0] + headerBytes != data.size()) {
+  if (data.size() < HeaderBytes || data[0] + HeaderBytes != data.size()) {
     return HostFault{"a packet of another length than it says"};
   }
   if (data[2] != 0 || data[3] != 0) {
     return HostFault{"a packet without its zeros"};
   }
   switch (data[4]) {
-    case searchType:
+    case SearchType:
       return ReadSearch(transmit);
-    case commandType:
+    case CommandType:
       return ReadCommand(transmit, guns);
     default:
       return HostFault{"an unknown packet type"};

@@ -5,10 +5,10 @@
 namespace sim {
 namespace {
 
-constexpr std::uint8_t receivedFrom64 = 0x80;
-constexpr std::uint8_t signalStrength = 0x28;  // -40 dBm
+constexpr std::uint8_t ReceivedFrom64 = 0x80;
+constexpr std::uint8_t SignalStrength = 0x28;  // -40 dBm
 // A total is told in units of 255, not 256.
-constexpr std::size_t totalFactor = 255;
+constexpr std::size_t TotalFactor = 255;
 
 std::vector<std::uint8_t> Packet(const RadioGun& gun, std::uint8_t type,
                                  const std::vector<std::uint8_t>& payload) {
@@ -19,7 +19,7 @@ std::vector<std::uint8_t> Packet(const RadioGun& gun, std::uint8_t type,
 
 std::vector<std::uint8_t> SizePayload(const RadioGun& gun) {
   const std::size_t total = gun.Frame.size() - 1;
-  return {1, static_cast<std::uint8_t>(total % totalFactor), static_cast<std::uint8_t>(total / totalFactor),
+  return {1, static_cast<std::uint8_t>(total % TotalFactor), static_cast<std::uint8_t>(total / TotalFactor),
           gun.Frame.back()};
 }
 
@@ -58,11 +58,11 @@ std::vector<std::uint8_t> EncodeModemFrame(std::span<const std::uint8_t> body) {
 }
 
 std::vector<std::uint8_t> EncodeReceivedFrame(std::uint64_t address, std::span<const std::uint8_t> packet) {
-  std::vector<std::uint8_t> body{receivedFrom64};
+  std::vector<std::uint8_t> body{ReceivedFrom64};
   for (unsigned shift = 64; shift > 0; shift -= 8) {
     body.push_back(static_cast<std::uint8_t>(address >> (shift - 8U) & 0xFFU));
   }
-  body.push_back(signalStrength);
+  body.push_back(SignalStrength);
   body.push_back(0);  // options: sent to this modem alone
   body.insert(body.end(), packet.begin(), packet.end());
   return EncodeModemFrame(body);

@@ -9,10 +9,10 @@ namespace sim {
 namespace {
 
 // Every code that has a name, so that a field of 27 guns shows each once.
-constexpr std::array<std::uint8_t, 27> weapons{0,  1,  2,  3,  4,   5,   6,   7,   8,   9,   10,  11,  12, 13,
+constexpr std::array<std::uint8_t, 27> Weapons{0,  1,  2,  3,  4,   5,   6,   7,   8,   9,   10,  11,  12, 13,
                                                14, 15, 16, 17, 100, 101, 102, 103, 104, 105, 106, 107, 108};
 // The maker's part of a radio's address; the 0x7E in the serial number is data, whatever it looks like.
-constexpr std::uint64_t addressBase = 0x0013A200'407E0000;
+constexpr std::uint64_t AddressBase = 0x0013A200'407E0000;
 
 }  // namespace
 
@@ -24,11 +24,11 @@ std::vector<RadioGun> MakeRadioGuns(const std::vector<GunScores>& game,
     const unsigned id = scores.PlayerId;
     RadioGun gun;
     gun.PlayerId = scores.PlayerId;
-    gun.Address = addressBase + std::uint64_t{id} * 151U % 256U * 256U + id;
+    gun.Address = AddressBase + std::uint64_t{id} * 151U % 256U * 256U + id;
     gun.FirmwareMajor = id % 16 == 0 ? 1 : 2;
     gun.FirmwareMinor = static_cast<std::uint8_t>(id % 3 + 9);
     gun.Battery = static_cast<std::uint8_t>(100 - id * 37U % 91U);
-    gun.Weapon = weapons.at(id % weapons.size());
+    gun.Weapon = Weapons.at(id % Weapons.size());
     gun.Frame = EncodeScoreFrame(scores);
     gun.AnswerTime = answerTime;
     guns.push_back(gun);

@@ -8,13 +8,13 @@
 namespace sim {
 namespace {
 
-constexpr int lineBaud = 57600;
+constexpr int LineBaud = 57600;
 
 }  // namespace
 
 RadioModem::RadioModem(RadioModemSettings settings)
     : Device({.LogName = "radio-modem",
-              .Understood = {{.Baud = lineBaud}},
+              .Understood = {{.Baud = LineBaud}},
               .LinePace = settings.LinePace,
               .Log = settings.Log}),
       settings_(std::move(settings)),

@@ -14,20 +14,20 @@ namespace {
 
 using Bytes = std::vector<std::uint8_t>;
 
-constexpr std::uint8_t startByte = 0x7E;
+constexpr std::uint8_t StartByte = 0x7E;
 // Neither 0 nor a likely count, so that a reader that takes it for data is noticed.
-constexpr std::uint8_t filler = 0xEE;
-const Bytes transmitStatus{0x89, 0, 0};
-const Bytes modemStatus{0x8A, 6};
-const Bytes noise{0xFE, 0xF0, 0x7F};
-const Bytes noiseWithStart{0xFE, startByte, 0x12};
-constexpr std::size_t startOfBlock = 8;
+constexpr std::uint8_t Filler = 0xEE;
+const Bytes TransmitStatus{0x89, 0, 0};
+const Bytes ModemStatus{0x8A, 6};
+const Bytes Noise{0xFE, 0xF0, 0x7F};
+const Bytes NoiseWithStart{0xFE, StartByte, 0x12};
+constexpr std::size_t StartOfBlock = 8;
 
 // A frame has at least 47 bytes with its CRC, so it passes 270 with these.
 void LengthenScores(RadioGun& gun) {
   constexpr std::size_t extraBytes = 255;
   gun.Frame.pop_back();
-  gun.Frame.insert(gun.Frame.end(), extraBytes, filler);
+  gun.Frame.insert(gun.Frame.end(), extraBytes, Filler);
   gun.Frame.push_back(Crc8(gun.Frame));
 }
 
@@ -50,7 +50,7 @@ Bytes OtherBlock(const RadioGun& gun, GunRequest request, Bytes packet) {
 Bytes AtResponse() {
   constexpr std::size_t valueBytes = 30;
   Bytes body{0x88, 1, 'N', 'D', 0};
-  body.insert(body.end(), valueBytes, filler);
+  body.insert(body.end(), valueBytes, Filler);
   return EncodeModemFrame(body);
 }
 
@@ -65,7 +65,7 @@ Bytes SpoilPacket(RadioFailure failure, const RadioGun& gun, const GunRequest& r
     case RadioFailure::OtherBlock:
       return OtherBlock(gun, request, std::move(packet));
     case RadioFailure::WrongCrc:
-      packet[startOfBlock] ^= 0xFFU;
+      packet[StartOfBlock] ^= 0xFFU;
       break;
     case RadioFailure::TotalZero:
       packet[6] = 0;
@@ -75,7 +75,7 @@ Bytes SpoilPacket(RadioFailure failure, const RadioGun& gun, const GunRequest& r
       packet[1] %= 32;
       break;
     case RadioFailure::LongData:
-      packet.resize(longData, filler);
+      packet.resize(longData, Filler);
       break;
     case RadioFailure::LongPayload:
       packet[0] = 255;
@@ -99,20 +99,20 @@ std::vector<LinePiece> SpoilFrame(RadioFailure failure, Bytes frame) {
     case RadioFailure::DoubleAnswer:
       return {{frame}, {frame}};
     case RadioFailure::StatusFrames:
-      return {{EncodeModemFrame(transmitStatus)}, {frame}, {EncodeModemFrame(modemStatus)}};
+      return {{EncodeModemFrame(TransmitStatus)}, {frame}, {EncodeModemFrame(ModemStatus)}};
     case RadioFailure::TornFrames:
       return {{.Bytes = frame, .Torn = true}};
     case RadioFailure::CutFrames:
       return {FirstHalf(frame, false)};
     case RadioFailure::StartForChecksum:
-      frame.back() = startByte;
+      frame.back() = StartByte;
       return {{frame}};
     case RadioFailure::LostChecksum:
       return {{Bytes(frame.begin(), frame.end() - 1)}, {frame}};
     case RadioFailure::Noise:
-      return {{noise}, {frame}};
+      return {{Noise}, {frame}};
     case RadioFailure::FalseStart:
-      return {{noiseWithStart}, {frame}};
+      return {{NoiseWithStart}, {frame}};
     case RadioFailure::HangUpInSearch:
     case RadioFailure::HangUpInBlock:
       return {FirstHalf(frame, true)};

@@ -22,8 +22,8 @@
 
 namespace {
 
-constexpr int exitFailure = 1;
-constexpr int exitBadOptions = 2;
+constexpr int ExitFailure = 1;
+constexpr int ExitBadOptions = 2;
 
 // Must run before the first thread starts, so that no thread is ended by the signals that end the program.
 sim::FileDescriptor CatchEndSignals() {
@@ -114,9 +114,9 @@ int main(int argc, char** argv) {
     return 0;
   } catch (const std::invalid_argument& failure) {
     Complain(failure);
-    return exitBadOptions;
+    return ExitBadOptions;
   } catch (const std::exception& failure) {
     Complain(failure);
-    return exitFailure;
+    return ExitFailure;
   }
 }

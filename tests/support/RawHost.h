@@ -16,7 +16,7 @@ namespace sim {
 using Bytes = std::vector<std::uint8_t>;
 
 /// Longest wait for something that must come; long enough for a busy machine.
-constexpr std::chrono::seconds limit{20};
+constexpr std::chrono::seconds Limit{20};
 
 /// For the messages of failed tests.
 inline void PrintTo(const LineSettings& settings, std::ostream* out) {
@@ -34,7 +34,7 @@ class RawHost {
   LineSettings Settings() const { return ReadLineSettings(line_.Get()); }
   void Write(const Bytes& bytes);
   /// None when `longestWait` passed first or the line hung up.
-  std::optional<std::uint8_t> ReadByte(std::chrono::milliseconds longestWait = limit);
+  std::optional<std::uint8_t> ReadByte(std::chrono::milliseconds longestWait = Limit);
   /// `count` bytes, or fewer when one does not come within the limit.
   Bytes Read(std::size_t count);
   /// All bytes until the line hangs up.

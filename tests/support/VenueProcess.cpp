@@ -32,7 +32,7 @@ struct Pipe {
 
 bool WaitReadable(const FileDescriptor& descriptor) {
   pollfd watched{descriptor.Get(), POLLIN, 0};
-  return ::poll(&watched, 1, static_cast<int>(std::chrono::milliseconds(limit).count())) > 0;
+  return ::poll(&watched, 1, static_cast<int>(std::chrono::milliseconds(Limit).count())) > 0;
 }
 
 std::string ReadTo(const FileDescriptor& descriptor, char last) {

@@ -20,10 +20,10 @@ namespace {
 using LineClock = std::chrono::steady_clock;
 
 /// What the system holds back of the output. Of more bytes than that the first ones are already through.
-constexpr int outputBufferBytes = 4096;
+constexpr int OutputBufferBytes = 4096;
 
 /// A full output buffer takes 2.1 s at 19200 baud.
-constexpr int longestOutputMilliseconds = 3000;
+constexpr int LongestOutputMilliseconds = 3000;
 
 /// A second look at a device while it is opened. The system does not hold root to another program's exclusive
 /// mode, and the toolkit enters that mode itself, so it has to be asked for before. Kept until the toolkit
@@ -182,7 +182,7 @@ bool QtSerialPort::AwaitIdle() const {
 
 void QtSerialPort::NoteOutput() {
   const auto now = LineClock::now();
-  idleAt_ = std::min(std::max(idleAt_, now) + timeOfAByte_, now + outputBufferBytes * timeOfAByte_);
+  idleAt_ = std::min(std::max(idleAt_, now) + timeOfAByte_, now + OutputBufferBytes * timeOfAByte_);
 }
 
 std::size_t QtSerialPort::InBufferCount() {
@@ -217,7 +217,7 @@ void QtSerialPort::Output(std::uint8_t byte) {
     }
     const bool full = written == 0 || errno == EAGAIN;
     pollfd line{port_.handle(), POLLOUT, 0};
-    if (!full || ::poll(&line, 1, longestOutputMilliseconds) == 0) {
+    if (!full || ::poll(&line, 1, LongestOutputMilliseconds) == 0) {
       Lose();
     }
   }

@@ -12,11 +12,11 @@
 namespace sim {
 namespace {
 
-constexpr int players = 5;
+constexpr int Players = 5;
 // The second frame, or a byte within it.
-constexpr std::size_t faultyFrame = 2;
-constexpr std::size_t index = faultyFrame - 1;
-constexpr std::size_t bytesIntoFrame = 10;
+constexpr std::size_t FaultyFrame = 2;
+constexpr std::size_t Index = FaultyFrame - 1;
+constexpr std::size_t BytesIntoFrame = 10;
 
 struct Conversation {
   Bytes Lead;                 // up to and with the count byte
@@ -27,19 +27,19 @@ struct Conversation {
 class FailureOfTheBaseUnit : public testing::TestWithParam<BaseUnitFailureInfo> {
  protected:
   FailureOfTheBaseUnit()
-      : faultless_(MakeBaseUnitAnswer(MakeGame(players, 2)).Frames),
-        unit_({.Answer = MakeBaseUnitAnswer(MakeGame(players, 2), GetParam().Failure, Place()),
+      : faultless_(MakeBaseUnitAnswer(MakeGame(Players, 2)).Frames),
+        unit_({.Answer = MakeBaseUnitAnswer(MakeGame(Players, 2), GetParam().Failure, Place()),
                .LinePace = Pace::Fast}),
         host_(unit_.DevicePath()) {}
 
   std::size_t Place() const {
-    return GetParam().Place == FailurePlace::Byte ? 1 + faultless_[0].size() + bytesIntoFrame : faultyFrame;
+    return GetParam().Place == FailurePlace::Byte ? 1 + faultless_[0].size() + BytesIntoFrame : FaultyFrame;
   }
 
   Bytes Receive(std::size_t count) {
     // Where silence is what must come, there is no reason to wait for long.
     const auto patience =
-        GetParam().Failure == BaseUnitFailure::Silence ? std::chrono::milliseconds(500) : limit;
+        GetParam().Failure == BaseUnitFailure::Silence ? std::chrono::milliseconds(500) : Limit;
     Bytes bytes;
     while (bytes.size() < count) {
       const std::optional<std::uint8_t> byte = host_.ReadByte(patience);
@@ -69,7 +69,7 @@ class FailureOfTheBaseUnit : public testing::TestWithParam<BaseUnitFailureInfo> 
       }
       heard.Frames.push_back(frame);
     }
-    EXPECT_TRUE(unit_.WaitUntilServed(1, limit));
+    EXPECT_TRUE(unit_.WaitUntilServed(1, Limit));
     return heard;
   }
 
@@ -81,13 +81,13 @@ class FailureOfTheBaseUnit : public testing::TestWithParam<BaseUnitFailureInfo> 
   bool broken_ = false;
 };
 
-const Bytes countOfAll{players};
-const Bytes allAccepted(players, 170);
+const Bytes CountOfAll{Players};
+const Bytes allAccepted(Players, 170);
 
 void ExpectOthersFaultless(const std::vector<Bytes>& frames, const std::vector<Bytes>& faultless) {
   ASSERT_GE(frames.size(), faultless.size());
   for (std::size_t i = 0; i < faultless.size(); ++i) {
-    if (i != index) {
+    if (i != Index) {
       EXPECT_EQ(frames[i], faultless[i]) << "frame " << i + 1;
     }
   }
@@ -116,26 +116,26 @@ void ExpectLongerStatistics(const Bytes& frame, const Bytes& faultless) {
 
 void ExpectWrongCrc(const std::vector<Bytes>& frames, const std::vector<Bytes>& faultless) {
   ExpectOthersFaultless(frames, faultless);
-  const std::size_t length = faultless[index].size() - 1;
-  EXPECT_EQ(Part(frames.at(index), 0, length), Part(faultless[index], 0, length));
-  EXPECT_NE(frames.at(index).back(), faultless[index].back());
+  const std::size_t length = faultless[Index].size() - 1;
+  EXPECT_EQ(Part(frames.at(Index), 0, length), Part(faultless[Index], 0, length));
+  EXPECT_NE(frames.at(Index).back(), faultless[Index].back());
 }
 
 void ExpectSecondRun(const std::vector<Bytes>& frames, const std::vector<Bytes>& faultless) {
   ASSERT_EQ(frames.size(), faultless.size() + 1);
-  EXPECT_EQ(frames.at(index), faultless[index]);
+  EXPECT_EQ(frames.at(Index), faultless[Index]);
   ExpectOthersFaultless(frames, faultless);
-  EXPECT_EQ(frames.back()[4], faultless[index][4]);
-  EXPECT_NE(Part(frames.back(), 6, 45), Part(faultless[index], 6, 45));
+  EXPECT_EQ(frames.back()[4], faultless[Index][4]);
+  EXPECT_NE(Part(frames.back(), 6, 45), Part(faultless[Index], 6, 45));
 }
 
 // A line that is pulled out takes bytes with it that the host had not read yet.
 void ExpectHalfAFrameAtMost(const std::vector<Bytes>& frames, const std::vector<Bytes>& faultless) {
-  ASSERT_EQ(frames.size(), faultyFrame);
+  ASSERT_EQ(frames.size(), FaultyFrame);
   EXPECT_EQ(frames[0], faultless[0]);
-  const Bytes& rest = frames.at(index);
-  EXPECT_LE(rest.size(), faultless[index].size() / 2);
-  EXPECT_TRUE(std::equal(rest.begin(), rest.end(), faultless[index].begin()));
+  const Bytes& rest = frames.at(Index);
+  EXPECT_LE(rest.size(), faultless[Index].size() / 2);
+  EXPECT_TRUE(std::equal(rest.begin(), rest.end(), faultless[Index].begin()));
 }
 
 TEST_P(FailureOfTheBaseUnit, ReachesTheHostAsItsNameSays) {
@@ -144,7 +144,7 @@ TEST_P(FailureOfTheBaseUnit, ReachesTheHostAsItsNameSays) {
   switch (failure) {
     case BaseUnitFailure::None:
     case BaseUnitFailure::TornWrites:
-      EXPECT_EQ(heard.Lead, countOfAll);
+      EXPECT_EQ(heard.Lead, CountOfAll);
       EXPECT_EQ(heard.Frames, faultless_);
       EXPECT_EQ(Replies(), allAccepted);
       break;
@@ -154,7 +154,7 @@ TEST_P(FailureOfTheBaseUnit, ReachesTheHostAsItsNameSays) {
       break;
     case BaseUnitFailure::Silence:
       EXPECT_EQ(heard.Frames,
-                (std::vector<Bytes>{faultless_[0], Part(faultless_[1], 0, bytesIntoFrame - 1)}));
+                (std::vector<Bytes>{faultless_[0], Part(faultless_[1], 0, BytesIntoFrame - 1)}));
       EXPECT_FALSE(host_.HungUp());
       break;
     case BaseUnitFailure::CountZero:
@@ -162,7 +162,7 @@ TEST_P(FailureOfTheBaseUnit, ReachesTheHostAsItsNameSays) {
       EXPECT_TRUE(host_.IsSilent());
       break;
     case BaseUnitFailure::NoiseBeforeCount:
-      EXPECT_EQ(heard.Lead, (Bytes{0xFE, 0xF0, 0x7F, players}));
+      EXPECT_EQ(heard.Lead, (Bytes{0xFE, 0xF0, 0x7F, Players}));
       EXPECT_EQ(heard.Frames, faultless_);
       break;
     case BaseUnitFailure::LongerStatisticsBlock:
@@ -174,24 +174,24 @@ TEST_P(FailureOfTheBaseUnit, ReachesTheHostAsItsNameSays) {
       break;
     case BaseUnitFailure::LengthAbove1001:
       ExpectOthersFaultless(heard.Frames, faultless_);
-      EXPECT_GT(heard.Frames.at(index).size(), 1001U + 1U);
-      EXPECT_EQ(Part(heard.Frames.at(index), 4, 45), Part(faultless_[index], 4, 45));
+      EXPECT_GT(heard.Frames.at(Index).size(), 1001U + 1U);
+      EXPECT_EQ(Part(heard.Frames.at(Index), 4, 45), Part(faultless_[Index], 4, 45));
       EXPECT_EQ(Replies(), allAccepted);
       break;
     case BaseUnitFailure::HighBitWords:
       ExpectOthersFaultless(heard.Frames, faultless_);
-      ExpectHighCounters(heard.Frames.at(index), faultless_[index]);
+      ExpectHighCounters(heard.Frames.at(Index), faultless_[Index]);
       EXPECT_EQ(Replies(), allAccepted);
       break;
     case BaseUnitFailure::SameGunTwice:
-      EXPECT_EQ(heard.Lead, Bytes{players + 1});
+      EXPECT_EQ(heard.Lead, Bytes{Players + 1});
       ExpectSecondRun(heard.Frames, faultless_);
       break;
     case BaseUnitFailure::HangUp:
       EXPECT_TRUE(host_.HungUp());
       ExpectHalfAFrameAtMost(heard.Frames, faultless_);
-      EXPECT_EQ(unit_.LatestExchange().Frames.at(index),
-                Part(faultless_[index], 0, faultless_[index].size() / 2));
+      EXPECT_EQ(unit_.LatestExchange().Frames.at(Index),
+                Part(faultless_[Index], 0, faultless_[Index].size() / 2));
       break;
   }
 }

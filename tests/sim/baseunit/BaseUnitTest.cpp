@@ -14,64 +14,64 @@ namespace {
 
 using Clock = std::chrono::steady_clock;
 
-const Bytes request{1, 0};
-const Bytes accept{170};
-const Bytes reject{0};
+const Bytes Request{1, 0};
+const Bytes Accept{170};
+const Bytes Reject{0};
 
 // Written by hand: red 0 who did nothing, and blue 2 with two hits.
-const Bytes red0{0x2E, 0, 0x29, 0, 0x20, 0x12, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0,   0,
+const Bytes Red0{0x2E, 0, 0x29, 0, 0x20, 0x12, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0,   0,
                  0,    0, 0,    0, 0,    0,    0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0x6C};
-const Bytes blue2{0x34, 0x00, 0x29, 0x00, 0x42, 0x12, 0x01, 0x23, 0x00, 0x04, 0x00, 0x05, 0x00, 0x06,
+const Bytes Blue2{0x34, 0x00, 0x29, 0x00, 0x42, 0x12, 0x01, 0x23, 0x00, 0x04, 0x00, 0x05, 0x00, 0x06,
                   0x00, 0x07, 0x00, 0x08, 0x01, 0x02, 0x00, 0x0A, 0x00, 0x0B, 0x01, 0x23, 0x45, 0x67,
                   0x89, 0xAB, 0xCD, 0xEF, 0x00, 0x64, 0x00, 0x03, 0x00, 0x1E, 0x00, 0x32, 0x00, 0x19,
                   0x01, 0x10, 0x80, 0x02, 0x21, 0x2C, 0x01, 0xFF, 0xFF, 0x7F, 0xE1};
 
 BaseUnitSettings TwoFrames() {
-  return {.Answer = {.Count = 2, .Frames = {blue2, red0}}, .LinePace = Pace::Fast};
+  return {.Answer = {.Count = 2, .Frames = {Blue2, Red0}}, .LinePace = Pace::Fast};
 }
 
 TEST(BaseUnit, SendsTheCountAndThenAFrameForEachReply) {
   BaseUnit unit(TwoFrames());
   RawHost host(unit.DevicePath());
-  host.Write(request);
+  host.Write(Request);
   EXPECT_EQ(host.Read(1), Bytes{2});
-  EXPECT_EQ(host.Read(blue2.size()), blue2);
+  EXPECT_EQ(host.Read(Blue2.size()), Blue2);
   EXPECT_TRUE(host.IsSilent());
-  host.Write(accept);
-  EXPECT_EQ(host.Read(red0.size()), red0);
+  host.Write(Accept);
+  EXPECT_EQ(host.Read(Red0.size()), Red0);
   EXPECT_TRUE(host.IsSilent());
-  host.Write(accept);
-  EXPECT_TRUE(unit.WaitUntilServed(1, limit));
+  host.Write(Accept);
+  EXPECT_TRUE(unit.WaitUntilServed(1, Limit));
   EXPECT_TRUE(host.IsSilent());
 }
 
 TEST(BaseUnit, GoesOnWithTheNextFrameAfterARejection) {
   BaseUnit unit(TwoFrames());
   RawHost host(unit.DevicePath());
-  host.Write(request);
-  EXPECT_EQ(host.Read(1 + blue2.size()).size(), 1 + blue2.size());
-  host.Write(reject);
-  EXPECT_EQ(host.Read(red0.size()), red0);
-  host.Write(reject);
-  EXPECT_TRUE(unit.WaitUntilServed(1, limit));
+  host.Write(Request);
+  EXPECT_EQ(host.Read(1 + Blue2.size()).size(), 1 + Blue2.size());
+  host.Write(Reject);
+  EXPECT_EQ(host.Read(Red0.size()), Red0);
+  host.Write(Reject);
+  EXPECT_TRUE(unit.WaitUntilServed(1, Limit));
   EXPECT_EQ(unit.LatestExchange().Replies, (Bytes{0, 0}));
 }
 
 TEST(BaseUnit, TellsWhatHasPassedTheLine) {
   BaseUnit unit(TwoFrames());
   RawHost host(unit.DevicePath());
-  host.Write(request);
-  host.Read(1 + blue2.size());
-  host.Write(accept);
-  host.Read(red0.size());
-  host.Write(reject);
-  ASSERT_TRUE(unit.WaitUntilServed(1, limit));
+  host.Write(Request);
+  host.Read(1 + Blue2.size());
+  host.Write(Accept);
+  host.Read(Red0.size());
+  host.Write(Reject);
+  ASSERT_TRUE(unit.WaitUntilServed(1, Limit));
   const BaseUnitExchange exchange = unit.LatestExchange();
   Bytes sent{2};
-  sent.insert(sent.end(), blue2.begin(), blue2.end());
-  sent.insert(sent.end(), red0.begin(), red0.end());
+  sent.insert(sent.end(), Blue2.begin(), Blue2.end());
+  sent.insert(sent.end(), Red0.begin(), Red0.end());
   EXPECT_EQ(exchange.Sent, sent);
-  EXPECT_EQ(exchange.Frames, (std::vector<Bytes>{blue2, red0}));
+  EXPECT_EQ(exchange.Frames, (std::vector<Bytes>{Blue2, Red0}));
   EXPECT_EQ(exchange.Replies, (Bytes{170, 0}));
 }
 
@@ -87,26 +87,26 @@ TEST(BaseUnit, AnswersNothingButTheTwoBytesOfARequestInOrder) {
 TEST(BaseUnit, TakesNoOtherByteForAReply) {
   BaseUnit unit(TwoFrames());
   RawHost host(unit.DevicePath());
-  host.Write(request);
-  host.Read(1 + blue2.size());
+  host.Write(Request);
+  host.Read(1 + Blue2.size());
   host.Write({7, 0xAB, 0xFF, 1});
   EXPECT_TRUE(host.IsSilent());
-  host.Write(accept);
-  EXPECT_EQ(host.Read(red0.size()), red0);
+  host.Write(Accept);
+  EXPECT_EQ(host.Read(Red0.size()), Red0);
 }
 
 TEST(BaseUnit, BeginsAgainWhenTheHostAsksAnewInsteadOfReplying) {
   BaseUnit unit(TwoFrames());
   RawHost host(unit.DevicePath());
-  host.Write(request);
-  host.Read(1 + blue2.size());
-  host.Write(request);
+  host.Write(Request);
+  host.Read(1 + Blue2.size());
+  host.Write(Request);
   EXPECT_EQ(host.Read(1), Bytes{2});
-  EXPECT_EQ(host.Read(blue2.size()), blue2);
-  host.Write(accept);
-  EXPECT_EQ(host.Read(red0.size()), red0);
-  host.Write(accept);
-  EXPECT_TRUE(unit.WaitUntilServed(2, limit));
+  EXPECT_EQ(host.Read(Blue2.size()), Blue2);
+  host.Write(Accept);
+  EXPECT_EQ(host.Read(Red0.size()), Red0);
+  host.Write(Accept);
+  EXPECT_TRUE(unit.WaitUntilServed(2, Limit));
   EXPECT_EQ(unit.LatestExchange().Replies, (Bytes{170, 170}));
 }
 
@@ -114,22 +114,22 @@ TEST(BaseUnit, GivesTheSameScoresAgainToAHostThatComesBack) {
   BaseUnit unit(TwoFrames());
   for (int download = 1; download <= 3; ++download) {
     RawHost host(unit.DevicePath());
-    host.Write(request);
+    host.Write(Request);
     EXPECT_EQ(host.Read(1), Bytes{2});
-    EXPECT_EQ(host.Read(blue2.size()), blue2);
-    host.Write(accept);
-    EXPECT_EQ(host.Read(red0.size()), red0);
-    host.Write(accept);
-    EXPECT_TRUE(unit.WaitUntilServed(download, limit));
+    EXPECT_EQ(host.Read(Blue2.size()), Blue2);
+    host.Write(Accept);
+    EXPECT_EQ(host.Read(Red0.size()), Red0);
+    host.Write(Accept);
+    EXPECT_TRUE(unit.WaitUntilServed(download, Limit));
   }
 }
 
 TEST(BaseUnit, SaysZeroWhenThereAreNoScores) {
   BaseUnit unit({.Answer = MakeBaseUnitAnswer({}), .LinePace = Pace::Fast});
   RawHost host(unit.DevicePath());
-  host.Write(request);
+  host.Write(Request);
   EXPECT_EQ(host.Read(1), Bytes{0});
-  EXPECT_TRUE(unit.WaitUntilServed(1, limit));
+  EXPECT_TRUE(unit.WaitUntilServed(1, Limit));
   EXPECT_TRUE(host.IsSilent());
 }
 
@@ -137,13 +137,13 @@ TEST(BaseUnit, HandsOverAFullField) {
   const BaseUnitAnswer answer = MakeBaseUnitAnswer(MakeGame(224, 9));
   BaseUnit unit({.Answer = answer, .LinePace = Pace::Fast});
   RawHost host(unit.DevicePath());
-  host.Write(request);
+  host.Write(Request);
   EXPECT_EQ(host.Read(1), Bytes{224});
   for (const Bytes& frame : answer.Frames) {
     ASSERT_EQ(host.Read(frame.size()), frame);
-    host.Write(accept);
+    host.Write(Accept);
   }
-  EXPECT_TRUE(unit.WaitUntilServed(1, limit));
+  EXPECT_TRUE(unit.WaitUntilServed(1, Limit));
   EXPECT_EQ(unit.LatestExchange().Frames, answer.Frames);
 }
 
@@ -153,12 +153,12 @@ TEST(BaseUnit, SendsNoFasterThanItsBaudRate) {
   BaseUnit unit(settings);
   RawHost host(unit.DevicePath());
   const Clock::time_point start = Clock::now();
-  host.Write(request);
-  host.Read(1 + blue2.size());
-  host.Write(accept);
-  host.Read(red0.size());
+  host.Write(Request);
+  host.Read(1 + Blue2.size());
+  host.Write(Accept);
+  host.Read(Red0.size());
   // Request, count, two frames and a reply at 19200 bits a second, ten bits each.
-  const double bytes = static_cast<double>(2 + 1 + blue2.size() + red0.size() + 1);
+  const double bytes = static_cast<double>(2 + 1 + Blue2.size() + Red0.size() + 1);
   EXPECT_GE(Clock::now() - start, std::chrono::duration<double>(bytes * 10.0 / 19200.0));
 }
 
@@ -168,11 +168,11 @@ TEST(BaseUnit, PausesBetweenThePiecesOfATornAnswer) {
   BaseUnit unit(settings);
   RawHost host(unit.DevicePath());
   const Clock::time_point start = Clock::now();
-  host.Write(request);
+  host.Write(Request);
   EXPECT_EQ(host.Read(1), Bytes{2});
-  EXPECT_EQ(host.Read(blue2.size()), blue2);
+  EXPECT_EQ(host.Read(Blue2.size()), Blue2);
   // At most three bytes between two pauses of 3 ms.
-  EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(blue2.size() / 3 * 3));
+  EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(Blue2.size() / 3 * 3));
 }
 
 TEST(BaseUnit, EndsTheLineAfterTheRequestsItWasToServe) {
@@ -184,23 +184,23 @@ TEST(BaseUnit, EndsTheLineAfterTheRequestsItWasToServe) {
   BaseUnit unit(settings);
   std::future<void> end = finished.get_future();
   std::optional<RawHost> host(unit.DevicePath());
-  host->Write(request);
+  host->Write(Request);
   EXPECT_EQ(host->Read(1), Bytes{0});
-  EXPECT_TRUE(unit.WaitUntilServed(1, limit));
+  EXPECT_TRUE(unit.WaitUntilServed(1, Limit));
   EXPECT_EQ(end.wait_for(std::chrono::milliseconds(50)), std::future_status::timeout);
-  host->Write(request);
+  host->Write(Request);
   EXPECT_EQ(host->Read(1), Bytes{0});
   EXPECT_EQ(end.wait_for(std::chrono::milliseconds(50)), std::future_status::timeout);
   EXPECT_FALSE(host->HungUp());
   host.reset();
-  EXPECT_EQ(end.wait_for(limit), std::future_status::ready);
+  EXPECT_EQ(end.wait_for(Limit), std::future_status::ready);
 }
 
 TEST(BaseUnit, StopsInTheMiddleOfAnAnswerWhenItIsDestroyed) {
   std::optional<BaseUnit> unit(std::in_place,
                                BaseUnitSettings{.Answer = MakeBaseUnitAnswer(MakeGame(224, 1))});
   RawHost host(unit->DevicePath());
-  host.Write(request);
+  host.Write(Request);
   EXPECT_EQ(host.Read(3).size(), 3U);
   unit.reset();
   EXPECT_LT(host.ReadUntilHangUp().size(), MakeBaseUnitAnswer(MakeGame(224, 1)).Frames[0].size());
@@ -216,14 +216,14 @@ TEST(BaseUnit, LogsBothDirections) {
   std::ostringstream log;
   {
     BaseUnitSettings settings = TwoFrames();
-    settings.Answer = {.Count = 1, .Frames = {red0}};
+    settings.Answer = {.Count = 1, .Frames = {Red0}};
     settings.Log = &log;
     BaseUnit unit(settings);
     RawHost host(unit.DevicePath());
     host.Write({9, 1, 0});
-    host.Read(1 + red0.size());
+    host.Read(1 + Red0.size());
     host.Write({8, 170});
-    EXPECT_TRUE(unit.WaitUntilServed(1, limit));
+    EXPECT_TRUE(unit.WaitUntilServed(1, Limit));
   }
   std::string frame = "2E 00 29 00 20 12";
   for (int i = 0; i < 40; ++i) {
@@ -245,17 +245,17 @@ TEST(BaseUnit, CopiesTheFramesAsTheyWentOut) {
   {
     BaseUnitSettings settings = TwoFrames();
     settings.Frames = &frames;
-    settings.Answer.CutAfter = 1 + blue2.size() + 5;
+    settings.Answer.CutAfter = 1 + Blue2.size() + 5;
     BaseUnit unit(settings);
     RawHost host(unit.DevicePath());
-    host.Write(request);
-    host.Read(1 + blue2.size());
-    host.Write(accept);
+    host.Write(Request);
+    host.Read(1 + Blue2.size());
+    host.Write(Accept);
     EXPECT_EQ(host.Read(5).size(), 5U);
-    EXPECT_TRUE(unit.WaitUntilServed(1, limit));
+    EXPECT_TRUE(unit.WaitUntilServed(1, Limit));
   }
-  std::string expected(blue2.begin(), blue2.end());
-  expected.append(red0.begin(), red0.begin() + 5);
+  std::string expected(Blue2.begin(), Blue2.end());
+  expected.append(Red0.begin(), Red0.begin() + 5);
   EXPECT_EQ(frames.str(), expected);
 }
 

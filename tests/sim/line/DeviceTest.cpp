@@ -30,16 +30,16 @@ TEST(Device, DoesNotAnswerAHostAtOtherSettingsAndNotesEachRunOfItsBytes) {
   RawHost host(device.DevicePath());
   host.Speak({.Baud = 9600});
   host.Write({1});
-  ASSERT_TRUE(device.WaitUntilHostFaults(1, limit));
+  ASSERT_TRUE(device.WaitUntilHostFaults(1, Limit));
   host.Speak({.Baud = 19200, .StopBits = 2});
   host.Write({3});
-  ASSERT_TRUE(device.WaitUntilHostFaults(2, limit));
+  ASSERT_TRUE(device.WaitUntilHostFaults(2, Limit));
   host.Speak({.Baud = 19200});
   host.Write({4});
   EXPECT_EQ(host.Read(1), Bytes{4});
   host.Speak({.Baud = 19200, .StopBits = 2});
   host.Write({5});
-  ASSERT_TRUE(device.WaitUntilHostFaults(3, limit));
+  ASSERT_TRUE(device.WaitUntilHostFaults(3, Limit));
   EXPECT_TRUE(host.IsSilent());
   EXPECT_THAT(device.HostFaults(), ElementsAre("the host speaks 9600,8N1 instead of 19200,8N1",
                                                "the host speaks 19200,8N2 instead of 19200,8N1",
@@ -54,7 +54,7 @@ TEST(Device, SaysWhichSettingsItWouldHaveUnderstood) {
   EXPECT_EQ(host.Read(1), Bytes{1});
   host.Speak({.Baud = 9600});
   host.Write({2});
-  ASSERT_TRUE(device.WaitUntilHostFaults(1, limit));
+  ASSERT_TRUE(device.WaitUntilHostFaults(1, Limit));
   EXPECT_THAT(device.HostFaults(),
               ElementsAre("the host speaks 9600,8N1 instead of 19200,8N1 or 115200,8N1"));
 }
@@ -66,7 +66,7 @@ TEST(Device, LogsTheBytesThatItDidNotUnderstand) {
     RawHost host(device.DevicePath());
     host.Speak({.Baud = 9600});
     host.Write({0xA5, 0x01});
-    ASSERT_TRUE(device.WaitUntilHostFaults(1, limit));
+    ASSERT_TRUE(device.WaitUntilHostFaults(1, Limit));
   }
   EXPECT_THAT(log.str(), HasSubstr("echo <- A5 01 fault: the host speaks 9600,8N1 instead of 19200,8N1\n"));
 }

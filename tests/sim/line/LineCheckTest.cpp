@@ -37,7 +37,7 @@ TEST_P(LineCheck, LetsNothingThroughThatComesAtOtherSettings) {
     EXPECT_EQ(foreign.Text, Text(GetParam()) + " begins: 1 0\n");
     host.Speak({.Baud = 19200});
     host.Write({7});
-    EXPECT_EQ(line.ReadByte(limit), 7);
+    EXPECT_EQ(line.ReadByte(Limit), 7);
   }
 }
 
@@ -73,14 +73,14 @@ TEST(LineChecks, LookAtTheSettingsWhenBytesComeAndNotAtTheOpening) {
   PseudoTerminal line(19200, Pace::Fast);
   RawHost host(line.SlavePath());
   host.Write({1});
-  EXPECT_EQ(line.ReadByte(limit), 1);
+  EXPECT_EQ(line.ReadByte(Limit), 1);
   host.Speak({.Baud = 57600});
   EXPECT_EQ(line.ReadByte(milliseconds(0)), std::nullopt);
   host.Write({2});
   EXPECT_EQ(line.ReadByte(milliseconds(20)), std::nullopt);
   host.Speak({.Baud = 19200});
   host.Write({3});
-  EXPECT_EQ(line.ReadByte(limit), 3);
+  EXPECT_EQ(line.ReadByte(Limit), 3);
 }
 
 TEST(LineChecks, TellWhereARunOfForeignBytesBegins) {
@@ -110,7 +110,7 @@ TEST(LineChecks, LetEachOfSeveralSettingsThroughAndKeepToTheLatest) {
   EXPECT_EQ(line.Current(), slow);
   host.Speak(quick);
   host.Write({1});
-  EXPECT_EQ(line.ReadByte(limit), 1);
+  EXPECT_EQ(line.ReadByte(Limit), 1);
   EXPECT_EQ(line.Current(), quick);
   EXPECT_EQ(line.DurationOf(1152), milliseconds(100));
   host.Speak({.Baud = 57600});
@@ -119,7 +119,7 @@ TEST(LineChecks, LetEachOfSeveralSettingsThroughAndKeepToTheLatest) {
   EXPECT_EQ(line.Current(), quick);
   host.Speak(slow);
   host.Write({3});
-  EXPECT_EQ(line.ReadByte(limit), 3);
+  EXPECT_EQ(line.ReadByte(Limit), 3);
   EXPECT_EQ(line.Current(), slow);
 }
 
@@ -128,14 +128,14 @@ TEST(LineChecks, GoByTheSettingsToWhichTheDeviceHasChanged) {
   Foreign foreign(line);
   RawHost host(line.SlavePath());
   host.Write({1});
-  EXPECT_EQ(line.ReadByte(limit), 1);
+  EXPECT_EQ(line.ReadByte(Limit), 1);
   line.SetBaud(57600);
   host.Write({2});
   EXPECT_EQ(line.ReadByte(milliseconds(20)), std::nullopt);
   EXPECT_EQ(foreign.Text, "9600,8N1 begins: 2\n");
   host.Speak({.Baud = 57600});
   host.Write({3});
-  EXPECT_EQ(line.ReadByte(limit), 3);
+  EXPECT_EQ(line.ReadByte(Limit), 3);
 }
 
 }  // namespace

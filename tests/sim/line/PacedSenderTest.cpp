@@ -10,10 +10,10 @@ namespace {
 using Clock = PacedSender::Clock;
 using std::chrono::milliseconds;
 
-constexpr int baud = 1200;
+constexpr int Baud = 1200;
 // Ten bits a byte.
 std::chrono::duration<double> WireTime(std::size_t bytes) {
-  return std::chrono::duration<double>(static_cast<double>(bytes) * 10.0 / baud);
+  return std::chrono::duration<double>(static_cast<double>(bytes) * 10.0 / Baud);
 }
 
 class PacedSenderTest : public testing::Test {
@@ -29,7 +29,7 @@ class PacedSenderTest : public testing::Test {
     }
   }
 
-  PseudoTerminal line_{baud, Pace::AsWired};
+  PseudoTerminal line_{Baud, Pace::AsWired};
   RawHost host_{line_.SlavePath()};
   std::vector<Bytes> sent_;
   PacedSender sender_{line_, [this](const LinePiece& piece) { sent_.push_back(piece.Bytes); }};

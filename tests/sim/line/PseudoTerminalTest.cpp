@@ -36,7 +36,7 @@ TEST(PseudoTerminal, CarriesEveryByteValueFromTheClientAndEchoesNone) {
   RawHost host(line.SlavePath());
   host.Write(AllByteValues());
   for (const std::uint8_t value : AllByteValues()) {
-    EXPECT_EQ(line.ReadByte(limit), value);
+    EXPECT_EQ(line.ReadByte(Limit), value);
   }
   EXPECT_TRUE(host.IsSilent());
 }
@@ -44,11 +44,11 @@ TEST(PseudoTerminal, CarriesEveryByteValueFromTheClientAndEchoesNone) {
 TEST(PseudoTerminal, SurvivesAClientThatClosesAndComesBack) {
   PseudoTerminal line(19200, Pace::Fast);
   RawHost(line.SlavePath()).Write({1});
-  EXPECT_EQ(line.ReadByte(limit), 1);
+  EXPECT_EQ(line.ReadByte(Limit), 1);
   EXPECT_EQ(line.ReadByte(milliseconds(20)), std::nullopt);
   RawHost host(line.SlavePath());
   host.Write({2});
-  EXPECT_EQ(line.ReadByte(limit), 2);
+  EXPECT_EQ(line.ReadByte(Limit), 2);
   line.Write(Bytes{3});
   EXPECT_EQ(host.Read(1), Bytes{3});
 }
@@ -84,7 +84,7 @@ TEST(PseudoTerminal, KeepsToANewSpeedFromItsChangeOn) {
   host.Speak({.Baud = 1200});
   host.Write(Bytes(6, 0x55));
   for (std::size_t i = 7; i <= 12; ++i) {
-    EXPECT_EQ(line.ReadByte(limit), 0x55);
+    EXPECT_EQ(line.ReadByte(Limit), 0x55);
     EXPECT_GE(Clock::now() - start, WireTime(i, 1200)) << "byte " << i;
   }
 }
@@ -95,7 +95,7 @@ TEST(PseudoTerminal, ReceivesNoFasterThanTheLineCarries) {
   const Clock::time_point start = Clock::now();
   host.Write(Bytes(40, 0x55));
   for (std::size_t i = 1; i <= 40; ++i) {
-    EXPECT_EQ(line.ReadByte(limit), 0x55);
+    EXPECT_EQ(line.ReadByte(Limit), 0x55);
     EXPECT_GE(Clock::now() - start, WireTime(i, 19200)) << "byte " << i;
   }
 }
@@ -106,7 +106,7 @@ TEST(PseudoTerminal, HoldsAByteBackUntilItsLastBitIsThroughHoweverOftenAsked) {
   const Clock::time_point start = Clock::now();
   host.Write({1});
   std::optional<std::uint8_t> byte;
-  while (!byte && Clock::now() - start < limit) {
+  while (!byte && Clock::now() - start < Limit) {
     byte = line.ReadByte(std::chrono::microseconds(100));
   }
   EXPECT_EQ(byte, 1);
@@ -117,7 +117,7 @@ TEST(PseudoTerminal, LetsBytesOfOneWriteFollowWithoutGapsHoweverLateTheyAreAsked
   PseudoTerminal line(19200, Pace::AsWired);
   RawHost host(line.SlavePath());
   host.Write(AllByteValues());
-  EXPECT_EQ(line.ReadByte(limit), 0);
+  EXPECT_EQ(line.ReadByte(Limit), 0);
   std::this_thread::sleep_for(WireTime(256, 19200));
   for (std::size_t i = 1; i < 256; ++i) {
     EXPECT_EQ(line.ReadByte(std::chrono::nanoseconds(0)), static_cast<std::uint8_t>(i));
@@ -183,7 +183,7 @@ TEST(PseudoTerminal, LetsTheClientCloseFirst) {
   std::optional<RawHost> host(line.SlavePath());
   EXPECT_FALSE(line.WaitForClientToClose(milliseconds(20)));
   host.reset();
-  EXPECT_TRUE(line.WaitForClientToClose(limit));
+  EXPECT_TRUE(line.WaitForClientToClose(Limit));
 }
 
 TEST(PseudoTerminal, AnInterruptionEndsAWaitForAByte) {

@@ -9,8 +9,8 @@
 namespace sim {
 namespace {
 
-constexpr std::uint8_t present = 0xCD;
-constexpr std::uint8_t absent = 0xCF;
+constexpr std::uint8_t Present = 0xCD;
+constexpr std::uint8_t Absent = 0xCF;
 
 class ButtonCommands : public testing::Test {
  protected:
@@ -24,21 +24,21 @@ class ButtonCommands : public testing::Test {
 TEST_F(ButtonCommands, TouchAButtonWithTheRomThatTheyName) {
   EXPECT_EQ(Obey("touch efcdab8967452301"), "touched EFCDAB8967452301");
   EXPECT_EQ(host_.Ask({0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3}, 10),
-            (Bytes{present, 0x33, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF}));
+            (Bytes{Present, 0x33, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF}));
 }
 
 TEST_F(ButtonCommands, TakeAButtonAway) {
   Obey("touch EFCDAB8967452301");
   EXPECT_EQ(Obey("  leave   EFCDAB8967452301 \r"), "left EFCDAB8967452301");
-  EXPECT_EQ(ResetAnswer(), absent);
+  EXPECT_EQ(ResetAnswer(), Absent);
 }
 
 TEST_F(ButtonCommands, TakeAllButtonsAway) {
   Obey("touch EFCDAB8967452301");
   Obey("touch A200000001B81C02");
-  EXPECT_EQ(ResetAnswer(), present);
+  EXPECT_EQ(ResetAnswer(), Present);
   EXPECT_EQ(Obey("leave"), "left");
-  EXPECT_EQ(ResetAnswer(), absent);
+  EXPECT_EQ(ResetAnswer(), Absent);
   EXPECT_EQ(Obey("leave"), "left");
 }
 
@@ -54,7 +54,7 @@ TEST_F(ButtonCommands, RefuseWhatTheyDoNotUnderstandAndButtonsThatAreNotThere) {
         "leave EFCDAB8967452301 now", "Touch EFCDAB8967452301", "EFCDAB8967452301"}) {
     EXPECT_THROW(Obey(line), std::invalid_argument) << line;
   }
-  EXPECT_EQ(ResetAnswer(), present);
+  EXPECT_EQ(ResetAnswer(), Present);
 }
 
 }  // namespace

@@ -9,14 +9,14 @@ namespace {
 
 using Bytes = std::vector<std::uint8_t>;
 
-constexpr RomId button{0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
-constexpr RomId sister{0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCC, 0xEF};
-constexpr RomId reader{0x81, 0x10, 0x32, 0x54, 0x76, 0x98, 0xBA, 0xDC};
+constexpr RomId Button{0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
+constexpr RomId Sister{0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCC, 0xEF};
+constexpr RomId Reader{0x81, 0x10, 0x32, 0x54, 0x76, 0x98, 0xBA, 0xDC};
 
 // What the search accelerator tells of each when there is no choice on the way.
-const Bytes buttonPath{0x02, 0x00, 0x0A, 0x08, 0x22, 0x20, 0x2A, 0x28,
+const Bytes ButtonPath{0x02, 0x00, 0x0A, 0x08, 0x22, 0x20, 0x2A, 0x28,
                        0x82, 0x80, 0x8A, 0x88, 0xA2, 0xA0, 0xAA, 0xA8};
-const Bytes readerPath{0x02, 0x80, 0x00, 0x02, 0x08, 0x0A, 0x20, 0x22,
+const Bytes ReaderPath{0x02, 0x80, 0x00, 0x02, 0x08, 0x0A, 0x20, 0x22,
                        0x28, 0x2A, 0x80, 0x82, 0x88, 0x8A, 0xA0, 0xA2};
 
 class Ds2480bTest : public testing::Test {
@@ -92,7 +92,7 @@ TEST_F(Ds2480bTest, ChangesItsBaudRateWithTheParameter) {
 
 TEST_F(Ds2480bTest, TellsPresenceAndItsVersionAfterAReset) {
   EXPECT_EQ(Answers({0xC1}), Bytes{0xCF});
-  bus_.Touch(button);
+  bus_.Touch(Button);
   EXPECT_EQ(Answers({0xC1, 0xC5, 0xC9}), (Bytes{0xCD, 0xCD, 0xCD}));
 }
 
@@ -111,7 +111,7 @@ TEST_F(Ds2480bTest, ReadsBackSingleBitsInBothLowBits) {
 }
 
 TEST_F(Ds2480bTest, CarriesACommandToTheBusBitByBit) {
-  bus_.Touch(button);
+  bus_.Touch(Button);
   EXPECT_EQ(Answers({0xC1}), Bytes{0xCD});
   EXPECT_EQ(Answers({0x91, 0x91, 0x81, 0x81, 0x91, 0x91, 0x81, 0x81}),
             (Bytes{0x93, 0x93, 0x80, 0x80, 0x93, 0x93, 0x80, 0x80}));
@@ -124,7 +124,7 @@ TEST_F(Ds2480bTest, EchoesDataWithWhatTheBusGave) {
 }
 
 TEST_F(Ds2480bTest, ReadsARomInDataMode) {
-  bus_.Touch(button);
+  bus_.Touch(Button);
   EXPECT_EQ(Answers({0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3, 0xC1}),
             (Bytes{0xCD, 0x33, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF, 0xCD}));
 }
@@ -146,32 +146,32 @@ TEST_F(Ds2480bTest, AnswersNoModeByteInCommandModeAndNoByteThatIsNoCommand) {
 }
 
 TEST_F(Ds2480bTest, FindsASingleDevice) {
-  bus_.Touch(button);
-  EXPECT_EQ(Search(lowestFirst), buttonPath);
-  EXPECT_EQ(Search(Bytes(16, 0xAA)), buttonPath);
+  bus_.Touch(Button);
+  EXPECT_EQ(Search(lowestFirst), ButtonPath);
+  EXPECT_EQ(Search(Bytes(16, 0xAA)), ButtonPath);
 }
 
 TEST_F(Ds2480bTest, FindsTwoDevicesByTheDirectionAtTheirOnlyConflict) {
-  bus_.Touch(button);
-  bus_.Touch(reader);
-  EXPECT_EQ(Search(lowestFirst), With(buttonPath, 1, 0x40));
-  EXPECT_EQ(Search(With(lowestFirst, 1, 0x80)), With(readerPath, 1, 0xC0));
+  bus_.Touch(Button);
+  bus_.Touch(Reader);
+  EXPECT_EQ(Search(lowestFirst), With(ButtonPath, 1, 0x40));
+  EXPECT_EQ(Search(With(lowestFirst, 1, 0x80)), With(ReaderPath, 1, 0xC0));
 }
 
 TEST_F(Ds2480bTest, FindsThreeDevicesAndTellsEachConflictOnTheWay) {
-  bus_.Touch(button);
-  bus_.Touch(reader);
-  bus_.Touch(sister);
-  const Bytes toButtons = With(buttonPath, 1, 0x40);
+  bus_.Touch(Button);
+  bus_.Touch(Reader);
+  bus_.Touch(Sister);
+  const Bytes toButtons = With(ButtonPath, 1, 0x40);
   EXPECT_EQ(Search(lowestFirst), With(toButtons, 12, 0xA1));
   EXPECT_EQ(Search(With(lowestFirst, 12, 0x02)), With(toButtons, 12, 0xA3));
-  EXPECT_EQ(Search(With(lowestFirst, 1, 0x80)), With(readerPath, 1, 0xC0));
+  EXPECT_EQ(Search(With(lowestFirst, 1, 0x80)), With(ReaderPath, 1, 0xC0));
 }
 
 TEST_F(Ds2480bTest, IgnoresTheEvenBitsOfDirections) {
-  bus_.Touch(button);
-  bus_.Touch(reader);
-  EXPECT_EQ(Search(Bytes(16, 0x55)), With(buttonPath, 1, 0x40));
+  bus_.Touch(Button);
+  bus_.Touch(Reader);
+  EXPECT_EQ(Search(Bytes(16, 0x55)), With(ButtonPath, 1, 0x40));
 }
 
 TEST_F(Ds2480bTest, TellsOnlyOnesFromTheFirstBitThatNobodyAnswers) {
@@ -181,20 +181,20 @@ TEST_F(Ds2480bTest, TellsOnlyOnesFromTheFirstBitThatNobodyAnswers) {
 
 TEST_F(Ds2480bTest, ForgetsAFailedSearchWhenTheAcceleratorIsSwitchedOff) {
   Answers({0xE1, 0xF0, 0xE3, 0xB1, 0xE1, 0x00, 0xE3, 0xA1});
-  bus_.Touch(button);
-  EXPECT_EQ(Search(lowestFirst), buttonPath);
+  bus_.Touch(Button);
+  EXPECT_EQ(Search(lowestFirst), ButtonPath);
 }
 
 TEST_F(Ds2480bTest, RemembersAFailedSearchWhileTheAcceleratorIsOn) {
   Answers({0xE1, 0xF0, 0xE3, 0xB1, 0xE1, 0x00, 0xE3});
-  bus_.Touch(button);
+  bus_.Touch(Button);
   // Reset and search command past the accelerator, as single bits.
   Answers({0xC1, 0x81, 0x81, 0x81, 0x81, 0x91, 0x91, 0x91, 0x91, 0xE1});
   EXPECT_EQ(Answers(lowestFirst), Bytes(16, 0xFF));
 }
 
 TEST_F(Ds2480bTest, TellsAButtonThatLeavesInTheMiddleOfASearch) {
-  bus_.Touch(button);
+  bus_.Touch(Button);
   EXPECT_EQ(Answers({0xC1, 0xE1, 0xF0, 0xE3, 0xB1, 0xE1, 0x00, 0x00, 0x00}),
             (Bytes{0xCD, 0xF0, 0x02, 0x00, 0x0A}));
   bus_.LeaveAll();
@@ -212,8 +212,8 @@ TEST_F(Ds2480bTest, TellsAConflictAtEachBitOfASearchOnAShortedBus) {
 }
 
 TEST_F(Ds2480bTest, MatchesARomWithEchoesOnly) {
-  bus_.Touch(button);
-  bus_.Touch(reader);
+  bus_.Touch(Button);
+  bus_.Touch(Reader);
   EXPECT_EQ(Answers({0xC1, 0xE1, 0x55, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF, 0xFF}),
             (Bytes{0xCD, 0x55, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF, 0xFF}));
 }

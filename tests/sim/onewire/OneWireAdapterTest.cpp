@@ -12,8 +12,8 @@
 namespace sim {
 namespace {
 
-constexpr RomId button{0x02, 0x1C, 0xB8, 0x01, 0x00, 0x00, 0x00, 0xA2};
-const Bytes readRom{0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3};
+constexpr RomId Button{0x02, 0x1C, 0xB8, 0x01, 0x00, 0x00, 0x00, 0xA2};
+const Bytes ReadRom{0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3};
 
 Bytes RomAnswer(const Bytes& rom) {
   Bytes answer{0xCD, 0x33};
@@ -27,7 +27,7 @@ TEST(OneWireAdapter, AnswersDetectionAndHasAnIdentityOfItsOwn) {
   EXPECT_EQ(host.Ask({0x17, 0x45, 0x5B, 0x0F, 0x91}, 5), (Bytes{0x16, 0x44, 0x5A, 0x00, 0x93}));
   const Bytes identity{0x81, 0x37, 0x5A, 0x1E, 0x00, 0x00, 0x00, 0xC7};
   EXPECT_EQ(Crc8(identity), 0);
-  EXPECT_EQ(host.Ask(readRom, 10), RomAnswer(identity));
+  EXPECT_EQ(host.Ask(ReadRom, 10), RomAnswer(identity));
 }
 
 TEST(OneWireAdapter, HasAButtonOnItsBusWhileItIsTouched) {
@@ -35,12 +35,12 @@ TEST(OneWireAdapter, HasAButtonOnItsBusWhileItIsTouched) {
   AdapterHost host(adapter.DevicePath());
   const Bytes absent(1, 0xCF);
   EXPECT_EQ(host.Ask({0xC1}, 1), absent);
-  adapter.Touch(button);
-  EXPECT_EQ(host.Ask(readRom, 10), RomAnswer({button.begin(), button.end()}));
-  EXPECT_TRUE(adapter.Leave(button));
+  adapter.Touch(Button);
+  EXPECT_EQ(host.Ask(ReadRom, 10), RomAnswer({Button.begin(), Button.end()}));
+  EXPECT_TRUE(adapter.Leave(Button));
   EXPECT_EQ(host.Ask({0xC1}, 1), absent);
-  EXPECT_FALSE(adapter.Leave(button));
-  adapter.Touch(button);
+  EXPECT_FALSE(adapter.Leave(Button));
+  adapter.Touch(Button);
   adapter.LeaveAll();
   EXPECT_EQ(host.Ask({0xC1}, 1), absent);
 }
@@ -62,7 +62,7 @@ TEST(OneWireAdapter, HearsTheHostAtTheSpeedThatItWasTold) {
   AdapterHost host(adapter.DevicePath());
   EXPECT_EQ(host.Ask({0x75}, 1), Bytes{0x74});
   host.Write({0x17});
-  ASSERT_TRUE(adapter.WaitUntilHostFaults(1, limit));
+  ASSERT_TRUE(adapter.WaitUntilHostFaults(1, Limit));
   EXPECT_EQ(adapter.HostFaults(), std::vector<std::string>{"the host speaks 9600,8N1 instead of 57600,8N1"});
   host.Speak({.Baud = 57600});
   EXPECT_EQ(host.Ask({0x0F, 0x71}, 2), (Bytes{0x04, 0x70}));

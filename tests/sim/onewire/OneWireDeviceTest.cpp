@@ -7,7 +7,7 @@
 namespace sim {
 namespace {
 
-constexpr RomId rom{0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
+constexpr RomId Rom{0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
 
 // A slot with only this device and the master on the line.
 bool Slot(OneWireDevice& device, bool level) {
@@ -37,7 +37,7 @@ class OneWireDeviceTest : public testing::Test {
     Send(device_, command);
   }
 
-  OneWireDevice device_{rom};
+  OneWireDevice device_{Rom};
 };
 
 TEST_F(OneWireDeviceTest, HearsNothingBeforeTheFirstResetPulse) {
@@ -49,7 +49,7 @@ TEST_F(OneWireDeviceTest, HearsNothingBeforeTheFirstResetPulse) {
 
 TEST_F(OneWireDeviceTest, GivesItsRomLeastSignificantBitFirst) {
   Command(0x33);
-  for (const std::uint8_t byte : rom) {
+  for (const std::uint8_t byte : Rom) {
     EXPECT_EQ(Read(device_), byte);
   }
   EXPECT_EQ(device_.RomBitsGiven(), 64U);
@@ -92,12 +92,12 @@ TEST_F(OneWireDeviceTest, IsSelectedByASearchThatFollowsItToTheEnd) {
 
 TEST_F(OneWireDeviceTest, IsSelectedByItsOwnRomOnly) {
   Command(0x55);
-  for (const std::uint8_t byte : rom) {
+  for (const std::uint8_t byte : Rom) {
     Send(device_, byte);
   }
   EXPECT_TRUE(device_.IsSelected());
   for (std::size_t bit = 0; bit < 64; ++bit) {
-    RomId other = rom;
+    RomId other = Rom;
     other[bit / 8] ^= static_cast<std::uint8_t>(1U << bit % 8);
     Command(0x55);
     for (const std::uint8_t byte : other) {

@@ -10,20 +10,20 @@
 namespace sim {
 namespace {
 
-constexpr std::size_t faultyAnswer = 3;
-constexpr std::size_t lastBit = 12;
+constexpr std::size_t FaultyAnswer = 3;
+constexpr std::size_t LastBit = 12;
 
-const Bytes detection{0x17, 0x45, 0x5B, 0x0F, 0x91};
-const Bytes detected{0x16, 0x44, 0x5A, 0x00, 0x93};
+const Bytes Detection{0x17, 0x45, 0x5B, 0x0F, 0x91};
+const Bytes Detected{0x16, 0x44, 0x5A, 0x00, 0x93};
 
 // The first bit tells the button (family 02) from the reader's own device (81).
 const Bytes toLowest(16, 0x00);
-const Bytes toReader{2, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0};
+const Bytes ToReader{2, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0};
 
 // Answers to reset, search command and directions.
-const Bytes foundButton{0xCD, 0xF0, 0x09, 0x00, 0xA0, 0x02, 0x80, 0x8A, 0x02,
+const Bytes FoundButton{0xCD, 0xF0, 0x09, 0x00, 0xA0, 0x02, 0x80, 0x8A, 0x02,
                         0x00, 0x00, 0x00, 0x00, 0x00, 0x00, 0x00, 0x08, 0x88};
-const Bytes foundReader{0xCD, 0xF0, 0x03, 0x80, 0x2A, 0x0A, 0x88, 0x22, 0xA8,
+const Bytes FoundReader{0xCD, 0xF0, 0x03, 0x80, 0x2A, 0x0A, 0x88, 0x22, 0xA8,
                         0x02, 0x00, 0x00, 0x00, 0x00, 0x00, 0x00, 0x2A, 0xA0};
 
 Bytes With(Bytes bytes, std::size_t index, std::uint8_t value) {
@@ -36,39 +36,39 @@ class FailureOfTheAdapter : public testing::TestWithParam<OneWireFailureInfo> {
  protected:
   FailureOfTheAdapter()
       : adapter_({.Failure = GetParam().Failure,
-                  .FailurePlace = GetParam().Place == FailurePlace::Bit ? lastBit : faultyAnswer,
+                  .FailurePlace = GetParam().Place == FailurePlace::Bit ? LastBit : FaultyAnswer,
                   .LinePace = Pace::Fast}),
         host_(adapter_.DevicePath()) {
     adapter_.Touch({0x02, 0x1C, 0xB8, 0x01, 0x00, 0x00, 0x00, 0xA2});
   }
 
-  void ExpectDetection() { EXPECT_EQ(host_.Ask(detection, detected.size()), detected); }
+  void ExpectDetection() { EXPECT_EQ(host_.Ask(Detection, Detected.size()), Detected); }
 
   // Twice, since a failure must stay.
   void ExpectSearches(const Bytes& lowest, const Bytes& reader) {
     for (int round = 0; round < 2; ++round) {
       EXPECT_EQ(host_.Search(toLowest), lowest);
-      EXPECT_EQ(host_.Search(toReader), reader);
+      EXPECT_EQ(host_.Search(ToReader), reader);
     }
     EXPECT_TRUE(host_.IsSilent());
   }
 
   void ExpectTwoButtons() {
-    ExpectSearches(With(foundButton, 4, 0xA1), foundReader);
+    ExpectSearches(With(FoundButton, 4, 0xA1), FoundReader);
     EXPECT_EQ(host_.Search(With(toLowest, 2, 0x02)),
               (Bytes{0xCD, 0xF0, 0x09, 0x00, 0xA3, 0x02, 0x80, 0x8A, 0x02, 0x00, 0x00, 0x00, 0x00, 0x00, 0x00,
                      0x00, 0x22, 0x82}));
     EXPECT_TRUE(adapter_.Leave({0x02, 0x1C, 0xB8, 0x01, 0x00, 0x00, 0x00, 0xA2}));
-    EXPECT_EQ(host_.Search(toLowest), With(foundReader, 2, 0x02));
+    EXPECT_EQ(host_.Search(toLowest), With(FoundReader, 2, 0x02));
   }
 
   OneWireAdapter adapter_;
   AdapterHost host_;
 };
 
-const Bytes lostOnTheWay{0xCD, 0xF0, 0x09, 0x00, 0xE0, 0xFF, 0xFF, 0xFF, 0xFF,
+const Bytes LostOnTheWay{0xCD, 0xF0, 0x09, 0x00, 0xE0, 0xFF, 0xFF, 0xFF, 0xFF,
                          0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF};
-const Bytes shorted{0xCC, 0x00, 0x55, 0x55, 0x55, 0x55, 0x55, 0x55, 0x55,
+const Bytes Shorted{0xCC, 0x00, 0x55, 0x55, 0x55, 0x55, 0x55, 0x55, 0x55,
                     0x55, 0x55, 0x55, 0x55, 0x55, 0x55, 0x55, 0x55, 0x55};
 
 TEST_P(FailureOfTheAdapter, ReachesTheHostAsItsNameSays) {
@@ -76,43 +76,43 @@ TEST_P(FailureOfTheAdapter, ReachesTheHostAsItsNameSays) {
     case OneWireFailure::None:
     case OneWireFailure::TornWrites:
       ExpectDetection();
-      ExpectSearches(foundButton, foundReader);
+      ExpectSearches(FoundButton, FoundReader);
       break;
     case OneWireFailure::Silence:
-      EXPECT_EQ(host_.Ask(detection, 2), (Bytes{0x16, 0x44}));
+      EXPECT_EQ(host_.Ask(Detection, 2), (Bytes{0x16, 0x44}));
       host_.Write({0xC1});
       EXPECT_TRUE(host_.IsSilent());
       EXPECT_FALSE(host_.HungUp());
       break;
     case OneWireFailure::NoDetection:
-      EXPECT_EQ(host_.Ask(detection, 1), Bytes{0x93});
-      ExpectSearches(foundButton, foundReader);
+      EXPECT_EQ(host_.Ask(Detection, 1), Bytes{0x93});
+      ExpectSearches(FoundButton, FoundReader);
       EXPECT_EQ(host_.Ask({0xE1, 0x17}, 1), Bytes{0x17});
       break;
     case OneWireFailure::ShortCircuit:
-      EXPECT_EQ(host_.Ask(detection, 5), With(detected, 4, 0x90));
-      ExpectSearches(shorted, With(shorted, 2, 0x57));
+      EXPECT_EQ(host_.Ask(Detection, 5), With(Detected, 4, 0x90));
+      ExpectSearches(Shorted, With(Shorted, 2, 0x57));
       break;
     case OneWireFailure::ContactLost:
       ExpectDetection();
-      ExpectSearches(lostOnTheWay, foundReader);
+      ExpectSearches(LostOnTheWay, FoundReader);
       break;
     case OneWireFailure::WrongCrc:
       ExpectDetection();
-      ExpectSearches(With(foundButton, 17, 0x08), foundReader);
+      ExpectSearches(With(FoundButton, 17, 0x08), FoundReader);
       break;
     case OneWireFailure::HangUp: {
-      host_.Write(detection);
+      host_.Write(Detection);
       const Bytes heard = host_.ReadUntilHangUp();
       EXPECT_TRUE(host_.HungUp());
       // A line that is pulled out takes bytes with it that the host had not read yet.
-      EXPECT_LE(heard.size(), faultyAnswer - 1);
-      EXPECT_TRUE(std::equal(heard.begin(), heard.end(), detected.begin()));
+      EXPECT_LE(heard.size(), FaultyAnswer - 1);
+      EXPECT_TRUE(std::equal(heard.begin(), heard.end(), Detected.begin()));
       break;
     }
     case OneWireFailure::NoiseByte:
-      EXPECT_EQ(host_.Ask(detection, 6), (Bytes{0x16, 0x44, 0xF8, 0x5A, 0x00, 0x93}));
-      ExpectSearches(foundButton, foundReader);
+      EXPECT_EQ(host_.Ask(Detection, 6), (Bytes{0x16, 0x44, 0xF8, 0x5A, 0x00, 0x93}));
+      ExpectSearches(FoundButton, FoundReader);
       break;
     case OneWireFailure::TwoButtons:
       ExpectDetection();
@@ -120,7 +120,7 @@ TEST_P(FailureOfTheAdapter, ReachesTheHostAsItsNameSays) {
       break;
     case OneWireFailure::NoOwnDevice:
       ExpectDetection();
-      ExpectSearches(With(foundButton, 2, 0x08), With(foundButton, 2, 0x08));
+      ExpectSearches(With(FoundButton, 2, 0x08), With(FoundButton, 2, 0x08));
       break;
   }
 }

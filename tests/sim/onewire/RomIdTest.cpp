@@ -7,16 +7,16 @@
 namespace sim {
 namespace {
 
-constexpr RomId counting{0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
+constexpr RomId Counting{0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
 
 TEST(RomId, ReadsTheCrcFirstAndTheFamilyCodeLast) {
-  EXPECT_EQ(ParseRomId("EFCDAB8967452301"), counting);
-  EXPECT_EQ(ParseRomId("efcdab8967452301"), counting);
+  EXPECT_EQ(ParseRomId("EFCDAB8967452301"), Counting);
+  EXPECT_EQ(ParseRomId("efcdab8967452301"), Counting);
   EXPECT_EQ(ParseRomId("0A00000000000001"), (RomId{1, 0, 0, 0, 0, 0, 0, 10}));
 }
 
 TEST(RomId, IsWrittenInUpperCaseWithAllZeros) {
-  EXPECT_EQ(RomIdText(counting), "EFCDAB8967452301");
+  EXPECT_EQ(RomIdText(Counting), "EFCDAB8967452301");
   EXPECT_EQ(RomIdText({0x0A, 0, 0, 0, 0, 0, 0x0B, 0x0C}), "0C0B00000000000A");
 }
 

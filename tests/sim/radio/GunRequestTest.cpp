@@ -7,8 +7,8 @@
 namespace sim {
 namespace {
 
-constexpr std::uint64_t red2 = 0x0013A200407E0E22;
-constexpr std::uint64_t blue0 = 0x0013A200407EC040;
+constexpr std::uint64_t Red2 = 0x0013A200407E0E22;
+constexpr std::uint64_t Blue0 = 0x0013A200407EC040;
 
 // A request as its description, a fault as its text.
 std::string Read(std::uint64_t destination, const Bytes& data) {
@@ -26,9 +26,9 @@ TEST(GunRequest, IsASearchForAnyPlayerId) {
 }
 
 TEST(GunRequest, IsACommandToAGun) {
-  EXPECT_EQ(Read(red2, {1, 0x22, 0, 0, 4, 1}), "size 34");
-  EXPECT_EQ(Read(blue0, {3, 0x40, 0, 0, 4, 2, 90, 10}), "block 64 90+10");
-  EXPECT_EQ(Read(blue0, {1, 0x40, 0, 0, 4, 3}), "close 64");
+  EXPECT_EQ(Read(Red2, {1, 0x22, 0, 0, 4, 1}), "size 34");
+  EXPECT_EQ(Read(Blue0, {3, 0x40, 0, 0, 4, 2, 90, 10}), "block 64 90+10");
+  EXPECT_EQ(Read(Blue0, {1, 0x40, 0, 0, 4, 3}), "close 64");
 }
 
 TEST(GunRequest, HasALengthThatAgreesWithItsPacket) {
@@ -48,15 +48,15 @@ TEST(GunRequest, HasAKnownTypeAndCommand) {
     EXPECT_EQ(Read(0xFFFF, {0, 0x22, 0, 0, type}), "an unknown packet type");
   }
   for (const std::uint8_t command : Bytes{0, 4, 255}) {
-    EXPECT_EQ(Read(red2, {1, 0x22, 0, 0, 4, command}), "an unknown command");
+    EXPECT_EQ(Read(Red2, {1, 0x22, 0, 0, 4, command}), "an unknown command");
   }
-  EXPECT_EQ(Read(red2, {0, 0x22, 0, 0, 4}), "an unknown command");
+  EXPECT_EQ(Read(Red2, {0, 0x22, 0, 0, 4}), "an unknown command");
 }
 
 TEST(GunRequest, GoesToAllAsASearchAndToOneGunAsACommand) {
-  EXPECT_EQ(Read(red2, {0, 0x22, 0, 0, 6}), "a search to a single address");
+  EXPECT_EQ(Read(Red2, {0, 0x22, 0, 0, 6}), "a search to a single address");
   EXPECT_EQ(Read(0xFFFF, {1, 0x22, 0, 0, 4, 1}), "an address that no gun has");
-  EXPECT_EQ(Read(red2 + 1, {1, 0x22, 0, 0, 4, 1}), "an address that no gun has");
+  EXPECT_EQ(Read(Red2 + 1, {1, 0x22, 0, 0, 4, 1}), "an address that no gun has");
 }
 
 TEST(GunRequest, HasTheAddressHighByteFirst) {
@@ -65,7 +65,7 @@ TEST(GunRequest, HasTheAddressHighByteFirst) {
 }
 
 TEST(GunRequest, NamesTheGunToWhichItGoes) {
-  EXPECT_EQ(Read(red2, {1, 0x40, 0, 0, 4, 1}), "another gun's player id");
+  EXPECT_EQ(Read(Red2, {1, 0x40, 0, 0, 4, 1}), "another gun's player id");
 }
 
 TEST(GunRequest, SearchesNoPlayerIdBelow32AndWithoutPayload) {
@@ -74,18 +74,18 @@ TEST(GunRequest, SearchesNoPlayerIdBelow32AndWithoutPayload) {
 }
 
 TEST(GunRequest, HasTheArgumentsOfItsCommand) {
-  EXPECT_EQ(Read(red2, {2, 0x22, 0, 0, 4, 1, 0}), "a wrong number of arguments");
-  EXPECT_EQ(Read(red2, {2, 0x22, 0, 0, 4, 2, 0}), "a wrong number of arguments");
-  EXPECT_EQ(Read(red2, {4, 0x22, 0, 0, 4, 2, 0, 1, 0}), "a wrong number of arguments");
-  EXPECT_EQ(Read(red2, {3, 0x22, 0, 0, 4, 3, 0, 0}), "a wrong number of arguments");
+  EXPECT_EQ(Read(Red2, {2, 0x22, 0, 0, 4, 1, 0}), "a wrong number of arguments");
+  EXPECT_EQ(Read(Red2, {2, 0x22, 0, 0, 4, 2, 0}), "a wrong number of arguments");
+  EXPECT_EQ(Read(Red2, {4, 0x22, 0, 0, 4, 2, 0, 1, 0}), "a wrong number of arguments");
+  EXPECT_EQ(Read(Red2, {3, 0x22, 0, 0, 4, 3, 0, 0}), "a wrong number of arguments");
 }
 
 TEST(GunRequest, AsksForABlockWithinTheScoresAndAFrame) {
-  EXPECT_EQ(Read(blue0, {3, 0x40, 0, 0, 4, 2, 8, 92}), "block 64 8+92");
-  EXPECT_EQ(Read(blue0, {3, 0x40, 0, 0, 4, 2, 0, 93}), "a block that fits no frame");
-  EXPECT_EQ(Read(blue0, {3, 0x40, 0, 0, 4, 2, 0, 0}), "a block that fits no frame");
-  EXPECT_EQ(Read(blue0, {3, 0x40, 0, 0, 4, 2, 90, 11}), "a block beyond the scores");
-  EXPECT_EQ(Read(blue0, {3, 0x40, 0, 0, 4, 2, 255, 1}), "a block beyond the scores");
+  EXPECT_EQ(Read(Blue0, {3, 0x40, 0, 0, 4, 2, 8, 92}), "block 64 8+92");
+  EXPECT_EQ(Read(Blue0, {3, 0x40, 0, 0, 4, 2, 0, 93}), "a block that fits no frame");
+  EXPECT_EQ(Read(Blue0, {3, 0x40, 0, 0, 4, 2, 0, 0}), "a block that fits no frame");
+  EXPECT_EQ(Read(Blue0, {3, 0x40, 0, 0, 4, 2, 90, 11}), "a block beyond the scores");
+  EXPECT_EQ(Read(Blue0, {3, 0x40, 0, 0, 4, 2, 255, 1}), "a block beyond the scores");
 }
 
 }  // namespace

@@ -42,8 +42,8 @@ Bytes FirstHalf(const Bytes& frame) {
   return {frame.begin(), frame.begin() + static_cast<std::ptrdiff_t>(frame.size() / 2)};
 }
 
-const Bytes transmitStatus{0x7E, 0x00, 0x03, 0x89, 0x00, 0x00, 0x76};
-const Bytes modemStatus{0x7E, 0x00, 0x02, 0x8A, 0x06, 0x6F};
+const Bytes TransmitStatus{0x7E, 0x00, 0x03, 0x89, 0x00, 0x00, 0x76};
+const Bytes ModemStatus{0x7E, 0x00, 0x02, 0x8A, 0x06, 0x6F};
 
 // What red 2, struck by the failure, answers for the first time to the command that the failure concerns.
 Bytes StruckAnswer(RadioFailure failure) {
@@ -66,7 +66,7 @@ Bytes StruckAnswer(RadioFailure failure) {
     case RadioFailure::DoubleAnswer:
       return FoundRed2 + FoundRed2;
     case RadioFailure::StatusFrames:
-      return transmitStatus + FoundRed2 + modemStatus;
+      return TransmitStatus + FoundRed2 + ModemStatus;
     case RadioFailure::CutFrames:
     case RadioFailure::HangUpInSearch:
       return FirstHalf(FoundRed2);

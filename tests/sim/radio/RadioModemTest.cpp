@@ -53,7 +53,7 @@ TEST(RadioModem, LeavesASearchForAnAbsentGunUnanswered) {
   RawHost host(modem.DevicePath());
   host.Write(SearchRed3);
   EXPECT_TRUE(host.IsSilent());
-  ASSERT_TRUE(modem.WaitUntilAsked(1, limit));
+  ASSERT_TRUE(modem.WaitUntilAsked(1, Limit));
   EXPECT_EQ(modem.Traffic().Requests,
             std::vector<GunRequest>{(GunRequest{.Command = GunCommand::Search, .PlayerId = 0x23})});
   EXPECT_TRUE(modem.Traffic().Faults.empty());
@@ -102,7 +102,7 @@ TEST(RadioModem, CountsWhatTheHostMustNotSendAndDoesNotAnswerIt) {
   for (const auto& [bytes, fault] : bad) {
     expected.push_back(fault);
     host.Write(bytes);
-    ASSERT_TRUE(modem.WaitUntilAsked(expected.size(), limit)) << fault;
+    ASSERT_TRUE(modem.WaitUntilAsked(expected.size(), Limit)) << fault;
   }
   EXPECT_TRUE(host.IsSilent());
   EXPECT_EQ(modem.Traffic().Faults, expected);
@@ -116,7 +116,7 @@ TEST(RadioModem, CountsTheBytesOfBothDirections) {
   RawHost host(modem.DevicePath());
   host.Write(SearchRed3 + SearchRed2 + BlockRed2);
   host.Read(FoundRed2.size() + GotRed2.size());
-  ASSERT_TRUE(modem.WaitUntilAsked(3, limit));
+  ASSERT_TRUE(modem.WaitUntilAsked(3, Limit));
   EXPECT_EQ(modem.Traffic().BytesFromHost, 20U + 20U + 23U);
   EXPECT_TRUE(host.IsSilent());
   EXPECT_EQ(modem.Traffic().BytesToHost, 24U + 26U);
@@ -223,7 +223,7 @@ TEST(RadioModem, CopiesTheScoresOfEachGunOnceWhenTheyAreClosed) {
     RadioModem modem(settings);
     RawHost host(modem.DevicePath());
     host.Write(BlockRed2 + CloseBlue0 + CloseRed2 + CloseBlue0);
-    ASSERT_TRUE(modem.WaitUntilAsked(4, limit));
+    ASSERT_TRUE(modem.WaitUntilAsked(4, Limit));
   }
   const Bytes expected = TwoGuns()[1].Frame + TwoGuns()[0].Frame;
   EXPECT_EQ(frames.str(), std::string(expected.begin(), expected.end()));

@@ -35,16 +35,16 @@ std::vector<std::string> Read(const Bytes& bytes) {
 }
 
 using Found = std::vector<std::string>;
-const std::string redFound = "65535 " + testing::PrintToString(Bytes{0, 0x22, 0, 0, 6});
+const std::string RedFound = "65535 " + testing::PrintToString(Bytes{0, 0x22, 0, 0, 6});
 
 TEST(TransmitRequest, IsFoundWithItsDestinationAndData) {
-  EXPECT_EQ(Read(SearchRed2), Found{redFound});
+  EXPECT_EQ(Read(SearchRed2), Found{RedFound});
   EXPECT_EQ(Read(SizeRed2), Found{std::to_string(0x0013A200407E0E22) + ' ' +
                                   testing::PrintToString(Bytes{1, 0x22, 0, 0, 4, 1})});
 }
 
 TEST(TransmitRequest, MayFollowTheOneBeforeAtOnce) {
-  EXPECT_EQ(Read(SearchRed2 + SearchRed2), (Found{redFound, redFound}));
+  EXPECT_EQ(Read(SearchRed2 + SearchRed2), (Found{RedFound, RedFound}));
 }
 
 TEST(TransmitRequest, IsNotEscaped) {
@@ -80,8 +80,8 @@ TEST(TransmitRequest, HasALengthThatFitsAndTheHighByteFirst) {
 
 TEST(TransmitRequest, BeginsWithTheStartByteAndStrayBytesAreOneFault) {
   EXPECT_EQ(Read({1, 2, 3}), Found{"a byte outside a frame"});
-  EXPECT_EQ(Read(Bytes{0x7D, 0x5E} + SearchRed2), (Found{"a byte outside a frame", redFound}));
-  EXPECT_EQ(Read(SearchRed2 + Bytes{0} + SearchRed2), (Found{redFound, "a byte outside a frame", redFound}));
+  EXPECT_EQ(Read(Bytes{0x7D, 0x5E} + SearchRed2), (Found{"a byte outside a frame", RedFound}));
+  EXPECT_EQ(Read(SearchRed2 + Bytes{0} + SearchRed2), (Found{RedFound, "a byte outside a frame", RedFound}));
 }
 
 TEST(TransmitRequest, IsFoundAgainBehindAFault) {
@@ -89,7 +89,7 @@ TEST(TransmitRequest, IsFoundAgainBehindAFault) {
   for (const Bytes& bad :
        {With(SearchRed2, 19, 0), MadeGood(With(SearchRed2, 13, 4)), Bytes{0x7E, 9, 9, 1}}) {
     EXPECT_EQ(Read(reader, bad).size(), 1U);
-    EXPECT_EQ(Read(reader, SearchRed2), Found{redFound});
+    EXPECT_EQ(Read(reader, SearchRed2), Found{RedFound});
   }
 }
 

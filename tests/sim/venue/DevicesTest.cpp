@@ -128,7 +128,7 @@ TEST_P(EveryDevice, DoesNotAnswerAHostAtOtherSettings) {
     host.Speak(other);
     host.Write(Bytes(40, 0xC1));
     ++faults;
-    ASSERT_TRUE(started.Served->WaitUntilHostFaults(faults, limit));
+    ASSERT_TRUE(started.Served->WaitUntilHostFaults(faults, Limit));
     EXPECT_THAT(started.Served->HostFaults().back(),
                 StartsWith("the host speaks " + Text(other) + " instead of " + Text(own)));
   }

@@ -38,7 +38,7 @@ class VenueProgram : public testing::Test {
 
   // False when `text` does not come into the file within the limit.
   static bool AwaitContent(const std::string& path, const std::string& text) {
-    const auto end = std::chrono::steady_clock::now() + limit;
+    const auto end = std::chrono::steady_clock::now() + Limit;
     while (Content(path).find(text) == std::string::npos) {
       if (std::chrono::steady_clock::now() > end) {
         return false;
@@ -177,7 +177,7 @@ TEST_F(VenueProgram, ServesOthersWithoutTheBaseUnitWhenTold) {
   EXPECT_EQ(venue.RestOfOutput(), "");
 }
 
-const Bytes readRom{0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3};
+const Bytes ReadRom{0xC1, 0xE1, 0x33, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xE3};
 
 TEST_F(VenueProgram, HoldsButtonsToTheReaderAndTakesThemAwayOnCommand) {
   VenueProcess venue({"--fast", "--onewire", "--onewire-failure", "no-own-device"});
@@ -186,7 +186,7 @@ TEST_F(VenueProgram, HoldsButtonsToTheReaderAndTakesThemAwayOnCommand) {
   EXPECT_EQ(host.Ask({0xC1}, 1), Bytes{0xCF});
   venue.WriteInput("touch EFCDAB8967452301\n");
   EXPECT_EQ(venue.ReadLine(), "touched EFCDAB8967452301");
-  EXPECT_EQ(host.Ask(readRom, 10), (Bytes{0xCD, 0x33, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF}));
+  EXPECT_EQ(host.Ask(ReadRom, 10), (Bytes{0xCD, 0x33, 0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF}));
   venue.WriteInput("onewire leave EFCDAB8967452301\n");
   EXPECT_EQ(venue.ReadLine(), "left EFCDAB8967452301");
   venue.WriteInput("nonsense\n\nleave\n");

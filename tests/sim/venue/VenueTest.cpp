@@ -19,7 +19,7 @@ using testing::Not;
 
 enum class HornFailure { None, Hoarse };
 
-constexpr std::array<FailureInfo<HornFailure>, 2> hornFailures{{
+constexpr std::array<FailureInfo<HornFailure>, 2> HornFailures{{
     {HornFailure::None, "none", FailurePlace::None, "a faultless horn"},
     {HornFailure::Hoarse, "hoarse", FailurePlace::Byte, "a rough tone from byte K on"},
 }};
@@ -50,7 +50,7 @@ std::vector<DeviceEntry> HornAndBell() {
   return {{.Name = "horn",
            .Title = "big horn",
            .Purpose = "a horn",
-           .Failures = FailureRows(hornFailures),
+           .Failures = FailureRows(HornFailures),
            .NoSuchFailure = "The horn has no failure",
            .PlaceMeaning = "the byte, from 1 (1)",
            .HighestPlace = 9,
@@ -234,7 +234,7 @@ TEST_F(VenueOfHornAndBell, TellsTheFaultsOfTheHostsOfEachDevice) {
   RawHost host(PathsOf(*venue).at(1));
   host.Speak({.Baud = 1200});
   host.Write({1});
-  const auto end = std::chrono::steady_clock::now() + limit;
+  const auto end = std::chrono::steady_clock::now() + Limit;
   std::string told;
   while (told.find("bell") == std::string::npos && std::chrono::steady_clock::now() < end) {
     std::ostringstream out;
