@@ -79,7 +79,7 @@ bool MeasureTimeOut(const char* name, std::size_t silentFrom) {
 /// both alike. The ratio is that of the median pair.
 bool MeasureTranscript() {
   constexpr int players = 40;
-  constexpr int pairs = 11;
+  constexpr int pairs = 15;
   const sim::BaseUnit unit({.Answer = sim::MakeBaseUnitAnswer(sim::MakeGame(players, 1))});
   const std::filesystem::path folder = std::filesystem::temp_directory_path() / "tessarine-bench-logs";
   std::vector<double> with;

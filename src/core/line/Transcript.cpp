@@ -14,24 +14,16 @@ constexpr std::size_t RememberedConversations = 4;
 
 Transcript::Transcript(const LogRing& ring, std::string instrument, const MonotonicClock& time,
                        Repeats repeats)
-    : ring_(ring), instrument_(std::move(instrument)), time_(time), repeats_(repeats) {}
+    : time_(time), repeats_(repeats), ring_(ring), instrument_(std::move(instrument)) {}
 
 Transcript::~Transcript() {
   EndRow();
   Write();
 }
 
-void Transcript::Add(char direction, std::uint8_t byte) {
-  const auto now = time_.Elapsed();
-  if (direction != rowDirection_ || rowSize_ == RowBytes || now - rowTime_ > RowGap) {
-    EndRow();
-    rowDirection_ = direction;
-  }
-  row_[rowSize_++] = byte;
-  rowTime_ = now;
-  if (repeats_ == Repeats::Counted) {
-    passed_.append({direction, static_cast<char>(byte)});
-  }
+void Transcript::BeginRow(char direction) {
+  EndRow();
+  rowDirection_ = direction;
 }
 
 void Transcript::EndRow(std::string_view note) {
@@ -43,6 +35,12 @@ void Transcript::EndRow(std::string_view note) {
   for (std::size_t i = 0; i < rowSize_; ++i) {
     const std::array<char, 3> text{' ', digits[row_[i] >> 4U], digits[row_[i] & 15U]};
     rows_.append(text.data(), text.size());
+  }
+  if (repeats_ == Repeats::Counted) {
+    for (std::size_t i = 0; i < rowSize_; ++i) {
+      passed_.append(
+          {rowDirection_, static_cast<char>(row_[i])});  // where rows part is a matter of time alone
+    }
   }
   rowSize_ = 0;
   FinishRow(note);
