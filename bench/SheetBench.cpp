@@ -162,22 +162,22 @@ struct Evening {
     std::filesystem::copy_file(bin / "members_default.mdb", Folder + "/members.mdb");
     AddMembers();
     for (int index = 1; index <= PlayerCount; ++index) {
-      Player& player = Board.Players(index);
+      Player& player = Game.Players(index);
       player.Active = true;
       player.MemberIndex = 1 + index % Members;
       player.ShotCount = 1000 + index;
       for (int hit = 1; hit <= hitsPerPlayer; ++hit) {
-        Board.Players(1 + (index + hit * 5) % PlayerCount).HitByPlayer(index) = 10 * hit;
+        Game.Players(1 + (index + hit * 5) % PlayerCount).HitByPlayer(index) = 10 * hit;
       }
     }
-    Board.GameDate = "15 November 2026";
+    Game.GameDate = "15 November 2026";
   }
   ~Evening() { std::filesystem::remove_all(Folder); }
   Evening(const Evening&) = delete;
   Evening& operator=(const Evening&) = delete;
 
   StringTable Strings{Language::English};
-  Game Board{Strings};
+  ::Game Game{Strings};
   std::string Folder;
   SilentBoxes Boxes;
   std::unique_ptr<Database> DbMembers;
@@ -210,7 +210,7 @@ double OwnRun(Evening& evening, LibreOffice& office, std::int16_t target, Times&
   LinuxFiles files;
   TimedWord word(office, times);
   SheetProgressWindow progress(evening.Strings, nullptr);
-  const SheetParts parts{.Board = evening.Board,
+  const SheetParts parts{.Game = evening.Game,
                          .RsMembers = *evening.RsMembers,
                          .Members = members,
                          .Strings = evening.Strings,
@@ -263,15 +263,15 @@ double PlainRun(Evening& evening, const std::string& host) {
     const auto add = [&sheet](const BookmarkTexts& texts) {
       sheet.Bookmarks.insert(sheet.Bookmarks.end(), texts.begin(), texts.end());
     };
-    add(ResultTexts(evening.Board, index, WinningTeam(evening.Board)));
-    const std::int32_t contactId = evening.Board.Players(index).MemberIndex;
+    add(ResultTexts(evening.Game, index, WinningTeam(evening.Game)));
+    const std::int32_t contactId = evening.Game.Players(index).MemberIndex;
     const std::optional<Member> member = members.LoadMember(contactId);
     add(MemberTexts(*member, members.LoadHistory(contactId)));
     sheet.Photo = files.MakeTempFileName();
     ExportPhoto(*evening.RsMembers, "Photograph", "PhotographLength", sheet.Photo, files);
-    add(GameTexts(evening.Board.Players(index), "Bench", "15 November 2026", " 1"));
-    sheet.Scored = HitsScored(evening.Board, index, members);
-    sheet.Taken = HitsTaken(evening.Board, index, members);
+    add(GameTexts(evening.Game.Players(index), "Bench", "15 November 2026", " 1"));
+    sheet.Scored = HitsScored(evening.Game, index, members);
+    sheet.Taken = HitsTaken(evening.Game, index, members);
     sheet.Target = evening.Folder + "/scores/plain " + std::to_string(index) + ".doc";
     plain.Make(evening.Folder + "/score_card.doc", sheet);
     files.Delete(sheet.Photo);

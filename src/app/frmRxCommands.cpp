@@ -81,7 +81,7 @@ void frmRx::PrintScores() {
     return;
   }
   SheetProgressWindow progress(services_.Strings, this);
-  const SheetParts parts{.Board = session_.Game(),
+  const SheetParts parts{.Game = session_.Game(),
                          .RsMembers = session_.RsMembers(),
                          .Members = session_.Members(),
                          .Strings = services_.Strings,
@@ -172,7 +172,7 @@ void frmRx::ManageRemotely() {
                 .Boxes = services_.Boxes,
                 .Time = services_.Time,
                 .Strings = services_.Strings,
-                .Scores = session_.Game()},
+                .Game = session_.Game()},
                this)
       .exec();
   session_.CalculateScores();

@@ -59,8 +59,8 @@ ScoreSheets::ScoreSheets(const SheetParts& parts, const PrintChoice& choice)
     : in_(parts),
       choice_(choice),
       folder_(parts.UserDataFolder + "/scores"),
-      winner_(WinningTeam(parts.Board)),
-      sheetDate_(WithoutWeekday(parts.Time.LongDate(parts.Board.GameDate))) {}
+      winner_(WinningTeam(parts.Game)),
+      sheetDate_(WithoutWeekday(parts.Time.LongDate(parts.Game.GameDate))) {}
 
 void ScoreSheets::GenerateScoreSheets() {
   std::optional<StageFailure> failure;
@@ -99,7 +99,7 @@ bool ScoreSheets::IsChosen(int index) const {
     case SheetSelection::All:
       return true;
     case SheetSelection::Active:
-      return in_.Board.Players(index).Active;
+      return in_.Game.Players(index).Active;
     case SheetSelection::Team:
       return inTeam;
     case SheetSelection::OnePlayer:
@@ -166,15 +166,15 @@ void ScoreSheets::MakeSheet(int index, int number, int count) {
 }
 
 void ScoreSheets::FillPlayer(WordDocument& document, int index, int number, int count) {
-  Write(document, ResultTexts(in_.Board, index, winner_));
-  const std::int32_t contactId = in_.Board.Players(index).MemberIndex;
+  Write(document, ResultTexts(in_.Game, index, winner_));
+  const std::int32_t contactId = in_.Game.Players(index).MemberIndex;
   const std::optional<Member> member = contactId == 0 ? std::nullopt : in_.Members.LoadMember(contactId);
   const BookmarkTexts texts =
       member ? MemberTexts(*member, in_.Members.LoadHistory(contactId)) : GuestTexts();
   const std::string& name = texts.front().second;
   const std::uint8_t id = IdFromIndex(index);
   const std::string player =
-      in_.Board.TeamNames(TeamFromId(id)) + Str(std::int32_t{PlayerNumberFromId(id)}) + "-" + name;
+      in_.Game.TeamNames(TeamFromId(id)) + Str(std::int32_t{PlayerNumberFromId(id)}) + "-" + name;
   sheetName_ = player + "-" + sheetDate_ + "-" + in_.MissionName;
   in_.Progress.ShowSheet(number, count, player);
   ServeEvents();
@@ -197,14 +197,14 @@ void ScoreSheets::AddPhoto(WordDocument& document, const Member& member) {
 }
 
 void ScoreSheets::FillGame(WordDocument& document, int index) {
-  const Player& player = in_.Board.Players(index);
+  const Player& player = in_.Game.Players(index);
   const std::string rank = choice_.RankHidden ? in_.Strings.Text(129) : Str(std::int32_t{player.Rank});
   Write(document, GameTexts(player, in_.MissionName, sheetDate_, rank));
   constexpr int firstRow = 2;
   constexpr int rows = 20;
-  document.WriteCells(4, firstRow, rows, HitsScored(in_.Board, index, in_.Members));
+  document.WriteCells(4, firstRow, rows, HitsScored(in_.Game, index, in_.Members));
   ServeEvents();
-  document.WriteCells(5, firstRow, rows, HitsTaken(in_.Board, index, in_.Members));
+  document.WriteCells(5, firstRow, rows, HitsTaken(in_.Game, index, in_.Members));
   ServeEvents();
 }
 

@@ -19,7 +19,7 @@
 
 /// What a run of score sheets works with; it outlives the run.
 struct SheetParts {
-  const Game& Board;
+  const ::Game& Game;
   Recordset& RsMembers;
   MemberLookup& Members;
   const StringTable& Strings;

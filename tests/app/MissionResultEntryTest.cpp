@@ -11,7 +11,6 @@
 namespace {
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 class Results : public testing::Test {
  protected:

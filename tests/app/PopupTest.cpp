@@ -14,7 +14,6 @@
 namespace {
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 class Popup : public testing::Test {
  protected:

@@ -43,7 +43,7 @@ class Sheets : public testing::Test {
   }
 
   void Run() {
-    const SheetParts parts{.Board = venue.game,
+    const SheetParts parts{.Game = venue.game,
                            .RsMembers = *venue.RsMembers,
                            .Members = *venue.Members,
                            .Strings = venue.Strings,

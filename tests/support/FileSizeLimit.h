@@ -9,8 +9,8 @@ class FileSizeLimit {
  public:
   explicit FileSizeLimit(rlim_t bytes) : oldHandler_(std::signal(SIGXFSZ, SIG_IGN)) {
     getrlimit(RLIMIT_FSIZE, &old_);
-    const rlimit Limit{bytes, old_.rlim_max};
-    if (setrlimit(RLIMIT_FSIZE, &Limit) != 0) {
+    const rlimit limit{bytes, old_.rlim_max};
+    if (setrlimit(RLIMIT_FSIZE, &limit) != 0) {
       throw std::runtime_error("cannot limit the size of files");
     }
   }

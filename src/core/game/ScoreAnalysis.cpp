@@ -91,7 +91,8 @@ bool ScoreAnalysis::AddUpDamageAtOnce() {
     const int team = teams[victim / BlockSize];
     for (int block = 0; block < BlockCount; ++block) {
       auto& sums = countsFriendlyFire && teams[block] == team ? dealt.ToOwnTeam : dealt.ToFoes;
-      inRange &= AddHits(&sums[block * BlockSize], hits + block * BlockSize);
+      const auto first = static_cast<std::size_t>(block) * BlockSize;
+      inRange &= AddHits(&sums[first], hits + first);
     }
   }
   const auto factor = inRange ? static_cast<std::int64_t>(factors_.FriendlyFire) : 0;

@@ -82,7 +82,7 @@ void RemoteManage::SearchForGuns() {
 
 void RemoteManage::GetScores() {
   Work([this](RadioLink& link) {
-    ScoreFetch(link, parts_.Events, parts_.Time, parts_.Strings, parts_.Scores, guns_, *this).GetScores();
+    ScoreFetch(link, parts_.Events, parts_.Time, parts_.Strings, parts_.Game, guns_, *this).GetScores();
   });
 }
 

@@ -36,7 +36,7 @@ class RemoteManage : public QDialog, private RadioDisplay {
     MessageBoxes& Boxes;
     const Clock& Time;
     const StringTable& Strings;
-    Game& Scores;
+    ::Game& Game;
   };
 
   RemoteManage(const Parts& parts, QWidget* parent);

@@ -58,6 +58,7 @@ Pipe::Pipe() {
 
 pid_t StartProcess(const std::vector<std::string>& words, const StandardStreams& streams, ProcessKind kind) {
   std::vector<char*> texts;
+  texts.reserve(words.size() + 1);
   for (const std::string& word : words) {
     texts.push_back(const_cast<char*>(word.c_str()));
   }

@@ -26,7 +26,7 @@ QString SuffixOf(const QString& nameFilter) {
 }
 
 QString StartFolder(const FileRequest& request, const QString& lastFolder) {
-  const QString folder = QString::fromStdString(request.Folder);
+  QString folder = QString::fromStdString(request.Folder);
   if (!folder.isEmpty() && QDir(folder).exists()) {
     return folder;
   }
