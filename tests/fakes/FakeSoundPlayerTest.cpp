@@ -8,7 +8,8 @@ namespace {
 
 using namespace std::chrono_literals;
 
-struct Player : testing::Test {
+class Player : public testing::Test {
+ protected:
   FakeEventPump pump;
   FakeSoundPlayer player{pump};
   const std::vector<std::uint8_t> halfSecond = std::vector<std::uint8_t>(11025, 128);

@@ -2,7 +2,6 @@
 
 namespace {
 
-using testing::ElementsAre;
 using testing::IsEmpty;
 
 TEST_F(MembersWindow, FindsTheStartOfAnyOfTheThreeNames) {

@@ -15,7 +15,6 @@
 namespace {
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 constexpr int Red0 = 1;
 constexpr int Red1 = 2;

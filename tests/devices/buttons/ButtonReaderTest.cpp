@@ -26,8 +26,8 @@ class ReadingAButton : public testing::Test {
  protected:
   ReadingAButton() { reader.Activate(); }
 
-  static constexpr FakeOneWire::Rom button = {0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
-  static constexpr FakeOneWire::Rom ownDevice = {0x81, 0x01, 0x02, 0x03, 0x04, 0x05, 0x06, 0x07};
+  static constexpr FakeOneWire::Rom Button = {0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
+  static constexpr FakeOneWire::Rom OwnDevice = {0x81, 0x01, 0x02, 0x03, 0x04, 0x05, 0x06, 0x07};
 
   FakeOneWire wire;
   FakeMessageBoxes boxes;
@@ -35,7 +35,7 @@ class ReadingAButton : public testing::Test {
 };
 
 TEST_F(ReadingAButton, TellsItsCodeAndIsDone) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   EXPECT_FALSE(reader.Tick());
   EXPECT_EQ(reader.DallasID(), "EFCDAB8967452301");
   EXPECT_THAT(boxes.Boxes, ElementsAre(ReadBox("EFCDAB8967452301")));
@@ -48,7 +48,7 @@ TEST_F(ReadingAButton, GivesEachByteTwoDigits) {
 }
 
 TEST_F(ReadingAButton, TakesOneSessionATick) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   reader.Tick();
   EXPECT_THAT(wire.Log, ElementsAre("TMReadDefaultPort", "TMExtendedStartSession 1 5", "TMSetup", "TMNext",
                                     "TMRom", "TMEndSession"));
@@ -96,7 +96,7 @@ TEST_F(ReadingAButton, GoesOnWhileTheReaderIsEmpty) {
 }
 
 TEST_F(ReadingAButton, NeverTakesTheReadersOwnDevice) {
-  wire.Devices = {ownDevice};
+  wire.Devices = {OwnDevice};
   for (int tick = 0; tick < 50; ++tick) {
     ASSERT_TRUE(reader.Tick());
   }
@@ -105,7 +105,7 @@ TEST_F(ReadingAButton, NeverTakesTheReadersOwnDevice) {
 }
 
 TEST_F(ReadingAButton, FindsItBehindTheReadersOwnDevice) {
-  wire.Devices = {ownDevice, button};
+  wire.Devices = {OwnDevice, Button};
   EXPECT_TRUE(reader.Tick());
   EXPECT_FALSE(reader.Tick());
   EXPECT_EQ(reader.DallasID(), "EFCDAB8967452301");
@@ -118,14 +118,14 @@ TEST_F(ReadingAButton, LooksAtTheFamilyAloneToKnowTheReader) {
 }
 
 TEST_F(ReadingAButton, TakesTheFirstOfTwo) {
-  wire.Devices = {button, {0x0C, 1, 2, 3, 4, 5, 6, 7}};
+  wire.Devices = {Button, {0x0C, 1, 2, 3, 4, 5, 6, 7}};
   EXPECT_FALSE(reader.Tick());
   EXPECT_EQ(reader.DallasID(), "EFCDAB8967452301");
   EXPECT_EQ(boxes.Boxes.size(), 1U);
 }
 
 TEST_F(ReadingAButton, TellsItWithTheSessionOpen) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   bool openMeanwhile = false;
   boxes.WhileOpen = [&](const Box&) { openMeanwhile = wire.SessionOpen(); };
   reader.Tick();
@@ -142,7 +142,7 @@ TEST_F(ReadingAButton, EndsAtTheEndOfTheNextTickAfterCancel) {
 }
 
 TEST_F(ReadingAButton, GoesOnAfterABadRead) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   wire.NextResults = {OneWire::BadRead, OneWire::EndOfBus, -27};
   for (int tick = 0; tick < 3; ++tick) {
     EXPECT_TRUE(reader.Tick());
@@ -155,7 +155,7 @@ TEST_F(ReadingAButton, GoesOnAfterABadRead) {
 
 TEST_F(ReadingAButton, StillTakesAButtonInTheTickAfterCancel) {
   ASSERT_TRUE(reader.Tick());
-  wire.Devices = {button};
+  wire.Devices = {Button};
   reader.Cancel();
   EXPECT_FALSE(reader.Tick());
   EXPECT_EQ(reader.DallasID(), "EFCDAB8967452301");
@@ -171,7 +171,7 @@ TEST_F(ReadingAButton, EndsWithTheTickInWhichCancelIsPressed) {
 }
 
 TEST_F(ReadingAButton, BeginsAnewWithEachActivation) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   ASSERT_FALSE(reader.Tick());
   wire.Devices.clear();
   reader.Activate();
@@ -193,7 +193,7 @@ TEST_F(ReadingAButton, TellsOfASessionThatDoesNotStartAndIsDone) {
 }
 
 TEST_F(ReadingAButton, TellsOfAnyFaultOfTheDriverAndIsDone) {
-  wire.Devices = {ownDevice};
+  wire.Devices = {OwnDevice};
   for (const char* operation :
        {"TMReadDefaultPort", "TMExtendedStartSession", "TMSetup", "TMNext", "TMRom"}) {
     FakeMessageBoxes told;
@@ -216,7 +216,7 @@ TEST_F(ReadingAButton, TellsOfAFaultAtTheEndOfTheSessionToo) {
 }
 
 TEST_F(ReadingAButton, KeepsAButtonThatWasReadBeforeTheFault) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   wire.Broken = "TMEndSession";
   EXPECT_FALSE(reader.Tick());
   EXPECT_EQ(reader.DallasID(), "EFCDAB8967452301");

@@ -17,7 +17,7 @@ using testing::IsEmpty;
 
 class ButtonSwipeWindow : public testing::Test {
  protected:
-  static constexpr FakeOneWire::Rom button = {0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
+  static constexpr FakeOneWire::Rom Button = {0x01, 0x23, 0x45, 0x67, 0x89, 0xAB, 0xCD, 0xEF};
 
   /// Does `act` after the first look at the reader.
   void AfterAPoll(const std::function<void()>& act) {
@@ -58,7 +58,7 @@ TEST_F(ButtonSwipeWindow, PollsTenTimesASecondOnceItIsShown) {
 }
 
 TEST_F(ButtonSwipeWindow, GoesWithTheButtonThatWasRead) {
-  AfterAPoll([this] { wire.Devices = {button}; });
+  AfterAPoll([this] { wire.Devices = {Button}; });
   window.exec();
   EXPECT_EQ(window.DallasID(), "EFCDAB8967452301");
   EXPECT_EQ(boxes.Boxes.size(), 1U);
@@ -67,7 +67,7 @@ TEST_F(ButtonSwipeWindow, GoesWithTheButtonThatWasRead) {
 }
 
 TEST_F(ButtonSwipeWindow, StaysWhileItTellsOfTheButton) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   bool visible = false;
   boxes.WhileOpen = [&](const FakeMessageBoxes::Box&) { visible = window.isVisible(); };
   window.exec();
@@ -76,7 +76,7 @@ TEST_F(ButtonSwipeWindow, StaysWhileItTellsOfTheButton) {
 
 /// The box is modal and events go on while it is open.
 TEST_F(ButtonSwipeWindow, DoesNotPollWhileItTellsOfTheButton) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   boxes.WhileOpen = [this](const FakeMessageBoxes::Box&) {
     QTimer later;
     bool over = false;
@@ -103,7 +103,7 @@ TEST_F(ButtonSwipeWindow, GoesAtTheEndOfTheNextPollAfterCancel) {
 TEST_F(ButtonSwipeWindow, ReturnsAButtonThatIsReadInThePollAfterCancel) {
   AfterAPoll([this] {
     Press(window, "Cancel");
-    wire.Devices = {button};
+    wire.Devices = {Button};
   });
   window.exec();
   EXPECT_EQ(window.DallasID(), "EFCDAB8967452301");
@@ -139,7 +139,7 @@ TEST_F(ButtonSwipeWindow, DoesNotTakeReturnForCancel) {
 }
 
 TEST_F(ButtonSwipeWindow, ForgetsTheLastButtonWhenItComesUpAgain) {
-  wire.Devices = {button};
+  wire.Devices = {Button};
   window.exec();
   ASSERT_EQ(window.DallasID(), "EFCDAB8967452301");
   wire.Devices.clear();

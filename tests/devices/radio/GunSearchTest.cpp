@@ -11,9 +11,7 @@
 namespace {
 
 using std::chrono::milliseconds;
-using testing::Each;
 using testing::ElementsAre;
-using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
 

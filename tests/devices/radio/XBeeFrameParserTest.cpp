@@ -31,7 +31,6 @@ std::size_t allocations = 0;
 
 namespace {
 
-using testing::Each;
 using testing::ElementsAre;
 using testing::IsEmpty;
 

@@ -8,7 +8,6 @@
 namespace {
 
 using testing::ElementsAre;
-using testing::ElementsAreArray;
 
 using Bytes = std::vector<std::uint8_t>;
 

@@ -7,7 +7,6 @@
 namespace {
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 std::string Text(const std::string& text) {
   return 'S' + std::string{static_cast<char>(text.size()), 0, 0, 0} + text;

@@ -82,7 +82,7 @@ class FailureOfTheBaseUnit : public testing::TestWithParam<BaseUnitFailureInfo> 
 };
 
 const Bytes CountOfAll{Players};
-const Bytes allAccepted(Players, 170);
+const Bytes AllAccepted(Players, 170);
 
 void ExpectOthersFaultless(const std::vector<Bytes>& frames, const std::vector<Bytes>& faultless) {
   ASSERT_GE(frames.size(), faultless.size());
@@ -146,7 +146,7 @@ TEST_P(FailureOfTheBaseUnit, ReachesTheHostAsItsNameSays) {
     case BaseUnitFailure::TornWrites:
       EXPECT_EQ(heard.Lead, CountOfAll);
       EXPECT_EQ(heard.Frames, faultless_);
-      EXPECT_EQ(Replies(), allAccepted);
+      EXPECT_EQ(Replies(), AllAccepted);
       break;
     case BaseUnitFailure::WrongCrc:
       ExpectWrongCrc(heard.Frames, faultless_);
@@ -170,18 +170,18 @@ TEST_P(FailureOfTheBaseUnit, ReachesTheHostAsItsNameSays) {
       for (std::size_t i = 0; i < faultless_.size(); ++i) {
         ExpectLongerStatistics(heard.Frames[i], faultless_[i]);
       }
-      EXPECT_EQ(Replies(), allAccepted);
+      EXPECT_EQ(Replies(), AllAccepted);
       break;
     case BaseUnitFailure::LengthAbove1001:
       ExpectOthersFaultless(heard.Frames, faultless_);
       EXPECT_GT(heard.Frames.at(Index).size(), 1001U + 1U);
       EXPECT_EQ(Part(heard.Frames.at(Index), 4, 45), Part(faultless_[Index], 4, 45));
-      EXPECT_EQ(Replies(), allAccepted);
+      EXPECT_EQ(Replies(), AllAccepted);
       break;
     case BaseUnitFailure::HighBitWords:
       ExpectOthersFaultless(heard.Frames, faultless_);
       ExpectHighCounters(heard.Frames.at(Index), faultless_[Index]);
-      EXPECT_EQ(Replies(), allAccepted);
+      EXPECT_EQ(Replies(), AllAccepted);
       break;
     case BaseUnitFailure::SameGunTwice:
       EXPECT_EQ(heard.Lead, Bytes{Players + 1});

@@ -46,7 +46,7 @@ class Ds2480bTest : public testing::Test {
   Ds2480b chip_{bus_};
 };
 
-const Bytes lowestFirst(16, 0x00);
+const Bytes LowestFirst(16, 0x00);
 
 Bytes With(Bytes bytes, std::size_t index, std::uint8_t value) {
   bytes.at(index) = value;
@@ -147,15 +147,15 @@ TEST_F(Ds2480bTest, AnswersNoModeByteInCommandModeAndNoByteThatIsNoCommand) {
 
 TEST_F(Ds2480bTest, FindsASingleDevice) {
   bus_.Touch(Button);
-  EXPECT_EQ(Search(lowestFirst), ButtonPath);
+  EXPECT_EQ(Search(LowestFirst), ButtonPath);
   EXPECT_EQ(Search(Bytes(16, 0xAA)), ButtonPath);
 }
 
 TEST_F(Ds2480bTest, FindsTwoDevicesByTheDirectionAtTheirOnlyConflict) {
   bus_.Touch(Button);
   bus_.Touch(Reader);
-  EXPECT_EQ(Search(lowestFirst), With(ButtonPath, 1, 0x40));
-  EXPECT_EQ(Search(With(lowestFirst, 1, 0x80)), With(ReaderPath, 1, 0xC0));
+  EXPECT_EQ(Search(LowestFirst), With(ButtonPath, 1, 0x40));
+  EXPECT_EQ(Search(With(LowestFirst, 1, 0x80)), With(ReaderPath, 1, 0xC0));
 }
 
 TEST_F(Ds2480bTest, FindsThreeDevicesAndTellsEachConflictOnTheWay) {
@@ -163,9 +163,9 @@ TEST_F(Ds2480bTest, FindsThreeDevicesAndTellsEachConflictOnTheWay) {
   bus_.Touch(Reader);
   bus_.Touch(Sister);
   const Bytes toButtons = With(ButtonPath, 1, 0x40);
-  EXPECT_EQ(Search(lowestFirst), With(toButtons, 12, 0xA1));
-  EXPECT_EQ(Search(With(lowestFirst, 12, 0x02)), With(toButtons, 12, 0xA3));
-  EXPECT_EQ(Search(With(lowestFirst, 1, 0x80)), With(ReaderPath, 1, 0xC0));
+  EXPECT_EQ(Search(LowestFirst), With(toButtons, 12, 0xA1));
+  EXPECT_EQ(Search(With(LowestFirst, 12, 0x02)), With(toButtons, 12, 0xA3));
+  EXPECT_EQ(Search(With(LowestFirst, 1, 0x80)), With(ReaderPath, 1, 0xC0));
 }
 
 TEST_F(Ds2480bTest, IgnoresTheEvenBitsOfDirections) {
@@ -176,13 +176,13 @@ TEST_F(Ds2480bTest, IgnoresTheEvenBitsOfDirections) {
 
 TEST_F(Ds2480bTest, TellsOnlyOnesFromTheFirstBitThatNobodyAnswers) {
   EXPECT_EQ(Answers({0xC1, 0xE1, 0xF0, 0xE3, 0xB1, 0xE1}), (Bytes{0xCF, 0xF0}));
-  EXPECT_EQ(Answers(lowestFirst), Bytes(16, 0xFF));
+  EXPECT_EQ(Answers(LowestFirst), Bytes(16, 0xFF));
 }
 
 TEST_F(Ds2480bTest, ForgetsAFailedSearchWhenTheAcceleratorIsSwitchedOff) {
   Answers({0xE1, 0xF0, 0xE3, 0xB1, 0xE1, 0x00, 0xE3, 0xA1});
   bus_.Touch(Button);
-  EXPECT_EQ(Search(lowestFirst), ButtonPath);
+  EXPECT_EQ(Search(LowestFirst), ButtonPath);
 }
 
 TEST_F(Ds2480bTest, RemembersAFailedSearchWhileTheAcceleratorIsOn) {
@@ -190,7 +190,7 @@ TEST_F(Ds2480bTest, RemembersAFailedSearchWhileTheAcceleratorIsOn) {
   bus_.Touch(Button);
   // Reset and search command past the accelerator, as single bits.
   Answers({0xC1, 0x81, 0x81, 0x81, 0x81, 0x91, 0x91, 0x91, 0x91, 0xE1});
-  EXPECT_EQ(Answers(lowestFirst), Bytes(16, 0xFF));
+  EXPECT_EQ(Answers(LowestFirst), Bytes(16, 0xFF));
 }
 
 TEST_F(Ds2480bTest, TellsAButtonThatLeavesInTheMiddleOfASearch) {

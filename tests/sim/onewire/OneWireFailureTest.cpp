@@ -17,7 +17,7 @@ const Bytes Detection{0x17, 0x45, 0x5B, 0x0F, 0x91};
 const Bytes Detected{0x16, 0x44, 0x5A, 0x00, 0x93};
 
 // The first bit tells the button (family 02) from the reader's own device (81).
-const Bytes toLowest(16, 0x00);
+const Bytes ToLowest(16, 0x00);
 const Bytes ToReader{2, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0};
 
 // Answers to reset, search command and directions.
@@ -47,7 +47,7 @@ class FailureOfTheAdapter : public testing::TestWithParam<OneWireFailureInfo> {
   // Twice, since a failure must stay.
   void ExpectSearches(const Bytes& lowest, const Bytes& reader) {
     for (int round = 0; round < 2; ++round) {
-      EXPECT_EQ(host_.Search(toLowest), lowest);
+      EXPECT_EQ(host_.Search(ToLowest), lowest);
       EXPECT_EQ(host_.Search(ToReader), reader);
     }
     EXPECT_TRUE(host_.IsSilent());
@@ -55,11 +55,11 @@ class FailureOfTheAdapter : public testing::TestWithParam<OneWireFailureInfo> {
 
   void ExpectTwoButtons() {
     ExpectSearches(With(FoundButton, 4, 0xA1), FoundReader);
-    EXPECT_EQ(host_.Search(With(toLowest, 2, 0x02)),
+    EXPECT_EQ(host_.Search(With(ToLowest, 2, 0x02)),
               (Bytes{0xCD, 0xF0, 0x09, 0x00, 0xA3, 0x02, 0x80, 0x8A, 0x02, 0x00, 0x00, 0x00, 0x00, 0x00, 0x00,
                      0x00, 0x22, 0x82}));
     EXPECT_TRUE(adapter_.Leave({0x02, 0x1C, 0xB8, 0x01, 0x00, 0x00, 0x00, 0xA2}));
-    EXPECT_EQ(host_.Search(toLowest), With(FoundReader, 2, 0x02));
+    EXPECT_EQ(host_.Search(ToLowest), With(FoundReader, 2, 0x02));
   }
 
   OneWireAdapter adapter_;
