@@ -15,7 +15,7 @@ Language LanguageOfSystem() {
   return LanguageOf(languages.isEmpty() ? std::string() : languages.first().toStdString());
 }
 
-/// Where the word processor's module lies: beside the program, or where it is installed.
+/// Folder of the word processor's module: beside the program, or where it is installed.
 std::string ModuleFolder() {
   const QDir program(QCoreApplication::applicationDirPath());
   const bool isBuildTree = program.exists(QStringLiteral("tessarine-office-host"));

@@ -21,7 +21,7 @@
 #include "platform/sqlite/SqliteDatabase.h"
 #include "ui/DialogParent.h"
 
-/// The real parts of the platform, put together for one run of the program. Needs a QApplication.
+/// The real platform, assembled for one run of the program. Needs a QApplication.
 class Composition {
  public:
   Composition();

@@ -8,10 +8,10 @@
 #include "core/text/StringTable.h"
 #include "platform/jet/JetConverter.h"
 
-/// Converts old databases, and shows in a window how far it is where that takes more than a moment.
+/// Converts old databases, and shows the progress in a window if that takes more than a moment.
 class ConversionWithProgress : public OldDatabases {
  public:
-  /// `moment` is the time after which the window comes up, and from one text in it to the next.
+  /// `moment` is the time until the window appears, and between updates of its text.
   explicit ConversionWithProgress(const StringTable& strings,
                                   std::chrono::milliseconds moment = std::chrono::milliseconds(90),
                                   const std::string& reader = JetReaderPath());
@@ -26,7 +26,7 @@ class ConversionWithProgress : public OldDatabases {
   const StringTable& strings_;
   JetConverter converter_;
   std::chrono::milliseconds moment_;
-  QString file_;  ///< that is being converted, without its folder
+  QString file_;  ///< being converted, without its folder
   QElapsedTimer sinceShown_;
-  std::unique_ptr<QProgressDialog> window_;  ///< once it took more than a moment
+  std::unique_ptr<QProgressDialog> window_;  ///< set once it has taken more than a moment
 };

@@ -6,6 +6,6 @@ namespace Ui {
 class frmRx;
 }
 
-/// Gives the menus and labels of the main window their texts in the program's language. The letter for the
-/// Alt key stays that of the design where the new text has it.
+/// Sets the texts of the main window's menus and labels in the program's language. Menus keep the Alt-key
+/// letter of the design if the new text has it.
 void SetCaptions(Ui::frmRx& ui, const StringTable& strings);

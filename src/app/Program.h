@@ -11,8 +11,8 @@ class Program : public QObject {
  public:
   Program();
 
-  /// Gets the main window ready and shows it. Returns false when the program cannot go on, which has been
-  /// told, or when the operator chose to end it.
+  /// Prepares the main window and shows it. Returns false if the program cannot continue, which has been
+  /// reported, or if the operator chose to end it.
   bool Start();
 
   /// Starts, and runs until the main window is closed. Returns the process's exit code.
@@ -21,7 +21,7 @@ class Program : public QObject {
   frmRx& Window() { return *window_; }
 
  protected:
-  /// Sees the commands of all windows, for the log.
+  /// Logs the commands of all windows.
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:

@@ -6,12 +6,12 @@
 
 class QWidget;
 
-/// How the main window answers to the screen at start-up. Sizes are pixels.
+/// How the main window adapts to the screen at start-up. Sizes are in pixels.
 struct ScreenFit {
-  bool Warn = false;  ///< tell that the screen is small
+  bool Warn = false;  ///< warn that the screen is small
   bool Maximised = false;
-  std::optional<int> Width;   ///< limit, with the window at the left edge
-  std::optional<int> Height;  ///< limit, with the window at the top edge
+  std::optional<int> Width;   ///< new width, with the window at the left edge
+  std::optional<int> Height;  ///< new height, with the window at the top edge
 };
 
 inline constexpr int RecommendedScreenWidth = 1024;
@@ -35,6 +35,6 @@ constexpr ScreenFit FitToScreen(int screenWidth, int screenHeight) {
   return fit;
 }
 
-/// Fits the main window to its screen, whose size counts in the screen's own pixels, and tells in a box that
-/// it is small.
+/// Fits the main window to its screen, whose size is in the screen's own pixels, and warns in a box if the
+/// screen is small.
 void FitToScreen(QWidget& window, MessageBoxes& boxes);

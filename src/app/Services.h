@@ -16,7 +16,7 @@
 #include "platform/SerialPort.h"
 #include "platform/WordProcessor.h"
 
-/// The platform's parts that the main window works with; they outlive it.
+/// The platform services that the main window uses; they must outlive it.
 struct Services {
   const StringTable& Strings;
   const Clock& Time;
@@ -30,6 +30,6 @@ struct Services {
   const SerialDevices& Devices;
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;
-  /// Waits for a membership button; its number, or NoDallasId. Empty where there is no reader.
+  /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
 };

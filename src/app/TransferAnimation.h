@@ -3,7 +3,7 @@
 #include <QTimer>
 #include <QWidget>
 
-/// Packets that fly from a gun to the desk while data come in; at rest an empty track.
+/// Packets that fly from a gun to the desk while data arrives; an empty track at rest.
 class TransferAnimation : public QWidget {
   Q_OBJECT
 
@@ -18,5 +18,5 @@ class TransferAnimation : public QWidget {
 
  private:
   QTimer step_;
-  int phase_ = 0;  ///< 0 to PhaseCount - 1: how far the packets have flown to their successors' places
+  int phase_ = 0;  ///< 0 to PhaseCount - 1: how far each packet has flown towards the next one's place
 };

@@ -2,12 +2,12 @@
 
 #include "platform/WordProcessor.h"
 
-/// Starts the word processor and follows it until it is ready or will never be.
+/// Starts the word processor and tracks it until it is ready or has failed.
 class WordProcessorStart {
  public:
   explicit WordProcessorStart(WordProcessor& wordProcessor) : wordProcessor_(wordProcessor) {}
 
-  /// How far it has come; the first call starts it. One that cannot be started has ended.
+  /// The word processor's state; the first call starts it. Ended if it cannot be started.
   WordState Follow();
 
  private:

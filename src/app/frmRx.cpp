@@ -45,7 +45,7 @@ bool frmRx::FormLoad() {
   session_.Factors() = ReadSoldieringFactors(*ini_);
   ui_->mnuCheckButton->setEnabled(services_.ButtonSwipe != nullptr);
   ConnectCommands();
-  // Not before the window has come up.
+  // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
           [this] { commands_.Run([this] { FollowWordProcessor(); }); });
@@ -93,10 +93,10 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
                                {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
                            });
-  // In the bar, but never shown there: tools that read the screen find the items of an open context menu only
-  // so.
+  // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
+  // menu.
   ui_->mnuPopup->menuAction()->setVisible(false);
-  // An item that such a tool presses does not close its menu by itself, and the board waits for that.
+  // An item pressed by a screen reader does not close its menu by itself, and the board waits for that.
   connect(ui_->mnuPopup, &QMenu::triggered, ui_->mnuPopup, &QWidget::close);
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);

@@ -29,7 +29,7 @@ class frmRx : public QMainWindow {
   ~frmRx() override;
 
   /// Finds the user's data, opens the databases and fills the window, in the order that the operator sees.
-  /// Throws RuntimeError when the program cannot go on; returns false when the operator chose to end it.
+  /// Throws RuntimeError if the program cannot continue; returns false if the operator chose to end it.
   bool FormLoad();
 
  protected:
@@ -41,7 +41,7 @@ class frmRx : public QMainWindow {
 
   void TellOfMissingBackup();
 
-  /// Shows what has changed in the session, as far as the lists do not.
+  /// Shows changes in the session, except those that the lists show.
   void Show(SessionChange change);
   void ShowMissions();
 
@@ -49,7 +49,7 @@ class frmRx : public QMainWindow {
   void SaveGame();
   void ClearGame();
   void GetScoreData();
-  /// Follows the word processor until it is ready. Where it is missing, says so once and goes on without
+  /// Tracks the word processor until it is ready. If it is missing, says so once and continues without
   /// printing.
   void FollowWordProcessor();
   void PrintScores();
@@ -59,8 +59,8 @@ class frmRx : public QMainWindow {
   void CommitGame();
   void ManageMembers();
   void CheckMembershipButton();
-  /// Shows the members, standing on one of them (0 for none); `ContactID` of the one chosen with OK, or
-  /// empty.
+  /// Shows the members, starting at `contactToShow` (0 for none). Returns `ContactID` of the one chosen with
+  /// OK, or an empty text.
   std::string ShowMembers(std::int32_t contactToShow);
   void ShowAdminData();
   void EnterMissionResults();

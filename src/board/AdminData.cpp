@@ -13,7 +13,7 @@
 AdminData::AdminData(const Game& game, const StringTable& strings, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::AdminData>()) {
   ui_->setupUi(this);
-  ui_->PlayerList->setObjectName(QStringLiteral("AdminData"));  // which the form cannot call it: its own name
+  ui_->PlayerList->setObjectName(QStringLiteral("AdminData"));  // not possible in the form: it has this name
   setWindowTitle(Text(strings, 136));
   ui_->Command1->setText(Text(strings, 137));
   ui_->Copy->setText(Text(strings, OwnText::Copy));
@@ -45,7 +45,7 @@ void AdminData::ShowPlayers(const Game& game) {
   }
 }
 
-// A list answers to the key itself, with the text of one cell.
+// The list itself would copy only the text of one cell.
 bool AdminData::eventFilter(QObject* watched, QEvent* event) {
   if (event->type() == QEvent::KeyPress && static_cast<QKeyEvent*>(event)->matches(QKeySequence::Copy)) {
     Copy();

@@ -23,7 +23,8 @@ class AdminData : public QDialog {
 
  private:
   void ShowPlayers(const Game& game);
-  /// Puts the selected rows, or all when none is, on the clipboard as text with tabs, the headers first.
+  /// Copies the selected rows, or all if none is selected, to the clipboard as tab-separated text, headers
+  /// first.
   void Copy() const;
 
   std::unique_ptr<Ui::AdminData> ui_;

@@ -19,8 +19,7 @@ class BonusPoints : public QDialog {
   BonusPoints(std::int32_t value, MessageBoxes& boxes, QWidget* parent);
   ~BonusPoints() override;
 
-  /// The value handed over, or what was entered with OK: the leading number of the text, 0 when there is
-  /// none.
+  /// The value passed in or, after OK, the one entered: the leading number of the text, 0 if there is none.
   std::int32_t Value() const { return value_; }
 
  private:

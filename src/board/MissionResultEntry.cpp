@@ -73,7 +73,7 @@ void MissionResultEntry::ShowObjectives(MissionList& missions) {
   }
 }
 
-// A touch screen knows no hovering, and a screen reader no tool tips.
+// A touch screen has no hovering, and a screen reader no tool tips.
 bool MissionResultEntry::eventFilter(QObject* watched, QEvent* event) {
   if (event->type() == QEvent::FocusIn || event->type() == QEvent::Enter) {
     ui_->ObjectiveText->setText(qobject_cast<QWidget*>(watched)->toolTip());

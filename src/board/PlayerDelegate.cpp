@@ -8,7 +8,7 @@
 
 namespace {
 
-constexpr double PlayerSize = 0.72;  ///< of the cell's letters
+constexpr double PlayerSize = 0.72;  ///< relative to the cell's font size
 constexpr double NameSize = 0.68;
 
 void DrawLine(QPainter& painter, const QRect& place, QFont font, double size, const QString& text,

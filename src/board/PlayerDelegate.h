@@ -2,8 +2,8 @@
 
 #include <QStyledItemDelegate>
 
-/// Shows a player of a ScoreListModel with the member's name in small letters below, since both do not fit
-/// side by side into the board's column.
+/// Shows a player of a ScoreListModel with the member's name in small letters below, since the two do not fit
+/// side by side in the board's column.
 class PlayerDelegate : public QStyledItemDelegate {
   Q_OBJECT
 

@@ -5,8 +5,8 @@
 #include "core/game/BoardTexts.h"
 #include "core/game/Session.h"
 
-/// Shows one of the lists of a session to the toolkit, with each row in its team's colour. Any number of them
-/// may show the same list.
+/// Presents one of a session's lists to the toolkit, each row in its team's colour. Any number of models may
+/// show the same list.
 class ScoreListModel : public QAbstractTableModel {
   Q_OBJECT
 
@@ -14,7 +14,7 @@ class ScoreListModel : public QAbstractTableModel {
   /// The text of a cell in two parts.
   enum Role { NameRole = Qt::UserRole, MemberNameRole };
 
-  /// Both `session` and `strings` outlive the model's views.
+  /// `session` and `strings` must outlive the model's views.
   ScoreListModel(Session& session, BoardList list, const StringTable& strings, QObject* parent);
 
   int rowCount(const QModelIndex& parent = {}) const override;

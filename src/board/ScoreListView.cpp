@@ -11,7 +11,7 @@
 
 namespace {
 
-/// Gives cells the side margin of their headers.
+/// Gives cells the same side margin as their headers.
 class CellMargin : public QProxyStyle {
  public:
   int pixelMetric(PixelMetric metric, const QStyleOption* option, const QWidget* widget) const override {
@@ -86,7 +86,7 @@ void ScoreListView::focusInEvent(QFocusEvent* event) {
 }
 
 void ScoreListView::keyPressEvent(QKeyEvent* event) {
-  // The toolkit knows only the menu key on this platform; many keyboards have none.
+  // On this platform the toolkit handles only the menu key, which many keyboards lack.
   if (event->key() == Qt::Key_F10 && event->modifiers() == Qt::ShiftModifier) {
     emit customContextMenuRequested(visualRect(currentIndex()).center());
     return;

@@ -2,7 +2,7 @@
 
 #include <string>
 
-/// The present local time in the system locale's own forms, the year always in four digits.
+/// The current local date and time in the system locale's formats, but always with a four-digit year.
 class Clock {
  public:
   virtual ~Clock() = default;
@@ -10,10 +10,10 @@ class Clock {
   virtual std::string ShortDate() const = 0;
   virtual std::string ShortTime() const = 0;
 
-  /// Local date and time as the databases keep them: "YYYY-MM-DD HH:MM:SS".
+  /// Local date and time as the databases store them: "YYYY-MM-DD HH:MM:SS".
   virtual std::string Now() const = 0;
 
-  /// The date in `text` (a short date, with or without a time behind it) in the locale's long form; `text`
-  /// as it stands when there is none.
+  /// The date in `text` (a short date, optionally followed by a time) in the locale's long format; `text`
+  /// unchanged if there is none.
   virtual std::string LongDate(const std::string& text) const = 0;
 };

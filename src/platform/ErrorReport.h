@@ -7,15 +7,15 @@
 #include "platform/MessageBoxes.h"
 #include "platform/RuntimeError.h"
 
-/// The number follows.
+/// How every error report begins; the number follows.
 inline constexpr const char* ErrorReportStart = "Run-time error '";
 
 inline void ShowErrorReport(MessageBoxes& boxes, int number, const std::string& text) {
   boxes.Show(ErrorReportStart + std::to_string(number) + "': " + text, DefaultBoxTitle, BoxIcon::Critical);
 }
 
-/// Runs a command of the operator. A failure that nothing below has a behaviour for ends the command with a
-/// box; the program goes on. Returns false when the command failed.
+/// Runs one of the operator's commands. A failure that is not handled inside ends the command with a box; the
+/// program continues. Returns false if the command failed.
 template <typename Command>
 bool ReportErrors(MessageBoxes& boxes, Command&& command) {
   try {

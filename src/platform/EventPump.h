@@ -6,27 +6,27 @@
 enum class WaitResult {
   Met,       ///< the condition holds
   TimedOut,  ///< the limit passed first
-  Ended      ///< the program is closing: give up without a word
+  Ended      ///< the program is closing: give up silently
 };
 
-/// The one thread's way to wait: events (timers, paint, input, serial data) are served meanwhile, and an idle
-/// wait costs no processor time.
+/// How the program's only thread waits: events (timers, painting, input, serial data) are processed
+/// meanwhile, and an idle wait uses no processor time.
 class EventPump {
  public:
   virtual ~EventPump() = default;
 
-  /// Serves the events that are pending now.
+  /// Processes the events that are pending now.
   virtual void DoEvents() = 0;
 
-  /// Serves events until `condition` holds or `limit` has passed. The condition is tested first, and again
-  /// after each batch of events; it must depend on something that an event changes. Waits nest: an outer one
-  /// goes on when the inner one has returned.
+  /// Processes events until `condition` is true or `limit` has passed. The condition is tested first, and
+  /// again after each batch of events; it must depend on something that an event changes. Waits nest: an
+  /// outer one resumes when the inner one has returned.
   virtual WaitResult WaitFor(const std::function<bool()>& condition, std::chrono::milliseconds limit) = 0;
 
-  /// Pauses. Up to 50 ms the thread just sleeps; a longer pause serves events and ends early when the program
-  /// closes.
+  /// Pauses. Up to 50 ms the thread just sleeps; a longer pause processes events and ends early if the
+  /// program closes.
   virtual void Sleep(std::chrono::milliseconds time) = 0;
 
-  /// The program closes: all present and later waits return Ended, whatever their condition.
+  /// The program is closing: all current and later waits return Ended, whatever their condition.
   virtual void EndWaits() = 0;
 };

@@ -2,8 +2,8 @@
 
 #include <string_view>
 
-/// Numbers of the failures that operations of the platform and conversions report. The operator reads them in
-/// the error report, so a number keeps its meaning for good.
+/// Error numbers of platform operations and conversions. The operator sees them in error reports, so a number
+/// never changes its meaning.
 namespace Fault {
 
 inline constexpr int InvalidProcedureCall = 5;
@@ -67,7 +67,7 @@ struct NumberedText {
   std::string_view Text;
 };
 
-/// The usual texts, where a number has one.
+/// The standard texts, for the numbers that have one.
 inline constexpr NumberedText Texts[] = {
     {InvalidProcedureCall, "Invalid procedure call or argument"},
     {Overflow, "Overflow"},

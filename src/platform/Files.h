@@ -15,38 +15,39 @@ class Files {
   /// Makes one folder; its parent must exist. Throws RuntimeError 75 or 76.
   virtual void CreateFolder(const std::string& path) = 0;
 
-  /// Bytes in a file. Throws RuntimeError 53 when it does not exist, 75 when it is none that can be read.
+  /// Size of a file in bytes. Throws RuntimeError 53 if it does not exist, 75 if it is not a readable file.
   virtual std::uint64_t FileLen(const std::string& path) const = 0;
 
   /// The whole file. Throws RuntimeError 53 when it does not exist, 75 when it cannot be read.
   virtual std::string Read(const std::string& path) const = 0;
 
   /// Writes the whole file atomically: a failure or a crash leaves the old file (or none). Durable on return.
-  /// A path that is a symbolic link has its target replaced. Throws RuntimeError 61 (disk full), 70, 75 or
+  /// If the path is a symbolic link, its target is replaced. Throws RuntimeError 61 (disk full), 70, 75 or
   /// 76; the text names the file.
   virtual void Replace(const std::string& path, const std::string& bytes) = 0;
 
-  /// Makes a new empty file in the system's temporary folder, its name beginning with "per", and returns its
+  /// Creates an empty file in the system's temporary folder, its name beginning with "per", and returns its
   /// path. Throws as Replace does.
   virtual std::string MakeTempFileName() = 0;
 
-  /// Writes the whole file in place, neither atomic nor durable: for temporary files. Throws as Replace does.
+  /// Writes the whole file in place, neither atomically nor durably: for temporary files. Throws as Replace
+  /// does.
   virtual void Write(const std::string& path, const std::string& bytes) = 0;
 
-  /// Adds bytes at the end of a file, which is made when missing; not durable. Throws as Replace does.
+  /// Appends bytes to a file, creating it if it is missing; not durable. Throws as Replace does.
   virtual void Append(const std::string& path, const std::string& bytes) = 0;
 
-  /// Bytes that this user may still write on the disk that `path`, a file or folder, lies on. Throws
-  /// RuntimeError 76 when there is no such path.
+  /// Bytes that this user may still write on the disk that holds `path`, a file or folder. Throws
+  /// RuntimeError 76 if there is no such path.
   virtual std::uint64_t FreeSpace(const std::string& path) const = 0;
 
-  /// Names of the files in a folder, in ascending order; none when there is no such folder.
+  /// Names of the files in a folder, in ascending order; none if there is no such folder.
   virtual std::vector<std::string> FileNames(const std::string& folder) const = 0;
 
-  /// Gives a file another path on the same disk, in place of what is there. Durable on return. Throws
-  /// RuntimeError 53 when it does not exist, 61, 70, 75 or 76.
+  /// Moves a file to another path on the same disk, replacing any file there. Durable on return. Throws
+  /// RuntimeError 53 if it does not exist, 61, 70, 75 or 76.
   virtual void Rename(const std::string& path, const std::string& newPath) = 0;
 
-  /// Deletes a file. Throws RuntimeError 53 when it does not exist, 70, 75 or 76.
+  /// Deletes a file. Throws RuntimeError 53 if it does not exist, 70, 75 or 76.
   virtual void Delete(const std::string& path) = 0;
 };

@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <string>
 
-/// Where this user's data and the program's own files lie. Paths have no separator at their end.
+/// Where this user's data and the program's own files are. Paths have no trailing separator.
 class Folders {
  public:
   virtual ~Folders() = default;
@@ -12,8 +12,8 @@ class Folders {
   static constexpr std::uint32_t DoesNotExist = 1;
   static constexpr std::uint32_t InvalidFolderId = 0x80070057;
 
-  /// The per-user application data folder, created when absent. Returns Found and sets `path`, or says why
-  /// not.
+  /// The per-user application data folder, created if missing. Returns Found and sets `path`, or returns the
+  /// reason for failure.
   virtual std::uint32_t LocalAppData(std::string& path) const = 0;
 
   /// The folder that holds the default data files.

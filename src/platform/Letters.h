@@ -1,6 +1,6 @@
 #pragma once
 
-/// ASCII letters, whatever the locale. Down here because drivers of files and devices need them too.
+/// ASCII characters, independent of the locale. In platform/ because file and device drivers need them too.
 
 constexpr bool IsDigit(char letter) {
   return letter >= '0' && letter <= '9';
@@ -11,7 +11,7 @@ constexpr bool IsBlank(char letter) {
   return letter == ' ' || letter == '\t';
 }
 
-/// A space, a tab, or one of the characters that end a line or page.
+/// A space, a tab, or a line or page break.
 constexpr bool IsWhiteSpace(char letter) {
   return letter == ' ' || (letter >= '\t' && letter <= '\r');
 }

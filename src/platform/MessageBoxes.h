@@ -14,9 +14,9 @@ class MessageBoxes {
  public:
   virtual ~MessageBoxes() = default;
 
-  /// Shows a box and returns the button that closed it. Escape and the close box answer Cancel where there is
-  /// such a button, else Ok; a box of nothing but Yes and No closes by its buttons alone. A box whose window
-  /// is destroyed answers as its last button does.
+  /// Shows a box and returns the button that closed it. Escape and the close box count as Cancel if there is
+  /// such a button, else as Ok; a box with only Yes and No can be closed only by its buttons. A box whose
+  /// window is destroyed returns its last button.
   virtual BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,
                          BoxButtons buttons = BoxButtons::Ok) = 0;
 };

@@ -2,11 +2,11 @@
 
 #include <chrono>
 
-/// Time for stamps and for time left. Nobody can set it, and it never goes back.
+/// A clock for time stamps and estimates of time left. It cannot be set and never goes back.
 class MonotonicClock {
  public:
   virtual ~MonotonicClock() = default;
 
-  /// Time since a moment of its own, near the start of the program.
+  /// Time since a fixed moment near the start of the program.
   virtual std::chrono::microseconds Elapsed() const = 0;
 };

@@ -4,12 +4,12 @@
 #include <string>
 #include <vector>
 
-/// Something of an old file that is not in the new one as it was.
+/// Something in an old file that the new one lacks or has in another form.
 struct NotTakenOver {
   enum Kind {
-    Table,         ///< which the new file has no place for
+    Table,         ///< that the new file has no place for
     Column,        ///< likewise
-    TextsOfColumn  ///< that are no numbers, where the new file takes only these; they are 0 now
+    TextsOfColumn  ///< that are not numbers, in a column that is numeric in the new file; 0 there
   };
   Kind What;
   std::string Name;
@@ -20,10 +20,10 @@ struct NotTakenOver {
 
 /// What became of an old file.
 struct OldDatabaseReport {
-  /// Rows taken over.
+  /// Rows copied to the new file.
   std::int64_t Rows = 0;
   std::vector<NotTakenOver> NotTaken;
-  /// Path of the old file now.
+  /// Path where the old file was kept.
   std::string KeptAs;
 };
 
@@ -32,12 +32,13 @@ class OldDatabases {
  public:
   virtual ~OldDatabases() = default;
 
-  /// True when the file begins as one of that format does; false also when it cannot be read.
+  /// True if the file starts like one of that format; false also if it cannot be read.
   virtual bool IsOld(const std::string& path) const = 0;
 
-  /// Puts a new file with the rows of `table` in the place of the old one, which is kept beside it under a
-  /// name that nothing has. `emptyDatabase` is a file with that table, whose rows do not count. Throws
-  /// RuntimeError 3343 whose text says why when the old file cannot be read whole; nothing has changed then.
+  /// Replaces the old file with a new one that has the rows of `table`; the old one is kept beside it under
+  /// an unused name. `emptyDatabase` is a file with that table, whose own rows are ignored. Throws
+  /// RuntimeError 3343, whose text says why, if the old file cannot be read completely; nothing has changed
+  /// then.
   virtual OldDatabaseReport Convert(const std::string& path, const std::string& table,
                                     const std::string& emptyDatabase) = 0;
 };

@@ -8,9 +8,8 @@ class Programs {
  public:
   virtual ~Programs() = default;
 
-  /// Starts a program that goes on by itself, also when this one has ended. The first of `words` is the
-  /// program: a path, or a name that is looked for where the system's programs lie. The others are its
-  /// arguments, each handed over as it stands. Throws RuntimeError 53 when it cannot be started, 5 when there
-  /// are no words.
+  /// Starts a program that runs on its own and may outlive this one. The first of `words` is the program: a
+  /// path, or a name that is looked up among the system's programs. The others are its arguments, passed
+  /// unchanged. Throws RuntimeError 53 if it cannot be started, 5 if `words` is empty.
   virtual void Start(const std::vector<std::string>& words) = 0;
 };

@@ -5,10 +5,10 @@
 
 #include "platform/Fault.h"
 
-/// A failure that an operation of the platform, or a conversion, reports by number (Fault) and text.
+/// A failure of a platform operation or a conversion, with its number (see Fault) and text.
 class RuntimeError : public std::runtime_error {
  public:
-  /// With the usual text of `number`.
+  /// With the standard text for `number`.
   explicit RuntimeError(int number) : RuntimeError(number, std::string(Fault::TextOf(number))) {}
   RuntimeError(int number, const std::string& text) : std::runtime_error(text), number_(number) {}
 

@@ -4,18 +4,18 @@
 #include <cstdint>
 #include <vector>
 
-/// Plays one sound at a time on the computer's sound device, which it holds only while it plays. The sound
-/// goes on while events are served (EventPump); its end is noticed there too.
+/// Plays one sound at a time on the computer's sound device, which it holds only while playing. Playback
+/// continues while events are processed (EventPump), and its end is noticed then too.
 class SoundPlayer {
  public:
   virtual ~SoundPlayer() = default;
 
-  /// Starts to play a sound of one channel, 8 bits unsigned a sample (128 is silence), and returns at once. A
-  /// sound that played before is stopped. Throws RuntimeError 68, and then plays nothing, when there is no
-  /// sound device or it cannot be opened for such a sound.
+  /// Starts a mono sound of unsigned 8-bit samples (128 is silence) and returns at once. Stops any sound
+  /// already playing. Throws RuntimeError 68, and plays nothing, if there is no sound device or it cannot be
+  /// opened for this format.
   virtual void Play(std::vector<std::uint8_t> samples, int samplesPerSecond) = 0;
 
-  /// Stops at once and goes back to the start. Does nothing when nothing plays.
+  /// Stops at once and returns to the start. Does nothing when nothing is playing.
   virtual void Stop() = 0;
 
   /// True from Play until the last sample has been heard or Stop was called.

@@ -4,17 +4,17 @@
 #include <string>
 #include <string_view>
 
-/// The byte form of UTF-8, the one place where it is taken apart and put together. Down here because the
-/// databases match texts by it; core/text/TextEncoding.h has what callers above want of a text.
+/// The one place that decodes and encodes UTF-8 characters. In platform/ because the databases use it to
+/// match texts; for callers above, there is core/text/TextEncoding.h.
 namespace Utf8 {
 
-/// False for a byte that goes on with the character before it.
+/// False for a continuation byte.
 constexpr bool StartsCharacter(char byte) {
   return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U;
 }
 
-/// Length of the well-formed character, 1 to 4 bytes, that `text` begins with; 0 when it begins with none, or
-/// is empty. Overlong forms, surrogates and what lies above U+10FFFF are not well-formed.
+/// Length of the well-formed character, 1 to 4 bytes, at the start of `text`; 0 if there is none. Overlong
+/// forms, surrogates and values above U+10FFFF are not well-formed.
 constexpr std::size_t LengthOfCharacter(std::string_view text) {
   const auto byte = [text](std::size_t at) { return static_cast<unsigned char>(text[at]); };
   if (text.empty()) {
@@ -45,7 +45,7 @@ constexpr std::size_t LengthOfCharacter(std::string_view text) {
   return length;
 }
 
-/// The character whose bytes are all of `bytes`, which is well-formed.
+/// Decodes `bytes`, which must be exactly one well-formed character.
 constexpr char32_t CharacterOf(std::string_view bytes) {
   const auto lead = static_cast<unsigned char>(bytes.front());
   char32_t character = bytes.size() == 1 ? lead : lead & (0x7FU >> bytes.size());
@@ -55,7 +55,7 @@ constexpr char32_t CharacterOf(std::string_view bytes) {
   return character;
 }
 
-/// Puts a character up to U+10FFFF, not a surrogate, at the end of `text`.
+/// Appends a character, at most U+10FFFF and not a surrogate, to `text`.
 inline void Append(std::string& text, char32_t character) {
   const auto following = [&text, character](unsigned int shift) {
     text += static_cast<char>(0x80U | ((character >> shift) & 0x3FU));

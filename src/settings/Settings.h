@@ -15,7 +15,7 @@ namespace Ui {
 class Settings;
 }
 
-/// Chooses the serial port by number. The list of ports is for looking only.
+/// Chooses the serial port by number. The list of ports is for display only.
 class Settings : public QDialog {
   Q_OBJECT
 

@@ -8,9 +8,9 @@
 class QAction;
 class QWidget;
 
-/// Gives each control its text of the string table: label, button, group box, or a window its title.
+/// Sets the text of each control from the string table: a label, button or group box, or a window's title.
 void SetCaptions(const StringTable& strings, std::initializer_list<std::pair<QWidget*, int>> captions);
 
-/// The same for menus and their items. Each keeps the letter for the Alt key that it was designed with where
-/// the new text has that letter.
+/// The same for menus and their items. Each keeps the Alt-key letter of its design if the new text has that
+/// letter.
 void SetCaptions(const StringTable& strings, std::initializer_list<std::pair<QAction*, int>> captions);

@@ -4,8 +4,8 @@
 #include <QString>
 #include <utility>
 
-/// Sent to the application when the operator gives a command of any window, before it runs; an event filter
-/// of the application sees all of them.
+/// Sent to the application before the operator's command runs, in any window; an event filter on the
+/// application sees all of them.
 class CommandEvent : public QEvent {
  public:
   /// `name` is the object name of the menu item or button.

@@ -50,13 +50,13 @@ void Commands::Connect(QAbstractButton& button, std::function<void()> command, W
 
 void Commands::Press(QAbstractButton& button, const std::function<void()>& command, WhileBusy whileBusy) {
   if (button.hasFocus()) {
-    // The mouse may have brought the focus here so recently that the check of the entry is still to come.
+    // The mouse may have moved the focus here so recently that the entry's check is still pending.
     if (EntriesHold && !EntriesHold()) {
       return;
     }
   } else {
-    // Keys have brought the focus before the click; so this is a screen reader. The command takes what
-    // stands, and an entry that would otherwise be left by the command itself is left now.
+    // A key moves the focus before the click, so this is a screen reader. The command uses the entries as
+    // they are, and an entry that the command itself would otherwise make the focus leave is left now.
     pressedUnfocused_ = true;
     button.setFocus();
     pressedUnfocused_ = false;
@@ -72,7 +72,7 @@ bool Commands::TakeFocus(QAbstractButton& button) {
   return !EntriesHold || EntriesHold();
 }
 
-// The toolkit presses a button by Return or its Alt key without giving it the focus.
+// The toolkit does not focus a button that is pressed by Return or its Alt key.
 bool Commands::eventFilter(QObject* watched, QEvent* event) {
   if (event->type() == QEvent::Shortcut && !static_cast<QShortcutEvent*>(event)->isAmbiguous()) {
     if (auto* button = qobject_cast<QAbstractButton*>(watched)) {

@@ -14,14 +14,14 @@ class QAbstractButton;
 class QAction;
 class QWidget;
 
-/// What a command does when it is pressed while another one of its window is on the stack.
+/// What a command does when it is given while another command of its window is on the stack.
 enum class WhileBusy {
   Run,    ///< on top of the other one
   Ignore  ///< nothing
 };
 
-/// The commands of one window. A failure in one is reported and ends it. Since a wait in a command serves
-/// events, others can start on top of it; a window that is closed meanwhile goes once the last has unwound.
+/// The commands of one window. A failure in one is reported and ends it. Since a wait in a command processes
+/// events, others can start on top of it; a window closed meanwhile goes away once the last has unwound.
 ///
 /// The window owns this object and asks `MayClose` in its `closeEvent` (a dialog: in its `reject`).
 class Commands : public QObject {
@@ -29,22 +29,22 @@ class Commands : public QObject {
   /// `boxes` must outlive the window.
   Commands(QWidget& window, MessageBoxes& boxes);
 
-  /// Called when the window is to close while commands run, to end their waits. May be called again.
+  /// Called when the window is asked to close while commands run, to end their waits. May be called again.
   std::function<void()> EndWaits;
 
-  /// Called each time when the last command has unwound, before a late close.
+  /// Called each time the last command has unwound, before a delayed close.
   std::function<void()> AllUnwound;
 
-  /// Asked before the command of a button that was pressed, when the button has the focus; false stops the
-  /// command. A press through a screen reader is not asked about.
+  /// Asked before the command of a pressed button that has the focus; false stops the command. Not asked when
+  /// a screen reader presses the button.
   std::function<bool()> EntriesHold;
 
-  /// Runs a command of the operator. Returns false when it failed.
+  /// Runs one of the operator's commands. Returns false if it failed.
   bool Run(const std::function<void()>& command);
 
   void Connect(QAction& action, std::function<void()> command, WhileBusy whileBusy = WhileBusy::Run);
 
-  /// A press of the button by any means gives it the focus first.
+  /// However the button is pressed, it first gets the focus.
   void Connect(QAbstractButton& button, std::function<void()> command, WhileBusy whileBusy = WhileBusy::Run);
 
   /// Actions or buttons with the member functions that they run.
@@ -63,14 +63,14 @@ class Commands : public QObject {
   /// True while a command is on the stack.
   bool Running() const { return running_ > 0; }
 
-  /// True once the window was to close while commands ran; jobs that poll look here.
+  /// True once the window was asked to close while commands run; polling jobs check this.
   bool CloseRequested() const { return closeRequested_; }
 
-  /// True when nothing runs. Else the waits are ended, and the window is closed when the last command has
+  /// True if no command is running. Otherwise ends the waits; the window closes when the last command has
   /// unwound.
   bool MayClose();
 
-  /// True while a button takes the focus that a screen reader pressed: entries are left unchecked then.
+  /// True while a button pressed by a screen reader takes the focus: the entry left is then not checked.
   bool PressedUnfocused() const { return pressedUnfocused_; }
 
   QWidget& Window() const { return window_; }
@@ -87,9 +87,9 @@ class Commands : public QObject {
   }
   void Start(const QObject& control, const std::function<void()>& command, WhileBusy whileBusy);
   void Press(QAbstractButton& button, const std::function<void()>& command, WhileBusy whileBusy);
-  /// Gives the button the focus. Returns false when an entry that is left thereby keeps it.
+  /// Gives the button the focus. Returns false if the entry being left keeps it.
   bool TakeFocus(QAbstractButton& button);
-  /// The button of this table that Return presses now, if any.
+  /// The connected button that Return would press now, if any.
   QAbstractButton* DefaultButton() const;
 
   QWidget& window_;

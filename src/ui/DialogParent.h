@@ -3,7 +3,7 @@
 #include <QPointer>
 #include <QWidget>
 
-/// Knows the window that a box or dialog opened now belongs to.
+/// Knows the parent window for a box or dialog opened now.
 class DialogParent {
  public:
   void SetMainWindow(QWidget* mainWindow) { mainWindow_ = mainWindow; }

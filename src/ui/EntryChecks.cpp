@@ -63,7 +63,7 @@ bool EntryChecks::Holds(QWidget& entry) {
     return true;
   }
   boxes_.Show(fault->Text, fault->Title, fault->Icon);
-  // An entry that the focus was in meanwhile is not left for good.
+  // If the focus was in another entry meanwhile, that one is not checked now.
   returning_ = true;
   entry.setFocus();
   returning_ = false;

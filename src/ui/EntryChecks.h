@@ -13,33 +13,32 @@ class Commands;
 class QAbstractButton;
 class QWidget;
 
-/// The box about an entry that cannot stay as it is.
+/// The box about an invalid entry.
 struct EntryFault {
   std::string Text;
   std::string Title = DefaultBoxTitle;
   BoxIcon Icon = BoxIcon::Critical;
 };
 
-/// The checks that a window makes when its entries are left. A failed one shows its box, puts the focus back
-/// with all selected, and stops the command of the button for which the entry was left. Nothing is checked
-/// when another window or a popup comes to the front, nor when the window goes.
+/// The checks that a window makes when the focus leaves its entries. A failed one shows its box, puts the
+/// focus back with all text selected, and stops the command of the button that took the focus. Nothing is
+/// checked when another window or a popup comes to the front, nor when the window closes.
 class EntryChecks : public QObject {
  public:
-  /// What is wrong with an entry, if anything. One that throws RuntimeError is reported and stops a command,
-  /// too, but the focus stays where it went.
+  /// Returns what is wrong with an entry, if anything. A RuntimeError from it is reported and stops the
+  /// command too, but the focus is not put back.
   using Check = std::function<std::optional<EntryFault>()>;
 
-  /// `commands` are those of the same window. Takes over their `EntriesHold`.
+  /// `commands` are those of the same window. Sets their `EntriesHold`.
   EntryChecks(Commands& commands, MessageBoxes& boxes);
 
   void Add(QWidget& entry, Check check);
 
-  /// An entry may be left for this button without a check: one that never checks (Cancel, Close), or that
-  /// checks by itself.
+  /// Entries may be left for this button without a check: it never checks (Cancel, Close), or does so itself.
   void LeaveFreelyFor(const QAbstractButton& button);
 
-  /// Makes the check of `entry` now, wherever the focus is. Returns false after its box. Throws RuntimeError
-  /// when the check does.
+  /// Checks `entry` now, wherever the focus is. Returns false if the check failed, after its box. Throws
+  /// RuntimeError if the check does.
   bool Holds(QWidget& entry);
 
  protected:
@@ -47,14 +46,14 @@ class EntryChecks : public QObject {
 
  private:
   bool IsLeft(const QEvent& focusOut) const;
-  /// Makes the checks of all entries that were left. Returns false when one failed or is still being made.
+  /// Makes the pending checks of all entries left. Returns false if one failed or a check is still running.
   bool CheckLeft();
 
   Commands& commands_;
   MessageBoxes& boxes_;
   std::map<QObject*, Check> checks_;
   std::vector<const QAbstractButton*> freeButtons_;
-  std::vector<QWidget*> left_;  ///< entries whose check is still to be made, in the order they were left
+  std::vector<QWidget*> left_;  ///< entries whose check is pending, in the order they were left
   bool checking_ = false;
   bool returning_ = false;  ///< the focus is on its way back to an entry
 };

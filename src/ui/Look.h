@@ -1,4 +1,4 @@
 #pragma once
 
-/// Name, icon and style of the application; call once before the first window. Needs a QApplication.
+/// Sets the application's name, icon and style; call once before the first window. Needs a QApplication.
 void PrepareLook();

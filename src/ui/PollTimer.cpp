@@ -16,7 +16,7 @@ void PollTimer::Tick() {
   // Boxes and dialogs are modal for the whole application, whichever window they belong to.
   const QWidget* const modal = QApplication::activeModalWidget();
   const bool isCovered = modal != nullptr && modal != &commands_.Window();
-  // The toolkit keeps a timer from ticking within its own tick, unless the tick starts it anew.
+  // The toolkit keeps a timer from ticking within its own tick, unless the tick restarts it.
   if (ticking_ || isCovered) {
     return;
   }

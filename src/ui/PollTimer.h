@@ -5,12 +5,12 @@
 
 class Commands;
 
-/// A timer of a window whose tick is one of its commands: a failure is reported, and a close waits for the
-/// tick's end. No tick runs while a box or dialog is open in front of the window, nor within another tick;
-/// what falls due meanwhile is left out.
+/// A window's timer whose tick is one of its commands: a failure is reported, and a close waits for the tick
+/// to end. No tick runs while a box or dialog is open in front of the window, nor within another tick; ticks
+/// that fall due meanwhile are skipped.
 class PollTimer : public QTimer {
  public:
-  /// Belongs to the window of `commands`. Not yet started.
+  /// Owned by the window of `commands`. Not yet started.
   PollTimer(Commands& commands, int milliseconds, std::function<void()> tick);
 
  private:

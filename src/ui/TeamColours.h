@@ -6,7 +6,7 @@
 /// Colour of team 1 to 3 (red, blue, yellow).
 QColor TeamColour(int team);
 
-/// That colour laid thinly over `base`, for the background of a row.
+/// A light tint of that colour over `base`, for the background of a row.
 QColor TeamTint(int team, const QColor& base);
 
 /// A round badge in the team's colour.

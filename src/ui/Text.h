@@ -9,7 +9,7 @@ inline QString Text(const StringTable& strings, int number) {
   return QString::fromStdString(strings.Text(number));
 }
 
-/// One of the program's further texts for a control.
+/// One of the program's own texts for a control.
 inline QString Text(const StringTable& strings, OwnText text) {
   return QString::fromStdString(strings.Text(text));
 }

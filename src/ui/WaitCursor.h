@@ -2,7 +2,7 @@
 
 #include <QGuiApplication>
 
-/// The hourglass, as long as it lives.
+/// Shows the hourglass as long as it exists.
 class WaitCursor {
  public:
   WaitCursor() { QGuiApplication::setOverrideCursor(Qt::WaitCursor); }

@@ -18,6 +18,6 @@ consteval std::array<std::uint8_t, 256> BuildCrcTable() {
 
 inline constexpr std::array<std::uint8_t, 256> CrcTable = BuildCrcTable();
 
-/// CRC-8 of `data` continued from `crc`; an empty `data` gives `crc` back. Over data with its own CRC behind
-/// it: 0.
+/// CRC-8 of `data`, continued from `crc`; `crc` itself if `data` is empty. 0 for data followed by its own
+/// CRC.
 std::uint8_t Crc8(std::span<const std::uint8_t> data, std::uint8_t crc = 0);

@@ -8,18 +8,18 @@
 #include "platform/MessageBoxes.h"
 #include "platform/SerialPort.h"
 
-/// The serial line whose number the settings name, and the question to the operator when it does not open.
+/// The serial port chosen in the settings, and the question to the operator if it does not open.
 class CommPort {
  public:
   /// `showSettings` shows the settings window modally.
   CommPort(SerialPort& port, const IniReader& ini, const SerialDevices& devices, MessageBoxes& boxes,
            const StringTable& strings, std::function<void()> showSettings);
 
-  /// Opens the line with `settings` ("19200,N,8,1"). While that fails the operator is asked: OK leads to the
-  /// settings and another try. Returns false once Cancel was pressed.
+  /// Opens the line with `settings` ("19200,N,8,1"). If that fails, the operator is asked: OK shows the
+  /// settings and tries again, Cancel returns false.
   bool OpenCommPort(const std::string& settings);
 
-  /// The device that the settings name now. Throws as CommPortSetting::Device does.
+  /// The device currently chosen in the settings. Throws as CommPortSetting::Device does.
   std::string Device() const { return setting_.Device(); }
 
   void CloseIfOpen();

@@ -9,7 +9,7 @@
 
 namespace {
 
-/// n of a key "com<n>" in plain decimal, 0 when the key is none.
+/// n from a key "com<n>", in plain decimal digits; 0 for any other key.
 std::int16_t PortOfKey(const std::string& key) {
   constexpr std::string_view form = Keys::PortDevice.Key;
   constexpr std::string_view prefix = form.substr(0, form.find('<'));

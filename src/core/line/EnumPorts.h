@@ -8,18 +8,18 @@
 #include "core/data/IniReader.h"
 #include "platform/SerialDevices.h"
 
-/// Serial port numbers: n stands for the device that key "com<n>" of section "ports" names, and without such
-/// a key for the n-th of the machine's ports. The section and the list of ports are read once: make a new one
-/// at the moment of use.
+/// Maps serial port numbers to devices: port n is the device named by key "com<n>" of section "ports" or,
+/// without such a key, the machine's n-th port. The section and the list of ports are read only once, so
+/// create an object for each use.
 class EnumPorts {
  public:
   /// `devices` must outlive this object.
   EnumPorts(const IniReader& ini, const SerialDevices& devices);
 
-  /// True when port `number` stands for a device that exists.
+  /// True if port `number` has a device that exists.
   bool PortExists(std::int16_t number) const;
 
-  /// Path of the device, whether it exists or not; empty when `number` stands for none.
+  /// Path of the device, whether or not it exists; empty if port `number` has none.
   std::string DeviceOf(std::int16_t number) const;
 
  private:

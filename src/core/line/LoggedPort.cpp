@@ -110,7 +110,7 @@ void LoggedPort::ClearInput() {
   Logged([&] { port_.ClearInput(); });
 }
 
-/// Bytes that nobody will take any more tell what went wrong as well as others do.
+/// Logs the bytes that will never be read: they can show what went wrong just as well as others.
 void LoggedPort::LogUnread() {
   log_->EndRow();
   try {
@@ -118,7 +118,7 @@ void LoggedPort::LogUnread() {
       log_->ToHost(port_.Input());
     }
   } catch (const RuntimeError&) {
-    log_->EndRow();  // lost or closed, so there is nothing left; whoever uses the line finds out
+    log_->EndRow();  // lost or closed, so nothing is left; the line's user will find out
   }
   log_->EndRow("dropped");
 }

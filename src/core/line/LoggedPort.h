@@ -11,22 +11,22 @@
 #include "platform/RuntimeError.h"
 #include "platform/SerialPort.h"
 
-/// A serial line that keeps a transcript of each instrument at its far end: bytes in both directions,
-/// openings, changes of the settings, closings and faults. Does just what the line does, whatever becomes of
-/// the transcript.
+/// A serial line that keeps a transcript for each instrument at its far end: bytes in both directions,
+/// openings, changes of the settings, closings and faults. Behaves exactly like the wrapped port, even if the
+/// transcript fails.
 class LoggedPort final : public SerialPort {
  public:
-  /// What transcripts are written with; all outlives the port.
+  /// What transcripts are written with; all must outlive the port.
   struct Parts {
     Files& Disk;
-    std::string Folder;  ///< of the logs; made when needed, but not the one above it
+    std::string Folder;  ///< of the logs; created when needed, but not its parent
     const MonotonicClock& Elapsed;
     const Clock& Time;
-    /// Called after each try to open the line; `fault` is 0 or the number of what went wrong. May be empty.
+    /// Called after each attempt to open the line; `fault` is 0 or the error number. May be empty.
     std::function<void(const std::string& device, const std::string& settings, int fault)> OnOpening = {};
   };
 
-  /// `port` must outlive this object. `instrument` is at its far end until told otherwise.
+  /// `port` must outlive this object. `instrument` is at its far end until SetInstrument names another.
   LoggedPort(SerialPort& port, const Parts& parts, std::string instrument,
              Transcript::Repeats repeats = Transcript::Repeats::Written);
 
@@ -54,7 +54,7 @@ class LoggedPort final : public SerialPort {
   const Transcript::Repeats repeats_;
   std::map<std::string, Transcript> transcripts_;
   std::string nextInstrument_;
-  Transcript* log_;  ///< of the instrument in use
+  Transcript* log_;  ///< transcript of the instrument in use
   int latestFault_ =
       0;  ///< number of the fault that was noted last, since a lost line gives it for each byte
 };

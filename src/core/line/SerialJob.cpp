@@ -6,10 +6,10 @@ namespace {
 
 using std::chrono::milliseconds;
 
-/// A device that is given this long needs it; a shorter pause only paces the bytes.
+/// A pause this long is one that the device needs; a shorter one only paces the bytes.
 constexpr milliseconds ShortestDrainedPause{10};
 
-/// As long as windows may go without being painted.
+/// The longest that windows may go unpainted.
 constexpr milliseconds LongestBlockingPause{50};
 
 }  // namespace

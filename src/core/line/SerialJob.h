@@ -12,9 +12,9 @@
 
 /// How a wait of a job ended.
 enum class LineWait {
-  Met,       ///< with what was waited for
+  Met,       ///< what was waited for happened
   TimedOut,  ///< the limit passed first
-  Stopped,   ///< the job is to end without a word: stopped from outside, or the program closes
+  Stopped,   ///< the job must end silently: stopped from outside, or the program is closing
   Fault      ///< the line failed
 };
 
@@ -24,32 +24,32 @@ struct LineFault {
   RuntimeError Error;
 };
 
-/// One conversation over a serial line: opened here or before, closed in the destructor.
+/// One conversation over a serial line that is opened here or already open, and closed in the destructor.
 ///
-/// Over once it was stopped or its line failed: it then sends nothing more, takes nothing more, and every
-/// wait and pause ends at once. So a routine can go on to its end without looking at each step, and the line
-/// gives one fault and not one for each byte. Other jobs may run in the middle of its waits, on the same port
-/// too; a job whose port was closed or taken over meanwhile finds a fault.
+/// A job is over once it was stopped or its line failed: it then sends and takes nothing more, and every wait
+/// and pause ends at once. So a routine can run to its end without checking each step, and the line gives one
+/// fault, not one per byte. Other jobs may run during its waits, even on the same port; a job whose port was
+/// closed or taken over meanwhile gets a fault.
 class SerialJob {
  public:
   using Milliseconds = std::chrono::milliseconds;
 
-  /// `instrument` names the far end for the log of the line. `stopped` tells in the middle of waits that the
-  /// job is to end; it must depend on what events change. The port may be open already.
+  /// `instrument` names the far end for the line's log. `stopped`, also called during waits, says whether the
+  /// job must end; it must depend on something that an event changes. The port may be open already.
   SerialJob(SerialPort& port, EventPump& events, std::string instrument, std::function<bool()> stopped);
   ~SerialJob();
   SerialJob(const SerialJob&) = delete;
   SerialJob& operator=(const SerialJob&) = delete;
 
-  /// Opens the line, which is closed first when it is open, and begins a new conversation: an old fault is
-  /// forgotten, and so are bytes that waited on the line. Throws as SerialPort::Open does; that is no fault
-  /// of the job.
+  /// Opens the line, closing it first if it is open, and begins a new conversation: an old fault and any
+  /// bytes waiting on the line are discarded. Throws as SerialPort::Open does; that is not a fault of the
+  /// job.
   void Open(const std::string& device, const std::string& settings);
 
   /// Drains the line and closes it. Does nothing when it is closed.
   void Close();
 
-  /// The end of the job leaves the line open for another one, unless the line failed.
+  /// Leaves the line open for another job when this one ends, unless the line failed.
   void LeaveOpen() { leaveOpen_ = true; }
 
   /// Changes the settings of the open line. False when the job is over.
@@ -61,15 +61,16 @@ class SerialJob {
   /// Drops what was received so far.
   void ClearInput();
 
-  /// Pauses. One of 10 ms or more begins when all bytes sent are on the line, a shorter one at once, when the
-  /// last byte was handed over. Up to 50 ms it blocks; a longer one serves events and ends with the job.
+  /// Pauses. A pause of 10 ms or more begins when all bytes have been transmitted, a shorter one at once,
+  /// when the last byte was handed over. Up to 50 ms it blocks; a longer one processes events and ends with
+  /// the job.
   void Pause(Milliseconds time);
 
-  /// A byte that has come in.
+  /// Takes a received byte, if there is one.
   std::optional<std::uint8_t> Take();
 
-  /// Waits until `condition` holds. It is tested first and again after each batch of events, but not once the
-  /// job is over, and may take bytes; what it throws ends the wait.
+  /// Waits until `condition` is true. It is tested first and again after each batch of events, but not once
+  /// the job is over. It may take bytes; an exception from it ends the wait.
   LineWait WaitUntil(const std::function<bool()>& condition, Milliseconds limit);
 
   struct ReceivedByte {
@@ -81,12 +82,13 @@ class SerialJob {
   /// True when the job is over.
   bool Over() const { return fault_ || Stopped(); }
 
-  /// True when the job is to end without a word.
+  /// True when the job must end silently.
   bool Stopped() const { return programCloses_ || stopped_(); }
 
   const std::optional<LineFault>& Fault() const { return fault_; }
 
-  /// The fault, to the first who asks: whoever gets it tells the operator. Nothing once the job was stopped.
+  /// The fault, only for the first caller, who must report it to the operator. Nothing once the job was
+  /// stopped.
   std::optional<LineFault> FaultToTell();
 
  private:

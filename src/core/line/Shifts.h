@@ -16,10 +16,10 @@ consteval std::array<std::int32_t, 32> BuildBitMasks() {
 
 inline constexpr std::array<std::int32_t, 32> BitMasks = BuildBitMasks();
 
-/// `value` shifted left by 0 to 30 bits; bits beyond bit 31 are lost. Throws RuntimeError 9 for another
+/// `value` shifted left by 0 to 30 bits; bits beyond bit 31 are lost. Throws RuntimeError 9 for any other
 /// `shift`.
 std::int32_t ShiftLeft32(std::int32_t value, std::int16_t shift);
 
-/// `value` shifted right by 1 bit or more, zeros coming in. Bit 0 is masked off first, so a shift of 0 clears
-/// it; that shift of a negative value, and a negative shift, throw RuntimeError 11.
+/// `value` shifted right by 1 bit or more, filling with zeros. Bit 0 is masked off first, so a shift of 0
+/// clears it. A shift of 0 of a negative value, and any negative shift, throw RuntimeError 11.
 std::int32_t ShiftRight32(std::int32_t value, std::int16_t shift);

@@ -11,21 +11,21 @@
 #include "core/data/LogRing.h"
 #include "platform/MonotonicClock.h"
 
-/// What passes the line of one instrument, a row each: seconds since the start of the program, the
-/// instrument, "->" for bytes to the host or "<-" for bytes from it, the bytes in hexadecimal, and a note
-/// where one is due; "--" for what is no byte. The simulated venue writes the same rows, so that both logs
-/// can be laid side by side. The time is that of the row's last byte.
+/// The traffic on one instrument's line, in rows: seconds since the start of the program, the instrument,
+/// "->" for bytes to the host or "<-" for bytes from it, the bytes in hexadecimal, and in some rows a note;
+/// "--" marks rows without bytes. The simulated venue writes the same rows, so the two logs can be compared
+/// side by side. The time is that of the row's last byte.
 ///
-/// A row holds bytes of one direction that follow each other within 5 ms, 64 at most. Rows wait in memory
-/// until the conversation ends or 16 KB are full.
+/// A row holds up to 64 bytes of one direction that follow each other within 5 ms. Rows wait in memory until
+/// the conversation ends or they exceed 16 KB.
 class Transcript {
  public:
   static constexpr std::chrono::milliseconds RowGap{5};
   static constexpr std::size_t RowBytes = 64;
   static constexpr std::uint64_t FileBytes = 2U << 20U;
 
-  /// What becomes of a conversation that repeats one of the last four to the byte. Polling a reader is the
-  /// same ten times a second, or in turn as many as there are steps in a walk along its bus.
+  /// What happens to a conversation that repeats one of the last four byte for byte. Polling a reader gives
+  /// the same one ten times a second, or cycles through as many as a walk along its bus has steps.
   enum class Repeats { Written, Counted };
 
   /// `time` must outlive this object.
@@ -38,18 +38,18 @@ class Transcript {
   void ToHost(std::uint8_t byte) { Add('>', byte); }
   void FromHost(std::uint8_t byte) { Add('<', byte); }
 
-  /// Ends the row of bytes, with a note behind them. Does nothing without bytes.
+  /// Ends the row of bytes, with a note after them. Does nothing if there are none.
   void EndRow(std::string_view note = {});
 
-  /// A row without bytes. `detail` stands behind the note but makes no difference between repeats.
+  /// Adds a row without bytes. `detail` follows the note but is ignored when looking for repeats.
   void Note(std::string_view note, std::string_view detail = {});
 
-  /// The conversation is over: writes or counts it.
+  /// Ends the conversation: writes or counts it.
   void End();
 
  private:
-  // Inline, so that it stands beside the code of whoever adds a byte: bytes come so slowly that the
-  // processor's cache has forgotten both in between.
+  // Inline, so that it is next to its caller's code: bytes come so slowly that both have left the processor's
+  // cache in between.
   void Add(char direction, std::uint8_t byte) {
     const auto now = time_.Elapsed();
     if (direction != rowDirection_ || rowSize_ == RowBytes || now - rowTime_ > RowGap) {
@@ -61,7 +61,7 @@ class Transcript {
   void BeginRow(char direction);
   std::string RowStart(std::chrono::microseconds time, std::string_view direction) const;
   void FinishRow(std::string_view note, std::string_view detail = {});
-  /// Tells how often the last conversations were repeated; empty when they were not.
+  /// A row that says how often the last conversations were repeated; empty if they were not.
   std::string RepeatsRow();
   void Write();
 

@@ -10,7 +10,7 @@ QString ShortFormatWithFullYear(const QLocale& locale) {
   return format;
 }
 
-/// The format changed so that one-digit days and months may be written without a zero.
+/// The format changed to accept one-digit days and months without a leading zero.
 QString Lenient(QString form) {
   form.replace(QStringLiteral("dd"), QStringLiteral("d"));
   if (!form.contains(QStringLiteral("MMM"))) {
@@ -19,7 +19,7 @@ QString Lenient(QString form) {
   return form;
 }
 
-/// Two digits of a year in a file's text mean 1930 to 2029.
+/// Two-digit years in files mean 1930 to 2029.
 const QDate EarliestOfFiles(1930, 1, 1);
 
 }  // namespace
@@ -50,7 +50,7 @@ std::string ShortTimeText(const QLocale& locale, QTime time) {
 }
 
 std::string LongDateText(const QLocale& locale, const QString& text) {
-  // The date may have blanks of its own, and so may the time: the longest text that is a date counts.
+  // Both the date and the time may contain spaces, so the longest prefix that is a date counts.
   const QString trimmed = text.trimmed();
   for (auto end = trimmed.size(); end > 0; end = trimmed.lastIndexOf(u' ', end - 1)) {
     if (const QDate date = DateIn(locale, trimmed.left(end), EarliestOfFiles); date.isValid()) {

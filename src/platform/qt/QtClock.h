@@ -6,19 +6,19 @@
 
 #include "platform/Clock.h"
 
-/// `date` in the short form of `locale`, but with all digits of the year.
+/// `date` in the short format of `locale`, but with a four-digit year.
 std::string ShortDateText(const QLocale& locale, QDate date);
 
-/// `time` in the short form of `locale`.
+/// `time` in the short format of `locale`.
 std::string ShortTimeText(const QLocale& locale, QTime time);
 
-/// The date that `text` is as a whole, invalid for none: in the short form of `locale`, with two or four
-/// digits of the year, or year-month-day; zeros in front may be missing. Two digits of a year make a date of
-/// the hundred years from `earliest` on.
+/// Parses all of `text` as a date, in the short format of `locale` with a two- or four-digit year, or as
+/// year-month-day; leading zeros are optional. A two-digit year means the hundred years from `earliest` on.
+/// Invalid if `text` is not a date.
 QDate DateIn(const QLocale& locale, const QString& text, QDate earliest);
 
-/// The date at the start of `text`, in the long form of `locale`; `text` as it stands when there is none.
-/// Dates are read as DateIn reads them; two digits of a year mean 1930 to 2029.
+/// The date at the start of `text`, in the long format of `locale`; `text` unchanged if there is none. Dates
+/// are parsed as by DateIn; two-digit years mean 1930 to 2029.
 std::string LongDateText(const QLocale& locale, const QString& text);
 
 class QtClock : public Clock {

@@ -3,8 +3,8 @@
 #include "platform/EventPump.h"
 #include "platform/MonotonicClock.h"
 
-/// Waits on the toolkit's event loop, asleep in the operating system until an event comes, and tells the time
-/// that passes in waits. Needs a QCoreApplication.
+/// Waits in the toolkit's event loop, asleep in the operating system until an event arrives. Also the
+/// monotonic clock. Needs a QCoreApplication.
 class QtEventPump : public EventPump, public MonotonicClock {
  public:
   void DoEvents() override;
@@ -12,7 +12,7 @@ class QtEventPump : public EventPump, public MonotonicClock {
   void Sleep(std::chrono::milliseconds time) override;
   void EndWaits() override { ended_ = true; }
 
-  /// Since the pump was made.
+  /// Time since this object was created.
   std::chrono::microseconds Elapsed() const override {
     return std::chrono::duration_cast<std::chrono::microseconds>(std::chrono::steady_clock::now() - start_);
   }

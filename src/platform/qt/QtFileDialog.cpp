@@ -9,7 +9,7 @@
 
 namespace {
 
-/// Patterns of one filter; "*.*" stands for all files, also those without a dot.
+/// Patterns of one filter; "*.*" means all files, including those without a dot.
 QStringList PatternsOf(const QString& text) {
   QStringList patterns;
   for (const QString& pattern : text.split(QLatin1Char(';'), Qt::SkipEmptyParts)) {
@@ -19,7 +19,7 @@ QStringList PatternsOf(const QString& text) {
   return patterns;
 }
 
-/// Suffix that a file name typed without one gets under `nameFilter`; empty for all files.
+/// Suffix that `nameFilter` adds to a file name typed without one; empty for all files.
 QString SuffixOf(const QString& nameFilter) {
   static const QRegularExpression first(QStringLiteral("\\(\\*\\.([^ *?)]+)[^(]*\\)$"));
   return first.match(nameFilter).captured(1);
@@ -69,7 +69,7 @@ std::optional<std::string> QtFileDialog::Ask(bool save, const FileRequest& reque
   const QPointer<QFileDialog> dialog = new QFileDialog(parent_());
   dialog->setObjectName(QStringLiteral("CommonDialog1"));
   dialog->setAcceptMode(save ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
-  // A name without a file is for the caller to judge, also when opening.
+  // The caller decides what to do if there is no such file, even when opening.
   dialog->setFileMode(QFileDialog::AnyFile);
   dialog->setOption(QFileDialog::DontUseNativeDialog);
   dialog->setOption(QFileDialog::DontConfirmOverwrite, save);

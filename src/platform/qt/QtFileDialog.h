@@ -8,15 +8,14 @@
 #include "platform/FileDialog.h"
 
 /// The toolkit's name filters for "description|pattern[|description|pattern...]", with patterns such as
-/// "*.bmp;*.jpg". A pattern list at the end of a description is replaced by the pattern's own.
+/// "*.bmp;*.jpg". A pattern list at the end of a description is replaced by the actual pattern.
 QStringList NameFilters(const std::string& filter);
 
-/// The toolkit's own dialogs, not those of a desktop, which look and behave differently from one to the
-/// other. They begin in the folder asked for, else in that of the name, else in the one last chosen from,
-/// else in the user's documents.
+/// The toolkit's own dialogs, since those of desktops each look and behave differently. They start in the
+/// requested folder, else in that of the name, else in that of the last choice, else in the user's documents.
 class QtFileDialog : public FileDialog {
  public:
-  /// `parent` tells the window that one opened now belongs to; it may be none.
+  /// `parent` returns the parent window for a dialog opened now, or null.
   explicit QtFileDialog(std::function<QWidget*()> parent) : parent_(std::move(parent)) {}
 
   std::optional<std::string> ShowOpen(const FileRequest& request) override;

@@ -4,7 +4,7 @@
 
 #include "platform/Folders.h"
 
-/// The folder of the default data files for a program in `executableFolder`: that folder itself when they lie
+/// The folder of the default data files for a program in `executableFolder`: that folder itself if they are
 /// there (build tree), else share/tessarine beside it (installed).
 QString ProgramFolder(const QString& executableFolder);
 

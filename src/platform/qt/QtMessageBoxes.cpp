@@ -7,7 +7,7 @@
 
 namespace {
 
-/// A question that has to be answered: the toolkit would take Escape and the close box for No.
+/// A question that must be answered: the toolkit would treat Escape and the close box as No.
 class QuestionBox : public QMessageBox {
  public:
   explicit QuestionBox(QWidget* parent) : QMessageBox(parent) {

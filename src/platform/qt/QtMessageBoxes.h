@@ -8,7 +8,7 @@
 
 class QtMessageBoxes : public MessageBoxes {
  public:
-  /// `parent` tells the window that one opened now belongs to; it may be none.
+  /// `parent` returns the parent window for a box opened now, or null.
   explicit QtMessageBoxes(std::function<QWidget*()> parent) : parent_(std::move(parent)) {}
 
   BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,

@@ -10,7 +10,7 @@
 
 namespace {
 
-/// Takes the run of digits at the front of `text`, without its leading zeros.
+/// Removes the run of digits at the start of `text` and returns it without leading zeros.
 std::string_view TakeNumber(std::string_view& text) {
   const auto end = std::find_if_not(text.begin(), text.end(), IsDigit);
   std::string_view number = text.substr(0, static_cast<std::size_t>(end - text.begin()));

@@ -2,7 +2,7 @@
 
 #include "platform/SerialDevices.h"
 
-/// Order of names in which runs of digits count as numbers: "ttyS2" is before "ttyS10".
+/// Natural order of names, comparing runs of digits as numbers: "ttyS2" before "ttyS10".
 bool NaturalLess(const std::string& left, const std::string& right);
 
 class QtSerialDevices : public SerialDevices {

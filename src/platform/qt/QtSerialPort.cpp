@@ -19,16 +19,16 @@ namespace {
 
 using LineClock = std::chrono::steady_clock;
 
-/// What the system holds back of the output. Of more bytes than that the first ones are already through.
+/// Size of the system's output buffer. If more bytes than that were written, the first ones have already been
+/// sent.
 constexpr int OutputBufferBytes = 4096;
 
 /// A full output buffer takes 2.1 s at 19200 baud.
 constexpr int LongestOutputMilliseconds = 3000;
 
-/// A second look at a device while it is opened. The system does not hold root to another program's exclusive
-/// mode, and the toolkit enters that mode itself, so it has to be asked for before. Kept until the toolkit
-/// has opened the device, since letting go of the only descriptor drops the control signals that adapters
-/// live on.
+/// Checks a device for another program's exclusive mode before the toolkit opens it: the system does not
+/// enforce that mode for root, and the toolkit then enters it itself. Kept until the toolkit has opened the
+/// device, since closing the only descriptor drops the control signals that power adapters.
 class Probe {
  public:
   explicit Probe(const std::string& device)
@@ -117,7 +117,7 @@ void QtSerialPort::Open(const std::string& device, const std::string& settings) 
     throw RuntimeError(Fault::PortAlreadyOpen);
   }
   if (!port_.open(QIODevice::ReadWrite)) {
-    // "Permission" means a device in use, a locked one, and one that this user may not touch.
+    // A permission error means that the device is in use or locked, or that this user may not open it.
     throw RuntimeError(port_.error() == QSerialPort::PermissionError ? Fault::PortAlreadyOpen
                                                                      : Fault::InvalidPortNumber);
   }
@@ -140,8 +140,8 @@ void QtSerialPort::SetSettings(const std::string& settings) {
   }
 }
 
-// The toolkit's lock file goes stale after half a minute and knows one name of a device only, and the
-// system's exclusive mode does not hold for root.
+// The toolkit's lock file goes stale after half a minute and covers only one name of a device, and the
+// system's exclusive mode does not apply to root.
 void QtSerialPort::TakeExclusively() {
   if (::flock(port_.handle(), LOCK_EX | LOCK_NB) != 0) {
     port_.close();
@@ -175,7 +175,7 @@ bool QtSerialPort::AwaitIdle() const {
   do {
     result = ::tcdrain(port_.handle());
   } while (result != 0 && errno == EINTR);
-  // That returned at once on a pseudo terminal, and early on adapters with a buffer of their own.
+  // tcdrain returns at once on a pseudo terminal, and early on adapters with a buffer of their own.
   std::this_thread::sleep_until(idleAt_);
   return result == 0;
 }
@@ -204,7 +204,7 @@ std::uint8_t QtSerialPort::Input() {
   return byte;
 }
 
-// Written past the toolkit's buffer, which would hold a byte back until the event loop runs.
+// Bypasses the toolkit's buffer, which would hold a byte back until the event loop runs.
 void QtSerialPort::Output(std::uint8_t byte) {
   if (!PortOpen()) {
     throw RuntimeError(Fault::PortNotOpen);
@@ -247,7 +247,7 @@ void QtSerialPort::OnError(QSerialPort::SerialPortError error) {
     Lose();
     return;
   }
-  // Input that was announced and then cleared reads as an error, after which the toolkit does not listen
+  // Input that was announced and then cleared shows up as an error, after which the toolkit reports no input
   // until it is read from.
   TakeReceived();
 }

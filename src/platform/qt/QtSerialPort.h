@@ -9,8 +9,9 @@
 /// A serial line of this machine, or a pseudo terminal. Needs a running event loop to receive.
 ///
 /// When the line is lost the device is closed at once, so that nothing spins on it, but the port counts as
-/// open until Close(): received bytes stay readable, then InBufferCount(), Input() and Output() throw
-/// RuntimeError 8012. A line that takes no byte for 3 s is lost too. Parity is N, E or O in either case.
+/// open until Close(): Output() throws RuntimeError 8012, and so do InBufferCount() and Input() once all
+/// received bytes have been read. A line that accepts no byte for 3 s is lost too. Parity is N, E or O, in
+/// upper or lower case.
 class QtSerialPort final : public SerialPort {
  public:
   QtSerialPort();
@@ -48,6 +49,6 @@ class QtSerialPort final : public SerialPort {
   QSerialPort port_;
   std::deque<std::uint8_t> input_;
   std::chrono::nanoseconds timeOfAByte_{0};
-  std::chrono::steady_clock::time_point idleAt_;  ///< when the bytes put out have had their time on the line
+  std::chrono::steady_clock::time_point idleAt_;  ///< when all bytes sent will have left the line
   bool lost_ = false;
 };
