@@ -114,7 +114,7 @@ BaseUnit::Ending BaseUnit::EndOfCutAnswer() {
   return Ending::Complete;
 }
 
-// False when not all of `bytes` went out: the answer is cut there, or the wait was interrupted.
+// False if not all of `bytes` was sent: the answer is cut here, or the line was interrupted or has ended.
 bool BaseUnit::Send(std::span<const std::uint8_t> bytes, bool isFrame) {
   const std::span<const std::uint8_t> due = bytes.first(std::min(bytes.size(), bytesUntilCut_));
   const std::size_t count = settings_.Answer.Torn ? Line().WriteTorn(due) : Line().Write(due);

@@ -14,34 +14,34 @@
 namespace sim {
 
 struct BaseUnitSettings {
-  BaseUnitAnswer Answer{};  ///< to every request: the unit keeps a game's scores until the next game
+  BaseUnitAnswer Answer{};  ///< sent for every request: the unit keeps a game's scores until the next game
   Pace LinePace = Pace::AsWired;
   int Requests = 0;                       ///< how many to serve before the line ends; 0: any number
-  std::ostream* Log = nullptr;            ///< gets both directions of the line
-  std::ostream* Frames = nullptr;         ///< gets the frames, byte for byte as they were put on the line
-  std::function<void()> OnFinished = {};  ///< called on the unit's thread when it serves no more
+  std::ostream* Log = nullptr;            ///< receives the traffic in both directions
+  std::ostream* Frames = nullptr;         ///< receives the frames, byte for byte as sent
+  std::function<void()> OnFinished = {};  ///< called on the unit's thread once it has stopped serving
 };
 
-/// What has passed the line for one request.
+/// The traffic of one request.
 struct BaseUnitExchange {
   std::vector<std::uint8_t> Sent;                 ///< all bytes, from the noise or count byte on
   std::vector<std::vector<std::uint8_t>> Frames;  ///< as sent; the last may be cut short
   std::vector<std::uint8_t> Replies;              ///< 170 accepted, 0 rejected
 };
 
-/// The unit that collects the guns' scores after a game and hands them over a line of 19200 baud. It serves
-/// from its construction until it has answered `Requests` requests, its line has been pulled out, or its
-/// destruction. While it waits for a reply it also takes a new request and begins again, since a host that
-/// gave up asks anew.
+/// The unit that collects the guns' scores after a game and passes them on over a 19200 baud line. It serves
+/// from construction until it has answered `Requests` requests, its line is pulled out, or it is destroyed.
+/// While waiting for a reply it also accepts a new request and starts over, since a host that gave up asks
+/// again.
 class BaseUnit : public Device {
  public:
   /// Throws std::system_error when the system grants no pseudo terminal. The streams must outlive the unit.
   explicit BaseUnit(BaseUnitSettings settings);
 
-  /// What passed the line for the latest request.
+  /// The traffic of the latest request.
   BaseUnitExchange LatestExchange() const;
 
-  /// Waits until `requests` requests have been answered to their end; false when `limit` passes first.
+  /// Waits until `requests` answers have ended, complete or not; false if `limit` passes first.
   bool WaitUntilServed(int requests, std::chrono::milliseconds limit) const;
 
  private:

@@ -11,7 +11,7 @@ namespace {
 
 constexpr std::size_t MostFrames = 255;
 constexpr std::size_t ExtraStatisticsBytes = 6;
-// A gun's own frame has at most 811 bytes, so every frame passes 1001 with these.
+// A gun's frame has at least 46 bytes without its CRC, so these always take it past 1001.
 constexpr std::size_t ExtraBytesOfAnOverlongFrame = 1000;
 
 std::vector<std::vector<std::uint8_t>> EncodeAll(const std::vector<GunScores>& game,
@@ -33,8 +33,8 @@ void RequirePlace(const std::vector<GunScores>& game, BaseUnitFailure failure, s
   }
 }
 
-// A second run must differ from the first to be told from it, so it borrows the figures of the gun that
-// reports next.
+// A second run must be distinguishable from the first, so it borrows the figures of the gun that reports
+// next.
 GunScores SecondRun(const std::vector<GunScores>& game, std::size_t index) {
   GunScores second = game[(index + 1) % game.size()];
   second.PlayerId = game[index].PlayerId;

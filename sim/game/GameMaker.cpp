@@ -16,7 +16,8 @@ namespace {
 constexpr int MostPlayers = 224;
 constexpr std::size_t GunsOfThirdTeam = 32;
 
-// The standard fixes the numbers of mt19937 but not those of its distributions or of shuffle.
+// The standard defines the output of mt19937 but not that of its distributions or of std::shuffle, and a seed
+// must give the same game on every machine.
 class Dice {
  public:
   explicit Dice(std::uint32_t seed) : engine_(seed) {}
@@ -48,7 +49,7 @@ struct Gun {
 };
 
 std::vector<Gun> AllGunsOf(std::size_t team) {
-  // The three top bits of a player id (1 to 7) name a block of 32 guns.
+  // The top three bits of a player id (1 to 7) select a block of 32 guns.
   constexpr std::array<std::size_t, 7> teamOfBlock{0, 1, 2, 0, 0, 1, 1};
   std::vector<Gun> guns;
   for (std::size_t id = 32; id < 256; ++id) {
@@ -74,7 +75,7 @@ std::vector<Gun> DrawGuns(std::size_t players, Dice& dice) {
   return drawn;
 }
 
-// The player id within the serial number keeps the ids of one game apart.
+// The player id in the serial number makes button ids unique within a game.
 std::array<std::uint8_t, 8> DrawButton(std::uint8_t playerId, Dice& dice) {
   constexpr std::uint8_t membershipFamily = 0x01;
   std::array<std::uint8_t, 8> id{membershipFamily, 0, 0, 0, playerId, 0, 0, 0};
@@ -109,7 +110,7 @@ GunScores DrawGun(const Gun& gun, int gameMinutes, Dice& dice) {
   return scores;
 }
 
-// Row: who was hit; column: who fired. Points of damage.
+// Damage points by player hit (row) and shooter (column).
 using DamageTable = std::vector<std::vector<int>>;
 
 struct Targets {
@@ -127,7 +128,7 @@ Targets TargetsOf(std::size_t shooter, const std::vector<Gun>& guns) {
   return targets;
 }
 
-// A player hits in bursts: some shots in a row on the one who stands before him.
+// Hits come in bursts: several in a row on the same target.
 void PlayBursts(std::size_t shooter, const std::vector<Gun>& guns, const GunScores& scores,
                 DamageTable& damage, Dice& dice) {
   Targets targets = TargetsOf(shooter, guns);

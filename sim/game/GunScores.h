@@ -6,7 +6,7 @@
 
 namespace sim {
 
-/// What one shooter did to the gun that reports.
+/// What one shooter did to the reporting gun.
 struct Hit {
   std::uint8_t Shooter = 0;  ///< player id, 32 to 255
   std::uint16_t Amount = 0;  ///< damage points
@@ -14,8 +14,8 @@ struct Hit {
   bool operator==(const Hit&) const = default;
 };
 
-/// What a gun hands to the base unit after a game. A believable word stays below 32768; the field's software
-/// reads words as signed.
+/// What a gun hands to the base unit after a game. Plausible words stay below 32768: the software in the
+/// field reads them as signed.
 struct GunScores {
   std::uint8_t PlayerId = 32;  ///< 32 to 255
   std::uint16_t ShotCount = 0;
@@ -31,8 +31,8 @@ struct GunScores {
   std::uint16_t RemainingHealth = 0;
   std::uint16_t RemainingClips = 0;
   std::uint16_t RemainingAmmo = 0;
-  std::uint16_t SecondaryDamage = 0;  ///< points of one hit
-  std::uint16_t PrimaryDamage = 0;    ///< points of one hit
+  std::uint16_t SecondaryDamage = 0;  ///< points per hit
+  std::uint16_t PrimaryDamage = 0;    ///< points per hit
   std::uint16_t RunCounter = 0;       ///< minutes
   std::uint8_t PowerCheatFlag = 0;
   std::vector<Hit> Hits;  ///< at most 255, one for each shooter

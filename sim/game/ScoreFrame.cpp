@@ -8,13 +8,13 @@ namespace sim {
 namespace {
 
 constexpr std::size_t CounterBytes = 18;
-// Player id and the byte that tells the length of the statistics block.
+// Player id and the length byte of the statistics block.
 constexpr std::size_t RecordHeadBytes = 2;
 // Button id, six words and the flag.
 constexpr std::size_t ClosingBytes = 8 + 12 + 1;
 constexpr std::size_t LengthWordsBytes = 4;
 constexpr std::size_t HitBytes = 3;
-// Neither 0 nor a likely count, so that a reader that takes it for data is noticed.
+// Neither 0 nor a plausible count, so that a reader that mistakes it for data is caught.
 constexpr std::uint8_t Filler = 0xEE;
 
 std::uint8_t LowByte(std::size_t word) {

@@ -8,10 +8,10 @@
 
 namespace sim {
 
-/// What the number that goes with a failure counts, from 1. None: the failure does not look at it.
+/// What the number given with a failure counts, from 1. None: the failure ignores it.
 enum class FailurePlace { None, Frame, Byte, Bit, Gun };
 
-/// A row of a device's table of failures. Each device has an enumeration `Kind` of its own, in which 0 is the
+/// A row of a device's table of failures. Each device has its own enumeration `Kind`, in which 0 is the
 /// faultless device, and a table that has every failure once, in the order of the enumeration.
 template <class Kind>
 struct FailureInfo {
@@ -21,7 +21,7 @@ struct FailureInfo {
   std::string_view Meaning;
 };
 
-/// To be asserted of every table, since its place in the table gives a failure its number.
+/// To be asserted for every table: a failure's number is its row.
 template <class Info, std::size_t Count>
 constexpr bool IsInOrder(const std::array<Info, Count>& table) {
   for (std::size_t i = 0; i < Count; ++i) {
@@ -32,14 +32,14 @@ constexpr bool IsInOrder(const std::array<Info, Count>& table) {
   return true;
 }
 
-/// A row of any table.
+/// A row of any device's table.
 struct FailureRow {
   std::string_view Name;
   FailurePlace Place;
   std::string_view Meaning;
 };
 
-/// A table without its enumeration, for those who serve all devices alike.
+/// A table stripped of its enumeration, for code that treats all devices alike.
 template <class Info, std::size_t Count>
 std::vector<FailureRow> FailureRows(const std::array<Info, Count>& table) {
   std::vector<FailureRow> rows(Count);

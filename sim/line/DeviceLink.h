@@ -4,12 +4,12 @@
 
 namespace sim {
 
-/// A symbolic link that gives a simulated device a lasting name for as long as the object lives.
+/// A symbolic link that gives a simulated device a fixed name while this object exists.
 class DeviceLink {
  public:
-  /// Takes the place of a link left at `path`, but of nothing else. Throws std::filesystem::filesystem_error.
+  /// Replaces a symbolic link left at `path`, but nothing else. Throws std::filesystem::filesystem_error.
   DeviceLink(std::filesystem::path path, std::filesystem::path device);
-  /// Removes the link unless it has come to lead elsewhere.
+  /// Removes the link unless it points elsewhere by now.
   ~DeviceLink();
   DeviceLink(const DeviceLink&) = delete;
   DeviceLink& operator=(const DeviceLink&) = delete;

@@ -5,16 +5,16 @@
 
 namespace sim {
 
-/// Cuts what comes in over a file descriptor into lines.
+/// Splits the input from a file descriptor into lines.
 class LineInput {
  public:
-  /// `descriptor` stays the caller's.
+  /// The caller keeps ownership of `descriptor`.
   explicit LineInput(int descriptor) : descriptor_(descriptor) {}
 
-  /// Waits for input unless some is there and returns the lines that it completes, without their ends; at the
-  /// end of the input also a last line that has none.
+  /// Waits for input if there is none and returns the lines that it completes, without their line ends; at
+  /// the end of the input also a last line that lacks one.
   std::vector<std::string> Read();
-  /// No more will come.
+  /// True once the end of the input was reached.
   bool HasEnded() const { return ended_; }
 
  private:

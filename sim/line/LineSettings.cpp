@@ -1,6 +1,6 @@
 #include "sim/line/LineSettings.h"
 
-// The kernel's own header, which excludes <termios.h>: it alone tells the speed as a number.
+// The kernel's own header, which cannot be combined with <termios.h>: only it has the speed as a number.
 #include <asm/termbits.h>
 #include <sys/ioctl.h>
 

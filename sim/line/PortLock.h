@@ -8,10 +8,9 @@
 
 namespace sim {
 
-/// Waits until nobody holds the lock file of a new pseudo terminal, at most 1 s. The system gives the number
-/// of one again as soon as it is closed, which is a moment before a program that had it open lets go of its
-/// lock
-/// (/var/lock/LCK..<device>, as the Filesystem Hierarchy Standard has it).
+/// Waits, at most 1 s, until a new pseudo terminal has no lock file. The system reuses a terminal's number as
+/// soon as it is closed, a moment before the program that had it open removes its lock
+/// (/var/lock/LCK..<device>, as in the Filesystem Hierarchy Standard).
 inline void AwaitPortUnlocked(const std::string& device) {
   const std::string devices = "/dev/";
   std::string name = device.starts_with(devices) ? device.substr(devices.size()) : device;

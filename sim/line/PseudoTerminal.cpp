@@ -144,7 +144,7 @@ bool PseudoTerminal::WaitForClientToClose(std::chrono::milliseconds limit) {
 void PseudoTerminal::Interrupt() {
   interrupted_ = true;
   const char wake = 0;
-  // The byte stays in the pipe for good. A full pipe wakes just as well, so the result does not matter.
+  // The byte is never read, so later waits end too. A full pipe wakes just as well: the result is irrelevant.
   [[maybe_unused]] const ssize_t written = ::write(wakeWriter_.Get(), &wake, 1);
 }
 
@@ -158,7 +158,7 @@ std::chrono::nanoseconds PseudoTerminal::DurationOf(std::size_t bytes) const {
       (static_cast<std::int64_t>(bytes) * nanosecondsOfTenBits + current_.Baud - 1) / current_.Baud);
 }
 
-// Notes when the bytes that have come will be through. False when the line has ended.
+// Queues the bytes that have come, with the time at which each is through. False if the line has ended.
 bool PseudoTerminal::TakeArrivals() {
   std::array<std::uint8_t, 256> bytes{};
   for (;;) {
@@ -177,7 +177,7 @@ bool PseudoTerminal::TakeArrivals() {
   }
 }
 
-// True when the settings at which `bytes` have come are understood; they are current then.
+// True if the settings at which `bytes` came are understood; they then become the current ones.
 bool PseudoTerminal::Understands(std::span<const std::uint8_t> bytes) {
   const LineSettings host = ReadLineSettings(master_.Get());
   if (std::find(understood_.begin(), understood_.end(), host) != understood_.end()) {
@@ -192,7 +192,7 @@ bool PseudoTerminal::Understands(std::span<const std::uint8_t> bytes) {
   return false;
 }
 
-// True when one of `events`, or the client's closing, came before the time-out and no interruption did.
+// True if one of `events`, or the client closing, came before the timeout without an interruption.
 bool PseudoTerminal::WaitFor(short events, std::optional<std::chrono::nanoseconds> timeout) {
   const Clock::time_point deadline = Clock::now() + timeout.value_or(std::chrono::nanoseconds(0));
   while (IsUp()) {

@@ -17,64 +17,64 @@
 
 namespace sim {
 
-/// How fast bytes pass a line: as its baud rate has it, or as fast as the machine can.
+/// How fast bytes travel: at the line's baud rate, or as fast as the machine can.
 enum class Pace { AsWired, Fast };
 
-/// A device's end of a serial line, 10 bits a byte. The other end is a slave device that a client opens by
-/// its path; the client may close and open it again without the line breaking. One thread uses it; only
+/// A device's end of a serial line, 10 bits per byte. The other end is a slave device that a client opens by
+/// its path; the client may close and reopen it without breaking the line. For use by one thread; only
 /// Interrupt may be called from another.
 ///
-/// Bytes of a client whose settings are none of those understood never arrive. A real line would turn them
-/// into noise; silence has the advantage that no noise can happen to be a request or an answer, so that such
-/// a client fails always and in the same way. The settings are looked at when the bytes are taken, so a
-/// client must not change them before its bytes have had their time on the line. The terminal begins with the
-/// first settings understood: a client that sets none finds those, or what the client before it has left.
+/// Bytes from a client whose settings are not among those understood never arrive. A real line would turn
+/// them into noise; with silence, nothing can pass for a request or a reply by chance, so such a client
+/// always fails, and always in the same way. The settings are checked when the bytes are taken, so a client
+/// must not change them before its bytes have had their time on the line. The terminal starts with the first
+/// of the understood settings: a client that sets none gets those, or whatever the client before it left.
 class PseudoTerminal {
  public:
   /// A device that understands 8 data bits without parity at `baud`. Throws std::system_error when the system
   /// grants no pseudo terminal.
   PseudoTerminal(int baud, Pace pace);
-  /// A device that understands each of `understood` (one at least) and answers as it was spoken to; the first
-  /// until then. Throws like the other.
+  /// A device that understands each of `understood` (at least one) and answers at the settings the client
+  /// last used; until then, at the first. Throws like the other.
   PseudoTerminal(std::vector<LineSettings> understood, Pace pace);
 
   using Clock = std::chrono::steady_clock;
 
   const std::string& SlavePath() const { return slavePath_; }
 
-  /// From now on the device understands `baud` alone, without parity, and bytes pass at that.
+  /// From now on the device understands only `baud`, 8 data bits, no parity; bytes travel at that speed.
   void SetBaud(int baud) { SetUnderstood({{.Baud = baud}}); }
-  /// As SetBaud, with each of `understood`; bytes pass at the first until the client has spoken.
+  /// As SetBaud, for each of `understood`; bytes travel at the first until the client sends some.
   void SetUnderstood(std::vector<LineSettings> understood);
   const std::vector<LineSettings>& Understood() const { return understood_; }
-  /// Those understood ones at which the client has spoken last; the first of them until it has.
+  /// The understood settings that the client last used; the first of them until it has sent something.
   const LineSettings& Current() const { return current_; }
 
-  /// `begin`: a run of bytes at these settings of the host begins.
+  /// `begin`: `bytes` start a run at the settings `host`.
   using ForeignBytes =
       std::function<void(const LineSettings& host, std::span<const std::uint8_t> bytes, bool begin)>;
-  /// `told` is called with bytes that did not arrive for their settings' sake.
+  /// `told` is called with bytes that were dropped because of their settings.
   void OnForeignBytes(ForeignBytes told) { onForeignBytes_ = std::move(told); }
 
   /// False after an interruption or the end of the line.
   bool IsUp() const { return !interrupted_ && master_.IsOpen(); }
 
-  /// What the line needs for `bytes` bytes; nothing when it is not paced.
+  /// Time that `bytes` bytes take on the line; 0 if it is not paced.
   std::chrono::nanoseconds DurationOf(std::size_t bytes) const;
 
-  /// The next byte from the client, once its last bit is through; none after `timeout` (for ever without
-  /// one), an interruption or the end of the line. Bytes that the client wrote at once follow each other
-  /// without a gap, however late they are asked for.
+  /// The next byte from the client, once its last bit has arrived; none after `timeout` (if given), an
+  /// interruption or the end of the line. Bytes that the client wrote together follow each other without a
+  /// gap, however late they are read.
   std::optional<std::uint8_t> ReadByte(std::optional<std::chrono::nanoseconds> timeout = std::nullopt);
 
-  /// Sends `bytes` back to back and returns when the last one is through. A byte never arrives before its
-  /// last bit would, and lateness of one does not delay those behind it. Returns how many went out: fewer
-  /// than all only after an interruption or the end of the line.
+  /// Sends `bytes` back to back and returns once the last one is through. No byte arrives before its last bit
+  /// would, and a late byte does not delay the ones after it. Returns how many were sent: fewer than all only
+  /// after an interruption or the end of the line.
   std::size_t Write(std::span<const std::uint8_t> bytes);
 
   /// Hands `bytes` to the client at once, for callers that keep the line's pace themselves and must go on
-  /// reading meanwhile. What a client that does not read has no room for is lost, as on a line without flow
-  /// control. Returns how many went out.
+  /// reading meanwhile. If the client does not read, what exceeds its buffer is lost, as on a line without
+  /// flow control. Returns how many were sent.
   std::size_t Put(std::span<const std::uint8_t> bytes);
 
   /// As Write, but in pieces of one to three bytes with pauses between them.
@@ -87,13 +87,13 @@ class PseudoTerminal {
   /// `limit`.
   bool WaitForClientToClose(std::chrono::milliseconds limit);
 
-  /// Makes a wait that is under way, and all later ones, return at once.
+  /// Makes the current wait and all later ones return at once.
   void Interrupt();
 
  private:
   struct Arrival {
     std::uint8_t Byte;
-    Clock::time_point Through;  // when its last bit is
+    Clock::time_point Through;  // when its last bit has arrived
   };
 
   bool IsPaced() const { return pace_ == Pace::AsWired; }

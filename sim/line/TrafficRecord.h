@@ -6,7 +6,7 @@
 
 namespace sim {
 
-/// What a device notes on its own thread for others to read and wait for.
+/// What a device records on its own thread, for others to read and wait for.
 template <class Traffic>
 class TrafficRecord {
  public:

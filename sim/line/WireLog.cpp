@@ -42,7 +42,7 @@ void WireLog::Row(std::string_view direction, std::span<const std::uint8_t> byte
     row << ' ' << note;
   }
   row << '\n';
-  // Devices on threads of their own may share the stream.
+  // Devices on different threads may share the stream.
   std::osyncstream(*out_) << row.str() << std::flush;
 }
 

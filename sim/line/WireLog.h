@@ -9,10 +9,9 @@
 
 namespace sim {
 
-/// What passed a device's line, a row each: seconds since the log began, the device, "->" for bytes to the
-/// host or
-/// "<-" for bytes from it, the bytes in hexadecimal, and a note where one is due. The time is that of the
-/// last byte.
+/// The traffic of a device's line, row by row: seconds since the log began, the device, "->" for bytes to the
+/// host or "<-" for bytes from it ("--" without bytes), the bytes in hexadecimal, and a note if there is one.
+/// The time is that of the last byte.
 class WireLog {
  public:
   /// Without a stream nothing is written. `out` must outlive the log; logs of several devices may share it.

@@ -9,7 +9,7 @@ constexpr std::uint8_t DataMode = 0xE1;
 constexpr std::uint8_t CommandMode = 0xE3;
 constexpr std::uint8_t EndOfPulse = 0xF1;
 
-// Commands that make bus cycles are 1ffp ss?1: function f, polarity or parameter p, speed s.
+// Commands that cause bus cycles are 1ffp ss?1: function f, polarity or parameter p, speed s.
 constexpr unsigned FunctionMask = 0xE1;
 constexpr unsigned SingleBitFunction = 0x81;
 constexpr unsigned SearchAcceleratorFunction = 0xA1;
@@ -78,7 +78,7 @@ std::optional<std::uint8_t> Ds2480b::Obey(std::uint8_t command) {
   return std::nullopt;
 }
 
-// 0pppvvv1 gives parameter p the value v; 0000ppp1 asks for the value.
+// 0pppvvv1 sets parameter p to the value v; 0000ppp1 reads the value of p.
 std::uint8_t Ds2480b::Configure(std::uint8_t command) {
   const std::size_t parameter = command >> 4U & 7U;
   const std::uint8_t value = command >> 1U & 7U;
@@ -140,8 +140,8 @@ std::uint8_t Ds2480b::Pass(std::uint8_t data) {
   return static_cast<std::uint8_t>(heard);
 }
 
-// Four ROM bits: the host sends the wanted direction of each in the odd bits, and gets there the direction
-// taken, and in the even bits whether there was a choice or no answer at all.
+// Four ROM bits. The host sends the direction wanted for each in the odd bits; the answer has the direction
+// taken in the odd bits and, in the even ones, whether there was a conflict or no response at all.
 std::uint8_t Ds2480b::PassSearch(std::uint8_t directions) {
   unsigned answer = 0;
   for (unsigned place = 0; place < 8; place += 2) {
@@ -156,7 +156,7 @@ std::uint8_t Ds2480b::PassSearch(std::uint8_t directions) {
   return static_cast<std::uint8_t>(answer);
 }
 
-// Behind a bit or byte: its own answer is out already, and only an endless pull-up has one of its own.
+// Follows a bit or byte, which is answered anyway; only an endless pull-up has an answer of its own.
 void Ds2480b::PullUp() {
   if (parameters_[StrongPullUp] == Endless) {
     endlessPulse_ = static_cast<std::uint8_t>(PulseFunction & 0xFCU);

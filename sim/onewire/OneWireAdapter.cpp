@@ -115,7 +115,7 @@ bool OneWireAdapter::Send(std::uint8_t answer) {
   return sent == bytes.size();
 }
 
-// What hangs on the bus while the button `rom` is held to the reader.
+// The buttons on the bus while `rom` is held to the reader.
 std::vector<RomId> OneWireAdapter::OnTheBus(const RomId& rom) const {
   if (Fails(OneWireFailure::WrongCrc)) {
     RomId wrong = rom;

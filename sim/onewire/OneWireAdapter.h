@@ -18,21 +18,20 @@ struct OneWireAdapterSettings {
   OneWireFailure Failure = OneWireFailure::None;
   std::size_t FailurePlace = 1;  ///< byte (from 1) or bit (1 to 64) that the failure concerns
   Pace LinePace = Pace::AsWired;
-  std::ostream* Log = nullptr;  ///< gets both directions of the line
+  std::ostream* Log = nullptr;  ///< receives the traffic in both directions
 };
 
-/// The reader of membership buttons at the operator's desk: a DS2480B on a serial line that begins at 9600
-/// baud, with an identity device of its own on the bus. It is powered up once, at its construction: a host
-/// that goes and comes back finds the chip as it left it. It serves until its line has been pulled out or its
-/// destruction. On the line it takes and gives bytes in turn, so a block takes up to twice as long as on a
-/// real line.
+/// The reader of membership buttons at the operator's desk: a DS2480B on a serial line that starts at 9600
+/// baud, with an identity device of its own on the bus. It is powered up once, at construction: a host that
+/// goes away and comes back finds the chip as it left it. It serves until its line is pulled out or it is
+/// destroyed. It receives and sends in turn, so a block takes up to twice as long as on a real line.
 class OneWireAdapter : public Device {
  public:
   /// Throws std::invalid_argument when the failure has no such place, std::system_error when the system
   /// grants no pseudo terminal. The log must outlive the adapter.
   explicit OneWireAdapter(OneWireAdapterSettings settings);
 
-  /// Holds a button to the reader until it leaves. One that is there already stays.
+  /// Holds a button to the reader until it leaves. No effect on one that is there already.
   void Touch(const RomId& rom);
   /// False when no such button is at the reader.
   bool Leave(const RomId& rom);

@@ -10,27 +10,27 @@ namespace sim {
 
 struct OneWireBusSettings {
   std::optional<RomId> OwnDevice{};  ///< soldered to the bus
-  bool Shorted = false;              ///< data line and ground touch
-  /// Buttons lose their contact after that many bits of a ROM number, 1 to 64, until the next reset pulse.
+  bool Shorted = false;              ///< data line shorted to ground
+  /// Buttons lose contact after this many bits of a ROM number, 1 to 64, until the next reset pulse.
   std::optional<std::size_t> ContactLostAfterBits{};
 };
 
-/// The one data line with all that hangs on it. The line is high only as long as nobody pulls it low.
+/// The data line with everything connected to it. It is high only while nobody pulls it low.
 class OneWireBus {
  public:
   enum class Presence { Shorted, Present, Absent };
 
   explicit OneWireBus(OneWireBusSettings settings = {});
 
-  /// A reset pulse, and what is on the line behind it.
+  /// Sends a reset pulse and returns what responds.
   Presence Reset();
-  /// One time slot in which the master releases the line (`level`, which is how it reads) or pulls it low.
-  /// Returns the level that all hear.
+  /// One time slot, in which the master releases the line (`level` is true, also for reading) or pulls it
+  /// low. Returns the level that everyone sees.
   bool Slot(bool level);
 
-  /// A button comes to the bus; one that is there already stays. It takes part from the next reset pulse on.
+  /// Puts a button on the bus; it takes part from the next reset pulse on. No effect on one already there.
   void Touch(const RomId& rom);
-  /// False when no such button was touched.
+  /// False if no such button is on the bus.
   bool Leave(const RomId& rom);
   void LeaveAll();
 

@@ -7,8 +7,8 @@
 
 namespace sim {
 
-/// A device on a 1-Wire bus, time slot by time slot: the commands that read, find and select ROM numbers.
-/// What a selected device is asked beyond that, it leaves unanswered, and so it does any other command.
+/// A device on a 1-Wire bus, time slot by time slot: the ROM commands read, match, skip and search. It does
+/// not respond to any other command, nor to anything sent to it once selected.
 class OneWireDevice {
  public:
   /// Deaf until the first reset pulse.
@@ -18,7 +18,7 @@ class OneWireDevice {
 
   /// A reset pulse has passed: the next eight slots carry a ROM command.
   void Reset();
-  /// Loses the contact; back at the next reset pulse.
+  /// Loses contact until the next reset pulse.
   void LoseContact() { state_ = State::Deaf; }
 
   /// Whether the device leaves the line high in the coming slot.
@@ -26,7 +26,7 @@ class OneWireDevice {
   /// The slot has passed with `level` on the line.
   void Slot(bool level);
 
-  /// Whether the device, as the one that was meant, takes what follows for a command to itself.
+  /// Whether the device has been selected, so that what follows is addressed to it.
   bool IsSelected() const { return state_ == State::Selected; }
 
   /// Bits of its ROM number that the device has put on the line since the reset pulse, 0 to 64.

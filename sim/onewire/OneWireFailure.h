@@ -23,7 +23,7 @@ enum class OneWireFailure {
 
 using OneWireFailureInfo = FailureInfo<OneWireFailure>;
 
-/// Answer bytes count from the start of the adapter.
+/// Answer bytes are counted from the adapter's start.
 inline constexpr std::array<OneWireFailureInfo, 11> OneWireFailures{{
     {OneWireFailure::None, "none", FailurePlace::None, "a faultless adapter"},
     {OneWireFailure::Silence, "silence", FailurePlace::Byte, "answer byte K and all behind it stay away"},

@@ -9,7 +9,7 @@ constexpr std::size_t HeaderBytes = 5;
 constexpr std::uint8_t SearchType = 6;
 constexpr std::uint8_t CommandType = 4;
 constexpr std::uint8_t LowestPlayerId = 32;
-// A radio frame holds 100 data bytes; 8 stand before a block.
+// A radio frame holds 100 data bytes, 8 of them ahead of the block.
 constexpr std::uint8_t LongestBlock = 92;
 
 std::uint64_t Reversed(std::uint64_t address) {

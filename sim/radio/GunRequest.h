@@ -16,16 +16,16 @@ enum class GunCommand { Search, Size, Block, Close };
 struct GunRequest {
   GunCommand Command = GunCommand::Search;
   std::uint8_t PlayerId = 0;
-  std::uint8_t Start = 0;  ///< of a block
-  std::uint8_t Count = 0;  ///< of a block's bytes
+  std::uint8_t Start = 0;  ///< of a block, offset in the scores
+  std::uint8_t Count = 0;  ///< of a block, in bytes
 
   bool operator==(const GunRequest&) const = default;
 };
 
-/// What `transmit` asks of one of `guns`. A fault unless every byte of the packet is as it must be: its
-/// length, the two zeros, type and command with their arguments, a search to all and a command to the address
-/// of the gun that it names, a block within that gun's scores and a frame. A search may be for a gun that is
-/// not there.
+/// What `transmit` asks of one of `guns`, or a fault if any part of the packet is wrong: its length, the two
+/// zeros, type and command with their arguments, the destination (everyone for a search, the address of the
+/// gun it names for a command), or a block that exceeds that gun's scores or a frame. A search may be for a
+/// gun that is not there.
 std::variant<GunRequest, HostFault> ReadGunRequest(const TransmitRequest& transmit,
                                                    std::span<const RadioGun> guns);
 

@@ -7,7 +7,7 @@ namespace {
 
 constexpr std::uint8_t ReceivedFrom64 = 0x80;
 constexpr std::uint8_t SignalStrength = 0x28;  // -40 dBm
-// A total is told in units of 255, not 256.
+// A total is split into units of 255, not 256.
 constexpr std::size_t TotalFactor = 255;
 
 std::vector<std::uint8_t> Packet(const RadioGun& gun, std::uint8_t type,

@@ -9,10 +9,10 @@
 
 namespace sim {
 
-/// The packet with which `gun` answers `request`, which must be one of its own.
+/// The packet with which `gun` answers `request`, which must be addressed to it.
 std::vector<std::uint8_t> AnswerPacket(const RadioGun& gun, const GunRequest& request);
 
-/// A modem's frame with `body`: start byte, length, body, checksum.
+/// A modem's frame around `body`: start byte, length, body, checksum.
 std::vector<std::uint8_t> EncodeModemFrame(std::span<const std::uint8_t> body);
 
 /// The modem's frame for `packet`, received from `address`.

@@ -39,7 +39,7 @@ enum class RadioFailure {
 };
 
 struct RadioFailureInfo : FailureInfo<RadioFailure> {
-  std::optional<GunCommand> Concerned;  ///< the one command whose answers it strikes; none: all
+  std::optional<GunCommand> Concerned;  ///< the only command whose answers it strikes; none: all
 };
 
 inline constexpr std::array<RadioFailureInfo, 26> RadioFailures{{

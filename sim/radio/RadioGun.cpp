@@ -8,10 +8,11 @@
 namespace sim {
 namespace {
 
-// Every code that has a name, so that a field of 27 guns shows each once.
+// Every code that has a name; 27 consecutive player ids show each once.
 constexpr std::array<std::uint8_t, 27> Weapons{0,  1,  2,  3,  4,   5,   6,   7,   8,   9,   10,  11,  12, 13,
                                                14, 15, 16, 17, 100, 101, 102, 103, 104, 105, 106, 107, 108};
-// The maker's part of a radio's address; the 0x7E in the serial number is data, whatever it looks like.
+// The radios' addresses begin with the manufacturer's part. The 0x7E in the serial number looks like a start
+// byte but is data.
 constexpr std::uint64_t AddressBase = 0x0013A200'407E0000;
 
 }  // namespace

@@ -8,7 +8,7 @@
 
 namespace sim {
 
-/// A gun as the radio knows it.
+/// A gun as seen over the radio.
 struct RadioGun {
   std::uint8_t PlayerId = 32;  ///< 32 to 255
   std::uint64_t Address = 0;   ///< of its radio
@@ -21,7 +21,7 @@ struct RadioGun {
   std::chrono::microseconds AnswerTime{5000};  ///< from the last bit of a request to the first of the answer
 };
 
-/// The guns of `game` in the order of their player ids. Address, firmware, battery and weapon hang on the
+/// The guns of `game` in the order of their player ids. Address, firmware, battery and weapon depend on the
 /// player id alone.
 std::vector<RadioGun> MakeRadioGuns(const std::vector<GunScores>& game,
                                     std::chrono::microseconds answerTime = std::chrono::milliseconds(5));

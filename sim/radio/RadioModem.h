@@ -21,21 +21,22 @@ struct RadioModemSettings {
   std::vector<RadioGun> Guns{};  ///< those in range; distinct player ids and addresses
   RadioTroubleSettings Trouble{};
   Pace LinePace = Pace::AsWired;
-  std::ostream* Log = nullptr;     ///< gets both directions of the line
-  std::ostream* Frames = nullptr;  ///< gets a gun's scores, CRC included, when they are first closed
+  std::ostream* Log = nullptr;     ///< receives the traffic in both directions
+  std::ostream* Frames = nullptr;  ///< receives a gun's scores, CRC included, when first closed
 };
 
-/// What has passed the line.
+/// The traffic so far.
 struct RadioModemTraffic {
-  std::vector<GunRequest> Requests;  ///< in the order of their coming, also those for guns that are not there
-  std::vector<std::string> Faults;   ///< what the host must not have sent; none of it was answered
+  std::vector<GunRequest> Requests;  ///< in order of arrival, including those for guns that are not there
+  std::vector<std::string> Faults;   ///< what the host must not send; none of it was answered
   std::size_t BytesFromHost = 0;
   std::size_t BytesToHost = 0;
 };
 
-/// The radio modem, in API mode without escaping on a line of 57600 baud, and the guns in its range. Both
-/// directions run at once: a gun answers its time after the last bit of the request, or later while the line
-/// is busy with another's answer. The guns keep their scores, so a host may close them and fetch them again.
+/// The radio modem, in API mode without escaping on a 57600 baud line, and the guns in its range. Both
+/// directions run at once: a gun answers when its answer time has passed since the last bit of the request,
+/// or later if the line is still busy with another answer. The guns keep their scores, so a host may close a
+/// transfer and fetch them again.
 class RadioModem : public Device {
  public:
   /// Throws std::system_error when the system grants no pseudo terminal, and std::invalid_argument when there
@@ -44,7 +45,7 @@ class RadioModem : public Device {
 
   RadioModemTraffic Traffic() const { return traffic_.Copy(); }
 
-  /// Waits until `count` requests and faults have come; false when `limit` passes first.
+  /// Waits until `count` requests and faults in total have come; false when `limit` passes first.
   bool WaitUntilAsked(std::size_t count, std::chrono::milliseconds limit) const;
 
  private:

@@ -15,7 +15,7 @@ namespace {
 using Bytes = std::vector<std::uint8_t>;
 
 constexpr std::uint8_t StartByte = 0x7E;
-// Neither 0 nor a likely count, so that a reader that takes it for data is noticed.
+// Neither 0 nor a plausible count, so that a reader that mistakes it for data is caught.
 constexpr std::uint8_t Filler = 0xEE;
 const Bytes TransmitStatus{0x89, 0, 0};
 const Bytes ModemStatus{0x8A, 6};
@@ -23,7 +23,7 @@ const Bytes Noise{0xFE, 0xF0, 0x7F};
 const Bytes NoiseWithStart{0xFE, StartByte, 0x12};
 constexpr std::size_t StartOfBlock = 8;
 
-// A frame has at least 47 bytes with its CRC, so it passes 270 with these.
+// A frame has at least 47 bytes with its CRC, so these always take it past 270.
 void LengthenScores(RadioGun& gun) {
   constexpr std::size_t extraBytes = 255;
   gun.Frame.pop_back();

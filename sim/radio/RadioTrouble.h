@@ -19,17 +19,17 @@ struct RadioTroubleSettings {
   int Times = 0;        ///< how many answers of each gun it strikes; 0: all
 };
 
-/// Makes guns' answers, with a failure in them.
+/// Makes the guns' answers, with the failure built in.
 class RadioTrouble {
  public:
-  /// Lengthens the scores of `guns` where the failure is about those. Throws std::invalid_argument when there
-  /// is no such gun.
+  /// Lengthens the scores of the stricken `guns` if that is the failure. Throws std::invalid_argument if
+  /// there is no such gun.
   RadioTrouble(const RadioTroubleSettings& settings, std::vector<RadioGun>& guns);
 
-  /// What the modem puts on the line when `gun` answers `request`, in this order.
+  /// What the modem sends, in this order, when `gun` answers `request`.
   std::vector<LinePiece> Answer(const RadioGun& gun, const GunRequest& request);
 
-  /// What was kept back for the next search. To be sent before its answer.
+  /// Hands over what was kept back for the next search, to be sent before the answer to that.
   std::vector<LinePiece> KeptBack();
 
  private:

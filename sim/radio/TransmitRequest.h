@@ -22,16 +22,16 @@ struct TransmitRequest {
 /// The destination that reaches every gun.
 constexpr std::uint64_t Broadcast = 0xFFFF;
 
-/// Finds transmit requests (64-bit address, no escaping) in what the host sends, and takes nothing for one
-/// that is not right in every byte: the length fits a radio frame of at most 100 data bytes, frame identifier
-/// and options are 0, the checksum agrees.
+/// Finds transmit requests (64-bit address, no escaping) in what the host sends. Accepts only those that are
+/// correct throughout: the length is that of a radio frame of 1 to 100 data bytes, frame identifier and
+/// options are 0, the checksum matches.
 class TransmitRequestReader {
  public:
-  /// Takes the next byte. Gives a request when it ends one and a fault when it shows one; a run of stray
-  /// bytes is one fault.
+  /// Takes the next byte. Returns a request if the byte completes one, a fault if it reveals one; a run of
+  /// stray bytes is one fault.
   std::optional<std::variant<TransmitRequest, HostFault>> Take(std::uint8_t byte);
 
-  /// The bytes of the frame that goes on or has just ended, or the stray ones.
+  /// The bytes of the frame in progress or just ended, or the latest stray byte.
   const std::vector<std::uint8_t>& Bytes() const { return bytes_; }
 
  private:

@@ -9,19 +9,19 @@
 
 namespace sim {
 
-/// An option of the program, for its parser and its help.
+/// A command line option, for the parser and the help.
 struct CommandLineOption {
-  std::vector<std::string> Spellings;  ///< the first is the one for the help
-  std::string Value;                   ///< empty for one that stands alone
+  std::vector<std::string> Spellings;  ///< the help shows the first
+  std::string Value;                   ///< how the help names it; empty for an option without one
   std::string Meaning;
   /// `spelling`: the one that was used. Throws std::invalid_argument with a text for the user.
   std::function<void(VenueOptions& options, const std::string& spelling, const std::string& value)> Take;
 };
 
-/// Those that concern the whole venue.
+/// The options that concern the whole venue.
 std::vector<CommandLineOption> GeneralOptions();
 
-/// Those of one device, as its entry has them.
+/// The options of one device, from its entry.
 std::vector<CommandLineOption> OptionsOf(const DeviceEntry& entry);
 
 }  // namespace sim

@@ -13,11 +13,11 @@ namespace sim {
 struct DeviceOptions {
   bool Served = false;
   std::size_t Failure = 0;  ///< row of the device's table of failures
-  std::size_t Place = 1;    ///< what the failure concerns, by its kind of place
+  std::size_t Place = 1;    ///< frame, byte, bit or gun that the failure concerns
   std::optional<std::string> Link;
-  /// Of the device's own options that are numbers or choices, by name; all of them are there.
+  /// Values of the device's own number and choice options, by name; all of them are there.
   std::map<std::string, std::uint64_t, std::less<>> Numbers;
-  /// Of those that are files, where one was given.
+  /// Values of its file options, where given.
   std::map<std::string, std::string, std::less<>> Files;
 
   /// `Kind`: the enumeration of the device's failures.
@@ -28,7 +28,7 @@ struct DeviceOptions {
 
   /// Throws std::out_of_range when the device has no such option.
   std::uint64_t Number(std::string_view option) const;
-  /// The place of the name that was chosen; throws like Number.
+  /// Index of the chosen name; throws like Number.
   std::size_t Choice(std::string_view option) const { return static_cast<std::size_t>(Number(option)); }
   std::optional<std::string> File(std::string_view option) const;
 };

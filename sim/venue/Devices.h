@@ -10,7 +10,7 @@ DeviceEntry BaseUnitEntry();
 DeviceEntry OneWireEntry();
 DeviceEntry RadioEntry();
 
-/// Every device that the venue has, in the order of its outputs.
+/// All devices of the venue, in output order.
 const std::vector<DeviceEntry>& Devices();
 
 }  // namespace sim

@@ -15,26 +15,26 @@
 
 namespace sim {
 
-/// The devices that a command line asks for, served from its construction to its destruction.
+/// The devices that the command line asks for, served from construction to destruction.
 class Venue {
  public:
-  /// `endVenue` may be called on any thread, as soon as there is nothing left to serve. Throws what the
-  /// starts of the devices throw, and std::runtime_error when a file cannot be written. `devices` must
-  /// outlive it.
+  /// `endVenue` may be called on any thread, as soon as there is nothing left to serve. Throws whatever
+  /// starting a device throws, and std::runtime_error if a file cannot be written. `devices` must outlive the
+  /// venue.
   Venue(const VenueOptions& options, std::function<void()> endVenue,
         const std::vector<DeviceEntry>& devices = Devices());
   Venue(const Venue&) = delete;
   Venue& operator=(const Venue&) = delete;
 
-  /// "TITLE: DEVICE", a line each.
+  /// Writes "TITLE: DEVICE", one line per device.
   void TellDevices(std::ostream& out) const;
-  /// What the hosts must not have done.
+  /// Writes what the hosts did wrong.
   void TellHostFaults(std::ostream& out) const;
 
   bool TakesCommands() const;
-  /// Hands `line` to the device that has such a command; of several to the first of the table, unless the
-  /// line begins with another's name. Returns what is to be printed of it, nothing for an empty line. Throws
-  /// std::invalid_argument with a text for the user.
+  /// Hands `line` to the device whose name it begins with, or else to the first in the table that has such a
+  /// command. Returns what to print, nothing for an empty line. Throws std::invalid_argument with a text for
+  /// the user.
   std::string Obey(const std::string& line);
 
  private:

@@ -25,7 +25,8 @@ namespace {
 constexpr int ExitFailure = 1;
 constexpr int ExitBadOptions = 2;
 
-// Must run before the first thread starts, so that no thread is ended by the signals that end the program.
+// Must run before the first thread starts, so that all threads inherit the mask and the signals arrive only
+// at the descriptor.
 sim::FileDescriptor CatchEndSignals() {
   sigset_t signals;
   sigemptyset(&signals);

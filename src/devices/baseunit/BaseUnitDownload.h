@@ -14,20 +14,20 @@
 #include "platform/MessageBoxes.h"
 #include "platform/SerialPort.h"
 
-/// The small window that follows a transfer. It only shows what it is told.
+/// The small progress window of a transfer. It only displays.
 class TransferProgress {
  public:
   virtual ~TransferProgress() = default;
 
-  /// Shows the window, its bar at 0 of 224, the animation at rest.
+  /// Shows the window with its bar at 0 of 224 and the animation stopped.
   virtual void Open() = 0;
   virtual void Close() = 0;
-  /// True when the operator closed the window: the transfer is to end without a word.
+  /// True once the operator has closed the window: the transfer must then end silently.
   virtual bool ClosedByOperator() const = 0;
 
   virtual void SetStatusText(const std::string& text) = 0;
   virtual void SetMaximum(int maximum) = 0;
-  /// Moves the bar to `value` and shows it as number, too.
+  /// Moves the bar to `value` and also shows it as a number.
   virtual void SetProgress(int value) = 0;
   virtual void StartTransferAnim() = 0;
 };
@@ -36,7 +36,7 @@ class TransferProgress {
 /// gun back.
 ///
 /// Host to unit: 1, 20 ms pause, 0 asks for scores; 170 accepts a frame; 0 rejects it. Unit to host: the
-/// number of frames, then each frame with its check byte, the next after the reply to the last.
+/// number of frames, then each frame with its check byte, after the reply to the one before.
 class BaseUnitDownload {
  public:
   static constexpr const char* LineSettings = "19200,N,8,1";
@@ -44,7 +44,7 @@ class BaseUnitDownload {
   BaseUnitDownload(SerialPort& port, CommPort& commPort, EventPump& events, MessageBoxes& boxes,
                    const Clock& clock, TransferProgress& progress, Game& game);
 
-  /// Runs the download with its boxes and leaves the line closed. Frames that came through are in the game,
+  /// Runs the download, message boxes included, and leaves the line closed. Accepted frames are in the game,
   /// however it ended.
   void GetScores();
 
@@ -56,7 +56,7 @@ class BaseUnitDownload {
   bool ChecksumFits(std::uint8_t crc) const;
 
   void SendByte(std::uint8_t byte);
-  /// The next byte; nothing when the transfer has to end: no byte in 5 s, the line lost, or a window closed.
+  /// The next byte; nothing if the transfer must end: no byte in 5 s, line failure, or a window closed.
   std::optional<std::uint8_t> ReceiveByte();
   void TellOfFault();
 
@@ -68,5 +68,5 @@ class BaseUnitDownload {
   Game& game_;
   SerialJob job_;
   ReceiveBuffer buffer_{};
-  std::size_t length_ = 0;  ///< L of the frame in hand, 0 to 32767
+  std::size_t length_ = 0;  ///< length word of the current frame, 0 to 32767
 };

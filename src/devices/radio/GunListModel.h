@@ -7,7 +7,7 @@
 
 #include "devices/radio/GunTable.h"
 
-/// The guns that were found, as rows of a list. Rows that stay where they are stay selected.
+/// The guns that were found, as rows of a list. Updates are made in place, so that the selection survives.
 class GunListModel : public QAbstractTableModel {
   Q_OBJECT
 
@@ -15,7 +15,7 @@ class GunListModel : public QAbstractTableModel {
   /// `player` is the header of the first column.
   explicit GunListModel(const QString& player, QObject* parent);
 
-  /// Shows the listed ones of `guns`.
+  /// Shows the guns that ListedGuns gives.
   void Show(const GunTable& guns, std::int16_t maxPlayerId);
   void Clear();
 

@@ -6,7 +6,7 @@
 
 namespace {
 
-constexpr int Scale = 4;  // painted larger than shown, for screens of any density
+constexpr int Scale = 4;  // painted larger than shown, to stay sharp on dense screens
 
 const QColor Green(0x2e, 0x9e, 0x4f);
 const QColor Amber(0xe0, 0x9a, 0x12);
@@ -34,7 +34,7 @@ QColor ColourOf(ScoreStatus status) {
   }
 }
 
-/// The form inside the mark, in a square of 16.
+/// The symbol inside the mark, in a 16 by 16 square.
 QPainterPath FormOf(ScoreStatus status) {
   QPainterPath form;
   switch (status) {

@@ -36,7 +36,7 @@ void GunSearch::SearchGuns(std::int16_t maxPlayerId) {
 void GunSearch::Ask(std::uint8_t playerId) {
   events_.DoEvents();
   while (link_.TakeFrame()) {
-    TakeAnswer();  // came together with another one, and must not end the next gun's slot
+    TakeAnswer();  // arrived along with another answer, and must not end the next gun's slot
   }
   link_.SendGunPacket(playerId, BroadcastAddress, 0, 0, GunPacketType::Search);
   if (link_.WaitForFrame(false)) {

@@ -7,7 +7,7 @@
 
 #include "devices/radio/XBeeFrames.h"
 
-/// How far the fetching of a gun's scores has come.
+/// How far the fetching of a gun's scores has got.
 enum class ScoreStatus : std::int16_t { Pending = 0, InProgress = 1, Failed = 2, Ok = 3 };
 
 /// A gun that answered the search.
@@ -24,15 +24,15 @@ struct GunEntry {
   bool operator==(const GunEntry&) const = default;
 };
 
-/// The guns, each at its player id less 32; the last entry is never used.
+/// The guns, indexed by player id minus 32; the last entry is never used.
 using GunTable = std::array<GunEntry, 225>;
 
-/// Guns that a search can find and scores can be fetched from, entries 0 to 223.
+/// How many guns can be found and their scores fetched: entries 0 to 223.
 inline constexpr int GunCount = 224;
 
 inline constexpr std::uint8_t FirstGunId = 32;
 
-/// Name of the weapon with this code; "Unknown" for a code that no gun is known to have.
+/// Name of the weapon with this code; "Unknown" if there is none.
 std::string WeaponText(std::uint8_t code);
 
 std::string StatusText(ScoreStatus status);
@@ -45,5 +45,5 @@ using GunRow = std::array<std::string, 5>;
 
 GunRow RowOf(const GunEntry& gun);
 
-/// Indexes of the guns that the list shows: those present among 0 to `maxPlayerId`, both included.
+/// Indexes of the guns that the list shows: those present from 0 to `maxPlayerId` inclusive.
 std::vector<int> ListedGuns(const GunTable& guns, std::int16_t maxPlayerId);

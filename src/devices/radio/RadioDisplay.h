@@ -2,7 +2,7 @@
 
 #include <string>
 
-/// Where a job on the radio link shows how it goes.
+/// Where a job on the radio link shows its progress.
 class RadioDisplay {
  public:
   virtual ~RadioDisplay() = default;
@@ -11,9 +11,9 @@ class RadioDisplay {
   virtual void SetPlayersFound(int count) = 0;
   virtual void ClearGunList() = 0;
 
-  /// Shows the guns as they now are, and serves pending events.
+  /// Shows the guns as they are now and processes pending events.
   virtual void RefreshGunList() = 0;
 
-  /// Step `step` (from 0 up) of `steps` begins.
+  /// Step `step` of `steps`, counted from 0, begins.
   virtual void SetProgress(const std::string& text, int step, int steps) = 0;
 };

@@ -22,7 +22,7 @@ void RadioLink::OpenXBeePort() {
   try {
     job_.Open(commPort_.Device(), LineSettings);
   } catch (const RuntimeError&) {
-    return;  // a closed line has its own fault, at the first byte
+    return;  // the first byte sent on the closed line fails instead
   }
 }
 

@@ -11,7 +11,8 @@
 #include "platform/EventPump.h"
 #include "platform/SerialPort.h"
 
-/// The way to the guns for one job: a radio modem on the serial line of the settings. Leaves the line closed.
+/// The radio link to the guns for one job: a modem on the serial port of the settings. Leaves the
+/// port closed.
 ///
 /// A job that is stopped (its window closed, a later job started, the program closing) or whose line is lost
 /// sends nothing more, and every wait ends as if nobody had answered.
@@ -19,11 +20,11 @@ class RadioLink {
  public:
   static constexpr const char* LineSettings = "57600,N,8,1";
 
-  /// `stopped` tells in the middle of waits that the job is to end; it must depend on what events change.
+  /// `stopped` is polled during waits: true if the job must end. Its result may change only through events.
   RadioLink(SerialPort& port, CommPort& commPort, EventPump& events, std::function<bool()> stopped);
 
-  /// Opens the line and forgets what came before. A line that does not open is not reported here: the first
-  /// byte sent finds out.
+  /// Opens the line and starts afresh. A line that cannot be opened is not reported here: the first byte sent
+  /// fails.
   void OpenXBeePort();
 
   void XBee_CloseCommPort() { job_.Close(); }
@@ -35,22 +36,22 @@ class RadioLink {
   /// Sends a command to the modem itself.
   void SendAtCommand(std::uint8_t frameId, const AtLetters& letters, std::span<const std::uint8_t> value);
 
-  /// Waits 2 s, or 12 ms, for a good frame of whatever kind. Throws RuntimeError 9 for a frame that is longer
-  /// than its buffer.
+  /// Waits 2 s (`longWait`) or 12 ms for a valid frame of any kind. Throws RuntimeError 9 for a frame that is
+  /// too long for its buffer.
   bool WaitForFrame(bool longWait);
 
-  /// True when a good frame is among the bytes that have come in; it is then taken. Throws as WaitForFrame.
+  /// Takes a valid frame from the bytes that have come in; false if there is none. Throws as WaitForFrame.
   bool TakeFrame();
 
-  /// API identifier of the last frame; 0 when none was taken since the last packet was sent.
+  /// API identifier of the frame just taken; 0 if the last attempt found none, or after sending.
   std::uint8_t ReceivedFrameType() const { return receivedFrameType_; }
 
   const ReceivedFrame& Frame() const { return parser_.Frame(); }
 
-  /// True when the job is to end.
+  /// True if the job must end: it was stopped or the line failed.
   bool Stopped() const { return job_.Over(); }
 
-  /// Throws what went wrong with the line, unless the job was stopped anyway.
+  /// Throws the line's fault, if there is one and the job was not stopped anyway.
   void ThrowIfLineLost() const;
 
   std::uint32_t BytesSent() const { return bytesSent_; }

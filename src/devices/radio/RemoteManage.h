@@ -22,13 +22,13 @@ namespace Ui {
 class RemoteManage;
 }
 
-/// Guns in radio range: who is there, and their scores. Both buttons stay alive during a run; the later run
-/// ends the earlier one. Closed in mid-run, the window goes once the run has unwound.
+/// The guns in radio range, and their scores. Both buttons stay enabled during a run; a later run ends the
+/// earlier one. If closed during a run, the window goes once the run has unwound.
 class RemoteManage : public QDialog, private RadioDisplay {
   Q_OBJECT
 
  public:
-  /// What the window works with; it outlives it.
+  /// What the window works with; all of it must outlive the window.
   struct Parts {
     SerialPort& MSComm1;
     CommPort& Port;
@@ -52,7 +52,7 @@ class RemoteManage : public QDialog, private RadioDisplay {
   void ShareListWidth();
   void SearchForGuns();
   void GetScores();
-  /// Runs a job on a link of its own; whatever ends it, the line is closed and the pointer back.
+  /// Runs a job on a link of its own. However it ends, the line is closed and the pointer restored.
   void Work(const std::function<void(RadioLink&)>& job);
 
   void SetStatus(const std::string& text) override;
@@ -65,7 +65,7 @@ class RemoteManage : public QDialog, private RadioDisplay {
   const Parts parts_;
   GunListModel* list_ = nullptr;
   GunTable guns_;
-  std::int16_t maxPlayerId_;  ///< 128 or 224: ids that the last search tried
+  std::int16_t maxPlayerId_;  ///< 128 or 224: number of ids that the last search tried
   int latestRun_ = 0;
   Commands commands_;
 };

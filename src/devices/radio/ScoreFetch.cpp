@@ -105,14 +105,14 @@ void ScoreFetch::Attempt(GunEntry& gun, std::uint8_t playerId) {
 bool ScoreFetch::Command(const GunEntry& gun, std::uint8_t playerId, std::span<const std::uint8_t> payload) {
   events_.DoEvents();
   while (link_.TakeFrame()) {
-    // a late answer to an earlier command would pass for the one to this
+    // drops late answers to earlier commands, which would pass for the answer to this one
   }
   link_.SendGunPacket(playerId, gun.Address, 0, 0, GunPacketType::Command, payload);
   if (!link_.WaitForFrame(true)) {
     return false;
   }
   while (link_.TakeFrame()) {
-    // a status frame and the answer came at once: the data that came last count
+    // a status frame may come along with the answer: the data received last counts
   }
   answer_ = ReadGunPacket(link_.Frame());
   return answer_.Type == GunPacketType::CommandAnswer;

@@ -12,25 +12,25 @@
 #include "platform/Clock.h"
 #include "platform/EventPump.h"
 
-/// Fetches the score block of every listed gun that is pending or failed, and adds it to the game. Commands
-/// of 1 (size), 2 (read a block) and 3 (close the transfer), each to one gun and answered by it.
+/// Fetches the scores of every listed gun that is pending or failed, and adds them to the game. Uses the
+/// commands 1 (size), 2 (read a block) and 3 (close the transfer), each sent to one gun and answered by it.
 class ScoreFetch {
  public:
   ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, const StringTable& strings, Game& game,
              GunTable& guns, RadioDisplay& display);
 
   /// Throws RuntimeError 6 for a gun that reports 0 bytes, or needs a block that begins beyond byte 255; 9
-  /// for an answer that is longer than its buffer. That gun then stays "in progress".
+  /// for an answer that is too long for its buffer. That gun then stays "in progress".
   void GetScores();
 
  private:
   void FetchGun(int index);
   void Attempt(GunEntry& gun, std::uint8_t playerId);
-  /// Sends a command; true when an answer to a command came, now in `answer_`.
+  /// Sends a command; true if an answer to a command came, which is then in `answer_`.
   bool Command(const GunEntry& gun, std::uint8_t playerId, std::span<const std::uint8_t> payload);
-  /// Number of bytes that came.
+  /// Returns the number of bytes received.
   int FetchBlocks(const GunEntry& gun, std::uint8_t playerId, int total);
-  /// Puts a block into the buffer where it says that it belongs. Returns its length.
+  /// Copies a block into the buffer at the offset it states. Returns its length.
   int TakeBlock();
 
   RadioLink& link_;

@@ -112,7 +112,7 @@ void XBeeFrameParser::TakeReceive64(std::uint8_t byte) {
   }
 }
 
-// Compared behind the identifier only: a body of 0 or 1 bytes never ends.
+// The length is compared only after the identifier: a body of 0 or 1 bytes never ends.
 void XBeeFrameParser::CountBody(std::uint8_t byte) {
   sum_ += byte;
   ++position_;

@@ -5,8 +5,8 @@
 
 #include "devices/radio/XBeeFrames.h"
 
-/// What the modem's frames brought. A frame writes its own fields alone and only as far as it goes, so `Data`
-/// beyond `DataLength` is what an earlier one left there.
+/// Contents of the modem's frames. A frame writes only its own fields, and only as far as it reaches, so
+/// `Data` past `DataLength` is left over from an earlier one.
 struct ReceivedFrame {
   XBeeAddress SourceAddress{};
   std::uint8_t Rssi = 0;     ///< signal strength, -dBm
@@ -21,16 +21,16 @@ struct ReceivedFrame {
   std::uint8_t AtDataLength = 0;
 };
 
-/// Takes the modem's bytes one at a time. Received data (64-bit addresses) and AT responses are kept, other
-/// known frames are only checked. What belongs to no known frame, and frames with a wrong check byte, are
-/// dropped without a word.
+/// Parses the modem's bytes one at a time. Received data (64-bit addresses) and AT responses are kept; other
+/// known frames are only checked. Bytes that belong to no known frame, and frames with a wrong check byte,
+/// are dropped silently.
 class XBeeFrameParser {
  public:
-  /// API identifier of the good frame that `byte` completes, otherwise 0. Throws RuntimeError 9 for the byte
+  /// API identifier of the valid frame that `byte` completes, otherwise 0. Throws RuntimeError 9 for a byte
   /// that `Frame()` has no room for, and drops that frame.
   std::uint8_t Receive(std::uint8_t byte);
 
-  /// The frame that Receive() told of, until the next one begins.
+  /// The frame last reported by Receive(), until the next one begins.
   const ReceivedFrame& Frame() const { return frame_; }
 
  private:

@@ -9,7 +9,7 @@ namespace {
 
 constexpr std::size_t HeadLength = 3;
 
-/// Fills the length in and adds the check byte.
+/// Fills in the length and adds the check byte.
 void Close(std::vector<std::uint8_t>& frame) {
   const std::size_t bodyLength = frame.size() - HeadLength;
   frame[1] = static_cast<std::uint8_t>(bodyLength >> 8);

@@ -10,14 +10,14 @@
 ///     0      0x7E
 ///     1      body length, high byte first
 ///     3      body, its first byte the API identifier
-///     3 + n  check byte: 255 less the low byte of the sum of the body
+///     3 + n  check byte: 255 minus the low byte of the sum of the body
 
 inline constexpr std::uint8_t FrameStart = 0x7E;
 
-/// 64-bit address of a modem, least significant byte first (on the line it goes the other way round).
+/// 64-bit address of a modem, least significant byte first (the reverse of its order on the line).
 using XBeeAddress = std::array<std::uint8_t, 8>;
 
-/// Every modem in reach.
+/// Every modem in range.
 inline constexpr XBeeAddress BroadcastAddress = {0xFF, 0xFF};
 
 /// The two letters of an AT command.
@@ -34,7 +34,7 @@ inline constexpr std::uint8_t TransmitStatus = 0x89;
 inline constexpr std::uint8_t ModemStatus = 0x8A;
 }  // namespace XBeeApi
 
-/// Asks the modem to send `data` on the air. The frame identifier is 0, so it answers no transmit status.
+/// Asks the modem to transmit `data`. The frame identifier is 0, so no transmit status comes back.
 std::vector<std::uint8_t> TransmitRequest(const XBeeAddress& destination, std::span<const std::uint8_t> data);
 
 /// A command to the modem itself. It answers with the same `frameId`.
