@@ -73,7 +73,7 @@ inline void ExpectCaptionsFit(const QWidget& window) {
   }
 }
 
-/// The Tab key goes through the window as one reads it, and misses nothing.
+/// The Tab key goes through the window in reading order.
 inline void ExpectTabOrderFollowsTheEye(const QWidget& window) {
   const auto takesTab = [&window](const QWidget* widget) {
     return (widget->focusPolicy() & Qt::TabFocus) != 0 && widget->isVisibleTo(&window) && widget->isEnabled();

@@ -19,7 +19,7 @@ inline std::string SmallGame() {
   return GameFile(PlayerOf(1, "<BonusPoints>5</BonusPoints>") + PlayerOf(40, "<BonusPoints>9</BonusPoints>"));
 }
 
-/// Red 0 and eight others who hit each other, with members' names missing.
+/// Nine players who hit each other, with members' names missing.
 inline std::string GameOfManyHits() {
   std::string players;
   for (int index = 1; index <= 9; ++index) {
