@@ -10,7 +10,7 @@ class UploadProgress;
 }
 
 /// The small window shown during a download. Closing it ends the download.
-class UploadProgress : public QDialog, public TransferProgress {
+class UploadProgress : public QDialog, public DownloadProgress {
   Q_OBJECT
 
  public:

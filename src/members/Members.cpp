@@ -92,10 +92,10 @@ void Members::ConnectCommands() {
                                {ui_->OK, &Members::SelectMember},
                            });
   commands_.Connect(*data1_, {
-                                 {ui_->DataFirst, &MemberRows::MoveFirst},
-                                 {ui_->DataPrevious, &MemberRows::MovePrevious},
-                                 {ui_->DataNext, &MemberRows::MoveNext},
-                                 {ui_->DataLast, &MemberRows::MoveLast},
+                                 {ui_->DataFirst, &MemberCursor::MoveFirst},
+                                 {ui_->DataPrevious, &MemberCursor::MovePrevious},
+                                 {ui_->DataNext, &MemberCursor::MoveNext},
+                                 {ui_->DataLast, &MemberCursor::MoveLast},
                              });
 }
 

@@ -7,7 +7,7 @@
 #include <string>
 
 #include "core/text/StringTable.h"
-#include "members/MemberRows.h"
+#include "members/MemberCursor.h"
 #include "platform/Clock.h"
 #include "platform/Database.h"
 #include "platform/FileDialog.h"
@@ -82,6 +82,6 @@ class Members : public QDialog, private BoundControls {
   std::unique_ptr<Ui::Members> ui_;
   const Parts parts_;
   Commands commands_;
-  std::optional<MemberRows> data1_;
+  std::optional<MemberCursor> data1_;
   std::string selectedContact_;
 };

@@ -10,12 +10,12 @@
 
 #include "devices/baseunit/BaseUnitDownload.h"
 #include "tests/fakes/FakeClock.h"
+#include "tests/fakes/FakeDownloadProgress.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
-#include "tests/fakes/FakeTransferProgress.h"
 #include "tests/support/Frames.h"
 
 /// The boxes of a download.
@@ -49,7 +49,7 @@ struct DownloadStage {
   FakeMessageBoxes Boxes;
   FakeEventPump Events;
   FakeClock Time;
-  FakeTransferProgress Progress;
+  FakeDownloadProgress Progress;
   StringTable Strings{Language::English};
   Game Scores{Strings};
   IniReader Ini{Store, "/tessarine.ini"};
@@ -65,7 +65,7 @@ struct DownloadStage {
   void GetScores() { GetScores(Progress); }
 
   /// For a second download beside the first.
-  void GetScores(TransferProgress& progress) {
+  void GetScores(DownloadProgress& progress) {
     BaseUnitDownload(Port, Line, Events, Boxes, Time, progress, Scores).GetScores();
   }
 

@@ -19,7 +19,7 @@ constexpr milliseconds RejectPause{2000};
 }  // namespace
 
 BaseUnitDownload::BaseUnitDownload(SerialPort& port, CommPort& commPort, EventPump& events,
-                                   MessageBoxes& boxes, const Clock& clock, TransferProgress& progress,
+                                   MessageBoxes& boxes, const Clock& clock, DownloadProgress& progress,
                                    Game& game)
     : commPort_(commPort),
       events_(events),

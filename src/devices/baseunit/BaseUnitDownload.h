@@ -15,9 +15,9 @@
 #include "platform/SerialPort.h"
 
 /// The small progress window of a transfer. It only displays.
-class TransferProgress {
+class DownloadProgress {
  public:
-  virtual ~TransferProgress() = default;
+  virtual ~DownloadProgress() = default;
 
   /// Shows the window with its bar at 0 of 224 and the animation stopped.
   virtual void Open() = 0;
@@ -42,7 +42,7 @@ class BaseUnitDownload {
   static constexpr const char* LineSettings = "19200,N,8,1";
 
   BaseUnitDownload(SerialPort& port, CommPort& commPort, EventPump& events, MessageBoxes& boxes,
-                   const Clock& clock, TransferProgress& progress, Game& game);
+                   const Clock& clock, DownloadProgress& progress, Game& game);
 
   /// Runs the download, message boxes included, and leaves the line closed. Accepted frames are in the game,
   /// however it ended.
@@ -64,7 +64,7 @@ class BaseUnitDownload {
   EventPump& events_;
   MessageBoxes& boxes_;
   const Clock& clock_;
-  TransferProgress& progress_;
+  DownloadProgress& progress_;
   Game& game_;
   SerialJob job_;
   ReceiveBuffer buffer_{};

@@ -12,9 +12,9 @@
 #include "sim/baseunit/BaseUnit.h"
 #include "sim/game/GameMaker.h"
 #include "tests/fakes/FakeClock.h"
+#include "tests/fakes/FakeDownloadProgress.h"
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/fakes/FakeSerialDevices.h"
-#include "tests/fakes/FakeTransferProgress.h"
 #include "tests/support/TemporaryFolder.h"
 
 // A real line with its transcript, and the simulated unit's own log of it.
@@ -61,7 +61,7 @@ class TranscriptOfADownload : public testing::Test {
     QtSerialPort line;
     LoggedPort port(line, {files, folder / "logs", events, clock}, "line");
     CommPort commPort(port, ini, devices, boxes, strings, [] {});
-    FakeTransferProgress progress;
+    FakeDownloadProgress progress;
     BaseUnitDownload(port, commPort, events, boxes, clock, progress, game).GetScores();
   }
 

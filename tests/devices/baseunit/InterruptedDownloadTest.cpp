@@ -64,7 +64,7 @@ TEST_F(InterruptedDownload, LosesItsLineToASecondOneStartedInAWait) {
   for (const std::size_t bytes : {0, 1, 20, 53, 60}) {
     SCOPED_TRACE(bytes);
     DownloadStage stage;
-    FakeTransferProgress second;
+    FakeDownloadProgress second;
     stage.Frames = {FrameOfRed1(), FrameOfBlue0()};
     stage.SilentFrom = bytes;
     stage.Events.At(milliseconds(500), [&] {
@@ -84,7 +84,7 @@ TEST_F(InterruptedDownload, LosesItsLineToASecondOneStartedInAWait) {
 }
 
 TEST_F(InterruptedDownload, LosesItsLineToASecondOneStartedInThePauseBehindABadFrame) {
-  FakeTransferProgress second;
+  FakeDownloadProgress second;
   Frames = {WithWrongCheckByte(FrameOfRed1()), FrameOfBlue0()};
   Events.At(milliseconds(500), [&] {
     Frames = {FrameOfRed1()};
@@ -97,7 +97,7 @@ TEST_F(InterruptedDownload, LosesItsLineToASecondOneStartedInThePauseBehindABadF
 }
 
 TEST_F(InterruptedDownload, EndsTogetherWithASecondOneWhenTheProgramCloses) {
-  FakeTransferProgress second;
+  FakeDownloadProgress second;
   SilentFrom = 0;
   Events.At(milliseconds(500), [&] { GetScores(second); });
   Events.At(milliseconds(1000), [this] { Events.EndWaits(); });

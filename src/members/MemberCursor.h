@@ -28,9 +28,9 @@ class BoundControls {
 ///
 /// All operations throw RuntimeError if the database fails. A change that could not be written stays in the
 /// controls, and the cursor on its row; it is discarded only if the row no longer exists.
-class MemberRows {
+class MemberCursor {
  public:
-  MemberRows(Database& dbMembers, BoundControls& controls);
+  MemberCursor(Database& dbMembers, BoundControls& controls);
 
   /// Reads the rows of a query and shows the first one. If the query fails, keeps the old rows.
   void Refresh(const std::string& recordSource);

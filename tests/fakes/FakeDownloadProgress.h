@@ -7,7 +7,7 @@
 
 /// Records what a download shows, in order: "Open", "Status Requesting Data...", "Maximum 3", "Progress 1",
 /// "Animate", "Close".
-class FakeTransferProgress : public TransferProgress {
+class FakeDownloadProgress : public DownloadProgress {
  public:
   std::vector<std::string> Log;
   bool Closed = false;  ///< set by a test: the operator closed the window

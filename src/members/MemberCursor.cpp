@@ -1,23 +1,23 @@
-#include "members/MemberRows.h"
+#include "members/MemberCursor.h"
 
 #include "platform/RuntimeError.h"
 
-MemberRows::MemberRows(Database& dbMembers, BoundControls& controls)
+MemberCursor::MemberCursor(Database& dbMembers, BoundControls& controls)
     : dbMembers_(dbMembers), controls_(controls), rows_(dbMembers.OpenRecordset("Members")) {}
 
-void MemberRows::Refresh(const std::string& recordSource) {
+void MemberCursor::Refresh(const std::string& recordSource) {
   WriteBack();
   rows_ = dbMembers_.OpenRecordset(recordSource);
   Show();
 }
 
-void MemberRows::MoveFirst() {
+void MemberCursor::MoveFirst() {
   WriteBack();
   rows_->MoveFirst();
   Show();
 }
 
-void MemberRows::MovePrevious() {
+void MemberCursor::MovePrevious() {
   WriteBack();
   if (!rows_->Bof()) {
     rows_->MovePrevious();
@@ -28,7 +28,7 @@ void MemberRows::MovePrevious() {
   Show();
 }
 
-void MemberRows::MoveNext() {
+void MemberCursor::MoveNext() {
   WriteBack();
   if (!rows_->Eof()) {
     rows_->MoveNext();
@@ -39,19 +39,19 @@ void MemberRows::MoveNext() {
   Show();
 }
 
-void MemberRows::MoveLast() {
+void MemberCursor::MoveLast() {
   WriteBack();
   rows_->MoveLast();
   Show();
 }
 
-void MemberRows::WalkTo(std::int64_t contactId) {
+void MemberCursor::WalkTo(std::int64_t contactId) {
   WriteBack();
   rows_->WalkTo("ContactID", contactId);
   Show();
 }
 
-void MemberRows::AddMember(const std::string& now) {
+void MemberCursor::AddMember(const std::string& now) {
   WriteBack();
   rows_->AddNew();
   rows_->SetField("DateJoined", now);
@@ -62,13 +62,13 @@ void MemberRows::AddMember(const std::string& now) {
   Show();
 }
 
-void MemberRows::Delete() {
+void MemberCursor::Delete() {
   rows_->Delete();
   rows_->MoveFirst();
   Show();
 }
 
-void MemberRows::WriteBack() {
+void MemberCursor::WriteBack() {
   if (!hasRow_) {
     return;
   }
@@ -89,13 +89,13 @@ void MemberRows::WriteBack() {
   shown_ = entered;
 }
 
-void MemberRows::SetField(const std::string& column, const std::string& text) {
+void MemberCursor::SetField(const std::string& column, const std::string& text) {
   rows_->Edit();
   rows_->SetField(column, text);
   Update();
 }
 
-void MemberRows::Update() {
+void MemberCursor::Update() {
   try {
     rows_->Update();
   } catch (const RuntimeError&) {
@@ -104,7 +104,7 @@ void MemberRows::Update() {
   }
 }
 
-void MemberRows::Show() {
+void MemberCursor::Show() {
   hasRow_ = false;
   if (rows_->Eof() || rows_->Bof()) {
     controls_.ShowNoRow();

@@ -1,4 +1,4 @@
-#include "members/MemberRows.h"
+#include "members/MemberCursor.h"
 
 #include <gtest/gtest.h>
 
@@ -34,7 +34,7 @@ class MemberCursor : public testing::Test {
  protected:
   void Open() {
     database = file.Open();
-    rows = std::make_unique<MemberRows>(*database, controls);
+    rows = std::make_unique<MemberCursor>(*database, controls);
     rows->Refresh(AllMembers);
     controls.Changes.clear();
   }
@@ -42,7 +42,7 @@ class MemberCursor : public testing::Test {
   MemberFile file;
   Controls controls;
   std::unique_ptr<Database> database;
-  std::unique_ptr<MemberRows> rows;
+  std::unique_ptr<MemberCursor> rows;
 };
 
 TEST_F(MemberCursor, ShowsTheFirstRowAfterARefresh) {
@@ -70,8 +70,8 @@ TEST_F(MemberCursor, ShowsNoRowOfAnEmptySet) {
   Open();
   EXPECT_FALSE(rows->HasRow());
   controls.Details.FirstName = "typed";
-  for (const auto move :
-       {&MemberRows::MoveFirst, &MemberRows::MovePrevious, &MemberRows::MoveNext, &MemberRows::MoveLast}) {
+  for (const auto move : {&MemberCursor::MoveFirst, &MemberCursor::MovePrevious, &MemberCursor::MoveNext,
+                          &MemberCursor::MoveLast}) {
     ((*rows).*move)();
   }
   EXPECT_EQ(controls.Changes, "none none none none ");
