@@ -30,7 +30,7 @@ class Controls final : public BoundControls {
   std::string Changes;
 };
 
-class MemberCursor : public testing::Test {
+class CursorOnMembers : public testing::Test {
  protected:
   void Open() {
     database = file.Open();
@@ -45,7 +45,7 @@ class MemberCursor : public testing::Test {
   std::unique_ptr<MemberCursor> rows;
 };
 
-TEST_F(MemberCursor, ShowsTheFirstRowAfterARefresh) {
+TEST_F(CursorOnMembers, ShowsTheFirstRowAfterARefresh) {
   Open();
   EXPECT_EQ(controls.Number, "1");
   rows->Refresh(SearchQuery("mole"));
@@ -53,7 +53,7 @@ TEST_F(MemberCursor, ShowsTheFirstRowAfterARefresh) {
   EXPECT_TRUE(rows->HasRow());
 }
 
-TEST_F(MemberCursor, StopsAtBothEnds) {
+TEST_F(CursorOnMembers, StopsAtBothEnds) {
   Open();
   rows->MovePrevious();
   for (int i = 0; i < 4; ++i) {
@@ -65,7 +65,7 @@ TEST_F(MemberCursor, StopsAtBothEnds) {
   EXPECT_EQ(controls.Changes, "1 2 5 9 9 1 9 5 ");
 }
 
-TEST_F(MemberCursor, ShowsNoRowOfAnEmptySet) {
+TEST_F(CursorOnMembers, ShowsNoRowOfAnEmptySet) {
   file.Execute("DELETE FROM Members");
   Open();
   EXPECT_FALSE(rows->HasRow());
@@ -78,7 +78,7 @@ TEST_F(MemberCursor, ShowsNoRowOfAnEmptySet) {
   EXPECT_EQ(NumberThrownBy([&] { rows->Delete(); }), 3021);
 }
 
-TEST_F(MemberCursor, WritesBackWhenItLeavesTheRow) {
+TEST_F(CursorOnMembers, WritesBackWhenItLeavesTheRow) {
   Open();
   controls.Details.City = "Cardiff";
   rows->MoveNext();
@@ -89,7 +89,7 @@ TEST_F(MemberCursor, WritesBackWhenItLeavesTheRow) {
   EXPECT_EQ(file.Stored("Clan", 2), "Moles");
 }
 
-TEST_F(MemberCursor, WritesNothingWhenNothingWasChanged) {
+TEST_F(CursorOnMembers, WritesNothingWhenNothingWasChanged) {
   Open();
   OtherConnection other(file.Path());
   other.Execute("BEGIN IMMEDIATE");
@@ -99,7 +99,7 @@ TEST_F(MemberCursor, WritesNothingWhenNothingWasChanged) {
   EXPECT_EQ(controls.Changes, "2 1 ");
 }
 
-TEST_F(MemberCursor, KeepsWhatOthersWroteIntoOtherColumnsOfTheRow) {
+TEST_F(CursorOnMembers, KeepsWhatOthersWroteIntoOtherColumnsOfTheRow) {
   Open();
   file.Execute("UPDATE Members SET TotalGamesPlayed = 7, City = 'Other' WHERE ContactID = 1");
   controls.Details.NickName = "Dragon";
@@ -107,7 +107,7 @@ TEST_F(MemberCursor, KeepsWhatOthersWroteIntoOtherColumnsOfTheRow) {
   EXPECT_EQ(file.Stored("TotalGamesPlayed || City || NickName", 1), "7OtherDragon");
 }
 
-TEST_F(MemberCursor, WalksToAMember) {
+TEST_F(CursorOnMembers, WalksToAMember) {
   Open();
   controls.Details.City = "Cardiff";
   rows->WalkTo(5);
@@ -115,7 +115,7 @@ TEST_F(MemberCursor, WalksToAMember) {
   EXPECT_EQ(file.Stored("City", 1), "Cardiff");
 }
 
-TEST_F(MemberCursor, StandsBehindTheLastRowForAMemberThatIsGone) {
+TEST_F(CursorOnMembers, StandsBehindTheLastRowForAMemberThatIsGone) {
   Open();
   rows->WalkTo(77);
   EXPECT_TRUE(rows->Rows().Eof());
@@ -127,7 +127,7 @@ TEST_F(MemberCursor, StandsBehindTheLastRowForAMemberThatIsGone) {
   EXPECT_EQ(controls.Number, "9");
 }
 
-TEST_F(MemberCursor, AddsAMemberWithItsMomentAndShowsIt) {
+TEST_F(CursorOnMembers, AddsAMemberWithItsMomentAndShowsIt) {
   Open();
   controls.Details.City = "Cardiff";
   rows->AddMember("2013-05-21 14:30:05");
@@ -139,7 +139,7 @@ TEST_F(MemberCursor, AddsAMemberWithItsMomentAndShowsIt) {
   EXPECT_EQ(file.Stored("DateJoined", 11), "2013-05-21 14:30:06");
 }
 
-TEST_F(MemberCursor, ShowsTheFirstRowAfterADeletion) {
+TEST_F(CursorOnMembers, ShowsTheFirstRowAfterADeletion) {
   Open();
   rows->WalkTo(5);
   controls.Details.City = "given up";
@@ -149,7 +149,7 @@ TEST_F(MemberCursor, ShowsTheFirstRowAfterADeletion) {
   EXPECT_EQ(file.Query("SELECT count(*) FROM Members WHERE City = 'given up'"), "0");
 }
 
-TEST_F(MemberCursor, WritesOneColumnAtOnceAndKeepsTheOpenChanges) {
+TEST_F(CursorOnMembers, WritesOneColumnAtOnceAndKeepsTheOpenChanges) {
   Open();
   controls.Details.City = "Cardiff";
   rows->SetField("DallasID", "EFCDAB8967452301");
@@ -159,7 +159,7 @@ TEST_F(MemberCursor, WritesOneColumnAtOnceAndKeepsTheOpenChanges) {
   EXPECT_EQ(file.Stored("City", 1), "Cardiff");
 }
 
-TEST_F(MemberCursor, StaysOnItsRowWithTheChangesWhileTheFileIsLocked) {
+TEST_F(CursorOnMembers, StaysOnItsRowWithTheChangesWhileTheFileIsLocked) {
   Open();
   controls.Details.City = "Cardiff";
   {
@@ -175,7 +175,7 @@ TEST_F(MemberCursor, StaysOnItsRowWithTheChangesWhileTheFileIsLocked) {
   EXPECT_EQ(file.Stored("City", 1), "Cardiff");
 }
 
-TEST_F(MemberCursor, SaysThatAReadOnlyFileTakesNoChange) {
+TEST_F(CursorOnMembers, SaysThatAReadOnlyFileTakesNoChange) {
   std::filesystem::permissions(file.Path(), std::filesystem::perms(0444));
   const OrdinaryUser user;
   Open();
@@ -186,7 +186,7 @@ TEST_F(MemberCursor, SaysThatAReadOnlyFileTakesNoChange) {
   EXPECT_EQ(controls.Details.City, "Cardiff");
 }
 
-TEST_F(MemberCursor, KeepsTheOldRowsOnAFullDisk) {
+TEST_F(CursorOnMembers, KeepsTheOldRowsOnAFullDisk) {
   Open();
   controls.Details.Address = std::string(20000, 'x');
   {
@@ -200,7 +200,7 @@ TEST_F(MemberCursor, KeepsTheOldRowsOnAFullDisk) {
   EXPECT_EQ(file.Stored("length(Address)", 1), "20000");
 }
 
-TEST_F(MemberCursor, GivesUpTheChangesOfARowThatIsGone) {
+TEST_F(CursorOnMembers, GivesUpTheChangesOfARowThatIsGone) {
   Open();
   controls.Details.City = "Cardiff";
   file.Execute("DELETE FROM Members WHERE ContactID = 1");
@@ -209,7 +209,7 @@ TEST_F(MemberCursor, GivesUpTheChangesOfARowThatIsGone) {
   EXPECT_EQ(controls.Number, "2");
 }
 
-TEST_F(MemberCursor, PassesOverARowThatIsGone) {
+TEST_F(CursorOnMembers, PassesOverARowThatIsGone) {
   Open();
   file.Execute("DELETE FROM Members WHERE ContactID = 2");
   EXPECT_EQ(NumberThrownBy([&] { rows->MoveNext(); }), 3167);
@@ -221,7 +221,7 @@ TEST_F(MemberCursor, PassesOverARowThatIsGone) {
   EXPECT_EQ(file.Query("SELECT count(*) FROM Members WHERE City = 'nowhere'"), "0");
 }
 
-TEST_F(MemberCursor, KeepsTheOldRowsWhenAQueryCannotBeRead) {
+TEST_F(CursorOnMembers, KeepsTheOldRowsWhenAQueryCannotBeRead) {
   Open();
   rows->MoveNext();
   EXPECT_EQ(NumberThrownBy([&] { rows->Refresh(SearchQuery("O'B")); }), 3075);
