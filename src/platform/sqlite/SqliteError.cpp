@@ -11,15 +11,17 @@ bool IsNoSpace(int systemError) {
   return systemError == ENOSPC || systemError == EDQUOT || systemError == EFBIG;
 }
 
-// SQLite reports a full disk as such only for ENOSPC. A quota or file-size limit comes as an I/O error; its
-// cause is kept with the file, or in errno if it hit the journal.
+// SQLite reports a full disk as such only for ENOSPC on a write. A quota or file-size limit comes as an I/O
+// error, and so does a full disk that shows at a flush; the cause is kept with the file, or in errno if it
+// hit the journal. The file's note may be of an earlier failure, so it does not count against a plain EIO.
 bool NoSpaceLeft(sqlite3* database, int code) {
   if (code != SQLITE_IOERR) {
     return code == SQLITE_FULL;
   }
+  const int lastError = sqlite3_system_errno(database);
   int fileError = 0;
   sqlite3_file_control(database, "main", SQLITE_FCNTL_LAST_ERRNO, &fileError);
-  return IsNoSpace(fileError) || IsNoSpace(sqlite3_system_errno(database));
+  return IsNoSpace(lastError) || (lastError != EIO && IsNoSpace(fileError));
 }
 
 RuntimeError ConstraintError(int extendedCode, const std::string& message) {
@@ -39,6 +41,11 @@ RuntimeError ConstraintError(int extendedCode, const std::string& message) {
 }
 
 }  // namespace
+
+RuntimeError CannotOpen(const std::string& path) {
+  return {Fault::DatabaseCannotOpen,
+          "Cannot open the file '" + path + "'. You may lack the permission for it."};
+}
 
 RuntimeError UnrecognizedFormat(const std::string& path) {
   return {Fault::UnrecognizedDatabase, "Unrecognized database format '" + path + "'."};
@@ -67,8 +74,7 @@ RuntimeError SqliteError(sqlite3* database, const std::string& path) {
     case SQLITE_CANTOPEN:
     case SQLITE_PERM:
     case SQLITE_AUTH:
-      return {Fault::DatabaseCannotOpen,
-              "Cannot open the file '" + path + "'. You may lack the permission for it."};
+      return CannotOpen(path);
     case SQLITE_CORRUPT:
     case SQLITE_NOTADB:
       return UnrecognizedFormat(path);

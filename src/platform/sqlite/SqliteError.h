@@ -15,5 +15,8 @@ inline constexpr int SqliteInvalidPattern = 1 | (93 << 8);
 /// anything else. Throws std::bad_alloc if SQLite ran out of memory.
 RuntimeError SqliteError(sqlite3* database, const std::string& path);
 
+/// RuntimeError 3051: the file at `path` cannot be opened.
+RuntimeError CannotOpen(const std::string& path);
+
 /// RuntimeError 3343: the file at `path` is not a database, or is damaged.
 RuntimeError UnrecognizedFormat(const std::string& path);
