@@ -227,9 +227,9 @@ std::int64_t SqliteConnection::ChangedRows() const {
   return sqlite3_changes64(handle_);
 }
 
-void SqliteConnection::Fail() {
+void SqliteConnection::Fail(int systemError) {
   try {
-    throw SqliteError(handle_, path_);
+    throw SqliteError(handle_, path_, systemError);
   } catch (...) {  // std::bad_alloc as well
     Undo();
     throw;
@@ -242,12 +242,13 @@ void SqliteConnection::Commit() {
   if (sqlite3_get_autocommit(handle_) != 0) {
     throw RuntimeError(Fault::NoTransaction);  // rolled back by a fault in one of the writes
   }
+  errno = 0;
   const int result = sqlite3_exec(handle_, "COMMIT", nullptr, nullptr, nullptr);
   if (result == SQLITE_OK) {
     return;
   }
   try {
-    Fail();
+    Fail(errno);
   } catch (...) {
     if (!HoldsWhatWasWritten(result)) {
       throw;
@@ -261,12 +262,22 @@ bool SqliteConnection::HoldsWhatWasWritten(int commitResult) {
     return false;  // another program's lock, which is found before anything is written
   }
   try {
-    return written_.AreIn(*this);
-  } catch (...) {
-    // The file cannot be asked now. These two faults come from steps after the deletion of the journal; with
-    // any other the journal is still there, and the next one who reads the file puts the old rows back.
-    return commitResult == SQLITE_IOERR_DIR_FSYNC || commitResult == SQLITE_IOERR_UNLOCK;
+    if (!written_.AreIn(*this)) {
+      return false;
+    }
+    // SQLite takes a journal that it cannot see for one that is not there, and then reads rows that the next
+    // one who sees it takes back.
+    struct stat info {};
+    if (stat(sqlite3_filename_journal(sqlite3_db_filename(handle_, "main")), &info) != 0 && errno == ENOENT) {
+      return true;
+    }
+  } catch (...) {  // the file cannot be asked now
   }
+  // These faults come from steps after the deletion of the journal: the flush of its folder, and giving up
+  // the lock or all of it but the right to read. With any other the journal is still there, and the next one
+  // who reads the file puts the old rows back.
+  return commitResult == SQLITE_IOERR_DIR_FSYNC || commitResult == SQLITE_IOERR_UNLOCK ||
+         commitResult == SQLITE_IOERR_RDLOCK;
 }
 
 // Makes the deletion of the journal durable where SQLite failed to. Should it fail again, the change is still

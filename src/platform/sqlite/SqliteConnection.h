@@ -52,7 +52,7 @@ class SqliteConnection {
   std::int64_t ChangedRows() const;
 
   /// Rolls back the open transaction and throws the error of the last SQLite call.
-  [[noreturn]] void Fail();
+  [[noreturn]] void Fail(int systemError = 0);
 
  private:
   friend class WriteTransaction;
