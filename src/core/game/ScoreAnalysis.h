@@ -22,11 +22,11 @@ class ScoreAnalysis {
         players_(players),
         teams_(teams) {}
 
-  /// Throws RuntimeError 6 when a figure leaves the 32-bit range; the lists are then incomplete.
+  /// Throws RuntimeError 6 if a figure leaves the 32-bit range; the lists are then incomplete.
   void CalculateScores();
 
  private:
-  /// What the active mission pays and takes.
+  /// Rewards and penalties of the active mission.
   struct MissionPoints {
     std::array<double, TeamCount> Primary;    ///< by objective set
     std::array<double, TeamCount> Secondary;  ///< by objective set
@@ -35,14 +35,14 @@ class ScoreAnalysis {
   };
 
   void AddUpDamage();
-  /// The fast way for the usual game. Returns false, with nothing worth keeping, where only the other way
-  /// gives the right figures or the right failure.
+  /// The fast way, for ordinary games. Returns false, with useless figures, if only the other way gives the
+  /// right figures or the right error.
   bool AddUpDamageAtOnce();
   void AddUpDamageHitByHit();
-  /// True when friendly fire counts: the mode is not a free-for-all, and both are of one team.
+  /// True if this counts as friendly fire: both are on one team, and the mode is not Free For All.
   bool IsOwnTeamHit(int victim, int shooter) const;
   void ScorePlayer(int index);
-  /// Finds the member by the button where none is assigned. Empty when there is none.
+  /// Looks the member up by button if none is assigned. Empty if there is none.
   std::string NameOfMember(Player& player);
   void CalculateAccuracy(Player& player) const;
   void CalculateSoldiering(Player& player) const;
@@ -56,5 +56,5 @@ class ScoreAnalysis {
   MemberLookup& members_;
   Board& players_;
   Board& teams_;
-  std::optional<MissionPoints> missionPoints_;  ///< read once a calculation
+  std::optional<MissionPoints> missionPoints_;  ///< read once per calculation
 };
