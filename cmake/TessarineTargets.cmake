@@ -1,14 +1,14 @@
-# Warnings and strictness that all of our own code shares.
+# Warnings and restrictions for all of our own code.
 add_library(tessarine_options INTERFACE)
 target_compile_options(tessarine_options INTERFACE
   -Wall -Wextra -Wpedantic -Werror -Wshadow -Wconversion -Wno-sign-conversion -Wnon-virtual-dtor
   -Woverloaded-virtual -Wold-style-cast -Wcast-align -Wnull-dereference -Wformat=2
-  -fno-math-errno)  # nobody looks at it, and rounding becomes one instruction
+  -fno-math-errno)  # errno is never checked, and rounding becomes one instruction
 target_compile_definitions(tessarine_options INTERFACE
   QT_NO_CAST_FROM_ASCII QT_NO_CAST_TO_ASCII QT_NO_URL_CAST_FROM_STRING QT_NO_NARROWING_CONVERSIONS_IN_CONNECT
   QT_NO_FOREACH QT_USE_QSTRINGBUILDER)
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
-  # gcc 12 reports faults inside the standard library's own code when it inlines strings and vectors.
+  # gcc 12 warns about the standard library's own code when it inlines strings and vectors.
   target_compile_options(tessarine_options INTERFACE
     -Wno-null-dereference -Wno-restrict -Wno-array-bounds -Wno-stringop-overflow -Wno-stringop-overread)
 endif()
@@ -18,7 +18,7 @@ if(TESSARINE_SANITIZE)
   target_link_options(tessarine_options INTERFACE -fsanitize=address,undefined,fuzzer-no-link)
 endif()
 
-# What the program is made of: the same, with src/ as include root.
+# The same for the program's code, with src/ as include root.
 add_library(tessarine_source INTERFACE)
 target_link_libraries(tessarine_source INTERFACE tessarine_options)
 target_include_directories(tessarine_source INTERFACE ${CMAKE_SOURCE_DIR}/src)
@@ -30,7 +30,7 @@ function(tessarine_library name)
 endfunction()
 
 # tessarine_test_label(<label>): fails unless it is one of the four kinds of tests.
-#   logic   no window, no line, no other program: together a matter of seconds
+#   logic   no window, no line, no other program; all of them take seconds
 #   window  windows, offscreen, with mouse and key events
 #   wire    over pseudo terminals: the real serial part, the simulated venue
 #   real    real parts of the platform: files, databases, old installations, the word processor
@@ -40,9 +40,9 @@ function(tessarine_test_label label)
   endif()
 endfunction()
 
-# tessarine_test(<name> [LABEL <label>] LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest knows
-# one by one: a process for each costs 8 ms, and a thousand of them are still seconds. Without a label those with the main
-# program of window tests are window tests, and all others logic.
+# tessarine_test(<name> [LABEL <label>] LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest runs
+# one by one: a process for each costs 8 ms, so a thousand still take only seconds. Without a label, programs that use the
+# main program of window tests are window tests, all others logic.
 function(tessarine_test name)
   cmake_parse_arguments(ARG "" "LABEL" "LIBS;SOURCES" ${ARGN})
   if(NOT ARG_LABEL AND "tessarine_test_windows" IN_LIST ARG_LIBS)
@@ -54,8 +54,8 @@ function(tessarine_test name)
   add_executable(${name} ${ARG_SOURCES})
   target_link_libraries(${name} PRIVATE ${ARG_LIBS} tessarine_options GTest::gmock GTest::gtest_main)
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/src)
-  # A test's own code runs once: half the time to build it is worth more than its speed.
-  # One precompiled header serves all, the first program's: so all are compiled with -fPIC, which the toolkit asks for.
+  # A test's own code runs only once: building it in half the time is worth more than its speed.
+  # All share the first program's precompiled header, so all are compiled with -fPIC, which Qt requires.
   target_compile_options(${name} PRIVATE -O0 -fPIC)
   get_property(owner GLOBAL PROPERTY TESSARINE_TEST_HEADERS)
   if(owner)
