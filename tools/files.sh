@@ -1,6 +1,6 @@
 # For the other scripts in this folder: the project's own files.
 
-# OurFiles PATTERN...: the files that git lists (committed or just added) and that still exist. Without git the folder is searched.
+# OurFiles PATTERN...: existing files that git lists, committed or just added. Without git the folder is searched.
 OurFiles() {
   local file
   { git ls-files -- "$@" 2> /dev/null || FoundFiles "$@"; } | while IFS= read -r file; do
