@@ -27,8 +27,8 @@ enum class AccuracyKind { Known, NoShots, NoPrimaryDamage };
 struct BoardRow {
   int Index = 0;                ///< record of the player, 1 to 224; 0 for a team
   int Team = 0;                 ///< 1 to 3
-  std::int32_t Rank = 0;        ///< the record's rank, or 0 for a team; if `Placed`, the place
-  bool Placed = false;          ///< a sort has assigned the place
+  std::int32_t Rank = 0;        ///< the one that the record had, or a team's 0; with `Placed` the place
+  bool Placed = false;          ///< a sort has given the row its place
   std::string MemberName = {};  ///< empty for a player who is no member
   std::int32_t Soldiering = 0;
   AccuracyKind HasAccuracy = AccuracyKind::Known;
@@ -65,8 +65,8 @@ class Board {
   void Sort(BoardColumn column);
 
   const std::function<void()> changed_;
-  std::vector<BoardRow> rows_;      ///< in the order in which they were added
-  std::vector<std::size_t> order_;  ///< indexes into `rows_` in display order
+  std::vector<BoardRow> rows_;      ///< in the order of adding
+  std::vector<std::size_t> order_;  ///< indexes into `rows_` as shown
 };
 
 /// Sorts by the numbers that `column` shows, in the list's current direction; an accuracy counts with its two

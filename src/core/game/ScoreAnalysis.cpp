@@ -137,7 +137,7 @@ bool ScoreAnalysis::IsOwnTeamHit(int victim, int shooter) const {
 void ScoreAnalysis::ScorePlayer(int index) {
   Player& player = game_.Players(index);
   const int team = TeamFromId(IdFromIndex(index));
-  // Whatever may show a box comes before the row is added: a command given meanwhile can rebuild the lists.
+  // What may show a box comes before the row: a command given meanwhile can rebuild the lists.
   std::string memberName = NameOfMember(player);
   CalculateAccuracy(player);
   CalculateSoldiering(player);

@@ -22,7 +22,7 @@ class ScoreAnalysis {
         players_(players),
         teams_(teams) {}
 
-  /// Throws RuntimeError 6 if a figure leaves the 32-bit range; the lists are then incomplete.
+  /// Throws RuntimeError 6 when a figure leaves the 32-bit range; the lists are then incomplete.
   void CalculateScores();
 
  private:
@@ -42,7 +42,7 @@ class ScoreAnalysis {
   /// True if this counts as friendly fire: both are on one team, and the mode is not Free For All.
   bool IsOwnTeamHit(int victim, int shooter) const;
   void ScorePlayer(int index);
-  /// Looks the member up by button if none is assigned. Empty if there is none.
+  /// Finds the member by the button where none is assigned. Empty when there is none.
   std::string NameOfMember(Player& player);
   void CalculateAccuracy(Player& player) const;
   void CalculateSoldiering(Player& player) const;

@@ -84,7 +84,7 @@ class Session {
   Database& DbMembers() { return *dbMembers_; }
   Recordset& RsMembers() { return *rsMembers_; }
 
-  /// Throws as ScoreAnalysis::CalculateScores does; the lists are then incomplete, and no Scores follows.
+  /// Throws as ScoreAnalysis::CalculateScores does; the lists are then incomplete, and Scores is not told.
   void CalculateScores();
   /// Does the same, but only if there is a game and the databases are open.
   void CalculateScoresWhenPresent();
@@ -92,7 +92,7 @@ class Session {
   /// Sorts the players as a click on column header `header` (counted from 1) does.
   void SortByHeader(int header);
 
-  /// Rereads the missions and makes "None" the active one.
+  /// Reads the missions anew and makes "None" the active one.
   void FillMissionList();
   /// Makes entry `index` of the missions the active one. A box reports a mission whose row is gone.
   void SelectMission(int index);
