@@ -1,14 +1,14 @@
-# Warnings and restrictions for all of our own code.
+# Warnings and strictness that all of our own code shares.
 add_library(tessarine_options INTERFACE)
 target_compile_options(tessarine_options INTERFACE
   -Wall -Wextra -Wpedantic -Werror -Wshadow -Wconversion -Wno-sign-conversion -Wnon-virtual-dtor
   -Woverloaded-virtual -Wold-style-cast -Wcast-align -Wnull-dereference -Wformat=2
-  -fno-math-errno)  # errno is never checked, and rounding becomes one instruction
+  -fno-math-errno)  # nobody looks at it, and rounding becomes one instruction
 target_compile_definitions(tessarine_options INTERFACE
   QT_NO_CAST_FROM_ASCII QT_NO_CAST_TO_ASCII QT_NO_URL_CAST_FROM_STRING QT_NO_NARROWING_CONVERSIONS_IN_CONNECT
   QT_NO_FOREACH QT_USE_QSTRINGBUILDER)
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
-  # gcc 12 warns about the standard library's own code when it inlines strings and vectors.
+  # gcc 12 reports faults inside the standard library's own code when it inlines strings and vectors.
   target_compile_options(tessarine_options INTERFACE
     -Wno-null-dereference -Wno-restrict -Wno-array-bounds -Wno-stringop-overflow -Wno-stringop-overread)
 endif()
@@ -18,7 +18,7 @@ if(TESSARINE_SANITIZE)
   target_link_options(tessarine_options INTERFACE -fsanitize=address,undefined,fuzzer-no-link)
 endif()
 
-# The same for the program's code, with src/ as include root.
+# What the program is made of: the same, with src/ as include root.
 add_library(tessarine_source INTERFACE)
 target_link_libraries(tessarine_source INTERFACE tessarine_options)
 target_include_directories(tessarine_source INTERFACE ${CMAKE_SOURCE_DIR}/src)
@@ -29,8 +29,29 @@ function(tessarine_library name)
   target_link_libraries(${name} PUBLIC tessarine_source)
 endfunction()
 
+# tessarine_precompile(<target> <kind> <header>...): the first target of a kind precompiles the headers, and the others of
+# that kind use the result, so all of them need the same compiler options.
+function(tessarine_precompile target kind)
+  get_property(owner GLOBAL PROPERTY TESSARINE_HEADERS_OF_${kind})
+  if(owner)
+    target_precompile_headers(${target} REUSE_FROM ${owner})
+  else()
+    target_precompile_headers(${target} PRIVATE ${ARGN})
+    set_property(GLOBAL PROPERTY TESSARINE_HEADERS_OF_${kind} ${target})
+  endif()
+endfunction()
+
+# tessarine_windows(<name> <sources>...): the windows of one folder, with their forms. Qt's headers are precompiled: reading
+# them would take most of the build.
+function(tessarine_windows name)
+  tessarine_library(${name} ${ARGN})
+  target_link_libraries(${name} PUBLIC Qt6::Widgets)
+  set_target_properties(${name} PROPERTIES AUTOMOC ON AUTOUIC ON AUTORCC ON)
+  tessarine_precompile(${name} windows <QtWidgets>)
+endfunction()
+
 # tessarine_test_label(<label>): fails unless it is one of the four kinds of tests.
-#   logic   no window, no line, no other program; all of them take seconds
+#   logic   no window, no line, no other program: together a matter of seconds
 #   window  windows, offscreen, with mouse and key events
 #   wire    over pseudo terminals: the real serial part, the simulated venue
 #   real    real parts of the platform: files, databases, old installations, the word processor
@@ -40,9 +61,9 @@ function(tessarine_test_label label)
   endif()
 endfunction()
 
-# tessarine_test(<name> [LABEL <label>] LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest runs
-# one by one: a process for each costs 8 ms, so a thousand still take only seconds. Without a label, programs that use the
-# main program of window tests are window tests, all others logic.
+# tessarine_test(<name> [LABEL <label>] LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest knows
+# one by one: a process for each costs 8 ms, and a thousand of them are still seconds. Without a label those with the main
+# program of window tests are window tests, and all others logic.
 function(tessarine_test name)
   cmake_parse_arguments(ARG "" "LABEL" "LIBS;SOURCES" ${ARGN})
   if(NOT ARG_LABEL AND "tessarine_test_windows" IN_LIST ARG_LIBS)
@@ -54,15 +75,14 @@ function(tessarine_test name)
   add_executable(${name} ${ARG_SOURCES})
   target_link_libraries(${name} PRIVATE ${ARG_LIBS} tessarine_options GTest::gmock GTest::gtest_main)
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/src)
-  # A test's own code runs only once: building it in half the time is worth more than its speed.
-  # All share the first program's precompiled header, so all are compiled with -fPIC, which Qt requires.
+  # A test's own code runs only once: building it in half the time is worth more than its speed. Qt requires -fPIC.
   target_compile_options(${name} PRIVATE -O0 -fPIC)
-  get_property(owner GLOBAL PROPERTY TESSARINE_TEST_HEADERS)
-  if(owner)
-    target_precompile_headers(${name} REUSE_FROM ${owner})
+  if("tessarine_test_windows" IN_LIST ARG_LIBS)
+    # Qt defines these differently in each folder and its headers use them, so precompiled ones could not be shared.
+    target_compile_options(${name} PRIVATE -UQT_TESTCASE_BUILDDIR -UQT_TESTCASE_SOURCEDIR)
+    tessarine_precompile(${name} window_tests <gmock/gmock.h> <gtest/gtest.h> <QtTest> <QtWidgets>)
   else()
-    target_precompile_headers(${name} PRIVATE <gmock/gmock.h> <gtest/gtest.h>)
-    set_property(GLOBAL PROPERTY TESSARINE_TEST_HEADERS ${name})
+    tessarine_precompile(${name} tests <gmock/gmock.h> <gtest/gtest.h>)
   endif()
   include(GoogleTest)
   gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 120 LABELS ${ARG_LABEL}
