@@ -148,7 +148,7 @@ TEST_F(Sorting, OfAColumnLeavesThePlaces) {
   Add(2, Red(1), 5);
   Add(1, Red(2), 7);
   SortByHeader(list, 3, game);
-  EXPECT_THAT(Column(BoardColumn::Rank), ElementsAre(" 1", " 2"));
+  EXPECT_THAT(Column(BoardColumn::Rank), ElementsAre("1", "2"));
   EXPECT_EQ(game.Players(Red(1)).Rank, 0);
 }
 
@@ -156,7 +156,7 @@ TEST_F(Sorting, ByRankWritesEachPlaceIntoTheRecordOfThatNumber) {
   Add(2, Blue(4), 5);
   Add(1, Yellow(9), 7);
   SortByHeader(list, 1, game);
-  EXPECT_THAT(Column(BoardColumn::Rank), ElementsAre(" 1", " 2"));
+  EXPECT_THAT(Column(BoardColumn::Rank), ElementsAre("1", "2"));
   EXPECT_EQ(game.Players(1).Rank, 1);
   EXPECT_EQ(game.Players(2).Rank, 2);
   EXPECT_EQ(game.Players(Blue(4)).Rank, 0);
