@@ -292,6 +292,12 @@ TEST(FormatPercent, ShowsTwoDecimals) {
   EXPECT_EQ(FormatPercent(0.0001), "0.01%");
   EXPECT_EQ(FormatPercent(0.055), "5.50%");
   EXPECT_EQ(FormatPercent(12345.678), "1234567.80%");
+  EXPECT_EQ(FormatPercent(-0.1), "-10.00%");
+  EXPECT_EQ(FormatPercent(-0.1F), "-10.00%");
+  EXPECT_EQ(FormatPercent(-0.01), "-1.00%");
+  EXPECT_EQ(FormatPercent(-0.001), "-0.10%");
+  EXPECT_EQ(FormatPercent(-1.1), "-110.00%");
+  EXPECT_EQ(FormatPercent(-12345.678), "-1234567.80%");
   EXPECT_EQ(FormatPercent(1E20), "10000000000000000000000.00%");
 }
 
