@@ -104,7 +104,7 @@ std::vector<std::string_view> CutPlayers(std::string_view bytes) {
 /// Parses one of the texts from CutPlayers, with `text` as work space.
 bool ParsePlayer(std::string_view player, std::string& text, pugi::xml_document& document) {
   text = player;
-  return Parse(text, document) && document.child("Player");
+  return Parse(text, document);
 }
 
 /// Parses the file without its players. Returns false unless parsing these one by one gives the same players

@@ -92,6 +92,11 @@ TEST_F(Players, OfSeveralPlayerDatasCountTogether) {
                        "</PlayerData></GameData>")
                   .value(),
               ElementsAre(3, 5, 9));
+  EXPECT_THAT(ActiveIn("<GameData><PlayerData>" + PlayerOf(3) +
+                       "</PlayerData><PlayerData><Player ><Index>9</Index><Active>1</Active></Player >"
+                       "</PlayerData></GameData>")
+                  .value(),
+              ElementsAre(3, 9));
 }
 
 TEST_F(Players, MakeTheWholeFileInvalidWhenOneIsMalformed) {
@@ -160,7 +165,8 @@ class RandomFiles : public Players {
   }
 
   std::string Oddity() {
-    static constexpr const char* oddities[] = {"<Player>",
+    static constexpr const char* oddities[] = {"<Player ><Index>5</Index><Active>1</Active></Player >",
+                                               "<Player>",
                                                "</Player>",
                                                "<Player/>",
                                                "<Player >",
