@@ -204,9 +204,6 @@ void ScoreAnalysis::CalculateSoldiering(Player& player) const {
 }
 
 void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName) {
-  if (missions_.ListIndex() <= MissionList::FreeForAll) {
-    return;
-  }
   if (!missionPoints_) {
     if (!missions_.ActivateCurrentMissionRecord()) {
       return;

@@ -243,6 +243,14 @@ TEST(Damage, OutsideTheRangeIsAnOverflowEvenOfInactivePlayers) {
   }
 }
 
+TEST(Damage, OutsideTheRangeOnTheWayIsAnOverflowThoughTheSumIsNot) {
+  ScoredGame venue;
+  venue.game.Players(Red1).HitByPlayer(Red0) = 1;
+  venue.game.Players(Blue0).HitByPlayer(Red0) = Most;
+  venue.game.Players(Blue7).HitByPlayer(Red0) = -Most;
+  EXPECT_EQ(NumberThrownBy([&venue] { venue.CalculateScores(); }), 6);
+}
+
 TEST(Damage, IsNotOutsideTheRangeWhileNobodyOfTheTeamIsHit) {
   ScoredGame venue;
   venue.Factors.FriendlyFire = 1e300;

@@ -228,8 +228,12 @@ TEST_F(Sessions, ForgetTheGameButNotTheMission) {
 TEST_F(Sessions, TellOfAMissionBeforeAndAfterItsRowIsLookedFor) {
   AddMissions();
   Start();
+  std::vector<int> chosen;
+  const Subscription choices =
+      session.Listen([&](Change) { chosen.push_back(session.Missions().ListIndex()); });
   session.SelectMission(2);
   EXPECT_THAT(told, ElementsAre(Change::Mission, Change::MissionRow));
+  EXPECT_THAT(chosen, ElementsAre(2, 2));
   EXPECT_TRUE(session.MissionIsActive());
   EXPECT_EQ(session.MissionDescription(), "Hold it");
   EXPECT_EQ(IntegerOf(session.RsScenarios(), "ID"), 3);
