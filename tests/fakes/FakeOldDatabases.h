@@ -7,12 +7,12 @@
 #include "platform/OldDatabases.h"
 #include "platform/RuntimeError.h"
 
-/// Old files by path; converting one takes it out of `OldPaths`.
+/// Old files by path; converting one removes it from `OldPaths`.
 class FakeOldDatabases : public OldDatabases {
  public:
   std::set<std::string> OldPaths;
   OldDatabaseReport Report;
-  std::string Failure;                 ///< when it is not empty, every conversion fails with this text
+  std::string Failure;                 ///< if not empty, every conversion fails with this text
   std::vector<std::string> Converted;  ///< "path table empty" of each call
 
   bool IsOld(const std::string& path) const override { return OldPaths.count(path) != 0; }
