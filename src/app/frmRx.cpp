@@ -11,6 +11,7 @@
 #include "board/PlayerDelegate.h"
 #include "board/ScoreListModel.h"
 #include "core/data/FirstRun.h"
+#include "ui/Choice.h"
 #include "ui_frmRx.h"
 
 frmRx::frmRx(const Services& services)
@@ -101,8 +102,8 @@ void frmRx::ConnectCommands() {
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
   connect(ui_->RemoteManageButton, &QPushButton::clicked, ui_->mnuRemoteManage, &QAction::trigger);
-  connect(ui_->ActiveMission, &QComboBox::currentIndexChanged, this,
-          [this](int index) { commands_.Run([this, index] { session_.SelectMission(index); }); });
+  OnChoice(*ui_->ActiveMission,
+           [this](int index) { commands_.Run([this, index] { session_.SelectMission(index); }); });
   connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this,
           [this](int section) { commands_.Run([this, section] { session_.SortByHeader(section + 1); }); });
   connect(ui_->ScoreDisplay, &QWidget::customContextMenuRequested, this,

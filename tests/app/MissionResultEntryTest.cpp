@@ -116,6 +116,17 @@ TEST_F(Results, StayAsTheyWereWhenTheWindowIsClosedByItsBox) {
   EXPECT_THAT(Scores(), ElementsAre(100, 0, 0));
 }
 
+TEST_F(Results, ScoreTheGameAnewHoweverTheWindowIsClosed) {
+  Open([this] { Box("PrimaryCompleted1").setChecked(true); });
+  ASSERT_THAT(Scores(), ElementsAre(100, 0, 0));
+  venue.ChangeDatabase("scenarios.mdb", "UPDATE Table1 SET PrimaryObjectivePointsA = 70");
+  Open([] {}, true);
+  EXPECT_THAT(Scores(), ElementsAre(70, 0, 0));
+  venue.ChangeDatabase("scenarios.mdb", "UPDATE Table1 SET PrimaryObjectivePointsA = 60");
+  Open([] {});
+  EXPECT_THAT(Scores(), ElementsAre(60, 0, 0));
+}
+
 TEST_F(Results, StayTickedForTheNextGame) {
   Open([this] { Box("PrimaryCompleted1").setChecked(true); });
   venue.Trigger("mnuClearScores");
