@@ -138,6 +138,27 @@ TEST_P(PrintOptionsWindow, OfTheProgressShowsSheetAndName) {
   EXPECT_FALSE(progress.isVisible());
 }
 
+TEST_P(PrintOptionsWindow, OfTheProgressHasABarThatBeginsEmptyInEachRun) {
+  SheetProgressWindow progress(strings, nullptr);
+  const auto& bar = Find<QProgressBar>(progress, "Progress");
+  for (int run = 1; run <= 2; ++run) {
+    progress.Open();
+    EXPECT_EQ(bar.minimum(), bar.maximum());  // moving until the word processor has started
+    EXPECT_EQ(Find<QLabel>(progress, "SheetLabel").text().toStdString(),
+              strings.Text(OwnText::StartingWordProcessor));
+    EXPECT_EQ(Find<QLabel>(progress, "PlayerLabel").text(), QString());
+    EXPECT_TRUE(Find<QPushButton>(progress, "Stop").isEnabled());
+    progress.ShowSheet(1, 3, "Red 0-Guest");
+    EXPECT_EQ(bar.minimum(), 0);
+    EXPECT_EQ(bar.maximum(), 3);
+    EXPECT_EQ(bar.value(), 0);
+    progress.ShowSheet(3, 3, "Red 2-Guest");
+    EXPECT_EQ(bar.value(), 2);
+    progress.reject();
+    progress.Close();
+  }
+}
+
 TEST_P(PrintOptionsWindow, OfTheProgressShowsAnHourglassButNotInTheBoxesAfterIt) {
   SheetProgressWindow progress(strings, nullptr);
   progress.Open();
