@@ -43,12 +43,15 @@ Size OwnSize(const Reference<XPropertySet>& graphic) {
           static_cast<sal_Int32>(pixels.Height * Inch / dotsPerInch)};
 }
 
-/// Height of a page's text.
+/// Height of the text of the paragraph's page; 0 if the paragraph is hidden and thus on no page.
 sal_Int32 PageRoom(const Reference<text::XTextDocument>& document, const Reference<XPropertySet>& paragraph) {
   const Reference<com::sun::star::style::XStyleFamiliesSupplier> styles(document, UNO_QUERY_THROW);
   const Reference<XNameAccess> pages(styles->getStyleFamilies()->getByName("PageStyles"), UNO_QUERY_THROW);
-  const Reference<XPropertySet> page(pages->getByName(Property<OUString>(paragraph, "PageStyleName")),
-                                     UNO_QUERY_THROW);
+  const OUString name = Property<OUString>(paragraph, "PageStyleName");
+  if (!pages->hasByName(name)) {
+    return 0;
+  }
+  const Reference<XPropertySet> page(pages->getByName(name), UNO_QUERY_THROW);
   const auto ifOn = [&page](const char* isOn, const char* height) {
     return Property<bool>(page, isOn) ? Length(page, height) : 0;
   };
@@ -77,10 +80,12 @@ sal_Int32 WidthRoom(const Reference<XPropertySet>& picture) {
   return laidOut.Width;
 }
 
-/// `own` made smaller, if need be, to fit into `room`.
+/// `own` made smaller, if need be, to fit into `room`, where only a length above 0 is a limit.
 Size Fit(const Size& own, const Size& room) {
-  const double scale = std::min({1.0, static_cast<double>(std::max(room.Width, sal_Int32{1})) / own.Width,
-                                 static_cast<double>(std::max(room.Height, sal_Int32{1})) / own.Height});
+  const auto scaleTo = [](sal_Int32 limit, sal_Int32 length) {
+    return limit > 0 ? static_cast<double>(limit) / length : 1.0;
+  };
+  const double scale = std::min({1.0, scaleTo(room.Width, own.Width), scaleTo(room.Height, own.Height)});
   return {std::max(sal_Int32{1}, static_cast<sal_Int32>(own.Width * scale)),
           std::max(sal_Int32{1}, static_cast<sal_Int32>(own.Height * scale))};
 }

@@ -46,7 +46,7 @@ std::string Jpeg(std::uint32_t width, std::uint32_t height, char unit, std::uint
 }
 
 /// A table of one row in a Word 2007 file. Widths are in twips (1/1440 inch).
-std::string Table(const std::string& width, const std::vector<int>& cells) {
+std::string Table(const std::string& width, const std::vector<int>& cells, const std::string& place = "") {
   std::string grid;
   std::string whole;
   for (const int cell : cells) {
@@ -54,8 +54,8 @@ std::string Table(const std::string& width, const std::vector<int>& cells) {
     whole += "<w:tc><w:tcPr><w:tcW w:w=\"" + std::to_string(cell) +
              "\" w:type=\"dxa\"/></w:tcPr><w:p><w:r><w:t>cell</w:t></w:r></w:p></w:tc>";
   }
-  return "<w:tbl><w:tblPr><w:tblW " + width + "/></w:tblPr><w:tblGrid>" + grid + "</w:tblGrid><w:tr>" +
-         whole + "</w:tr></w:tbl><w:p/>";
+  return "<w:tbl><w:tblPr>" + place + "<w:tblW " + width + "/></w:tblPr><w:tblGrid>" + grid +
+         "</w:tblGrid><w:tr>" + whole + "</w:tr></w:tbl><w:p/>";
 }
 
 const std::string Automatic = R"(w:w="0" w:type="auto")";
@@ -132,7 +132,8 @@ class APictureOnASheet : public Writer {
  private:
   /// Width or height of the only picture, in millimetres.
   static double Measured(const std::string& sheet, const std::string& attribute) {
-    const std::regex form("<draw:frame [^>]*svg:" + attribute + "=\"([0-9.]+)(in|cm|mm)\"");
+    const std::regex form("<draw:frame [^>]*svg:" + attribute +
+                          "=\"([0-9.]+)(in|cm|mm)\"[^>]*>\\s*<draw:image");
     std::smatch found;
     if (!std::regex_search(sheet, found, form)) {
       return 0;
@@ -167,6 +168,15 @@ TEST_F(APictureOnASheet, IsAsWideAsItsCellAtMost) {
 
 TEST_F(APictureOnASheet, IsNoWiderThanThePageInACellThatIs) {
   ExpectSizes({{WordTemplate(Table(Automatic, {20000, 3000})), Bmp(3000, 400), {159.2, 21.23}}});
+}
+
+TEST_F(APictureOnASheet, FitsIntoATableThatTextFlowsAround) {
+  const std::string place =
+      R"(<w:tblpPr w:vertAnchor="page" w:horzAnchor="page" w:tblpX="3000" w:tblpY="3000"/>)";
+  const std::string floating =
+      Table(Automatic, {2000, 2000}, place) + "<w:p><w:r><w:t>text</w:t></w:r></w:p>";
+  ExpectSizes({{WordTemplate(floating), Bmp(100, 100), {26.46, 26.46}},
+               {WordTemplate(floating), Bmp(3000, 400), {31.47, 4.20}}});
 }
 
 TEST_F(APictureOnASheet, IsNoHigherThanThePage) {
