@@ -30,6 +30,14 @@ TEST(EndOfAJpeg, IsNotThatOfAPictureInASegment) {
   EXPECT_FALSE(IsCutShort("\xFF\xD8"s + segment + rest + "\xFF\xD9", "jpeg"));
 }
 
+TEST(EndOfAJpeg, IsFoundBehindMarkersWithoutASegment) {
+  for (const char marker : {'\x00', '\x01', '\xD0', '\xD7', '\xD9'}) {
+    const std::string whole = "\xFF\xD8\xFF"s + marker + "\xFF\xDA\x00\x02\x11\xFF\xD9"s;
+    EXPECT_FALSE(IsCutShort(whole, "jpeg"));
+    EXPECT_TRUE(IsCutShort(Cut(whole, 1), "jpeg"));
+  }
+}
+
 TEST(EndOfAJpeg, IsFoundBehindFillBytesAndLongSegments) {
   const std::string longSegment = "\xFF\xE2\x01\x04"s + std::string(256, '\xFF') + "\xDA\x00"s;
   const std::string whole = "\xFF\xD8\xFF\xFF\xFF\x01junk"s + longSegment + "\xFF\xDA\x00\x02\x11\xFF\xD9"s;
@@ -93,6 +101,7 @@ TEST(EndOfABmp, IsLeftToTheReaderWhenItIsCompressed) {
 
 TEST(EndOfAPicture, IsTheReadersMatterInOtherFormats) {
   EXPECT_FALSE(IsCutShort("", "png"));
+  EXPECT_FALSE(IsCutShort(Cut(Bmp("\x02\x00\x00\x00"s), 1), "png"));
 }
 
 }  // namespace

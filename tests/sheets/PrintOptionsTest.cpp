@@ -4,6 +4,7 @@
 
 #include <QCheckBox>
 #include <QComboBox>
+#include <QGroupBox>
 #include <QLabel>
 #include <QProgressBar>
 #include <QRadioButton>
@@ -38,8 +39,18 @@ TEST_P(PrintOptionsWindow, IsCaredFor) {
   Show(window);
   ExpectCaredFor(window);
   EXPECT_EQ(window.windowTitle().toStdString(), strings.Text(159));
-  EXPECT_EQ(Find<QRadioButton>(window, "PrintOne").text().toStdString(), strings.Text(155));
-  EXPECT_EQ(Find<QRadioButton>(window, "PrintFile").text().toStdString(), strings.Text(157));
+  const std::pair<const char*, int> options[] = {{"PrintActive", 152},  {"PrintAll", 153},
+                                                 {"PrintTeam", 154},    {"PrintOne", 155},
+                                                 {"PrintPrinter", 156}, {"PrintFile", 157}};
+  for (const auto& [name, number] : options) {
+    EXPECT_EQ(Find<QRadioButton>(window, name).text().toStdString(), strings.Text(number));
+  }
+  const std::pair<const char*, int> frames[] = {{"Frame1", 149}, {"Frame2", 150}, {"Frame3", 151}};
+  for (const auto& [name, number] : frames) {
+    EXPECT_EQ(Find<QGroupBox>(window, name).title().toStdString(), strings.Text(number));
+  }
+  EXPECT_EQ(Find<QPushButton>(window, "OK").text().toStdString(), strings.Text(140));
+  EXPECT_EQ(Find<QPushButton>(window, "Cancel").text().toStdString(), strings.Text(141));
   EXPECT_EQ(Find<QCheckBox>(window, "HideRank").text().toStdString(), strings.Text(158));
 }
 
@@ -176,6 +187,10 @@ TEST_P(PrintOptionsWindow, OfTheProgressStaysUntilTheSheetIsDone) {
   EXPECT_TRUE(progress.Stopped());
   EXPECT_TRUE(progress.isVisible());
   EXPECT_FALSE(Find<QPushButton>(progress, "Stop").isEnabled());
+  const auto& label = Find<QLabel>(progress, "SheetLabel");
+  EXPECT_EQ(label.text().toStdString(), strings.Text(OwnText::StoppingAfterThisSheet));
+  progress.ShowSheet(1, 3, "Red 0-Guest");
+  EXPECT_EQ(label.text().toStdString(), strings.Text(OwnText::StoppingAfterThisSheet));
   progress.Close();
   progress.Open();
   EXPECT_FALSE(progress.Stopped());

@@ -8,6 +8,7 @@
 #include <com/sun/star/frame/XStorable.hpp>
 #include <com/sun/star/sheet/XCellRangeData.hpp>
 #include <com/sun/star/table/XCellRange.hpp>
+#include <com/sun/star/text/WrapTextMode.hpp>
 #include <com/sun/star/text/XBookmarksSupplier.hpp>
 #include <com/sun/star/text/XTextContent.hpp>
 #include <com/sun/star/text/XTextFrame.hpp>
@@ -122,6 +123,18 @@ void AddTable(const Any& part, BodyTables& names) {
   }
 }
 
+/// True unless the frame is a text box, which may begin with a table as well: text runs through it, or it
+/// keeps a distance (in 1/100 mm) from what is in it.
+bool IsOfFloatingTable(const Reference<text::XTextFrame>& frame) {
+  const Reference<com::sun::star::beans::XPropertySet> properties(frame, UNO_QUERY_THROW);
+  text::WrapTextMode wrap{};
+  properties->getPropertyValue("Surround") >>= wrap;
+  sal_Int32 distance = 0;
+  properties->getPropertyValue("LeftBorderDistance") >>= distance;
+  constexpr sal_Int32 rounding = 10;
+  return wrap != text::WrapTextMode_THROUGH && distance < rounding;
+}
+
 /// Word counts a table that text flows around among the body's tables. LibreOffice puts it first in a frame,
 /// which is anchored to the paragraph after it or to a character of that paragraph.
 void AddFloatingTables(const Any& place, BodyTables& names) {
@@ -130,7 +143,7 @@ void AddFloatingTables(const Any& place, BodyTables& names) {
       access->createContentEnumeration("com.sun.star.text.TextContent");
   while (hanging->hasMoreElements()) {
     const Reference<text::XTextFrame> frame(hanging->nextElement(), UNO_QUERY);
-    if (frame.is()) {
+    if (frame.is() && IsOfFloatingTable(frame)) {
       const Reference<container::XEnumerationAccess> inside(frame->getText(), UNO_QUERY_THROW);
       AddTable(inside->createEnumeration()->nextElement(), names);
     }

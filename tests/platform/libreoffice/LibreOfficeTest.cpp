@@ -12,6 +12,7 @@
 #include <thread>
 
 #include "platform/RuntimeError.h"
+#include "tests/platform/libreoffice/Docx.h"
 #include "tests/platform/libreoffice/OfficeStart.h"
 #include "tests/platform/libreoffice/Writer.h"
 #include "tests/support/TemporaryFolder.h"
@@ -141,8 +142,8 @@ TEST_F(Writer, CountsTablesThatTextFlowsAround) {
     return text + "</table:table>";
   };
   const auto inFrame = [](const std::string& anchor, const std::string& inside) {
-    return "<text:p><draw:frame text:anchor-type='" + anchor + "' svg:width='5cm'><draw:text-box>" + inside +
-           "</draw:text-box></draw:frame>behind</text:p>";
+    return "<text:p><draw:frame draw:style-name='floating' text:anchor-type='" + anchor +
+           "' svg:width='5cm'><draw:text-box>" + inside + "</draw:text-box></draw:frame>behind</text:p>";
   };
   WriteFile(folder / "floating.fodt",
             R"(<?xml version="1.0" encoding="UTF-8"?><office:document
@@ -150,8 +151,12 @@ TEST_F(Writer, CountsTablesThatTextFlowsAround) {
               xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
               xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
               xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
+              xmlns:style="urn:oasis:names:tc:opendocument:xmlns:style:1.0"
+              xmlns:fo="urn:oasis:names:tc:opendocument:xmlns:xsl-fo-compatible:1.0"
               xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
-              office:mimetype="application/vnd.oasis.opendocument.text"><office:body><office:text>)" +
+              office:mimetype="application/vnd.oasis.opendocument.text"><office:automatic-styles><style:style
+              style:name="floating" style:family="graphic" style:parent-style-name="Frame"><style:graphic-properties style:wrap="parallel"
+              fo:padding="0mm" fo:border="none"/></style:style></office:automatic-styles><office:body><office:text>)" +
                 inFrame("paragraph", table(1)) + table(2) + inFrame("char", table(3)) +
                 inFrame("char", "<text:p>box</text:p>") + table(4) +
                 "</office:text></office:body></office:document>");
@@ -165,6 +170,47 @@ TEST_F(Writer, CountsTablesThatTextFlowsAround) {
   }
   EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(5, 1, 20, {}); }), 9);
   document->Close();
+}
+
+/// A table of one column in a Word 2007 file, and a paragraph behind it.
+std::string WordTable(int rows, const std::string& place = "") {
+  std::string text =
+      "<w:tbl><w:tblPr>" + place + "</w:tblPr><w:tblGrid><w:gridCol w:w=\"2000\"/></w:tblGrid>";
+  for (int row = 0; row < rows; ++row) {
+    text += "<w:tr><w:tc><w:p/></w:tc></w:tr>";
+  }
+  return text + "</w:tbl><w:p><w:r><w:t>text</w:t></w:r></w:p>";
+}
+
+TEST_F(Writer, CountsNoTableInATextBox) {
+  const auto box = [](const std::string& wrap) {
+    return R"(<w:p><w:r><w:pict><v:shape xmlns:v="urn:schemas-microsoft-com:vml")"
+           R"( xmlns:w10="urn:schemas-microsoft-com:office:word")"
+           R"( style="position:absolute;width:200pt;height:100pt"><v:textbox><w:txbxContent>)" +
+           WordTable(1) + "</w:txbxContent></v:textbox>" + wrap + "</v:shape></w:pict></w:r></w:p>";
+  };
+  WriteFile(folder / "over.docx", Docx(box("") + WordTable(3)));
+  WriteFile(folder / "beside.docx", Docx(box(R"(<w10:wrap type="square"/>)") + WordTable(3)));
+  Convert({folder / "over.docx", folder / "beside.docx"}, "doc:MS Word 97");
+  for (const char* name : {"over.docx", "over.doc", "beside.docx", "beside.doc"}) {
+    const auto document = Office().Add(folder / name);
+    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 1, 20, {"1", "2", "3"}); }), 0) << name;
+    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {}); }), 9) << name;
+    document->Close();
+  }
+}
+
+TEST_F(Writer, CountsAFloatingTableOfAWordFile) {
+  const std::string place =
+      R"(<w:tblpPr w:vertAnchor="page" w:horzAnchor="page" w:tblpX="3000" w:tblpY="3000"/>)";
+  WriteFile(folder / "floating.docx", Docx(WordTable(2, place) + WordTable(3)));
+  Convert({folder / "floating.docx"}, "doc:MS Word 97");
+  for (const char* name : {"floating.docx", "floating.doc"}) {
+    const auto document = Office().Add(folder / name);
+    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 1, 20, {"1", "2", "3"}); }), 440) << name;
+    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {"1", "2", "3"}); }), 0) << name;
+    document->Close();
+  }
 }
 
 TEST_F(Writer, AddsPicturesWithPaddingAndRefusesOtherFiles) {
