@@ -4,6 +4,7 @@
 
 #include <QCheckBox>
 #include <QComboBox>
+#include <QGroupBox>
 #include <QLabel>
 #include <QProgressBar>
 #include <QRadioButton>
@@ -38,8 +39,18 @@ TEST_P(PrintOptionsWindow, IsCaredFor) {
   Show(window);
   ExpectCaredFor(window);
   EXPECT_EQ(window.windowTitle().toStdString(), strings.Text(159));
-  EXPECT_EQ(Find<QRadioButton>(window, "PrintOne").text().toStdString(), strings.Text(155));
-  EXPECT_EQ(Find<QRadioButton>(window, "PrintFile").text().toStdString(), strings.Text(157));
+  const std::pair<const char*, int> options[] = {{"PrintActive", 152},  {"PrintAll", 153},
+                                                 {"PrintTeam", 154},    {"PrintOne", 155},
+                                                 {"PrintPrinter", 156}, {"PrintFile", 157}};
+  for (const auto& [name, number] : options) {
+    EXPECT_EQ(Find<QRadioButton>(window, name).text().toStdString(), strings.Text(number));
+  }
+  const std::pair<const char*, int> frames[] = {{"Frame1", 149}, {"Frame2", 150}, {"Frame3", 151}};
+  for (const auto& [name, number] : frames) {
+    EXPECT_EQ(Find<QGroupBox>(window, name).title().toStdString(), strings.Text(number));
+  }
+  EXPECT_EQ(Find<QPushButton>(window, "OK").text().toStdString(), strings.Text(140));
+  EXPECT_EQ(Find<QPushButton>(window, "Cancel").text().toStdString(), strings.Text(141));
   EXPECT_EQ(Find<QCheckBox>(window, "HideRank").text().toStdString(), strings.Text(158));
 }
 
@@ -138,6 +149,27 @@ TEST_P(PrintOptionsWindow, OfTheProgressShowsSheetAndName) {
   EXPECT_FALSE(progress.isVisible());
 }
 
+TEST_P(PrintOptionsWindow, OfTheProgressHasABarThatBeginsEmptyInEachRun) {
+  SheetProgressWindow progress(strings, nullptr);
+  const auto& bar = Find<QProgressBar>(progress, "Progress");
+  for (int run = 1; run <= 2; ++run) {
+    progress.Open();
+    EXPECT_EQ(bar.minimum(), bar.maximum());  // moving until the word processor has started
+    EXPECT_EQ(Find<QLabel>(progress, "SheetLabel").text().toStdString(),
+              strings.Text(OwnText::StartingWordProcessor));
+    EXPECT_EQ(Find<QLabel>(progress, "PlayerLabel").text(), QString());
+    EXPECT_TRUE(Find<QPushButton>(progress, "Stop").isEnabled());
+    progress.ShowSheet(1, 3, "Red 0-Guest");
+    EXPECT_EQ(bar.minimum(), 0);
+    EXPECT_EQ(bar.maximum(), 3);
+    EXPECT_EQ(bar.value(), 0);
+    progress.ShowSheet(3, 3, "Red 2-Guest");
+    EXPECT_EQ(bar.value(), 2);
+    progress.reject();
+    progress.Close();
+  }
+}
+
 TEST_P(PrintOptionsWindow, OfTheProgressShowsAnHourglassButNotInTheBoxesAfterIt) {
   SheetProgressWindow progress(strings, nullptr);
   progress.Open();
@@ -155,6 +187,10 @@ TEST_P(PrintOptionsWindow, OfTheProgressStaysUntilTheSheetIsDone) {
   EXPECT_TRUE(progress.Stopped());
   EXPECT_TRUE(progress.isVisible());
   EXPECT_FALSE(Find<QPushButton>(progress, "Stop").isEnabled());
+  const auto& label = Find<QLabel>(progress, "SheetLabel");
+  EXPECT_EQ(label.text().toStdString(), strings.Text(OwnText::StoppingAfterThisSheet));
+  progress.ShowSheet(1, 3, "Red 0-Guest");
+  EXPECT_EQ(label.text().toStdString(), strings.Text(OwnText::StoppingAfterThisSheet));
   progress.Close();
   progress.Open();
   EXPECT_FALSE(progress.Stopped());
