@@ -2,6 +2,7 @@
 
 #include <chrono>
 
+#include "platform/RuntimeError.h"
 #include "platform/sqlite/SqliteStatement.h"
 #include "platform/sqlite/SqliteTable.h"
 
@@ -13,6 +14,12 @@ void Attach(SqliteConnection& connection, const Value& path, const std::string& 
   SqliteStatement attach(connection, "ATTACH ?1 AS " + name);
   attach.Bind(1, path);
   attach.Step();
+}
+
+std::int64_t RowsOf(SqliteConnection& connection, const std::string& table) {
+  SqliteStatement count(connection, "SELECT count(*) FROM " + table);
+  count.Step();
+  return count.Integer(0);
 }
 
 }  // namespace
@@ -37,12 +44,11 @@ InterimRows::InterimRows(const std::string& newFile, const OldDatabase& old)
   connection_.Execute(
       ("CREATE TEMP TABLE Entered AS " + all + "Interim." + table_ + " EXCEPT " + all + "Empty." + table_)
           .c_str());
-  SqliteStatement count(connection_, "SELECT count(*) FROM temp.Entered");
-  count.Step();
-  count_ = count.Integer(0);
+  count_ = RowsOf(connection_, "temp.Entered");
 }
 
 void InterimRows::Join() {
+  const std::int64_t before = RowsOf(connection_, "main." + table_);
   WriteTransaction transaction(connection_);
   const std::string isTaken = key_ + " IN (SELECT " + key_ + " FROM main." + table_ + ")";
   const auto add = [this](const std::string& key, const std::string& from) {
@@ -55,4 +61,7 @@ void InterimRows::Join() {
   add(key_, "temp.Entered WHERE NOT " + isTaken);
   add("NULL", "temp.Renumbered");
   transaction.Commit();
+  if (RowsOf(connection_, "main." + table_) != before + count_) {
+    throw RuntimeError(Fault::DatabaseDiskError, "The rows of the interim file could not be added.");
+  }
 }

@@ -119,8 +119,16 @@ OldDatabaseReport JetConverter::MakeAndReplace(const OldDatabase& old, Conversio
   KeptFile kept(disk_, old.Path);
   report.KeptAs = kept.Path();
   steps.BeforeReplacing(report);
-  disk_.Rename(newFile.Path(), old.Path);
   kept.Keep();
+  try {
+    disk_.Rename(newFile.Path(), old.Path);
+  } catch (const RuntimeError&) {
+    // Not if it only could not be made durable: both files are whole, whatever a power failure then leaves.
+    if (disk_.FileExists(newFile.Path())) {
+      kept.TakeBack();
+      throw;
+    }
+  }
   if (joined) {
     try {
       disk_.Rename(old.InterimPath, UnusedName(disk_, old.InterimPath + ".joined"));

@@ -44,7 +44,8 @@ KeptFile::KeptFile(Files& disk, const std::string& path, const LinkFile& link) :
       break;
     }
     if (std::filesystem::equivalent(path_, path, error)) {
-      isOurs_ = false;  // left by an interrupted conversion
+      isOurs_ = false;
+      stays_ = true;
       return;
     }
   }
@@ -56,7 +57,7 @@ KeptFile::KeptFile(Files& disk, const std::string& path, const LinkFile& link) :
 }
 
 KeptFile::~KeptFile() {
-  if (!isOurs_) {
+  if (stays_) {
     return;
   }
   try {

@@ -23,12 +23,15 @@ class KeptFile {
   KeptFile& operator=(const KeptFile&) = delete;
 
   const std::string& Path() const { return path_; }
-  void Keep() { isOurs_ = false; }
+  void Keep() { stays_ = true; }
+  /// Undoes Keep.
+  void TakeBack() { stays_ = !isOurs_; }
 
  private:
   Files& disk_;
   std::string path_;
-  bool isOurs_ = true;  ///< to be deleted
+  bool isOurs_ = true;  ///< false: an interrupted conversion left it
+  bool stays_ = false;
 };
 
 /// `path` itself or, if that is taken, with the first free number from 2 behind it.

@@ -56,12 +56,16 @@ class ReaderWords {
 class FailingFiles : public LinuxFiles {
  public:
   std::string FailingPath;
+  bool FailsWhenRenamed = false;  ///< as when only the folder cannot be flushed
 
   void Write(const std::string& path, const std::string& bytes) override {
     LinuxFiles::Write(path, bytes.substr(0, path == FailingPath ? bytes.size() / 2 : bytes.size()));
     ThrowFor(path);
   }
   void Rename(const std::string& path, const std::string& newPath) override {
+    if (FailsWhenRenamed) {
+      LinuxFiles::Rename(path, newPath);
+    }
     ThrowFor(newPath);
     LinuxFiles::Rename(path, newPath);
   }
@@ -159,6 +163,14 @@ TEST_F(WithWords, TakesEverythingBackWhenTheNewFileCannotTakeItsPlace) {
   EXPECT_THAT(Refusal(OneMember()).Failure(), HasSubstr("Disk full"));
   disk.FailingPath.clear();
   EXPECT_EQ(Convert(OneMember()).KeptAs, path + ".jet");
+}
+
+TEST_F(WithWords, KeepsTheOldFileWhenTheNewOneHasTakenItsPlaceAllTheSame) {
+  disk.FailingPath = path;
+  disk.FailsWhenRenamed = true;
+  EXPECT_EQ(Convert(OneMember()).KeptAs, path + ".jet");
+  EXPECT_EQ(ReadFile(path + ".jet"), before);
+  EXPECT_EQ(OtherConnection(path).Query("SELECT FirstName FROM Members"), "Ada");
 }
 
 TEST_F(WithWords, TakesEverythingBackWhenItsListCannotBeWritten) {

@@ -225,6 +225,18 @@ TEST_F(DamagedFile, DoesNotBringADeletedRowBackThatHadOutgrownItsPage) {
   EXPECT_EQ(Convert(OldFiles[1], bytes).Rows, 39);
 }
 
+TEST_F(DamagedFile, IsRefusedWhenItsListOfTablesLacksOne) {
+  std::string bytes = OldFileBytes("members");
+  const std::size_t entry = MembersFile::CatalogPage * JetPageSize + MembersFile::RowTable + 2 + 2 * 7;
+  PutNumber(bytes, entry, static_cast<std::uint16_t>(NumberAt<std::uint16_t>(bytes, entry) | 0xC000U));
+  try {
+    Convert(OldFiles[1], bytes);
+    ADD_FAILURE() << "it was converted";
+  } catch (const OldDatabaseRefused& error) {
+    EXPECT_THAT(error.Parts(), IsEmpty());
+  }
+}
+
 TEST_F(DamagedFile, TellsHowManyOfItsRowsCanBeRead) {
   std::string bytes = OldFileBytes("members");
   bytes.replace(MembersFile::FirstDataPage * JetPageSize, JetPageSize, JetPageSize, '\0');

@@ -42,6 +42,7 @@ void PutNumber(std::string& bytes, std::size_t at, T number) {
 /// Places in members.mdb.
 namespace MembersFile {
 
+inline constexpr std::size_t CatalogPage = 14;
 inline constexpr std::size_t TablePage = 24;
 inline constexpr std::size_t RowCount = TablePage * JetPageSize + 16;
 inline constexpr std::size_t FirstDataPage = 37;
