@@ -8,12 +8,12 @@
 #include "platform/OldDatabases.h"
 #include "platform/RuntimeError.h"
 
-/// Old files by path; converting one takes it out of `OldPaths`.
+/// Old files by path; converting one removes it from `OldPaths`.
 class FakeOldDatabases : public OldDatabases {
  public:
   std::set<std::string> OldPaths;
   OldDatabaseReport Report;
-  std::string Failure;  ///< when it is not empty, every conversion fails with this text
+  std::string Failure;  ///< if not empty, every conversion fails with this text
   std::function<void(const OldDatabase&, ConversionSteps&)> Run;  ///< asks, or fails
   std::vector<std::string> Converted;                             ///< "path table empty" of each call
 

@@ -14,8 +14,8 @@
 #include "tests/support/ScoredGame.h"
 #include "tests/support/TemporaryFolder.h"
 
-/// A session on a data folder of its own, with real databases and files; no mission and no member until a
-/// test adds them.
+/// A session on a temporary data folder, with real databases and files; no mission and no member until a test
+/// adds them.
 class OpenSession {
  public:
   OpenSession() {
@@ -30,7 +30,7 @@ class OpenSession {
 
   bool Open() { return session.Open({Databases, Old, Disk, Folder.Path(), Folder / "program"}); }
 
-  /// Puts a player into the game with that many bonus points.
+  /// Puts a player with that many bonus points into the game.
   Player& Play(int index, int points) {
     session.Game().DataPresent = true;
     Player& player = session.Game().Players(index);

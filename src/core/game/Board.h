@@ -9,7 +9,7 @@
 
 #include "core/game/Game.h"
 
-/// Columns of the list of players; those behind `Player` hold numbers. The list of teams has the first three,
+/// Columns of the list of players; those after `Player` hold numbers. The list of teams has the first three,
 /// with the team in the second.
 enum class BoardColumn { Rank, Player, Soldiering, Accuracy, Damage, ShotsFired, Wia, Kia, AmmoAdds };
 inline constexpr int BoardColumnCount = 9;
@@ -20,7 +20,7 @@ enum class BoardList { Players, Teams };
 
 enum class SortOrder { Ascending, Descending };
 
-/// Why a row has an accuracy or none.
+/// Whether a row has an accuracy and, if not, why.
 enum class AccuracyKind { Known, NoShots, NoPrimaryDamage };
 
 /// A player or a team, with the figures as they were when the scores were calculated.
@@ -43,8 +43,8 @@ struct BoardRow {
 /// The rows of a score list in the order in which the operator sees them.
 class Board {
  public:
-  /// `changed` is called when the rows have new contents or a new order. Rows that were only added are told
-  /// with the next sort.
+  /// `changed` is called when the contents or the order of the rows change. Adding a row does not call it;
+  /// the next sort does.
   explicit Board(std::function<void()> changed) : changed_(std::move(changed)) {}
   Board(const Board&) = delete;
   Board& operator=(const Board&) = delete;
@@ -69,15 +69,15 @@ class Board {
   std::vector<std::size_t> order_;  ///< indexes into `rows_` as shown
 };
 
-/// Sorts by the numbers that `column` shows, in the list's present direction: an accuracy counts with its two
+/// Sorts by the numbers that `column` shows, in the list's current direction; an accuracy counts with its two
 /// decimals. A cell that shows no number sorts below all numbers, and equal cells keep the order in which
 /// their rows were added.
 ///
-/// Column 0 writes each place into the record of the same number, whichever player stands there. For other
+/// Column 0 writes each place into the record of the same number, whichever player that is. For other
 /// columns, `assignRanks` numbers the rows from 1 and stores the places in the players' records. The record
-/// is found from team and number alone, 32 to a team, so the place of a player numbered 32 or above goes into
-/// another record. An index outside the table is RuntimeError 9.
+/// is computed from team and number alone, 32 to a team, so the place of a player numbered 32 or above goes
+/// into another record. Throws RuntimeError 9 for an index outside the table.
 void SortListNumeric(Board& list, BoardColumn column, bool assignRanks, Game& game);
 
-/// The board's answer to a click on column header `header` (counted from 1).
+/// Sorts the board as a click on column header `header` (counted from 1) does.
 void SortByHeader(Board& players, int header, Game& game);

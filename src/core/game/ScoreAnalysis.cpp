@@ -15,7 +15,7 @@ void AddTo(std::int32_t& sum, std::int32_t amount) {
   }
 }
 
-/// Players stand in blocks of 32 that belong to one team each.
+/// Players are in blocks of 32, each of one team.
 constexpr int BlockSize = 32;
 constexpr int BlockCount = PlayerCount / BlockSize;
 
@@ -27,14 +27,14 @@ std::array<int, BlockCount> TeamsOfBlocks() {
   return teams;
 }
 
-/// Damage that each player dealt to foes and to the own team, by record index less 1.
+/// Damage that each player dealt to foes and to their own team, by record index minus 1.
 struct DealtDamage {
   std::array<std::int32_t, PlayerCount> ToFoes{};
   std::array<std::int32_t, PlayerCount> ToOwnTeam{};
 };
 
-/// Adds one victim's hits. Returns false when one is negative or a sum has left the 32-bit range. Written so
-/// that the compiler adds several at a time.
+/// Adds a victim's hits from the shooters of one block. Returns false if a hit is negative or a sum left the
+/// 32-bit range. Written so that the compiler vectorizes it.
 bool AddHits(std::int32_t* sums, const std::int32_t* hits) {
   std::uint32_t signs = 0;
   for (int i = 0; i < BlockSize; ++i) {
@@ -79,8 +79,8 @@ void ScoreAnalysis::AddUpDamage() {
 }
 
 bool ScoreAnalysis::AddUpDamageAtOnce() {
-  // Whole factors need no rounding, so the order of the hits does not matter unless a sum on the way could
-  // leave the range.
+  // A whole factor needs no rounding, so the order of the hits does not matter unless an intermediate sum
+  // could leave the range.
   const bool isWhole = std::trunc(factors_.FriendlyFire) == factors_.FriendlyFire;
   const bool countsFriendlyFire = missions_.ListIndex() != MissionList::FreeForAll;
   const std::array<int, BlockCount> teams = TeamsOfBlocks();
@@ -112,13 +112,13 @@ void ScoreAnalysis::AddUpDamageHitByHit() {
     player.TotalDamage = 0;
     player.AbsoluteDamage = 0;
   }
-  // Each shooter's sums grow in the order of the victims, which is how the matrix lies in memory.
+  // Each shooter's hits are added in the order of the victims, which is also their order in memory.
   for (int victim = 1; victim <= PlayerCount; ++victim) {
     for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
       const std::int32_t hit = game_.Players(victim).HitByPlayer(shooter);
       Player& player = game_.Players(shooter);
       if (IsOwnTeamHit(victim, shooter)) {
-        // Rounded each by itself: half a point twice is nothing.
+        // Rounded hit by hit: half a point twice adds nothing.
         player.TotalDamage =
             RoundToInt32(hit * static_cast<long double>(factors_.FriendlyFire) + player.TotalDamage);
       } else {

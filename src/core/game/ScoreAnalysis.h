@@ -26,7 +26,7 @@ class ScoreAnalysis {
   void CalculateScores();
 
  private:
-  /// What the active mission pays and takes.
+  /// Rewards and penalties of the active mission.
   struct MissionPoints {
     std::array<double, TeamCount> Primary;    ///< by objective set
     std::array<double, TeamCount> Secondary;  ///< by objective set
@@ -35,11 +35,11 @@ class ScoreAnalysis {
   };
 
   void AddUpDamage();
-  /// The fast way for the usual game. Returns false, with nothing worth keeping, where only the other way
-  /// gives the right figures or the right failure.
+  /// The fast way, for ordinary games. Returns false, with useless figures, if only the other way gives the
+  /// right figures or the right error.
   bool AddUpDamageAtOnce();
   void AddUpDamageHitByHit();
-  /// True when friendly fire counts: the mode is not a free-for-all, and both are of one team.
+  /// True if this counts as friendly fire: both are on one team, and the mode is not Free For All.
   bool IsOwnTeamHit(int victim, int shooter) const;
   void ScorePlayer(int index);
   /// Finds the member by the button where none is assigned. Empty when there is none.
@@ -56,5 +56,5 @@ class ScoreAnalysis {
   MemberLookup& members_;
   Board& players_;
   Board& teams_;
-  std::optional<MissionPoints> missionPoints_;  ///< read once a calculation
+  std::optional<MissionPoints> missionPoints_;  ///< read once per calculation
 };

@@ -72,7 +72,7 @@ bool IsTooLarge(std::string_view text) {
   return point - firstDigit + (negative ? -exponent : exponent) > 0;
 }
 
-/// Value of a text that is a number as a whole: an infinity if too large, 0 if too small.
+/// Value of a text that consists of a number only: an infinity if too large, 0 if too small.
 double ValueOfNumber(std::string_view text) {
   if (text.starts_with('+')) {
     text.remove_prefix(1);

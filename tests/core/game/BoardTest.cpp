@@ -26,7 +26,7 @@ class Sorting : public testing::Test {
  protected:
   static BoardRow RowOf(int index) { return {.Index = index, .Team = TeamFromId(IdFromIndex(index))}; }
 
-  /// A row of a player with a place and one figure.
+  /// Adds a player's row with a place and one figure.
   void Add(std::int32_t rank, int index, std::int32_t soldiering) {
     BoardRow row = RowOf(index);
     row.Rank = rank;
@@ -34,7 +34,7 @@ class Sorting : public testing::Test {
     list.AddRow(std::move(row));
   }
 
-  /// The texts of a column from the top.
+  /// The texts of a column, from the top.
   std::vector<std::string> Column(BoardColumn column) const {
     std::vector<std::string> cells;
     for (int place = 0; place < list.RowCount(); ++place) {
