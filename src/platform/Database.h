@@ -59,7 +59,7 @@ class Recordset {
   virtual void SetField(std::string_view column, Value value) = 0;
 
   /// Writes the pending row; it is durable when this returns. A failure leaves the old row in the file and
-  /// the edit pending. After AddNew the cursor stays where it was.
+  /// the edit pending, so trying again is safe. After AddNew the cursor stays where it was.
   virtual void Update() = 0;
   virtual void CancelUpdate() = 0;
   virtual ::EditMode EditMode() const = 0;
@@ -94,7 +94,8 @@ class Database {
 
   /// All writes from BeginTrans to CommitTrans are committed together, with one wait for the disk. Reads
   /// through this database see them at once. CommitTrans makes them durable; if it or one of the writes
-  /// throws, or Rollback is called first, all the old rows are kept. Use WriteScope.
+  /// throws, or Rollback is called first, all the old rows are kept. It never throws when the file holds the
+  /// new ones. Use WriteScope.
   virtual void BeginTrans() = 0;
   virtual void CommitTrans() = 0;
   virtual void Rollback() noexcept = 0;

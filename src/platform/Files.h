@@ -9,6 +9,7 @@ class Files {
  public:
   virtual ~Files() = default;
 
+  /// FileExists throws RuntimeError 70 or 75 when the disk or the folder's permissions do not let it tell.
   virtual bool FileExists(const std::string& path) const = 0;
   virtual bool FolderExists(const std::string& path) const = 0;
 

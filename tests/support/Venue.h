@@ -134,7 +134,7 @@ class Venue : public DataSite {
   }
 
   FakeEventPump Events;
-  JetConverter Old{JetReaderPath(), std::chrono::milliseconds(5000)};
+  JetConverter Old{Disk, JetReaderPath(), std::chrono::milliseconds(5000)};
   QtEventPump RealEvents;
   FakeFolders Places;
   FakeSerialDevices Devices;

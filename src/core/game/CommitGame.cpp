@@ -1,6 +1,7 @@
 #include "core/game/CommitGame.h"
 
 #include <algorithm>
+#include <new>
 #include <vector>
 
 #include "core/data/FieldValue.h"
@@ -45,6 +46,27 @@ void AddFigures(Recordset& row, const Player& player, const Clock& clock) {
   row.SetField("AverageSecAccuracy", 0.0);
 }
 
+/// The marks of players whose rows are not committed yet; taken back at the end unless they are kept.
+class Marks {
+ public:
+  explicit Marks(Game& game) : game_(game) {}
+  ~Marks() {
+    for (const int index : players_) {
+      game_.Players(index).Committed = false;
+    }
+  }
+  Marks(const Marks&) = delete;
+  Marks& operator=(const Marks&) = delete;
+
+  /// The player is about to be marked.
+  void Add(int index) { players_.push_back(index); }
+  void Keep() { players_.clear(); }
+
+ private:
+  Game& game_;
+  std::vector<int> players_;
+};
+
 class GameCommit {
  public:
   GameCommit(Game& game, Database& dbMembers, Recordset& rsMembers, MemberLookup& members, const Clock& clock)
@@ -75,7 +97,7 @@ class GameCommit {
     if (index > PlayerCount) {
       return true;
     }
-    std::vector<int> marked;
+    Marks marks(game_);  // taken back whatever ends the group, lack of memory as well
     try {
       WriteScope group(dbMembers_);
       int next = index;
@@ -87,16 +109,14 @@ class GameCommit {
         if (!rsMembers_.WalkTo("ContactID", std::int64_t{player.MemberIndex})) {
           break;
         }
-        marked.push_back(next);
+        marks.Add(next);
         AddGame(next);
       }
       group.Commit();
+      marks.Keep();
       index = next;
       return true;
     } catch (const RuntimeError&) {
-      for (const int member : marked) {
-        game_.Players(member).Committed = false;
-      }
       return false;
     }
   }
@@ -105,7 +125,13 @@ class GameCommit {
     const Player& player = game_.Players(index);
     if (IsDue(player) && members_.LoadMember(player.MemberIndex) &&
         rsMembers_.WalkTo("ContactID", std::int64_t{player.MemberIndex})) {
-      AddGame(index);
+      try {
+        AddGame(index);
+      } catch (const std::bad_alloc&) {
+        // The database did not refuse this player, so the next commit may try again.
+        game_.Players(index).Committed = false;
+        throw;
+      }
     }
   }
 

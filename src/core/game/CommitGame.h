@@ -15,7 +15,8 @@ enum class CommitResult {
 /// Adds the game of each active player with a member to that member's lifetime figures, and marks the player
 /// `Committed`. A player whose member is gone is reported in a box and left out. All rows written are durable
 /// on return, usually after a single wait for the disk. If the database fails on a player's row, the player
-/// is marked although the row is unchanged, so that a write of unknown outcome can never count twice.
+/// is marked although the row is unchanged: the game is then left out rather than counted twice. Whoever is
+/// not marked is not in the file.
 CommitResult CommitPlayers(Game& game, Database& dbMembers, Recordset& rsMembers, MemberLookup& members,
                            const Clock& clock);
 

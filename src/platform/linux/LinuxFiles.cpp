@@ -102,7 +102,15 @@ bool SyncFolder(const std::string& folder) {
 
 bool LinuxFiles::FileExists(const std::string& path) const {
   struct stat info {};
-  return stat(path.c_str(), &info) == 0 && !S_ISDIR(info.st_mode);
+  if (stat(path.c_str(), &info) == 0) {
+    return !S_ISDIR(info.st_mode);
+  }
+  // "No" has a default file put in its place, so it must be certain.
+  const bool isCertain = errno == ENOENT || errno == ENOTDIR || errno == ENAMETOOLONG || errno == ELOOP;
+  if (!isCertain) {
+    throw FileError(errno, path);
+  }
+  return false;
 }
 
 bool LinuxFiles::FolderExists(const std::string& path) const {

@@ -93,8 +93,17 @@ std::int64_t PendingRow::Insert() {
   }
   insertion.Step();
   const std::int64_t key = connection_.LastInsertedKey();
+  TellOf(transaction, key, columns);
   transaction.Commit();
   return key;
+}
+
+void PendingRow::TellOf(WriteTransaction& transaction, std::int64_t key,
+                        const std::vector<std::size_t>& columns) const {
+  transaction.Written().Write(table_.Name(), key);
+  for (const std::size_t i : columns) {
+    transaction.Written().Set(table_.Name(), key, table_.Columns()[i].Name, *values_[i]);
+  }
 }
 
 void PendingRow::PrepareChange(const std::vector<std::size_t>& columns) {
@@ -126,6 +135,9 @@ bool PendingRow::Change(std::int64_t key) {
   change_.Bind(static_cast<int>(columns.size() + 1), key);
   change_.Step();
   const bool changed = connection_.ChangedRows() != 0;
+  if (changed) {
+    TellOf(transaction, key, columns);
+  }
   transaction.Commit();
   return changed;
 }

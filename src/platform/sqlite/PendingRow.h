@@ -39,6 +39,7 @@ class PendingRow {
   void TakeDefaults();
   void CheckStarted() const;
   std::vector<std::size_t> ColumnsSet() const;
+  void TellOf(WriteTransaction& transaction, std::int64_t key, const std::vector<std::size_t>& columns) const;
   void PrepareChange(const std::vector<std::size_t>& columns);
 
   SqliteConnection& connection_;

@@ -1,12 +1,15 @@
 #include "platform/sqlite/SqliteConnection.h"
 
 #include <cerrno>
+#include <filesystem>
 #include <memory>
 #include <new>
 #include <string_view>
 
+#include <fcntl.h>
 #include <sqlite3.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include "platform/RuntimeError.h"
 #include "platform/sqlite/JetLike.h"
@@ -58,8 +61,7 @@ void CheckFile(const std::string& path) {
     if (errno == ENOENT || errno == ENOTDIR) {
       throw RuntimeError(Fault::DatabaseNotFound, "Could not find file '" + path + "'.");
     }
-    throw RuntimeError(Fault::DatabaseCannotOpen,
-                       "Cannot open the file '" + path + "'. You may lack the permission for it.");
+    throw CannotOpen(path);
   }
   if (!S_ISREG(info.st_mode)) {
     throw RuntimeError(Fault::DatabaseCannotOpen, "Cannot open the file '" + path + "'. It is no file.");
@@ -81,6 +83,8 @@ SqliteConnection::SqliteConnection(const std::string& path, std::chrono::millise
     if (sqlite3_open_v2(path.c_str(), &handle_, flags, nullptr) != SQLITE_OK) {
       Fail();
     }
+    folder_ = std::filesystem::path(sqlite3_db_filename(handle_, "main")).parent_path();
+    CheckWritable();
     Configure(busyTimeout);
   } catch (...) {
     sqlite3_close_v2(handle_);
@@ -100,6 +104,15 @@ void SqliteConnection::Configure(std::chrono::milliseconds busyTimeout) {
   // EXTRA also makes the deletion of the journal durable; without it a power failure just after a commit
   // could bring back the journal, and with it the old rows.
   Execute("PRAGMA synchronous = EXTRA");
+}
+
+// SQLite goes on read-only with a file that could not be opened for writing, whatever the reason. It is not
+// to be the mode of a whole run because of a fault that has passed.
+void SqliteConnection::CheckWritable() {
+  if (sqlite3_db_readonly(handle_, "main") == 1 &&
+      faccessat(AT_FDCWD, path_.c_str(), W_OK, AT_EACCESS) == 0) {
+    throw CannotOpen(path_);
+  }
 }
 
 // A file truncated within its last page opens without error and would fail only when that page is read.
@@ -214,10 +227,73 @@ std::int64_t SqliteConnection::ChangedRows() const {
   return sqlite3_changes64(handle_);
 }
 
-void SqliteConnection::Fail() {
-  const RuntimeError error = SqliteError(handle_, path_);
-  Undo();
-  throw error;
+void SqliteConnection::Fail(int systemError) {
+  try {
+    throw SqliteError(handle_, path_, systemError);
+  } catch (...) {  // std::bad_alloc as well
+    Undo();
+    throw;
+  }
+}
+
+// SQLite can report a commit as failed that is in the file: it commits by deleting the journal, and what
+// comes after that can fail too. Told as a failure, the change would be entered a second time.
+void SqliteConnection::Commit() {
+  if (sqlite3_get_autocommit(handle_) != 0) {
+    throw RuntimeError(Fault::NoTransaction);  // rolled back by a fault in one of the writes
+  }
+  errno = 0;
+  const int result = sqlite3_exec(handle_, "COMMIT", nullptr, nullptr, nullptr);
+  if (result == SQLITE_OK) {
+    return;
+  }
+  try {
+    Fail(errno);
+  } catch (...) {
+    if (!HoldsWhatWasWritten(result)) {
+      throw;
+    }
+  }
+  FlushFolder();
+}
+
+bool SqliteConnection::HoldsWhatWasWritten(int commitResult) {
+  if ((commitResult & 0xFF) == SQLITE_BUSY) {
+    return false;  // another program's lock, which is found before anything is written
+  }
+  try {
+    if (!written_.AreIn(*this)) {
+      return false;
+    }
+    // SQLite takes a journal that it cannot see for one that is not there, and then reads rows that the next
+    // one who sees it takes back.
+    struct stat info {};
+    if (stat(sqlite3_filename_journal(sqlite3_db_filename(handle_, "main")), &info) != 0 && errno == ENOENT) {
+      return true;
+    }
+  } catch (...) {  // the file cannot be asked now
+  }
+  // These faults come from steps after the deletion of the journal: the flush of its folder, and giving up
+  // the lock or all of it but the right to read. With any other the journal is still there, and the next one
+  // who reads the file puts the old rows back.
+  return commitResult == SQLITE_IOERR_DIR_FSYNC || commitResult == SQLITE_IOERR_UNLOCK ||
+         commitResult == SQLITE_IOERR_RDLOCK;
+}
+
+// Makes the deletion of the journal durable where SQLite failed to. Should it fail again, the change is still
+// whole and in the file, and only a power failure before the next flush could undo it; that is no reason to
+// have it entered twice, and the next write will tell of a disk that is about to die.
+void SqliteConnection::FlushFolder() noexcept {
+  const int descriptor = open(folder_.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+  if (descriptor < 0) {
+    return;
+  }
+  if (fsync(descriptor) != 0 && errno == EINVAL) {
+    // This file system cannot flush a folder and would refuse each time. Leave it out then, which is SQLite's
+    // own default, and all that such a file system has to give.
+    sqlite3_exec(handle_, "PRAGMA synchronous = FULL", nullptr, nullptr, nullptr);
+  }
+  close(descriptor);
 }
 
 WriteTransaction::WriteTransaction(SqliteConnection& connection)
@@ -228,6 +304,7 @@ WriteTransaction::WriteTransaction(SqliteConnection& connection)
     connection.PrepareChange();
     connection.Execute("BEGIN IMMEDIATE");
     connection.writing_ = true;
+    connection.written_.Clear();
   } else if (sqlite3_get_autocommit(connection.Handle()) != 0) {
     throw RuntimeError(Fault::NoTransaction);
   }
@@ -236,6 +313,7 @@ WriteTransaction::WriteTransaction(SqliteConnection& connection)
 WriteTransaction::~WriteTransaction() {
   if (!isPart_) {
     connection_.writing_ = false;
+    connection_.written_.Clear();
     connection_.Rollback();
     connection_.LeaveState();
   }
@@ -243,6 +321,6 @@ WriteTransaction::~WriteTransaction() {
 
 void WriteTransaction::Commit() {
   if (!isPart_) {
-    connection_.Execute("COMMIT");
+    connection_.Commit();
   }
 }

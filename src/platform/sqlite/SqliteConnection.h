@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "platform/sqlite/SqliteStatement.h"
+#include "platform/sqlite/WrittenRows.h"
 
 class SqliteTable;
 struct sqlite3;
@@ -51,20 +52,26 @@ class SqliteConnection {
   std::int64_t ChangedRows() const;
 
   /// Rolls back the open transaction and throws the error of the last SQLite call.
-  [[noreturn]] void Fail();
+  [[noreturn]] void Fail(int systemError = 0);
 
  private:
   friend class WriteTransaction;
 
   void PrepareChange();
+  void Commit();
+  bool HoldsWhatWasWritten(int commitResult);
+  void FlushFolder() noexcept;
   void Undo() noexcept;
+  void CheckWritable();
   void Configure(std::chrono::milliseconds busyTimeout);
   void CheckWholePages();
 
   std::string path_;
+  std::string folder_;  ///< of the file itself, behind symbolic links
   sqlite3* handle_ = nullptr;
   int readers_ = 0;
   bool writing_ = false;  ///< a WriteTransaction is open
+  WrittenRows written_;   ///< by it
   SqliteStatement dataVersion_;
   std::int64_t versionRead_ = 0;  ///< last data_version; differs after a change by another connection
   std::uint64_t state_ = 1;
@@ -81,7 +88,11 @@ class WriteTransaction {
   WriteTransaction(const WriteTransaction&) = delete;
   WriteTransaction& operator=(const WriteTransaction&) = delete;
 
-  /// The writes are durable on return. Does nothing in a nested transaction.
+  /// Tell of each row that was written, before Commit.
+  WrittenRows& Written() { return connection_.written_; }
+
+  /// The writes are durable on return. Does nothing in a nested transaction. Throws RuntimeError only if the
+  /// file does not hold them.
   void Commit();
 
  private:

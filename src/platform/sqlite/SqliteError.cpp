@@ -11,15 +11,28 @@ bool IsNoSpace(int systemError) {
   return systemError == ENOSPC || systemError == EDQUOT || systemError == EFBIG;
 }
 
-// SQLite reports a full disk as such only for ENOSPC. A quota or file-size limit comes as an I/O error; its
-// cause is kept with the file, or in errno if it hit the journal.
-bool NoSpaceLeft(sqlite3* database, int code) {
+/// errno of the last call on the database file that failed; 0 for none.
+int FileErrorOf(sqlite3* database) {
+  int error = 0;
+  sqlite3_file_control(database, "main", SQLITE_FCNTL_LAST_ERRNO, &error);
+  return error;
+}
+
+// SQLite reports a full disk as such only for ENOSPC on a write. A quota or file-size limit comes as an I/O
+// error, and so does a full disk that shows at a flush; the cause is kept with the file, or in errno if it
+// hit the journal. The file's note may be of an earlier failure, so it does not count against a plain EIO.
+bool NoSpaceLeft(sqlite3* database, int code, int systemError) {
   if (code != SQLITE_IOERR) {
     return code == SQLITE_FULL;
   }
-  int fileError = 0;
-  sqlite3_file_control(database, "main", SQLITE_FCNTL_LAST_ERRNO, &fileError);
-  return IsNoSpace(fileError) || IsNoSpace(sqlite3_system_errno(database));
+  const int lastError = systemError != 0 ? systemError : sqlite3_system_errno(database);
+  return IsNoSpace(lastError) || (lastError != EIO && IsNoSpace(FileErrorOf(database)));
+}
+
+// SQLite calls a page damaged that the disk could not read.
+bool IsUnreadable(sqlite3* database, int code) {
+  const int error = FileErrorOf(database);
+  return code == SQLITE_CORRUPT && (error == EIO || error == ENXIO);
 }
 
 RuntimeError ConstraintError(int extendedCode, const std::string& message) {
@@ -40,19 +53,28 @@ RuntimeError ConstraintError(int extendedCode, const std::string& message) {
 
 }  // namespace
 
+RuntimeError CannotOpen(const std::string& path) {
+  return {Fault::DatabaseCannotOpen,
+          "Cannot open the file '" + path + "'. You may lack the permission for it."};
+}
+
 RuntimeError UnrecognizedFormat(const std::string& path) {
   return {Fault::UnrecognizedDatabase, "Unrecognized database format '" + path + "'."};
 }
 
-RuntimeError SqliteError(sqlite3* database, const std::string& path) {
+RuntimeError SqliteError(sqlite3* database, const std::string& path, int systemError) {
   const int extendedCode = sqlite3_extended_errcode(database);
   const int code = extendedCode & 0xFF;
   const std::string message = sqlite3_errmsg(database);
   if (extendedCode == SqliteInvalidPattern) {
     return {Fault::InvalidPattern, message};
   }
-  if (NoSpaceLeft(database, code)) {
+  if (NoSpaceLeft(database, code, systemError)) {
     return {Fault::DatabaseDiskFull, "Not enough space on disk: " + path};
+  }
+  const RuntimeError diskError(Fault::DatabaseDiskError, "Disk error: " + path);
+  if (IsUnreadable(database, code)) {
+    return diskError;
   }
   switch (code) {
     case SQLITE_NOMEM:
@@ -63,12 +85,11 @@ RuntimeError SqliteError(sqlite3* database, const std::string& path) {
     case SQLITE_READONLY:
       return {Fault::DatabaseReadOnly, "Cannot update. Database or object is read-only: " + path};
     case SQLITE_IOERR:
-      return {Fault::DatabaseDiskError, "Disk error: " + path};
+      return diskError;
     case SQLITE_CANTOPEN:
     case SQLITE_PERM:
     case SQLITE_AUTH:
-      return {Fault::DatabaseCannotOpen,
-              "Cannot open the file '" + path + "'. You may lack the permission for it."};
+      return CannotOpen(path);
     case SQLITE_CORRUPT:
     case SQLITE_NOTADB:
       return UnrecognizedFormat(path);

@@ -325,6 +325,7 @@ void SqliteRecordset::Delete() {
   if (connection_.ChangedRows() == 0) {
     FailDeleted();
   }
+  transaction.Written().Delete(table_.Name(), key);
   transaction.Commit();
   cursor_.Erase();
   ForgetRow();

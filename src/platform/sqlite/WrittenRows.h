@@ -1,0 +1,35 @@
+#pragma once
+
+#include <cstdint>
+#include <map>
+#include <string>
+#include <utility>
+
+#include "platform/Database.h"
+
+class SqliteConnection;
+
+/// What a transaction has written, so that the file can be asked whether it holds it.
+class WrittenRows {
+ public:
+  void Clear() { rows_.clear(); }
+
+  /// The row `key` of `table` is there now, and holds what later calls of Set tell.
+  void Write(const std::string& table, std::int64_t key);
+  void Set(const std::string& table, std::int64_t key, const std::string& column, const Value& value);
+  void Delete(const std::string& table, std::int64_t key);
+
+  /// True if the file holds every row as it was last written. Throws RuntimeError if it cannot be read.
+  bool AreIn(SqliteConnection& connection) const;
+
+ private:
+  struct Row {
+    bool Deleted = false;
+    std::map<std::string, Value> Columns;  ///< by name, as far as they were written
+  };
+  using Place = std::pair<std::string, std::int64_t>;  ///< table and key
+
+  static bool IsIn(SqliteConnection& connection, const Place& place, const Row& row);
+
+  std::map<Place, Row> rows_;
+};
