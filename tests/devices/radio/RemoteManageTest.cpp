@@ -151,6 +151,21 @@ TEST_P(RemoteWindow, KeepsRowsInTheOrderOfIds) {
   EXPECT_THAT(Column(0), ElementsAre(Red() + "  3", Red() + "  10", Red() + "  18"));
 }
 
+TEST_P(RemoteWindow, EmptiesTheListAsASearchBegins) {
+  guns = {33, 40};
+  Press("SearchGunsButton");
+  ASSERT_EQ(List().rowCount(), 2);
+  guns = {};
+  bool looked = false;
+  Meanwhile(3, [&] {
+    looked = true;
+    EXPECT_EQ(List().rowCount(), 0);
+  });
+  Press("SearchGunsButton");
+  EXPECT_TRUE(looked);
+  EXPECT_EQ(List().rowCount(), 0);
+}
+
 TEST_P(RemoteWindow, ShowsHowASearchGoes) {
   guns = {33};
   int looks = 0;
