@@ -29,6 +29,27 @@ function(tessarine_library name)
   target_link_libraries(${name} PUBLIC tessarine_source)
 endfunction()
 
+# tessarine_precompile(<target> <kind> <header>...): the first target of a kind precompiles the headers, and the others of
+# that kind use the result, so all of them need the same compiler options.
+function(tessarine_precompile target kind)
+  get_property(owner GLOBAL PROPERTY TESSARINE_HEADERS_OF_${kind})
+  if(owner)
+    target_precompile_headers(${target} REUSE_FROM ${owner})
+  else()
+    target_precompile_headers(${target} PRIVATE ${ARGN})
+    set_property(GLOBAL PROPERTY TESSARINE_HEADERS_OF_${kind} ${target})
+  endif()
+endfunction()
+
+# tessarine_windows(<name> <sources>...): the windows of one folder, with their forms. Qt's headers are precompiled: reading
+# them would take most of the build.
+function(tessarine_windows name)
+  tessarine_library(${name} ${ARGN})
+  target_link_libraries(${name} PUBLIC Qt6::Widgets)
+  set_target_properties(${name} PROPERTIES AUTOMOC ON AUTOUIC ON AUTORCC ON)
+  tessarine_precompile(${name} windows <QtWidgets>)
+endfunction()
+
 # tessarine_test_label(<label>): fails unless it is one of the four kinds of tests.
 #   logic   no window, no line, no other program: together a matter of seconds
 #   window  windows, offscreen, with mouse and key events
@@ -54,15 +75,14 @@ function(tessarine_test name)
   add_executable(${name} ${ARG_SOURCES})
   target_link_libraries(${name} PRIVATE ${ARG_LIBS} tessarine_options GTest::gmock GTest::gtest_main)
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/src)
-  # A test's own code runs once: half the time to build it is worth more than its speed.
-  # One precompiled header serves all, the first program's: so all are compiled with -fPIC, which the toolkit asks for.
+  # A test's own code runs only once: building it in half the time is worth more than its speed. Qt requires -fPIC.
   target_compile_options(${name} PRIVATE -O0 -fPIC)
-  get_property(owner GLOBAL PROPERTY TESSARINE_TEST_HEADERS)
-  if(owner)
-    target_precompile_headers(${name} REUSE_FROM ${owner})
+  if("tessarine_test_windows" IN_LIST ARG_LIBS)
+    # Qt defines these differently in each folder and its headers use them, so precompiled ones could not be shared.
+    target_compile_options(${name} PRIVATE -UQT_TESTCASE_BUILDDIR -UQT_TESTCASE_SOURCEDIR)
+    tessarine_precompile(${name} window_tests <gmock/gmock.h> <gtest/gtest.h> <QtTest> <QtWidgets>)
   else()
-    target_precompile_headers(${name} PRIVATE <gmock/gmock.h> <gtest/gtest.h>)
-    set_property(GLOBAL PROPERTY TESSARINE_TEST_HEADERS ${name})
+    tessarine_precompile(${name} tests <gmock/gmock.h> <gtest/gtest.h>)
   endif()
   include(GoogleTest)
   gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 120 LABELS ${ARG_LABEL}

@@ -1,6 +1,6 @@
-# For the scripts beside it: the files that are ours.
+# For the other scripts in this folder: the project's own files.
 
-# OurFiles PATTERN...: what git lists (committed or only added) and still exists. A tree without git is searched instead.
+# OurFiles PATTERN...: existing files that git lists, committed or just added. Without git the folder is searched.
 OurFiles() {
   local file
   { git ls-files -- "$@" 2> /dev/null || FoundFiles "$@"; } | while IFS= read -r file; do

@@ -1,5 +1,5 @@
-# For tools/floors, which hands over its tables in the environment. Reads lines "file PATH" and then "include PATH NAME",
-# tab between, NAME with its opening quote or bracket.
+# For tools/floors, which passes its tables in the environment. Reads lines "file PATH" and then "include PATH NAME",
+# separated by tabs, NAME with its opening quote or bracket.
 
 function Fault(text) {
   print text
@@ -17,7 +17,7 @@ function Matches(folder, pattern) {
   return Starts(folder, substr(pattern, 1, length(pattern) - 1))
 }
 
-# The longest of `count` patterns that fits; the very name of a folder comes first. 0 when none does.
+# The number of the longest of `count` patterns that fits, or of the one that is the folder's name; 0 if none fits.
 function Best(folder, patterns, count,    i, best) {
   best = 0
   for (i = 1; i <= count; ++i) {
@@ -27,7 +27,7 @@ function Best(folder, patterns, count,    i, best) {
   return best
 }
 
-# A subject is the first folder below src/; each room of devices/ is one.
+# A subject is a folder directly below src/; in devices/, each folder is one.
 function Subject(folder,    names) {
   split(folder, names, "/")
   return names[1] == "devices" ? names[1] "/" names[2] : names[1]
@@ -62,12 +62,12 @@ function ReadTables(    lines, count, i, fields) {
   }
 }
 
-# The path of what `file` includes as "name"; "" when no include root leads to it.
+# The path of what `file` includes as "name"; "" if it is below no include root.
 function Resolved(file, name,    form) {
   if (("src/" name) in exists) return "src/" name
   if (name ~ /^(src|\.)\// || name ~ /(^|\/)\.\.\//) return ""
   if (name in exists) return name
-  if (name ~ /^ui_[^\/]*\.h$/) {  # made from the form beside the file
+  if (name ~ /^ui_[^\/]*\.h$/) {  # generated from the form beside the file
     form = Folder(file) "/" substr(Unsuffixed(name), 4) ".ui"
     if (form in exists) return form
   }
@@ -109,7 +109,7 @@ function Check(file, name,    target, from, to) {
   includes[file] = includes[file] "\n" target
   from = Folder(file)
   to = Folder(target)
-  # A test ties no folders together: nothing includes it.
+  # A test makes no folder depend on another, since nothing includes it.
   if (from != to && ++uses[from, to] && file !~ /Test\.cpp$/ && !linked[from, to]++) edges[from] = edges[from] "\n" to
   if (index(mayUse[Root(file)], " " Root(target) " ") == 0) {
     Fault(file ": " Root(file) "/ does not include " Root(target) "/: " target)
@@ -120,7 +120,7 @@ function Check(file, name,    target, from, to) {
   }
 }
 
-# Depth first; `path` is how it came here.
+# Depth first; `path` is the way to `folder`.
 function FindCircle(folder, path,    next_, count, i) {
   state[folder] = "open"
   count = split(edges[folder], next_, "\n")
@@ -136,7 +136,7 @@ function FindCircle(folder, path,    next_, count, i) {
   state[folder] = "done"
 }
 
-# What no source reaches is compiled and looked at by nobody.
+# A header that no source reaches is neither compiled nor checked.
 function Reach(file,    next_, count, i) {
   if (reached[file]++) return
   count = split(includes[file], next_, "\n")

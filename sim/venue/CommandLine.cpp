@@ -59,7 +59,7 @@ class OptionMaker {
     return {
         {"--" + name_},
         "",
-        "serve " + std::string(entry_.Purpose) + (entry_.ServedUnlessTold ? "; so it is unless told" : ""),
+        "serve " + std::string(entry_.Purpose) + (entry_.ServedUnlessTold ? "; on unless switched off" : ""),
         [name = name_](VenueOptions& options, const std::string&, const std::string&) {
           options.Devices[name].Served = true;
         }};
@@ -146,18 +146,18 @@ std::vector<CommandLineOption> GeneralOptions() {
        }},
       {{"--seed"},
        "S",
-       "picks the game; a seed always gives the same game (1)",
+       "selects the game; a seed always gives the same game (1)",
        [](VenueOptions& options, Argument spelling, Argument value) {
          options.Seed = static_cast<std::uint32_t>(
              ParseNumber(spelling, value, std::numeric_limits<std::uint32_t>::max()));
        }},
       {{"--fast"},
        "",
-       "bytes as fast as possible instead of at the line's speed",
+       "send bytes as fast as possible instead of at the line's speed",
        [](VenueOptions& options, Argument, Argument) { options.Fast = true; }},
       {{"--log"},
        "FILE",
-       "what passes the lines: seconds, device, -> to or <- from the host, bytes",
+       "the traffic on the lines: seconds, device, -> to or <- from the host, bytes",
        [](VenueOptions& options, Argument spelling, Argument value) {
          options.LogFile = ParseFile(spelling, value);
        }},

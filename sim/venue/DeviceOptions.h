@@ -15,9 +15,9 @@ struct DeviceOptions {
   std::size_t Failure = 0;  ///< row of the device's table of failures
   std::size_t Place = 1;    ///< frame, byte, bit or gun that the failure concerns
   std::optional<std::string> Link;
-  /// Values of the device's own number and choice options, by name; all of them are there.
+  /// Values of the device's own number and choice options, by name; complete.
   std::map<std::string, std::uint64_t, std::less<>> Numbers;
-  /// Values of its file options, where given.
+  /// Values of its file options, if given.
   std::map<std::string, std::string, std::less<>> Files;
 
   /// `Kind`: the enumeration of the device's failures.
@@ -26,7 +26,7 @@ struct DeviceOptions {
     return static_cast<Kind>(Failure);
   }
 
-  /// Throws std::out_of_range when the device has no such option.
+  /// Throws std::out_of_range if the device has no such option.
   std::uint64_t Number(std::string_view option) const;
   /// Index of the chosen name; throws like Number.
   std::size_t Choice(std::string_view option) const { return static_cast<std::size_t>(Number(option)); }

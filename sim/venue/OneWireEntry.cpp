@@ -23,10 +23,10 @@ DeviceEntry OneWireEntry() {
           .Purpose = "the reader of membership buttons, with the commands below",
           .Failures = FailureRows(OneWireFailures),
           .NoSuchFailure = "The 1-wire adapter has no failure",
-          .PlaceMeaning = "the byte or bit that the failure concerns, from 1 (1)",
+          .PlaceMeaning = "the byte or bit that the failure affects, counted from 1 (1)",
           .Commands = {{"touch ID",
                         "hold a button to the reader: 16 hexadecimal digits, CRC first, family code last"},
-                       {"leave ID", "take it away"},
+                       {"leave ID", "take that button away"},
                        {"leave", "take all buttons away"}},
           .Start = Start};
 }

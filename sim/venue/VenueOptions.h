@@ -20,10 +20,10 @@ struct VenueOptions {
   std::optional<std::string> LogFile;
   bool UntilEof = false;
   bool Help = false;
-  /// By the names of their entries; every device of the table is here, served or not.
+  /// By the names of their entries; every device of the table is listed, served or not.
   std::map<std::string, DeviceOptions, std::less<>> Devices;
 
-  /// Throws std::out_of_range when the table has no device of that name.
+  /// Throws std::out_of_range if the table has no device of that name.
   const DeviceOptions& Of(std::string_view device) const;
 };
 

@@ -36,7 +36,7 @@ void Failures(std::ostream& text, const DeviceEntry& entry) {
 }
 
 void Commands(std::ostream& text, const std::vector<DeviceEntry>& devices) {
-  text << "\nCommands, a line each; the device's name may stand before (\"onewire leave\"):\n";
+  text << "\nCommands, one per line; the device's name may come first (\"onewire leave\"):\n";
   for (const DeviceEntry& entry : devices) {
     for (const DeviceCommand& command : entry.Commands) {
       Row(text, std::string(command.Usage), command.Meaning);
@@ -48,18 +48,12 @@ void Commands(std::ostream& text, const std::vector<DeviceEntry>& devices) {
 
 std::string VenueUsage(const std::vector<DeviceEntry>& devices) {
   std::ostringstream text;
-  text
-      << "Usage: tessarine-venue [OPTION]...\n"
-         "Stands in for the devices of a venue, each on a pseudo terminal of its own. Prints a line for each "
-         "when it is\n"
-         "ready (\"base unit: DEVICE\"), obeys commands on the standard input, serves until SIGTERM or "
-         "SIGINT, "
-         "and tells at\n"
-         "the end on the standard error what the host must not have done. A host whose line has another "
-         "speed, parity or\n"
-         "count of bits than the device's is not answered; of seven data bits and of even parity a pseudo "
-         "terminal knows\n"
-         "nothing.\n\n";
+  text << "Usage: tessarine-venue [OPTION]...\n"
+          "Stands in for the devices of a venue, each on its own pseudo terminal. Prints a line for each\n"
+          "device when it is ready (\"base unit: DEVICE\"), obeys commands on the standard input, serves\n"
+          "until SIGTERM or SIGINT, and at the end reports on the standard error what the host did wrong.\n"
+          "A host whose line differs from the device's in speed, parity or number of bits gets no answer;\n"
+          "seven data bits and even parity cannot be seen on a pseudo terminal.\n\n";
   Rows(text, GeneralOptions());
   for (const DeviceEntry& entry : devices) {
     text << "\nThe " << entry.Title;

@@ -41,11 +41,11 @@ class Composition {
   QTranslator dialogTexts_;  ///< the toolkit's own texts ("OK", "File name:") in the program's language
   QtClock clock_;
   SqliteEngine databases_;
-  ConversionWithProgress old_{strings_};
   QtEventPump events_;
   DialogParent parent_;
   QtFileDialog fileDialog_{[this] { return parent_.Window(); }};
   LinuxFiles files_;
+  ConversionWithProgress old_{strings_, files_};
   QtFolders folders_;
   ProgramLog log_;
   QtMessageBoxes shownBoxes_{[this] { return parent_.Window(); }};

@@ -12,13 +12,12 @@
 class ConversionWithProgress : public OldDatabases {
  public:
   /// `moment` is the time until the window appears, and between updates of its text.
-  explicit ConversionWithProgress(const StringTable& strings,
+  explicit ConversionWithProgress(const StringTable& strings, Files& disk,
                                   std::chrono::milliseconds moment = std::chrono::milliseconds(90),
                                   const std::string& reader = JetReaderPath());
 
   bool IsOld(const std::string& path) const override { return converter_.IsOld(path); }
-  OldDatabaseReport Convert(const std::string& path, const std::string& table,
-                            const std::string& emptyDatabase) override;
+  OldDatabaseReport Convert(const OldDatabase& old, ConversionSteps& steps) override;
 
  private:
   void ShowRows(std::int64_t rows);

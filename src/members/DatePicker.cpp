@@ -71,9 +71,7 @@ void DatePicker::ShowStored() {
 // While the operator types, the text may be a different date ("1961-02-3") or no date at all; in the latter
 // case the last finished date counts.
 void DatePicker::TakeText(const QString& text) {
-  // A two-digit year is taken from the last hundred years, since birthdates are not in the future.
-  const QDate earliest = QDate::currentDate().addYears(-100).addDays(1);
-  const QDate date = DateIn(QLocale::system(), text.trimmed(), earliest);
+  const QDate date = DateIn(QLocale::system(), text.trimmed());
   if (text.trimmed().isEmpty()) {
     stored_.clear();
   } else if (date.isValid()) {

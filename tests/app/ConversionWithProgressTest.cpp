@@ -7,7 +7,9 @@
 #include <QTimer>
 #include <filesystem>
 
+#include "platform/linux/LinuxFiles.h"
 #include "tests/support/Controls.h"
+#include "tests/support/ConversionAnswers.h"
 #include "tests/support/TemporaryFolder.h"
 
 namespace {
@@ -36,13 +38,60 @@ class ConversionWindow : public testing::TestWithParam<Language> {
   }
 
   TemporaryFolder folder;
+  LinuxFiles disk;
   const std::string Path = folder / "members.mdb";
   const std::string Reader = folder / "reader";
 };
 
+TEST_P(ConversionWindow, StandsWhileTheReaderIsSilent) {
+  WriteFile(Reader, "#!/bin/sh\nsleep 2\ncat '" + (folder / "written") + "'\n");
+  const StringTable strings(GetParam());
+  ConversionWithProgress conversion(strings, disk, std::chrono::milliseconds(90), Reader);
+  bool stood = false;
+  QTimer watch;
+  QObject::connect(&watch, &QTimer::timeout, [&stood] {
+    for (const QWidget* window : QApplication::topLevelWidgets()) {
+      stood |= qobject_cast<const QProgressDialog*>(window) != nullptr && window->isVisible();
+    }
+  });
+  watch.start(0);
+  ConversionAnswers steps;
+  conversion.Convert({Path, "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb", folder / "none"},
+                     steps);
+  EXPECT_TRUE(stood);
+}
+
+/// Asks whether a window stands over its question.
+class WindowDuringQuestion : public ConversionAnswers {
+ public:
+  bool Stood = false;
+  bool Asked = false;
+
+  bool GoOnWithout(const std::vector<NotTakenOver>& /*values*/) override {
+    Asked = true;
+    for (const QWidget* window : QApplication::topLevelWidgets()) {
+      Stood |= qobject_cast<const QProgressDialog*>(window) != nullptr;
+    }
+    return true;
+  }
+};
+
+TEST_P(ConversionWindow, GoesBeforeAQuestion) {
+  std::string words = OneMember();
+  words.insert(words.find("RI") + 10, "U");
+  WriteFile(folder / "written", words);
+  const StringTable strings(GetParam());
+  ConversionWithProgress conversion(strings, disk, std::chrono::milliseconds(0), Reader);
+  WindowDuringQuestion steps;
+  conversion.Convert({Path, "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb", folder / "none"},
+                     steps);
+  EXPECT_TRUE(steps.Asked);
+  EXPECT_FALSE(steps.Stood);
+}
+
 TEST_P(ConversionWindow, TellsFileAndRowsUntilItIsDone) {
   const StringTable strings(GetParam());
-  ConversionWithProgress conversion(strings, std::chrono::milliseconds(0), Reader);
+  ConversionWithProgress conversion(strings, disk, std::chrono::milliseconds(0), Reader);
   QStringList seen;
   QTimer watch;
   QObject::connect(&watch, &QTimer::timeout, [&seen] {
@@ -54,7 +103,9 @@ TEST_P(ConversionWindow, TellsFileAndRowsUntilItIsDone) {
     }
   });
   watch.start(0);
-  conversion.Convert(Path, "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb");
+  ConversionAnswers steps;
+  conversion.Convert({Path, "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb", folder / "none"},
+                     steps);
   ASSERT_FALSE(seen.isEmpty());
   EXPECT_EQ(seen.front(), GetParam() == Language::English
                               ? QStringLiteral("Converting members.mdb of an old installation: 1 rows")

@@ -16,7 +16,7 @@ class FakeClock : public Clock {
   std::string ShortTime() const override { return Time; }
   std::string Now() const override { return DateAndTime; }
 
-  /// Long forms by the texts they are asked for; other texts stand for no date.
+  /// Long dates by the text they are requested for; any other text is no date.
   std::map<std::string, std::string> LongDates = {{"21/05/2013 14:30", "Tuesday, 21 May 2013"}};
 
   std::string LongDate(const std::string& text) const override {

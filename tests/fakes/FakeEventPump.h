@@ -11,8 +11,8 @@
 #include "platform/EventPump.h"
 #include "platform/MonotonicClock.h"
 
-/// Event pump, timers and passing of time in one: a wait of a minute takes no time. Time stands still while
-/// code runs and goes on in waits, in pauses, and in what blocks (Pass).
+/// Event pump, timers and clock in one: a wait of a minute takes no real time. Time stands still while code
+/// runs, and passes in waits, in pauses and in blocking calls (Pass).
 class FakeEventPump : public EventPump, public MonotonicClock {
  public:
   using Time = std::chrono::milliseconds;
@@ -20,7 +20,7 @@ class FakeEventPump : public EventPump, public MonotonicClock {
   /// All pauses so far.
   std::vector<Time> Sleeps;
 
-  /// Run at the start of each pause, with its length.
+  /// Called at the start of each pause, with its length.
   std::function<void(Time)> OnSleep;
 
   /// Schedules an event: a timer's tick, arriving bytes, a button pressed in the middle of a wait. Events of
@@ -32,7 +32,7 @@ class FakeEventPump : public EventPump, public MonotonicClock {
 
   std::chrono::microseconds Elapsed() const override { return now_; }
 
-  /// Time passes while a call blocks: no event is served.
+  /// Lets time pass as in a blocking call: no events are processed.
   void Pass(std::chrono::microseconds time) { now_ += time; }
 
   /// Number of waits and long pauses that are on the stack.
@@ -41,7 +41,7 @@ class FakeEventPump : public EventPump, public MonotonicClock {
   void EndWaits() override { ended_ = true; }
 
   void DoEvents() override {
-    // What these events schedule in turn is left for the next call, even when it is due at once.
+    // Whatever these events schedule is left for the next call, even if it is due at once.
     std::vector<std::function<void()>> due;
     while (!events_.empty() && events_.begin()->first <= now_) {
       due.push_back(TakeNext());

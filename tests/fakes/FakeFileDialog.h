@@ -25,10 +25,10 @@ class FakeFileDialog : public FileDialog {
   /// All calls so far.
   std::vector<Call> Calls;
 
-  /// Paths that the operator will choose, first one first; std::nullopt is Cancel.
+  /// Paths that the operator will choose, in order; std::nullopt is Cancel.
   std::deque<std::optional<std::string>> Answers;
 
-  /// Run while a dialog is open.
+  /// Called while a dialog is open.
   std::function<void()> WhileOpen;
 
   std::optional<std::string> ShowOpen(const FileRequest& request) override { return Ask(false, request); }

@@ -20,19 +20,19 @@ class FakeFiles : public Files {
     bool operator==(const ReplaceCall&) const = default;
   };
 
-  /// All calls of Replace, also those that failed.
+  /// All calls of Replace, including those that failed.
   std::vector<ReplaceCall> Replaced;
 
-  /// All calls of CreateFolder, also those that failed.
+  /// All calls of CreateFolder, including those that failed.
   std::vector<std::string> Created;
 
-  /// Number of calls of Append, also of those that failed.
+  /// Number of calls of Append, including those that failed.
   int Appends = 0;
 
-  /// What FreeSpace answers.
+  /// What FreeSpace returns.
   std::uint64_t FreeBytes = std::uint64_t{1} << 40U;
 
-  /// Adds a folder and those above it.
+  /// Adds a folder and its parents.
   void AddFolder(const std::string& path) {
     for (std::string folder = path; !FolderExists(folder); folder = ParentOf(folder)) {
       folders_.insert(WithoutSeparator(folder));
@@ -49,7 +49,7 @@ class FakeFiles : public Files {
 
   const std::map<std::string, std::string>& Contents() const { return contents_; }
 
-  /// Every read, replacement (also Write and Append) or making of `path` fails from now on.
+  /// From now on every read, replacement (also Write, Append, Rename), creation or deletion of `path` fails.
   void FailRead(const std::string& path, const RuntimeError& error) {
     readFailures_.insert_or_assign(path, error);
   }
@@ -64,7 +64,7 @@ class FakeFiles : public Files {
     deleteFailures_.insert_or_assign(path, error);
   }
 
-  /// Where MakeTempFileName makes "per1", "per2", ...; fails when making that folder is told to fail.
+  /// Where MakeTempFileName creates "per1", "per2", ...; it fails after FailCreateFolder for this folder.
   static constexpr const char* TempFolder = "/tmp";
 
   bool FileExists(const std::string& path) const override { return contents_.count(path) != 0; }

@@ -6,7 +6,7 @@
 
 class FakeFolders : public Folders {
  public:
-  /// Result of LocalAppData; with any other than Found the path is left alone.
+  /// Result of LocalAppData; unless it is Found, the path is left unchanged.
   std::uint32_t Code = Found;
   std::string LocalAppDataPath = "/home/operator/.local/share";
   std::string ProgramPath = "/opt/tessarine/share/tessarine";

@@ -32,14 +32,14 @@ class FakeMessageBoxes : public MessageBoxes {
   /// All boxes so far, in the order in which they opened.
   std::vector<Box> Boxes;
 
-  /// Answers to the coming questions, first one first. When they run out, the default button (OK, Yes) is
-  /// pressed. A box with nothing but OK takes none of them.
+  /// Answers to the next questions, in order. When they run out, the default button (OK, Yes) is pressed. A
+  /// box with only an OK button uses none of them.
   std::deque<BoxAnswer> Answers;
 
-  /// Run while a box is open, with the box; may press buttons, open further boxes or add answers.
+  /// Called while a box is open, with the box; may press buttons, open further boxes or add answers.
   std::function<void(const Box&)> WhileOpen;
 
-  /// More boxes than any test opens: a box that is asked again for ever then ends its test.
+  /// More boxes than any test opens: a box that keeps coming back then ends its test.
   static constexpr std::size_t MostBoxes = 1000;
 
   BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,

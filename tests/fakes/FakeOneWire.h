@@ -12,30 +12,30 @@
 #include "platform/OneWire.h"
 #include "platform/RuntimeError.h"
 
-/// A bus whose devices the test touches and takes away.
+/// A bus to which the test adds devices and from which it removes them.
 class FakeOneWire : public OneWire {
  public:
   using Rom = std::array<std::uint8_t, 8>;
 
-  /// All operations in order, with what they were given: "TMExtendedStartSession 1 5", "TMNext", ...
+  /// All operations in order, with their arguments: "TMExtendedStartSession 1 5", "TMNext", ...
   std::vector<std::string> Log;
 
-  /// Port and kind of the settings.
+  /// Port and adapter type in the settings; if empty, TMReadDefaultPort fails.
   std::optional<std::pair<std::int16_t, std::int16_t>> DefaultPort;
 
-  /// What a session gets as its handle.
+  /// Handle that a session gets; if it is 0 or below, none can be opened.
   std::int32_t Handle = 7;
 
-  /// Devices on the bus in the order in which a walk meets them.
+  /// Devices on the bus in the order in which a walk finds them.
   std::vector<Rom> Devices;
 
-  /// The next calls of TMNext give these instead, oldest first: BadRead, mostly.
+  /// Results of the next calls of TMNext, in order, instead of a device: BadRead, mostly.
   std::deque<std::int16_t> NextResults;
 
-  /// This operation throws.
+  /// Name of the operation that throws.
   std::string Broken;
 
-  /// Run at the start of each operation, with its name; may touch a button.
+  /// Called at the start of each operation, with its name; may add a device.
   std::function<void(const std::string&)> OnCall;
 
   /// What the bus answers to a byte; by default the same.
@@ -64,7 +64,7 @@ class FakeOneWire : public OneWire {
     return IsOpen(handle);
   }
 
-  /// The walk counts in `Branch`.
+  /// Counts the devices of the walk in `Branch`.
   std::int16_t TMNext(std::int32_t handle, OneWireState& state) override {
     Begin("TMNext");
     if (!NextResults.empty()) {

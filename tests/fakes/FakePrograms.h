@@ -13,7 +13,7 @@ class FakePrograms : public Programs {
   /// The words of each program that was started.
   std::vector<std::vector<std::string>> Started;
 
-  /// When set, every start fails so.
+  /// If set, every start throws this.
   std::optional<RuntimeError> Failure;
 
   void Start(const std::vector<std::string>& words) override {

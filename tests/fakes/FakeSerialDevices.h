@@ -8,10 +8,10 @@
 
 class FakeSerialDevices : public SerialDevices {
  public:
-  /// The machine's ports; they exist.
+  /// The machine's ports, all of which exist.
   std::vector<std::string> Ports;
 
-  /// Devices that exist beside those, such as links by id.
+  /// Other devices that exist, such as links by id.
   std::set<std::string> Others;
 
   std::vector<std::string> Names() const override { return Ports; }

@@ -21,29 +21,29 @@ class FakeSerialPort : public SerialPort {
   /// All bytes put on the line.
   std::vector<std::uint8_t> Sent;
 
-  /// Of the last successful open; the settings as they were changed since.
+  /// From the last successful open; `Settings` also from later changes.
   std::string Device;
   std::string Settings;
 
-  /// A drain of the open line, also that of a close.
+  /// A drain of the open line, including those of a close and of a change of settings.
   struct DrainCall {
-    std::size_t BytesSent;           ///< before it
-    std::chrono::microseconds Time;  ///< of its end, when there is a `Pump`
+    std::size_t BytesSent;           ///< before the drain
+    std::chrono::microseconds Time;  ///< when it ended; 0 without a `Pump`
 
     bool operator==(const DrainCall&) const = default;
   };
   std::vector<DrainCall> Drains;
 
-  /// As last told.
+  /// As last set by SetInstrument.
   std::string Instrument;
 
-  /// With it the line has the rate of its settings: each byte needs its time, which a drain lets pass.
+  /// If set, the line has the baud rate of its settings: each byte takes its time, which passes in a drain.
   FakeEventPump* Pump = nullptr;
 
-  /// Run with each byte put on the line, so that a test can answer.
+  /// Called with each byte put on the line, so that a test can answer.
   std::function<void(std::uint8_t)> OnOutput;
 
-  /// Bytes arrive. As on a real line, those that came before the open are lost.
+  /// Lets bytes arrive. As on a real line, those that came before the open are lost.
   void Receive(const std::vector<std::uint8_t>& bytes) {
     input_.insert(input_.end(), bytes.begin(), bytes.end());
   }

@@ -29,7 +29,7 @@ class FakeSoundPlayer : public SoundPlayer {
   /// All sounds that were started.
   std::vector<Sound> Played;
 
-  /// There is no sound device from now on.
+  /// If set, there is no sound device.
   bool NoDevice = false;
 
   void Play(std::vector<std::uint8_t> samples, int samplesPerSecond) override {
@@ -39,7 +39,7 @@ class FakeSoundPlayer : public SoundPlayer {
     }
     Played.push_back({std::move(samples), samplesPerSecond});
     start_ = pump_.Now();
-    pump_.At(Played.back().Length(), [] {});  // a wait for the end looks again then
+    pump_.At(Played.back().Length(), [] {});  // makes a wait for the end test its condition then
   }
 
   void Stop() override { start_.reset(); }
@@ -52,5 +52,5 @@ class FakeSoundPlayer : public SoundPlayer {
 
  private:
   FakeEventPump& pump_;
-  std::optional<Time> start_;  ///< of the last sound, which was not stopped
+  std::optional<Time> start_;  ///< of the last sound, unless it was stopped
 };

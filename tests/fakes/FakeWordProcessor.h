@@ -11,9 +11,9 @@
 #include "platform/RuntimeError.h"
 #include "platform/WordProcessor.h"
 
-/// A word processor that only remembers. Every operation is logged ("Start", "Add /x/score_card.doc",
+/// A word processor that only records. Every operation is logged ("Start", "Add /x/score_card.doc",
 /// "SetBookmark Rank", "WriteCells 4", "AddPicture 1 1 1", "SaveAs /x/y.doc", "ExportPdf", "PrintOut",
-/// "Close", "JoinPdfs 3 /x/z.pdf", "Quit"); one of them can be told to fail.
+/// "Close", "JoinPdfs 3 /x/z.pdf", "Quit"); one of them can be made to fail.
 class FakeWordProcessor : public WordProcessor {
  public:
   struct Document {
@@ -30,14 +30,14 @@ class FakeWordProcessor : public WordProcessor {
   std::vector<std::string> Log;
   std::vector<std::unique_ptr<Document>> Documents;
 
-  /// What State tells; Start makes it `AfterStart` when it is Ended.
+  /// What State returns; Start changes it from Ended to `AfterStart`.
   WordState Now = WordState::Ended;
   WordState AfterStart = WordState::Ready;
 
-  /// The operation that begins with this text fails, each time.
+  /// Every operation whose log entry begins with this text fails.
   std::string FailAt;
 
-  /// Run before each operation, with its log entry.
+  /// Called before each operation, with its log entry.
   std::function<void(const std::string&)> OnOperation;
 
   void Start() override {

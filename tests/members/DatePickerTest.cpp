@@ -7,6 +7,7 @@
 #include <QCalendarWidget>
 #include <QTest>
 
+#include "platform/qt/QtClock.h"
 #include "tests/support/Controls.h"
 
 namespace {
@@ -25,6 +26,10 @@ class DateEntry : public testing::Test {
     picker.selectAll();
     QTest::keyClick(&picker, Qt::Key_Delete);
     QTest::keyClicks(&picker, QString::fromStdString(text));
+  }
+
+  static std::string TwoDigits(int year) {
+    return QString::number(year % 100).rightJustified(2, u'0').toStdString();
   }
 
   void Leave() { other.setFocus(); }
@@ -87,14 +92,19 @@ TEST_F(DateEntry, TakesADateThatAnAssistiveProgramEnters) {
   EXPECT_EQ(picker.Stored(), "");
 }
 
-TEST_F(DateEntry, TakesTwoDigitsOfAYearAsOfTheLastHundredYears) {
-  const int thisYear = QDate::currentDate().year();
-  const auto twoDigits = [](int year) {
-    return "1 Jan " + QString::number(year % 100).rightJustified(2, u'0').toStdString();
-  };
-  for (const int year : {thisYear - 99, thisYear - 60, thisYear - 1, thisYear}) {
-    Enter(twoDigits(year));
+TEST_F(DateEntry, TakesTwoDigitsOfAYearAs1930To2029) {
+  for (const int year : {1930, 1961, 1999, 2000, 2013, 2026, 2029}) {
+    Enter("1 Jan " + TwoDigits(year));
     EXPECT_EQ(picker.Stored(), std::to_string(year) + "-01-01 00:00:00");
+  }
+}
+
+TEST_F(DateEntry, TakesTwoDigitsOfAYearAsTheScoreSheetDoes) {
+  for (int year = 1930; year <= 2029; ++year) {
+    const std::string text = "1 Jan " + TwoDigits(year);
+    Enter(text);
+    const QDate date = QDate::fromString(QString::fromStdString(picker.Stored()).left(10), Qt::ISODate);
+    EXPECT_EQ(QtClock().LongDate(text), QLocale::system().toString(date, QLocale::LongFormat).toStdString());
   }
 }
 

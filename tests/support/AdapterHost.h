@@ -6,10 +6,10 @@
 
 namespace sim {
 
-/// A host that speaks to a 1-wire adapter in bytes.
+/// A host that speaks to a 1-wire adapter byte by byte.
 class AdapterHost : public RawHost {
  public:
-  /// Opens the device, calibrates the chip with its first byte and waits for nothing.
+  /// Opens the device and calibrates the chip with a first byte, which has no answer.
   explicit AdapterHost(const std::string& path) : RawHost(path) { Write({0xC1}); }
 
   /// Writes `bytes` and reads `count` answers.
@@ -18,7 +18,7 @@ class AdapterHost : public RawHost {
     return Read(count);
   }
 
-  /// A reset and a pass of a search: the answers to both, to the search command and to the 16 bytes.
+  /// A reset and one search pass. Returns the answers to the reset, the search command and the 16 bytes.
   Bytes Search(const Bytes& directions) {
     Bytes bytes{0xC1, 0xE1, 0xF0, 0xE3, 0xB1, 0xE1};
     bytes.insert(bytes.end(), directions.begin(), directions.end());

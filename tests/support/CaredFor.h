@@ -17,7 +17,7 @@
 #include <QWidget>
 #include <vector>
 
-// What holds for every window, in both languages.
+// What must hold for every window, in both languages.
 
 /// The controls of `window` that the operator writes into or chooses from.
 inline std::vector<QWidget*> EntriesOf(const QWidget& window) {
@@ -39,7 +39,7 @@ inline std::vector<QWidget*> EntriesOf(const QWidget& window) {
   return entries;
 }
 
-/// A screen reader knows each entry by the label beside it or by a name of its own.
+/// A screen reader knows each entry by its label or by an accessible name.
 inline void ExpectEntriesAreNamed(const QWidget& window) {
   for (const QWidget* entry : EntriesOf(window)) {
     bool named = !entry->accessibleName().isEmpty();
@@ -50,7 +50,7 @@ inline void ExpectEntriesAreNamed(const QWidget& window) {
   }
 }
 
-/// No caption is cut off, and nothing lies outside of the window.
+/// No caption is cut off, and none is outside the window.
 inline void ExpectCaptionsFit(const QWidget& window) {
   for (const QWidget* widget : window.findChildren<QWidget*>()) {
     const auto* label = qobject_cast<const QLabel*>(widget);
@@ -96,7 +96,7 @@ inline void ExpectTabOrderFollowsTheEye(const QWidget& window) {
   }
 }
 
-/// All of these for a window that is shown and fits on the smallest screen that the program is made for.
+/// All of the above, for a window that is shown, and that it fits on the smallest supported screen.
 inline void ExpectCaredFor(const QWidget& window) {
   QCoreApplication::processEvents();  // layouts follow new texts
   ExpectEntriesAreNamed(window);

@@ -6,7 +6,7 @@
 #include <stdexcept>
 #include <string>
 
-/// The control of this name in `window`. Throws std::logic_error when there is none of that type.
+/// The control of this name in `window`. Throws std::logic_error if there is none of that type.
 template <typename Control>
 Control& Find(const QObject& window, const std::string& name) {
   auto* control = window.findChild<Control*>(QString::fromStdString(name));

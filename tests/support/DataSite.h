@@ -15,8 +15,8 @@
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/TestDatabase.h"
 
-/// What a window that works on the operator's data stands on: a data folder of its own with real databases
-/// and files; boxes, file dialogs, clock and reader are faked.
+/// The surroundings of a window that works on the operator's data: a temporary data folder with real
+/// databases and files; boxes, file dialogs, clock and reader are fakes.
 class DataSite {
  public:
   explicit DataSite(Language language = Language::English) : Strings(language) {}
@@ -36,12 +36,12 @@ class DataSite {
     }
   }
 
-  /// Another program changes one of the databases.
+  /// Changes one of the databases, as another program would.
   void ChangeDatabase(const std::string& file, const std::string& sql) const {
     OtherConnection(DataFile(file)).Execute(sql);
   }
 
-  /// What another program reads of one of the databases: the first column of the first row, "NULL" or "none".
+  /// What another program reads in one of the databases: the first column of the first row, "NULL" or "none".
   std::string QueryDatabase(const std::string& file, const std::string& sql) const {
     return OtherConnection(DataFile(file)).Query(sql);
   }
@@ -53,6 +53,6 @@ class DataSite {
   FakeFileDialog Dialog;
   LinuxFiles Disk;
   FakeMessageBoxes Boxes;
-  /// The reader of membership buttons; none as long as it is empty.
+  /// The reader of membership buttons; if it is empty, there is none.
   std::function<std::string()> ButtonSwipe;
 };

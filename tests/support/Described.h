@@ -8,7 +8,7 @@
 
 #include "core/game/Game.h"
 
-/// Every field of a player, one a line, so that a failed comparison names those that differ.
+/// Every field of a player, one per line, so that a failed comparison names those that differ.
 inline std::string Described(const Player& player) {
   std::ostringstream out;
   out << std::setprecision(9);
@@ -44,7 +44,7 @@ inline std::string DescribedHeader(const Game& game) {
   return out.str();
 }
 
-/// Expects two games to be the same in all 224 records; tells the first difference only.
+/// Expects two games to be the same in all 224 records; reports only the first record that differs.
 inline void ExpectSameGame(const Game& game, const Game& expected) {
   EXPECT_EQ(DescribedHeader(game), DescribedHeader(expected));
   for (int index = 1; index <= PlayerCount; ++index) {

@@ -33,14 +33,14 @@ inline const FakeMessageBoxes::Box SendErrorBox =
 inline const FakeMessageBoxes::Box ChecksumBox = BoxOf("Checksum failed", BoxIcon::Critical);
 inline const FakeMessageBoxes::Box NoScoresBox = BoxOf("Kesh has no score data.", BoxIcon::Information);
 
-/// A download with all that it touches. At the far end of its line stands a unit that answers each request
-/// with the same frames, at once.
+/// A download with everything it uses. At the far end of its line is a unit that answers each request with
+/// the same frames, at once.
 struct DownloadStage {
   static constexpr std::size_t Never = std::numeric_limits<std::size_t>::max();
 
   std::vector<Bytes> Frames;          ///< with their check bytes
-  std::optional<std::uint8_t> Count;  ///< what the unit says when it is not the number of frames
-  std::size_t SilentFrom = Never;     ///< bytes of an answer after which nothing more comes
+  std::optional<std::uint8_t> Count;  ///< the count that the unit sends, if not the number of frames
+  std::size_t SilentFrom = Never;     ///< how many bytes of an answer come before it falls silent
   std::function<void()> ShowSettings = [] {};
 
   FakeFiles Store;
@@ -52,6 +52,7 @@ struct DownloadStage {
   FakeDownloadProgress Progress;
   StringTable Strings{Language::English};
   Game Scores{Strings};
+  DownloadedGuns Guns{Scores};
   IniReader Ini{Store, "/tessarine.ini"};
   CommPort Line{Port, Ini, Devices, Boxes, Strings, [this] { ShowSettings(); }};
 
@@ -62,11 +63,11 @@ struct DownloadStage {
   DownloadStage(const DownloadStage&) = delete;
   DownloadStage& operator=(const DownloadStage&) = delete;
 
-  void GetScores() { GetScores(Progress); }
+  DownloadResult GetScores() { return GetScores(Progress); }
 
-  /// For a second download beside the first.
-  void GetScores(DownloadProgress& progress) {
-    BaseUnitDownload(Port, Line, Events, Boxes, Time, progress, Scores).GetScores();
+  /// For a second download during the first.
+  DownloadResult GetScores(DownloadProgress& progress) {
+    return BaseUnitDownload(Port, Line, Events, Boxes, Time, progress, Guns).GetScores();
   }
 
   /// Writes bytes sent, pauses and boxes into the log of the progress window.
@@ -82,7 +83,7 @@ struct DownloadStage {
   }
 
  private:
-  /// 1 and then 0 ask for the count and the first frame, each reply brings the next frame.
+  /// 1 and then 0 request the count and the first frame; each reply brings the next frame.
   void Answer(std::uint8_t byte) {
     if (byte == 1) {
       asked_ = true;

@@ -2,7 +2,7 @@
 
 #include "platform/RuntimeError.h"
 
-/// Number of the RuntimeError that `command` throws, 0 when it throws none.
+/// Number of the RuntimeError that `command` throws, 0 if it throws none.
 template <typename Command>
 int FailureOf(Command&& command) {
   try {

@@ -4,7 +4,7 @@
 #include <csignal>
 #include <stdexcept>
 
-/// While it lives no file of this process can grow beyond `bytes`; a write that would do so fails instead.
+/// While it exists, no file of this process can grow beyond `bytes`; a write that would do so fails instead.
 class FileSizeLimit {
  public:
   explicit FileSizeLimit(rlim_t bytes) : oldHandler_(std::signal(SIGXFSZ, SIG_IGN)) {

@@ -38,8 +38,8 @@ inline Bytes FrameOfBlue0() {
           215};
 }
 
-/// Red 1 with the longest frame that the buffer takes, 1001 bytes: 949 unknown ones stand between the flag
-/// and the number of hits, and the second hit, 517 damage, ends in the buffer's last byte.
+/// Red 1 with the longest frame that fits the buffer, 1001 bytes: 949 unknown bytes are between the flag and
+/// the number of hits, and the second hit, 517 damage, ends in the buffer's last byte.
 inline Bytes LongestFrameOfRed1() {
   Bytes frame = FrameOfRed1();
   frame.insert(frame.begin() + 45, 949, 0);

@@ -9,7 +9,7 @@ inline std::string GameFile(const std::string& players, const std::string& missi
          "</PlayerData></GameData>";
 }
 
-/// An active player of a game file with these further fields.
+/// An active player in a game file, with these further fields.
 inline std::string PlayerOf(int index, const std::string& fields = {}) {
   return "<Player><Index>" + std::to_string(index) + "</Index><Active>1</Active>" + fields + "</Player>";
 }
@@ -19,7 +19,7 @@ inline std::string SmallGame() {
   return GameFile(PlayerOf(1, "<BonusPoints>5</BonusPoints>") + PlayerOf(40, "<BonusPoints>9</BonusPoints>"));
 }
 
-/// Nine players who hit each other, with members' names missing.
+/// Nine players who hit each other, none of them a member.
 inline std::string GameOfManyHits() {
   std::string players;
   for (int index = 1; index <= 9; ++index) {

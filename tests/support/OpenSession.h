@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <string>
 #include <utility>
 #include <vector>
@@ -14,8 +15,8 @@
 #include "tests/support/ScoredGame.h"
 #include "tests/support/TemporaryFolder.h"
 
-/// A session on a data folder of its own, with real databases and files; no mission and no member until a
-/// test adds them.
+/// A session on a temporary data folder, with real databases and files; no mission and no member until a test
+/// adds them.
 class OpenSession {
  public:
   OpenSession() {
@@ -30,7 +31,7 @@ class OpenSession {
 
   bool Open() { return session.Open({Databases, Old, Disk, Folder.Path(), Folder / "program"}); }
 
-  /// Puts a player into the game with that many bonus points.
+  /// Puts a player with that many bonus points into the game.
   Player& Play(int index, int points) {
     session.Game().DataPresent = true;
     Player& player = session.Game().Players(index);
@@ -53,7 +54,7 @@ class OpenSession {
   StringTable Strings{Language::English};
   FakeClock Time;
   FakeMessageBoxes Boxes;
-  SqliteEngine Databases;
+  SqliteEngine Databases{std::chrono::milliseconds(50)};
   FakeOldDatabases Old;
   LinuxFiles Disk;
   Session session{Strings, Time, Boxes};

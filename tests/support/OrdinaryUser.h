@@ -3,7 +3,7 @@
 #include <unistd.h>
 #include <stdexcept>
 
-/// While it lives permissions count, also where the tests are run by root.
+/// While it exists, file permissions apply even if the tests are run by root.
 class OrdinaryUser {
  public:
   OrdinaryUser() {

@@ -32,7 +32,7 @@ inline std::vector<RadioGun> TwoGuns() {
            .AnswerTime = {}}};
 }
 
-/// Frames as they pass the line, worked out by hand.
+/// Frames as they appear on the line, worked out by hand.
 namespace wire {
 
 inline const Bytes SearchRed2{0x7E, 0x00, 0x10, 0x00, 0x00, 0x00, 0x00, 0x00, 0x00, 0x00,

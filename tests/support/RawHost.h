@@ -26,20 +26,20 @@ inline void PrintTo(const LineSettings& settings, std::ostream* out) {
 /// The host's end of a line, byte by byte and without a protocol.
 class RawHost {
  public:
-  /// Fails the running test when `path` cannot be opened.
+  /// Fails the running test if `path` cannot be opened.
   explicit RawHost(const std::string& path);
 
-  /// Sets the host's end of the line; without this it has what the device begins with.
+  /// Sets the host's end of the line; until then it has the device's initial settings.
   void Speak(const LineSettings& settings) { SetRawLine(line_.Get(), settings); }
   LineSettings Settings() const { return ReadLineSettings(line_.Get()); }
   void Write(const Bytes& bytes);
-  /// None when `longestWait` passed first or the line hung up.
+  /// None if `longestWait` passes first or the line hangs up.
   std::optional<std::uint8_t> ReadByte(std::chrono::milliseconds longestWait = Limit);
-  /// `count` bytes, or fewer when one does not come within the limit.
+  /// `count` bytes, or fewer if one does not come within the limit.
   Bytes Read(std::size_t count);
   /// All bytes until the line hangs up.
   Bytes ReadUntilHangUp();
-  /// True when no byte waits and none comes for a while that exceeds the line's own delays by far.
+  /// True if no byte is waiting and none comes for far longer than the line's own delays.
   bool IsSilent() { return !ReadByte(std::chrono::milliseconds(60)); }
   bool HungUp() const { return hungUp_; }
 

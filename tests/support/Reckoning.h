@@ -15,7 +15,7 @@
 // The scores of a game the long way: plain loops, every rounding written out, nothing shared with the
 // analysis.
 
-/// Nearest integer, a half to the even one.
+/// Nearest integer, ties to even.
 inline long long HalfEven(long double value) {
   const long double below = std::floor(value);
   const long double rest = value - below;
@@ -23,7 +23,7 @@ inline long long HalfEven(long double value) {
   return rest > 0.5L || (rest == 0.5L && low % 2 != 0) ? low + 1 : low;
 }
 
-/// What a mission pays by objective set, and takes.
+/// The rewards of a mission, by objective set, and its penalties.
 struct MissionPay {
   std::array<double, TeamCount> Primary{};
   std::array<double, TeamCount> Secondary{};
@@ -115,7 +115,7 @@ struct Reckoning {
     player.Soldiering = static_cast<std::int32_t>(score);
   }
 
-  /// Picks the best of those left, again and again; the first of equals.
+  /// Repeatedly picks the best of those left, the first among equals.
   std::vector<int> Place(Game& game) const {
     std::vector<int> left;
     for (int p = 1; p <= PlayerCount; ++p) {
@@ -144,7 +144,7 @@ struct Reckoning {
   }
 };
 
-/// Scores a random game both ways and compares every field, the teams' sums and the order of the board.
+/// Scores the game both ways and compares every field, the teams' sums and the order of the board.
 inline void ExpectReckonedScores(ScoredGame& venue, const Reckoning& reckoning) {
   const auto reckoned = std::make_unique<Game>(venue.game);
   const std::vector<int> board = reckoning.Score(*reckoned);

@@ -17,7 +17,7 @@
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/support/TemporaryFolder.h"
 
-/// Runs SQL on the file at `path`, which is made when absent.
+/// Runs SQL on the file at `path`, which is created if missing.
 inline void ExecuteSql(const std::string& path, const std::string& sql) {
   sqlite3* handle = nullptr;
   sqlite3_open(path.c_str(), &handle);
@@ -80,7 +80,7 @@ class ScoredGame {
     return game.Players(index);
   }
 
-  /// Cells of one column of the board, in shown order.
+  /// Cells of one column of the board, in display order.
   std::vector<std::string> Column(BoardColumn column) const {
     std::vector<std::string> cells;
     for (int place = 0; place < Board.RowCount(); ++place) {

@@ -7,7 +7,7 @@
 #include <stdexcept>
 #include <string>
 
-/// A new folder that goes with everything in it. Other users may look into it.
+/// A new folder, deleted with everything in it at the end. Other users can read it.
 class TemporaryFolder {
  public:
   TemporaryFolder() {

@@ -45,10 +45,10 @@ class OtherConnection {
   sqlite3* handle_ = nullptr;
 };
 
-/// A members file of its own for one test.
+/// A members file for one test.
 class TestDatabase {
  public:
-  /// An empty table, with a photograph in the midst of its columns.
+  /// Creates an empty table, with the photograph in the middle of its columns.
   TestDatabase() {
     Execute(
         "CREATE TABLE Members (ContactID INTEGER PRIMARY KEY AUTOINCREMENT, DallasID TEXT, FirstName TEXT, "
@@ -64,7 +64,7 @@ class TestDatabase {
   void Execute(const std::string& sql) const { OtherConnection(Path()).Execute(sql); }
   std::string Query(const std::string& sql) const { return OtherConnection(Path()).Query(sql); }
 
-  /// Four members, numbers 1, 2, 5 and 9.
+  /// Adds four members, with the numbers 1, 2, 5 and 9.
   void AddMembers() const {
     Execute(
         "INSERT INTO Members (ContactID, DallasID, FirstName, LastName, NickName) VALUES "

@@ -9,7 +9,7 @@ struct Thrown {
   std::string Text;
 };
 
-/// Number and text of the RuntimeError that `operation` throws; number 0 when it throws none.
+/// Number and text of the RuntimeError that `operation` throws; number 0 if it throws none.
 template <typename Operation>
 Thrown ThrownBy(Operation&& operation) {
   try {

@@ -25,10 +25,10 @@
 #include "tests/support/DataSite.h"
 #include "tests/support/GameFiles.h"
 
-/// What passes the time in a wait: a script, or the toolkit's events as in the program itself.
+/// What drives a wait: a script, or the toolkit's events as in the program itself.
 enum class Waits { Scripted, Real };
 
-/// The main window on a data folder of its own, with real databases and files; all else is faked.
+/// The main window on a temporary data folder, with real databases and files; everything else is faked.
 class Venue : public DataSite {
  public:
   explicit Venue(Language language = Language::English, Waits waits = Waits::Scripted)
@@ -59,7 +59,7 @@ class Venue : public DataSite {
     return *Window;
   }
 
-  /// Starts the program, not for the first time.
+  /// Starts the program, but not for the first time.
   frmRx& Start() {
     PutDefaultFiles();
     MakeWindow().FormLoad();
@@ -104,8 +104,8 @@ class Venue : public DataSite {
 
   int RowCount(const std::string& list) const { return Find<QTableView>(list).model()->rowCount(); }
 
-  /// Selects a row of the board and opens the context menu there by the keyboard; `choose` is done with the
-  /// menu open.
+  /// Selects a row of the board and opens the context menu there by the keyboard; calls `choose` while the
+  /// menu is open.
   void OpenPopup(int row, const std::function<void(QMenu&)>& choose) const {
     QTableView& board = Find<QTableView>("ScoreDisplay");
     if (row >= 0) {
@@ -134,7 +134,7 @@ class Venue : public DataSite {
   }
 
   FakeEventPump Events;
-  JetConverter Old{JetReaderPath(), std::chrono::milliseconds(5000)};
+  JetConverter Old{Disk, JetReaderPath(), std::chrono::milliseconds(5000)};
   QtEventPump RealEvents;
   FakeFolders Places;
   FakeSerialDevices Devices;

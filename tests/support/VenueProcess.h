@@ -9,7 +9,7 @@
 
 namespace sim {
 
-/// The program tessarine-venue as a child process; it is killed when the object ends before it does.
+/// The program tessarine-venue as a child process; it is killed if the object ends before it does.
 class VenueProcess {
  public:
   explicit VenueProcess(const std::vector<std::string>& arguments);
@@ -17,7 +17,7 @@ class VenueProcess {
   VenueProcess(const VenueProcess&) = delete;
   VenueProcess& operator=(const VenueProcess&) = delete;
 
-  /// The device of the line "TITLE: DEVICE"; fails the running test when another line or none comes.
+  /// The device of the line "TITLE: DEVICE"; fails the running test if another line or none comes.
   std::string ReadDevice(const std::string& title = "base unit");
   /// The next line of the output, without its end.
   std::string ReadLine();
@@ -25,9 +25,9 @@ class VenueProcess {
   void Signal(int signal);
   void CloseInput() { input_.Close(); }
   bool IsRunning();
-  /// The exit status, or -1 when the program did not exit by itself within the limit.
+  /// The exit status, or -1 if the program did not exit by itself within the limit.
   int WaitForExit();
-  /// All that is left of the outputs, after the exit.
+  /// The rest of both outputs, after the exit.
   std::string RestOfOutput();
   std::string RestOfErrors();
 

@@ -6,7 +6,7 @@
 #include <QTimer>
 #include <functional>
 
-/// Runs `act` as soon as a modal window of type `Window` is up, with that window. Counts how often it ran.
+/// Runs `act` as soon as a modal window of type `Window` is shown, with that window. Counts how often it ran.
 template <typename Window>
 class WhileModal {
  public:

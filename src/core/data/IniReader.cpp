@@ -16,8 +16,8 @@ constexpr std::size_t MostBytesOfValue = 254;
 
 constexpr std::string_view ByteOrderMark = "\xEF\xBB\xBF";
 
-/// Each name and value is decoded by itself, since the values that this program writes into an old file are
-/// UTF-8 among others in code page 1252.
+/// Names and values are decoded one by one, since in an old file the values written by this program are UTF-8
+/// among others in code page 1252.
 std::string Decoded(std::string_view bytes) {
   return IsUtf8(bytes) ? std::string(bytes) : Windows1252ToUtf8(bytes);
 }

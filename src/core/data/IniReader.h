@@ -11,9 +11,9 @@
 /// first one with a given name counts, and only ";" begins a comment. Texts are UTF-8; a value that is not
 /// valid UTF-8 is read as code page 1252.
 ///
-/// Not a library's reader, for none keeps these rules: the first of two keys counts, a value ends after 254
-/// bytes, names and values are decoded one by one, and a write leaves every other line as it is to the byte,
-/// with its comments, blanks and line breaks.
+/// Our own, because no library's reader keeps these rules: the first of two keys counts, a value ends after
+/// 254 bytes, names and values are decoded one by one, and a write leaves every other line as it is, byte for
+/// byte, with its comments, blanks and line breaks.
 class IniReader {
  public:
   using Values = std::vector<std::pair<std::string, std::string>>;

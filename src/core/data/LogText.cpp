@@ -17,13 +17,13 @@ bool IsLetterOrDigit(char c) {
   return IsDigit(c) || (LowerAscii(c) >= 'a' && LowerAscii(c) <= 'z');
 }
 
-/// True where something may begin: not in the middle of "photo's" and "Path/File".
+/// True if a path or a quotation can begin at `at`: not in the middle of "photo's" or "Path/File".
 bool BeginsAt(std::string_view line, std::size_t at) {
   return at == 0 || !IsLetterOrDigit(line[at - 1]);
 }
 
-/// "members.mdb" at the start of what follows the data folder; empty for a file that is not the program's
-/// own.
+/// The file name ("members.mdb") at the start of `rest`, the text after the data folder; empty for a file
+/// that is not the program's own.
 std::string_view OwnName(std::string_view rest) {
   if (!rest.starts_with('/')) {
     return {};
@@ -45,12 +45,12 @@ std::string_view OwnName(std::string_view rest) {
   return isOwn ? name : std::string_view();
 }
 
-/// What stands for a path that goes up to the end of the line, with the kind of file where it shows.
+/// The replacement for a path that reaches to the end of the line; names the kind of file if it is known.
 std::string HiddenPath(std::string_view path) {
   while (!path.empty() && !IsLetterOrDigit(path.back())) {
     path.remove_suffix(1);
   }
-  // Not just anything behind a dot, which could be a name.
+  // Not just anything after a dot, which could be a name.
   static constexpr std::string_view known[] = {"bmp", "csv",  "doc", "gif",  "hex", "html",
                                                "ini", "jpeg", "jpg", "json", "log", "mdb",
                                                "pdf", "png",  "txt", "wav",  "xml"};
@@ -63,8 +63,8 @@ bool IsNumber(std::string_view text) {
   return std::all_of(text.begin(), text.end(), IsDigit);
 }
 
-/// Length of the quotation that `rest` begins with, up to the last quote of the line, since a name may hold
-/// one; 0 for a plain number, which hides nothing, or without an end.
+/// Length of the quotation with which `rest` begins, up to the last quote of the line, since a name may
+/// contain one; 0 for a plain number, which need not be hidden, and for a quotation without an end.
 std::size_t QuotedLength(std::string_view rest) {
   const std::size_t next = rest.find('\'', 1);
   if (next == std::string_view::npos || IsNumber(rest.substr(1, next - 1))) {
@@ -73,8 +73,8 @@ std::size_t QuotedLength(std::string_view rest) {
   return rest.rfind('\'') + 1;
 }
 
-/// Takes the part of a line at `at` that may not be shown; returns what stands for it. Takes one character
-/// that may be shown else.
+/// Moves `at` past the part of the line there that must not be shown and returns its replacement; otherwise
+/// past one character, which it returns.
 std::string TakeNext(std::string_view line, std::size_t& at, std::string_view dataFolder) {
   const std::string_view rest = line.substr(at);
   if (BeginsAt(line, at) && !dataFolder.empty() && rest.starts_with(dataFolder)) {

@@ -3,8 +3,8 @@
 #include <string>
 #include <string_view>
 
-/// `text` as it may stand in a log that is handed on: in one line, and without what could be a person's.
-/// Numbers of membership buttons go, and so does what stands in single quotes (a query may hold a name; plain
-/// numbers stay) and every path but those of this program's own files in `dataFolder`, of which the name
-/// stays. What follows another path in its line goes with it, since blanks do not tell where a path ends.
+/// `text` made fit for a log that is passed on: in one line and without personal data. Hides the numbers of
+/// membership buttons, anything in single quotes (a query may contain a name) except plain numbers, and
+/// paths, of which only the names of this program's own files in `dataFolder` remain. Any other path takes
+/// the rest of its line with it, since blanks do not show where a path ends.
 std::string LogText(std::string_view text, std::string_view dataFolder);

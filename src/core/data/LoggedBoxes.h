@@ -5,11 +5,11 @@
 #include "core/data/ProgramLog.h"
 #include "platform/MessageBoxes.h"
 
-/// Message boxes that the program's log tells of, with what the operator answered. An error report is logged
-/// as a fault.
+/// Message boxes that are recorded in the program's log, with the operator's answers. An error report is
+/// logged as a fault.
 class LoggedBoxes : public MessageBoxes {
  public:
-  /// Both outlive this.
+  /// Both must outlive this object.
   LoggedBoxes(MessageBoxes& boxes, ProgramLog& log) : boxes_(boxes), log_(log) {}
 
   BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon icon,

@@ -10,16 +10,16 @@
 #include "platform/Files.h"
 
 /// What the program did, step by step, for whoever has to find out later what happened at a venue: a row for
-/// each step, with date and time, in `logs/program.log` of the user's data folder. It may be handed on: no
-/// names of members, no numbers of their buttons. Never a reason to fail.
+/// each step, with date and time, in `logs/program.log` in the user's data folder. Safe to pass on: it has
+/// neither names of members nor numbers of their buttons. Rows that cannot be written are dropped.
 class ProgramLog {
  public:
   static constexpr std::uint64_t FileBytes = 1U << 20U;  ///< of each of the ring's two files
 
-  /// `dataFolder` need not exist yet: rows wait for it. The others outlive the log.
+  /// `dataFolder` need not exist yet: rows wait for it. The others must outlive the log.
   ProgramLog(Files& disk, const Clock& time, std::string dataFolder);
 
-  /// The program begins; `facts` tell what it is and runs on.
+  /// The program has started; `facts` describe it and its system.
   void Started(const std::vector<std::string>& facts);
 
   /// The operator gave a command: the name of its menu item or button.
@@ -28,10 +28,10 @@ class ProgramLog {
   void BoxOpened(std::string_view title, std::string_view text);
   void BoxClosed(std::string_view answer);
 
-  /// A failure that the operator was told of; the row names the latest command too.
+  /// A failure reported to the operator; the row also names the latest command.
   void Fault(std::string_view text);
 
-  /// A serial port was opened; `fault` is 0 when it is open, else why not.
+  /// An attempt to open a serial port; `fault` is 0 if it succeeded, otherwise the error number.
   void PortOpening(std::string_view device, std::string_view settings, int fault);
 
   void Ended(int exitCode);

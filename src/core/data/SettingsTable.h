@@ -6,12 +6,12 @@
 struct Setting {
   const char* Section;
   const char* Key;
-  const char* Default;  ///< what counts where the file has none; empty for nothing
-  const char* Meaning;  ///< as the manual tells it
+  const char* Default;  ///< used if the file has none; empty if there is no default
+  const char* Meaning;  ///< as in the manual
 };
 
 /// Every setting of the program, each named here and nowhere else. A new one gets a section that no other
-/// program or earlier version wrote, a line in AllSettings, and its row in the manual, which a test compares.
+/// program or earlier version wrote, a line in AllSettings, and a row in the manual, which a test compares.
 namespace Keys {
 
 inline constexpr Setting CommPort = {"comm", "commport", "1",

@@ -27,6 +27,12 @@ struct DatabaseParts {
   const StringTable& Strings;
 };
 
+/// Title of the boxes about the databases at start-up.
+inline constexpr const char* DatabaseBoxTitle = "Database status";
+
+/// Path of the database that is used in place of one that cannot be: "-new" behind its name.
+std::string FreshPath(const UserDatabase& database);
+
 /// Opens a database and has it backed up before its first change. A file from an old installation is
 /// converted first, which a box reports. A file that cannot be read is left untouched: the operator is asked
 /// whether to go on with a fresh copy beside it, named "...-new.mdb", which later starts will use again.

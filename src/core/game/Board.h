@@ -9,7 +9,7 @@
 
 #include "core/game/Game.h"
 
-/// Columns of the list of players; those behind `Player` hold numbers. The list of teams has the first three,
+/// Columns of the list of players; those after `Player` hold numbers. The list of teams has the first three,
 /// with the team in the second.
 enum class BoardColumn { Rank, Player, Soldiering, Accuracy, Damage, ShotsFired, Wia, Kia, AmmoAdds };
 inline constexpr int BoardColumnCount = 9;
@@ -20,15 +20,14 @@ enum class BoardList { Players, Teams };
 
 enum class SortOrder { Ascending, Descending };
 
-/// Why a row has an accuracy or none.
+/// Whether a row has an accuracy and, if not, why.
 enum class AccuracyKind { Known, NoShots, NoPrimaryDamage };
 
 /// A player or a team, with the figures as they were when the scores were calculated.
 struct BoardRow {
   int Index = 0;                ///< record of the player, 1 to 224; 0 for a team
   int Team = 0;                 ///< 1 to 3
-  std::int32_t Rank = 0;        ///< the one that the record had, or a team's 0; with `Placed` the place
-  bool Placed = false;          ///< a sort has given the row its place
+  std::int32_t Rank = 0;        ///< place, 1 = first; 0 until a sort assigns it
   std::string MemberName = {};  ///< empty for a player who is no member
   std::int32_t Soldiering = 0;
   AccuracyKind HasAccuracy = AccuracyKind::Known;
@@ -43,8 +42,8 @@ struct BoardRow {
 /// The rows of a score list in the order in which the operator sees them.
 class Board {
  public:
-  /// `changed` is called when the rows have new contents or a new order. Rows that were only added are told
-  /// with the next sort.
+  /// `changed` is called when the contents or the order of the rows change. Adding a row does not call it;
+  /// the next sort does.
   explicit Board(std::function<void()> changed) : changed_(std::move(changed)) {}
   Board(const Board&) = delete;
   Board& operator=(const Board&) = delete;
@@ -57,6 +56,8 @@ class Board {
   const BoardRow& RowAt(int place) const { return rows_[order_.at(static_cast<std::size_t>(place))]; }
 
   void Clear();
+  /// How many times the list has been cleared.
+  int Clears() const { return clears_; }
   void AddRow(BoardRow row);
 
  private:
@@ -67,17 +68,18 @@ class Board {
   const std::function<void()> changed_;
   std::vector<BoardRow> rows_;      ///< in the order of adding
   std::vector<std::size_t> order_;  ///< indexes into `rows_` as shown
+  int clears_ = 0;
 };
 
-/// Sorts by the numbers that `column` shows, in the list's present direction: an accuracy counts with its two
+/// Sorts by the numbers that `column` shows, in the list's current direction; an accuracy counts with its two
 /// decimals. A cell that shows no number sorts below all numbers, and equal cells keep the order in which
 /// their rows were added.
 ///
-/// Column 0 writes each place into the record of the same number, whichever player stands there. For other
+/// Column 0 writes each place into the record of the same number, whichever player that is. For other
 /// columns, `assignRanks` numbers the rows from 1 and stores the places in the players' records. The record
-/// is found from team and number alone, 32 to a team, so the place of a player numbered 32 or above goes into
-/// another record. An index outside the table is RuntimeError 9.
+/// is computed from team and number alone, 32 to a team, so the place of a player numbered 32 or above goes
+/// into another record. Throws RuntimeError 9 for an index outside the table.
 void SortListNumeric(Board& list, BoardColumn column, bool assignRanks, Game& game);
 
-/// The board's answer to a click on column header `header` (counted from 1).
+/// Sorts the board as a click on column header `header` (counted from 1) does.
 void SortByHeader(Board& players, int header, Game& game);

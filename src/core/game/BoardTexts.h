@@ -5,8 +5,8 @@
 #include "core/game/Board.h"
 #include "core/text/StringTable.h"
 
-/// The lists of the board in the words and figures that the operator reads. All of their texts are made here,
-/// and none is ever read back: who needs a player or a number takes it from the row.
+/// The texts of the board's lists as the operator reads them. All of them are made here, and none is ever
+/// parsed: code that needs a player or a number takes it from the row.
 class BoardTexts {
  public:
   BoardTexts(const Game& game, const StringTable& strings) : game_(game), strings_(strings) {}
@@ -15,7 +15,7 @@ class BoardTexts {
 
   std::string Cell(const BoardRow& row, BoardColumn column) const;
 
-  /// The cell of the second column without a member's name: "Blue  7", or the team "Blue".
+  /// The second column's cell without the member's name: "Blue  7", or the team "Blue".
   std::string Name(const BoardRow& row) const;
 
  private:

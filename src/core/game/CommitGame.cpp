@@ -76,7 +76,7 @@ class GameCommit {
   void Run() {
     for (int index = 1; index <= PlayerCount; ++index) {
       if (!CommitTogether(index)) {
-        // Nothing of the group was written. One by one, the players before the faulty row still get in.
+        // Nothing of the group was written. One by one, those before the faulty row are still committed.
         for (; index <= PlayerCount; ++index) {
           CommitOne(index);
         }
@@ -88,8 +88,8 @@ class GameCommit {
 
  private:
   /// Commits the players from `index` up to the first whose member is gone, and sets `index` to that one. The
-  /// group ends there since the box about it must not keep the file locked. Returns false if the database
-  /// failed; then nothing is written or marked, and `index` is the first player of the group.
+  /// group ends there because the file must not stay locked while the box is open. Returns false if the
+  /// database failed; then nothing is written or marked, and `index` is the first player of the group.
   bool CommitTogether(int& index) {
     while (index <= PlayerCount && !IsDue(game_.Players(index))) {
       ++index;
@@ -135,7 +135,7 @@ class GameCommit {
     }
   }
 
-  /// Adds a player's game to the member on whose row the cursor stands.
+  /// Adds a player's game to the member in the cursor's current row.
   void AddGame(int index) {
     rsMembers_.Edit();
     game_.Players(index).Committed = true;

@@ -8,7 +8,7 @@
 
 enum class CommitResult {
   Committed,
-  SomeWereAlready,  ///< players were left out because their game counts already
+  SomeWereAlready,  ///< players were left out because their game had already been added
   Failed            ///< the database refused a player; those before it are committed, those after it are not
 };
 

@@ -4,7 +4,7 @@
 #include <cstdint>
 #include <string>
 
-/// Stands for "no button", for a player or at the reader.
+/// Means "no button", in a player's record or at the reader.
 inline constexpr const char* NoDallasId = "0000000000000000";
 
 /// A button's number as text: 16 upper-case hexadecimal digits, from the last byte of `rom` (the CRC) down to

@@ -8,7 +8,7 @@
 #include "core/game/PlayerId.h"
 #include "core/text/StringTable.h"
 
-/// One gun's game. Only the score analysis writes the "calculated" fields.
+/// One gun's game. The score analysis computes the "calculated" fields from the others.
 struct Player {
   /// Damage this player took from player q; self-hits included.
   OneBased<std::int32_t, PlayerCount> HitByPlayer;
@@ -62,7 +62,7 @@ struct Game {
   /// Calculated: sum of `Soldiering` of a team's active players.
   OneBased<std::int32_t, TeamCount> TeamTotals;
   OneBased<ObjectiveTeam, TeamCount> ObjectiveTeams;
-  /// A text: the date as the locale writes it, or what a loaded file says.
+  /// Date and time in the locale's short form, or the text from a loaded file.
   std::string GameDate;
   /// True once a frame was decoded or a file loaded.
   bool DataPresent = false;
@@ -70,9 +70,9 @@ struct Game {
   /// Clears the players and the date. Team names and objective results stay for the next game.
   void Clear();
 
-  /// Name of the team of the player at record `index`.
+  /// Team name of the player at record `index`.
   const std::string& TeamName(int index) const { return TeamNames(TeamFromId(IdFromIndex(index))); }
 
-  /// How that player is named: "Blue  7".
+  /// Display name of that player: "Blue  7".
   std::string DisplayName(int index) const { return PlayerName(TeamName(index), IdFromIndex(index)); }
 };

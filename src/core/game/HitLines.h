@@ -13,7 +13,7 @@ struct Hit {
   std::int32_t Amount;  ///< damage, above 0
 };
 
-/// The damage that the player at record `index` did to each player, themselves included, by ascending record.
+/// The damage that the player at record `index` did to each player, themselves included, in record order.
 std::vector<Hit> HitsGivenBy(int index, const Game& game);
 
 /// The damage that each player did to the player at record `index`.

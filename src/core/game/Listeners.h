@@ -5,7 +5,7 @@
 #include <utility>
 #include <vector>
 
-/// Keeps a listener listening as long as it lives. May outlive what is listened to.
+/// Keeps a listener subscribed while this object exists. May outlive the Listeners.
 class [[nodiscard]] Subscription {
  public:
   Subscription() = default;
@@ -26,12 +26,12 @@ class [[nodiscard]] Subscription {
   }
 
  private:
-  std::shared_ptr<bool> listening_;  ///< shares its life with the listener
+  std::shared_ptr<bool> listening_;  ///< keeps the listener alive
 };
 
-/// Those to whom something is told, in the order in which they began to listen. Any of them may end, and new
-/// ones may come, while something is being told: who has ended hears no more of it, and who is new begins
-/// with the next. Listeners must not throw.
+/// The listeners to one kind of message, called in the order in which they subscribed. While a message is
+/// being delivered, listeners may end and new ones may subscribe: one that has ended is not called any more,
+/// and a new one first gets the next message. Listeners must not throw.
 template <typename Message>
 class Listeners {
  public:
@@ -48,7 +48,7 @@ class Listeners {
     const std::vector<std::weak_ptr<Entry>> present = entries_;
     for (const std::weak_ptr<Entry>& held : present) {
       const std::shared_ptr<Entry> entry = held.lock();
-      // One that ended inside of its own call is still there.
+      // One that ended during its own call still exists.
       if (entry && entry->Listening) {
         entry->Hear(message);
       }
@@ -61,5 +61,5 @@ class Listeners {
     Listener Hear;
   };
 
-  std::vector<std::weak_ptr<Entry>> entries_;  ///< those that have ended expire
+  std::vector<std::weak_ptr<Entry>> entries_;  ///< expired for listeners that have ended
 };

@@ -14,7 +14,7 @@ struct Member {
   std::string LastName;
   std::string NickName;
 
-  /// The nickname when it is wanted and not empty, else first and last name.
+  /// The nickname if `useNickName` and it is not empty, otherwise first and last name.
   std::string GetPlayerName(bool useNickName) const;
 };
 
@@ -27,19 +27,19 @@ struct MemberHistory {
   double AverageSoldiering = 0;
 };
 
-/// How the board gets at the members: through one cursor that is opened at start-up and never asked again for
-/// new rows. Each look moves it; the answers do not depend on where it goes afterwards.
+/// Finds members for the board, through one cursor that is opened at start-up and does not see rows added
+/// later. Each call moves the cursor; the results do not depend on where it moves afterwards.
 class MemberLookup {
  public:
   MemberLookup(Recordset& rsMembers, MessageBoxes& boxes) : rsMembers_(rsMembers), boxes_(boxes) {}
 
-  /// The member with this `ContactID`. When there is none, says so in a box.
+  /// The member with this `ContactID`. If there is none, a box says so.
   std::optional<Member> LoadMember(std::int32_t contactId);
 
-  /// Throws RuntimeError 3021 when there is no such member (any more).
+  /// Throws RuntimeError 3021 if the member does not exist (any more).
   MemberHistory LoadHistory(std::int32_t contactId);
 
-  /// `ContactID` of the first member with this button, 0 when there is none.
+  /// `ContactID` of the first member with this button, 0 if there is none.
   std::int32_t FindByDallasId(const std::string& dallasId);
 
  private:

@@ -3,6 +3,7 @@
 #include <cmath>
 #include <limits>
 #include <utility>
+#include <vector>
 
 #include "core/data/FieldValue.h"
 #include "core/text/NumberForms.h"
@@ -15,7 +16,7 @@ void AddTo(std::int32_t& sum, std::int32_t amount) {
   }
 }
 
-/// Players stand in blocks of 32 that belong to one team each.
+/// Players are in blocks of 32, each of one team.
 constexpr int BlockSize = 32;
 constexpr int BlockCount = PlayerCount / BlockSize;
 
@@ -27,14 +28,14 @@ std::array<int, BlockCount> TeamsOfBlocks() {
   return teams;
 }
 
-/// Damage that each player dealt to foes and to the own team, by record index less 1.
+/// Damage that each player dealt to foes and to their own team, by record index minus 1.
 struct DealtDamage {
   std::array<std::int32_t, PlayerCount> ToFoes{};
   std::array<std::int32_t, PlayerCount> ToOwnTeam{};
 };
 
-/// Adds one victim's hits. Returns false when one is negative or a sum has left the 32-bit range. Written so
-/// that the compiler adds several at a time.
+/// Adds a victim's hits from the shooters of one block. Returns false if a hit is negative or a sum left the
+/// 32-bit range. Written so that the compiler vectorizes it.
 bool AddHits(std::int32_t* sums, const std::int32_t* hits) {
   std::uint32_t signs = 0;
   for (int i = 0; i < BlockSize; ++i) {
@@ -54,7 +55,7 @@ AccuracyKind KindOfAccuracy(const Player& player) {
 
 }  // namespace
 
-void ScoreAnalysis::CalculateScores() {
+bool ScoreAnalysis::CalculateScores() {
   players_.Clear();
   teams_.Clear();
   for (std::int32_t& total : game_.TeamTotals) {
@@ -62,14 +63,26 @@ void ScoreAnalysis::CalculateScores() {
   }
   missionPoints_.reset();
   AddUpDamage();
+  // Listed once all are scored, so that nobody sees a part of the rows, whether a box is open or a figure
+  // overflows.
+  std::vector<BoardRow> rows;
   for (int index = 1; index <= PlayerCount; ++index) {
-    if (game_.Players(index).Active) {
-      ScorePlayer(index);
+    if (!game_.Players(index).Active) {
+      continue;
     }
+    std::optional<BoardRow> row = ScorePlayer(index);
+    if (!row) {
+      return false;
+    }
+    rows.push_back(std::move(*row));
+  }
+  for (BoardRow& row : rows) {
+    players_.AddRow(std::move(row));
   }
   ListTeams();
   SortListNumeric(players_, BoardColumn::Soldiering, true, game_);
   SortListNumeric(teams_, BoardColumn::Soldiering, true, game_);
+  return true;
 }
 
 void ScoreAnalysis::AddUpDamage() {
@@ -79,8 +92,8 @@ void ScoreAnalysis::AddUpDamage() {
 }
 
 bool ScoreAnalysis::AddUpDamageAtOnce() {
-  // Whole factors need no rounding, so the order of the hits does not matter unless a sum on the way could
-  // leave the range.
+  // A whole factor needs no rounding, so the order of the hits does not matter unless an intermediate sum
+  // could leave the range.
   const bool isWhole = std::trunc(factors_.FriendlyFire) == factors_.FriendlyFire;
   const bool countsFriendlyFire = missions_.ListIndex() != MissionList::FreeForAll;
   const std::array<int, BlockCount> teams = TeamsOfBlocks();
@@ -112,13 +125,13 @@ void ScoreAnalysis::AddUpDamageHitByHit() {
     player.TotalDamage = 0;
     player.AbsoluteDamage = 0;
   }
-  // Each shooter's sums grow in the order of the victims, which is how the matrix lies in memory.
+  // Each shooter's hits are added in the order of the victims, which is also their order in memory.
   for (int victim = 1; victim <= PlayerCount; ++victim) {
     for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
       const std::int32_t hit = game_.Players(victim).HitByPlayer(shooter);
       Player& player = game_.Players(shooter);
       if (IsOwnTeamHit(victim, shooter)) {
-        // Rounded each by itself: half a point twice is nothing.
+        // Rounded hit by hit: half a point twice adds nothing.
         player.TotalDamage =
             RoundToInt32(hit * static_cast<long double>(factors_.FriendlyFire) + player.TotalDamage);
       } else {
@@ -134,27 +147,32 @@ bool ScoreAnalysis::IsOwnTeamHit(int victim, int shooter) const {
          TeamFromId(IdFromIndex(victim)) == TeamFromId(IdFromIndex(shooter));
 }
 
-void ScoreAnalysis::ScorePlayer(int index) {
+std::optional<BoardRow> ScoreAnalysis::ScorePlayer(int index) {
+  const auto overtaken = [this, clears = players_.Clears()] { return players_.Clears() != clears; };
   Player& player = game_.Players(index);
   const int team = TeamFromId(IdFromIndex(index));
-  // What may show a box comes before the row: a command given meanwhile can rebuild the lists.
   std::string memberName = NameOfMember(player);
+  if (overtaken()) {
+    return std::nullopt;
+  }
   CalculateAccuracy(player);
   CalculateSoldiering(player);
   AddMissionPoints(player, game_.TeamNames(team));
-  players_.AddRow({.Index = index,
-                   .Team = team,
-                   .Rank = player.Rank,
-                   .MemberName = std::move(memberName),
-                   .Soldiering = player.Soldiering,
-                   .HasAccuracy = KindOfAccuracy(player),
-                   .Accuracy = player.Accuracy,
-                   .Damage = player.TotalDamage,
-                   .ShotsFired = player.ShotCount,
-                   .Wia = player.HealCount,
-                   .Kia = player.DeathCount,
-                   .AmmoAdds = player.AmmoAddCount});
+  if (overtaken()) {
+    return std::nullopt;
+  }
   AddTo(game_.TeamTotals(team), player.Soldiering);
+  return BoardRow{.Index = index,
+                  .Team = team,
+                  .MemberName = std::move(memberName),
+                  .Soldiering = player.Soldiering,
+                  .HasAccuracy = KindOfAccuracy(player),
+                  .Accuracy = player.Accuracy,
+                  .Damage = player.TotalDamage,
+                  .ShotsFired = player.ShotCount,
+                  .Wia = player.HealCount,
+                  .Kia = player.DeathCount,
+                  .AmmoAdds = player.AmmoAddCount};
 }
 
 std::string ScoreAnalysis::NameOfMember(Player& player) {
@@ -186,9 +204,6 @@ void ScoreAnalysis::CalculateSoldiering(Player& player) const {
 }
 
 void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName) {
-  if (missions_.ListIndex() <= MissionList::FreeForAll) {
-    return;
-  }
   if (!missionPoints_) {
     if (!missions_.ActivateCurrentMissionRecord()) {
       return;

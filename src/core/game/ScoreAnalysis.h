@@ -2,6 +2,7 @@
 
 #include <array>
 #include <optional>
+#include <string>
 
 #include "core/game/Board.h"
 #include "core/game/Game.h"
@@ -22,11 +23,13 @@ class ScoreAnalysis {
         players_(players),
         teams_(teams) {}
 
-  /// Throws RuntimeError 6 when a figure leaves the 32-bit range; the lists are then incomplete.
-  void CalculateScores();
+  /// Throws RuntimeError 6 when a figure leaves the 32-bit range; both lists are then empty. Returns false if
+  /// a command given in one of its boxes cleared the lists, usually to calculate anew: whatever that command
+  /// left stays.
+  bool CalculateScores();
 
  private:
-  /// What the active mission pays and takes.
+  /// Rewards and penalties of the active mission.
   struct MissionPoints {
     std::array<double, TeamCount> Primary;    ///< by objective set
     std::array<double, TeamCount> Secondary;  ///< by objective set
@@ -35,13 +38,14 @@ class ScoreAnalysis {
   };
 
   void AddUpDamage();
-  /// The fast way for the usual game. Returns false, with nothing worth keeping, where only the other way
-  /// gives the right figures or the right failure.
+  /// The fast way, for ordinary games. Returns false, with useless figures, if only the other way gives the
+  /// right figures or the right error.
   bool AddUpDamageAtOnce();
   void AddUpDamageHitByHit();
-  /// True when friendly fire counts: the mode is not a free-for-all, and both are of one team.
+  /// True if this counts as friendly fire: both are on one team, and the mode is not Free For All.
   bool IsOwnTeamHit(int victim, int shooter) const;
-  void ScorePlayer(int index);
+  /// Calculates a player's score and row. Returns nullopt if the lists were cleared in a box meanwhile.
+  std::optional<BoardRow> ScorePlayer(int index);
   /// Finds the member by the button where none is assigned. Empty when there is none.
   std::string NameOfMember(Player& player);
   void CalculateAccuracy(Player& player) const;
@@ -56,5 +60,5 @@ class ScoreAnalysis {
   MemberLookup& members_;
   Board& players_;
   Board& teams_;
-  std::optional<MissionPoints> missionPoints_;  ///< read once a calculation
+  std::optional<MissionPoints> missionPoints_;  ///< read once per calculation
 };

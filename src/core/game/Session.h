@@ -7,6 +7,7 @@
 
 #include "core/data/Backups.h"
 #include "core/game/Board.h"
+#include "core/game/CalculationReads.h"
 #include "core/game/CommitGame.h"
 #include "core/game/Game.h"
 #include "core/game/Listeners.h"
@@ -23,26 +24,26 @@
 
 /// What has just happened in a session.
 enum class SessionChange {
-  PlayerRows,  ///< the list of players has other rows, or another order
+  PlayerRows,  ///< the list of players has new rows or a new order
   TeamRows,    ///< the list of teams has
   Scores,      ///< a calculation is complete: figures, places and both lists
-  Cleared,     ///< the game was emptied; a load begins so too
-  Loaded,      ///< a file's game is in its place; its scores come next
+  Cleared,     ///< the game was cleared; also the first step of a load
+  Loaded,      ///< a file's game was read in; its scores come next
   Saved,       ///< the game was written to a file
-  Committed,   ///< the game was added to its members' totals, as far as that went
-  Missions,    ///< the list of missions was read anew; the choice of the first one comes next
-  Mission,     ///< a mission was chosen, maybe the same again
-  MissionRow,  ///< its row was looked for: MissionIsActive and MissionDescription hold for it
+  Committed,   ///< the game was added to its members' totals, as far as that succeeded
+  Missions,    ///< the list of missions was reread; the choice of its first entry comes next
+  Mission,     ///< a mission was chosen, perhaps the same one again
+  MissionRow,  ///< its row was looked up: MissionIsActive and MissionDescription now apply to it
 };
 
-/// A run of the program as far as it is about games: the one on the board, what its scores depend on, both
-/// lists, and the open databases. Whoever shows something of it listens; there may be any number of them.
+/// The state of one run of the program: the game on the board, what its scores depend on, both lists, and the
+/// open databases. Views listen for changes; there may be any number of them.
 ///
 /// Until Open has succeeded, and after Close, only Game, Factors, List, ClearPlayerData and SortByHeader may
 /// be used.
 class Session {
  public:
-  /// What opening works with; all but the folders outlives the session.
+  /// What Open works with; all but the folders must outlive the session.
   struct Sources {
     DatabaseEngine& Engine;
     OldDatabases& Old;
@@ -51,27 +52,27 @@ class Session {
     std::string ProgramFolder;
   };
 
-  /// Fills `game`, once the mission's name is known calls `chooseMission` with it, and returns true; or
-  /// returns false when there was no game to read.
+  /// Reads a game into `game`, calls `chooseMission` once the mission's name is known, and returns true.
+  /// Returns false if there was no game to read.
   using MissionChoice = std::function<void(const std::string& missionName)>;
   using GameReader = std::function<bool(::Game& game, const MissionChoice& chooseMission)>;
 
-  /// Keeps a game that was played in a mission; false when it did not.
+  /// Saves a game and the name of its mission. Returns false if it did not.
   using GameWriter = std::function<bool(const ::Game& game, const std::string& missionName)>;
 
   Session(const StringTable& strings, const Clock& time, MessageBoxes& boxes);
   Session(const Session&) = delete;
   Session& operator=(const Session&) = delete;
 
-  /// Has `listener` called after each change, until the handle ends.
+  /// Calls `listener` after each change, until the returned handle ends.
   Subscription Listen(std::function<void(SessionChange)> listener);
 
-  /// Opens both databases, as OpenUserDatabase does, and reads the missions. Returns false when the operator
+  /// Opens both databases, as OpenUserDatabase does, and reads the missions. Returns false if the operator
   /// chose to end the program.
   bool Open(const Sources& sources);
   void Close();
 
-  /// What the operator should know of a backup copy that could not be made; empty for nothing new.
+  /// Returns the operator's message about a backup copy that failed, or an empty text if there is none.
   std::string TakeBackupFailure();
 
   ::Game& Game() { return game_; }
@@ -84,25 +85,28 @@ class Session {
   Database& DbMembers() { return *dbMembers_; }
   Recordset& RsMembers() { return *rsMembers_; }
 
-  /// Throws as ScoreAnalysis::CalculateScores does; the lists are then incomplete, and Scores is not told.
+  /// Throws as ScoreAnalysis::CalculateScores does; the lists are then empty, and Scores is not told. Nor is
+  /// it told by a calculation that a command in one of its boxes has overtaken. While a box is open, other
+  /// programs can write both databases.
   void CalculateScores();
-  /// Does so when there is a game and the databases are open.
+  /// Does the same, but only if there is a game and the databases are open.
   void CalculateScoresWhenPresent();
   void ClearPlayerData();
-  /// The answer to a click on column header `header` (counted from 1) of the players.
+  /// Sorts the players as a click on column header `header` (counted from 1) does.
   void SortByHeader(int header);
 
-  /// Reads the missions anew and makes "None" the active one.
+  /// Reads the missions anew and makes "None" the active one. A failure to read them leaves list and active
+  /// mission as they were.
   void FillMissionList();
-  /// Makes entry `index` of the missions the active one. A mission whose row is gone is told in a box.
+  /// Makes entry `index` of the missions the active one. A box reports a mission whose row is gone.
   void SelectMission(int index);
-  /// True when the active entry is a mission whose row was there when it was chosen.
+  /// True if the active entry is a mission whose row existed when it was chosen.
   bool MissionIsActive() const { return missionIsActive_; }
   /// First line of that mission's description; empty without one.
   const std::string& MissionDescription() const { return missionDescription_; }
 
-  /// Empties the game and has `read` fill it. A failure of it is passed on; what it read so far stays,
-  /// without scores.
+  /// Clears the game and has `read` fill it. An exception from `read` is passed on; what it has read by then
+  /// stays, without scores.
   void LoadGame(const GameReader& read);
   void SaveGame(const GameWriter& write);
   CommitResult CommitGame();
@@ -120,8 +124,9 @@ class Session {
   Board teams_{[this] { listeners_.Tell(SessionChange::TeamRows); }};
   bool missionIsActive_ = false;
   std::string missionDescription_;
+  UnlockingBoxes unlockingBoxes_{boxes_};
 
-  // In the order in which Open makes them.
+  // In the order in which Open creates them.
   std::optional<Backups> backups_;
   std::unique_ptr<Database> dbScenarios_;
   std::unique_ptr<Recordset> rsScenarios_;

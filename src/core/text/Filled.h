@@ -4,6 +4,6 @@
 #include <string>
 #include <string_view>
 
-/// `text` with each place %1 to %9 taken by the value of that number, counted from 1. A place without a value
-/// stays as it stands, and what a value holds is not looked at for places.
+/// `text` with each placeholder %1 to %9 replaced by the value of that number, counted from 1. A placeholder
+/// without a value stays as it is, and values are not searched for placeholders.
 std::string Filled(std::string_view text, std::initializer_list<std::string_view> values);

@@ -72,7 +72,7 @@ bool IsTooLarge(std::string_view text) {
   return point - firstDigit + (negative ? -exponent : exponent) > 0;
 }
 
-/// Value of a text that is a number as a whole: an infinity if too large, 0 if too small.
+/// Value of a text that consists of a number only: an infinity if too large, 0 if too small.
 double ValueOfNumber(std::string_view text) {
   if (text.starts_with('+')) {
     text.remove_prefix(1);
@@ -206,7 +206,6 @@ std::string PlainDecimal(double value) {
 }
 
 double Val(std::string_view text) {
-  text = Trimmed(text, IsWhiteSpace);
   std::string dense;
   const std::size_t next = text.find_first_not_of("0123456789+-.Ee");
   if (next != std::string_view::npos && IsWhiteSpace(text[next])) {

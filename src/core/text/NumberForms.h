@@ -26,7 +26,7 @@ double Val(std::string_view text);
 /// The value of a numeric text (see IsNumeric), an infinity if it is too large; nullopt for any other text.
 std::optional<double> NumberIn(std::string_view text);
 
-/// The number that a text of digits and nothing else says; nothing for any other text, and above 32767.
+/// The number in a text of digits only; nullopt for any other text, and above 32767.
 std::optional<std::int16_t> NumberOfDigits(std::string_view text);
 
 /// True for an optional sign, digits with at most one point, and an optional exponent, with any white space
@@ -55,7 +55,7 @@ std::string FormatPercent(double value);
 
 /// A running time in minutes as hours and minutes, each in the number form: " 2H  5M" for 125.
 std::string RunTimeText(std::int32_t minutes);
-/// The number that FormatPercent shows of a float, in hundredths of a percent: 5000 for "50.00%".
+/// The number that FormatPercent shows for a float, in hundredths of a percent: 5000 for "50.00%".
 double PercentHundredths(float value);
 
 /// `value` with `decimals` (0 or more) digits after the point, rounded like FormatPercent.

@@ -1,8 +1,7 @@
 #pragma once
 
-/// Texts beyond the numbered captions and messages up to 218, by name. The string table holds their words:
-/// resources/StringTable.inc, which is also where a new one is entered, under the next free number of its
-/// area.
+/// Names of the texts beyond the captions and messages numbered up to 218. Their words are in the string
+/// table, resources/StringTable.inc; a new text is added there, under the next free number of its area.
 enum class OwnText {
 #define OWN_TEXT(number, name, english, simplifiedChinese) name = (number),
 #include "resources/StringTable.inc"

@@ -3,7 +3,7 @@
 #include <string>
 #include <string_view>
 
-/// `text` without the letters at both ends that `isBlank` holds for.
+/// `text` without the characters at either end for which `isBlank` is true.
 template <typename Predicate>
 constexpr std::string_view Trimmed(std::string_view text, Predicate isBlank) {
   while (!text.empty() && isBlank(text.front())) {

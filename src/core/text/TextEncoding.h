@@ -4,7 +4,7 @@
 #include <string>
 #include <string_view>
 
-/// True when `text` is well-formed UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
+/// True if `text` is well-formed UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
 bool IsUtf8(std::string_view text);
 
 /// Converts code page 1252 to UTF-8. The five bytes that it leaves undefined become the control characters of
@@ -17,5 +17,5 @@ std::size_t CharacterCount(std::string_view text);
 /// Up to `count` characters of a UTF-8 text, starting with character `first` (counted from 0).
 std::string Characters(std::string_view text, std::size_t first, std::size_t count);
 
-/// The first `most` bytes of a text in UTF-8, or fewer where these would cut a character.
+/// The first `most` bytes of a UTF-8 text, or fewer if that would split a character.
 std::string_view FirstBytes(std::string_view text, std::size_t most);

@@ -1,69 +1,87 @@
 #include "platform/jet/JetConverter.h"
 
-#include <fcntl.h>
-#include <unistd.h>
-
 #include <array>
-#include <cstdint>
 #include <filesystem>
 #include <fstream>
+#include <optional>
 #include <string_view>
+#include <vector>
 
 #include "platform/RuntimeError.h"
 #include "platform/jet/ChildProgram.h"
+#include "platform/jet/InterimRows.h"
 #include "platform/jet/JetStream.h"
+#include "platform/jet/KeptFile.h"
 #include "platform/jet/TableImport.h"
 
 namespace {
 
-/// A file that is deleted at the end unless it has been renamed.
+/// A copy of a file that is deleted at the end unless it has taken the place of another.
 class NewFile {
  public:
-  NewFile(std::string path, const std::string& source) : path_(std::move(path)) {
-    std::filesystem::copy_file(source, path_, std::filesystem::copy_options::overwrite_existing);
-    std::filesystem::permissions(path_, std::filesystem::perms::owner_write,
-                                 std::filesystem::perm_options::add);
+  NewFile(Files& disk, std::string path, const std::string& source) : disk_(disk), path_(std::move(path)) {
+    Remove();  // a crash may have left one
+    try {
+      disk.Write(path_, disk.Read(source));
+    } catch (const RuntimeError&) {
+      Remove();
+      throw;
+    }
   }
-  ~NewFile() {
-    std::error_code ignored;
-    std::filesystem::remove(path_, ignored);
-    std::filesystem::remove(path_ + "-journal", ignored);
-  }
+  ~NewFile() { Remove(); }
   NewFile(const NewFile&) = delete;
   NewFile& operator=(const NewFile&) = delete;
 
   const std::string& Path() const { return path_; }
 
  private:
+  void Remove() noexcept {
+    for (const char* ending : {"", "-journal"}) {
+      try {
+        if (disk_.FileExists(path_ + ending)) {
+          disk_.Delete(path_ + ending);
+        }
+      } catch (const RuntimeError&) {  // the next conversion writes over it
+      }
+    }
+  }
+
+  Files& disk_;
   std::string path_;
 };
 
-void SyncFolderOf(const std::string& path) {
-  const std::string folder = std::filesystem::path(path).parent_path();
-  const int descriptor = open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-  if (descriptor >= 0) {
-    fsync(descriptor);
-    close(descriptor);
+std::vector<NotTakenOver> LeftOut(const TableImport& import, const std::vector<NotTakenOver>& otherTables) {
+  std::vector<NotTakenOver> left = import.UnreadValues();
+  for (const std::string& column : import.MissingColumns()) {
+    left.push_back({NotTakenOver::MissingColumn, column});
+  }
+  for (const std::string& column : import.UnknownColumns()) {
+    left.push_back({NotTakenOver::Column, column});
+  }
+  for (const std::string& column : import.ZeroedColumns()) {
+    left.push_back({NotTakenOver::TextsOfColumn, column});
+  }
+  left.insert(left.end(), otherTables.begin(), otherTables.end());
+  return left;
+}
+
+void RequireValues(const std::vector<NotTakenOver>& left, ConversionSteps& steps) {
+  std::vector<NotTakenOver> values;
+  for (const NotTakenOver& what : left) {
+    if (what.What == NotTakenOver::OneValue) {
+      values.push_back(what);
+    }
+  }
+  if (!values.empty() && !steps.GoOnWithout(values)) {
+    throw OldDatabaseRefused(std::move(values));
   }
 }
 
-/// Gives the old file a second, unused name, so that it exists under one of the two at every instant.
-std::string KeepOld(const std::string& path) {
-  for (int number = 1;; ++number) {
-    std::string kept = path + ".jet" + (number == 1 ? "" : std::to_string(number));
-    std::error_code error;
-    if (std::filesystem::exists(kept)) {
-      if (std::filesystem::equivalent(kept, path, error)) {
-        return kept;  // left by an interrupted conversion
-      }
-      continue;
-    }
-    std::filesystem::create_hard_link(path, kept, error);
-    if (error) {
-      std::filesystem::copy_file(path, kept);
-    }
-    return kept;
+[[noreturn]] void RefuseTable(const std::string& table, std::int64_t read, std::int64_t counted) {
+  if (table.empty()) {
+    throw OldDatabaseRefused();
   }
+  throw OldDatabaseRefused({{NotTakenOver::TableRows, table, read, counted}});
 }
 
 }  // namespace
@@ -79,55 +97,88 @@ bool JetConverter::IsOld(const std::string& path) const {
          (mark == "Standard Jet DB" || mark == "Standard ACE DB");
 }
 
-OldDatabaseReport JetConverter::Convert(const std::string& path, const std::string& table,
-                                        const std::string& emptyDatabase) {
+OldDatabaseReport JetConverter::Convert(const OldDatabase& old, ConversionSteps& steps) {
   try {
-    constexpr std::uintmax_t smallestPage = 2048;
-    if (std::filesystem::file_size(path) % smallestPage != 0) {
-      throw RuntimeError(Fault::UnrecognizedDatabase, "It is cut short.");
-    }
-    const NewFile newFile(path + ".new", emptyDatabase);
-    OldDatabaseReport report = ReadInto(newFile.Path(), path, table);
-    report.KeptAs = KeepOld(path);
-    SyncFolderOf(path);
-    std::filesystem::rename(newFile.Path(), path);
-    SyncFolderOf(path);
-    return report;
-  } catch (const std::filesystem::filesystem_error& error) {
-    throw RuntimeError(Fault::UnrecognizedDatabase, error.code().message() + ".");
+    return MakeAndReplace(old, steps);
+  } catch (const OldDatabaseRefused&) {
+    throw;
   } catch (const RuntimeError& error) {
-    throw RuntimeError(Fault::UnrecognizedDatabase, error.what());
+    throw OldDatabaseRefused(error.what());
   }
 }
 
-OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const std::string& path,
-                                         const std::string& table) const {
-  TableImport import(newFile, table);
-  OldDatabaseReport report;
-  JetStream stream({[&report](const std::string& other, std::int64_t rows) {
-                      report.NotTaken.push_back({NotTakenOver::Table, other, rows});
-                    },
-                    [&import](const std::vector<std::string>& columns) { import.SetColumns(columns); },
-                    [&import](const std::vector<Value>& row) { import.AddRow(row); }});
-  const ChildEnd end = RunChild(reader_, {path, table}, silence_, [&](std::string_view bytes) {
-    stream.Take(bytes);
-    onRows_(import.Rows());
-  });
-  if (end.TimedOut) {
-    throw RuntimeError(Fault::UnrecognizedDatabase, "It is damaged: reading it did not come to an end.");
+OldDatabaseReport JetConverter::MakeAndReplace(const OldDatabase& old, ConversionSteps& steps) {
+  constexpr std::uint64_t smallestPage = 2048;
+  if (disk_.FileLen(old.Path) % smallestPage != 0) {
+    throw OldDatabaseRefused();
   }
-  if (!end.Succeeded || !stream.Ended()) {
-    throw RuntimeError(Fault::UnrecognizedDatabase, "It is damaged. " + end.Error);
+  const NewFile newFile(disk_, old.Path + ".new", old.EmptyPath);
+  OldDatabaseReport report = ReadInto(newFile.Path(), old);
+  RequireValues(report.NotTaken, steps);
+  const bool joined = Join(newFile.Path(), old, steps);
+  KeptFile kept(disk_, old.Path);
+  report.KeptAs = kept.Path();
+  steps.BeforeReplacing(report);
+  kept.Keep();
+  try {
+    disk_.Rename(newFile.Path(), old.Path);
+  } catch (const RuntimeError&) {
+    // Not if it only could not be made durable: both files are whole, whatever a power failure then leaves.
+    if (disk_.FileExists(newFile.Path())) {
+      kept.TakeBack();
+      throw;
+    }
   }
-  import.Finish();
-  report.Rows = import.Rows();
-  for (const std::string& column : import.UnknownColumns()) {
-    report.NotTaken.push_back({NotTakenOver::Column, column});
-  }
-  for (const std::string& column : import.ZeroedColumns()) {
-    report.NotTaken.push_back({NotTakenOver::TextsOfColumn, column});
+  if (joined) {
+    try {
+      disk_.Rename(old.InterimPath, UnusedName(disk_, old.InterimPath + ".joined"));
+    } catch (const RuntimeError&) {  // its rows are in the new file, and it is not asked for again
+    }
   }
   return report;
+}
+
+bool JetConverter::Join(const std::string& newFile, const OldDatabase& old, ConversionSteps& steps) const {
+  if (!disk_.FileExists(old.InterimPath)) {
+    return false;
+  }
+  std::optional<InterimRows> rows;
+  try {
+    rows.emplace(newFile, old);
+  } catch (const RuntimeError&) {
+    return false;  // it is damaged or no database; it stays where it is
+  }
+  if (rows->Count() == 0 || !steps.AddInterimRows(rows->Count())) {
+    return false;
+  }
+  rows->Join();
+  return true;
+}
+
+OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const OldDatabase& old) const {
+  TableImport import(newFile, old.Table);
+  std::vector<NotTakenOver> otherTables;
+  JetStream stream({.OtherTable =
+                        [&](const std::string& other, std::int64_t rows) {
+                          otherTables.push_back({NotTakenOver::Table, other, rows});
+                        },
+                    .Table = [&](const std::vector<std::string>& columns) { import.SetColumns(columns); },
+                    .Row = [&](const std::vector<Value>& row,
+                               const std::vector<std::size_t>& unread) { import.AddRow(row, unread); },
+                    .Unreadable = RefuseTable});
+  const ChildEnd end = RunChild(reader_, {old.Path, old.Table}, silence_,
+                                {.OnOutput =
+                                     [&](std::string_view bytes) {
+                                       stream.Take(bytes);
+                                       onProgress_(import.Rows());
+                                     },
+                                 .OnWait = [&] { onProgress_(import.Rows()); }});
+  // What the reader wrote to standard error comes from the library, in its own words.
+  if (!end.Succeeded || !stream.Ended()) {
+    throw OldDatabaseRefused();
+  }
+  import.Finish();
+  return {.Rows = import.Rows(), .NotTaken = LeftOut(import, otherTables), .KeptAs = {}};
 }
 
 std::string JetReaderPath() {

@@ -6,6 +6,7 @@
 #include <string>
 #include <utility>
 
+#include "platform/Files.h"
 #include "platform/OldDatabases.h"
 
 /// Converts Jet files to SQLite. A separate program reads them, since a damaged file can hang or crash the
@@ -15,23 +16,24 @@ class JetConverter : public OldDatabases {
   static constexpr std::chrono::milliseconds LongestSilence = std::chrono::seconds(20);
 
   /// `reader` is the path of tessarine-jet-reader; one that writes nothing for `silence` is taken to have
-  /// hung. `onRows` is called repeatedly with the number of rows read so far.
-  explicit JetConverter(
-      std::string reader, std::chrono::milliseconds silence = LongestSilence,
-      std::function<void(std::int64_t rows)> onRows = [](std::int64_t) {})
-      : reader_(std::move(reader)), silence_(silence), onRows_(std::move(onRows)) {}
+  /// hung. `onProgress` is called at least 20 times a second, with the number of rows read so far.
+  JetConverter(
+      Files& disk, std::string reader, std::chrono::milliseconds silence = LongestSilence,
+      std::function<void(std::int64_t rows)> onProgress = [](std::int64_t) {})
+      : disk_(disk), reader_(std::move(reader)), silence_(silence), onProgress_(std::move(onProgress)) {}
 
   bool IsOld(const std::string& path) const override;
-  OldDatabaseReport Convert(const std::string& path, const std::string& table,
-                            const std::string& emptyDatabase) override;
+  OldDatabaseReport Convert(const OldDatabase& old, ConversionSteps& steps) override;
 
  private:
-  OldDatabaseReport ReadInto(const std::string& newFile, const std::string& path,
-                             const std::string& table) const;
+  OldDatabaseReport ReadInto(const std::string& newFile, const OldDatabase& old) const;
+  OldDatabaseReport MakeAndReplace(const OldDatabase& old, ConversionSteps& steps);
+  bool Join(const std::string& newFile, const OldDatabase& old, ConversionSteps& steps) const;
 
+  Files& disk_;
   std::string reader_;
   std::chrono::milliseconds silence_;
-  std::function<void(std::int64_t rows)> onRows_;
+  std::function<void(std::int64_t rows)> onProgress_;
 };
 
 /// Path of tessarine-jet-reader beside the running program.

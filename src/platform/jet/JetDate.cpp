@@ -5,6 +5,12 @@
 #include <cmath>
 #include <cstdio>
 
+bool IsJetDate(double date) {
+  constexpr double first = -657434;
+  constexpr double behindLast = 2958466;
+  return date > first - 1 && date < behindLast;  // false for NaN
+}
+
 std::string JetDateText(double date) {
   using std::chrono::days;
   constexpr std::chrono::sys_days first{std::chrono::year{1899} / 12 / 30};

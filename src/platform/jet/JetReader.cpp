@@ -6,63 +6,60 @@
 #include <mdbtools.h>
 #include <sys/resource.h>
 
+#include <algorithm>
 #include <charconv>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <string>
+#include <string_view>
 #include <system_error>
-#include <vector>
 
 #include "platform/jet/JetDate.h"
+#include "platform/jet/JetLongValue.h"
+#include "platform/jet/JetRows.h"
+#include "platform/jet/JetText.h"
+#include "platform/jet/ReaderOutput.h"
 
 namespace {
 
-constexpr std::size_t MostBytesOfText = std::size_t{8} << 20U;
-
-[[noreturn]] void Fail(const std::string& reason) {
-  std::fprintf(stderr, "%s\n", reason.c_str());
-  std::exit(1);
+/// Tells that a table cannot be read, and ends the program. An empty name stands for the list of tables.
+[[noreturn]] void Fail(ReaderOutput& output, std::string_view table, std::uint64_t read = 0,
+                       std::uint64_t counted = 0) {
+  output.Tag('F');
+  output.Text(table);
+  output.Number(read, 8);
+  output.Number(counted, 8);
+  output.Flush();
+  std::_Exit(1);
 }
 
-void Write(const void* bytes, std::size_t size) {
-  if (std::fwrite(bytes, 1, size, stdout) != size) {
-    Fail("The reader of old files has lost its listener.");
+/// A number of type T at the start of `bytes`.
+template <typename T>
+T NumberIn(std::string_view bytes) {
+  T number{};
+  std::memcpy(&number, bytes.data(), sizeof number);
+  return number;
+}
+
+/// Bytes of a number of one of Jet's types; 0 for a type of any size.
+std::size_t SizeOf(int type) {
+  switch (type) {
+    case MDB_BYTE:
+      return 1;
+    case MDB_INT:
+      return 2;
+    case MDB_LONGINT:
+    case MDB_FLOAT:
+      return 4;
+    case MDB_MONEY:
+    case MDB_DOUBLE:
+    case MDB_DATETIME:
+      return 8;
+    default:
+      return 0;
   }
-}
-
-void WriteNumber(std::uint64_t number, std::size_t bytes) {
-  for (std::size_t i = 0; i < bytes; ++i) {
-    const char byte = static_cast<char>(number >> (8 * i));
-    Write(&byte, 1);
-  }
-}
-
-void WriteTag(char tag) {
-  Write(&tag, 1);
-}
-
-void WriteBytes(char tag, const void* bytes, std::size_t size) {
-  WriteTag(tag);
-  WriteNumber(size, 4);
-  Write(bytes, size);
-}
-
-void WriteText(const std::string& text) {
-  WriteBytes('S', text.data(), text.size());
-}
-
-void WriteInteger(std::int64_t value) {
-  WriteTag('I');
-  WriteNumber(static_cast<std::uint64_t>(value), 8);
-}
-
-void WriteReal(double value) {
-  WriteTag('D');
-  std::uint64_t bits = 0;
-  std::memcpy(&bits, &value, sizeof bits);
-  WriteNumber(bits, 8);
 }
 
 /// A 32-bit float as the double nearest to its shortest decimal form: 0.1f becomes 0.1.
@@ -74,132 +71,182 @@ double Widened(float value) {
   return wide;
 }
 
-/// Reads the columns of a table's current row.
-class Row {
- public:
-  explicit Row(MdbTableDef* table) : table_(table), texts_(table->num_cols), lengths_(table->num_cols) {
-    for (unsigned int i = 0; i < table->num_cols; ++i) {
-      texts_[i].resize(TakesText(*Column(i)) ? MostBytesOfText : MDB_BIND_SIZE);
-      mdb_bind_column(table, static_cast<int>(i) + 1, texts_[i].data(), &lengths_[i]);
-    }
+/// Before version 4 texts are in the file's code page, which the library knows.
+JetText DecodeInCodePage(MdbHandle* mdb, std::string_view bytes) {
+  if (bytes.empty()) {
+    return {};
   }
+  constexpr std::size_t mostBytesOfCharacter = 4;
+  std::string text(bytes.size() * mostBytesOfCharacter + 1, '\0');
+  const int size = mdb_unicode2ascii(mdb, bytes.data(), bytes.size(), text.data(), text.size());
+  text.resize(static_cast<std::size_t>(size));
+  // The library puts a question mark where it knows no character.
+  const auto marks = [](std::string_view where) { return std::count(where.begin(), where.end(), '?'); };
+  const bool whole = marks(text) == marks(bytes);
+  return {std::move(text), whole};
+}
 
-  void WriteOut() {
-    int start = 0;
-    std::size_t size = 0;
-    std::vector<MdbField> fields(MDB_MAX_COLS);
-    if (mdb_find_row(table_->entry->mdb, static_cast<int>(table_->cur_row) - 1, &start, &size) != 0 ||
-        mdb_crack_row(table_, start & OffsetMask, size, fields.data()) < 0) {
-      Fail("A row of the table " + std::string(table_->name) + " cannot be read.");
+class TableWriter {
+ public:
+  TableWriter(MdbTableDef* table, ReaderOutput& output)
+      : mdb_(table->entry->mdb), output_(output), rows_(table) {}
+
+  /// Writes all rows; returns their number, which is at most one more than `most`.
+  std::uint64_t WriteRows(std::uint64_t most) {
+    std::uint64_t count = 0;
+    while (count <= most && rows_.Next()) {
+      output_.Tag('R');
+      for (unsigned int i = 0; i < rows_.ColumnCount(); ++i) {
+        WriteColumn(i);
+      }
+      ++count;
     }
-    std::vector<bool> isNull;
-    for (unsigned int i = 0; i < table_->num_cols; ++i) {
-      isNull.push_back(fields[i].is_null != 0);
-    }
-    WriteTag('R');
-    for (unsigned int i = 0; i < table_->num_cols; ++i) {
-      WriteColumn(i, isNull[i]);
-    }
+    return count;
   }
 
  private:
-  static constexpr int OffsetMask = 0x1FFF;
-
-  static bool TakesText(const MdbColumn& column) { return column.col_type == MDB_MEMO; }
-
-  MdbColumn* Column(unsigned int i) const {
-    return static_cast<MdbColumn*>(g_ptr_array_index(table_->columns, i));
+  void WriteColumn(unsigned int i) {
+    const int type = rows_.Column(i).col_type;
+    if (type == MDB_BOOL) {  // stored as the mark of a value that is there
+      output_.Integer(rows_.IsNull(i) ? 0 : 1);
+    } else if (rows_.IsNull(i)) {
+      output_.Null();
+    } else if (type == MDB_OLE || type == MDB_MEMO) {
+      WriteLong(rows_.Bytes(i), type == MDB_MEMO);
+    } else if (type == MDB_NUMERIC) {
+      output_.Text(rows_.DecimalText(i));
+    } else if (type == MDB_TEXT) {
+      WriteText(rows_.Bytes(i));
+    } else if (rows_.Bytes(i).size() < SizeOf(type)) {
+      WriteUnread();
+    } else if (!WriteNumber(type, rows_.Bytes(i))) {
+      output_.Binary(rows_.Bytes(i));
+    }
   }
 
-  void WriteColumn(unsigned int i, bool isNull) {
-    MdbColumn& column = *Column(i);
-    if (isNull && column.col_type != MDB_BOOL) {
-      WriteTag('N');
-      return;
-    }
-    unsigned char* const page = table_->entry->mdb->pg_buf;
-    const int at = column.cur_value_start;
-    switch (column.col_type) {
-      case MDB_BOOL:
-        WriteInteger(texts_[i][0] == '1' ? 1 : 0);
-        break;
+  void WriteUnread() {
+    output_.Tag('U');
+    output_.Null();
+  }
+
+  bool WriteNumber(int type, std::string_view bytes) {
+    constexpr double moneyUnits = 10000;
+    switch (type) {
       case MDB_BYTE:
-        WriteInteger(page[at]);
-        break;
+        output_.Integer(NumberIn<std::uint8_t>(bytes));
+        return true;
       case MDB_INT:
-        WriteInteger(static_cast<std::int16_t>(mdb_get_int16(page, at)));
-        break;
+        output_.Integer(NumberIn<std::int16_t>(bytes));
+        return true;
       case MDB_LONGINT:
-        WriteInteger(static_cast<std::int32_t>(mdb_get_int32(page, at)));
-        break;
-      case MDB_MONEY: {
-        std::int64_t tenThousandths = 0;
-        std::memcpy(&tenThousandths, page + at, sizeof tenThousandths);
-        WriteReal(static_cast<double>(tenThousandths) / 10000);
-        break;
-      }
+        output_.Integer(NumberIn<std::int32_t>(bytes));
+        return true;
+      case MDB_MONEY:
+        output_.Real(static_cast<double>(NumberIn<std::int64_t>(bytes)) / moneyUnits);
+        return true;
       case MDB_FLOAT:
-        WriteReal(Widened(mdb_get_single(page, at)));
-        break;
+        output_.Real(Widened(NumberIn<float>(bytes)));
+        return true;
       case MDB_DOUBLE:
-        WriteReal(mdb_get_double(page, at));
-        break;
+        output_.Real(NumberIn<double>(bytes));
+        return true;
       case MDB_DATETIME:
-        WriteText(JetDateText(mdb_get_double(page, at)));
-        break;
-      case MDB_OLE: {
-        std::size_t size = 0;
-        void* bytes = mdb_ole_read_full(table_->entry->mdb, &column, &size);
-        if (bytes == nullptr) {
-          Fail("A picture or object in the table " + std::string(table_->name) + " cannot be read.");
-        }
-        WriteBytes('B', bytes, size);
-        std::free(bytes);
-        break;
-      }
-      case MDB_BINARY:
-      case MDB_REPID:
-        WriteBytes('B', page + at, static_cast<std::size_t>(column.cur_value_len));
-        break;
+        WriteDate(NumberIn<double>(bytes));
+        return true;
       default:
-        WriteBoundText(i);
-        break;
+        return false;
     }
   }
 
-  void WriteBoundText(unsigned int i) {
-    const std::size_t length = std::strlen(texts_[i].data());
-    if (length + 1 >= texts_[i].size()) {
-      Fail("A text in the table " + std::string(table_->name) + " is too long.");
+  void WriteDate(double date) {
+    if (IsJetDate(date)) {
+      output_.Text(JetDateText(date));
+    } else {
+      WriteUnread();
     }
-    WriteBytes('S', texts_[i].data(), length);
   }
 
-  MdbTableDef* table_;
-  std::vector<std::vector<char>> texts_;
-  std::vector<int> lengths_;
+  void WriteText(std::string_view bytes) {
+    const JetText text = IS_JET3(mdb_) ? DecodeInCodePage(mdb_, bytes) : DecodeJetText(bytes);
+    if (!text.Whole) {
+      output_.Tag('U');
+    }
+    output_.Text(text.Utf8);
+  }
+
+  void WriteLong(std::string_view reference, bool isText) {
+    const auto value = ReadLongValue(mdb_, reference);
+    if (!value) {
+      WriteUnread();
+    } else if (isText) {
+      WriteText(*value);
+    } else {
+      output_.Binary(*value);
+    }
+  }
+
+  MdbHandle* mdb_;
+  ReaderOutput& output_;
+  JetRows rows_;
 };
 
-void WriteTable(MdbTableDef* table) {
-  WriteTag('T');
-  WriteText(table->name);
-  WriteNumber(table->num_cols, 4);
+void WriteTable(MdbTableDef* table, ReaderOutput& output) {
+  output.Tag('T');
+  output.Text(table->name);
+  output.Number(table->num_cols, 4);
   for (unsigned int i = 0; i < table->num_cols; ++i) {
-    WriteText(static_cast<MdbColumn*>(g_ptr_array_index(table->columns, i))->name);
+    output.Text(static_cast<MdbColumn*>(g_ptr_array_index(table->columns, i))->name);
   }
-  mdb_rewind_table(table);
-  Row row(table);
-  unsigned int rows = 0;
-  while (mdb_fetch_row(table) != 0) {
-    row.WriteOut();
-    if (++rows > table->num_rows) {
-      Fail("The table " + std::string(table->name) + " holds more rows than it counts.");
+  const std::uint64_t count = TableWriter(table, output).WriteRows(table->num_rows);
+  if (count != table->num_rows) {
+    Fail(output, table->name, count, table->num_rows);
+  }
+  output.Tag('E');
+}
+
+/// The table of an entry of the catalog, with its columns; nullptr if it cannot be read.
+MdbTableDef* ReadTable(MdbCatalogEntry* entry) {
+  MdbTableDef* const table = mdb_read_table(entry);
+  return table == nullptr || table->num_cols > MDB_MAX_COLS || mdb_read_columns(table) == nullptr ? nullptr
+                                                                                                  : table;
+}
+
+/// The library takes what it can read of the list of tables; the list counts its rows as every table does.
+bool CatalogIsWhole(MdbHandle* mdb) {
+  MdbCatalogEntry* const entry = mdb_get_catalogentry_by_name(mdb, "MSysObjects");
+  MdbTableDef* const table = entry == nullptr ? nullptr : ReadTable(entry);
+  if (table == nullptr) {
+    return false;
+  }
+  JetRows rows(table);
+  unsigned int count = 0;
+  while (count <= table->num_rows && rows.Next()) {
+    ++count;
+  }
+  return count == table->num_rows;
+}
+
+/// Writes the names of the other tables of the user, and returns the wanted one.
+MdbTableDef* WriteOtherTables(MdbHandle* mdb, const char* name, ReaderOutput& output) {
+  MdbTableDef* wanted = nullptr;
+  for (unsigned int i = 0; i < mdb->num_catalog; ++i) {
+    auto* const entry = static_cast<MdbCatalogEntry*>(g_ptr_array_index(mdb->catalog, i));
+    if (entry->object_type != MDB_TABLE || mdb_is_user_table(entry) == 0) {
+      continue;
+    }
+    MdbTableDef* const table = ReadTable(entry);
+    if (table == nullptr) {
+      Fail(output, entry->object_name);
+    }
+    if (g_ascii_strcasecmp(entry->object_name, name) == 0) {
+      wanted = table;
+    } else {
+      output.Tag('O');
+      output.Text(entry->object_name);
+      output.Number(table->num_rows, 8);
     }
   }
-  if (rows != table->num_rows) {
-    Fail("The table " + std::string(table->name) + " has " + std::to_string(table->num_rows) +
-         " rows, of which " + std::to_string(rows) + " can be read.");
-  }
+  return wanted;
 }
 
 #ifdef __has_feature
@@ -221,40 +268,21 @@ void LimitMemory() {
 
 int main(int argc, char** argv) {
   if (argc != 3) {
-    Fail("usage: tessarine-jet-reader FILE TABLE");
+    std::fprintf(stderr, "usage: tessarine-jet-reader FILE TABLE\n");
+    return 2;
   }
   LimitMemory();
+  ReaderOutput output;
   MdbHandle* const mdb = mdb_open(argv[1], MDB_NOFLAGS);
-  if (mdb == nullptr || mdb_read_catalog(mdb, MDB_TABLE) == nullptr) {
-    Fail("Its list of tables cannot be read.");
+  if (mdb == nullptr || mdb_read_catalog(mdb, MDB_TABLE) == nullptr || !CatalogIsWhole(mdb)) {
+    Fail(output, "");
   }
-  mdb_set_bind_size(mdb, MostBytesOfText);
-  MdbTableDef* wanted = nullptr;
-  for (unsigned int i = 0; i < mdb->num_catalog; ++i) {
-    auto* const entry = static_cast<MdbCatalogEntry*>(g_ptr_array_index(mdb->catalog, i));
-    if (entry->object_type != MDB_TABLE || mdb_is_user_table(entry) == 0) {
-      continue;
-    }
-    MdbTableDef* const table = mdb_read_table(entry);
-    if (table == nullptr || mdb_read_columns(table) == nullptr) {
-      Fail("The table " + std::string(entry->object_name) + " cannot be read.");
-    }
-    if (g_ascii_strcasecmp(entry->object_name, argv[2]) == 0) {
-      wanted = table;
-    } else {
-      WriteTag('O');
-      WriteText(entry->object_name);
-      WriteNumber(table->num_rows, 8);
-    }
-  }
+  MdbTableDef* const wanted = WriteOtherTables(mdb, argv[2], output);
   if (wanted == nullptr) {
-    Fail("It has no table " + std::string(argv[2]) + ".");
+    Fail(output, argv[2]);
   }
-  WriteTable(wanted);
-  WriteTag('E');
-  if (std::fflush(stdout) != 0) {
-    Fail("The reader of old files has lost its listener.");
-  }
+  WriteTable(wanted, output);
+  output.Flush();
   // The library's own clean-up is not needed, and is not safe after reading a damaged file.
   std::_Exit(0);
 }

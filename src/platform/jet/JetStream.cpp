@@ -3,7 +3,7 @@
 #include <cstring>
 #include <utility>
 
-#include "platform/RuntimeError.h"
+#include "platform/OldDatabases.h"
 
 namespace {
 
@@ -11,7 +11,18 @@ constexpr std::uint64_t MostColumns = 1024;
 constexpr std::uint64_t MostBytesOfValue = std::uint64_t{1} << 30U;
 
 [[noreturn]] void FailForm() {
-  throw RuntimeError(Fault::UnrecognizedDatabase, "It is damaged: its rows make no sense.");
+  throw OldDatabaseRefused();
+}
+
+/// Puts bytes into a text (tag 'S') or a blob, using the memory of the one that stands there.
+void PutBytes(char tag, std::string_view bytes, Value& value) {
+  if (tag == 'B') {
+    value.emplace<Blob>(bytes.begin(), bytes.end());
+  } else if (auto* text = std::get_if<std::string>(&value)) {
+    text->assign(bytes);
+  } else {
+    value.emplace<std::string>(bytes);
+  }
 }
 
 }  // namespace
@@ -39,6 +50,9 @@ bool JetStream::TakeItem() {
     ++taken_;
     ended_ = true;
     return true;
+  }
+  if (tag == 'F') {
+    return TakeFailure(taken_ + 1);
   }
   if (tag == 'O' && !inTable_) {
     return TakeOtherTable(taken_ + 1);
@@ -77,20 +91,37 @@ bool JetStream::TakeTable(std::size_t at) {
   }
   taken_ = at;
   inTable_ = true;
-  columns_ = columns.size();
+  row_.resize(columns.size());
   listener_.Table(columns);
   return true;
 }
 
 bool JetStream::TakeRow(std::size_t at) {
-  std::vector<Value> row(columns_);
-  for (Value& value : row) {
-    if (!TakeValue(at, value)) {
+  unread_.clear();
+  for (std::size_t i = 0; i < row_.size(); ++i) {
+    if (at < waiting_.size() && waiting_[at] == 'U') {
+      unread_.push_back(i);
+      ++at;
+    }
+    if (!TakeValue(at, row_[i])) {
       return false;
     }
   }
   taken_ = at;
-  listener_.Row(row);
+  listener_.Row(row_, unread_);
+  return true;
+}
+
+bool JetStream::TakeFailure(std::size_t at) {
+  std::string table;
+  std::uint64_t read = 0;
+  std::uint64_t counted = 0;
+  if (!TakeText(at, table) || !TakeNumber(at, 8, read) || !TakeNumber(at, 8, counted)) {
+    return false;
+  }
+  taken_ = at;
+  ended_ = true;
+  listener_.Unreadable(table, static_cast<std::int64_t>(read), static_cast<std::int64_t>(counted));
   return true;
 }
 
@@ -140,12 +171,7 @@ bool JetStream::TakeValue(std::size_t& at, Value& value) const {
       if (waiting_.size() - at < number) {
         return false;
       }
-      if (tag == 'S') {
-        value = waiting_.substr(at, number);
-      } else {
-        value = Blob(waiting_.begin() + static_cast<std::ptrdiff_t>(at),
-                     waiting_.begin() + static_cast<std::ptrdiff_t>(at + number));
-      }
+      PutBytes(tag, {waiting_.data() + at, number}, value);
       at += number;
       return true;
     default:

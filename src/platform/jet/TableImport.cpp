@@ -1,6 +1,7 @@
 #include "platform/jet/TableImport.h"
 
 #include <charconv>
+#include <cmath>
 #include <functional>
 #include <string_view>
 
@@ -46,13 +47,34 @@ std::string TextOfNumber(const Value& value) {
 }  // namespace
 
 TableImport::TableImport(const std::string& path, const std::string& table)
-    : connection_(path, BusyTimeout), table_(connection_, table), transaction_(connection_) {
+    : connection_(path, BusyTimeout), table_(connection_, table) {
+  // A new file that is not finished is thrown away, so its journal need not outlive this program.
+  connection_.Execute("PRAGMA journal_mode = MEMORY");
+  connection_.Execute("PRAGMA cache_size = -65536");  // KiB
+  transaction_.emplace(connection_);
   connection_.Execute(("DELETE FROM [" + table_.Name() + "]").c_str());
+  TakeIndexesAway();
+}
+
+// Making an index of all rows at the end takes a fraction of the time of adding to it row by row.
+void TableImport::TakeIndexesAway() {
+  std::vector<std::string> names;
+  SqliteStatement query(
+      connection_,
+      "SELECT m.name, m.sql FROM sqlite_master m, pragma_index_list(?1) i "
+      "WHERE m.type = 'index' AND m.name = i.name AND m.sql IS NOT NULL AND NOT i.[unique]");
+  const Value tableName = table_.Name();
+  query.Bind(1, tableName);
+  while (query.Step()) {
+    names.push_back(query.Text(0));
+    indexes_.push_back(query.Text(1));
+  }
+  for (const std::string& name : names) {
+    connection_.Execute(("DROP INDEX [" + name + "]").c_str());
+  }
 }
 
 void TableImport::SetColumns(const std::vector<std::string>& columns) {
-  std::string names;
-  std::string values;
   std::set<std::string> required;
   SqliteStatement info(connection_, "SELECT name FROM pragma_table_info(?1) WHERE [notnull]");
   const Value tableName = table_.Name();
@@ -60,70 +82,154 @@ void TableImport::SetColumns(const std::vector<std::string>& columns) {
   while (info.Step()) {
     required.insert(info.Text(0));
   }
+  std::set<std::string> known;
   for (std::size_t source = 0; source < columns.size(); ++source) {
     try {
       const SqliteColumn& column = table_.Columns()[table_.ColumnAt(columns[source])];
-      targets_.push_back({source, column});
-      const std::string comma = names.empty() ? "" : ", ";
-      const bool fill = required.count(column.Name) != 0 && !column.Default.empty();
-      names += comma + "[" + column.Name + "]";
-      values += comma + (fill ? "coalesce(?, " + column.Default + ")" : "?");
+      targets_.push_back({source, column, {}, {}, nullptr});
+      known.insert(column.Name);
+      if (required.count(column.Name) != 0 && !column.Default.empty()) {
+        SqliteStatement value(connection_, "SELECT " + column.Default);
+        value.Step();
+        value.Read(0, targets_.back().WhenNull);
+      }
     } catch (const RuntimeError&) {
       unknown_.push_back(columns[source]);
     }
   }
-  if (targets_.empty()) {
-    throw RuntimeError(Fault::UnrecognizedDatabase,
-                       "Its table " + table_.Name() + " has none of the columns that are needed.");
-  }
-  insert_ = SqliteStatement(connection_, "INSERT INTO [" + table_.Name() + "] (" + names + ") VALUES (" +
-                                             values + ") RETURNING " + names);
-}
-
-void TableImport::AddRow(const std::vector<Value>& row) {
-  std::vector<Value> fitting;
-  for (const Target& target : targets_) {
-    fitting.push_back(Fitting(target, row[target.Source]));
-  }
-  for (std::size_t i = 0; i < fitting.size(); ++i) {
-    insert_.Bind(static_cast<int>(i + 1), fitting[i]);
-  }
-  std::uint64_t hash = 0;
-  if (insert_.Step()) {
-    Value stored;
-    for (std::size_t i = 0; i < fitting.size(); ++i) {
-      insert_.Read(static_cast<int>(i), stored);
-      if (!std::holds_alternative<std::monostate>(fitting[i]) && HashOf(stored) != HashOf(fitting[i])) {
-        throw RuntimeError(Fault::UnrecognizedDatabase,
-                           "A value of its column " + targets_[i].Column.Name + " does not fit.");
-      }
-      hash = Mixed(hash, HashOf(stored));
+  for (const SqliteColumn& column : table_.Columns()) {
+    if (known.count(column.Name) == 0) {
+      missing_.push_back(column.Name);
     }
   }
-  insert_.Reset();
-  checksum_ += hash;
-  ++rows_;
+  PrepareInsert();
 }
 
-Value TableImport::Fitting(const Target& target, const Value& value) {
+void TableImport::PrepareInsert() {
+  if (targets_.empty()) {
+    throw OldDatabaseRefused({{NotTakenOver::TableRows, table_.Name()}});
+  }
+  std::string names;
+  std::string values;
+  for (const Target& target : targets_) {
+    names += (names.empty() ? "[" : ", [") + target.Column.Name + "]";
+    values += values.empty() ? "?" : ", ?";
+  }
+  insert_ = SqliteStatement(connection_,
+                            "INSERT INTO [" + table_.Name() + "] (" + names + ") VALUES (" + values + ")");
+}
+
+void TableImport::AddRow(const std::vector<Value>& row, const std::vector<std::size_t>& unread) {
+  ++rows_;
+  for (Target& target : targets_) {
+    target.Stored = &Fitting(target, row[target.Source]);
+  }
+  for (const Target& target : targets_) {
+    // SQLite would store it as NULL.
+    if (const auto* real = std::get_if<double>(target.Stored); real != nullptr && std::isnan(*real)) {
+      Refuse(target.Column.Name);
+    }
+  }
+  if (!unread.empty()) {
+    NoteUnread(unread);
+  }
+  Insert();
+  checksum_ += HashOfRow();
+}
+
+void TableImport::Insert() {
+  for (std::size_t i = 0; i < targets_.size(); ++i) {
+    insert_.Bind(static_cast<int>(i + 1), *targets_[i].Stored);
+  }
+  try {
+    insert_.Step();
+  } catch (const RuntimeError& error) {
+    switch (error.Number()) {
+      case Fault::DuplicateKey:
+      case Fault::ValueRequired:
+      case Fault::ValueProhibited:
+      case Fault::DataConversion:
+        break;
+      default:
+        throw;
+    }
+    // SQLite tells the column only within the text of its error.
+    const std::string text = error.what();
+    std::string named;
+    for (const Target& target : targets_) {
+      if (target.Column.Name.size() > named.size() && text.find(target.Column.Name) != std::string::npos) {
+        named = target.Column.Name;
+      }
+    }
+    Refuse(named);
+  }
+}
+
+void TableImport::NoteUnread(const std::vector<std::size_t>& unread) {
+  for (const std::size_t source : unread) {
+    for (const Target& target : targets_) {
+      if (target.Source != source) {
+        continue;
+      }
+      unreadValues_.push_back(ValueOf(target.Column.Name));
+      // A column beside it may hold the length of a value that is now left out.
+      for (Target& other : targets_) {
+        if (target.Column.IsLong && other.Column.Name == target.Column.Name + "Length") {
+          other.Converted = std::int64_t{0};
+          other.Stored = &other.Converted;
+        }
+      }
+    }
+  }
+}
+
+NotTakenOver TableImport::ValueOf(const std::string& column) const {
+  std::string row = std::to_string(rows_);
+  for (const Target& target : targets_) {
+    if (target.Column.IsKey && target.Stored != nullptr) {
+      row += " (" + target.Column.Name + " " + TextOfNumber(*target.Stored) + ")";
+    }
+  }
+  return {.What = NotTakenOver::OneValue, .Name = column, .InTable = table_.Name(), .InRow = row};
+}
+
+void TableImport::Refuse(const std::string& column) const {
+  throw OldDatabaseRefused({ValueOf(column)});
+}
+
+const Value& TableImport::Fitting(Target& target, const Value& value) {
   const bool isText = std::holds_alternative<std::string>(value);
   if (target.Column.IsNumber && isText) {
     try {
-      return target.Column.Accept(value);
+      target.Converted = target.Column.Accept(value);
     } catch (const RuntimeError&) {
       zeroed_.insert(target.Column.Name);
-      return std::int64_t{0};
+      target.Converted = std::int64_t{0};
     }
+    return target.Converted;
   }
   const bool isNumber = std::holds_alternative<std::int64_t>(value) || std::holds_alternative<double>(value);
   if (isNumber && !target.Column.IsNumber && !target.Column.IsLong) {
-    return TextOfNumber(value);
+    target.Converted = TextOfNumber(value);
+    return target.Converted;
   }
-  return value;
+  return std::holds_alternative<std::monostate>(value) ? target.WhenNull : value;
+}
+
+std::uint64_t TableImport::HashOfRow() const {
+  std::uint64_t hash = 0;
+  for (const Target& target : targets_) {
+    const bool isNew = target.Column.IsKey && std::holds_alternative<std::monostate>(*target.Stored);
+    hash = Mixed(hash, isNew ? HashOf(connection_.LastInsertedKey()) : HashOf(*target.Stored));
+  }
+  return hash;
 }
 
 void TableImport::Finish() {
-  transaction_.Commit();
+  for (const std::string& index : indexes_) {
+    connection_.Execute(index.c_str());
+  }
+  transaction_->Commit();
   std::string names;
   for (const Target& target : targets_) {
     names += (names.empty() ? "[" : ", [") + target.Column.Name + "]";

@@ -14,7 +14,7 @@ class IniReaderTest : public testing::Test {
  protected:
   IniReaderTest() { Store.AddFolder("/data"); }
 
-  /// The value of "comm"/"commport" in a file of these bytes.
+  /// The value of "comm"/"commport" in a file with these bytes.
   std::string Read(const std::string& bytes) {
     Store.Put(Path, bytes);
     return Ini.ReadIni("comm", "commport", "default");

@@ -98,7 +98,7 @@ TEST_F(Ring, DropsRowsWhenTheOldFileCannotBePutAway) {
 TEST_F(Ring, GoesOnWhenSomeoneTookTheFileAway) {
   ring.Append("12345678\n");
   files.Remove(Newer);
-  ring.Append("one\n");  // finds nothing to put away
+  ring.Append("one\n");  // finds no file to rename
   ring.Append("two\n");
   EXPECT_EQ(TextOf(Newer), "two\n");
 }

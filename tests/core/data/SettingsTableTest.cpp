@@ -13,7 +13,7 @@ namespace {
 
 using testing::HasSubstr;
 
-/// The rows of the manual's list, in its form.
+/// The table in the manual, in its format.
 std::string ManualRows() {
   std::string rows = "| Section | Key | Default | Meaning |\n| --- | --- | --- | --- |\n";
   for (const Setting& setting : AllSettings) {

@@ -27,7 +27,7 @@ class Storing : public testing::Test {
     venue.Open();
   }
 
-  /// Stores a file of these bytes.
+  /// Stores a file with these bytes.
   void Store(const std::string& bytes) {
     files.Put("/photo.jpg", bytes);
     StoreFile("/photo.jpg");

@@ -27,7 +27,7 @@ const std::string Untouched = "0||0.0|0.0|0.0|0.0|0|0.0|0.0|0.0";
 
 class Commit : public testing::Test {
  protected:
-  /// Members with the numbers 1 to `count`.
+  /// Adds members with the numbers 1 to `count`.
   void AddMembers(int count) {
     std::string rows;
     for (int member = 1; member <= count; ++member) {
@@ -38,7 +38,7 @@ class Commit : public testing::Test {
 
   void Sql(const std::string& sql) { ExecuteSql(venue.MembersFile(), sql); }
 
-  /// An active player with these figures in the game.
+  /// Puts an active player with these figures into the game.
   Player& Play(int index, std::int32_t member, std::int32_t damage = 10, std::int32_t soldiering = 20,
                float accuracy = 0.5F) {
     Player& player = venue.Activate(index);
@@ -201,7 +201,7 @@ TEST_F(Commit, LeavesThePlayerUncommittedWhenTheMemberIsGone) {
   for (int index = 1; index <= 4; ++index) {
     Play(index, index);
   }
-  // While the box is open other programs can write the file, and see what was committed before it.
+  // While the box is open, other programs can write the file and see what has been committed so far.
   venue.Boxes.WhileOpen = [this](const FakeMessageBoxes::Box&) {
     EXPECT_EQ(Figure("TotalGamesPlayed"), "1");
     Sql("UPDATE Members SET City = 'Other'");

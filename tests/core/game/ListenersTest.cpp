@@ -63,7 +63,7 @@ TEST_F(Listening, MayEndItselfInTheMidstOfATelling) {
   own = listeners.Listen([this, &own, kept](int message) {
     own.End();
     heard.push_back(*kept + std::to_string(message));
-    listeners.Tell(message + 1);  // not heard any more
+    listeners.Tell(message + 1);  // no longer heard
   });
   const Subscription next = Listen("next");
   listeners.Tell(1);

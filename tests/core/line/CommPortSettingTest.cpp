@@ -54,7 +54,7 @@ TEST_F(PortOfTheSettings, WithoutADeviceIsNoSuchPort) {
   }
 }
 
-/// For a window that keeps the number and opens the line later.
+/// For a window that remembers the number and opens the line later.
 TEST_F(PortOfTheSettings, GivesTheDeviceOfAnyOtherNumberToo) {
   EXPECT_EQ(setting.DeviceOf(2), "/dev/ttyUSB0");
   EXPECT_EQ(FailureOf([&] { setting.DeviceOf(9); }), 8002);

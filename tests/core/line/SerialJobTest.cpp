@@ -22,7 +22,7 @@ class Job : public testing::Test {
  protected:
   void Open() { job.Open(Device, Settings); }
 
-  /// These bytes arrive after `delay`.
+  /// Lets these bytes arrive after `delay`.
   void Arrive(std::chrono::milliseconds delay, const std::vector<std::uint8_t>& bytes) {
     events.At(delay, [this, bytes] { port.Receive(bytes); });
   }
@@ -257,7 +257,7 @@ TEST_F(Job, ClosesALineThatFailedAlsoWhenItWasToLeaveItOpen) {
   EXPECT_FALSE(port.PortOpen());
 }
 
-/// The fake line has the rate of its settings.
+/// The fake line has the baud rate of its settings.
 class JobsPause : public Job {
  protected:
   JobsPause() {

@@ -120,7 +120,7 @@ class PollTranscript : public LineTranscript {
                  Transcript::Repeats::Counted);
   }
 
-  /// One look at the bus, which answers `answer`; the second byte comes `gap` later.
+  /// One poll of the bus, which answers `answer`; the second byte comes `gap` later.
   void Tick(std::uint8_t answer, std::chrono::milliseconds gap = 0ms) {
     time.Pass(100ms);
     poll->Note("opened", std::to_string(time.Now().count()));
@@ -153,7 +153,7 @@ TEST_F(PollTranscript, CountsTicksThatRepeatTheLastOne) {
             "    3.900000 box -- closed\n");
 }
 
-/// So it is when a walk along the bus has several steps.
+/// As when a walk along the bus has several steps.
 TEST_F(PollTranscript, CountsTicksThatRepeatInTurn) {
   for (int round = 0; round < 10; ++round) {
     for (std::uint8_t step = 1; step <= 4; ++step) {

@@ -80,7 +80,7 @@ constexpr NamedText OwnTexts[] = {
 #include "resources/StringTable.inc"
 };
 
-/// The places for values in a text, "%1%2", each once, ascending.
+/// The placeholders in a text, "%1%2", each once, ascending.
 std::string PlacesIn(const std::string& text) {
   std::string places;
   for (char digit = '0'; digit <= '9'; ++digit) {

@@ -17,7 +17,7 @@ struct Ran {
 Ran RunShell(const std::string& script, std::chrono::milliseconds silence = 10s) {
   Ran ran;
   ran.End =
-      RunChild("/bin/sh", {"-c", script}, silence, [&ran](std::string_view bytes) { ran.Output += bytes; });
+      RunChild("/bin/sh", {"-c", script}, silence, {[&ran](std::string_view bytes) { ran.Output += bytes; }});
   return ran;
 }
 
@@ -60,11 +60,26 @@ TEST(ChildProgram, IsEndedWhenItWritesErrorsWithoutEnd) {
 
 TEST(ChildProgram, IsEndedWhenItsOutputIsRefused) {
   const auto refuse = [](std::string_view) { throw RuntimeError(3343); };
-  EXPECT_EQ(NumberThrownBy([&] { RunChild("/bin/sh", {"-c", "echo x; exec sleep 60"}, 10s, refuse); }), 3343);
+  EXPECT_EQ(NumberThrownBy([&] {
+              RunChild("/bin/sh", {"-c", "echo x; exec sleep 60"}, 10s, {refuse});
+            }),
+            3343);
+}
+
+TEST(ChildProgram, IsEndedByItsErrorsLongBeforeItIsSilentForTooLong) {
+  const auto start = std::chrono::steady_clock::now();
+  EXPECT_TRUE(RunShell("exec yes >&2", 60s).End.TimedOut);
+  EXPECT_LT(std::chrono::steady_clock::now() - start, 30s);
+}
+
+TEST(ChildProgram, LeavesItsListenerTimeWhileItIsSilent) {
+  int waits = 0;
+  RunChild("/bin/sh", {"-c", "sleep 1"}, 10s, {[](std::string_view) {}, [&waits] { ++waits; }});
+  EXPECT_GE(waits, 5);
 }
 
 TEST(ChildProgram, ThatIsMissingIsReported) {
-  EXPECT_EQ(NumberThrownBy([] { RunChild("/nowhere/program", {}, 1s, [](std::string_view) {}); }), 53);
+  EXPECT_EQ(NumberThrownBy([] { RunChild("/nowhere/program", {}, 1s, {[](std::string_view) {}}); }), 53);
 }
 
 }  // namespace

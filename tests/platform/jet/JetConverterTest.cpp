@@ -7,6 +7,8 @@
 #include <iterator>
 #include <random>
 
+#include "platform/linux/LinuxFiles.h"
+#include "tests/support/ConversionAnswers.h"
 #include "tests/support/OldFiles.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/TestDatabase.h"
@@ -76,15 +78,21 @@ class Conversion : public testing::Test {
     return differences;
   }
 
+  OldDatabaseReport Convert(const std::string& path, const std::string& table, const std::string& empty) {
+    return converter.Convert({path, table, empty, folder / "members-new.mdb"}, answers);
+  }
+
   TemporaryFolder folder;
-  JetConverter converter{JetReaderPath(), 1s};
+  LinuxFiles disk;
+  JetConverter converter{disk, JetReaderPath(), 1s};
+  ConversionAnswers answers;
 };
 
 TEST_F(Conversion, ConvertsEveryValue) {
   for (const OldFile& old : OldFiles) {
     const std::string path = Copy(old.Name);
     EXPECT_TRUE(converter.IsOld(path));
-    const OldDatabaseReport report = converter.Convert(path, old.Table, Empty(old.Name));
+    const OldDatabaseReport report = Convert(path, old.Table, Empty(old.Name));
     EXPECT_THAT(report.NotTaken, IsEmpty());
     EXPECT_FALSE(converter.IsOld(path));
     const std::string json = ReadFile(std::string(TESSARINE_OLD_FILES "/") + old.Name + ".json");
@@ -96,7 +104,7 @@ TEST_F(Conversion, KeepsTheOldFileUnderAnUnusedName) {
   const std::string path = Copy("members");
   const std::string before = ReadFile(path);
   WriteFile(path + ".jet", "an older one");
-  const OldDatabaseReport report = converter.Convert(path, "Members", Empty("members"));
+  const OldDatabaseReport report = Convert(path, "Members", Empty("members"));
   EXPECT_EQ(report.KeptAs, path + ".jet2");
   EXPECT_TRUE(ReadFile(path + ".jet2") == before);
   EXPECT_EQ(ReadFile(path + ".jet"), "an older one");
@@ -110,7 +118,7 @@ TEST_F(Conversion, OfADamagedFileChangesNothing) {
     for (const std::size_t length : {std::size_t{5000}, whole.size() / 2, whole.size() - 1000}) {
       const std::string path = folder / (std::string(old.Name) + ".mdb");
       WriteFile(path, whole.substr(0, length));
-      EXPECT_EQ(NumberThrownBy([&] { converter.Convert(path, old.Table, Empty(old.Name)); }), 3343) << length;
+      EXPECT_EQ(NumberThrownBy([&] { Convert(path, old.Table, Empty(old.Name)); }), 3343) << length;
       EXPECT_TRUE(ReadFile(path) == whole.substr(0, length)) << length;
     }
     const std::string path = folder / (std::string(old.Name) + ".mdb");
@@ -121,7 +129,7 @@ TEST_F(Conversion, OfADamagedFileChangesNothing) {
       }
       WriteFile(path, damaged);
       try {
-        converter.Convert(path, old.Table, Empty(old.Name));
+        Convert(path, old.Table, Empty(old.Name));
         std::filesystem::remove(path + ".jet");
       } catch (const RuntimeError& error) {
         EXPECT_EQ(error.Number(), 3343);
@@ -134,21 +142,21 @@ TEST_F(Conversion, OfADamagedFileChangesNothing) {
 
 TEST_F(Conversion, WithoutItsTableFails) {
   const std::string path = Copy("scenarios");
-  EXPECT_THAT(ThrownBy([&] { converter.Convert(path, "Members", Empty("members")); }).Text,
-              HasSubstr("Members"));
+  EXPECT_THAT(ThrownBy([&] { Convert(path, "Members", Empty("members")); }).Text, HasSubstr("Members"));
   EXPECT_EQ(FilesInFolder(), 1U);
 }
 
 TEST_F(Conversion, IntoADatabaseWithoutTheTableFails) {
   const std::string path = Copy("members");
   // The new file is a copy of the other empty database, which has no such table.
-  EXPECT_EQ(NumberThrownBy([&] { converter.Convert(path, "Members", Empty("scenarios")); }), 3343);
+  EXPECT_EQ(NumberThrownBy([&] { Convert(path, "Members", Empty("scenarios")); }), 3343);
   EXPECT_TRUE(converter.IsOld(path));
 }
 
 TEST(OldFormat, IsKnownByItsMark) {
   const TemporaryFolder folder;
-  const JetConverter converter(JetReaderPath());
+  LinuxFiles disk;
+  const JetConverter converter(disk, JetReaderPath());
   const auto isOld = [&](const std::string& bytes) {
     WriteFile(folder / "x.mdb", bytes);
     return converter.IsOld(folder / "x.mdb");
@@ -166,9 +174,12 @@ TEST(OldFormat, IsKnownByItsMark) {
 TEST(OldFormat, ThatCannotBeReadWithoutTheReaderIsReported) {
   const TemporaryFolder folder;
   WriteFile(folder / "x.mdb", std::string("\0\1\0\0", 4) + "Standard Jet DB" + std::string(4096 - 19, '\0'));
-  JetConverter converter("/nowhere/tessarine-jet-reader");
+  LinuxFiles disk;
+  JetConverter converter(disk, "/nowhere/tessarine-jet-reader");
+  ConversionAnswers answers;
   const Thrown thrown = ThrownBy([&] {
-    converter.Convert(folder / "x.mdb", "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb");
+    converter.Convert({folder / "x.mdb", "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb", ""},
+                      answers);
   });
   EXPECT_THAT(thrown.Text, HasSubstr("/nowhere/tessarine-jet-reader"));
 }

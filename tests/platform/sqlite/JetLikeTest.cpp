@@ -118,6 +118,21 @@ TEST(JetLike, MatchesChinese) {
              {"马库斯", "马[库裤]斯", true}});
 }
 
+TEST(JetLike, MatchesTheLastCharactersOfTheBasicPlane) {
+  ExpectAll({{"\uEFFF", "?", true},
+             {"\uF000", "?", true},
+             {"\uFFFD", "?", true},
+             {"\uFFFF", "?", true},
+             {"a\uF8FFb", "a?b", true},
+             {"\uF900", "[\uF000-\uFFFF]", true},
+             {"\uE000", "[\uF000-\uFFFF]", false},
+             {"\uF000", "[!\uE000-\uFFFF]", false},
+             {"\uF000", "\uF001", false},
+             {"ＡＮＮＡ", "ａnna", false},
+             {"ＡＮＮＡ", "ａｎ*", true},
+             {"（会员）", "（*）", true}});
+}
+
 TEST(JetLike, SignsOfOtherPatternsAreOrdinary) {
   ExpectAll({{"100%", "100%", true},
              {"1000", "100%", false},
