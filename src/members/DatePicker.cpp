@@ -7,8 +7,10 @@
 #include <QKeyEvent>
 #include <QLocale>
 #include <QPainter>
+#include <QScreen>
 #include <QSignalBlocker>
 #include <QVBoxLayout>
+#include <algorithm>
 
 #include "platform/qt/QtClock.h"
 
@@ -100,6 +102,16 @@ void DatePicker::focusOutEvent(QFocusEvent* event) {
   }
 }
 
+QPoint DatePicker::PlaceOfCalendar(const QSize& calendar) const {
+  const QRect area = screen()->availableGeometry();
+  QPoint place = mapToGlobal(QPoint(0, height()));
+  if (place.y() + calendar.height() > area.bottom()) {
+    place.setY(mapToGlobal(QPoint(0, 0)).y() - calendar.height());
+  }
+  place.setX(std::min(place.x(), area.right() - calendar.width()));
+  return {std::max(place.x(), area.left()), std::max(place.y(), area.top())};
+}
+
 void DatePicker::OpenCalendar() {
   auto* popup = new QFrame(this, Qt::Popup);
   popup->setAttribute(Qt::WA_DeleteOnClose);
@@ -117,7 +129,9 @@ void DatePicker::OpenCalendar() {
   };
   connect(calendar, &QCalendarWidget::clicked, this, take);
   connect(calendar, &QCalendarWidget::activated, this, take);
-  popup->move(mapToGlobal(QPoint(0, height())));
+  popup->adjustSize();
+  popup->move(PlaceOfCalendar(popup->size()));
   popup->show();
+  popup->move(PlaceOfCalendar(popup->size()));  // some pixels larger now
   calendar->setFocus();
 }

@@ -30,6 +30,8 @@ class DatePicker : public QLineEdit {
   void Finish();
   void TakeDate(QDate date);
   void ShowStored();
+  /// Below the entry, or above it where the screen ends.
+  QPoint PlaceOfCalendar(const QSize& calendar) const;
   void OpenCalendar();
 
   std::string stored_;

@@ -5,6 +5,7 @@
 #include <QAccessible>
 #include <QApplication>
 #include <QCalendarWidget>
+#include <QScreen>
 #include <QTest>
 
 #include "platform/qt/QtClock.h"
@@ -145,6 +146,20 @@ TEST_F(DateEntry, ChoosesInACalendarByTheKeyboard) {
   EXPECT_EQ(picker.Stored(), "1961-05-20 00:00:00");
   EXPECT_EQ(Shown(), "20 May 1961");
   EXPECT_EQ(Calendar(), nullptr);
+}
+
+TEST_F(DateEntry, OpensTheCalendarInsideTheScreen) {
+  const QRect area = window.screen()->availableGeometry();
+  window.resize(picker.sizeHint().width(), 100);
+  const QPoint last = area.bottomRight() - QPoint(window.width(), window.height());
+  for (const QPoint& place : {area.topLeft(), QPoint(last.x(), 0), QPoint(0, last.y()), last}) {
+    window.move(place);
+    QTest::keyClick(&picker, Qt::Key_Down, Qt::AltModifier);
+    ASSERT_NE(Calendar(), nullptr);
+    const QRect popup = QApplication::activePopupWidget()->geometry();
+    EXPECT_TRUE(area.contains(popup)) << popup.right() << ' ' << popup.bottom();
+    QTest::keyClick(Calendar(), Qt::Key_Escape);
+  }
 }
 
 TEST_F(DateEntry, ClosesTheCalendarByEscapeAndKeepsTheDate) {
