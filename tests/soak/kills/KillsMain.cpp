@@ -60,7 +60,7 @@ Options ParseOptions(const std::vector<std::string>& arguments) {
 /// A work with its folder, and how it went.
 struct Job {
   std::unique_ptr<::Work> Work;
-  std::unique_ptr<TemporaryFolder> Folder;
+  std::unique_ptr<TemporaryFolder> Folder{};
   int Done = 0;
   std::chrono::duration<double> Spent{0};
   int Kills = 0;
