@@ -158,7 +158,7 @@ bool Members::focusNextPrevChild(bool next) {
   return QDialog::focusNextPrevChild(next);
 }
 
-// Called by Escape and the close box.
+// Called by the close box.
 void Members::reject() {
   commands_.Run([this] { RunClearSearch(); });
   QDialog::reject();
