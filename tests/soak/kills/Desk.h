@@ -33,7 +33,7 @@ class ExpectedBoxes : public MessageBoxes {
 class Desk {
  public:
   Desk(const WorkSources& sources, const std::filesystem::path& folder, const std::string& expectedBoxes = {})
-      : old_(sources.ProgramFolder / "tessarine-jet-reader") {
+      : old_(Disk, sources.ProgramFolder / "tessarine-jet-reader") {
     Boxes.Title = expectedBoxes;
     Time.DateAndTime = Now();  // backup copies are named by it
     if (!Games.Open({.Engine = engine_,
