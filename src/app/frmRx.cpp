@@ -2,6 +2,7 @@
 
 #include <QCloseEvent>
 #include <QHeaderView>
+#include <QLabel>
 #include <QSignalBlocker>
 #include <utility>
 #include <vector>
@@ -20,8 +21,13 @@ frmRx::frmRx(const Services& services)
       subscription_(session_.Listen([this](SessionChange change) { Show(change); })),
       gameFile_(services.CommonDialog1, services.Disk, services.Boxes),
       wordProcessor_(services.WordProcessor),
+      downloadedGuns_(session_.Game()),
+      status_(new QLabel(this)),
       commands_(*this, services.Boxes) {
   ui_->setupUi(this);
+  status_->setObjectName(QStringLiteral("Status"));
+  status_->setTextFormat(Qt::PlainText);
+  ui_->StatusBar->addWidget(status_, 1);
 }
 
 frmRx::~frmRx() = default;
@@ -131,6 +137,10 @@ void frmRx::closeEvent(QCloseEvent* event) {
 
 void frmRx::Show(SessionChange change) {
   switch (change) {
+    case SessionChange::Cleared:
+      downloadedGuns_.Settle();
+      ShowStatus({});
+      break;
     case SessionChange::Missions:
       ShowMissions();
       break;

@@ -62,7 +62,8 @@ class TranscriptOfADownload : public testing::Test {
     LoggedPort port(line, {files, folder / "logs", events, clock}, "line");
     CommPort commPort(port, ini, devices, boxes, strings, [] {});
     FakeDownloadProgress progress;
-    BaseUnitDownload(port, commPort, events, boxes, clock, progress, game).GetScores();
+    DownloadedGuns guns(game);
+    BaseUnitDownload(port, commPort, events, boxes, clock, progress, guns).GetScores();
   }
 
   std::ostringstream unitLog;
