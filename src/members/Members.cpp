@@ -97,6 +97,7 @@ void Members::ConnectCommands() {
                                  {ui_->DataNext, &MemberCursor::MoveNext},
                                  {ui_->DataLast, &MemberCursor::MoveLast},
                              });
+  commands_.EscapePresses(*ui_->OK);
 }
 
 void Members::RunInFocusChange(const std::function<void()>& command) {
@@ -128,7 +129,7 @@ void Members::Activate() {
   }
 }
 
-// Called by Escape and the close box.
+// Called by the close box.
 void Members::reject() {
   commands_.Run([this] { RunClearSearch(); });
   QDialog::reject();

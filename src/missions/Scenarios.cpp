@@ -107,6 +107,7 @@ void Scenarios::ConnectCommands() {
                                {ui_->Delete, &Scenarios::DeleteMission},
                                {ui_->SelectExit, &Scenarios::SelectExit},
                            });
+  commands_.EscapePresses(*ui_->SelectExit);
   const auto show = [this] { commands_.Run([this] { ShowSelectedMission(); }); };
   connect(ui_->MissionSelection1, &QListWidget::currentRowChanged, this, show);
   // A click on the entry that is already current also shows its mission again, discarding unsaved changes.
@@ -292,7 +293,6 @@ void Scenarios::SaveRow() {
 void Scenarios::StartRow() {
   if (isNewRecord_) {
     rsScenarios_.AddNew();
-    isNewRecord_ = false;
   } else if (rsScenarios_.EditMode() != EditMode::Add) {
     // After a failed insertion the new row is still pending. Any other save goes to the row selected in the
     // list.

@@ -234,10 +234,22 @@ TEST_F(MembersWindow, ChoosesNobodyWhoseNameIsNotStored) {
 TEST_F(MembersWindow, ChoosesNobodyWhenItIsClosed) {
   Open([this] {
     Press("DataNext");
-    Type(*window, Qt::Key_Escape);
+    window->close();
     EXPECT_EQ(window->SelectedContact(), "");
     EXPECT_FALSE(window->isVisible());
   });
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(MembersWindow, DoesByEscapeWhatOkDoes) {
+  Open([this] {
+    Press("DataNext");
+    Enter("FirstNameEntry", "Alicia");
+    Type(*window, Qt::Key_Escape);
+    EXPECT_EQ(window->SelectedContact(), "2");
+    EXPECT_FALSE(window->isVisible());
+  });
+  EXPECT_EQ(Stored("FirstName", 2), "Alicia");
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
