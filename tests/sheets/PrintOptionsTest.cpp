@@ -10,6 +10,7 @@
 
 #include "sheets/SheetProgressWindow.h"
 #include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/support/Captions.h"
 #include "tests/support/CaredFor.h"
 #include "tests/support/Controls.h"
 
@@ -41,6 +42,29 @@ TEST_P(PrintOptionsWindow, IsCaredFor) {
   EXPECT_EQ(Find<QRadioButton>(window, "PrintOne").text().toStdString(), strings.Text(155));
   EXPECT_EQ(Find<QRadioButton>(window, "PrintFile").text().toStdString(), strings.Text(157));
   EXPECT_EQ(Find<QCheckBox>(window, "HideRank").text().toStdString(), strings.Text(158));
+}
+
+TEST_P(PrintOptionsWindow, HaveTheirCaptions) {
+  const auto in = [](const char* english, const char* chinese) {
+    return std::string(GetParam() == Language::English ? english : chinese);
+  };
+  EXPECT_EQ(window.windowTitle().toStdString(), in("Print Options", "打印选项"));
+  ExpectCaptions(window,
+                 {{"Frame1", in("Select sheets to print", "选择要打印的成绩单")},
+                  {"Frame2", in("Output", "输出")},
+                  {"Frame3", in("Options", "选项")},
+                  {"PrintActive", in("Print score sheets for active players", "打印参赛玩家的成绩单")},
+                  {"PrintAll", in("Print all score sheets", "打印全部成绩单")},
+                  {"PrintTeam", in("Print sheets for Team", "打印指定队伍的成绩单")},
+                  {"PrintOne", in("Print sheet for Player", "打印指定玩家的成绩单")},
+                  {"PrintPrinter", in("Output to Printer", "输出到打印机")},
+                  {"PrintFile", in("Output to Files", "输出到文件")},
+                  {"HideRank", in("Hide Rank", "隐藏名次")},
+                  {"OK", in("OK", "确定")},
+                  {"Cancel", in("Cancel", "取消")}});
+  ExpectLabels(
+      window,
+      {{"TeamID", in("Team", "队伍")}, {"TeamID2", in("Team", "队伍")}, {"PlayerID", in("Player", "玩家")}});
 }
 
 TEST_P(PrintOptionsWindow, OfferTeamsAndNumbers) {
