@@ -202,6 +202,7 @@ TEST_F(DownloadWait, AfterAWrongCheckByteLetsTheMainWindowClose) {
 TEST_F(DownloadWait, SwallowsASecondPressByButtonMenuAndKey) {
   const auto sees = [this](const std::function<void()>& press) {
     return [this, press] {
+      Show(*venue.Window);
       press();
       EXPECT_TRUE(venue.Port.PortOpen());
       EXPECT_EQ(venue.Window->findChildren<UploadProgress*>().size(), 1);
