@@ -158,7 +158,7 @@ void ScoreListView::FitCaptions() {
   constexpr double step = 0.05;
   const int room = width() - 2 * frameWidth() - verticalScrollBar()->sizeHint().width();
   double size = LargestCaptions;
-  while (size > SmallestCaptions && NeededWidthWithCaptions(CaptionFont(font(), size)) > room) {
+  while (size > SmallestCaptions && !CaptionsFit(CaptionFont(font(), size), room)) {
     size -= step;
   }
   const QFont captions = CaptionFont(font(), size);
@@ -167,15 +167,16 @@ void ScoreListView::FitCaptions() {
   }
 }
 
-int ScoreListView::NeededWidthWithCaptions(const QFont& captions) const {
+bool ScoreListView::CaptionsFit(const QFont& captions, int room) const {
   const QFontMetrics now = horizontalHeader()->fontMetrics();
   const QFontMetrics then(captions);
-  int sum = 0;
   for (int column = 0; column < ColumnCount(); ++column) {
     const QString caption = model()->headerData(column, Qt::Horizontal).toString();
-    const int captionWidth = horizontalHeader()->sectionSizeHint(column) - now.horizontalAdvance(caption) +
-                             then.horizontalAdvance(caption);
-    sum += std::max(captionWidth, sizeHintForColumn(column));
+    const int width = horizontalHeader()->sectionSizeHint(column) - now.horizontalAdvance(caption) +
+                      then.horizontalAdvance(caption);
+    if (width > static_cast<int>(room * shares_[static_cast<std::size_t>(column)])) {
+      return false;
+    }
   }
-  return sum;
+  return true;
 }

@@ -29,9 +29,10 @@ class ScoreListView : public QTableView {
  private:
   int ColumnCount() const { return static_cast<int>(shares_.size()); }
   void ShareWidth();
-  /// Makes the captions smaller where not all columns fit otherwise.
+  /// Makes the captions smaller where they do not fit into their shares.
   void FitCaptions();
-  int NeededWidthWithCaptions(const QFont& captions) const;
+  /// True if captions in this font fit into their shares of `room` pixels.
+  bool CaptionsFit(const QFont& captions, int room) const;
   /// Width at which nothing in the column is cut, its header included.
   int NeededWidth(int column) const;
 
