@@ -107,11 +107,6 @@ TEST_F(Editor, ClosedByItsCloseBoxAsksNothingInAnyState) {
     Press("Edit");
     Describe("never saved");
   });
-  Open([this] {
-    Press("Edit");
-    QTest::keyClick(window, Qt::Key_Escape);
-    EXPECT_FALSE(window->isVisible());
-  });
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
   EXPECT_EQ(Stored("MissionDescription", "One"), "First text");
   Open([this] { NewMission("Four"); });

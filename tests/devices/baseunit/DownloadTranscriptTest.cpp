@@ -104,6 +104,7 @@ TEST_F(TranscriptOfADownload, IsNoFailureWhereItCannotBeWritten) {
 TEST_F(TranscriptOfADownload, GoesOnInTheSameFile) {
   Download();
   Download();
+  ASSERT_TRUE(unit.WaitUntilServed(2, std::chrono::seconds(5)));
   const std::string log = ReadFile(folder / "logs/base-unit.log");
   const auto first = log.find(" opened ");
   ASSERT_NE(first, std::string::npos);
