@@ -145,8 +145,11 @@ bool JetConverter::Join(const std::string& newFile, const OldDatabase& old, Conv
   std::optional<InterimRows> rows;
   try {
     rows.emplace(newFile, old);
-  } catch (const RuntimeError&) {
-    return false;  // it is damaged or no database; it stays where it is
+  } catch (const RuntimeError& error) {
+    if (error.Number() == Fault::UnrecognizedDatabase || error.Number() == Fault::DatabaseError) {
+      return false;  // it is damaged, or no database of ours; it stays where it is
+    }
+    throw;  // its rows may be readable the next time
   }
   if (rows->Count() == 0 || !steps.AddInterimRows(rows->Count())) {
     return false;
