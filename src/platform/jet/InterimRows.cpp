@@ -27,7 +27,8 @@ std::int64_t RowsOf(SqliteConnection& connection, const std::string& table) {
 InterimRows::InterimRows(const std::string& newFile, const OldDatabase& old)
     : connection_(newFile, BusyTimeout) {
   const SqliteTable table(connection_, old.Table);
-  table_ = "[" + table.Name() + "]";
+  tableName_ = table.Name();
+  table_ = "[" + tableName_ + "]";
   for (const SqliteColumn& column : table.Columns()) {
     if (column.IsKey) {
       key_ = "[" + column.Name + "]";
@@ -60,6 +61,7 @@ void InterimRows::Join() {
   // First those that keep their keys, so that no new key takes one of theirs.
   add(key_, "temp.Entered WHERE NOT " + isTaken);
   add("NULL", "temp.Renumbered");
+  transaction.Written().Write(tableName_, connection_.LastInsertedKey());
   transaction.Commit();
   if (RowsOf(connection_, "main." + table_) != before + count_) {
     throw RuntimeError(Fault::DatabaseDiskError, "The rows of the interim file could not be added.");

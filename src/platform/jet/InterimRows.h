@@ -20,7 +20,8 @@ class InterimRows {
 
  private:
   SqliteConnection connection_;
-  std::string table_;
+  std::string tableName_;
+  std::string table_;    ///< in brackets
   std::string key_;      ///< its column
   std::string columns_;  ///< all others, in brackets
   std::int64_t count_ = 0;

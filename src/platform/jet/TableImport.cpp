@@ -134,6 +134,7 @@ void TableImport::AddRow(const std::vector<Value>& row, const std::vector<std::s
     NoteUnread(unread);
   }
   Insert();
+  lastKey_ = connection_.LastInsertedKey();
   checksum_ += HashOfRow();
 }
 
@@ -220,7 +221,7 @@ std::uint64_t TableImport::HashOfRow() const {
   std::uint64_t hash = 0;
   for (const Target& target : targets_) {
     const bool isNew = target.Column.IsKey && std::holds_alternative<std::monostate>(*target.Stored);
-    hash = Mixed(hash, isNew ? HashOf(connection_.LastInsertedKey()) : HashOf(*target.Stored));
+    hash = Mixed(hash, isNew ? HashOf(lastKey_) : HashOf(*target.Stored));
   }
   return hash;
 }
@@ -228,6 +229,9 @@ std::uint64_t TableImport::HashOfRow() const {
 void TableImport::Finish() {
   for (const std::string& index : indexes_) {
     connection_.Execute(index.c_str());
+  }
+  if (rows_ > 0) {
+    transaction_->Written().Write(table_.Name(), lastKey_);  // so that a commit that failed is known by it
   }
   transaction_->Commit();
   std::string names;

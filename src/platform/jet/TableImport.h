@@ -65,5 +65,6 @@ class TableImport {
   std::vector<NotTakenOver> unreadValues_;
   SqliteStatement insert_;
   std::int64_t rows_ = 0;
+  std::int64_t lastKey_ = 0;
   std::uint64_t checksum_ = 0;
 };
