@@ -19,8 +19,11 @@ class ExpectedBoxes : public MessageBoxes {
   /// The title of the boxes that may come; empty for none.
   std::string Title;
 
+  std::string LatestText;
+
   BoxAnswer Show(const std::string& text, const std::string& title, BoxIcon /*icon*/,
                  BoxButtons buttons = BoxButtons::Ok) override {
+    LatestText = text;
     if (title != Title) {
       throw std::runtime_error("a box came: " + text);
     }

@@ -113,6 +113,9 @@ class SheetWork : public Work {
     choice.SheetSelection = SheetSelection::Active;
     choice.OutputTarget = OutputTarget::Files;
     ScoreSheets(parts, choice).GenerateScoreSheets();
+    if (desk.Boxes.LatestText.find(desk.Strings.Text(OwnText::PdfOfSheetsFailed)) != std::string::npos) {
+      throw std::runtime_error("the PDF of the sheet failed");
+    }
   }
 
   /// The parts of such a file lie in any order, its directory often last; so its length must be what the
