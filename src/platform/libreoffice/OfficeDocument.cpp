@@ -21,8 +21,11 @@
 #include <cppuhelper/implbase1.hxx>
 #include <filesystem>
 #include <rtl/ref.hxx>
+#include <string>
 #include <string_view>
 #include <utility>
+
+#include <unistd.h>
 
 #include "platform/libreoffice/OfficePicture.h"
 
@@ -51,6 +54,13 @@ Any FindBookmark(container::XNameAccess& bookmarks, const OUString& name) {
     }
     throw;
   }
+}
+
+/// A name in the folder of `path` that no other file has.
+std::string UnfinishedBeside(const std::string& path) {
+  static std::atomic<int> count = 0;
+  const std::string name = ".new-" + std::to_string(getpid()) + "-" + std::to_string(++count);
+  return std::filesystem::path(path).parent_path() / name;
 }
 
 /// A block of cells. `Texts` runs down each column in turn.
@@ -219,19 +229,26 @@ void OfficeDocument::ExportPdf(const std::string& path) {
   Store(path, "writer_pdf_Export");
 }
 
+// First under a name of its own: an old file stays until the new one is whole, and a lock that a killed
+// LibreOffice has left on it does not matter.
 void OfficeDocument::Store(const std::string& path, const char* filter) {
+  const std::string unfinished = UnfinishedBeside(path);
+  std::error_code failed;
   try {
     Uno::Call([&] {
       if (document_->hasControllersLocked()) {
         document_->unlockControllers();
       }
       const Reference<com::sun::star::frame::XStorable> storable(document_, UNO_QUERY_THROW);
-      storable->storeToURL(Uno::UrlOf(path),
+      storable->storeToURL(Uno::UrlOf(unfinished),
                            Uno::Properties({{"FilterName", Any(OUString::createFromAscii(filter))}}));
     });
+    std::filesystem::rename(unfinished, path, failed);
+    if (failed) {
+      throw RuntimeError(Fault::AutomationError, "Automation error: " + failed.message() + ": " + path);
+    }
   } catch (const RuntimeError&) {
-    std::error_code ignored;
-    std::filesystem::remove(path, ignored);
+    std::filesystem::remove(unfinished, failed);
     throw;
   }
 }

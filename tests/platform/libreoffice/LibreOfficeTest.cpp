@@ -241,8 +241,24 @@ TEST_F(Writer, WantsADocumentAsTemplate) {
 TEST_F(Writer, LeavesNoHalfFileWhereItCannotSave) {
   const auto document = Office().Add(Template);
   EXPECT_EQ(NumberThrownBy([&] { document->SaveAs("/proc/sheet.doc"); }), 440);
-  std::filesystem::create_directory(folder / "sheet.doc");
-  EXPECT_EQ(NumberThrownBy([&] { document->SaveAs(folder / "sheet.doc"); }), 440);
+  std::filesystem::create_directories(folder / "scores/sheet.doc");
+  EXPECT_EQ(NumberThrownBy([&] { document->SaveAs(folder / "scores/sheet.doc"); }), 440);
+  document->Close();
+  std::size_t files = 0;
+  for ([[maybe_unused]] const auto& entry : std::filesystem::directory_iterator(folder / "scores")) {
+    ++files;
+  }
+  EXPECT_EQ(files, 1U);
+}
+
+TEST_F(Writer, SavesWhereAKilledOneLeftItsLock) {
+  const auto document = Office().Add(Template);
+  for (const std::string name : {"sheet.doc", "sheet.pdf"}) {
+    WriteFile(folder / (".~lock." + name + "#"), ",operator,venue,20.05.2013 20:15,file:///tmp/profile;");
+    WriteFile(folder / name, "an old sheet");
+    name == "sheet.doc" ? document->SaveAs(folder / name) : document->ExportPdf(folder / name);
+    EXPECT_GT(ReadFile(folder / name).size(), 1000U);
+  }
   document->Close();
 }
 
