@@ -47,9 +47,10 @@ Spent Download(const sim::BaseUnit& unit, const std::string& logFolder = {}) {
   SerialPort& line = logged ? static_cast<SerialPort&>(*logged) : port;
   CommPort commPort(line, ini, device, boxes, strings, [] {});
   UploadProgress progress(strings, nullptr);
+  DownloadedGuns guns(game);
   const double processor = ProcessorSeconds(RUSAGE_SELF);
   const auto start = std::chrono::steady_clock::now();
-  BaseUnitDownload(line, commPort, events, boxes, clock, progress, game).GetScores();
+  BaseUnitDownload(line, commPort, events, boxes, clock, progress, guns).GetScores();
   return {Seconds(std::chrono::steady_clock::now() - start).count(),
           ProcessorSeconds(RUSAGE_SELF) - processor};
 }

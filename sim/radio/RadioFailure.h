@@ -36,13 +36,14 @@ enum class RadioFailure {
   LongData,
   LongPayload,
   LongAtResponse,
+  NextFrameBegins,
 };
 
 struct RadioFailureInfo : FailureInfo<RadioFailure> {
   std::optional<GunCommand> Concerned;  ///< the only command whose answers it strikes; none: all
 };
 
-inline constexpr std::array<RadioFailureInfo, 26> RadioFailures{{
+inline constexpr std::array<RadioFailureInfo, 27> RadioFailures{{
     {{RadioFailure::None, "none", FailurePlace::None, "faultless answers"}, std::nullopt},
     {{RadioFailure::SilentGun, "silent-gun", FailurePlace::Gun, "no answer at all"}, std::nullopt},
     {{RadioFailure::LostSize, "lost-size", FailurePlace::Gun, "no answer to command 1"}, GunCommand::Size},
@@ -96,6 +97,9 @@ inline constexpr std::array<RadioFailureInfo, 26> RadioFailures{{
      std::nullopt},
     {{RadioFailure::LongAtResponse, "long-at-response", FailurePlace::Gun,
       "an AT response with 30 value bytes before the answer"},
+     std::nullopt},
+    {{RadioFailure::NextFrameBegins, "next-frame-begins", FailurePlace::Gun,
+      "the answer, and at once the first 22 bytes of another of 24"},
      std::nullopt},
 }};
 static_assert(IsInOrder(RadioFailures));

@@ -54,6 +54,15 @@ Bytes AtResponse() {
   return EncodeModemFrame(body);
 }
 
+// What another gun says of 22,695 bytes of scores, cut off behind their number. The missing bytes let a
+// reader lose no more than the next answer.
+Bytes BeginningOfAnother() {
+  constexpr std::size_t missing = 2;
+  Bytes frame = EncodeReceivedFrame(0, Bytes{4, 32, 0, 0, 5, 1, 0, 89, Filler});
+  frame.resize(frame.size() - missing);
+  return frame;
+}
+
 LinePiece FirstHalf(const Bytes& frame, bool lineEndsBehind) {
   return {.Bytes = Bytes(frame.begin(), frame.begin() + static_cast<std::ptrdiff_t>(frame.size() / 2)),
           .LineEndsBehind = lineEndsBehind};
@@ -118,6 +127,11 @@ std::vector<LinePiece> SpoilFrame(RadioFailure failure, Bytes frame) {
       return {FirstHalf(frame, true)};
     case RadioFailure::LongAtResponse:
       return {{AtResponse()}, {frame}};
+    case RadioFailure::NextFrameBegins: {
+      const Bytes another = BeginningOfAnother();
+      frame.insert(frame.end(), another.begin(), another.end());
+      return {{frame}};
+    }
     default:
       return {{frame}};
   }

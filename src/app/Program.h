@@ -5,6 +5,7 @@
 
 #include "app/Composition.h"
 #include "app/frmRx.h"
+#include "ui/PlainToolTips.h"
 
 /// One run of the program with the real platform. Needs a QApplication.
 class Program : public QObject {
@@ -25,6 +26,7 @@ class Program : public QObject {
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
+  PlainToolTips toolTips_;
   Composition composition_;
   std::optional<frmRx> window_;
 };

@@ -1,9 +1,11 @@
 #pragma once
 
+#include <QSize>
 #include <optional>
 
 #include "platform/MessageBoxes.h"
 
+class QScreen;
 class QWidget;
 
 /// How the main window adapts to the screen at start-up. Sizes are in pixels.
@@ -35,6 +37,9 @@ constexpr ScreenFit FitToScreen(int screenWidth, int screenHeight) {
   return fit;
 }
 
-/// Fits the main window to its screen, whose size is in the screen's own pixels, and warns in a box if the
-/// screen is small.
+/// Size of a screen in its own pixels, not divided by the desktop's scale factor.
+QSize PixelsOf(const QScreen& screen);
+
+/// Fits the main window to its screen, and warns in a box if the screen has few pixels. The window is
+/// maximised where it is larger than the work area.
 void FitToScreen(QWidget& window, MessageBoxes& boxes);

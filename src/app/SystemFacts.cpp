@@ -5,12 +5,13 @@
 #include <QScreen>
 #include <QSysInfo>
 
+#include "app/ScreenFit.h"
 #include "app/Version.h"
 
 namespace {
 
 QString ScreenText(const QScreen& screen) {
-  const QSize pixels = screen.size() * screen.devicePixelRatio();
+  const QSize pixels = PixelsOf(screen);
   return QStringLiteral("Screen %1 x %2, scale %3")
       .arg(pixels.width())
       .arg(pixels.height())

@@ -1,5 +1,7 @@
 #include "app/UploadProgress.h"
 
+#include <QKeyEvent>
+
 #include "ui/Text.h"
 #include "ui_UploadProgress.h"
 
@@ -7,6 +9,9 @@ UploadProgress::UploadProgress(const StringTable& strings, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::UploadProgress>()) {
   ui_->setupUi(this);
   setWindowTitle(Text(strings, 172));
+  ui_->Stop->setText(Text(strings, OwnText::Stop));
+  // Else the next blank, meant for the button just pressed in the main window, would press Stop.
+  setAttribute(Qt::WA_ShowWithoutActivating);
 }
 
 UploadProgress::~UploadProgress() = default;
@@ -44,6 +49,12 @@ void UploadProgress::StartTransferAnim() {
 
 void UploadProgress::StopTransferAnim() {
   ui_->Animation1->Stop();
+}
+
+void UploadProgress::keyPressEvent(QKeyEvent* event) {
+  if (!event->matches(QKeySequence::Cancel)) {
+    QDialog::keyPressEvent(event);
+  }
 }
 
 void UploadProgress::reject() {

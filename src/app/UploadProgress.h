@@ -9,7 +9,8 @@ namespace Ui {
 class UploadProgress;
 }
 
-/// The small window shown during a download. Closing it ends the download.
+/// The small window shown during a download. Its Stop button and its close box end the download; Escape does
+/// not. It leaves the keyboard to the main window.
 class UploadProgress : public QDialog, public DownloadProgress {
   Q_OBJECT
 
@@ -27,6 +28,9 @@ class UploadProgress : public QDialog, public DownloadProgress {
   void StopTransferAnim();
 
   void reject() override;
+
+ protected:
+  void keyPressEvent(QKeyEvent* event) override;
 
  private:
   std::unique_ptr<Ui::UploadProgress> ui_;

@@ -2,6 +2,7 @@
 
 #include <QCloseEvent>
 #include <QHeaderView>
+#include <QLabel>
 #include <QSignalBlocker>
 #include <utility>
 #include <vector>
@@ -11,6 +12,7 @@
 #include "board/PlayerDelegate.h"
 #include "board/ScoreListModel.h"
 #include "core/data/FirstRun.h"
+#include "ui/Choice.h"
 #include "ui_frmRx.h"
 
 frmRx::frmRx(const Services& services)
@@ -20,8 +22,13 @@ frmRx::frmRx(const Services& services)
       subscription_(session_.Listen([this](SessionChange change) { Show(change); })),
       gameFile_(services.CommonDialog1, services.Disk, services.Boxes),
       wordProcessor_(services.WordProcessor),
+      downloadedGuns_(session_.Game()),
+      status_(new QLabel(this)),
       commands_(*this, services.Boxes) {
   ui_->setupUi(this);
+  status_->setObjectName(QStringLiteral("Status"));
+  status_->setTextFormat(Qt::PlainText);
+  ui_->StatusBar->addWidget(status_, 1);
 }
 
 frmRx::~frmRx() = default;
@@ -101,8 +108,8 @@ void frmRx::ConnectCommands() {
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
   connect(ui_->RemoteManageButton, &QPushButton::clicked, ui_->mnuRemoteManage, &QAction::trigger);
-  connect(ui_->ActiveMission, &QComboBox::currentIndexChanged, this,
-          [this](int index) { commands_.Run([this, index] { session_.SelectMission(index); }); });
+  OnChoice(*ui_->ActiveMission,
+           [this](int index) { commands_.Run([this, index] { session_.SelectMission(index); }); });
   connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this,
           [this](int section) { commands_.Run([this, section] { session_.SortByHeader(section + 1); }); });
   connect(ui_->ScoreDisplay, &QWidget::customContextMenuRequested, this,
@@ -131,6 +138,10 @@ void frmRx::closeEvent(QCloseEvent* event) {
 
 void frmRx::Show(SessionChange change) {
   switch (change) {
+    case SessionChange::Cleared:
+      downloadedGuns_.Settle();
+      ShowStatus({});
+      break;
     case SessionChange::Missions:
       ShowMissions();
       break;

@@ -13,8 +13,11 @@
 #include "core/game/Session.h"
 #include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
+#include "devices/baseunit/BaseUnitDownload.h"
 #include "sheets/PrintOptions.h"
 #include "ui/Commands.h"
+
+class QLabel;
 
 namespace Ui {
 class frmRx;
@@ -49,6 +52,10 @@ class frmRx : public QMainWindow {
   void SaveGame();
   void ClearGame();
   void GetScoreData();
+  /// Says on the status line what a download left undone.
+  void Show(const DownloadResult& result);
+  /// Shows a text on the status line; without one there is no such line.
+  void ShowStatus(const QString& text);
   /// Tracks the word processor until it is ready. If it is missing, says so once and continues without
   /// printing.
   void FollowWordProcessor();
@@ -83,8 +90,11 @@ class frmRx : public QMainWindow {
   std::string userDataFolder_;
   std::optional<IniReader> ini_;
   std::optional<CommPort> commPort_;
+  DownloadedGuns downloadedGuns_;
+  bool downloading_ = false;                    ///< a score download is on the stack
   int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again
   QTimer wordProcessorTimer_;
+  QLabel* status_;  ///< text of the status line
   Commands commands_;
 };

@@ -2,6 +2,9 @@
 
 #include "app/frmRx.h"
 
+#include <QAccessible>
+#include <QLabel>
+#include <QScopeGuard>
 #include <algorithm>
 #include <string>
 #include <utility>
@@ -13,6 +16,7 @@
 #include "board/MissionResultEntry.h"
 #include "board/PlayerDetails.h"
 #include "core/data/FieldValue.h"
+#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 #include "devices/baseunit/BaseUnitDownload.h"
 #include "devices/radio/RemoteManage.h"
@@ -51,13 +55,40 @@ void frmRx::ClearGame() {
 }
 
 void frmRx::GetScoreData() {
+  if (downloading_) {
+    return;
+  }
+  ShowStatus({});
   {
+    downloading_ = true;
+    const auto ended = qScopeGuard([this] { downloading_ = false; });
     UploadProgress progress(services_.Strings, this);
-    BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time,
-                     progress, session_.Game())
-        .GetScores();
+    Show(BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time,
+                          progress, downloadedGuns_)
+             .GetScores());
   }
   session_.CalculateScores();
+}
+
+void frmRx::Show(const DownloadResult& result) {
+  if (result.End == DownloadEnd::Complete) {
+    return;
+  }
+  const bool stopped = result.End == DownloadEnd::Stopped;
+  const OwnText text = result.Received > 0
+                           ? (stopped ? OwnText::DownloadStopped : OwnText::DownloadIncomplete)
+                           : (stopped ? OwnText::DownloadStoppedEmpty : OwnText::DownloadFailed);
+  ShowStatus(QString::fromStdString(Filled(
+      services_.Strings.Text(text), {std::to_string(result.Received), std::to_string(result.Expected)})));
+}
+
+void frmRx::ShowStatus(const QString& text) {
+  status_->setText(text);
+  ui_->StatusBar->setVisible(!text.isEmpty());
+  if (!text.isEmpty()) {
+    QAccessibleEvent told(status_, QAccessible::Alert);
+    QAccessible::updateAccessibility(&told);
+  }
 }
 
 void frmRx::FollowWordProcessor() {

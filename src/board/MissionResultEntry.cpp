@@ -1,6 +1,7 @@
 #include "board/MissionResultEntry.h"
 
 #include <QEvent>
+#include <QKeyEvent>
 #include <string>
 
 #include "core/data/FieldValue.h"
@@ -70,6 +71,14 @@ void MissionResultEntry::ShowObjectives(MissionList& missions) {
     sets_[static_cast<std::size_t>(k)].PrimaryCompleted->setToolTip(objective("PrimaryObjectiveDescription"));
     sets_[static_cast<std::size_t>(k)].SecondaryCompleted->setToolTip(
         objective("SecondaryObjectiveDescription"));
+  }
+}
+
+void MissionResultEntry::keyPressEvent(QKeyEvent* event) {
+  if (event->matches(QKeySequence::Cancel)) {
+    ui_->OK->click();
+  } else {
+    QDialog::keyPressEvent(event);
   }
 }
 

@@ -15,7 +15,8 @@ namespace Ui {
 class MissionResultEntry;
 }
 
-/// Asks which team played each objective set of the active mission, and what was completed.
+/// Asks which team played each objective set of the active mission, and what was completed. OK and Escape
+/// store that, the close box does not.
 class MissionResultEntry : public QDialog {
   Q_OBJECT
 
@@ -25,6 +26,7 @@ class MissionResultEntry : public QDialog {
   ~MissionResultEntry() override;
 
  protected:
+  void keyPressEvent(QKeyEvent* event) override;
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:

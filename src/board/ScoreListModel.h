@@ -29,6 +29,6 @@ class ScoreListModel : public QAbstractTableModel {
   const BoardList kind_;
   const Board& list_;
   BoardTexts texts_;
-  int shownRows_ = 0;  ///< rows that the views know of; the list may be half rebuilt when they ask
+  int shownRows_ = 0;  ///< rows that the views know of; they hear of others by a reset
   Subscription subscription_;
 };

@@ -6,6 +6,7 @@
 #include <QPainter>
 #include <QPixmap>
 #include <QProxyStyle>
+#include <QScrollBar>
 #include <algorithm>
 #include <utility>
 
@@ -19,6 +20,41 @@ class CellMargin : public QProxyStyle {
     return metric == PM_FocusFrameHMargin ? sideMargin : QProxyStyle::pixelMetric(metric, option, widget);
   }
 };
+
+/// Sizes of the captions, relative to the figures.
+constexpr double LargestCaptions = 0.8;
+constexpr double SmallestCaptions = 0.6;
+
+QFont CaptionFont(QFont font, double size) {
+  font.setPointSizeF(font.pointSizeF() * size);
+  font.setBold(true);
+  return font;
+}
+
+/// Divides `width` among columns by their `shares`. A column whose share is less than it needs gets that at
+/// the cost of the others; if all together need more, so does the list.
+std::vector<int> ColumnWidths(int width, const std::vector<double>& shares, const std::vector<int>& needed) {
+  std::vector<int> widths = needed;
+  std::vector<bool> getsShare(shares.size(), true);
+  for (bool settled = false; !settled;) {
+    settled = true;
+    double rest = width;
+    double restShares = 0;
+    for (std::size_t i = 0; i < shares.size(); ++i) {
+      rest -= getsShare[i] ? 0 : needed[i];
+      restShares += getsShare[i] ? shares[i] : 0;
+    }
+    for (std::size_t i = 0; i < shares.size(); ++i) {
+      if (getsShare[i]) {
+        const int share = static_cast<int>(rest * shares[i] / restShares);
+        getsShare[i] = share >= needed[i];
+        settled = settled && getsShare[i];
+        widths[i] = std::max(share, needed[i]);
+      }
+    }
+  }
+  return widths;
+}
 
 }  // namespace
 
@@ -40,10 +76,7 @@ ScoreListView::ScoreListView(QWidget* parent) : QTableView(parent) {
   verticalHeader()->hide();
   verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
   verticalHeader()->setDefaultSectionSize(fontMetrics().height() + 12);
-  QFont captions = font();
-  captions.setPointSizeF(captions.pointSizeF() * 0.8);
-  captions.setBold(true);
-  horizontalHeader()->setFont(captions);
+  horizontalHeader()->setFont(CaptionFont(font(), LargestCaptions));
   horizontalHeader()->setHighlightSections(false);
   horizontalHeader()->setMinimumSectionSize(40);
   horizontalHeader()->setStretchLastSection(true);
@@ -57,6 +90,16 @@ void ScoreListView::SetColumnShares(std::vector<double> shares) {
 int ScoreListView::HeightForRows(int rows) const {
   return horizontalHeader()->sizeHint().height() + rows * verticalHeader()->defaultSectionSize() +
          2 * frameWidth();
+}
+
+void ScoreListView::reset() {
+  QTableView::reset();
+  for (int column = 0; column < ColumnCount(); ++column) {
+    if (columnWidth(column) < NeededWidth(column)) {
+      ShareWidth();
+      return;
+    }
+  }
 }
 
 void ScoreListView::resizeEvent(QResizeEvent* event) {
@@ -94,8 +137,46 @@ void ScoreListView::keyPressEvent(QKeyEvent* event) {
   QTableView::keyPressEvent(event);
 }
 
+int ScoreListView::NeededWidth(int column) const {
+  return std::max(horizontalHeader()->sectionSizeHint(column), sizeHintForColumn(column));
+}
+
 void ScoreListView::ShareWidth() {
-  for (std::size_t column = 0; column < shares_.size(); ++column) {
-    setColumnWidth(static_cast<int>(column), static_cast<int>(viewport()->width() * shares_[column]));
+  FitCaptions();
+  std::vector<int> needed;
+  for (int column = 0; column < ColumnCount(); ++column) {
+    needed.push_back(NeededWidth(column));
   }
+  const std::vector<int> widths = ColumnWidths(viewport()->width(), shares_, needed);
+  for (int column = 0; column < ColumnCount(); ++column) {
+    setColumnWidth(column, widths[static_cast<std::size_t>(column)]);
+  }
+}
+
+// The room does not depend on whether the scroll bar is shown: other captions may change that.
+void ScoreListView::FitCaptions() {
+  constexpr double step = 0.05;
+  const int room = width() - 2 * frameWidth() - verticalScrollBar()->sizeHint().width();
+  double size = LargestCaptions;
+  while (size > SmallestCaptions && !CaptionsFit(CaptionFont(font(), size), room)) {
+    size -= step;
+  }
+  const QFont captions = CaptionFont(font(), size);
+  if (captions != horizontalHeader()->font()) {
+    horizontalHeader()->setFont(captions);
+  }
+}
+
+bool ScoreListView::CaptionsFit(const QFont& captions, int room) const {
+  const QFontMetrics now = horizontalHeader()->fontMetrics();
+  const QFontMetrics then(captions);
+  for (int column = 0; column < ColumnCount(); ++column) {
+    const QString caption = model()->headerData(column, Qt::Horizontal).toString();
+    const int width = horizontalHeader()->sectionSizeHint(column) - now.horizontalAdvance(caption) +
+                      then.horizontalAdvance(caption);
+    if (width > static_cast<int>(room * shares_[static_cast<std::size_t>(column)])) {
+      return false;
+    }
+  }
+  return true;
 }

@@ -3,9 +3,9 @@
 #include <QTableView>
 #include <vector>
 
-/// A score list on the screen: whole rows, large figures, columns that keep their share of the width. When
-/// the Tab key reaches it with nothing selected, it selects its current row, so that keyboard commands have a
-/// row to act on.
+/// A score list on the screen: whole rows, large figures, columns that keep their share of the width as long
+/// as their contents fit. When the Tab key reaches it with nothing selected, it selects its current row, so
+/// that keyboard commands have a row to act on.
 class ScoreListView : public QTableView {
   Q_OBJECT
 
@@ -18,6 +18,8 @@ class ScoreListView : public QTableView {
   /// Height that shows `rows` rows and the header without scrolling, in pixels.
   int HeightForRows(int rows) const;
 
+  void reset() override;
+
  protected:
   void resizeEvent(QResizeEvent* event) override;
   void paintEvent(QPaintEvent* event) override;
@@ -25,7 +27,14 @@ class ScoreListView : public QTableView {
   void keyPressEvent(QKeyEvent* event) override;
 
  private:
+  int ColumnCount() const { return static_cast<int>(shares_.size()); }
   void ShareWidth();
+  /// Makes the captions smaller where they do not fit into their shares.
+  void FitCaptions();
+  /// True if captions in this font fit into their shares of `room` pixels.
+  bool CaptionsFit(const QFont& captions, int room) const;
+  /// Width at which nothing in the column is cut, its header included.
+  int NeededWidth(int column) const;
 
   std::vector<double> shares_;
 };

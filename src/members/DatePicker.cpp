@@ -7,8 +7,10 @@
 #include <QKeyEvent>
 #include <QLocale>
 #include <QPainter>
+#include <QScreen>
 #include <QSignalBlocker>
 #include <QVBoxLayout>
+#include <algorithm>
 
 #include "platform/qt/QtClock.h"
 
@@ -71,9 +73,7 @@ void DatePicker::ShowStored() {
 // While the operator types, the text may be a different date ("1961-02-3") or no date at all; in the latter
 // case the last finished date counts.
 void DatePicker::TakeText(const QString& text) {
-  // A two-digit year is taken from the last hundred years, since birthdates are not in the future.
-  const QDate earliest = QDate::currentDate().addYears(-100).addDays(1);
-  const QDate date = DateIn(QLocale::system(), text.trimmed(), earliest);
+  const QDate date = DateIn(QLocale::system(), text.trimmed());
   if (text.trimmed().isEmpty()) {
     stored_.clear();
   } else if (date.isValid()) {
@@ -102,6 +102,16 @@ void DatePicker::focusOutEvent(QFocusEvent* event) {
   }
 }
 
+QPoint DatePicker::PlaceOfCalendar(const QSize& calendar) const {
+  const QRect area = screen()->availableGeometry();
+  QPoint place = mapToGlobal(QPoint(0, height()));
+  if (place.y() + calendar.height() > area.bottom()) {
+    place.setY(mapToGlobal(QPoint(0, 0)).y() - calendar.height());
+  }
+  place.setX(std::min(place.x(), area.right() - calendar.width()));
+  return {std::max(place.x(), area.left()), std::max(place.y(), area.top())};
+}
+
 void DatePicker::OpenCalendar() {
   auto* popup = new QFrame(this, Qt::Popup);
   popup->setAttribute(Qt::WA_DeleteOnClose);
@@ -119,7 +129,9 @@ void DatePicker::OpenCalendar() {
   };
   connect(calendar, &QCalendarWidget::clicked, this, take);
   connect(calendar, &QCalendarWidget::activated, this, take);
-  popup->move(mapToGlobal(QPoint(0, height())));
+  popup->adjustSize();
+  popup->move(PlaceOfCalendar(popup->size()));
   popup->show();
+  popup->move(PlaceOfCalendar(popup->size()));  // some pixels larger now
   calendar->setFocus();
 }

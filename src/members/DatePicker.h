@@ -4,8 +4,8 @@
 #include <string>
 
 /// An entry for an optional date, with a calendar that its icon or Alt+Down opens. Shows the system's short
-/// date format with a four-digit year; accepts that format, also with a two-digit year, and year-month-day.
-/// When the focus leaves, a text that is not a date is replaced by the last valid one.
+/// date format with a four-digit year; accepts that format, also with a two-digit year (1930 to 2029), and
+/// year-month-day. When the focus leaves, a text that is not a date is replaced by the last valid one.
 class DatePicker : public QLineEdit {
   Q_OBJECT
 
@@ -30,6 +30,8 @@ class DatePicker : public QLineEdit {
   void Finish();
   void TakeDate(QDate date);
   void ShowStored();
+  /// Below the entry, or above it where the screen ends.
+  QPoint PlaceOfCalendar(const QSize& calendar) const;
   void OpenCalendar();
 
   std::string stored_;

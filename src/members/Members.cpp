@@ -5,6 +5,7 @@
 #include <QKeyEvent>
 #include <QLocale>
 #include <QTimer>
+#include <initializer_list>
 #include <utility>
 
 #include "core/data/FieldValue.h"
@@ -40,6 +41,11 @@ QString AccuracyText(double accuracy) {
   return accuracy == 0 ? QStringLiteral("N/A") : QString::fromStdString(FormatPercent(accuracy));
 }
 
+/// Gives a display room for `text`: what it shows later must not change the layout.
+void ReserveRoom(QLabel& display, const QString& text) {
+  display.setMinimumWidth(display.fontMetrics().horizontalAdvance(text));
+}
+
 void Show(QLineEdit& entry, const std::string& text) {
   entry.setText(QString::fromStdString(text));
   entry.setCursorPosition(0);
@@ -54,9 +60,9 @@ Members::Members(Parts parts, QWidget* parent)
       commands_(*this, parts_.Boxes) {
   ui_->setupUi(this);
   ui_->Dummy->hide();
-  ui_->ChangeID->setEnabled(parts_.ButtonSwipe != nullptr);
   ui_->SearchText->installEventFilter(this);
   SetCaptions();
+  ReserveRoomForFigures();
   BoundControls& controls = *this;
   data1_.emplace(parts_.DbMembers, controls);
   ConnectCommands();
@@ -81,6 +87,20 @@ void Members::SetCaptions() {
   }
 }
 
+void Members::ReserveRoomForFigures() {
+  ReserveRoom(*ui_->MemberIDDisplay, QStringLiteral("DDDDDDDDDDDDDDDD"));
+  for (QLabel* display : {ui_->DateJoinedDisplay, ui_->LastPlayedDisplay}) {
+    ReserveRoom(*display, DateText("2028-09-28 20:58:58") + QStringLiteral("  "));
+  }
+  for (QLabel* display : {ui_->TotalDamageDisplay, ui_->AverageDamageDisplay, ui_->TotalSoldieringDisplay,
+                          ui_->AverageSoldieringDisplay}) {
+    ReserveRoom(*display, QStringLiteral("-1234567.25"));
+  }
+  for (QLabel* display : {ui_->PrimaryAccuracyDisplay, ui_->SecondaryAccuracyDisplay}) {
+    ReserveRoom(*display, QStringLiteral("100.00%"));
+  }
+}
+
 void Members::ConnectCommands() {
   commands_.Connect(*this, {
                                {ui_->Search, &Members::RunSearch},
@@ -97,6 +117,7 @@ void Members::ConnectCommands() {
                                  {ui_->DataNext, &MemberCursor::MoveNext},
                                  {ui_->DataLast, &MemberCursor::MoveLast},
                              });
+  commands_.EscapePresses(*ui_->OK);
 }
 
 void Members::RunInFocusChange(const std::function<void()>& command) {
@@ -120,15 +141,24 @@ void Members::Activate() {
   RunClearSearch();
   if (ContactToShow != 0) {
     data1_->WalkTo(ContactToShow);
-    // The search box must not get the focus: leaving it would go back to the first member.
-    QWidget* const focus = data1_->HasRow() ? static_cast<QWidget*>(ui_->FirstNameEntry) : ui_->DataPrevious;
-    focus->setFocus();
+    // No entry gets the focus: a stray key would change the name, and leaving the search box would go back to
+    // the first member.
+    setFocus();
   } else {
     ui_->SearchText->setFocus();
   }
 }
 
-// Called by Escape and the close box.
+// From the window itself the Tab key goes to the member in view, past the search box.
+bool Members::focusNextPrevChild(bool next) {
+  if (next && focusWidget() == this && ui_->FirstNameEntry->isEnabled()) {
+    ui_->FirstNameEntry->setFocus(Qt::TabFocusReason);
+    return true;
+  }
+  return QDialog::focusNextPrevChild(next);
+}
+
+// Called by the close box.
 void Members::reject() {
   commands_.Run([this] { RunClearSearch(); });
   QDialog::reject();
@@ -180,7 +210,7 @@ void Members::ShowRow(Recordset& rows) {
   ui_->Dummy->setText(QString::fromStdString(TextOf(rows.Fields("ContactID"))));
   ui_->DateJoinedDisplay->setText(DateText(TextOf(rows.Fields("DateJoined"))));
   ui_->LastPlayedDisplay->setText(DateText(TextOf(rows.Fields("LastPlayedDate"))));
-  SetEntriesEnabled(true);
+  SetRowEnabled(true);
 }
 
 void Members::ShowNoRow() {
@@ -195,13 +225,15 @@ void Members::ShowNoRow() {
                           ui_->TotalSoldieringDisplay, ui_->AverageSoldieringDisplay, ui_->Dummy}) {
     display->clear();
   }
-  SetEntriesEnabled(false);
+  SetRowEnabled(false);
 }
 
-void Members::SetEntriesEnabled(bool enabled) {
-  for (QGroupBox* frame : {ui_->NameFrame, ui_->PersonalDetails, ui_->ContactDetails}) {
-    frame->setEnabled(enabled);
+void Members::SetRowEnabled(bool enabled) {
+  for (QWidget* control : std::initializer_list<QWidget*>{
+           ui_->NameFrame, ui_->PersonalDetails, ui_->ContactDetails, ui_->ChangePicture, ui_->Delete}) {
+    control->setEnabled(enabled);
   }
+  ui_->ChangeID->setEnabled(enabled && parts_.ButtonSwipe != nullptr);
 }
 
 MemberDetails Members::Entered() const {
@@ -285,9 +317,6 @@ void Members::ChangeMemberId() {
 }
 
 void Members::ChangeMemberPicture() {
-  if (!data1_->HasRow()) {
-    throw RuntimeError(Fault::NoCurrentRecord);
-  }
   data1_->WriteBack();
   const std::optional<std::string> file =
       parts_.CommonDialog1.ShowOpen({.Filter = "Photo Files(*.bmp,*.jpg,*.gif)|*.bmp;*.jpg;*.gif"});

@@ -50,6 +50,7 @@ class Members : public QDialog, private BoundControls {
 
  protected:
   void showEvent(QShowEvent* event) override;
+  bool focusNextPrevChild(bool next) override;
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
@@ -59,11 +60,13 @@ class Members : public QDialog, private BoundControls {
   void RowChanged() override;
 
   void SetCaptions();
+  void ReserveRoomForFigures();
   void ConnectCommands();
   /// Runs a command, but reports a failure only after the current event: a box must not open during a focus
   /// change.
   void RunInFocusChange(const std::function<void()>& command);
-  void SetEntriesEnabled(bool enabled);
+  /// Enables what needs a current row.
+  void SetRowEnabled(bool enabled);
   void ShowPlace();
   void ShowMemberExtras();
   void ReadPhoto();

@@ -3,32 +3,14 @@
 #include <QBuffer>
 #include <QImageReader>
 #include <QPainter>
-#include <QtEndian>
 #include <algorithm>
-#include <string_view>
+
+#include "members/PictureEnd.h"
 
 namespace {
 
 /// Larger photos are scaled down while being read, which takes a fraction of the time and memory.
 constexpr QSize LargestPicture(1600, 1600);
-
-/// True if the end of the picture is missing. Only for the formats in which Qt does not notice this itself.
-bool IsCutShort(std::string_view bytes, const QByteArray& format) {
-  using namespace std::string_view_literals;
-  if (format == "jpeg") {
-    const auto scan = bytes.rfind("\xFF\xDA"sv);
-    return scan == std::string_view::npos || bytes.find("\xFF\xD9"sv, scan) == std::string_view::npos;
-  }
-  if (format == "gif") {
-    return bytes.find("\x00\x3B"sv) == std::string_view::npos;
-  }
-  if (format == "bmp") {
-    constexpr std::size_t sizeAt = 2;
-    return bytes.size() < sizeAt + sizeof(quint32) ||
-           qFromLittleEndian<quint32>(bytes.data() + sizeAt) > bytes.size();
-  }
-  return false;
-}
 
 /// Draws a head and shoulders in place of a missing photo.
 void DrawSilhouette(QPainter& painter, const QRect& place, const QColor& colour) {
@@ -56,7 +38,8 @@ void PictureBox::Load(const std::string& bytes) {
   if (size.width() > LargestPicture.width() || size.height() > LargestPicture.height()) {
     reader.setScaledSize(size.scaled(LargestPicture, Qt::KeepAspectRatio));
   }
-  const bool isWhole = reader.canRead() && !IsCutShort(bytes, reader.format());
+  // In some formats Qt does not notice itself that the end is missing.
+  const bool isWhole = reader.canRead() && !IsCutShort(bytes, reader.format().toStdString());
   picture_ = isWhole ? reader.read() : QImage();
   update();
 }

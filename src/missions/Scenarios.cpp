@@ -3,6 +3,9 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QSignalBlocker>
+#include <QTextDocument>
+#include <memory>
+#include <vector>
 
 #include "core/data/FieldValue.h"
 #include "core/data/Rows.h"
@@ -14,9 +17,14 @@
 
 namespace {
 
-/// The text with CR LF line breaks, as missions have always been stored.
+/// The text with CR LF line breaks, as missions have always been stored. Not from toPlainText, which turns
+/// no-break spaces into blanks.
 std::string TextIn(const QPlainTextEdit& box) {
-  return box.toPlainText().replace(QLatin1Char('\n'), QStringLiteral("\r\n")).toStdString();
+  QString text = box.document()->toRawText();
+  for (const QChar lineBreak : {QChar(QChar::ParagraphSeparator), QChar(QChar::LineSeparator)}) {
+    text.replace(lineBreak, QStringLiteral("\r\n"));
+  }
+  return text.toStdString();
 }
 
 void Show(QPlainTextEdit& box, const std::string& text) {
@@ -107,6 +115,7 @@ void Scenarios::ConnectCommands() {
                                {ui_->Delete, &Scenarios::DeleteMission},
                                {ui_->SelectExit, &Scenarios::SelectExit},
                            });
+  commands_.EscapePresses(*ui_->SelectExit);
   const auto show = [this] { commands_.Run([this] { ShowSelectedMission(); }); };
   connect(ui_->MissionSelection1, &QListWidget::currentRowChanged, this, show);
   // A click on the entry that is already current also shows its mission again, discarding unsaved changes.
@@ -116,17 +125,23 @@ void Scenarios::ConnectCommands() {
 }
 
 void Scenarios::LoadMissionList() {
+  // The old entries stay if the rows cannot be read. Besides, setData on an item in a list searches the whole
+  // list for it.
+  std::vector<std::unique_ptr<QListWidgetItem>> entries;
+  {
+    const ReadScope scope(dbScenarios_);
+    ForEachRow(rsScenarios_, [this, &entries] {
+      const QString name = QString::fromStdString(TextOf(rsScenarios_.Fields("MissionName")));
+      const std::int32_t id = RoundToInt32(NumberOf(rsScenarios_.Fields("ID")));
+      entries.push_back(std::make_unique<QListWidgetItem>(name));
+      entries.back()->setData(Qt::UserRole, id);
+    });
+  }
   const QSignalBlocker blocker(ui_->MissionSelection1);
-  const ReadScope scope(dbScenarios_);
   ui_->MissionSelection1->clear();
-  ForEachRow(rsScenarios_, [this] {
-    const QString name = QString::fromStdString(TextOf(rsScenarios_.Fields("MissionName")));
-    const std::int32_t id = RoundToInt32(NumberOf(rsScenarios_.Fields("ID")));
-    // Added to the list last: setData on an item in a list searches the whole list for it.
-    auto entry = std::make_unique<QListWidgetItem>(name);
-    entry->setData(Qt::UserRole, id);
+  for (std::unique_ptr<QListWidgetItem>& entry : entries) {
     ui_->MissionSelection1->addItem(entry.release());
-  });
+  }
 }
 
 void Scenarios::SelectMission(int entry) {
@@ -292,7 +307,6 @@ void Scenarios::SaveRow() {
 void Scenarios::StartRow() {
   if (isNewRecord_) {
     rsScenarios_.AddNew();
-    isNewRecord_ = false;
   } else if (rsScenarios_.EditMode() != EditMode::Add) {
     // After a failed insertion the new row is still pending. Any other save goes to the row selected in the
     // list.

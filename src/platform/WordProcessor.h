@@ -22,7 +22,8 @@ class WordDocument {
   /// the table is missing (even with nothing to write) or a cell is missing.
   virtual void WriteCells(int table, int firstRow, int rows, const std::vector<std::string>& texts) = 0;
 
-  /// Inserts the picture in `file` into a cell, scaled to the cell's width. Throws if it is not a picture.
+  /// Inserts the picture in `file` into a cell: in its own size (96 dots per inch if it tells none), made
+  /// smaller if the cell or the page has no room for that. Throws if it is not a picture.
   virtual void AddPicture(int table, int row, int column, const std::string& file) = 0;
 
   /// Writes the document to `path` in Word's binary format, replacing any file there. A failure leaves no

@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "core/data/Photo.h"
+#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 #include "sheets/SheetTexts.h"
@@ -73,11 +74,7 @@ void ScoreSheets::GenerateScoreSheets() {
     closing = true;
   }
   in_.Progress.Close();
-  for (const std::string& page : pages_) {
-    if (in_.Disk.FileExists(page)) {
-      in_.Disk.Delete(page);
-    }
-  }
+  DeletePages();
   if (closing) {
     return;
   }
@@ -85,11 +82,32 @@ void ScoreSheets::GenerateScoreSheets() {
     in_.Boxes.Show(failure->Text, failure->Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
     return;
   }
-  std::string text = in_.Strings.Text(130);
-  if (choice_.OutputTarget == OutputTarget::Files) {
-    text += " Files saved to " + in_.UserDataFolder + "/Scores.";
+  in_.Boxes.Show(ClosingText(), in_.Strings.Text(131), BoxIcon::Information);
+}
+
+void ScoreSheets::DeletePages() {
+  for (const std::string& page : pages_) {
+    try {
+      in_.Disk.Delete(page);
+    } catch (const RuntimeError&) {
+      // The sheets are complete without it, and the system empties its temporary folder.
+      continue;
+    }
   }
-  in_.Boxes.Show(text, in_.Strings.Text(131), BoxIcon::Information);
+}
+
+std::string ScoreSheets::ClosingText() const {
+  const bool stopped = made_ < chosen_;
+  std::string text = stopped ? Filled(in_.Strings.Text(OwnText::PrintingStopped),
+                                      {std::to_string(made_), std::to_string(chosen_)})
+                             : in_.Strings.Text(130);
+  if (choice_.OutputTarget == OutputTarget::Files && (made_ > 0 || !stopped)) {
+    text += " Files saved to " + folder_ + ".";
+  }
+  if (pdfFailed_) {
+    text += "\n\n" + in_.Strings.Text(OwnText::PdfOfSheetsFailed);
+  }
+  return text;
 }
 
 bool ScoreSheets::IsChosen(int index) const {
@@ -124,14 +142,18 @@ void ScoreSheets::MakeSheets() {
   if (chosen.empty()) {
     return;
   }
+  chosen_ = static_cast<int>(chosen.size());
   in_.Progress.Open();
   Stage("Could not locate score template file.", [this] { StartWordProcessor(); });
-  const int count = static_cast<int>(chosen.size());
-  for (int number = 1; number <= count && !in_.Progress.Stopped(); ++number) {
-    MakeSheet(chosen[static_cast<std::size_t>(number) - 1], number, count);
+  for (const int index : chosen) {
+    if (in_.Progress.Stopped()) {
+      break;
+    }
+    MakeSheet(index);
+    ++made_;
   }
   if (!pages_.empty()) {
-    Stage("Error occured during file saving.", [this] { JoinSheets(); });
+    TryPdf([this] { JoinSheets(); });
   }
 }
 
@@ -146,13 +168,13 @@ void ScoreSheets::StartWordProcessor() {
   }
 }
 
-void ScoreSheets::MakeSheet(int index, int number, int count) {
+void ScoreSheets::MakeSheet(int index) {
   std::unique_ptr<WordDocument> document;
   Stage("Could not locate score template file.",
         [&] { document = in_.WordApp.Add(in_.UserDataFolder + "/score_card.doc"); });
   ServeEvents();
   Stage(in_.Strings.Text(132), in_.Strings.Text(133), [&] {
-    FillPlayer(*document, index, number, count);
+    FillPlayer(*document, index);
     FillGame(*document, index);
   });
   Save(*document);
@@ -165,7 +187,7 @@ void ScoreSheets::MakeSheet(int index, int number, int count) {
   ServeEvents();
 }
 
-void ScoreSheets::FillPlayer(WordDocument& document, int index, int number, int count) {
+void ScoreSheets::FillPlayer(WordDocument& document, int index) {
   Write(document, ResultTexts(in_.Game, index, winner_));
   const std::int32_t contactId = in_.Game.Players(index).MemberIndex;
   const std::optional<Member> member = contactId == 0 ? std::nullopt : in_.Members.LoadMember(contactId);
@@ -176,7 +198,7 @@ void ScoreSheets::FillPlayer(WordDocument& document, int index, int number, int 
   const std::string player =
       in_.Game.TeamNames(TeamFromId(id)) + Str(std::int32_t{PlayerNumberFromId(id)}) + "-" + name;
   sheetName_ = player + "-" + sheetDate_ + "-" + in_.MissionName;
-  in_.Progress.ShowSheet(number, count, player);
+  in_.Progress.ShowSheet(made_ + 1, chosen_, player);
   ServeEvents();
   Write(document, texts);
   if (member) {
@@ -224,12 +246,25 @@ void ScoreSheets::Save(WordDocument& document) {
   Stage("Error occured during file saving.", [&] {
     document.SaveAs(FreeName(sheetName_, ".doc"));
     ServeEvents();
-    if (choice_.OutputTarget == OutputTarget::Files) {
+  });
+  if (choice_.OutputTarget == OutputTarget::Files) {
+    TryPdf([&] {
       pages_.push_back(in_.Disk.MakeTempFileName());
       document.ExportPdf(pages_.back());
       ServeEvents();
-    }
-  });
+    });
+  }
+}
+
+void ScoreSheets::TryPdf(const std::function<void()>& step) {
+  if (pdfFailed_) {
+    return;
+  }
+  try {
+    step();
+  } catch (const RuntimeError&) {
+    pdfFailed_ = true;  // the closing box tells it
+  }
 }
 
 std::string ScoreSheets::FreeName(const std::string& base, const std::string& extension) const {

@@ -35,28 +35,34 @@ struct SheetParts {
 
 /// Makes one document for each chosen player from the template `score_card.doc` and saves it in the folder
 /// `scores`. Output to the printer also prints each document; output to files also leaves all sheets of the
-/// run in one PDF.
+/// run in one PDF, if that succeeds.
 class ScoreSheets {
  public:
   ScoreSheets(const SheetParts& parts, const PrintChoice& choice);
 
-  /// Runs to the end or to the first failure, either of which a box reports, or until the program closes,
-  /// without a box. Events are processed throughout. Finished sheets are kept in every case.
+  /// Runs to the end, until the operator stops it or to the first failure, each of which a box reports, or
+  /// until the program closes, without a box. Events are processed throughout. Finished sheets are kept in
+  /// every case.
   void GenerateScoreSheets();
 
  private:
   bool IsChosen(int index) const;
   std::vector<int> ChosenPlayers() const;
   void MakeSheets();
-  void MakeSheet(int index, int number, int count);
+  void MakeSheet(int index);
   void StartWordProcessor();
-  void FillPlayer(WordDocument& document, int index, int number, int count);
+  void FillPlayer(WordDocument& document, int index);
   void AddPhoto(WordDocument& document, const Member& member);
   void FillGame(WordDocument& document, int index);
   void Save(WordDocument& document);
   /// An unused path in the folder of sheets: `base` and the extension, with a number in between if needed.
   std::string FreeName(const std::string& base, const std::string& extension) const;
   void JoinSheets();
+  /// Runs one step towards the PDF of all sheets. A failure gives up the PDF, but not the run.
+  void TryPdf(const std::function<void()>& step);
+  void DeletePages();
+  /// What the box after a run without a failure says.
+  std::string ClosingText() const;
   void Write(WordDocument& document, const std::vector<std::pair<const char*, std::string>>& texts);
   /// Processes events. Ends the run if the program is closing.
   void ServeEvents();
@@ -67,5 +73,8 @@ class ScoreSheets {
   int winner_ = 0;
   std::string sheetDate_;
   std::string sheetName_;           ///< of the current sheet
+  int chosen_ = 0;                  ///< sheets to make
+  int made_ = 0;                    ///< sheets that are finished
+  bool pdfFailed_ = false;          ///< there will be no PDF of all sheets
   std::vector<std::string> pages_;  ///< each sheet of the run as PDF, in temporary files
 };

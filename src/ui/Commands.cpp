@@ -80,6 +80,10 @@ bool Commands::eventFilter(QObject* watched, QEvent* event) {
     }
   }
   if (watched == &window_ && event->type() == QEvent::KeyPress) {
+    if (escapeButton_ && static_cast<QKeyEvent*>(event)->matches(QKeySequence::Cancel)) {
+      PressByEscape();
+      return true;
+    }
     const int key = static_cast<QKeyEvent*>(event)->key();
     if (key == Qt::Key_Return || key == Qt::Key_Enter) {
       QAbstractButton* const button = DefaultButton();
@@ -87,6 +91,16 @@ bool Commands::eventFilter(QObject* watched, QEvent* event) {
     }
   }
   return QObject::eventFilter(watched, event);
+}
+
+void Commands::EscapePresses(QAbstractButton& button) {
+  escapeButton_ = &button;
+}
+
+void Commands::PressByEscape() {
+  if (!Running() && TakeFocus(*escapeButton_)) {
+    escapeButton_->click();
+  }
 }
 
 QAbstractButton* Commands::DefaultButton() const {

@@ -47,6 +47,10 @@ class Commands : public QObject {
   /// However the button is pressed, it first gets the focus.
   void Connect(QAbstractButton& button, std::function<void()> command, WhileBusy whileBusy = WhileBusy::Run);
 
+  /// Escape then does what this connected or plain button does, and nothing while a command runs. For a
+  /// window without a Cancel button.
+  void EscapePresses(QAbstractButton& button);
+
   /// Actions or buttons with the member functions that they run.
   template <typename Control, typename Owner>
   using Table = std::initializer_list<std::pair<Control*, void (std::type_identity_t<Owner>::*)()>>;
@@ -89,12 +93,14 @@ class Commands : public QObject {
   void Press(QAbstractButton& button, const std::function<void()>& command, WhileBusy whileBusy);
   /// Gives the button the focus. Returns false if the entry being left keeps it.
   bool TakeFocus(QAbstractButton& button);
+  void PressByEscape();
   /// The connected button that Return would press now, if any.
   QAbstractButton* DefaultButton() const;
 
   QWidget& window_;
   MessageBoxes& boxes_;
   std::vector<QPointer<QAbstractButton>> buttons_;
+  QPointer<QAbstractButton> escapeButton_;
   int running_ = 0;  ///< commands on the stack
   bool closeRequested_ = false;
   bool pressedUnfocused_ = false;

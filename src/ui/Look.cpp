@@ -2,6 +2,9 @@
 
 #include <QApplication>
 #include <QIcon>
+#include <QPalette>
+
+#include "ui/WorkArea.h"
 
 namespace {
 
@@ -17,11 +20,20 @@ constexpr const char* StyleSheet = R"(
 #GetScores:focus, #RemoteManageButton:focus { border: 2px solid white; }
 #RemoteManageButton:disabled { background: #222a3d; border-color: #2c3650; color: #7d879b; }
 #centralwidget > #Label1, #centralwidget > #Label2 { font-weight: bold; }
-ScoreListView, #DataList { border: 1px solid #c3c9d6; selection-background-color: #2f6fd6; selection-color: white; }
-ScoreListView QHeaderView::section, #DataList QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid #c3c9d6;
-  background: #e9edf4; color: #1b2233; }
+ScoreListView, #DataList { border: 1px solid palette(mid); selection-background-color: #2f6fd6; selection-color: white; }
+ScoreListView QHeaderView::section, #DataList QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid palette(mid);
+  background: palette(button); color: palette(button-text); }
 #DataList QHeaderView::section { padding: 5px 3px; font-weight: bold; }
 )";
+
+/// Some desktops with a dark palette leave the colour of placeholders black.
+void MakePlaceholdersReadable() {
+  QColor colour = QApplication::palette().color(QPalette::Text);
+  colour.setAlpha(128);
+  QPalette own;
+  own.setColor(QPalette::PlaceholderText, colour);
+  QApplication::setPalette(own);
+}
 
 }  // namespace
 
@@ -29,5 +41,7 @@ void PrepareLook() {
   Q_INIT_RESOURCE(pictures);  // a static library's resources are not registered by themselves
   QApplication::setDesktopFileName(QStringLiteral("tessarine"));
   QApplication::setWindowIcon(QIcon(QStringLiteral(":/pictures/tessarine-256.png")));
+  MakePlaceholdersReadable();
   qApp->setStyleSheet(QString::fromUtf8(StyleSheet));
+  qApp->installEventFilter(new WorkArea(qApp));
 }

@@ -1,4 +1,5 @@
 #pragma once
 
-/// Sets the application's name, icon and style; call once before the first window. Needs a QApplication.
+/// Sets the application's name, icon and style, and keeps its windows on the screen; call once before the
+/// first window. Needs a QApplication.
 void PrepareLook();

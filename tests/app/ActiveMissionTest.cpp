@@ -51,6 +51,14 @@ class ActiveMission : public testing::Test {
 
   std::string ToolTip() const { return venue.Find<QLabel>("ActiveMissionLabel").toolTip().toStdString(); }
 
+  /// Opens the list and chooses the entry that is the active one.
+  void ChooseAgain() const {
+    QTest::mouseClick(&venue.ActiveMission(), Qt::LeftButton);
+    QAbstractItemView& list = *venue.ActiveMission().view();
+    ASSERT_TRUE(list.isVisible());
+    QTest::keyClick(&list, Qt::Key_Return);
+  }
+
   /// Soldiering of Red 0.
   std::string ScoreOfRed0() const {
     for (int row = 0; row < venue.RowCount("ScoreDisplay"); ++row) {
@@ -129,6 +137,41 @@ TEST_F(ActiveMission, ScoresTheGameAnewWhenItChanges) {
   EXPECT_EQ(ScoreOfRed0(), " 55");
   venue.ActiveMission().setCurrentIndex(0);
   EXPECT_EQ(ScoreOfRed0(), " 70");
+}
+
+TEST_F(ActiveMission, CanBeChosenAgain) {
+  venue.LoadGame(GameWithFriendlyFire("Alpha"));
+  venue.ChangeDatabase("scenarios.mdb",
+                       "UPDATE Table1 SET RespawnPenalty = 20, MissionDescription = 'New text' WHERE ID = 7");
+  ChooseAgain();
+  EXPECT_EQ(ToolTip(), "New text");
+  EXPECT_EQ(ScoreOfRed0(), " 10");
+  venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1 WHERE ID = 7");
+  ChooseAgain();
+  EXPECT_THAT(venue.Boxes.Boxes, AllOf(SizeIs(1 + 3), Each(MissionGone)));
+  EXPECT_EQ(ToolTip(), "");
+}
+
+TEST_F(ActiveMission, IsClickedOnceWhenAnotherIsChosen) {
+  venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1 WHERE ID IN (4, 7)");
+  venue.ActiveMission().setFocus();
+  QTest::keyClick(&venue.ActiveMission(), Qt::Key_Z);
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(MissionGone));
+  QTest::mouseClick(&venue.ActiveMission(), Qt::LeftButton);
+  QTest::keyClick(venue.ActiveMission().view(), Qt::Key_Down);
+  QTest::keyClick(venue.ActiveMission().view(), Qt::Key_Return);
+  ASSERT_EQ(venue.ActiveMission().currentIndex(), 3);
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(MissionGone, MissionGone));
+  ChooseAgain();
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(MissionGone, MissionGone, MissionGone));
+}
+
+TEST_F(ActiveMission, IsClickedAgainAlsoAfterTheProgramChoseIt) {
+  venue.ActiveMission().setCurrentIndex(3);
+  QCoreApplication::processEvents();
+  venue.ChangeDatabase("scenarios.mdb", "UPDATE Table1 SET MissionDescription = 'New text' WHERE ID = 7");
+  ChooseAgain();
+  EXPECT_EQ(ToolTip(), "New text");
 }
 
 TEST_F(ActiveMission, IsTheOneOfALoadedGame) {

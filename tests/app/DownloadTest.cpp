@@ -225,6 +225,24 @@ TEST_F(Download, FindsTheMemberOfTheButton) {
   EXPECT_THAT(venue.Column("ScoreDisplay", 1), ElementsAre("Red  1: Ada Berg"));
 }
 
+TEST_F(Download, SaysOnTheStatusLineWhatIsMissing) {
+  const auto status = [this] { return ::Find<QLabel>(*venue.Window, "Status").text().toStdString(); };
+  frames = {FrameOfRed1(), WithWrongCheckByte(FrameOfBlue0())};
+  venue.Press("GetScores");
+  EXPECT_EQ(status(), "Download incomplete. Guns received: 1 of 2.");
+  EXPECT_TRUE(::Find<QLabel>(*venue.Window, "Status").isVisible());
+  venue.Port.OnOutput = nullptr;
+  venue.Press("GetScores");
+  EXPECT_EQ(status(), "Download failed. No data was received.");
+  venue.LoadGame(SmallGame());
+  EXPECT_EQ(status(), "");
+  EXPECT_FALSE(::Find<QLabel>(*venue.Window, "Status").isVisible());
+  Venue chinese(Language::SimplifiedChinese);
+  chinese.Start();
+  chinese.Press("GetScores");
+  EXPECT_EQ(::Find<QLabel>(*chinese.Window, "Status").text(), QStringLiteral("下载失败。未收到数据。"));
+}
+
 class PortQuestion : public Download {
  protected:
   const FakeMessageBoxes::Box question{

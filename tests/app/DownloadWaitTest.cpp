@@ -1,10 +1,12 @@
 #include <gmock/gmock.h>
 
+#include <QLabel>
 #include <QLineEdit>
 #include <QTimer>
 
 #include "app/About.h"
 #include "app/UploadProgress.h"
+#include "devices/radio/RemoteManage.h"
 #include "settings/Settings.h"
 #include "settings/SoldieringCalc.h"
 #include "tests/support/Frames.h"
@@ -26,6 +28,7 @@ class DownloadWait : public testing::Test {
   /// Presses GetScores and runs each step in a pass of its own of the wait for the first byte.
   void PressAndMeanwhile(std::vector<std::function<void()>> steps) {
     steps_ = std::move(steps);
+    stepsTaken_ = 0;
     TakeNextStep();
     venue.Press("GetScores");
     EXPECT_EQ(stepsTaken_, steps_.size());
@@ -38,6 +41,13 @@ class DownloadWait : public testing::Test {
   }
 
   UploadProgress& Progress() const { return *venue.Window->findChild<UploadProgress*>(); }
+
+  /// What the status line says; empty also when it is hidden.
+  std::string Status() const {
+    const auto& label = venue.Find<QLabel>("Status");
+    EXPECT_EQ(label.isVisible(), !label.text().isEmpty());
+    return label.text().toStdString();
+  }
 
   void ExpectUnwound() const {
     EXPECT_FALSE(venue.Port.PortOpen());
@@ -86,10 +96,63 @@ TEST_F(DownloadWait, EndsWhenTheProgressWindowIsClosed) {
   ExpectUnwound();
 }
 
-TEST_F(DownloadWait, EndsByEscapeInTheProgressWindow) {
-  PressAndMeanwhile({[this] { QTest::keyClick(&Progress(), Qt::Key_Escape); }});
+TEST_F(DownloadWait, GoesOnAfterEscapeInTheProgressWindow) {
+  PressAndMeanwhile({[this] { QTest::keyClick(&Progress(), Qt::Key_Escape); }, [this] { SendFrame(); }});
+  EXPECT_THAT(venue.Column("ScoreDisplay", 1), ElementsAre("Red  1"));
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
-  EXPECT_TRUE(venue.Window->isVisible());
+  EXPECT_EQ(Status(), "");
+  ExpectUnwound();
+}
+
+TEST_F(DownloadWait, EndsByTheStopButtonAndSaysSo) {
+  PressAndMeanwhile({[this] {
+                       venue.Port.Receive({2});
+                       venue.Port.Receive(FrameOfRed1());
+                     },
+                     [this] { ::Press(Progress(), "Stop"); }});
+  EXPECT_THAT(venue.Column("ScoreDisplay", 1), ElementsAre("Red  1"));
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+  EXPECT_EQ(Status(), "Download stopped. Guns received: 1 of 2.");
+  ExpectUnwound();
+}
+
+TEST_F(DownloadWait, AfterOneThatWasStoppedBeginsAnewAndCountsNoGunAgain) {
+  PressAndMeanwhile({[this] {
+                       venue.Port.Receive({2});
+                       venue.Port.Receive(FrameOfRed1());
+                     },
+                     [this] { ::Press(Progress(), "Stop"); }});
+  ASSERT_EQ(venue.Row("ScoreDisplay", 0)[5], " 258");
+  PressAndMeanwhile({[this] {
+    venue.Port.Receive({2});
+    venue.Port.Receive(FrameOfRed1());
+    venue.Port.Receive(FrameOfBlue0());
+  }});
+  EXPECT_THAT(venue.Column("ScoreDisplay", 5), ElementsAre(" 1", " 258"));
+  EXPECT_EQ(Status(), "");
+}
+
+TEST_F(DownloadWait, AfterAClearedGameTakesNothingBack) {
+  PressAndMeanwhile({[this] {
+                       venue.Port.Receive({2});
+                       venue.Port.Receive(FrameOfRed1());
+                     },
+                     [this] { ::Press(Progress(), "Stop"); }});
+  venue.Trigger("mnuClearScores");
+  EXPECT_EQ(Status(), "");
+  PressAndMeanwhile({[this] { SendFrame(); }});
+  EXPECT_EQ(venue.Row("ScoreDisplay", 0)[5], " 258");
+}
+
+TEST_F(DownloadWait, EndsWithoutABoxWhenTheRadioTakesTheLine) {
+  const WhileModal<RemoteManage> remote([](RemoteManage& window) {
+    ::Press(window, "GetScoresButton");
+    ::Press(window, "Close");
+  });
+  PressAndMeanwhile({[this] { venue.Trigger("mnuRemoteManage"); }});
+  EXPECT_EQ(remote.Runs(), 1);
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+  EXPECT_EQ(Status(), "Download stopped. No data was received.");
   ExpectUnwound();
 }
 
@@ -136,9 +199,26 @@ TEST_F(DownloadWait, AfterAWrongCheckByteLetsTheMainWindowClose) {
   ExpectUnwound();
 }
 
-TEST_F(DownloadWait, SurvivesASecondPress) {
-  PressAndMeanwhile({[this] { venue.Press("GetScores"); }, [this] { SendFrame(); }});
-  EXPECT_THAT(venue.Column("ScoreDisplay", 1), ElementsAre("Red  1"));
+TEST_F(DownloadWait, SwallowsASecondPressByButtonMenuAndKey) {
+  const auto sees = [this](const std::function<void()>& press) {
+    return [this, press] {
+      Show(*venue.Window);
+      press();
+      EXPECT_TRUE(venue.Port.PortOpen());
+      EXPECT_EQ(venue.Window->findChildren<UploadProgress*>().size(), 1);
+    };
+  };
+  PressAndMeanwhile(
+      {[this] {
+         venue.Port.Receive({2});
+         venue.Port.Receive(FrameOfRed1());
+       },
+       sees([this] { venue.Press("GetScores"); }), sees([this] { venue.Trigger("mnuGetKeshData"); }),
+       sees([this] { Type(*venue.Window, Qt::Key_F5); }),
+       sees([this] { Type(*venue.Window, Qt::Key_Space); }), [this] { venue.Port.Receive(FrameOfBlue0()); }});
+  EXPECT_THAT(venue.Column("ScoreDisplay", 5), ElementsAre(" 1", " 258"));
+  EXPECT_THAT(venue.Port.Sent, ElementsAre(1, 0, 170, 170));
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
   ExpectUnwound();
 }
 
@@ -146,18 +226,6 @@ TEST_F(DownloadWait, SurvivesThreePressesAndTheEndOfTheProgram) {
   PressAndMeanwhile({[this] { venue.Press("GetScores"); }, [this] { venue.Trigger("mnuGetKeshData"); },
                      [this] { EXPECT_FALSE(venue.Window->close()); }});
   EXPECT_FALSE(venue.Window->isVisible());
-  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
-  ExpectUnwound();
-}
-
-TEST_F(DownloadWait, SurvivesThatTheOuterProgressWindowIsClosedFirst) {
-  UploadProgress* outer = nullptr;
-  PressAndMeanwhile({[&] {
-                       outer = &Progress();
-                       venue.Press("GetScores");
-                     },
-                     [&] { outer->close(); }, [this] { SendFrame(); }});
-  EXPECT_THAT(venue.Column("ScoreDisplay", 1), ElementsAre("Red  1"));
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
   ExpectUnwound();
 }

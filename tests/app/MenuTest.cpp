@@ -39,7 +39,7 @@ const std::vector<Menu> Menus = {
       {"mnuSetupMissions", 213, "&Setup Missions", true}}},
     {{"mnuMembers", 0, "M&embers", true},
      {{"mnuManageMembers", 0, "Mana&ge Members", true},
-      {"mnuCheckButton", 0, "&Check Membership Button", false}}},
+      {"mnuCheckButton", 0, "&Check Membership Button", true}}},
     {{"mnuTools", 0, "&Tools", true},
      {{"mnuBoxConfig", 0, "&Utility Box Configuration", false},
       {"mnuFirmwareUpdate", 0, "F&irmware Update", false},
@@ -79,7 +79,10 @@ std::string CaptionOf(const Item& item, const StringTable& strings) {
 
 class MenuBar : public testing::TestWithParam<Language> {
  protected:
-  MenuBar() { venue.Start(); }
+  MenuBar() {
+    venue.ButtonSwipe = [] { return std::string(NoDallasId); };
+    venue.Start();
+  }
 
   QMenuBar& Bar() const { return venue.Find<QMenuBar>("menubar"); }
 
@@ -128,10 +131,11 @@ TEST_P(MenuBar, DisablesWhatHasNoWindowYet) {
   EXPECT_TRUE(venue.Find<QPushButton>("GetScores").isEnabled());
 }
 
-TEST_P(MenuBar, OffersToCheckAMembershipButtonWhereThereIsAReader) {
-  venue.ButtonSwipe = [] { return std::string(NoDallasId); };
-  venue.MakeWindow().FormLoad();
+TEST_P(MenuBar, OffersToCheckAMembershipButtonOnlyWhereThereIsAReader) {
   EXPECT_TRUE(venue.Find<QAction>("mnuCheckButton").isEnabled());
+  venue.ButtonSwipe = nullptr;
+  venue.MakeWindow().FormLoad();
+  EXPECT_FALSE(venue.Find<QAction>("mnuCheckButton").isEnabled());
 }
 
 TEST_P(MenuBar, GivesNoAltKeyTwice) {

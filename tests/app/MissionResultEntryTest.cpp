@@ -5,6 +5,7 @@
 #include <QCheckBox>
 #include <QLabel>
 
+#include "tests/support/Captions.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
 
@@ -86,6 +87,42 @@ TEST_F(Results, StartAsNothingCompletedByRedBlueAndYellow) {
   });
 }
 
+TEST_F(Results, HaveTheirCaptions) {
+  for (const Language language : {Language::English, Language::SimplifiedChinese}) {
+    Venue place(language);
+    place.Start();
+    place.ActiveMission().setCurrentIndex(2);
+    const bool english = language == Language::English;
+    const WhileModal<MissionResultEntry> open([english](MissionResultEntry& opened) {
+      const auto in = [english](const char* text, const char* chinese) {
+        return std::string(english ? text : chinese);
+      };
+      EXPECT_EQ(opened.windowTitle().toStdString(), in("Mission Results", "任务结果"));
+      const std::string primary = in("Primary Completed", "主要目标已完成");
+      const std::string secondary = in("Secondary Completed", "次要目标已完成");
+      ExpectCaptions(opened, {{"Frame1", in("Team A Objectives", "A 队目标")},
+                              {"Frame2", in("Team B Objectives", "B 队目标")},
+                              {"Frame3", in("Team C Objectives", "C 队目标")},
+                              {"PrimaryCompleted1", primary},
+                              {"PrimaryCompleted2", primary},
+                              {"PrimaryCompleted3", primary},
+                              {"SecondaryCompleted1", secondary},
+                              {"SecondaryCompleted2", secondary},
+                              {"SecondaryCompleted3", secondary},
+                              {"Label2", in("Team", "队伍")},
+                              {"Label3", in("Team", "队伍")},
+                              {"Label4", in("Team", "队伍")},
+                              {"OK", in("OK", "确定")}});
+      ExpectLabels(
+          opened,
+          {{"TeamA", in("Team", "队伍")}, {"TeamB", in("Team", "队伍")}, {"TeamC", in("Team", "队伍")}});
+      opened.close();
+    });
+    place.Trigger("mnuMissionResults");
+    EXPECT_EQ(open.Runs(), 1);
+  }
+}
+
 TEST_F(Results, PayTheTeamOfTheSet) {
   Open([this] { Box("PrimaryCompleted2").setChecked(true); });
   EXPECT_THAT(Scores(), ElementsAre(0, 20, 0));
@@ -114,6 +151,29 @@ TEST_F(Results, StayAsTheyWereWhenTheWindowIsClosedByItsBox) {
       },
       true);
   EXPECT_THAT(Scores(), ElementsAre(100, 0, 0));
+}
+
+TEST_F(Results, ScoreTheGameAnewHoweverTheWindowIsClosed) {
+  Open([this] { Box("PrimaryCompleted1").setChecked(true); });
+  ASSERT_THAT(Scores(), ElementsAre(100, 0, 0));
+  venue.ChangeDatabase("scenarios.mdb", "UPDATE Table1 SET PrimaryObjectivePointsA = 70");
+  Open([] {}, true);
+  EXPECT_THAT(Scores(), ElementsAre(70, 0, 0));
+  venue.ChangeDatabase("scenarios.mdb", "UPDATE Table1 SET PrimaryObjectivePointsA = 60");
+  Open([] {});
+  EXPECT_THAT(Scores(), ElementsAre(60, 0, 0));
+}
+
+TEST_F(Results, AreTakenByEscapeAsByOk) {
+  const WhileModal<MissionResultEntry> open([](MissionResultEntry& opened) {
+    auto& box = ::Find<QCheckBox>(opened, "PrimaryCompleted2");
+    box.setChecked(true);
+    QTest::keyClick(&box, Qt::Key_Escape);
+    EXPECT_FALSE(opened.isVisible());
+  });
+  venue.Trigger("mnuMissionResults");
+  EXPECT_EQ(open.Runs(), 1);
+  EXPECT_THAT(Scores(), ElementsAre(0, 20, 0));
 }
 
 TEST_F(Results, StayTickedForTheNextGame) {

@@ -5,6 +5,7 @@
 #include <QLabel>
 #include <QListWidget>
 
+#include "tests/support/Captions.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
 
@@ -78,6 +79,39 @@ TEST_F(Details, ShowEveryFigure) {
         }
         EXPECT_EQ(window.windowTitle(), QStringLiteral("Player Detailed Data"));
       });
+}
+
+TEST_F(Details, HaveTheirCaptions) {
+  Open("", [](const PlayerDetails& window) {
+    EXPECT_EQ(window.windowTitle(), QStringLiteral("Player Detailed Data"));
+    ExpectCaptions(window, {{"Frame7", "Calculated"},
+                            {"Frame6", "General"},
+                            {"Frame5", "Counters"},
+                            {"Frame4", "Totals"},
+                            {"Frame3", "Values Remaining"},
+                            {"Frame2", "Damage Taken"},
+                            {"Frame1", "Damage Inflicted"},
+                            {"OKButton", "OK"}});
+    ExpectLabels(window, {{"SoldieringDisplay", "Soldiering:"},
+                          {"AccuracyDisplay", "Accuracy:"},
+                          {"PowerCheatDisplay", "Power Cheat:"},
+                          {"AdminKillDisplay", "Admin Kills:"},
+                          {"CommitedDisplay", "Saved to DB:"},
+                          {"MemberIndexDisplay", "Member Index:"},
+                          {"MemberIDDisplay", "Member ID:"},
+                          {"SecondaryDamageDisplay", "Secondary Damage:"},
+                          {"PrimaryDamageDisplay", "Primary Damage:"},
+                          {"DeathDisplay", "Deaths:"},
+                          {"RunTimeDisplay", "Run Time:"},
+                          {"RespawnDisplay", "Respawns:"},
+                          {"AmmoAddDisplay", "Ammo Adds:"},
+                          {"HealDisplay", "Heal Points:"},
+                          {"DamageDisplay", "Damage Dealt:"},
+                          {"TotalShotsDisplay", "Shots Fired:"},
+                          {"RemAmmoDisplay", "Remaining Ammo:"},
+                          {"RemClipsDisplay", "Remaining Clips:"},
+                          {"RemHealthDisplay", "Remaining Health:"}});
+  });
 }
 
 TEST_F(Details, ShowNoAccuracyOfZeroAndNoHits) {

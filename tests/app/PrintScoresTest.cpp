@@ -71,7 +71,7 @@ TEST_F(PrintScores, MakesTheSheetsThatWereChosenAndKeepsTheChoice) {
   EXPECT_THAT(venue.Word.Documents, SizeIs(2));
   EXPECT_EQ(venue.Word.Documents[0]->SavedAs, venue.DataFile("scores/Red 0-Guest-today-None.doc"));
   EXPECT_THAT(venue.Boxes.Boxes,
-              ElementsAre(Box{"Printing completed. Files saved to " + venue.DataFolder() + "/Scores.",
+              ElementsAre(Box{"Printing completed. Files saved to " + venue.DataFolder() + "/scores.",
                               "Print Status", BoxIcon::Information, BoxButtons::Ok}));
   EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
   const WhileModal<PrintOptions> again([](PrintOptions& window) {

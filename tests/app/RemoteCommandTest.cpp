@@ -65,6 +65,14 @@ TEST_F(RemoteCommand, RecalculatesTheBoardAfterwards) {
   EXPECT_EQ(venue.RowCount("TeamScores"), 3);
 }
 
+TEST_F(RemoteCommand, RecalculatesTheBoardAlsoWithoutAGame) {
+  ASSERT_EQ(venue.RowCount("TeamScores"), 0);
+  const WhileModal<RemoteManage> window([](RemoteManage& remote) { remote.close(); });
+  venue.Trigger("mnuRemoteManage");
+  EXPECT_EQ(window.Runs(), 1);
+  EXPECT_EQ(venue.RowCount("TeamScores"), 3);
+}
+
 TEST_F(RemoteCommand, StartsWithAnEmptyListEachTime) {
   for (int i = 0; i < 2; ++i) {
     const WhileModal<RemoteManage> window([](RemoteManage& remote) {

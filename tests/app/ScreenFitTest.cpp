@@ -5,6 +5,8 @@
 #include <tuple>
 #include <utility>
 
+#include "tests/support/OnScreen.h"
+
 namespace {
 
 TEST(FitToScreen, MaximisesWithoutAWarningOnExactlyTheRecommendedSize) {
@@ -45,6 +47,12 @@ TEST(FitToScreen, LimitsTheHeightAloneOnALowScreen) {
     EXPECT_EQ(fit.Height, limit);
     EXPECT_FALSE(fit.Width);
   }
+}
+
+TEST(PixelsOf, AreThoseOfTheScreenAtAnyScale) {
+  EXPECT_EQ(PixelsOf(ScreenNamed("too low")), QSize(1280, 720));
+  EXPECT_EQ(PixelsOf(ScreenNamed("scaled by 2")), QSize(1920, 1080));
+  EXPECT_EQ(PixelsOf(ScreenNamed("scaled by 1.5")), QSize(1024, 768));  // 683 x 512 in the toolkit's units
 }
 
 }  // namespace

@@ -87,6 +87,16 @@ TEST_F(SoldieringCalcCommand, ChangesTheBoardAtOnce) {
   EXPECT_THAT(venue.Row("TeamScores", 0), ElementsAre("1", "Red", " 10"));
 }
 
+TEST_F(SoldieringCalcCommand, KeepsFactorsThatTheGameCannotBeScoredWith) {
+  venue.LoadGame(GameFile(PlayerOf(1, "<HealCount>2</HealCount>")));
+  Choose("1E300", "SaveExit");
+  EXPECT_THAT(venue.Boxes.Boxes,
+              ElementsAre(FakeMessageBoxes::Box{"Run-time error '6': Overflow", "Tessarine",
+                                                BoxIcon::Critical, BoxButtons::Ok}));
+  EXPECT_THAT(IniFile(), testing::HasSubstr("heals= 1E+300\n"));
+  EXPECT_EQ(venue.RowCount("ScoreDisplay"), 0);
+}
+
 TEST_F(SoldieringCalcCommand, CalculatesNothingWithoutAGame) {
   Choose("5", "SaveExit");
   EXPECT_EQ(venue.RowCount("TeamScores"), 0);

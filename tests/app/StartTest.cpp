@@ -2,10 +2,9 @@
 
 #include <QGuiApplication>
 #include <QScreen>
-#include <algorithm>
-#include <stdexcept>
 
 #include "tests/support/OldFiles.h"
+#include "tests/support/OnScreen.h"
 #include "tests/support/Thrown.h"
 #include "tests/support/Venue.h"
 
@@ -28,13 +27,7 @@ class Start : public testing::Test {
   /// Starts with the window on the screen of this name in Screens.json; returns the window's geometry then.
   QRect StartOnScreen(const QString& name) {
     venue.PutDefaultFiles();
-    const QList<QScreen*> screens = QGuiApplication::screens();
-    const auto screen = std::find_if(screens.begin(), screens.end(),
-                                     [&](const QScreen* each) { return each->name() == name; });
-    if (screen == screens.end()) {
-      throw std::logic_error("No such screen: " + name.toStdString());
-    }
-    venue.MakeWindow().setScreen(*screen);
+    venue.MakeWindow().setScreen(&ScreenNamed(name.toStdString()));
     venue.Window->move(100, 90);
     before = venue.Window->geometry();
     venue.Window->FormLoad();
@@ -119,8 +112,31 @@ TEST_F(Start, OnATooNarrowScreenLimitsTheWidthOnly) {
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(SmallScreen));
 }
 
+TEST_F(Start, OnAScreenSmallerThanTheWindowIsMaximised) {
+  const QRect after = StartOnScreen(QStringLiteral("laptop"));
+  EXPECT_LT(before.height(), 768);
+  EXPECT_TRUE(Maximised());
+  EXPECT_EQ(after.width(), before.width());
+  EXPECT_LE(after.height(), 768 - 33);  // also when it is no longer maximised
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(Start, OnAScaledScreenGoesByItsPixels) {
+  const QRect after = StartOnScreen(QStringLiteral("scaled by 2"));  // 1920 x 1080
+  EXPECT_TRUE(Maximised());
+  EXPECT_LE(after.width(), 960);
+  EXPECT_LE(after.height(), 540 - 33);
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(Start, OnAScaledScreenOfTheRecommendedSizeIsMaximisedWithoutAWarning) {
+  StartOnScreen(QStringLiteral("scaled by 1.5"));
+  EXPECT_TRUE(Maximised());
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
 TEST_F(Start, WarnsOfTheScreenBeforeItLooksForData) {
-  venue.MakeWindow().setScreen(QGuiApplication::screens().at(2));
+  venue.MakeWindow().setScreen(&ScreenNamed("too small"));
   venue.Window->FormLoad();
   ASSERT_EQ(venue.Boxes.Boxes.size(), 4u);
   EXPECT_EQ(venue.Boxes.Boxes[0], SmallScreen);

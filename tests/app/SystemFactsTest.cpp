@@ -20,6 +20,8 @@ TEST(SystemFacts, TellVersionsAndScreens) {
   EXPECT_THAT(facts, Contains(HasSubstr("linux ")));
   EXPECT_THAT(facts, Contains(StartsWith("Locale ")));
   EXPECT_THAT(facts, Contains(MatchesRegex("Screen [0-9]+ x [0-9]+, scale [0-9.]+")));
+  EXPECT_THAT(facts, Contains("Screen 1920 x 1080, scale 2"));
+  EXPECT_THAT(facts, Contains("Screen 1024 x 768, scale 1.5"));
 }
 
 }  // namespace

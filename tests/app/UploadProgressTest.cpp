@@ -90,11 +90,32 @@ TEST_F(UploadProgressWindow, KnowsWhetherTheOperatorClosedIt) {
   EXPECT_TRUE(window.ClosedByOperator());
 }
 
-TEST_F(UploadProgressWindow, IsClosedByEscape) {
+TEST_F(UploadProgressWindow, IsNotClosedByEscape) {
   window.Open();
   QTest::keyClick(&window, Qt::Key_Escape);
-  EXPECT_FALSE(window.isVisible());
-  EXPECT_TRUE(window.ClosedByOperator());
+  QTest::keyClick(&Find<QPushButton>(window, "Stop"), Qt::Key_Escape);
+  QTest::keyClick(&window, Qt::Key_Return);
+  EXPECT_TRUE(window.isVisible());
+  EXPECT_FALSE(window.ClosedByOperator());
+}
+
+TEST_F(UploadProgressWindow, IsStoppedByItsButton) {
+  for (const auto& [language, caption] : {std::pair{Language::English, QStringLiteral("Stop")},
+                                          {Language::SimplifiedChinese, QStringLiteral("停止")}}) {
+    const StringTable texts(language);
+    UploadProgress opened(texts, nullptr);
+    opened.Open();
+    EXPECT_EQ(Find<QPushButton>(opened, "Stop").text(), caption);
+    EXPECT_TRUE(Find<QPushButton>(opened, "Stop").isVisible());
+    Press(opened, "Stop");
+    EXPECT_FALSE(opened.isVisible());
+    EXPECT_TRUE(opened.ClosedByOperator());
+  }
+}
+
+// The platform of these tests brings every window to the front, whatever this says.
+TEST_F(UploadProgressWindow, DoesNotAskForTheKeyboard) {
+  EXPECT_TRUE(window.testAttribute(Qt::WA_ShowWithoutActivating));
 }
 
 }  // namespace

@@ -11,14 +11,39 @@
 #include "settings/Settings.h"
 #include "settings/SoldieringCalc.h"
 #include "tests/support/CaredFor.h"
+#include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
 
 namespace {
 
-class Windows : public testing::TestWithParam<Language> {
+/// Where the windows are looked at.
+struct Desktop {
+  const char* Name;
+  const char* Screen;  ///< of Screens.json
+  int Points;          ///< of the desktop's font; 0 for the usual size
+};
+
+constexpr Desktop Desktops[] = {
+    {"OnALargeScreen", "recommended or better", 0},
+    {"OnTheRecommendedScreen", "as recommended", 0},
+    {"OnALaptop", "laptop", 0},
+    {"OnAScaledScreen", "scaled by 2", 0},
+    {"InLargeLetters", "as recommended", 11},
+    {"InLargeLettersOnALaptop", "laptop", 11},
+    {"InLargeLettersOnAScaledScreen", "scaled by 2", 11},
+};
+
+class Windows : public testing::TestWithParam<std::tuple<Language, Desktop>> {
  protected:
-  Windows() { venue.Start(); }
+  Windows() {
+    venue.PutDefaultFiles();
+    QScreen& screen = ScreenNamed(desktop.Screen);
+    venue.MakeWindow().setScreen(&screen);
+    venue.Window->move(screen.geometry().topLeft() + QPoint(10, 30));
+    venue.Window->FormLoad();
+    Show(*venue.Window);
+  }
 
   /// Opens a modal window by its menu item and looks at it.
   template <typename Window>
@@ -31,7 +56,9 @@ class Windows : public testing::TestWithParam<Language> {
     EXPECT_EQ(look.Runs(), 1);
   }
 
-  Venue venue{GetParam()};
+  const Desktop desktop = std::get<Desktop>(GetParam());
+  const FontOfSize font{desktop.Points};
+  Venue venue{std::get<Language>(GetParam())};
 };
 
 TEST_P(Windows, AreCaredFor) {
@@ -95,15 +122,23 @@ TEST_P(Windows, OfTheDownloadIsCaredFor) {
 }
 
 TEST_P(Windows, TheMainOneIsCaredForAtTheSmallestSize) {
-  venue.Window->resize(1024, 700);
-  venue.LoadGame(SmallGame());
+  if (!venue.Window->isMaximized()) {
+    venue.Window->resize(1024, 700);
+  }
+  venue.LoadGame(GameOfManyHits());
   ExpectCaredFor(*venue.Window);
-  EXPECT_EQ(venue.Window->width(), 1024);
+  EXPECT_TRUE(venue.Window->isMaximized() || venue.Window->width() == 1024);
+  auto& board = venue.Find<QTableView>("ScoreDisplay");
+  EXPECT_GE(board.columnWidth(1), board.sizeHintForIndex(board.model()->index(0, 1)).width());
 }
 
-INSTANTIATE_TEST_SUITE_P(Languages, Windows, testing::Values(Language::English, Language::SimplifiedChinese),
-                         [](const auto& language) {
-                           return language.param == Language::English ? "English" : "SimplifiedChinese";
+INSTANTIATE_TEST_SUITE_P(Looks, Windows,
+                         testing::Combine(testing::Values(Language::English, Language::SimplifiedChinese),
+                                          testing::ValuesIn(Desktops)),
+                         [](const auto& look) {
+                           const bool isEnglish = std::get<Language>(look.param) == Language::English;
+                           return std::string(isEnglish ? "English" : "SimplifiedChinese") +
+                                  std::get<Desktop>(look.param).Name;
                          });
 
 }  // namespace

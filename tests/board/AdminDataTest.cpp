@@ -5,7 +5,7 @@
 #include <QClipboard>
 #include <QTableWidget>
 
-#include "tests/support/Controls.h"
+#include "tests/support/Captions.h"
 #include "tests/support/WhileModal.h"
 
 namespace {
@@ -39,6 +39,27 @@ TEST_F(Admin, ListsRunTimeAndKillsOfAllGuns) {
     EXPECT_EQ(list.item(1, 2)->text(), QStringLiteral("3"));
     EXPECT_EQ(list.item(223, 0)->text(), QStringLiteral("Blue  95"));
   });
+}
+
+TEST_F(Admin, HasItsCaptions) {
+  for (const Language language : {Language::English, Language::SimplifiedChinese}) {
+    const StringTable texts(language);
+    const Game empty(texts);
+    const AdminData window(empty, texts, nullptr);
+    const bool english = language == Language::English;
+    EXPECT_EQ(window.windowTitle(),
+              english ? QStringLiteral("Administration Data") : QStringLiteral("管理数据"));
+    ExpectCaptions(window, {{"Command1", english ? "Close" : "关闭"}});
+    const auto& list = ::Find<QTableWidget>(window, "AdminData");
+    const QStringList headers =
+        english
+            ? QStringList{QStringLiteral("Player"), QStringLiteral("Run Time"), QStringLiteral("Admin Kills")}
+            : QStringList{QStringLiteral("玩家"), QStringLiteral("运行时间"), QStringLiteral("管理员击杀")};
+    ASSERT_EQ(list.columnCount(), 3);
+    for (int column = 0; column < 3; ++column) {
+      EXPECT_EQ(list.horizontalHeaderItem(column)->text(), headers[column]);
+    }
+  }
 }
 
 TEST_F(Admin, CopiesTheSelectedRowsAsTextWithTabs) {

@@ -5,7 +5,7 @@
 #include <QLineEdit>
 
 #include "tests/fakes/FakeMessageBoxes.h"
-#include "tests/support/Controls.h"
+#include "tests/support/Captions.h"
 
 namespace {
 
@@ -31,6 +31,15 @@ TEST_F(BonusWindow, ShowsTheValueInTheNumberForm) {
     EXPECT_EQ(Find<QLineEdit>(window, "BonusPointsEntry").text().toStdString(), text);
     EXPECT_EQ(window.windowTitle(), QStringLiteral("Bonus Points"));
   }
+}
+
+TEST_F(BonusWindow, HasItsCaptions) {
+  const BonusPoints window(5, boxes, nullptr);
+  ExpectCaptions(window, {{"Label1", "Bonus Points for this player:"},
+                          {"Label2", "This value is added to the player's Soldiering Total."},
+                          {"OK", "OK"},
+                          {"Cancel", "Cancel"}});
+  ExpectLabels(window, {{"BonusPointsEntry", "Bonus Points for this player:"}});
 }
 
 TEST_F(BonusWindow, RoundsToTheEvenNumber) {

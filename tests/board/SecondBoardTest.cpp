@@ -38,6 +38,7 @@ struct Screen {
   ScoreListModel PlayerModel;
   ScoreListModel TeamModel;
   QAbstractItemModelTester PlayerTester{&PlayerModel, QAbstractItemModelTester::FailureReportingMode::Fatal};
+  QAbstractItemModelTester TeamTester{&TeamModel, QAbstractItemModelTester::FailureReportingMode::Fatal};
   ScoreListView PlayerView;
   ScoreListView TeamView;
 };

@@ -17,6 +17,7 @@ class FakeSheetProgress : public SheetProgress {
     stopped_ = stopped_ || number == StopAtSheet;
   }
   bool Stopped() const override { return stopped_; }
+  void Stop() { stopped_ = true; }
   void Close() override { Log.emplace_back("Close"); }
 
  private:

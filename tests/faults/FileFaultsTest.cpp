@@ -231,7 +231,7 @@ class SheetsMade : public OnFiles {
 
   /// What the operator is told of a failure has a text and no number.
   void Act() override {
-    word_.OnOperation = [this](const std::string& operation) {
+    word_.OnOperation = [](const std::string& operation) {
       if (operation.starts_with("SaveAs ")) {
         WriteFile(operation.substr(7), "sheet");  // as the word processor does, by itself
       }

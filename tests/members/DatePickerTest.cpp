@@ -5,8 +5,10 @@
 #include <QAccessible>
 #include <QApplication>
 #include <QCalendarWidget>
+#include <QScreen>
 #include <QTest>
 
+#include "platform/qt/QtClock.h"
 #include "tests/support/Controls.h"
 
 namespace {
@@ -25,6 +27,10 @@ class DateEntry : public testing::Test {
     picker.selectAll();
     QTest::keyClick(&picker, Qt::Key_Delete);
     QTest::keyClicks(&picker, QString::fromStdString(text));
+  }
+
+  static std::string TwoDigits(int year) {
+    return QString::number(year % 100).rightJustified(2, u'0').toStdString();
   }
 
   void Leave() { other.setFocus(); }
@@ -87,14 +93,19 @@ TEST_F(DateEntry, TakesADateThatAnAssistiveProgramEnters) {
   EXPECT_EQ(picker.Stored(), "");
 }
 
-TEST_F(DateEntry, TakesTwoDigitsOfAYearAsOfTheLastHundredYears) {
-  const int thisYear = QDate::currentDate().year();
-  const auto twoDigits = [](int year) {
-    return "1 Jan " + QString::number(year % 100).rightJustified(2, u'0').toStdString();
-  };
-  for (const int year : {thisYear - 99, thisYear - 60, thisYear - 1, thisYear}) {
-    Enter(twoDigits(year));
+TEST_F(DateEntry, TakesTwoDigitsOfAYearAs1930To2029) {
+  for (const int year : {1930, 1961, 1999, 2000, 2013, 2026, 2029}) {
+    Enter("1 Jan " + TwoDigits(year));
     EXPECT_EQ(picker.Stored(), std::to_string(year) + "-01-01 00:00:00");
+  }
+}
+
+TEST_F(DateEntry, TakesTwoDigitsOfAYearAsTheScoreSheetDoes) {
+  for (int year = 1930; year <= 2029; ++year) {
+    const std::string text = "1 Jan " + TwoDigits(year);
+    Enter(text);
+    const QDate date = QDate::fromString(QString::fromStdString(picker.Stored()).left(10), Qt::ISODate);
+    EXPECT_EQ(QtClock().LongDate(text), QLocale::system().toString(date, QLocale::LongFormat).toStdString());
   }
 }
 
@@ -135,6 +146,20 @@ TEST_F(DateEntry, ChoosesInACalendarByTheKeyboard) {
   EXPECT_EQ(picker.Stored(), "1961-05-20 00:00:00");
   EXPECT_EQ(Shown(), "20 May 1961");
   EXPECT_EQ(Calendar(), nullptr);
+}
+
+TEST_F(DateEntry, OpensTheCalendarInsideTheScreen) {
+  const QRect area = window.screen()->availableGeometry();
+  window.resize(picker.sizeHint().width(), 100);
+  const QPoint last = area.bottomRight() - QPoint(window.width(), window.height());
+  for (const QPoint& place : {area.topLeft(), QPoint(last.x(), 0), QPoint(0, last.y()), last}) {
+    window.move(place);
+    QTest::keyClick(&picker, Qt::Key_Down, Qt::AltModifier);
+    ASSERT_NE(Calendar(), nullptr);
+    const QRect popup = QApplication::activePopupWidget()->geometry();
+    EXPECT_TRUE(area.contains(popup)) << popup.right() << ' ' << popup.bottom();
+    QTest::keyClick(Calendar(), Qt::Key_Escape);
+  }
 }
 
 TEST_F(DateEntry, ClosesTheCalendarByEscapeAndKeepsTheDate) {

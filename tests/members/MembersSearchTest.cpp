@@ -174,4 +174,22 @@ TEST_F(MembersWindow, SearchesAnewAfterAMemberWasAdded) {
   });
 }
 
+TEST_F(MembersWindow, ShowsNoFiguresWithoutAHit) {
+  Sql("UPDATE Members SET DallasID = 'EFCDAB8967452301', LastPlayedDate = '2026-11-20 20:15:00', "
+      "TotalGamesPlayed = 12, TotalDamage = 3450, AverageDamage = 287.5, TotalSoldiering = -7, "
+      "AverageSoldiering = -0.58 WHERE ContactID = 1");
+  Open([this] {
+    const auto displays = {"MemberIDDisplay",        "DateJoinedDisplay",        "LastPlayedDisplay",
+                           "TotalDamageDisplay",     "TotalGamesPlayedDisplay",  "AverageDamageDisplay",
+                           "TotalSoldieringDisplay", "AverageSoldieringDisplay", "Dummy"};
+    for (const char* display : displays) {
+      EXPECT_NE(Shown(display), "") << display;
+    }
+    SearchFor("nobody");
+    for (const char* display : displays) {
+      EXPECT_EQ(Shown(display), "") << display;
+    }
+  });
+}
+
 }  // namespace

@@ -2,6 +2,7 @@
 #include <QGroupBox>
 
 #include "tests/members/MembersWindow.h"
+#include "tests/support/OnScreen.h"
 
 namespace {
 
@@ -160,16 +161,19 @@ TEST_F(MembersWindow, OpensOnAnEmptyTableAndTakesTheFirstMember) {
     }
     EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
     Press("OK");
-    Press("ChangePicture");
-    Press("Delete");
+    for (const char* button : {"ChangePicture", "Delete", "ChangeID"}) {
+      EXPECT_FALSE(::Find<QPushButton>(*window, button).isEnabled()) << button;
+    }
     EXPECT_TRUE(window->isVisible());
     EXPECT_EQ(window->SelectedContact(), "");
     Press("NewMember");
     EXPECT_TRUE(Line("FirstNameEntry").isEnabled());
     EXPECT_EQ(Text("FirstNameEntry"), "Enter Name");
+    for (const char* button : {"ChangePicture", "Delete", "ChangeID"}) {
+      EXPECT_TRUE(::Find<QPushButton>(*window, button).isEnabled()) << button;
+    }
   });
-  const auto none = Fault(3021, "No current record.");
-  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(none, none, testing::_, none));
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Fault(3021, "No current record.")));
   EXPECT_EQ(Query("SELECT count(*) FROM Members"), "1");
 }
 
@@ -234,10 +238,22 @@ TEST_F(MembersWindow, ChoosesNobodyWhoseNameIsNotStored) {
 TEST_F(MembersWindow, ChoosesNobodyWhenItIsClosed) {
   Open([this] {
     Press("DataNext");
-    Type(*window, Qt::Key_Escape);
+    window->close();
     EXPECT_EQ(window->SelectedContact(), "");
     EXPECT_FALSE(window->isVisible());
   });
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(MembersWindow, DoesByEscapeWhatOkDoes) {
+  Open([this] {
+    Press("DataNext");
+    Enter("FirstNameEntry", "Alicia");
+    Type(*window, Qt::Key_Escape);
+    EXPECT_EQ(window->SelectedContact(), "2");
+    EXPECT_FALSE(window->isVisible());
+  });
+  EXPECT_EQ(Stored("FirstName", 2), "Alicia");
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
@@ -279,8 +295,8 @@ TEST_F(MembersWindowOn, StandsBehindTheLastRowForAMemberThatIsGone) {
   OpenOn(77);
   EXPECT_EQ(Text("LastNameEntry"), "");
   EXPECT_FALSE(Line("LastNameEntry").isEnabled());
-  Press("ChangePicture");
-  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Fault(3021, "No current record.")));
+  EXPECT_FALSE(::Find<QPushButton>(*window, "ChangePicture").isEnabled());
+  EXPECT_FALSE(::Find<QPushButton>(*window, "Delete").isEnabled());
   Press("DataPrevious");
   EXPECT_EQ(Text("LastNameEntry"), "王");
 }
@@ -295,6 +311,27 @@ TEST_F(MembersWindowOn, IsUpToDateWheneverItComesUp) {
   EXPECT_EQ(Text("SearchText"), "");
   EXPECT_EQ(Text("LastNameEntry"), "One");
   EXPECT_EQ(Shown("DataPlace"), "5 / 5");
+}
+
+TEST_F(MembersWindowOn, HasItsCaretNowhereSoThatAStrayKeyChangesNothing) {
+  OpenOn(5);
+  QTest::keyClicks(QApplication::focusWidget(), QStringLiteral("x "));
+  EXPECT_EQ(Text("FirstNameEntry") + "|" + Text("SearchText"), "Sean|");
+  EXPECT_EQ(Shown("DataPlace"), "3 / 4");
+  Type(*window, Qt::Key_Tab);
+  EXPECT_TRUE(Line("FirstNameEntry").hasFocus());
+  EXPECT_EQ(Shown("DataPlace"), "3 / 4");
+}
+
+TEST_F(MembersWindowOn, ShowsTheLongestNumberOfAButtonWhole) {
+  Sql("UPDATE Members SET DallasID = 'DDDDDDDDDDDDDDDD' WHERE ContactID = 5");
+  for (const int points : {0, 11, 14}) {
+    const FontOfSize font(points);
+    OpenOn(5);
+    const auto& code = ::Find<QLabel>(*window, "MemberIDDisplay");
+    EXPECT_GE(code.width(), code.fontMetrics().horizontalAdvance(code.text())) << points;
+    opened.reset();
+  }
 }
 
 TEST_F(MembersWindowOn, HasNoIdToChangeWithoutAReader) {

@@ -3,6 +3,8 @@
 #include <gtest/gtest.h>
 
 #include <QWidget>
+#include <QtEndian>
+#include <cstring>
 
 #include "tests/members/Pictures.h"
 
@@ -42,6 +44,51 @@ TEST_F(APictureBox, IgnoresBytesBehindThePicture) {
     box.Load(PictureFile(Qt::white, format) + std::string(10000, '\0'));
     EXPECT_EQ(box.Picture().size(), QSize(80, 60)) << format;
   }
+}
+
+TEST_F(APictureBox, ShowsAPictureWhateverFollowsIt) {
+  for (const char* format : {"BMP", "JPG", "PNG"}) {
+    const std::string picture = PictureFile(Qt::white, format);
+    for (const std::string& rest :
+         {std::string(5000, 'x'), std::string(5000, '\xFF'), PictureFile(Qt::red, "JPG"),
+          PictureFile(Qt::red, "JPG").substr(2, 500), std::string("\xFF\xDA\x00\x0C and no end", 16),
+          PictureFile(Qt::red, "BMP"), PictureFile(Qt::red, "PNG"), Gif,
+          picture.substr(picture.size() / 2)}) {
+      box.Clear();
+      box.Load(picture + rest);
+      EXPECT_EQ(box.Picture().pixelColor(0, 0), QColor(Qt::white)) << format << " and " << rest.substr(0, 9);
+    }
+  }
+  for (const std::string& rest : {std::string(5000, 'x'), std::string(), PictureFile(Qt::red, "JPG")}) {
+    box.Clear();
+    box.Load(Gif.substr(0, Gif.size() - 1) + rest);  // without the mark at the end of the file
+    EXPECT_EQ(box.Picture().size(), QSize(1, 1)) << rest.substr(0, 9);
+  }
+}
+
+TEST_F(APictureBox, ShowsABmpWhateverItSaysOfTheFilesSize) {
+  const std::string picture = PictureFile(Qt::red, "BMP");
+  for (const int more : {-100, -1, 1, 2, 0x01000000}) {
+    std::string changed = picture;
+    const auto size = qToLittleEndian(static_cast<quint32>(static_cast<int>(picture.size()) + more));
+    std::memcpy(changed.data() + 2, &size, sizeof size);
+    box.Clear();
+    box.Load(changed);
+    EXPECT_EQ(box.Picture().size(), QSize(80, 60)) << more;
+  }
+}
+
+TEST_F(APictureBox, ShowsAPhotoWithAThumbnail) {
+  const std::string thumbnail = PictureFile(Qt::blue, "JPG", QSize(16, 12));
+  const std::string photo = PictureFile(Qt::red, "JPG");
+  std::string segment("\xFF\xE1\x00\x00", 4);
+  segment[2] = static_cast<char>((thumbnail.size() + 2) / 256);
+  segment[3] = static_cast<char>((thumbnail.size() + 2) % 256);
+  const std::string whole = photo.substr(0, 2) + segment + thumbnail + photo.substr(2);
+  box.Load(whole);
+  EXPECT_EQ(box.Picture().size(), QSize(80, 60));
+  box.Load(whole.substr(0, whole.size() - 2));
+  EXPECT_TRUE(box.Picture().isNull());  // the thumbnail's end is not the photo's
 }
 
 TEST_F(APictureBox, FitsThePictureWithItsProportions) {

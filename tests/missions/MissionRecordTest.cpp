@@ -198,7 +198,7 @@ TEST_F(MissionRow, TakesTheLeadingNumberOfAPenalty) {
 }
 
 TEST_F(MissionRow, RefusesPointsThatAreNoNumber) {
-  for (const char* points : {"abc", "12abc", "1,5", "--1", "1e999"}) {
+  for (const char* points : {"abc", "12abc", "1,5", "--1", "+-5", "-+5", "++5", "1e999"}) {
     MissionRecord mission = MissionWith("x");
     mission.Objectives[1].SecondaryPoints = points;
     EXPECT_NE(NumberThrownBy([&] { Add(mission); }), 0) << points;
@@ -207,7 +207,7 @@ TEST_F(MissionRow, RefusesPointsThatAreNoNumber) {
 
 TEST_F(MissionRow, TakesPointsThatAreANumberInAnyForm) {
   for (const auto& [points, shown] :
-       {std::pair{"12", "12"}, {" 7 ", "7"}, {"-2.5", "-2.5"}, {"1E2", "100"}}) {
+       {std::pair{"12", "12"}, {" 7 ", "7"}, {"-2.5", "-2.5"}, {"+3", "3"}, {"1E2", "100"}}) {
     MissionRecord mission = MissionWith("x");
     mission.Objectives[0].PrimaryPoints = points;
     Add(mission);

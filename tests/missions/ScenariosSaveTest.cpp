@@ -68,6 +68,40 @@ TEST_F(Editor, SavesWhatWasTyped) {
   EXPECT_EQ(Stored("ID", "One"), "3");
 }
 
+TEST_F(Editor, KeepsBlanksOfEveryKindAsTheyWereTyped) {
+  const std::string typed = " a\u00A0b\u2009c\u202Fd\u3000e\tf \u00A0";
+  Open([&] {
+    Press("Edit");
+    Describe(typed + "\n" + typed);
+    for (const char* box : {"PrimaryObjectiveDescription0", "SecondaryObjectiveDescription2"}) {
+      Memo(box).setPlainText(QString::fromStdString(typed));
+    }
+    Type("GameDuration", typed);
+    Type("TeamRatio", typed);
+    Press("Save");
+  });
+  EXPECT_EQ(Stored("MissionDescription", "One"), typed + "\r\n" + typed);
+  for (const char* column :
+       {"PrimaryObjectiveDescriptionA", "SecondaryObjectiveDescriptionC", "GameDuration", "TeamRatio"}) {
+    EXPECT_EQ(Stored(column, "One"), typed) << column;
+  }
+}
+
+TEST_F(Editor, StoresEveryLineBreakAsCarriageReturnAndLineFeed) {
+  Open([this] {
+    Press("Edit");
+    Describe("");
+    QPlainTextEdit& box = Memo("Description");
+    QTest::keyClicks(&box, QStringLiteral("one"));
+    QTest::keyClick(&box, Qt::Key_Return);
+    QTest::keyClicks(&box, QStringLiteral("two"));
+    QTest::keyClick(&box, Qt::Key_Return, Qt::ShiftModifier);
+    QTest::keyClicks(&box, QStringLiteral("three"));
+    Press("Save");
+  });
+  EXPECT_EQ(Stored("MissionDescription", "One"), "one\r\ntwo\r\nthree");
+}
+
 TEST_F(Editor, StandsOnTheLastMissionAfterAnySave) {
   Open([this] {
     Press("Save");

@@ -1,6 +1,7 @@
 #include <QAccessible>
 
 #include "tests/missions/Editor.h"
+#include "tests/support/Captions.h"
 
 namespace {
 
@@ -131,6 +132,29 @@ TEST_F(Editor, BringsTheTabsObjectivesToTheFront) {
   });
 }
 
+TEST_F(Editor, LabelsTheBoxesOfTheTabInFrontAndLeadsTheTabKeyThroughThem) {
+  Open([this] {
+    Show(*window);
+    auto& tabs = ::Find<QTabBar>(*window, "ObjectivesTab");
+    for (int tab = 0; tab < 3; ++tab) {
+      tabs.setCurrentIndex(tab);
+      const std::string set = std::to_string(tab);
+      const std::pair<const char*, std::string> boxes[] = {{"Label4", "PrimaryObjectiveDescription" + set},
+                                                           {"Label1", "PrimaryPoints" + set},
+                                                           {"Label5", "SecondaryObjectiveDescription" + set},
+                                                           {"Label3", "SecondaryPoints" + set}};
+      tabs.setFocus();
+      for (const auto& [label, box] : boxes) {
+        EXPECT_EQ(::Find<QLabel>(*window, label).buddy(), &::Find<QWidget>(*window, box)) << box;
+        ::Type(*window, Qt::Key_Tab);
+        EXPECT_EQ(window->focusWidget()->objectName().toStdString(), box);
+      }
+      ::Type(*window, Qt::Key_Tab);
+      EXPECT_EQ(window->focusWidget()->objectName(), QStringLiteral("SelectExit"));
+    }
+  });
+}
+
 TEST_F(Editor, DeletesTheSelectedMission) {
   Open([this] {
     List().setCurrentRow(1);
@@ -183,6 +207,26 @@ TEST_F(Editor, AsksBeforeItLeavesWhileEditing) {
   EXPECT_EQ(Stored("MissionDescription", "One"), "First text");
 }
 
+TEST_F(Editor, AsksByEscapeAsByItsButton) {
+  venue.Boxes.Answers = {BoxAnswer::Yes};
+  Open([this] {
+    Press("Edit");
+    Describe("saved by Escape");
+    QTest::keyClick(&Memo("Description"), Qt::Key_Escape);
+    EXPECT_FALSE(window->isVisible());
+  });
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(NotSaved(), Saved()));
+  EXPECT_EQ(Stored("MissionDescription", "One"), "saved by Escape");
+}
+
+TEST_F(Editor, LeavesByEscapeWithoutAQuestionWhileLocked) {
+  Open([this] {
+    QTest::keyClick(&List(), Qt::Key_Escape);
+    EXPECT_FALSE(window->isVisible());
+  });
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
 TEST_F(Editor, SavesOnTheWayOutWhenToldTo) {
   Open([this] {
     Press("Edit");
@@ -193,6 +237,59 @@ TEST_F(Editor, SavesOnTheWayOutWhenToldTo) {
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(NotSaved(), Saved()));
   EXPECT_EQ(Stored("MissionDescription", "One"), "saved at last");
 }
+
+class EditorCaptions : public testing::TestWithParam<Language> {
+ protected:
+  std::string In(const char* english, const char* chinese) const {
+    return GetParam() == Language::English ? english : chinese;
+  }
+};
+
+TEST_P(EditorCaptions, AreThoseOfTheStringTable) {
+  DataSite venue(GetParam());
+  venue.PutDefaultFiles();
+  const std::unique_ptr<Database> database = venue.Databases.OpenDatabase(venue.DataFile("scenarios.mdb"));
+  const std::unique_ptr<Recordset> rows = database->OpenRecordset("Table1");
+  const Scenarios window(*database, *rows, venue.Boxes, venue.Strings, nullptr);
+  EXPECT_EQ(window.windowTitle().toStdString(), In("Mission Setup", "任务设置"));
+  ExpectCaptions(window, {{"Frame1", In("Mission Selection", "任务选择")},
+                          {"Frame2", In("Mission Details", "任务详情")},
+                          {"Frame5", In("Penalties", "惩罚")},
+                          {"General", In("General", "常规")},
+                          {"NewButton", In("New", "新建")},
+                          {"Edit", "Edit"},
+                          {"Save", In("Save", "保存")},
+                          {"Delete", In("Delete", "删除")},
+                          {"SelectExit", In("OK", "确定")}});
+  ExpectLabels(window, {{"RespawnPenalty", In("Respawn", "重生")},
+                        {"HealPenalty", In("Heal", "治疗")},
+                        {"GameDuration", In("Game Duration", "比赛时长")},
+                        {"TeamRatio", In("Team Ratio", "队伍比例")},
+                        {"PrimaryObjectiveDescription0", In("Primary  Objective", "主要目标")},
+                        {"PrimaryPoints0", In("Victory points", "胜利分")},
+                        {"SecondaryObjectiveDescription0", In("Secondary Objective", "次要目标")},
+                        {"SecondaryPoints0", In("Victory points", "胜利分")}});
+  const auto& tabs = ::Find<QTabBar>(window, "ObjectivesTab");
+  ASSERT_EQ(tabs.count(), 3);
+  EXPECT_EQ(tabs.tabText(0).toStdString(), In("Team A", "A 队"));
+  EXPECT_EQ(tabs.tabText(1).toStdString(), In("Team B", "B 队"));
+  EXPECT_EQ(tabs.tabText(2).toStdString(), In("Team C", "C 队"));
+}
+
+TEST_P(EditorCaptions, OfANewMissionAreThoseOfTheStringTable) {
+  const StringTable strings(GetParam());
+  const MissionNameEntry window(strings, nullptr);
+  EXPECT_EQ(window.windowTitle().toStdString(), In("New Mission", "新任务"));
+  ExpectCaptions(window, {{"OK", In("OK", "确定")}, {"Cancel", In("Cancel", "取消")}});
+  ExpectLabels(window, {{"MissionEntry", In("Enter new mission name", "请输入新任务的名称")}});
+  EXPECT_EQ(CaptionOf(::Find<QLineEdit>(window, "MissionEntry")), In("New Mission", "新任务"));
+}
+
+INSTANTIATE_TEST_SUITE_P(Languages, EditorCaptions,
+                         testing::Values(Language::English, Language::SimplifiedChinese),
+                         [](const auto& language) {
+                           return language.param == Language::English ? "English" : "SimplifiedChinese";
+                         });
 
 class ChineseEditor : public testing::Test {};
 

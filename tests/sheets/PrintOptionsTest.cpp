@@ -4,12 +4,14 @@
 
 #include <QCheckBox>
 #include <QComboBox>
+#include <QGroupBox>
 #include <QLabel>
 #include <QProgressBar>
 #include <QRadioButton>
 
 #include "sheets/SheetProgressWindow.h"
 #include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/support/Captions.h"
 #include "tests/support/CaredFor.h"
 #include "tests/support/Controls.h"
 
@@ -38,9 +40,42 @@ TEST_P(PrintOptionsWindow, IsCaredFor) {
   Show(window);
   ExpectCaredFor(window);
   EXPECT_EQ(window.windowTitle().toStdString(), strings.Text(159));
-  EXPECT_EQ(Find<QRadioButton>(window, "PrintOne").text().toStdString(), strings.Text(155));
-  EXPECT_EQ(Find<QRadioButton>(window, "PrintFile").text().toStdString(), strings.Text(157));
+  const std::pair<const char*, int> options[] = {{"PrintActive", 152},  {"PrintAll", 153},
+                                                 {"PrintTeam", 154},    {"PrintOne", 155},
+                                                 {"PrintPrinter", 156}, {"PrintFile", 157}};
+  for (const auto& [name, number] : options) {
+    EXPECT_EQ(Find<QRadioButton>(window, name).text().toStdString(), strings.Text(number));
+  }
+  const std::pair<const char*, int> frames[] = {{"Frame1", 149}, {"Frame2", 150}, {"Frame3", 151}};
+  for (const auto& [name, number] : frames) {
+    EXPECT_EQ(Find<QGroupBox>(window, name).title().toStdString(), strings.Text(number));
+  }
+  EXPECT_EQ(Find<QPushButton>(window, "OK").text().toStdString(), strings.Text(140));
+  EXPECT_EQ(Find<QPushButton>(window, "Cancel").text().toStdString(), strings.Text(141));
   EXPECT_EQ(Find<QCheckBox>(window, "HideRank").text().toStdString(), strings.Text(158));
+}
+
+TEST_P(PrintOptionsWindow, HaveTheirCaptions) {
+  const auto in = [](const char* english, const char* chinese) {
+    return std::string(GetParam() == Language::English ? english : chinese);
+  };
+  EXPECT_EQ(window.windowTitle().toStdString(), in("Print Options", "打印选项"));
+  ExpectCaptions(window,
+                 {{"Frame1", in("Select sheets to print", "选择要打印的成绩单")},
+                  {"Frame2", in("Output", "输出")},
+                  {"Frame3", in("Options", "选项")},
+                  {"PrintActive", in("Print score sheets for active players", "打印参赛玩家的成绩单")},
+                  {"PrintAll", in("Print all score sheets", "打印全部成绩单")},
+                  {"PrintTeam", in("Print sheets for Team", "打印指定队伍的成绩单")},
+                  {"PrintOne", in("Print sheet for Player", "打印指定玩家的成绩单")},
+                  {"PrintPrinter", in("Output to Printer", "输出到打印机")},
+                  {"PrintFile", in("Output to Files", "输出到文件")},
+                  {"HideRank", in("Hide Rank", "隐藏名次")},
+                  {"OK", in("OK", "确定")},
+                  {"Cancel", in("Cancel", "取消")}});
+  ExpectLabels(
+      window,
+      {{"TeamID", in("Team", "队伍")}, {"TeamID2", in("Team", "队伍")}, {"PlayerID", in("Player", "玩家")}});
 }
 
 TEST_P(PrintOptionsWindow, OfferTeamsAndNumbers) {
@@ -138,6 +173,27 @@ TEST_P(PrintOptionsWindow, OfTheProgressShowsSheetAndName) {
   EXPECT_FALSE(progress.isVisible());
 }
 
+TEST_P(PrintOptionsWindow, OfTheProgressHasABarThatBeginsEmptyInEachRun) {
+  SheetProgressWindow progress(strings, nullptr);
+  const auto& bar = Find<QProgressBar>(progress, "Progress");
+  for (int run = 1; run <= 2; ++run) {
+    progress.Open();
+    EXPECT_EQ(bar.minimum(), bar.maximum());  // moving until the word processor has started
+    EXPECT_EQ(Find<QLabel>(progress, "SheetLabel").text().toStdString(),
+              strings.Text(OwnText::StartingWordProcessor));
+    EXPECT_EQ(Find<QLabel>(progress, "PlayerLabel").text(), QString());
+    EXPECT_TRUE(Find<QPushButton>(progress, "Stop").isEnabled());
+    progress.ShowSheet(1, 3, "Red 0-Guest");
+    EXPECT_EQ(bar.minimum(), 0);
+    EXPECT_EQ(bar.maximum(), 3);
+    EXPECT_EQ(bar.value(), 0);
+    progress.ShowSheet(3, 3, "Red 2-Guest");
+    EXPECT_EQ(bar.value(), 2);
+    progress.reject();
+    progress.Close();
+  }
+}
+
 TEST_P(PrintOptionsWindow, OfTheProgressShowsAnHourglassButNotInTheBoxesAfterIt) {
   SheetProgressWindow progress(strings, nullptr);
   progress.Open();
@@ -155,6 +211,10 @@ TEST_P(PrintOptionsWindow, OfTheProgressStaysUntilTheSheetIsDone) {
   EXPECT_TRUE(progress.Stopped());
   EXPECT_TRUE(progress.isVisible());
   EXPECT_FALSE(Find<QPushButton>(progress, "Stop").isEnabled());
+  const auto& label = Find<QLabel>(progress, "SheetLabel");
+  EXPECT_EQ(label.text().toStdString(), strings.Text(OwnText::StoppingAfterThisSheet));
+  progress.ShowSheet(1, 3, "Red 0-Guest");
+  EXPECT_EQ(label.text().toStdString(), strings.Text(OwnText::StoppingAfterThisSheet));
   progress.Close();
   progress.Open();
   EXPECT_FALSE(progress.Stopped());

@@ -2,6 +2,8 @@
 
 #include <gmock/gmock.h>
 
+#include <algorithm>
+
 #include "tests/fakes/FakeClock.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFiles.h"
@@ -15,11 +17,21 @@ using testing::Contains;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::Not;
+using testing::Pair;
 using testing::SizeIs;
 using testing::StartsWith;
 using Box = FakeMessageBoxes::Box;
 
-const Box Completed = {"Printing completed.", "Print Status", BoxIcon::Information, BoxButtons::Ok};
+/// The box after a run that did not fail.
+Box Closing(const std::string& text) {
+  return {text, "Print Status", BoxIcon::Information, BoxButtons::Ok};
+}
+
+const Box Completed = Closing("Printing completed.");
+
+const std::string WithoutPdf =
+    "Printing completed. Files saved to /data/scores.\n\n"
+    "The PDF of all sheets could not be made. The sheets themselves are saved.";
 
 Box Failure(const std::string& text) {
   return {text, "Print Error", BoxIcon::Exclamation, BoxButtons::OkCancel};
@@ -220,8 +232,7 @@ TEST_F(Sheets, ForFilesAreNotPrintedAndLeaveOnePdfOfAll) {
   Run();
   EXPECT_THAT(word.Log, Not(Contains("PrintOut")));
   EXPECT_EQ(word.Log.back(), "JoinPdfs 2 /data/scores/Score sheets-21 May 2013-Sniper Hunt.pdf");
-  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Box{"Printing completed. Files saved to /data/Scores.",
-                                                 "Print Status", BoxIcon::Information, BoxButtons::Ok}));
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing("Printing completed. Files saved to /data/scores.")));
   EXPECT_THAT(files.Contents(), IsEmpty());
 }
 
@@ -262,7 +273,41 @@ TEST_F(Sheets, EndBetweenSheetsWhenTheOperatorStopsThem) {
   EXPECT_THAT(word.Documents, SizeIs(3));
   EXPECT_TRUE(Sheet(2).Closed);
   EXPECT_THAT(word.Log.back(), StartsWith("JoinPdfs 3"));
-  EXPECT_EQ(venue.Boxes.Boxes.back().Text, "Printing completed. Files saved to /data/Scores.");
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing("Printing stopped. 3 of 224 sheets have been made. "
+                                                     "Files saved to /data/scores.")));
+}
+
+TEST_F(Sheets, SayThatTheyWereStoppedOnTheirWayToThePrinterToo) {
+  progress.StopAtSheet = 1;
+  Run();
+  EXPECT_EQ(Sheet(0).Printed, 1);
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing("Printing stopped. 1 of 2 sheets have been made.")));
+}
+
+TEST_F(Sheets, AreCompleteWhenTheLastOneWasStopped) {
+  progress.StopAtSheet = 2;
+  Run();
+  EXPECT_THAT(word.Documents, SizeIs(2));
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Completed));
+}
+
+TEST_F(Sheets, NameNoFolderWhenTheyWereStoppedBeforeTheFirst) {
+  choice.OutputTarget = OutputTarget::Files;
+  word.AfterStart = WordState::Starting;
+  events.At(std::chrono::milliseconds(500), [this] { progress.Stop(); });
+  Run();
+  EXPECT_LT(events.Now(), std::chrono::seconds(2));
+  EXPECT_THAT(word.Documents, IsEmpty());
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing("Printing stopped. 0 of 2 sheets have been made.")));
+}
+
+TEST_F(Sheets, NameTheirFolderWhenThereIsNoneToMake) {
+  choice.SheetSelection = SheetSelection::OnePlayer;
+  choice.SelectedTeam = 3;
+  choice.SelectedNumber = 40;
+  choice.OutputTarget = OutputTarget::Files;
+  Run();
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing("Printing completed. Files saved to /data/scores.")));
 }
 
 TEST_F(Sheets, EndWithoutABoxWhenTheProgramCloses) {
@@ -344,15 +389,63 @@ TEST_F(Sheets, NeedToBeSaved) {
   ExpectFailure("SaveAs", "Error occured during file saving.");
 }
 
-TEST_F(Sheets, NeedTheirPdf) {
+TEST_F(Sheets, DoNotNeedTheirPdf) {
   choice.OutputTarget = OutputTarget::Files;
-  ExpectFailure("ExportPdf", "Error occured during file saving.");
+  word.FailAt = "ExportPdf";
+  Run();
+  EXPECT_THAT(Names(), ElementsAre("/data/scores/Red 0-Ann Lee-21 May 2013-Sniper Hunt.doc",
+                                   "/data/scores/Blue 7-Guest-21 May 2013-Sniper Hunt.doc"));
+  EXPECT_TRUE(Sheet(1).Closed);
+  EXPECT_EQ(std::count(word.Log.begin(), word.Log.end(), "ExportPdf"), 1);
+  EXPECT_EQ(word.Log.back(), "Close");  // a PDF of some of the sheets is not made
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing(WithoutPdf)));
   EXPECT_THAT(files.Contents(), IsEmpty());
 }
 
-TEST_F(Sheets, NeedThePdfOfAll) {
+TEST_F(Sheets, DoNotNeedATemporaryFileForThePdf) {
   choice.OutputTarget = OutputTarget::Files;
-  ExpectFailure("JoinPdfs", "Error occured during file saving.");
+  venue.game.Players(1).MemberIndex = 0;  // a photo needs one
+  files.FailCreateFolder(FakeFiles::TempFolder, RuntimeError(75));
+  Run();
+  EXPECT_THAT(word.Documents, SizeIs(2));
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing(WithoutPdf)));
+}
+
+TEST_F(Sheets, DoNotNeedThePdfOfAll) {
+  choice.OutputTarget = OutputTarget::Files;
+  word.FailAt = "JoinPdfs";
+  Run();
+  EXPECT_THAT(word.Documents, SizeIs(2));
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing(WithoutPdf)));
+  EXPECT_THAT(files.Contents(), IsEmpty());
+}
+
+TEST_F(Sheets, SayThatThePdfFailedWhenTheyWereStoppedToo) {
+  choice.OutputTarget = OutputTarget::Files;
+  progress.StopAtSheet = 1;
+  word.FailAt = "JoinPdfs";
+  Run();
+  EXPECT_THAT(
+      venue.Boxes.Boxes,
+      ElementsAre(Closing("Printing stopped. 1 of 2 sheets have been made. "
+                          "Files saved to /data/scores.\n\n"
+                          "The PDF of all sheets could not be made. The sheets themselves are saved.")));
+}
+
+TEST_F(Sheets, EndWithTheirBoxWhenATemporaryPageCannotBeDeleted) {
+  choice.OutputTarget = OutputTarget::Files;
+  files.FailDelete("/tmp/per2", RuntimeError(70));  // per1 is the photo
+  Run();
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Closing("Printing completed. Files saved to /data/scores.")));
+  EXPECT_THAT(files.Contents(), ElementsAre(Pair("/tmp/per2", "")));
+}
+
+TEST_F(Sheets, TellTheirFailureWhenATemporaryPageCannotBeDeleted) {
+  choice.OutputTarget = OutputTarget::Files;
+  files.FailDelete("/tmp/per2", RuntimeError(70));
+  word.FailAt = "Close";
+  Run();
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Failure("Error occured during printing.")));
 }
 
 TEST_F(Sheets, NeedThePrinter) {
@@ -373,6 +466,12 @@ TEST_F(Sheets, CannotHaveANameThatSomeSystemRefuses) {
     EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Failure("Error occured during file saving."))) << part;
     EXPECT_THAT(Names(), ElementsAre("")) << part;
   }
+}
+
+TEST_F(Sheets, CannotBeOfAGameWithoutADate) {
+  venue.game.GameDate = "N/A";
+  Run();
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Failure("Error occured during file saving.")));
 }
 
 TEST_F(Sheets, CannotHaveALongerNameThanFileSystemsTake) {

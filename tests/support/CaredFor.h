@@ -13,6 +13,8 @@
 #include <QLineEdit>
 #include <QPlainTextEdit>
 #include <QProgressBar>
+#include <QScreen>
+#include <QScrollArea>
 #include <QTextEdit>
 #include <QWidget>
 #include <vector>
@@ -50,7 +52,18 @@ inline void ExpectEntriesAreNamed(const QWidget& window) {
   }
 }
 
-/// No caption is cut off, and none is outside the window.
+/// What scrolls in a window that is larger than its screen; null where nothing does.
+inline QScrollArea* ScrolledPart(const QWidget& window) {
+  return window.findChild<QScrollArea*>(QString(), Qt::FindDirectChildrenOnly);
+}
+
+/// The window's own area, or what scrolls in it, which may be larger.
+inline const QWidget& PageOf(const QWidget& widget, const QWidget& window) {
+  const QScrollArea* area = ScrolledPart(window);
+  return area != nullptr && area->widget()->isAncestorOf(&widget) ? *area->widget() : window;
+}
+
+/// No caption is cut off, and nothing lies outside of the window.
 inline void ExpectCaptionsFit(const QWidget& window) {
   for (const QWidget* widget : window.findChildren<QWidget*>()) {
     const auto* label = qobject_cast<const QLabel*>(widget);
@@ -68,8 +81,52 @@ inline void ExpectCaptionsFit(const QWidget& window) {
       EXPECT_GE(widget->width(), widget->minimumSizeHint().width()) << name;
       EXPECT_GE(widget->height(), widget->minimumSizeHint().height()) << name;
     }
-    const QRect place(widget->mapTo(&window, QPoint(0, 0)), widget->size());
-    EXPECT_TRUE(window.rect().contains(place)) << name;
+    const QWidget& page = PageOf(*widget, window);
+    const QRect place(widget->mapTo(&page, QPoint(0, 0)), widget->size());
+    EXPECT_TRUE(page.rect().contains(place)) << name;
+  }
+}
+
+/// No caption of a list's column is cut off.
+inline void ExpectHeadersFit(const QWidget& window) {
+  for (const QHeaderView* header : window.findChildren<QHeaderView*>()) {
+    if (!header->isVisible() || header->orientation() != Qt::Horizontal) {
+      continue;
+    }
+    for (int section = 0; section < header->count(); ++section) {
+      EXPECT_GE(header->sectionSize(section), header->sectionSizeHint(section))
+          << window.objectName().toStdString() << ": "
+          << header->model()->headerData(section, Qt::Horizontal).toString().toStdString();
+    }
+  }
+}
+
+/// The window lies in what the desktop leaves of its screen, and its title is not cut off.
+inline void ExpectInWorkArea(const QWidget& window) {
+  const QRect area = window.screen()->availableGeometry();
+  const QRect place = window.isMaximized() ? window.geometry() : window.frameGeometry();
+  EXPECT_TRUE(area.contains(place)) << window.objectName().toStdString() << ": " << place.x() << ' '
+                                    << place.y() << ' ' << place.width() << ' ' << place.height();
+  EXPECT_GT(window.width(), window.fontMetrics().horizontalAdvance(window.windowTitle()))
+      << window.objectName().toStdString();
+}
+
+/// Each button is in view, or can be scrolled into view.
+inline void ExpectButtonsReachable(const QWidget& window) {
+  QScrollArea* area = ScrolledPart(window);
+  for (QAbstractButton* button : window.findChildren<QAbstractButton*>()) {
+    if (!button->isVisible() || button->objectName().isEmpty() ||
+        button->objectName().startsWith(QStringLiteral("qt_"))) {
+      continue;
+    }
+    if (&PageOf(*button, window) != &window) {
+      area->ensureWidgetVisible(button, 0, 0);
+    }
+    EXPECT_EQ(button->visibleRegion().boundingRect(), button->rect())
+        << window.objectName().toStdString() << ": " << button->objectName().toStdString();
+  }
+  if (area != nullptr) {
+    area->ensureVisible(0, 0);
   }
 }
 
@@ -86,7 +143,12 @@ inline void ExpectTabOrderFollowsTheEye(const QWidget& window) {
       chain.push_back(widget);
     }
   }
-  const auto placeOf = [&window](const QWidget* widget) { return widget->mapTo(&window, QPoint(0, 0)); };
+  const auto placeOf = [&window](const QWidget* widget) {
+    const QWidget& page = PageOf(*widget, window);
+    const QPoint place = widget->mapTo(&page, QPoint(0, 0));
+    const bool isBelowPage = &page == &window && ScrolledPart(window) != nullptr;
+    return isBelowPage ? place + QPoint(0, ScrolledPart(window)->widget()->height()) : place;
+  };
   for (std::size_t i = 1; i < chain.size(); ++i) {
     const QPoint before = placeOf(chain[i - 1]);
     const QPoint after = placeOf(chain[i]);
@@ -96,11 +158,15 @@ inline void ExpectTabOrderFollowsTheEye(const QWidget& window) {
   }
 }
 
-/// All of the above, for a window that is shown, and that it fits on the smallest supported screen.
+/// All of these for a window that is shown and fits, without scrolling, on the smallest screen that the
+/// program is made for.
 inline void ExpectCaredFor(const QWidget& window) {
   QCoreApplication::processEvents();  // layouts follow new texts
   ExpectEntriesAreNamed(window);
   ExpectCaptionsFit(window);
+  ExpectHeadersFit(window);
+  ExpectInWorkArea(window);
+  ExpectButtonsReachable(window);
   ExpectTabOrderFollowsTheEye(window);
   EXPECT_LE(window.minimumSizeHint().width(), 1024) << window.objectName().toStdString();
   EXPECT_LE(window.minimumSizeHint().height(), 768 - 33) << window.objectName().toStdString();

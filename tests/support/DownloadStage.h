@@ -52,6 +52,7 @@ struct DownloadStage {
   FakeDownloadProgress Progress;
   StringTable Strings{Language::English};
   Game Scores{Strings};
+  DownloadedGuns Guns{Scores};
   IniReader Ini{Store, "/tessarine.ini"};
   CommPort Line{Port, Ini, Devices, Boxes, Strings, [this] { ShowSettings(); }};
 
@@ -62,11 +63,11 @@ struct DownloadStage {
   DownloadStage(const DownloadStage&) = delete;
   DownloadStage& operator=(const DownloadStage&) = delete;
 
-  void GetScores() { GetScores(Progress); }
+  DownloadResult GetScores() { return GetScores(Progress); }
 
   /// For a second download during the first.
-  void GetScores(DownloadProgress& progress) {
-    BaseUnitDownload(Port, Line, Events, Boxes, Time, progress, Scores).GetScores();
+  DownloadResult GetScores(DownloadProgress& progress) {
+    return BaseUnitDownload(Port, Line, Events, Boxes, Time, progress, Guns).GetScores();
   }
 
   /// Writes bytes sent, pauses and boxes into the log of the progress window.

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <string>
 #include <utility>
 #include <vector>
@@ -53,7 +54,7 @@ class OpenSession {
   StringTable Strings{Language::English};
   FakeClock Time;
   FakeMessageBoxes Boxes;
-  SqliteEngine Databases;
+  SqliteEngine Databases{std::chrono::milliseconds(50)};
   FakeOldDatabases Old;
   LinuxFiles Disk;
   Session session{Strings, Time, Boxes};

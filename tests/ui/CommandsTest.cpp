@@ -100,6 +100,31 @@ TEST_F(CommandTable, ReportsAFailureAndGoesOn) {
   EXPECT_EQ(boxes.Boxes.size(), 1U);
 }
 
+TEST_F(CommandTable, LetsEscapePressTheButtonThatEndsTheWindow) {
+  window.Table.Connect(window, {{&window.Send, &CommandDialog::LogOne}});
+  window.Table.EscapePresses(window.Send);
+  QTest::keyClick(&window.Entry, Qt::Key_Escape);
+  EXPECT_THAT(window.Log, ElementsAre("one"));
+  EXPECT_TRUE(window.isVisible());
+  EXPECT_TRUE(window.Send.hasFocus());
+}
+
+TEST_F(CommandTable, LetsEscapeDoNothingWhileACommandRuns) {
+  window.Table.Connect(window, {{&window.Send, &CommandDialog::LogOne}});
+  window.Table.EscapePresses(window.Send);
+  window.Table.Run([this] { QTest::keyClick(&window, Qt::Key_Escape); });
+  EXPECT_THAT(window.Log, IsEmpty());
+  EXPECT_TRUE(window.isVisible());
+}
+
+TEST_F(CommandTable, LetsAFailedCheckStopEscape) {
+  window.Table.Connect(window, {{&window.Send, &CommandDialog::LogOne}});
+  window.Table.EscapePresses(window.Send);
+  window.Table.EntriesHold = [] { return false; };
+  QTest::keyClick(&window.Entry, Qt::Key_Escape);
+  EXPECT_THAT(window.Log, IsEmpty());
+}
+
 TEST_F(CommandTable, TellsWhetherACommandFailed) {
   EXPECT_TRUE(window.Table.Run([] {}));
   EXPECT_FALSE(window.Table.Run([] { throw RuntimeError(53); }));

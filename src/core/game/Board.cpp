@@ -49,6 +49,7 @@ void Board::Clear() {
   rows_.clear();
   rows_.reserve(PlayerCount);
   order_.clear();
+  ++clears_;
   changed_();
 }
 
@@ -84,7 +85,6 @@ void SortListNumeric(Board& list, BoardColumn column, bool assignRanks, Game& ga
       game.Players(place).Rank = place;
     } else if (assignRanks) {
       row.Rank = place;
-      row.Placed = true;
       StoreRank(row, place, game);
     }
   }

@@ -27,8 +27,7 @@ enum class AccuracyKind { Known, NoShots, NoPrimaryDamage };
 struct BoardRow {
   int Index = 0;                ///< record of the player, 1 to 224; 0 for a team
   int Team = 0;                 ///< 1 to 3
-  std::int32_t Rank = 0;        ///< the one that the record had, or a team's 0; with `Placed` the place
-  bool Placed = false;          ///< a sort has given the row its place
+  std::int32_t Rank = 0;        ///< place, 1 = first; 0 until a sort assigns it
   std::string MemberName = {};  ///< empty for a player who is no member
   std::int32_t Soldiering = 0;
   AccuracyKind HasAccuracy = AccuracyKind::Known;
@@ -57,6 +56,8 @@ class Board {
   const BoardRow& RowAt(int place) const { return rows_[order_.at(static_cast<std::size_t>(place))]; }
 
   void Clear();
+  /// How many times the list has been cleared.
+  int Clears() const { return clears_; }
   void AddRow(BoardRow row);
 
  private:
@@ -67,6 +68,7 @@ class Board {
   const std::function<void()> changed_;
   std::vector<BoardRow> rows_;      ///< in the order of adding
   std::vector<std::size_t> order_;  ///< indexes into `rows_` as shown
+  int clears_ = 0;
 };
 
 /// Sorts by the numbers that `column` shows, in the list's current direction; an accuracy counts with its two

@@ -12,7 +12,7 @@ std::string BoardTexts::Header(BoardList list, BoardColumn column) const {
 std::string BoardTexts::Cell(const BoardRow& row, BoardColumn column) const {
   switch (column) {
     case BoardColumn::Rank:
-      return row.Placed ? std::to_string(row.Rank) : Str(row.Rank);
+      return std::to_string(row.Rank);
     case BoardColumn::Player:
       return row.MemberName.empty() ? Name(row) : Name(row) + ": " + row.MemberName;
     case BoardColumn::Soldiering:

@@ -1,17 +1,20 @@
 #include "core/game/MissionList.h"
 
+#include <utility>
+
 #include "core/data/FieldValue.h"
 #include "core/data/Rows.h"
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 
 void MissionList::FillMissionList() {
-  items_ = {{strings_.Text(119), 0}, {strings_.Text(120), 0}};
-  listIndex_ = None;
-  ForEachRow(rsScenarios_, [this] {
-    items_.push_back(
+  std::vector<Item> items = {{strings_.Text(119), 0}, {strings_.Text(120), 0}};
+  ForEachRow(rsScenarios_, [this, &items] {
+    items.push_back(
         {TextOf(rsScenarios_.Fields("MissionName")), RoundToInt32(NumberOf(rsScenarios_.Fields("ID")))});
   });
+  items_ = std::move(items);
+  listIndex_ = None;
 }
 
 const std::string& MissionList::Text() const {

@@ -23,7 +23,7 @@ class MissionList {
   MissionList(Recordset& rsScenarios, const StringTable& strings, MessageBoxes& boxes)
       : rsScenarios_(rsScenarios), strings_(strings), boxes_(boxes) {}
 
-  /// Reloads the list. The active mission is "None" afterwards.
+  /// Reloads the list. The active mission is "None" afterwards. A failure changes neither.
   void FillMissionList();
 
   const std::vector<Item>& Items() const { return items_; }

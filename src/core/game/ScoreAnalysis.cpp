@@ -3,6 +3,7 @@
 #include <cmath>
 #include <limits>
 #include <utility>
+#include <vector>
 
 #include "core/data/FieldValue.h"
 #include "core/text/NumberForms.h"
@@ -54,7 +55,7 @@ AccuracyKind KindOfAccuracy(const Player& player) {
 
 }  // namespace
 
-void ScoreAnalysis::CalculateScores() {
+bool ScoreAnalysis::CalculateScores() {
   players_.Clear();
   teams_.Clear();
   for (std::int32_t& total : game_.TeamTotals) {
@@ -62,14 +63,26 @@ void ScoreAnalysis::CalculateScores() {
   }
   missionPoints_.reset();
   AddUpDamage();
+  // Listed once all are scored, so that nobody sees a part of the rows, whether a box is open or a figure
+  // overflows.
+  std::vector<BoardRow> rows;
   for (int index = 1; index <= PlayerCount; ++index) {
-    if (game_.Players(index).Active) {
-      ScorePlayer(index);
+    if (!game_.Players(index).Active) {
+      continue;
     }
+    std::optional<BoardRow> row = ScorePlayer(index);
+    if (!row) {
+      return false;
+    }
+    rows.push_back(std::move(*row));
+  }
+  for (BoardRow& row : rows) {
+    players_.AddRow(std::move(row));
   }
   ListTeams();
   SortListNumeric(players_, BoardColumn::Soldiering, true, game_);
   SortListNumeric(teams_, BoardColumn::Soldiering, true, game_);
+  return true;
 }
 
 void ScoreAnalysis::AddUpDamage() {
@@ -134,27 +147,32 @@ bool ScoreAnalysis::IsOwnTeamHit(int victim, int shooter) const {
          TeamFromId(IdFromIndex(victim)) == TeamFromId(IdFromIndex(shooter));
 }
 
-void ScoreAnalysis::ScorePlayer(int index) {
+std::optional<BoardRow> ScoreAnalysis::ScorePlayer(int index) {
+  const auto overtaken = [this, clears = players_.Clears()] { return players_.Clears() != clears; };
   Player& player = game_.Players(index);
   const int team = TeamFromId(IdFromIndex(index));
-  // What may show a box comes before the row: a command given meanwhile can rebuild the lists.
   std::string memberName = NameOfMember(player);
+  if (overtaken()) {
+    return std::nullopt;
+  }
   CalculateAccuracy(player);
   CalculateSoldiering(player);
   AddMissionPoints(player, game_.TeamNames(team));
-  players_.AddRow({.Index = index,
-                   .Team = team,
-                   .Rank = player.Rank,
-                   .MemberName = std::move(memberName),
-                   .Soldiering = player.Soldiering,
-                   .HasAccuracy = KindOfAccuracy(player),
-                   .Accuracy = player.Accuracy,
-                   .Damage = player.TotalDamage,
-                   .ShotsFired = player.ShotCount,
-                   .Wia = player.HealCount,
-                   .Kia = player.DeathCount,
-                   .AmmoAdds = player.AmmoAddCount});
+  if (overtaken()) {
+    return std::nullopt;
+  }
   AddTo(game_.TeamTotals(team), player.Soldiering);
+  return BoardRow{.Index = index,
+                  .Team = team,
+                  .MemberName = std::move(memberName),
+                  .Soldiering = player.Soldiering,
+                  .HasAccuracy = KindOfAccuracy(player),
+                  .Accuracy = player.Accuracy,
+                  .Damage = player.TotalDamage,
+                  .ShotsFired = player.ShotCount,
+                  .Wia = player.HealCount,
+                  .Kia = player.DeathCount,
+                  .AmmoAdds = player.AmmoAddCount};
 }
 
 std::string ScoreAnalysis::NameOfMember(Player& player) {
@@ -186,9 +204,6 @@ void ScoreAnalysis::CalculateSoldiering(Player& player) const {
 }
 
 void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName) {
-  if (missions_.ListIndex() <= MissionList::FreeForAll) {
-    return;
-  }
   if (!missionPoints_) {
     if (!missions_.ActivateCurrentMissionRecord()) {
       return;

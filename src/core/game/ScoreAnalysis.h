@@ -2,6 +2,7 @@
 
 #include <array>
 #include <optional>
+#include <string>
 
 #include "core/game/Board.h"
 #include "core/game/Game.h"
@@ -22,8 +23,10 @@ class ScoreAnalysis {
         players_(players),
         teams_(teams) {}
 
-  /// Throws RuntimeError 6 when a figure leaves the 32-bit range; the lists are then incomplete.
-  void CalculateScores();
+  /// Throws RuntimeError 6 when a figure leaves the 32-bit range; both lists are then empty. Returns false if
+  /// a command given in one of its boxes cleared the lists, usually to calculate anew: whatever that command
+  /// left stays.
+  bool CalculateScores();
 
  private:
   /// Rewards and penalties of the active mission.
@@ -41,7 +44,8 @@ class ScoreAnalysis {
   void AddUpDamageHitByHit();
   /// True if this counts as friendly fire: both are on one team, and the mode is not Free For All.
   bool IsOwnTeamHit(int victim, int shooter) const;
-  void ScorePlayer(int index);
+  /// Calculates a player's score and row. Returns nullopt if the lists were cleared in a box meanwhile.
+  std::optional<BoardRow> ScorePlayer(int index);
   /// Finds the member by the button where none is assigned. Empty when there is none.
   std::string NameOfMember(Player& player);
   void CalculateAccuracy(Player& player) const;

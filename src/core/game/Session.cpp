@@ -30,7 +30,7 @@ bool Session::Open(const Sources& sources) {
     return false;
   }
   rsScenarios_ = dbScenarios_->OpenRecordset("Table1");
-  missions_.emplace(*rsScenarios_, strings_, boxes_);
+  missions_.emplace(*rsScenarios_, strings_, unlockingBoxes_);
   FillMissionList();
   rsScenarios_->MoveFirst();
   dbMembers_ = open("members", "Members");
@@ -38,7 +38,7 @@ bool Session::Open(const Sources& sources) {
     return false;
   }
   rsMembers_ = dbMembers_->OpenRecordset("Members");
-  members_.emplace(*rsMembers_, boxes_);
+  members_.emplace(*rsMembers_, unlockingBoxes_);
   analysis_.emplace(game_, factors_, *missions_, *members_, players_, teams_);
   return true;
 }
@@ -58,12 +58,14 @@ std::string Session::TakeBackupFailure() {
 }
 
 void Session::CalculateScores() {
+  bool complete = false;
   {
-    const ReadScope members(*dbMembers_);
-    const ReadScope missions(*dbScenarios_);
-    analysis_->CalculateScores();
+    const CalculationReads reads(*dbMembers_, *dbScenarios_, unlockingBoxes_);
+    complete = analysis_->CalculateScores();
   }
-  listeners_.Tell(SessionChange::Scores);
+  if (complete) {
+    listeners_.Tell(SessionChange::Scores);
+  }
 }
 
 void Session::CalculateScoresWhenPresent() {

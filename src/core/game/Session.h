@@ -7,6 +7,7 @@
 
 #include "core/data/Backups.h"
 #include "core/game/Board.h"
+#include "core/game/CalculationReads.h"
 #include "core/game/CommitGame.h"
 #include "core/game/Game.h"
 #include "core/game/Listeners.h"
@@ -84,7 +85,9 @@ class Session {
   Database& DbMembers() { return *dbMembers_; }
   Recordset& RsMembers() { return *rsMembers_; }
 
-  /// Throws as ScoreAnalysis::CalculateScores does; the lists are then incomplete, and Scores is not told.
+  /// Throws as ScoreAnalysis::CalculateScores does; the lists are then empty, and Scores is not told. Nor is
+  /// it told by a calculation that a command in one of its boxes has overtaken. While a box is open, other
+  /// programs can write both databases.
   void CalculateScores();
   /// Does the same, but only if there is a game and the databases are open.
   void CalculateScoresWhenPresent();
@@ -92,7 +95,8 @@ class Session {
   /// Sorts the players as a click on column header `header` (counted from 1) does.
   void SortByHeader(int header);
 
-  /// Reads the missions anew and makes "None" the active one.
+  /// Reads the missions anew and makes "None" the active one. A failure to read them leaves list and active
+  /// mission as they were.
   void FillMissionList();
   /// Makes entry `index` of the missions the active one. A box reports a mission whose row is gone.
   void SelectMission(int index);
@@ -120,6 +124,7 @@ class Session {
   Board teams_{[this] { listeners_.Tell(SessionChange::TeamRows); }};
   bool missionIsActive_ = false;
   std::string missionDescription_;
+  UnlockingBoxes unlockingBoxes_{boxes_};
 
   // In the order in which Open creates them.
   std::optional<Backups> backups_;

@@ -35,14 +35,31 @@ bool GetFlag(pugi::xml_node node, const char* name, const char* fallback) {
   return ToDouble(GetChildText(node, name, fallback)) == 1;
 }
 
-/// True for a document with one root element and no text beside it.
+/// True for a document with one root element and no text beside it; a declaration may only come first, and a
+/// document type only before the root.
 bool IsWellFormed(const pugi::xml_document& document) {
   int elements = 0;
+  int documentTypes = 0;
   for (const pugi::xml_node node : document.children()) {
-    if (node.type() == pugi::node_element) {
-      ++elements;
-    } else if (node.type() == pugi::node_pcdata || node.type() == pugi::node_cdata) {
-      return false;
+    switch (node.type()) {
+      case pugi::node_element:
+        ++elements;
+        break;
+      case pugi::node_doctype:
+        if (++documentTypes > 1 || elements > 0) {
+          return false;
+        }
+        break;
+      case pugi::node_declaration:
+        if (node.previous_sibling()) {
+          return false;
+        }
+        break;
+      case pugi::node_pcdata:
+      case pugi::node_cdata:
+        return false;
+      default:
+        break;
     }
   }
   return elements == 1;
@@ -52,8 +69,9 @@ bool IsWellFormed(const pugi::xml_document& document) {
 bool Parse(std::string& bytes, pugi::xml_document& document) {
   // embed_pcdata keeps a leaf's text in its element: a hit takes 4 nodes instead of 7, and a game can hold
   // 50,176 hits.
-  constexpr unsigned int options =
-      pugi::parse_default | pugi::parse_ws_pcdata_single | pugi::parse_fragment | pugi::parse_embed_pcdata;
+  constexpr unsigned int options = pugi::parse_default | pugi::parse_declaration | pugi::parse_doctype |
+                                   pugi::parse_ws_pcdata_single | pugi::parse_fragment |
+                                   pugi::parse_embed_pcdata;
   const bool isWide = bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF");
   if (!isWide && bytes.find('\0') != std::string::npos) {
     return false;
@@ -86,7 +104,7 @@ std::vector<std::string_view> CutPlayers(std::string_view bytes) {
 /// Parses one of the texts from CutPlayers, with `text` as work space.
 bool ParsePlayer(std::string_view player, std::string& text, pugi::xml_document& document) {
   text = player;
-  return Parse(text, document) && document.child("Player");
+  return Parse(text, document);
 }
 
 /// Parses the file without its players. Returns false unless parsing these one by one gives the same players

@@ -206,7 +206,6 @@ std::string PlainDecimal(double value) {
 }
 
 double Val(std::string_view text) {
-  text = Trimmed(text, IsWhiteSpace);
   std::string dense;
   const std::size_t next = text.find_first_not_of("0123456789+-.Ee");
   if (next != std::string_view::npos && IsWhiteSpace(text[next])) {

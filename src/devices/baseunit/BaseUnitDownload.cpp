@@ -20,49 +20,56 @@ constexpr milliseconds RejectPause{2000};
 
 BaseUnitDownload::BaseUnitDownload(SerialPort& port, CommPort& commPort, EventPump& events,
                                    MessageBoxes& boxes, const Clock& clock, DownloadProgress& progress,
-                                   Game& game)
+                                   DownloadedGuns& guns)
     : commPort_(commPort),
       events_(events),
       boxes_(boxes),
       clock_(clock),
       progress_(progress),
-      game_(game),
+      guns_(guns),
       job_(port, events, "base-unit", [&progress] { return progress.ClosedByOperator(); }) {}
 
-void BaseUnitDownload::GetScores() {
+DownloadResult BaseUnitDownload::GetScores() {
+  guns_.Begin();
   progress_.Open();
   progress_.SetStatusText("Requesting Data...");
-  if (commPort_.OpenCommPort(LineSettings)) {
-    Transfer();
+  const bool atEnd = commPort_.OpenCommPort(LineSettings) && Transfer();
+  if (atEnd && result_.Received == result_.Expected) {
+    result_.End = DownloadEnd::Complete;
+    guns_.Settle();
+  } else if (Stopped()) {
+    result_.End = DownloadEnd::Stopped;
   }
   progress_.Close();
   job_.Close();
+  return result_;
 }
 
-void BaseUnitDownload::Transfer() {
+bool BaseUnitDownload::Transfer() {
   SendByte(1);
   job_.Pause(RequestPause);
   SendByte(0);
   const auto count = ReceiveByte();
   if (!count) {
-    return;
+    return false;
   }
   if (*count == 0) {
     progress_.Close();
     boxes_.Show("Kesh has no score data.", DefaultBoxTitle, BoxIcon::Information);
-    return;
+    return true;
   }
+  result_.Expected = *count;
   progress_.SetMaximum(*count);
   for (int frame = 1; frame <= *count; ++frame) {
     progress_.SetStatusText("Accepting Score Data...");
     progress_.StartTransferAnim();
     progress_.SetProgress(frame);
     if (!ReceiveFrame()) {
-      return;
+      return false;
     }
     const auto crc = ReceiveByte();
     if (!crc) {
-      return;
+      return false;
     }
     if (ChecksumFits(*crc)) {
       AcceptFrame();
@@ -70,6 +77,7 @@ void BaseUnitDownload::Transfer() {
       RejectFrame();
     }
   }
+  return true;
 }
 
 bool BaseUnitDownload::ReceiveFrame() {
@@ -98,7 +106,8 @@ bool BaseUnitDownload::ChecksumFits(std::uint8_t crc) const {
 }
 
 void BaseUnitDownload::AcceptFrame() {
-  AnalyseData(buffer_, game_, clock_);
+  guns_.AnalyseData(buffer_, clock_);
+  ++result_.Received;
   job_.Pause(ReplyPause);
   SendByte(FrameAccepted);
 }
@@ -137,7 +146,15 @@ std::optional<std::uint8_t> BaseUnitDownload::ReceiveByte() {
   return std::nullopt;
 }
 
+bool BaseUnitDownload::Stopped() const {
+  // Only a command of ours closes the line; one that is lost stays open.
+  return job_.Stopped() || (job_.Fault() && job_.Fault()->Error.Number() == Fault::PortNotOpen);
+}
+
 void BaseUnitDownload::TellOfFault() {
+  if (Stopped()) {
+    return;
+  }
   if (const auto fault = job_.FaultToTell()) {
     boxes_.Show(fault->Sending ? "Error occured sending data. Please try again."
                                : "Error occured receiving data. Please try again.",

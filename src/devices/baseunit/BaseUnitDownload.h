@@ -5,10 +5,10 @@
 #include <optional>
 #include <string>
 
-#include "core/game/Game.h"
 #include "core/game/ScoreFrame.h"
 #include "core/line/CommPort.h"
 #include "core/line/SerialJob.h"
+#include "devices/baseunit/DownloadedGuns.h"
 #include "platform/Clock.h"
 #include "platform/EventPump.h"
 #include "platform/MessageBoxes.h"
@@ -22,7 +22,7 @@ class DownloadProgress {
   /// Shows the window with its bar at 0 of 224 and the animation stopped.
   virtual void Open() = 0;
   virtual void Close() = 0;
-  /// True once the operator has closed the window: the transfer must then end silently.
+  /// True once the operator has stopped the transfer or closed the window: it must then end silently.
   virtual bool ClosedByOperator() const = 0;
 
   virtual void SetStatusText(const std::string& text) = 0;
@@ -30,6 +30,19 @@ class DownloadProgress {
   /// Moves the bar to `value` and also shows it as a number.
   virtual void SetProgress(int value) = 0;
   virtual void StartTransferAnim() = 0;
+};
+
+/// How a download ended.
+enum class DownloadEnd {
+  Complete,  ///< every frame was taken; also when there was none
+  Stopped,   ///< by the operator, by another command that took the line, or by the end of the program
+  Failed     ///< no line, no answer in time, a line that was lost, or a frame with a wrong check byte
+};
+
+struct DownloadResult {
+  DownloadEnd End = DownloadEnd::Failed;
+  int Received = 0;  ///< frames taken
+  int Expected = 0;  ///< frames that the unit has; 0 when it did not say
 };
 
 /// One download of a game from the base unit: single-byte commands out, one length-prefixed frame for each
@@ -42,14 +55,15 @@ class BaseUnitDownload {
   static constexpr const char* LineSettings = "19200,N,8,1";
 
   BaseUnitDownload(SerialPort& port, CommPort& commPort, EventPump& events, MessageBoxes& boxes,
-                   const Clock& clock, DownloadProgress& progress, Game& game);
+                   const Clock& clock, DownloadProgress& progress, DownloadedGuns& guns);
 
   /// Runs the download, message boxes included, and leaves the line closed. Accepted frames are in the game,
-  /// however it ended.
-  void GetScores();
+  /// however it ended. When another command has closed the line meanwhile, the download ends without a box.
+  DownloadResult GetScores();
 
  private:
-  void Transfer();
+  /// False when it broke off.
+  bool Transfer();
   bool ReceiveFrame();
   void AcceptFrame();
   void RejectFrame();
@@ -59,14 +73,16 @@ class BaseUnitDownload {
   /// The next byte; nothing if the transfer must end: no byte in 5 s, line failure, or a window closed.
   std::optional<std::uint8_t> ReceiveByte();
   void TellOfFault();
+  bool Stopped() const;
 
   CommPort& commPort_;
   EventPump& events_;
   MessageBoxes& boxes_;
   const Clock& clock_;
   DownloadProgress& progress_;
-  Game& game_;
+  DownloadedGuns& guns_;
   SerialJob job_;
   ReceiveBuffer buffer_{};
+  DownloadResult result_;
   std::size_t length_ = 0;  ///< length word of the current frame, 0 to 32767
 };

@@ -37,11 +37,6 @@ void GunListModel::Show(const GunTable& guns, std::int16_t maxPlayerId) {
     }
     ++row;
   }
-  if (row < rows_.size()) {
-    beginRemoveRows({}, static_cast<int>(row), static_cast<int>(rows_.size()) - 1);
-    rows_.erase(rows_.begin() + static_cast<std::ptrdiff_t>(row), rows_.end());
-    endRemoveRows();
-  }
 }
 
 void GunListModel::Clear() {

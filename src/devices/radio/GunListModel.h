@@ -15,7 +15,8 @@ class GunListModel : public QAbstractTableModel {
   /// `player` is the header of the first column.
   explicit GunListModel(const QString& player, QObject* parent);
 
-  /// Shows the guns that ListedGuns gives.
+  /// Shows the guns that ListedGuns gives: those in the list and any more. A gun leaves the list by Clear
+  /// alone.
   void Show(const GunTable& guns, std::int16_t maxPlayerId);
   void Clear();
 

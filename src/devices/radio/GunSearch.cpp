@@ -30,7 +30,6 @@ void GunSearch::SearchGuns(std::int16_t maxPlayerId) {
     }
   }
   display_.SetStatus("Idle");
-  link_.XBee_CloseCommPort();
 }
 
 void GunSearch::Ask(std::uint8_t playerId) {

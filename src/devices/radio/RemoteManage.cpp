@@ -37,6 +37,7 @@ RemoteManage::RemoteManage(const Parts& parts, QWidget* parent)
   commands_.Connect(*this, {{ui_->SearchGunsButton, &RemoteManage::SearchForGuns},
                             {ui_->GetScoresButton, &RemoteManage::GetScores}});
   connect(ui_->Close, &QPushButton::clicked, this, &QDialog::reject);
+  commands_.EscapePresses(*ui_->Close);
 }
 
 RemoteManage::~RemoteManage() = default;

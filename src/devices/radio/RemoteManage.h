@@ -23,7 +23,8 @@ class RemoteManage;
 }
 
 /// The guns in radio range, and their scores. Both buttons stay enabled during a run; a later run ends the
-/// earlier one. If closed during a run, the window goes once the run has unwound.
+/// earlier one. If closed during a run, the window goes once the run has unwound; Escape does not close it
+/// then.
 class RemoteManage : public QDialog, private RadioDisplay {
   Q_OBJECT
 

@@ -64,7 +64,6 @@ void ScoreFetch::GetScores() {
     }
   }
   display_.SetStatus("Done");
-  link_.XBee_CloseCommPort();
 }
 
 void ScoreFetch::FetchGun(int index) {
@@ -111,10 +110,15 @@ bool ScoreFetch::Command(const GunEntry& gun, std::uint8_t playerId, std::span<c
   if (!link_.WaitForFrame(true)) {
     return false;
   }
+  // A status frame may come along with the answer: the data received last counts. It is kept, because what
+  // begins behind it is written over it.
+  ReceivedFrame received = link_.Frame();
   while (link_.TakeFrame()) {
-    // a status frame may come along with the answer: the data received last counts
+    if (link_.ReceivedFrameType() == XBeeApi::Receive64) {
+      received = link_.Frame();
+    }
   }
-  answer_ = ReadGunPacket(link_.Frame());
+  answer_ = ReadGunPacket(received);
   return answer_.Type == GunPacketType::CommandAnswer;
 }
 

@@ -1,19 +1,14 @@
 #include "platform/libreoffice/OfficeDocument.h"
 
-#include <algorithm>
 #include <atomic>
-#include <com/sun/star/awt/Size.hpp>
-#include <com/sun/star/beans/XPropertySet.hpp>
 #include <com/sun/star/container/NoSuchElementException.hpp>
 #include <com/sun/star/container/XContentEnumerationAccess.hpp>
 #include <com/sun/star/container/XEnumerationAccess.hpp>
 #include <com/sun/star/container/XNamed.hpp>
 #include <com/sun/star/frame/XStorable.hpp>
-#include <com/sun/star/lang/XMultiServiceFactory.hpp>
 #include <com/sun/star/sheet/XCellRangeData.hpp>
 #include <com/sun/star/table/XCellRange.hpp>
-#include <com/sun/star/text/TableColumnSeparator.hpp>
-#include <com/sun/star/text/TextContentAnchorType.hpp>
+#include <com/sun/star/text/WrapTextMode.hpp>
 #include <com/sun/star/text/XBookmarksSupplier.hpp>
 #include <com/sun/star/text/XTextContent.hpp>
 #include <com/sun/star/text/XTextFrame.hpp>
@@ -26,14 +21,15 @@
 #include <cppuhelper/implbase1.hxx>
 #include <filesystem>
 #include <rtl/ref.hxx>
+#include <string_view>
 #include <utility>
+
+#include "platform/libreoffice/OfficePicture.h"
 
 namespace container = com::sun::star::container;
 namespace table = com::sun::star::table;
 namespace text = com::sun::star::text;
 namespace view = com::sun::star::view;
-using com::sun::star::awt::Size;
-using com::sun::star::beans::XPropertySet;
 using com::sun::star::uno::UNO_QUERY;
 using com::sun::star::uno::UNO_QUERY_THROW;
 using Uno::Any;
@@ -83,11 +79,13 @@ void WriteAtOnce(table::XCellRange& range, const Block& block) {
 }
 
 /// Tables with merged cells have no ranges; their cells are found by name: "B3" is the second one in row 3.
+/// Behind column Z come a to z, and then AA.
 Reference<text::XText> CellByName(text::XTextTable& table, int row, int column) {
-  constexpr int letters = 26;
+  constexpr std::string_view letters = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz";
+  constexpr int count = static_cast<int>(letters.size());
   OUString name;
-  for (int rest = column + 1; rest > 0; rest = (rest - 1) / letters) {
-    name = OUString(static_cast<sal_Unicode>('A' + (rest - 1) % letters)) + name;
+  for (int rest = column + 1; rest > 0; rest = (rest - 1) / count) {
+    name = OUString(static_cast<sal_Unicode>(letters[static_cast<std::size_t>((rest - 1) % count)])) + name;
   }
   return {table.getCellByName(name + OUString::number(row + 1)), UNO_QUERY_THROW};
 }
@@ -109,41 +107,6 @@ void WriteBlock(text::XTextTable& table, table::XCellRange& range, const Block& 
   }
 }
 
-/// Room for a picture in a cell of a table's first row, in 1/100 mm: the cell's inner width, in portrait
-/// format (3:4).
-Size PictureBox(text::XTextTable& table, int column, const Reference<text::XText>& cell) {
-  const Reference<XPropertySet> whole(&table, UNO_QUERY_THROW);
-  const Reference<XPropertySet> inside(cell, UNO_QUERY_THROW);
-  const Reference<XPropertySet> row(table.getRows()->getByIndex(0), UNO_QUERY_THROW);
-  const auto number = [](const Reference<XPropertySet>& properties, const char* name) {
-    sal_Int32 value = 0;
-    properties->getPropertyValue(OUString::createFromAscii(name)) >>= value;
-    return value;
-  };
-  Sequence<text::TableColumnSeparator> separators;
-  row->getPropertyValue("TableColumnSeparators") >>= separators;
-  sal_Int16 sum = 0;
-  whole->getPropertyValue("TableColumnRelativeSum") >>= sum;
-  const int left = column == 0 || column > separators.getLength() ? 0 : separators[column - 1].Position;
-  const int right = column < separators.getLength() ? separators[column].Position : sum;
-  const int width = number(whole, "Width") * (right - left) / std::max<int>(sum, 1) -
-                    number(inside, "LeftBorderDistance") - number(inside, "RightBorderDistance");
-  constexpr int least = 500;
-  const int usable = std::max(width, least);
-  return {usable, usable * 4 / 3};
-}
-
-/// The largest size that fits into `box` with the proportions of `picture`.
-Size Fit(const Size& picture, const Size& box) {
-  if (picture.Width <= 0 || picture.Height <= 0) {
-    return box;
-  }
-  const double scale = std::min(static_cast<double>(box.Width) / picture.Width,
-                                static_cast<double>(box.Height) / picture.Height);
-  return {std::max(1, static_cast<int>(picture.Width * scale)),
-          std::max(1, static_cast<int>(picture.Height * scale))};
-}
-
 /// Calls `use` with each paragraph of a text and each table in it, or with each portion of a paragraph.
 template <typename Use>
 void ForEachPart(const Reference<container::XEnumerationAccess>& whole, Use&& use) {
@@ -160,6 +123,18 @@ void AddTable(const Any& part, BodyTables& names) {
   }
 }
 
+/// True unless the frame is a text box, which may begin with a table as well: text runs through it, or it
+/// keeps a distance (in 1/100 mm) from what is in it.
+bool IsOfFloatingTable(const Reference<text::XTextFrame>& frame) {
+  const Reference<com::sun::star::beans::XPropertySet> properties(frame, UNO_QUERY_THROW);
+  text::WrapTextMode wrap{};
+  properties->getPropertyValue("Surround") >>= wrap;
+  sal_Int32 distance = 0;
+  properties->getPropertyValue("LeftBorderDistance") >>= distance;
+  constexpr sal_Int32 rounding = 10;
+  return wrap != text::WrapTextMode_THROUGH && distance < rounding;
+}
+
 /// Word counts a table that text flows around among the body's tables. LibreOffice puts it first in a frame,
 /// which is anchored to the paragraph after it or to a character of that paragraph.
 void AddFloatingTables(const Any& place, BodyTables& names) {
@@ -168,7 +143,7 @@ void AddFloatingTables(const Any& place, BodyTables& names) {
       access->createContentEnumeration("com.sun.star.text.TextContent");
   while (hanging->hasMoreElements()) {
     const Reference<text::XTextFrame> frame(hanging->nextElement(), UNO_QUERY);
-    if (frame.is()) {
+    if (frame.is() && IsOfFloatingTable(frame)) {
       const Reference<container::XEnumerationAccess> inside(frame->getText(), UNO_QUERY_THROW);
       AddTable(inside->createEnumeration()->nextElement(), names);
     }
@@ -230,20 +205,9 @@ void OfficeDocument::WriteCells(int number, int firstRow, int rows, const std::v
 
 void OfficeDocument::AddPicture(int number, int row, int column, const std::string& file) {
   Uno::Call([&] {
-    const Reference<text::XTextTable> whole = Table(number);
-    const Reference<text::XText> cell = CellByName(*whole, row - 1, column - 1);
-    const Reference<XPropertySet> graphic(
+    const Reference<com::sun::star::beans::XPropertySet> graphic(
         services_.Graphics->queryGraphic(Uno::Properties({{"URL", Any(Uno::UrlOf(file))}})), UNO_QUERY_THROW);
-    Size own;
-    graphic->getPropertyValue("SizePixel") >>= own;
-    const Reference<com::sun::star::lang::XMultiServiceFactory> factory(document_, UNO_QUERY_THROW);
-    const Reference<text::XTextContent> picture(
-        factory->createInstance("com.sun.star.text.TextGraphicObject"), UNO_QUERY_THROW);
-    const Reference<XPropertySet> properties(picture, UNO_QUERY_THROW);
-    properties->setPropertyValue("Graphic", Any(graphic));
-    properties->setPropertyValue("AnchorType", Any(text::TextContentAnchorType_AS_CHARACTER));
-    properties->setPropertyValue("Size", Any(Fit(own, PictureBox(*whole, column - 1, cell))));
-    cell->insertTextContent(cell->getStart(), picture, false);
+    InsertPicture(document_, graphic, CellByName(*Table(number), row - 1, column - 1));
   });
 }
 

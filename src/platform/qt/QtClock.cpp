@@ -19,12 +19,12 @@ QString Lenient(QString form) {
   return form;
 }
 
-/// Two-digit years in files mean 1930 to 2029.
-const QDate EarliestOfFiles(1930, 1, 1);
+/// Two-digit years mean 1930 to 2029.
+constexpr int EarliestYear = 1930;
 
 }  // namespace
 
-QDate DateIn(const QLocale& locale, const QString& text, QDate earliest) {
+QDate DateIn(const QLocale& locale, const QString& text) {
   const QString longForm = Lenient(ShortFormatWithFullYear(locale));
   for (const QString& form : {longForm, QStringLiteral("yyyy-M-d")}) {
     if (const QDate date = locale.toDate(text, form); date.isValid()) {
@@ -33,12 +33,13 @@ QDate DateIn(const QLocale& locale, const QString& text, QDate earliest) {
   }
   QString shortForm = longForm;
   shortForm.replace(QStringLiteral("yyyy"), QStringLiteral("yy"));
-  QDate date = locale.toDate(text, shortForm);  // in the 1900s
-  constexpr int century = 100;
-  while (date.isValid() && date < earliest) {
-    date = date.addYears(century);
+  const QDate date = locale.toDate(text, shortForm);  // in the 1900s
+  if (!date.isValid()) {
+    // The year 2000 has a 29 February, 1900 had none.
+    return locale.toDate(QString(text).replace(QStringLiteral("00"), QStringLiteral("2000")), longForm);
   }
-  return date;
+  constexpr int century = 100;
+  return date.year() < EarliestYear ? date.addYears(century) : date;
 }
 
 std::string ShortDateText(const QLocale& locale, QDate date) {
@@ -53,7 +54,7 @@ std::string LongDateText(const QLocale& locale, const QString& text) {
   // Both the date and the time may contain spaces, so the longest prefix that is a date counts.
   const QString trimmed = text.trimmed();
   for (auto end = trimmed.size(); end > 0; end = trimmed.lastIndexOf(u' ', end - 1)) {
-    if (const QDate date = DateIn(locale, trimmed.left(end), EarliestOfFiles); date.isValid()) {
+    if (const QDate date = DateIn(locale, trimmed.left(end)); date.isValid()) {
       return locale.toString(date, QLocale::LongFormat).toStdString();
     }
   }

@@ -13,12 +13,12 @@ std::string ShortDateText(const QLocale& locale, QDate date);
 std::string ShortTimeText(const QLocale& locale, QTime time);
 
 /// Parses all of `text` as a date, in the short format of `locale` with a two- or four-digit year, or as
-/// year-month-day; leading zeros are optional. A two-digit year means the hundred years from `earliest` on.
-/// Invalid if `text` is not a date.
-QDate DateIn(const QLocale& locale, const QString& text, QDate earliest);
+/// year-month-day; leading zeros are optional. A two-digit year means 1930 to 2029. Invalid if `text` is not
+/// a date.
+QDate DateIn(const QLocale& locale, const QString& text);
 
 /// The date at the start of `text`, in the long format of `locale`; `text` unchanged if there is none. Dates
-/// are parsed as by DateIn; two-digit years mean 1930 to 2029.
+/// are parsed as by DateIn.
 std::string LongDateText(const QLocale& locale, const QString& text);
 
 class QtClock : public Clock {

@@ -1,8 +1,15 @@
 #include "platform/qt/QtFileDialog.h"
 
+#include <QAbstractButton>
+#include <QDialogButtonBox>
 #include <QDir>
+#include <QEvent>
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QFileSystemModel>
+#include <QGuiApplication>
+#include <QLineEdit>
+#include <QListView>
 #include <QPointer>
 #include <QRegularExpression>
 #include <QStandardPaths>
@@ -24,6 +31,50 @@ QString SuffixOf(const QString& nameFilter) {
   static const QRegularExpression first(QStringLiteral("\\(\\*\\.([^ *?)]+)[^(]*\\)$"));
   return first.match(nameFilter).captured(1);
 }
+
+/// The toolkit's dialog, except that it always takes the name that stands in its entry.
+class NamingDialog : public QFileDialog {
+ public:
+  explicit NamingDialog(QWidget* parent) : QFileDialog(parent) {}
+
+  /// To be called once the dialog has its controls.
+  void WatchButtons() {
+    for (QAbstractButton* button : findChild<QDialogButtonBox*>()->buttons()) {
+      button->installEventFilter(this);
+    }
+  }
+
+ protected:
+  // A button that a screen reader presses acts on a timer, which can overtake keys that were typed before.
+  bool eventFilter(QObject* watched, QEvent* event) override {
+    if (event->type() == QEvent::Timer && qobject_cast<QAbstractButton*>(watched) != nullptr) {
+      const QPointer<QObject> button(watched);
+      QGuiApplication::sync();
+      return button.isNull();
+    }
+    return QFileDialog::eventFilter(watched, event);
+  }
+
+  void accept() override {
+    LeaveOtherFile();
+    QFileDialog::accept();
+  }
+
+ private:
+  /// The toolkit prefers the file that is selected in the list, and takes the selection from it only while
+  /// the entry has the keyboard's focus.
+  void LeaveOtherFile() const {
+    const auto* entry = findChild<QLineEdit*>(QStringLiteral("fileNameEdit"));
+    const auto* list = findChild<QListView*>(QStringLiteral("listView"));
+    for (const QModelIndex& row : list->selectionModel()->selectedRows()) {
+      const QFileInfo file(row.data(QFileSystemModel::FilePathRole).toString());
+      if (!file.isDir() && file.fileName() != entry->text()) {
+        list->selectionModel()->clear();
+        return;
+      }
+    }
+  }
+};
 
 QString StartFolder(const FileRequest& request, const QString& lastFolder) {
   QString folder = QString::fromStdString(request.Folder);
@@ -66,7 +117,7 @@ std::optional<std::string> QtFileDialog::ShowSave(const FileRequest& request) {
 
 std::optional<std::string> QtFileDialog::Ask(bool save, const FileRequest& request) {
   // Not on the stack: its parent may be destroyed, and the dialog with it, while it is open.
-  const QPointer<QFileDialog> dialog = new QFileDialog(parent_());
+  const QPointer<NamingDialog> dialog = new NamingDialog(parent_());
   dialog->setObjectName(QStringLiteral("CommonDialog1"));
   dialog->setAcceptMode(save ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
   // The caller decides what to do if there is no such file, even when opening.
@@ -88,6 +139,7 @@ std::optional<std::string> QtFileDialog::Ask(bool save, const FileRequest& reque
     setSuffix(dialog->selectedNameFilter());
     QObject::connect(dialog, &QFileDialog::filterSelected, dialog, setSuffix);
   }
+  dialog->WatchButtons();
   const bool accepted = dialog->exec() == QDialog::Accepted;
   const QStringList chosen = accepted ? dialog->selectedFiles() : QStringList();
   delete dialog;

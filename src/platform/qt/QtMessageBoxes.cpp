@@ -1,9 +1,12 @@
 #include "platform/qt/QtMessageBoxes.h"
 
 #include <QCloseEvent>
+#include <QCursor>
+#include <QGuiApplication>
 #include <QKeyEvent>
 #include <QMessageBox>
 #include <QPointer>
+#include <vector>
 
 namespace {
 
@@ -22,6 +25,27 @@ class QuestionBox : public QMessageBox {
     }
   }
   void closeEvent(QCloseEvent* event) override { event->ignore(); }
+};
+
+/// Takes the hourglass away as long as it exists: a box waits for the operator, not the operator for it.
+class OrdinaryPointer {
+ public:
+  OrdinaryPointer() {
+    while (const QCursor* cursor = QGuiApplication::overrideCursor()) {
+      covered_.push_back(*cursor);
+      QGuiApplication::restoreOverrideCursor();
+    }
+  }
+  ~OrdinaryPointer() {
+    for (auto cursor = covered_.rbegin(); cursor != covered_.rend(); ++cursor) {
+      QGuiApplication::setOverrideCursor(*cursor);
+    }
+  }
+  OrdinaryPointer(const OrdinaryPointer&) = delete;
+  OrdinaryPointer& operator=(const OrdinaryPointer&) = delete;
+
+ private:
+  std::vector<QCursor> covered_;
 };
 
 QMessageBox* NewBox(BoxButtons buttons, QWidget* parent) {
@@ -92,6 +116,7 @@ BoxAnswer QtMessageBoxes::Show(const std::string& text, const std::string& title
   box->setWindowTitle(QString::fromStdString(title));
   box->setIcon(IconOf(icon));
   SetButtons(*box, buttons);
+  const OrdinaryPointer pointer;
   const int pressed = box->exec();
   delete box;
   return AnswerOf(pressed, buttons);

@@ -33,7 +33,7 @@ Value NumberFrom(std::string_view text) {
     throw RuntimeError(Fault::DataConversion, "Data type conversion error.");
   }
   text = text.substr(first, text.find_last_not_of(" \t") + 1 - first);
-  if (text.starts_with('+')) {
+  if (text.starts_with('+') && !text.starts_with("+-")) {
     text.remove_prefix(1);
   }
   const char* const end = text.data() + text.size();

@@ -148,7 +148,7 @@ TEST_F(Sorting, OfAColumnLeavesThePlaces) {
   Add(2, Red(1), 5);
   Add(1, Red(2), 7);
   SortByHeader(list, 3, game);
-  EXPECT_THAT(Column(BoardColumn::Rank), ElementsAre(" 1", " 2"));
+  EXPECT_THAT(Column(BoardColumn::Rank), ElementsAre("1", "2"));
   EXPECT_EQ(game.Players(Red(1)).Rank, 0);
 }
 
@@ -156,7 +156,7 @@ TEST_F(Sorting, ByRankWritesEachPlaceIntoTheRecordOfThatNumber) {
   Add(2, Blue(4), 5);
   Add(1, Yellow(9), 7);
   SortByHeader(list, 1, game);
-  EXPECT_THAT(Column(BoardColumn::Rank), ElementsAre(" 1", " 2"));
+  EXPECT_THAT(Column(BoardColumn::Rank), ElementsAre("1", "2"));
   EXPECT_EQ(game.Players(1).Rank, 1);
   EXPECT_EQ(game.Players(2).Rank, 2);
   EXPECT_EQ(game.Players(Blue(4)).Rank, 0);
@@ -198,17 +198,18 @@ TEST_F(Sorting, ByRankGoesUpwardByNumber) {
 }
 
 TEST_F(Sorting, OfEachColumnGoesByItsOwnFigure) {
-  BoardRow low = RowOf(Red(0));
-  BoardRow high = RowOf(Red(1));
-  high.Soldiering = high.Damage = high.ShotsFired = high.Wia = high.Kia = high.AmmoAdds = 1;
-  high.Accuracy = 0.5F;
-  list.AddRow(std::move(low));
-  list.AddRow(std::move(high));
+  std::vector<BoardRow> rows;
   for (int header = 3; header <= BoardColumnCount; ++header) {
-    SortByHeader(list, 2, game);
-    ASSERT_EQ(list.RowAt(0).Index, Red(0));
+    rows.push_back(RowOf(Red(header)));
+  }
+  rows[0].Soldiering = rows[2].Damage = rows[3].ShotsFired = rows[4].Wia = rows[5].Kia = rows[6].AmmoAdds = 1;
+  rows[1].Accuracy = 0.5F;
+  for (BoardRow& row : rows) {
+    list.AddRow(std::move(row));
+  }
+  for (int header = 3; header <= BoardColumnCount; ++header) {
     SortByHeader(list, header, game);
-    EXPECT_EQ(list.RowAt(0).Index, Red(1)) << header;
+    EXPECT_EQ(list.RowAt(0).Index, Red(header));
   }
 }
 

@@ -29,7 +29,6 @@ TEST_F(TextsOfTheBoard, ShowEachFigureInItsColumn) {
   const BoardRow row{.Index = 40,
                      .Team = 2,
                      .Rank = 7,
-                     .Placed = true,
                      .MemberName = "Mole",
                      .Soldiering = -289,
                      .Accuracy = 0.5F,
@@ -40,14 +39,6 @@ TEST_F(TextsOfTheBoard, ShowEachFigureInItsColumn) {
                      .AmmoAdds = 2};
   EXPECT_THAT(Cells(row),
               ElementsAre("7", "Blue  7: Mole", "-289", "50.00%", " 240", " 60", " 1", " 3", " 2"));
-}
-
-TEST_F(TextsOfTheBoard, ShowAPlaceThatNoSortGaveInTheNumberForm) {
-  BoardRow row = RowOf(1);
-  row.Rank = 3;
-  EXPECT_EQ(texts.Cell(row, BoardColumn::Rank), " 3");
-  row.Placed = true;
-  EXPECT_EQ(texts.Cell(row, BoardColumn::Rank), "3");
 }
 
 TEST_F(TextsOfTheBoard, NameEveryPlayerByTeamAndNumber) {
@@ -66,7 +57,7 @@ TEST_F(TextsOfTheBoard, LeaveTheMemberOutOfTheName) {
 }
 
 TEST_F(TextsOfTheBoard, ShowATeamInThreeColumns) {
-  EXPECT_THAT(Cells({.Team = 3, .Rank = 1, .Placed = true, .Soldiering = -11}, TeamColumnCount),
+  EXPECT_THAT(Cells({.Team = 3, .Rank = 1, .Soldiering = -11}, TeamColumnCount),
               ElementsAre("1", "Yellow", "-11"));
 }
 

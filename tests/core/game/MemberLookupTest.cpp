@@ -3,6 +3,7 @@
 #include <gmock/gmock.h>
 
 #include "core/data/FieldValue.h"
+#include "core/game/HitLines.h"
 #include "tests/support/ScoredGame.h"
 #include "tests/support/Thrown.h"
 
@@ -196,6 +197,20 @@ TEST_F(MemberNames, OfMembersWhoAreGoneAreMissedInABoxForEachPlayer) {
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(box, box));
   venue.CalculateScores();
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(box, box, box, box));
+}
+
+TEST_F(MemberNames, StandBehindAHitAndAreMissedThereInABoxToo) {
+  venue.Open();
+  const auto lineOf = [this](std::int32_t member, bool useNickName) {
+    venue.game.Players(Blue7).MemberIndex = member;
+    return HitText("Blue  7", {Blue7, 30}, venue.game, *venue.Members, useNickName);
+  };
+  EXPECT_EQ(lineOf(7, true), "Blue  7:  30  (Mole)");
+  EXPECT_EQ(lineOf(0, true), "Blue  7:  30");
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+  EXPECT_EQ(lineOf(-1, true), "Blue  7:  30");
+  EXPECT_EQ(lineOf(5, false), "Blue  7:  30");
+  EXPECT_EQ(venue.Boxes.Boxes.size(), 2U);
 }
 
 TEST_F(MemberNames, AppearInChineseBehindTheTeam) {

@@ -42,6 +42,9 @@ TEST_F(ListOfMissions, StandsOnNoneAfterEachFill) {
   venue.Missions->Select(3);
   venue.Missions->FillMissionList();
   EXPECT_EQ(venue.Missions->ListIndex(), MissionList::None);
+  venue.Missions->Select(MissionList::FreeForAll);
+  venue.Missions->FillMissionList();
+  EXPECT_EQ(venue.Missions->ListIndex(), MissionList::None);
 }
 
 TEST_F(ListOfMissions, NamesTheActiveEntry) {
@@ -232,6 +235,19 @@ TEST_F(MissionScores, PayTheSetsInTheirOrderPrimaryFirst) {
   venue.game.ObjectiveTeams(2).PrimaryAchieved = false;
   Score();
   EXPECT_EQ(ScoreOf(Red0), 1);  // secondary first gives 1, then 1.5 is 2
+}
+
+// See Soldiering.IsReckonedInMoreThanDoublePrecision.
+TEST_F(MissionScores, AreReckonedInMoreThanDoublePrecision) {
+  Set("RespawnPenalty = 0.3, HealPenalty = 0.3, PrimaryObjectivePointsC = 0.49999999999999994");
+  venue.game.Players(Red0).RespawnCount = 5;
+  venue.game.Players(Blue0).HealCount = 5;
+  venue.game.Players(Yellow0).BonusPoints = 1;
+  venue.game.ObjectiveTeams(3).PrimaryAchieved = true;
+  Score();
+  EXPECT_EQ(ScoreOf(Red0), -1);
+  EXPECT_EQ(ScoreOf(Blue0), -1);
+  EXPECT_EQ(ScoreOf(Yellow0), 1);
 }
 
 TEST_F(MissionScores, StartFromTheRoundedSum) {

@@ -2,8 +2,11 @@
 
 #include <gmock/gmock.h>
 
+#include <iterator>
 #include <limits>
 #include <memory>
+#include <random>
+#include <string>
 #include <utility>
 
 #include "tests/support/Described.h"
@@ -240,6 +243,14 @@ TEST(Damage, OutsideTheRangeIsAnOverflowEvenOfInactivePlayers) {
   }
 }
 
+TEST(Damage, OutsideTheRangeOnTheWayIsAnOverflowThoughTheSumIsNot) {
+  ScoredGame venue;
+  venue.game.Players(Red1).HitByPlayer(Red0) = 1;
+  venue.game.Players(Blue0).HitByPlayer(Red0) = Most;
+  venue.game.Players(Blue7).HitByPlayer(Red0) = -Most;
+  EXPECT_EQ(NumberThrownBy([&venue] { venue.CalculateScores(); }), 6);
+}
+
 TEST(Damage, IsNotOutsideTheRangeWhileNobodyOfTheTeamIsHit) {
   ScoredGame venue;
   venue.Factors.FriendlyFire = 1e300;
@@ -247,6 +258,50 @@ TEST(Damage, IsNotOutsideTheRangeWhileNobodyOfTheTeamIsHit) {
   venue.game.Players(Blue0).HitByPlayer(Red0) = 5;
   venue.CalculateScores();
   EXPECT_EQ(venue.game.Players(Red0).TotalDamage, 5);
+}
+
+/// The damage of all players but `besides`, or that a figure left the range.
+std::string DamageOf(ScoredGame& venue, int besides) {
+  if (const int fault = NumberThrownBy([&venue] { venue.CalculateScores(); }); fault != 0) {
+    return "fault " + std::to_string(fault);
+  }
+  std::string damage;
+  for (int index = 1; index <= PlayerCount; ++index) {
+    if (index != besides) {
+      const Player& player = venue.game.Players(index);
+      damage += std::to_string(player.TotalDamage) + '/' + std::to_string(player.AbsoluteDamage) + ' ';
+    }
+  }
+  return damage;
+}
+
+// A single hit below 0, of a player without any other, has all hits added up one by one.
+TEST(Damage, IsTheSameWhetherAddedUpAtOnceOrHitByHit) {
+  std::mt19937 random(20);
+  constexpr int outsider = Blue95;
+  int faults = 0;
+  ScoredGame venue;
+  venue.Open();
+  for (int game = 0; game < 300; ++game) {
+    venue.game.Clear();
+    const double factors[] = {-1, 0, 1, 2, -3, 1000, -70'000, 2147483647.0, 4e9};
+    venue.Factors.FriendlyFire = factors[random() % std::size(factors)];
+    const unsigned largest = 0x7FFFFFFFU >> random() % 31;
+    for (int hit = 0; hit < 60; ++hit) {
+      const int victim = 1 + static_cast<int>(random() % PlayerCount);
+      const int shooter = 1 + static_cast<int>(random() % 8) * 28;
+      if (shooter != outsider) {
+        venue.game.Players(victim).HitByPlayer(shooter) = static_cast<std::int32_t>(random() & largest);
+      }
+    }
+    venue.Missions->Select(static_cast<int>(random() % 2));
+    const std::string atOnce = DamageOf(venue, outsider);
+    venue.game.Players(Red0).HitByPlayer(outsider) = -1;
+    ASSERT_EQ(atOnce, DamageOf(venue, outsider)) << "game " << game;
+    faults += atOnce.starts_with("fault") ? 1 : 0;
+  }
+  EXPECT_GT(faults, 30);
+  EXPECT_LT(faults, 270);
 }
 
 TEST(Soldiering, RoundsHalvesToTheEvenNumber) {
@@ -285,6 +340,44 @@ TEST(Soldiering, TakesEachCountByItsOwnFactor) {
   venue.game.Players(Blue0).HitByPlayer(Red0) = 1;
   venue.CalculateScores();
   EXPECT_EQ(player.Soldiering, 132411);
+}
+
+// 0.3 is a little below three tenths: five times that is below 1.5, but exactly 1.5 in double precision,
+// which would round to 2.
+TEST(Soldiering, IsReckonedInMoreThanDoublePrecision) {
+  const std::pair<double SoldieringFactors::*, std::int32_t Player::*> cases[] = {
+      {&SoldieringFactors::Heal, &Player::HealCount},
+      {&SoldieringFactors::Death, &Player::DeathCount},
+      {&SoldieringFactors::Ammo, &Player::AmmoAddCount}};
+  for (const auto& [factor, count] : cases) {
+    ScoredGame venue;
+    venue.Factors = {0, 0, 0, 0, 0, 0};
+    venue.Factors.*factor = 0.3;
+    venue.Activate(Red0).*count = 5;
+    venue.CalculateScores();
+    EXPECT_EQ(venue.game.Players(Red0).Soldiering, 1);
+  }
+  ScoredGame venue;
+  venue.Factors = {.Damage = 0.3, .Death = 0, .Heal = 0, .Ammo = 0, .Accuracy = 0.03, .FriendlyFire = 0.3};
+  venue.game.Players(Blue0).HitByPlayer(Red0) = 5;
+  venue.Activate(Red0);
+  venue.Activate(Red1).Accuracy = 0.5F;
+  venue.game.Players(Yellow0).HitByPlayer(Yellow0) = 5;
+  venue.CalculateScores();
+  EXPECT_EQ(venue.game.Players(Red0).Soldiering, 1);
+  EXPECT_EQ(venue.game.Players(Red1).Soldiering, 1);
+  EXPECT_EQ(venue.game.Players(Yellow0).TotalDamage, 1);
+}
+
+TEST(Soldiering, LosesNoPointInASumOfLargeFigures) {
+  constexpr double twoTo53 = 9007199254740992.0;
+  ScoredGame venue;
+  venue.Factors = {.Damage = 1, .Death = -twoTo53, .Heal = twoTo53, .Ammo = 0, .Accuracy = 0};
+  Player& player = venue.Activate(Red0);
+  player.HealCount = player.DeathCount = 1;
+  venue.game.Players(Blue0).HitByPlayer(Red0) = 1;
+  venue.CalculateScores();
+  EXPECT_EQ(player.Soldiering, 1);
 }
 
 TEST(Soldiering, OutsideTheRangeIsAnOverflow) {
@@ -345,6 +438,16 @@ TEST(Accuracy, DividesByThePrimaryDamageFirst) {
   venue.game.Players(Blue0).HitByPlayer(Red0) = 589'027'389;
   venue.CalculateScores();
   EXPECT_EQ(player.Accuracy, 0.0264496896F);  // the other order and one division give 0.0264496878F
+}
+
+TEST(Accuracy, OfShotsThatAllMissedIsShownAsZero) {
+  ScoredGame venue;
+  Player& player = venue.Activate(Red0);
+  player.PrimaryDamage = 10;
+  player.ShotCount = 1;
+  venue.CalculateScores();
+  EXPECT_EQ(player.Accuracy, 0);
+  EXPECT_EQ(venue.Cell(0, BoardColumn::Accuracy), "0.00%");
 }
 
 TEST(Accuracy, CountsOwnTeamHitsInFull) {

@@ -67,6 +67,25 @@ TEST_F(Decoding, DatesTheGameAndEmptiesTheBuffer) {
   EXPECT_TRUE(std::all_of(buffer.begin(), buffer.end(), [](auto byte) { return byte == 0; }));
 }
 
+TEST_F(Decoding, EmptiesTheWholeBuffer) {
+  buffer.fill(7);
+  Decode(FrameOfBlue0());
+  EXPECT_TRUE(std::all_of(buffer.begin(), buffer.end(), [](auto byte) { return byte == 0; }));
+}
+
+TEST_F(Decoding, TakesAHitThatEndsInTheLastByteOfTheBuffer) {
+  Decode(LongestFrameOfRed1());
+  EXPECT_EQ(Red1().HitByPlayer(2), 517);
+}
+
+TEST_F(Decoding, DatesTheGameByTheLastFrame) {
+  Decode(FrameOfBlue0());
+  clock.Date = "22/05/2013";
+  clock.Time = "00:01";
+  Decode(FrameOfRed1());
+  EXPECT_EQ(game.GameDate, "22/05/2013 00:01");
+}
+
 TEST_F(Decoding, OfAFrameWithoutHitsLeavesThePlayerActive) {
   Decode(FrameOfBlue0());
   EXPECT_TRUE(game.Players(33).Active);

@@ -102,18 +102,101 @@ TEST_F(Sessions, CalculateOnlyAGameThatIsPresentWhereThatIsAsked) {
   EXPECT_EQ(told.back(), Change::Scores);
 }
 
-TEST_F(Sessions, KeepTheRowsUpToAnOverflowUntoldAndWithoutPlaces) {
+TEST_F(Sessions, HaveEmptyListsAfterAnOverflowAlsoWhenAHeaderIsClicked) {
   Start();
-  venue.Play(Red0, 5).Rank = 4;
+  venue.Play(Red0, 5);
   venue.Play(2, std::numeric_limits<std::int32_t>::max());
   venue.Play(Blue7, 9);
   EXPECT_EQ(NumberThrownBy([this] { session.CalculateScores(); }), 6);
   EXPECT_THAT(told, ElementsAre(Change::PlayerRows, Change::TeamRows));
-  EXPECT_THAT(Players(), ElementsAre("Red  0", "Red  1"));
-  EXPECT_THAT(venue.Column(BoardList::Players, BoardColumn::Rank), ElementsAre(" 4", " 0"));
+  EXPECT_THAT(Players(), IsEmpty());
   EXPECT_EQ(session.List(BoardList::Teams).RowCount(), 0);
   session.SortByHeader(3);
-  EXPECT_THAT(Players(), ElementsAre("Red  1", "Red  0"));
+  EXPECT_THAT(Players(), IsEmpty());
+  session.Game().Players(2).BonusPoints = 1;
+  session.CalculateScores();
+  EXPECT_THAT(Players(), ElementsAre("Blue  7", "Red  0", "Red  1"));
+}
+
+TEST_F(Sessions, LeaveBothDatabasesToOtherProgramsWhileABoxIsOpen) {
+  AddMissions();
+  AddMember();
+  Start();
+  session.SelectMission(3);
+  venue.Play(Red0, 5).MemberIndex = 7;
+  venue.Play(2, 6).MemberIndex = 99;
+  venue.Play(Blue7, 9).MemberIndex = 98;
+  venue.Boxes.WhileOpen = [this](const FakeMessageBoxes::Box&) {
+    EXPECT_EQ(OtherConnection(venue.MembersFile()).Try("UPDATE Members SET City = 'Bern'"), SQLITE_OK);
+    EXPECT_EQ(OtherConnection(venue.ScenariosFile()).Try("UPDATE Table1 SET TeamRatio = '1'"), SQLITE_OK);
+  };
+  session.CalculateScores();
+  EXPECT_EQ(venue.Boxes.Boxes.size(), 2U);
+  ExecuteSql(venue.ScenariosFile(), "DELETE FROM Table1 WHERE ID = 5");
+  session.CalculateScores();
+  EXPECT_EQ(venue.Boxes.Boxes.size(), 2U + 2U + 3U);
+}
+
+class CommandsInABox : public Sessions {
+ protected:
+  /// Red 0 and Blue 7 play; the member of Red 1 is gone, which a calculation reports in a box.
+  void SetUp() override {
+    AddMissions();
+    Start();
+    venue.Play(Red0, 5);
+    venue.Play(2, 6).MemberIndex = 99;
+    venue.Play(Blue7, 9);
+  }
+
+  /// Runs `command` in the first box that opens.
+  void InTheBox(const std::function<void()>& command) {
+    venue.Boxes.WhileOpen = [this, command](const FakeMessageBoxes::Box&) {
+      venue.Boxes.WhileOpen = nullptr;
+      command();
+    };
+  }
+};
+
+TEST_F(CommandsInABox, MayCalculateAnewAndListEachPlayerOnce) {
+  InTheBox([this] {
+    EXPECT_THAT(Players(), IsEmpty());
+    session.Game().Players(Red0).BonusPoints = 70;
+    session.CalculateScores();
+  });
+  session.CalculateScores();
+  EXPECT_THAT(Players(), ElementsAre("Red  0", "Blue  7", "Red  1"));
+  EXPECT_THAT(venue.Column(BoardList::Players, BoardColumn::Soldiering), ElementsAre(" 70", " 9", " 6"));
+  EXPECT_THAT(venue.Column(BoardList::Teams, BoardColumn::Soldiering), ElementsAre(" 76", " 9", " 0"));
+  EXPECT_EQ(session.Game().TeamTotals(1), 76);
+  EXPECT_THAT(told, ElementsAre(Change::PlayerRows, Change::TeamRows, Change::PlayerRows, Change::TeamRows,
+                                Change::PlayerRows, Change::TeamRows, Change::Scores));
+}
+
+TEST_F(CommandsInABox, MayClearTheGame) {
+  session.Game().Players(2).Accuracy = 0.5F;
+  InTheBox([this] { session.ClearPlayerData(); });
+  session.CalculateScores();
+  EXPECT_THAT(Players(), IsEmpty());
+  EXPECT_EQ(session.List(BoardList::Teams).RowCount(), 0);
+  EXPECT_EQ(session.Game().Players(2).Soldiering, 0);
+  EXPECT_EQ(told.back(), Change::Cleared);
+}
+
+TEST_F(CommandsInABox, MayDoSoInTheBoxAboutAMissionToo) {
+  session.Game().Players(2).MemberIndex = 0;
+  session.SelectMission(3);
+  ExecuteSql(venue.ScenariosFile(), "DELETE FROM Table1 WHERE ID = 5");
+  InTheBox([this] { session.SelectMission(MissionList::None); });
+  session.CalculateScores();
+  EXPECT_EQ(venue.Boxes.Boxes.size(), 1U);
+  EXPECT_THAT(Players(), ElementsAre("Blue  7", "Red  1", "Red  0"));
+  EXPECT_EQ(session.Game().TeamTotals(1), 11);
+}
+
+TEST_F(CommandsInABox, MaySortTheListThatIsStillEmpty) {
+  InTheBox([this] { session.SortByHeader(1); });
+  session.CalculateScores();
+  EXPECT_THAT(Players(), ElementsAre("Red  0", "Red  1", "Blue  7"));
 }
 
 TEST_F(Sessions, SortThePlayersAlone) {
@@ -145,8 +228,12 @@ TEST_F(Sessions, ForgetTheGameButNotTheMission) {
 TEST_F(Sessions, TellOfAMissionBeforeAndAfterItsRowIsLookedFor) {
   AddMissions();
   Start();
+  std::vector<int> chosen;
+  const Subscription choices =
+      session.Listen([&](Change) { chosen.push_back(session.Missions().ListIndex()); });
   session.SelectMission(2);
   EXPECT_THAT(told, ElementsAre(Change::Mission, Change::MissionRow));
+  EXPECT_THAT(chosen, ElementsAre(2, 2));
   EXPECT_TRUE(session.MissionIsActive());
   EXPECT_EQ(session.MissionDescription(), "Hold it");
   EXPECT_EQ(IntegerOf(session.RsScenarios(), "ID"), 3);
@@ -190,6 +277,40 @@ TEST_F(Sessions, ReadTheMissionsAnewAndStandOnNone) {
                                 Change::TeamRows, Change::PlayerRows, Change::TeamRows, Change::Scores));
   EXPECT_EQ(session.Missions().Text(), "None");
   EXPECT_FALSE(session.MissionIsActive());
+}
+
+TEST_F(Sessions, StandOnNoneAlsoAfterFreeForAllWhenTheMissionsAreReadAnew) {
+  Start();
+  session.SelectMission(MissionList::FreeForAll);
+  venue.Play(Red0, 5);
+  session.Game().Players(2).HitByPlayer(Red0) = 30;
+  session.FillMissionList();
+  EXPECT_EQ(session.Missions().Text(), "None");
+  EXPECT_EQ(session.Game().Players(Red0).Soldiering, 5 - 30);
+}
+
+TEST_F(Sessions, KeepListAndMissionWhenTheMissionsCannotBeReadAnew) {
+  AddMissions();
+  Start();
+  session.SelectMission(3);
+  venue.Play(Red0, 5).RespawnCount = 2;
+  session.CalculateScores();
+  told.clear();
+  {
+    OtherConnection other(venue.ScenariosFile());
+    other.Execute("DELETE FROM Table1 WHERE ID = 9; BEGIN EXCLUSIVE");
+    EXPECT_EQ(NumberThrownBy([this] { session.FillMissionList(); }), 3050);
+  }
+  EXPECT_THAT(told, IsEmpty());
+  EXPECT_EQ(session.Missions().Items().size(), 5U);
+  EXPECT_EQ(session.Missions().Text(), "Keep");
+  EXPECT_EQ(session.MissionDescription(), "");
+  EXPECT_TRUE(session.MissionIsActive());
+  session.CalculateScores();
+  EXPECT_EQ(session.Game().Players(Red0).Soldiering, 5 - 8);
+  session.FillMissionList();
+  EXPECT_EQ(session.Missions().Items().size(), 4U);
+  EXPECT_EQ(session.Missions().Text(), "None");
 }
 
 TEST_F(Sessions, LoadAGameInTheLastMissionOfItsName) {

@@ -200,6 +200,12 @@ TEST_F(Reading, FailsAtAFourthTeamAfterTheFirstThree) {
   EXPECT_EQ(game.ObjectiveTeams(3).Name, "F");
 }
 
+TEST_F(Reading, TakesTheDateBeforeTheTeams) {
+  game.GameDate = "before";
+  EXPECT_EQ(FaultIn(WithHeader("<Team></Team><GameDate>after</GameDate>")), 13);
+  EXPECT_EQ(game.GameDate, "after");
+}
+
 TEST_F(Reading, FailsAtAnIndexOutsideTheTable) {
   EXPECT_EQ(FaultIn(WithPlayer("")), 9);
   EXPECT_EQ(FaultIn(WithPlayer("<Index>0</Index>")), 9);

@@ -197,6 +197,7 @@ TEST(ToDouble, ReadsANumberWithBlanksAround) {
   EXPECT_EQ(ToDouble(" 1.25 "), 1.25);
   EXPECT_EQ(ToDouble("+1E-2"), 0.01);
   EXPECT_EQ(ToDouble("1E-999"), 0);
+  EXPECT_EQ(ToDouble("1e-999"), 0);
   EXPECT_EQ(ToDouble("1.7976931348623157E308"), std::numeric_limits<double>::max());
 }
 
@@ -211,6 +212,8 @@ TEST(ToDouble, ReportsWhatIsNoNumberAndWhatIsTooLarge) {
 TEST(ToSingle, ReadsUpToTheLargestFloat) {
   EXPECT_EQ(ToSingle(" .5"), 0.5F);
   EXPECT_EQ(ToSingle("3.402823E+38"), 3.402823E+38F);
+  EXPECT_EQ(ToSingle("3.4028234663852886E+38"), std::numeric_limits<float>::max());
+  EXPECT_EQ(ErrorOf([] { ToSingle("3.403E+38"); }), 6);
   EXPECT_EQ(ErrorOf([] { ToSingle("3.5E+38"); }), 6);
   EXPECT_EQ(ErrorOf([] { ToSingle("-3.5E+38"); }), 6);
   EXPECT_EQ(ErrorOf([] { ToSingle("x"); }), 13);
@@ -292,7 +295,15 @@ TEST(FormatPercent, ShowsTwoDecimals) {
   EXPECT_EQ(FormatPercent(0.0001), "0.01%");
   EXPECT_EQ(FormatPercent(0.055), "5.50%");
   EXPECT_EQ(FormatPercent(12345.678), "1234567.80%");
+  EXPECT_EQ(FormatPercent(-0.1), "-10.00%");
+  EXPECT_EQ(FormatPercent(-0.1F), "-10.00%");
+  EXPECT_EQ(FormatPercent(-0.01), "-1.00%");
+  EXPECT_EQ(FormatPercent(-0.001), "-0.10%");
+  EXPECT_EQ(FormatPercent(-1.1), "-110.00%");
+  EXPECT_EQ(FormatPercent(-12345.678), "-1234567.80%");
   EXPECT_EQ(FormatPercent(1E20), "10000000000000000000000.00%");
+  EXPECT_EQ(FormatPercent(1152921504606846976.0), "115292150460684697600.00%");
+  EXPECT_EQ(FormatPercent(-1152921504606846976.0), "-115292150460684697600.00%");
 }
 
 TEST(FormatPercent, RoundsAnExactTieAwayFromZero) {

@@ -109,9 +109,9 @@ TEST_F(Download, AddsToWhatIsOnTheBoard) {
 
 TEST_F(Download, DatesTheGameByItsLastFrame) {
   Frames = {FrameOfRed1(), FrameOfBlue0()};
-  Events.OnSleep = [this](milliseconds) { Time.Time = Port.Sent.size() < 3 ? "14:31" : "14:32"; };
+  Events.OnSleep = [this](milliseconds) { Time.Time = "14:3" + std::to_string(Port.Sent.size()); };
   GetScores();
-  EXPECT_EQ(Scores.GameDate, "21/05/2013 14:31");
+  EXPECT_EQ(Scores.GameDate, "21/05/2013 14:32");
 }
 
 TEST_F(Download, LeavesOutAFrameWithAWrongChecksumAndGoesOn) {

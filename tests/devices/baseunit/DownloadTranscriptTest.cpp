@@ -62,7 +62,8 @@ class TranscriptOfADownload : public testing::Test {
     LoggedPort port(line, {files, folder / "logs", events, clock}, "line");
     CommPort commPort(port, ini, devices, boxes, strings, [] {});
     FakeDownloadProgress progress;
-    BaseUnitDownload(port, commPort, events, boxes, clock, progress, game).GetScores();
+    DownloadedGuns guns(game);
+    BaseUnitDownload(port, commPort, events, boxes, clock, progress, guns).GetScores();
   }
 
   std::ostringstream unitLog;
@@ -103,6 +104,7 @@ TEST_F(TranscriptOfADownload, IsNoFailureWhereItCannotBeWritten) {
 TEST_F(TranscriptOfADownload, GoesOnInTheSameFile) {
   Download();
   Download();
+  ASSERT_TRUE(unit.WaitUntilServed(2, std::chrono::seconds(5)));
   const std::string log = ReadFile(folder / "logs/base-unit.log");
   const auto first = log.find(" opened ");
   ASSERT_NE(first, std::string::npos);

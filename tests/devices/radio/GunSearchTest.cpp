@@ -3,6 +3,7 @@
 #include <gmock/gmock.h>
 
 #include <chrono>
+#include <numeric>
 
 #include "core/game/PlayerId.h"
 #include "core/text/NumberForms.h"
@@ -14,6 +15,28 @@ using std::chrono::milliseconds;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::Not;
+
+/// Notes how many frames had gone out whenever the search itself, not its link, serves events.
+class NotingPump : public EventPump {
+ public:
+  NotingPump(FakeEventPump& events, const std::vector<Bytes>& frames) : events_(events), frames_(frames) {}
+
+  std::vector<std::size_t> FramesBefore;
+
+  void EndWaits() override { events_.EndWaits(); }
+  void DoEvents() override {
+    FramesBefore.push_back(frames_.size());
+    events_.DoEvents();
+  }
+  WaitResult WaitFor(const std::function<bool()>& condition, milliseconds limit) override {
+    return events_.WaitFor(condition, limit);
+  }
+  void Sleep(milliseconds time) override { events_.Sleep(time); }
+
+ private:
+  FakeEventPump& events_;
+  const std::vector<Bytes>& frames_;
+};
 
 class Search : public testing::Test, protected RadioSite {
  protected:
@@ -102,6 +125,15 @@ TEST_F(Search, Of224CallsIds32To255) {
 TEST_F(Search, WaitsTwelveMillisecondsForEach) {
   Run(128);
   EXPECT_EQ(Events.Now(), milliseconds(256 * 12));
+}
+
+TEST_F(Search, ServesEventsBeforeEachCall) {
+  NotingPump pump(Events, Frames);
+  RadioLink link(Port, Line, Events, [] { return false; });
+  GunSearch(link, pump, Strings, guns, display).SearchGuns(128);
+  std::vector<std::size_t> eachCall(256);
+  std::iota(eachCall.begin(), eachCall.end(), 0U);
+  EXPECT_EQ(pump.FramesBefore, eachCall);
 }
 
 TEST_F(Search, ListsAGunWithAllThatItSaysOfItself) {
@@ -200,6 +232,19 @@ TEST_F(Search, TakesAllAnswersThatComeAtOnceAndKeepsTheSlotsBehind) {
     EXPECT_TRUE(Gun(id).Present) << int(id);
   }
   EXPECT_EQ(Events.Now(), milliseconds(255 * 12 + 3));
+}
+
+TEST_F(Search, ReadsAnAnswerWhateverBeginsBehindIt) {
+  const Bytes another = Received(1, SearchAnswer(50));
+  for (std::size_t length = 1; length < another.size(); ++length) {
+    AfterCallOf40(Joined({Received(40, SearchAnswer(40)),
+                          Bytes(another.begin(), another.begin() + static_cast<std::ptrdiff_t>(length))}));
+    EXPECT_EQ(FaultOf(128), 0);
+    EXPECT_EQ(Gun(40).PlayerID, 40) << length;
+    EXPECT_EQ(Gun(40).Address[0], 40) << length;
+    EXPECT_EQ(CountPresent(), 1) << length;
+    guns = {};
+  }
 }
 
 TEST_F(Search, ListsAGunThatWasNotCalled) {

@@ -151,6 +151,21 @@ TEST_P(RemoteWindow, KeepsRowsInTheOrderOfIds) {
   EXPECT_THAT(Column(0), ElementsAre(Red() + "  3", Red() + "  10", Red() + "  18"));
 }
 
+TEST_P(RemoteWindow, EmptiesTheListAsASearchBegins) {
+  guns = {33, 40};
+  Press("SearchGunsButton");
+  ASSERT_EQ(List().rowCount(), 2);
+  guns = {};
+  bool looked = false;
+  Meanwhile(3, [&] {
+    looked = true;
+    EXPECT_EQ(List().rowCount(), 0);
+  });
+  Press("SearchGunsButton");
+  EXPECT_TRUE(looked);
+  EXPECT_EQ(List().rowCount(), 0);
+}
+
 TEST_P(RemoteWindow, ShowsHowASearchGoes) {
   guns = {33};
   int looks = 0;
@@ -291,11 +306,15 @@ TEST_P(RemoteWindow, ClosedByItsButtonInMidFetchGoesOnceThatHasUnwound) {
   EXPECT_THAT(Boxes.Boxes, IsEmpty());
 }
 
-TEST_P(RemoteWindow, ClosedByEscapeInMidRunGoesOnceThatHasUnwound) {
+TEST_P(RemoteWindow, IsNotClosedByEscapeInMidRun) {
+  guns = {33};
   Meanwhile(100, [&] { QTest::keyClick(&window, Qt::Key_Escape); });
+  Meanwhile(2000, [&] { QTest::keyClick(&Find<QPushButton>(window, "Close"), Qt::Key_Escape); });
   Press("SearchGunsButton");
-  EXPECT_FALSE(window.isVisible());
-  EXPECT_EQ(Events.Now(), milliseconds(100));
+  EXPECT_TRUE(window.isVisible());
+  EXPECT_EQ(Frames.size(), 256U);
+  EXPECT_EQ(List().rowCount(), 1);
+  ExpectUsable();
 }
 
 TEST_P(RemoteWindow, IsClosedByEscapeWhenIdle) {

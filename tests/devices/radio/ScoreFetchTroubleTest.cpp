@@ -198,6 +198,63 @@ TEST_F(Fetch, TakesTheAnswerThatComesAtOnceWithAStatusFrame) {
   }
 }
 
+/// As long as its frame may be, with other figures than any answer here, and of the kind that starts like
+/// one.
+Bytes AnotherFrame() {
+  return Received(99, Joined({{93, 99, 0, 0, 5, 2, 0, 89}, Bytes(90, 0xEE)}));
+}
+
+// The bytes behind the answer begin a frame that is never finished, so what they swallow must come again.
+TEST_F(Fetch, ReadsAnAnswerWhateverBeginsBehindIt) {
+  const Bytes another = AnotherFrame();
+  for (std::uint8_t command = 1; command <= 3; ++command) {
+    for (std::size_t length = 1; length < another.size(); ++length) {
+      SiteGun& gun = PutGun(33, BlockOfRed1(225));
+      guns[1].ScoreStatus = ScoreStatus::Pending;
+      Frames.clear();
+      game.Clear();
+      bool struck = false;
+      OnPacket = [&](const Bytes& packet) {
+        Bytes burst = Received(33, AnswerOf(gun, packet));
+        if (packet[5] == command && !struck) {
+          struck = true;
+          burst.insert(burst.end(), another.begin(), another.begin() + static_cast<std::ptrdiff_t>(length));
+        }
+        Arrive(10, burst);
+      };
+      ASSERT_EQ(FaultOfGetScores(), 0) << int(command) << ": " << length;
+      EXPECT_EQ(StatusOf(33), ScoreStatus::Ok) << int(command) << ": " << length;
+      EXPECT_EQ(Red1().ShotCount, 258) << int(command) << ": " << length;
+      if (command == 1) {
+        EXPECT_EQ(Packets()[1], (Bytes{3, 33, 0, 0, 4, 2, 0, 90})) << length;
+      }
+    }
+  }
+}
+
+TEST_F(Fetch, ReadsTheDataAmongFramesThatComeAtOnceAndNotWhatABadOneLeft) {
+  SiteGun& gun = PutGun(33, BlockOfRed1(52));
+  Bytes bad = AnotherFrame();
+  bad.back() ^= 1;
+  OnPacket = [&](const Bytes& packet) {
+    Arrive(10, Joined({Received(33, AnswerOf(gun, packet)), bad, ModemStatusFrame()}));
+  };
+  EXPECT_EQ(FaultOfGetScores(), 0);
+  EXPECT_EQ(CountOf(1), 1);
+  EXPECT_EQ(StatusOf(33), ScoreStatus::Ok);
+}
+
+TEST_F(Fetch, ServesEventsInEachRoundAlsoForIdsWithoutAGun) {
+  int rounds = 0;
+  std::function<void()> count = [&] {
+    ++rounds;
+    Events.At(milliseconds(0), count);
+  };
+  Events.At(milliseconds(0), count);
+  GetScores();
+  EXPECT_EQ(rounds, 224);
+}
+
 TEST_F(Fetch, TakesTheBlockBeforeOnceMoreWhenAStatusFrameComesFirst) {
   PutGun(33, BlockOfRed1(135));
   const auto answer = OnPacket;

@@ -192,6 +192,15 @@ TEST_F(Parser, NeverEndsABodyOfOneByteOrNone) {
   EXPECT_THAT(Receive({0x7E, 0x00, 0x00, 0x8A, 0x75}), IsEmpty());
 }
 
+// A byte behind the identifier makes the body longer than its length says, with a sum that would be right.
+TEST_F(Parser, NeverEndsABodyOfOneByteOrNoneAtAByteBehindIt) {
+  for (const std::uint8_t length : Bytes{0, 1}) {
+    parser = {};
+    EXPECT_THAT(Receive({0x7E, 0x00, length, 0x8A, 0x00, 0x75}), IsEmpty()) << int(length);
+    EXPECT_THAT(Receive(ModemStatus), IsEmpty()) << int(length);
+  }
+}
+
 TEST_F(Parser, ReadsTheLengthHighByteFirst) {
   EXPECT_THAT(Receive(FrameOfZeros(0x89, 0x0102)), ElementsAre(0x89));
   EXPECT_THAT(Receive(FrameOfZeros(0x81, 0xFFFF)), ElementsAre(0x81));

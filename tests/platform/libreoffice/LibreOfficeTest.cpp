@@ -12,8 +12,9 @@
 #include <thread>
 
 #include "platform/RuntimeError.h"
-#include "tests/platform/libreoffice/OfficeProcesses.h"
+#include "tests/platform/libreoffice/Docx.h"
 #include "tests/platform/libreoffice/OfficeStart.h"
+#include "tests/platform/libreoffice/Writer.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/Thrown.h"
 
@@ -24,58 +25,7 @@ using testing::IsEmpty;
 using testing::Not;
 using testing::SizeIs;
 
-const std::string Template = TESSARINE_PROGRAM_FOLDER "/score_card_default.doc";
-
-std::vector<pid_t> Hosts(pid_t parent = getpid()) {
-  return ChildrenOf(parent, "tessarine-office-host");
-}
-
-/// Number of LibreOffice profiles in the temporary folder.
-std::size_t Profiles() {
-  std::size_t count = 0;
-  for (const auto& entry : std::filesystem::directory_iterator(std::filesystem::temp_directory_path())) {
-    count += entry.path().filename().string().rfind("tessarine-office-", 0) == 0 ? 1 : 0;
-  }
-  return count;
-}
-
-/// A running LibreOffice with its own temporary folder. All tests share it, since starting takes a second.
-class Writer : public testing::Test {
- protected:
-  static void SetUpTestSuite() {
-    temporary_ = new TemporaryFolder;
-    setenv("TMPDIR", temporary_->Path().c_str(), 1);
-    office_ = new LibreOffice(TESSARINE_PROGRAM_FOLDER);
-    ASSERT_TRUE(StartAndWait(*office_));
-  }
-  static void TearDownTestSuite() {
-    delete office_;
-    EXPECT_THAT(Hosts(), IsEmpty());
-    EXPECT_EQ(Profiles(), 0u);
-    unsetenv("TMPDIR");
-    delete temporary_;
-  }
-
-  /// All text of a saved sheet or template, as read by another LibreOffice.
-  std::string TextOf(const std::string& document) const {
-    const std::string command = "soffice -env:UserInstallation=file://" + (folder / "profile") +
-                                " --headless --convert-to txt:Text --outdir '" + folder.Path() + "' '" +
-                                document + "' > /dev/null 2>&1";
-    EXPECT_EQ(std::system(command.c_str()), 0);
-    return ReadFile(std::filesystem::path(document).replace_extension(".txt"));
-  }
-
-  static LibreOffice& Office() { return *office_; }
-
-  TemporaryFolder folder;
-
- private:
-  static TemporaryFolder* temporary_;
-  static LibreOffice* office_;
-};
-
-TemporaryFolder* Writer::temporary_ = nullptr;
-LibreOffice* Writer::office_ = nullptr;
+const std::string Template = DefaultSheetTemplate;
 
 TEST_F(Writer, FillsATemplateAndSavesItForWord) {
   const auto document = Office().Add(Template);
@@ -127,6 +77,62 @@ TEST_F(Writer, WritesTablesWithMergedCells) {
   EXPECT_THAT(text, Not(HasSubstr("second")));
 }
 
+TEST_F(Writer, WritesMoreColumnsThanTheAlphabetHasLettersNextToMergedCells) {
+  constexpr int columns = 60;
+  std::string row;
+  std::vector<std::string> texts;
+  for (int column = 1; column <= columns; ++column) {
+    row += "<td>x</td>";
+    texts.push_back("Text" + std::to_string(column) + ".");
+  }
+  WriteFile(folder / "wide.html", "<html><body><table><tr><td colspan=60>Heading</td></tr><tr>" + row +
+                                      "</tr></table></body></html>");
+  const auto document = Office().Add(folder / "wide.html");
+  document->WriteCells(1, 2, 1, texts);
+  document->SaveAs(folder / "wide.doc");
+  texts.emplace_back("one too many");
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 2, 1, texts); }), 440);
+  document->Close();
+  const std::string text = TextOf(folder / "wide.doc");
+  std::size_t at = 0;
+  for (int column = 1; column <= columns; ++column) {
+    at = text.find("Text" + std::to_string(column) + ".", at);
+    ASSERT_NE(at, std::string::npos) << column;
+  }
+}
+
+TEST_F(Writer, FillsBookmarksInHeadersTextBoxesAndCells) {
+  WriteFile(folder / "places.fodt",
+            R"(<?xml version="1.0" encoding="UTF-8"?><office:document
+              xmlns:office="urn:oasis:names:tc:opendocument:xmlns:office:1.0"
+              xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
+              xmlns:style="urn:oasis:names:tc:opendocument:xmlns:style:1.0"
+              xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
+              xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
+              xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
+              office:mimetype="application/vnd.oasis.opendocument.text"><office:automatic-styles>
+              <style:page-layout style:name="pm1"><style:header-style/></style:page-layout>
+              </office:automatic-styles><office:master-styles><style:master-page style:name="Standard"
+              style:page-layout-name="pm1"><style:header><text:p><text:bookmark-start text:name="A"/>?<text:bookmark-end
+              text:name="A"/></text:p></style:header></style:master-page></office:master-styles><office:body><office:text>
+              <text:p><draw:frame text:anchor-type="paragraph" svg:width="5cm"><draw:text-box><text:p><text:bookmark-start
+              text:name="B"/>?<text:bookmark-end text:name="B"/></text:p></draw:text-box></draw:frame></text:p>
+              <table:table><table:table-column/><table:table-row><table:table-cell><text:p><text:bookmark-start
+              text:name="C"/>?<text:bookmark-end text:name="C"/></text:p></table:table-cell></table:table-row></table:table>
+              </office:text></office:body></office:document>)");
+  const auto document = Office().Add(folder / "places.fodt");
+  document->SetBookmark("A", "InHeader");
+  document->SetBookmark("B", "InBox");
+  document->SetBookmark("C", "InCell");
+  document->SaveAs(folder / "filled.doc");
+  document->Close();
+  Convert({folder / "filled.doc"}, "fodt");
+  const std::string text = ReadFile(folder / "filled.fodt");
+  for (const char* part : {"InHeader", "InBox", "InCell"}) {
+    EXPECT_THAT(text, HasSubstr(part));
+  }
+}
+
 TEST_F(Writer, CountsTablesThatTextFlowsAround) {
   const auto table = [](int rows) {
     std::string text = "<table:table><table:table-column/>";
@@ -136,8 +142,8 @@ TEST_F(Writer, CountsTablesThatTextFlowsAround) {
     return text + "</table:table>";
   };
   const auto inFrame = [](const std::string& anchor, const std::string& inside) {
-    return "<text:p><draw:frame text:anchor-type='" + anchor + "' svg:width='5cm'><draw:text-box>" + inside +
-           "</draw:text-box></draw:frame>behind</text:p>";
+    return "<text:p><draw:frame draw:style-name='floating' text:anchor-type='" + anchor +
+           "' svg:width='5cm'><draw:text-box>" + inside + "</draw:text-box></draw:frame>behind</text:p>";
   };
   WriteFile(folder / "floating.fodt",
             R"(<?xml version="1.0" encoding="UTF-8"?><office:document
@@ -145,8 +151,12 @@ TEST_F(Writer, CountsTablesThatTextFlowsAround) {
               xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
               xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
               xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
+              xmlns:style="urn:oasis:names:tc:opendocument:xmlns:style:1.0"
+              xmlns:fo="urn:oasis:names:tc:opendocument:xmlns:xsl-fo-compatible:1.0"
               xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
-              office:mimetype="application/vnd.oasis.opendocument.text"><office:body><office:text>)" +
+              office:mimetype="application/vnd.oasis.opendocument.text"><office:automatic-styles><style:style
+              style:name="floating" style:family="graphic" style:parent-style-name="Frame"><style:graphic-properties style:wrap="parallel"
+              fo:padding="0mm" fo:border="none"/></style:style></office:automatic-styles><office:body><office:text>)" +
                 inFrame("paragraph", table(1)) + table(2) + inFrame("char", table(3)) +
                 inFrame("char", "<text:p>box</text:p>") + table(4) +
                 "</office:text></office:body></office:document>");
@@ -160,6 +170,47 @@ TEST_F(Writer, CountsTablesThatTextFlowsAround) {
   }
   EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(5, 1, 20, {}); }), 9);
   document->Close();
+}
+
+/// A table of one column in a Word 2007 file, and a paragraph behind it.
+std::string WordTable(int rows, const std::string& place = "") {
+  std::string text =
+      "<w:tbl><w:tblPr>" + place + "</w:tblPr><w:tblGrid><w:gridCol w:w=\"2000\"/></w:tblGrid>";
+  for (int row = 0; row < rows; ++row) {
+    text += "<w:tr><w:tc><w:p/></w:tc></w:tr>";
+  }
+  return text + "</w:tbl><w:p><w:r><w:t>text</w:t></w:r></w:p>";
+}
+
+TEST_F(Writer, CountsNoTableInATextBox) {
+  const auto box = [](const std::string& wrap) {
+    return R"(<w:p><w:r><w:pict><v:shape xmlns:v="urn:schemas-microsoft-com:vml")"
+           R"( xmlns:w10="urn:schemas-microsoft-com:office:word")"
+           R"( style="position:absolute;width:200pt;height:100pt"><v:textbox><w:txbxContent>)" +
+           WordTable(1) + "</w:txbxContent></v:textbox>" + wrap + "</v:shape></w:pict></w:r></w:p>";
+  };
+  WriteFile(folder / "over.docx", Docx(box("") + WordTable(3)));
+  WriteFile(folder / "beside.docx", Docx(box(R"(<w10:wrap type="square"/>)") + WordTable(3)));
+  Convert({folder / "over.docx", folder / "beside.docx"}, "doc:MS Word 97");
+  for (const char* name : {"over.docx", "over.doc", "beside.docx", "beside.doc"}) {
+    const auto document = Office().Add(folder / name);
+    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 1, 20, {"1", "2", "3"}); }), 0) << name;
+    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {}); }), 9) << name;
+    document->Close();
+  }
+}
+
+TEST_F(Writer, CountsAFloatingTableOfAWordFile) {
+  const std::string place =
+      R"(<w:tblpPr w:vertAnchor="page" w:horzAnchor="page" w:tblpX="3000" w:tblpY="3000"/>)";
+  WriteFile(folder / "floating.docx", Docx(WordTable(2, place) + WordTable(3)));
+  Convert({folder / "floating.docx"}, "doc:MS Word 97");
+  for (const char* name : {"floating.docx", "floating.doc"}) {
+    const auto document = Office().Add(folder / name);
+    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 1, 20, {"1", "2", "3"}); }), 440) << name;
+    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {"1", "2", "3"}); }), 0) << name;
+    document->Close();
+  }
 }
 
 TEST_F(Writer, AddsPicturesWithPaddingAndRefusesOtherFiles) {

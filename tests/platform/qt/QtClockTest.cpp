@@ -53,6 +53,8 @@ TEST(LongDateText, TakesTwoDigitsOfAYearAs1930To2029) {
   EXPECT_EQ(LongDateText(american, QStringLiteral("5/9/13 2:30 PM")), "Thursday, May 9, 2013");
   EXPECT_EQ(LongDateText(american, QStringLiteral("1/1/30")), "Wednesday, January 1, 1930");
   EXPECT_EQ(LongDateText(american, QStringLiteral("12/31/29")), "Monday, December 31, 2029");
+  EXPECT_EQ(LongDateText(american, QStringLiteral("2/29/00")), "Tuesday, February 29, 2000");
+  EXPECT_EQ(LongDateText(american, QStringLiteral("2/30/00")), "2/30/00");
 }
 
 TEST(LongDateText, IsTheTextItselfWhenItIsNoDate) {

@@ -7,9 +7,12 @@
 #include <QFile>
 #include <QFileDialog>
 #include <QLineEdit>
+#include <QListView>
 #include <QPushButton>
 #include <QTemporaryDir>
 #include <QTest>
+#include <QThread>
+#include <QTimer>
 
 #include "tests/support/WhileModal.h"
 
@@ -113,6 +116,62 @@ TEST_F(QtFileDialogTest, SavesUnderTheNameEntered) {
                    Enter(Path("星期六.xml"), QDialogButtonBox::Save)(dialog);
                  }),
             Path("星期六.xml"));
+}
+
+TEST_F(QtFileDialogTest, TakesTheKeysThatWereTypedBeforeAScreenReaderPressesItsButton) {
+  EXPECT_EQ(Save(Path("last.xml"),
+                 [](QFileDialog& dialog) {
+                   Entry(dialog).selectAll();
+                   // Both are due when the events are served next, the keys as the first.
+                   QTimer::singleShot(50, Qt::PreciseTimer, &dialog, [&dialog] {
+                     for (const QChar key : QStringLiteral("new.xml")) {
+                       for (const auto type : {QEvent::KeyPress, QEvent::KeyRelease}) {
+                         qt_handleKeyEvent(dialog.windowHandle(), type, key.toUpper().unicode(), {}, key);
+                       }
+                     }
+                   });
+                   dialog.findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Save)->animateClick();
+                   QThread::msleep(200);
+                 }),
+            Path("new.xml"));
+}
+
+TEST_F(QtFileDialogTest, TakesTheNameThatStandsThereInPlaceOfTheFileSelected) {
+  MakeFile("last.xml");
+  const auto name = [](const char* text) {
+    return [text](QFileDialog& dialog) {
+      // As long as the window is not in front, its entry has no focus.
+      Entry(dialog).clearFocus();
+      Enter(text, QDialogButtonBox::Save)(dialog);
+    };
+  };
+  EXPECT_EQ(Save(Path("last.xml"), name("new.xml")), Path("new.xml"));
+  EXPECT_EQ(Save(Path("last.xml"), name("last.xml")), Path("last.xml"));
+}
+
+TEST_F(QtFileDialogTest, OpensTheFolderThatIsSelected) {
+  MakeFile("last.xml");
+  ASSERT_TRUE(QDir(QString::fromStdString(Path(""))).mkdir(QStringLiteral("more")));
+  EXPECT_EQ(Save(Path("last.xml"),
+                 [this](QFileDialog& dialog) {
+                   auto* list = dialog.findChild<QListView*>(QStringLiteral("listView"));
+                   QModelIndex folder;
+                   ASSERT_TRUE(QTest::qWaitFor([&] {
+                     const auto* model = list->model();
+                     const auto found = model->match(model->index(0, 0, list->rootIndex()), Qt::DisplayRole,
+                                                     QStringLiteral("more"));
+                     folder = found.isEmpty() ? QModelIndex() : found.first();
+                     return folder.isValid();
+                   }));
+                   list->setFocus();
+                   list->selectionModel()->select(
+                       folder, QItemSelectionModel::ClearAndSelect | QItemSelectionModel::Rows);
+                   Press(dialog, QDialogButtonBox::Save);
+                   EXPECT_TRUE(dialog.isVisible());
+                   EXPECT_EQ(dialog.directory().dirName(), QStringLiteral("more"));
+                   Enter("deep.xml", QDialogButtonBox::Save)(dialog);
+                 }),
+            Path("more/deep.xml"));
 }
 
 TEST_F(QtFileDialogTest, SavesOverAnExistingFileWithoutAQuestion) {

@@ -90,6 +90,23 @@ TEST_F(QtMessageBoxesTest, OffersTheButtonsAndAnswersTheOnePressed) {
   EXPECT_EQ(Show(BoxButtons::YesNoCancel, Press(QMessageBox::Cancel)), BoxAnswer::Cancel);
 }
 
+TEST_F(QtMessageBoxesTest, NoHourglassStandsOverABox) {
+  QGuiApplication::setOverrideCursor(Qt::WaitCursor);
+  QGuiApplication::setOverrideCursor(Qt::BusyCursor);
+  bool ordinary = false;
+  Show(BoxButtons::Ok, [&](QMessageBox& box) {
+    ordinary = QGuiApplication::overrideCursor() == nullptr;
+    box.close();
+  });
+  EXPECT_TRUE(ordinary);
+  for (const Qt::CursorShape shape : {Qt::BusyCursor, Qt::WaitCursor}) {
+    ASSERT_NE(QGuiApplication::overrideCursor(), nullptr);
+    EXPECT_EQ(QGuiApplication::overrideCursor()->shape(), shape);
+    QGuiApplication::restoreOverrideCursor();
+  }
+  EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
+}
+
 TEST_F(QtMessageBoxesTest, ReturnPressesTheFirstButton) {
   EXPECT_EQ(Show(BoxButtons::Ok, Type(Qt::Key_Return)), BoxAnswer::Ok);
   EXPECT_EQ(Show(BoxButtons::OkCancel, Type(Qt::Key_Return)), BoxAnswer::Ok);

@@ -105,6 +105,9 @@ Bytes StruckAnswer(RadioFailure failure) {
     case RadioFailure::LongAtResponse:
       return Bytes{0x7E, 0x00, 0x23, 0x88, 0x01, 0x4E, 0x44, 0x00} + Bytes(30, 0xEE) + Bytes{0x00} +
              FoundRed2;
+    case RadioFailure::NextFrameBegins:
+      return FoundRed2 + Bytes{0x7E, 0x00, 0x14, 0x80, 0,    0,    0,    0,    0,    0,    0,
+                               0,    0x28, 0x00, 0x04, 0x20, 0x00, 0x00, 0x05, 0x01, 0x00, 0x59};
   }
   return {};
 }
@@ -225,7 +228,7 @@ TEST(RadioFailures, StandInTheOrderOfTheirEnumerationUnderDistinctNames) {
     EXPECT_EQ(static_cast<std::size_t>(RadioFailures[i].Failure), i);
     EXPECT_TRUE(names.insert(RadioFailures[i].Name).second) << RadioFailures[i].Name;
   }
-  EXPECT_EQ(RadioFailures.back().Failure, RadioFailure::LongAtResponse);
+  EXPECT_EQ(RadioFailures.back().Failure, RadioFailure::NextFrameBegins);
 }
 
 TEST(RadioFailures, PutAnAnswerIntoTheSlotOfAGunThatIsNotThere) {

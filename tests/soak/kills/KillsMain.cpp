@@ -1,0 +1,161 @@
+#include <sys/resource.h>
+
+#include <algorithm>
+#include <array>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <map>
+#include <random>
+
+#include "tests/soak/kills/Life.h"
+#include "tests/support/TemporaryFolder.h"
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+
+constexpr const char* Usage =
+    "usage: soak-kills --seconds N [--seed S] [--only WORK] [--lie lost|doubled|damaged|crash]\n"
+    "Kills processes in the midst of their work for N seconds, and looks each time whether all that they "
+    "had\n"
+    "reported is there, once and whole. --lie makes them do wrong on purpose, to show that it is noticed.\n";
+
+struct Options {
+  double Seconds = 0;
+  unsigned Seed = std::random_device()();
+  std::string Only;
+  Lie Lies = Lie::None;
+};
+
+Lie LieNamed(const std::string& name) {
+  static const std::map<std::string, Lie> lies = {
+      {"lost", Lie::Lost}, {"doubled", Lie::Doubled}, {"damaged", Lie::Damaged}, {"crash", Lie::Crash}};
+  return lies.at(name);
+}
+
+/// Throws std::exception.
+Options ParseOptions(const std::vector<std::string>& arguments) {
+  Options options;
+  for (std::size_t i = 0; i < arguments.size(); i += 2) {
+    const std::string& value = arguments.at(i + 1);
+    if (arguments[i] == "--seconds") {
+      options.Seconds = std::stod(value);
+    } else if (arguments[i] == "--seed") {
+      options.Seed = static_cast<unsigned>(std::stoul(value));
+    } else if (arguments[i] == "--only") {
+      options.Only = value;
+    } else if (arguments[i] == "--lie") {
+      options.Lies = LieNamed(value);
+    } else {
+      throw std::invalid_argument(arguments[i]);
+    }
+  }
+  if (options.Seconds <= 0) {
+    throw std::invalid_argument("--seconds");
+  }
+  return options;
+}
+
+/// A work with its folder, and how it went.
+struct Job {
+  std::unique_ptr<::Work> Work;
+  std::unique_ptr<TemporaryFolder> Folder{};
+  int Done = 0;
+  std::chrono::duration<double> Spent{0};
+  int Kills = 0;
+  long Steps = 0;
+};
+
+class Soak {
+ public:
+  explicit Soak(const Options& options) : options_(options), random_(options.Seed) {
+    const WorkSources sources{std::filesystem::read_symlink("/proc/self/exe").parent_path(),
+                              TESSARINE_OLD_FILES};
+    for (auto* make : {MakeCommitWork, MakeMissionWork, MakePhotoWork, MakeGameFileWork, MakeConversionWork,
+                       MakeSheetWork}) {
+      if (std::unique_ptr<Work> work = make(sources);
+          work && (options.Only.empty() || work->Name() == options.Only)) {
+        jobs_.push_back({.Work = std::move(work)});
+      }
+    }
+    hasOldFiles_ = std::filesystem::exists(sources.OldFiles / "members.mdb");
+  }
+
+  bool Run() {
+    const Clock::time_point end = Clock::now() + std::chrono::duration_cast<Clock::duration>(
+                                                     std::chrono::duration<double>(options_.Seconds));
+    while (Clock::now() < end && !jobs_.empty()) {
+      KillOnce(end, *std::min_element(jobs_.begin(), jobs_.end(), [](const Job& one, const Job& other) {
+                 return one.Spent / one.Work->Share() < other.Spent / other.Work->Share();
+               }));
+    }
+    return Tell();
+  }
+
+ private:
+  void KillOnce(Clock::time_point end, Job& job) {
+    const Clock::time_point start = Clock::now();
+    if (!job.Folder || job.Done >= job.Work->MostSteps()) {
+      job.Folder = std::make_unique<TemporaryFolder>();
+      job.Done = 0;
+      job.Work->Prepare(job.Folder->Path());
+    }
+    const auto longest = std::chrono::duration_cast<std::chrono::microseconds>(std::min<Clock::duration>(
+        job.Work->LongestLife(), std::max(end - Clock::now(), Clock::duration(1000))));
+    const std::chrono::microseconds time(std::uniform_int_distribution<long>(0, longest.count())(random_));
+    const Life life = LiveAndDie(*job.Work, job.Folder->Path(), job.Done, time, options_.Lies);
+    job.Kills += life.Killed ? 1 : 0;
+    job.Steps += life.Reported - job.Done;
+    job.Done = life.Found;
+    ++results_[static_cast<std::size_t>(life.What)];
+    if (life.What != Life::Fine) {
+      std::printf("kills: %s, killed after %ld us (seed %u): %.600s\n", job.Work->Name().c_str(),
+                  time.count(), options_.Seed, life.Reason.c_str());
+      job.Folder.reset();
+    }
+    job.Spent += Clock::now() - start;
+  }
+
+  /// Tells how it went; true if all is well.
+  bool Tell() const {
+    int kills = 0;
+    long steps = 0;
+    std::string each;
+    for (const Job& job : jobs_) {
+      kills += job.Kills;
+      steps += job.Steps;
+      each += job.Work->Name() + " " + std::to_string(job.Kills) + ", ";
+    }
+    if (!hasOldFiles_) {
+      each += "conversions not run, ";
+    }
+    const auto count = [this](Life::Result result) { return results_[static_cast<std::size_t>(result)]; };
+    const int losses = count(Life::Lost) + count(Life::Doubled) + count(Life::Damaged);
+    std::printf(
+        "kills: %d tries, %d losses, %d crashes, %d hangs (%s%ld steps acknowledged, %d lost, %d doubled, "
+        "%d damaged)\n",
+        kills, losses, count(Life::Crashed), count(Life::Hung), each.c_str(), steps, count(Life::Lost),
+        count(Life::Doubled), count(Life::Damaged));
+    return kills > 0 && steps > 0 && losses + count(Life::Crashed) + count(Life::Hung) == 0;
+  }
+
+  const Options options_;
+  std::mt19937 random_;
+  std::vector<Job> jobs_;
+  bool hasOldFiles_ = false;
+  std::array<int, 6> results_{};
+};
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  Options options;
+  try {
+    options = ParseOptions({argv + 1, argv + argc});
+  } catch (const std::exception&) {
+    std::fputs(Usage, stderr);
+    return 2;
+  }
+  return Soak(options).Run() ? 0 : 1;
+}

@@ -1,0 +1,41 @@
+#include "ui/Look.h"
+
+#include <gtest/gtest.h>
+
+#include <QApplication>
+#include <QHeaderView>
+#include <QTableWidget>
+
+namespace {
+
+QPalette Dark() {
+  QPalette palette(QColor(50, 55, 60), QColor(45, 50, 55));
+  palette.setColor(QPalette::PlaceholderText, Qt::black);
+  return palette;
+}
+
+class Look : public testing::Test {
+ protected:
+  ~Look() override { QApplication::setPalette(before); }
+
+  const QPalette before = QApplication::palette();
+};
+
+TEST_F(Look, OfListHeadersFollowsTheDesktop) {
+  for (const auto& [palette, isDark] : {std::pair{before, false}, {Dark(), true}}) {
+    QApplication::setPalette(palette);
+    QTableWidget list(1, 1);
+    list.setObjectName(QStringLiteral("DataList"));
+    list.setHorizontalHeaderLabels({QString()});
+    const QImage header = list.horizontalHeader()->grab().toImage();
+    EXPECT_EQ(header.pixelColor(header.width() / 4, 3).lightness() < 128, isDark);
+  }
+}
+
+TEST_F(Look, KeepsPlaceholdersReadableOnADarkDesktop) {
+  QApplication::setPalette(Dark());
+  PrepareLook();
+  EXPECT_GT(QApplication::palette().color(QPalette::PlaceholderText).lightness(), 128);
+}
+
+}  // namespace

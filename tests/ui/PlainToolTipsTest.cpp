@@ -1,0 +1,36 @@
+#include "ui/PlainToolTips.h"
+
+#include <gtest/gtest.h>
+
+#include <QApplication>
+#include <QLabel>
+#include <QToolTip>
+
+namespace {
+
+/// The tool tip on the screen; null for none.
+const QLabel* Tip() {
+  for (const QWidget* widget : QApplication::topLevelWidgets()) {
+    if (widget->isVisible() && widget->windowType() == Qt::ToolTip) {
+      return qobject_cast<const QLabel*>(widget);
+    }
+  }
+  return nullptr;
+}
+
+TEST(PlainToolTips, ShowMarkupAsItStands) {
+  const PlainToolTips plain;
+  QWidget window;
+  window.show();
+  for (const QString& text : {QStringLiteral("<b>Bold</b>"), QStringLiteral("Ada &amp; <i>Co</i>")}) {
+    QToolTip::showText(QPoint(10, 10), text, &window);
+    const QLabel* tip = Tip();
+    ASSERT_NE(tip, nullptr);
+    EXPECT_EQ(tip->text(), text);
+    EXPECT_EQ(tip->textFormat(), Qt::PlainText);
+    EXPECT_GE(tip->height(), tip->heightForWidth(tip->width()));
+    QToolTip::hideText();
+  }
+}
+
+}  // namespace
