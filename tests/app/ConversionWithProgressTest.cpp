@@ -47,18 +47,23 @@ TEST_P(ConversionWindow, StandsWhileTheReaderIsSilent) {
   WriteFile(Reader, "#!/bin/sh\nsleep 2\ncat '" + (folder / "written") + "'\n");
   const StringTable strings(GetParam());
   ConversionWithProgress conversion(strings, disk, std::chrono::milliseconds(90), Reader);
-  bool stood = false;
+  QString first;
   QTimer watch;
-  QObject::connect(&watch, &QTimer::timeout, [&stood] {
+  QObject::connect(&watch, &QTimer::timeout, [&first] {
     for (const QWidget* window : QApplication::topLevelWidgets()) {
-      stood |= qobject_cast<const QProgressDialog*>(window) != nullptr && window->isVisible();
+      const auto* progress = qobject_cast<const QProgressDialog*>(window);
+      if (progress != nullptr && progress->isVisible() && first.isEmpty()) {
+        first = progress->labelText();
+      }
     }
   });
   watch.start(0);
   ConversionAnswers steps;
   conversion.Convert({Path, "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb", folder / "none"},
                      steps);
-  EXPECT_TRUE(stood);
+  EXPECT_TRUE(
+      first.contains(GetParam() == Language::English ? QStringLiteral(": 0 rows") : QStringLiteral("：0 行")))
+      << first.toStdString();
 }
 
 /// Asks whether a window stands over its question.

@@ -82,6 +82,9 @@ class OldFileConverted : public FaultyOperation {
     return told.Number == Fault::UnrecognizedDatabase && (general || byErrno || has("Disk error"));
   }
 
+  /// When the folder can no longer be asked which of the two stands there.
+  bool CanFailWhenDone() const override { return true; }
+
   /// The old file is there as long as it has not become the new one, and beside it from then on.
   void Check() const override {
     if (ReadFile(*this / "members.mdb") != OldBytes()) {

@@ -45,6 +45,8 @@ InterimRows::InterimRows(const std::string& newFile, const OldDatabase& old)
   connection_.Execute(
       ("CREATE TEMP TABLE Entered AS " + all + "Interim." + table_ + " EXCEPT " + all + "Empty." + table_)
           .c_str());
+  connection_.Execute("DETACH Interim");
+  connection_.Execute("DETACH Empty");
   count_ = RowsOf(connection_, "temp.Entered");
 }
 

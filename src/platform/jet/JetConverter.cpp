@@ -1,9 +1,13 @@
 #include "platform/jet/JetConverter.h"
 
+#include <fcntl.h>
+#include <unistd.h>
+
 #include <array>
+#include <cerrno>
 #include <filesystem>
 #include <fstream>
-#include <optional>
+#include <memory>
 #include <string_view>
 #include <vector>
 
@@ -13,6 +17,8 @@
 #include "platform/jet/JetStream.h"
 #include "platform/jet/KeptFile.h"
 #include "platform/jet/TableImport.h"
+#include "platform/linux/Descriptor.h"
+#include "platform/linux/FileError.h"
 
 namespace {
 
@@ -33,6 +39,13 @@ class NewFile {
   NewFile& operator=(const NewFile&) = delete;
 
   const std::string& Path() const { return path_; }
+
+  void MakeDurable() const {
+    const Descriptor file(open(path_.c_str(), O_RDONLY | O_CLOEXEC));
+    if (file.Number() < 0 || fsync(file.Number()) != 0) {
+      throw FileError(errno, path_);
+    }
+  }
 
  private:
   void Remove() noexcept {
@@ -84,6 +97,22 @@ void RequireValues(const std::vector<NotTakenOver>& left, ConversionSteps& steps
   throw OldDatabaseRefused({{NotTakenOver::TableRows, table, read, counted}});
 }
 
+/// Nothing if it is damaged or no database of ours; it then stays where it is.
+std::unique_ptr<InterimRows> ReadInterim(const std::string& newFile, const OldDatabase& old) {
+  // A single failed read can look like damage, and its rows are not offered a second time.
+  constexpr int tries = 2;
+  for (int count = 0; count < tries; ++count) {
+    try {
+      return std::make_unique<InterimRows>(newFile, old);
+    } catch (const RuntimeError& error) {
+      if (error.Number() != Fault::UnrecognizedDatabase && error.Number() != Fault::DatabaseError) {
+        throw;
+      }
+    }
+  }
+  return nullptr;
+}
+
 }  // namespace
 
 bool JetConverter::IsOld(const std::string& path) const {
@@ -116,6 +145,7 @@ OldDatabaseReport JetConverter::MakeAndReplace(const OldDatabase& old, Conversio
   OldDatabaseReport report = ReadInto(newFile.Path(), old);
   RequireValues(report.NotTaken, steps);
   const bool joined = Join(newFile.Path(), old, steps);
+  newFile.MakeDurable();
   KeptFile kept(disk_, old.Path);
   report.KeptAs = kept.Path();
   steps.BeforeReplacing(report);
@@ -142,16 +172,8 @@ bool JetConverter::Join(const std::string& newFile, const OldDatabase& old, Conv
   if (!disk_.FileExists(old.InterimPath)) {
     return false;
   }
-  std::optional<InterimRows> rows;
-  try {
-    rows.emplace(newFile, old);
-  } catch (const RuntimeError& error) {
-    if (error.Number() == Fault::UnrecognizedDatabase || error.Number() == Fault::DatabaseError) {
-      return false;  // it is damaged, or no database of ours; it stays where it is
-    }
-    throw;  // its rows may be readable the next time
-  }
-  if (rows->Count() == 0 || !steps.AddInterimRows(rows->Count())) {
+  const std::unique_ptr<InterimRows> rows = ReadInterim(newFile, old);
+  if (!rows || rows->Count() == 0 || !steps.AddInterimRows(rows->Count())) {
     return false;
   }
   rows->Join();

@@ -11,7 +11,8 @@
 #include "platform/sqlite/SqliteConnection.h"
 #include "platform/sqlite/SqliteTable.h"
 
-/// Replaces the rows of a table in a new database file, in one transaction.
+/// Replaces the rows of a table in a new database file, in one transaction. The file is not durable when that
+/// is done: flush it before it is used.
 class TableImport {
  public:
   TableImport(const std::string& path, const std::string& table);
