@@ -153,7 +153,7 @@ TEST_F(QtFileDialogTest, OpensTheFolderThatIsSelected) {
   MakeFile("last.xml");
   ASSERT_TRUE(QDir(QString::fromStdString(Path(""))).mkdir(QStringLiteral("more")));
   EXPECT_EQ(Save(Path("last.xml"),
-                 [this](QFileDialog& dialog) {
+                 [](QFileDialog& dialog) {
                    auto* list = dialog.findChild<QListView*>(QStringLiteral("listView"));
                    QModelIndex folder;
                    ASSERT_TRUE(QTest::qWaitFor([&] {
