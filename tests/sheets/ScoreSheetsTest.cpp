@@ -458,7 +458,7 @@ TEST_F(Sheets, NeedToBeClosed) {
 }
 
 TEST_F(Sheets, CannotHaveANameThatSomeSystemRefuses) {
-  for (const std::string part : {":", "/", "\\", "*", "?", "\"", "<", ">", "|", "\n", "\x7F"}) {
+  for (const std::string part : {":", "/", "\\", "*", "?", "\"", "<", ">", "|", "\n", "\x1F", "\x7F"}) {
     venue.Boxes.Boxes.clear();
     word.Documents.clear();
     mission = "Hunt" + part;

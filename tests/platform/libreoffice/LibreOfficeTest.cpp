@@ -4,6 +4,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <chrono>
 #include <csignal>
 #include <cstdlib>
@@ -77,7 +78,7 @@ TEST_F(Writer, WritesTablesWithMergedCells) {
   EXPECT_THAT(text, Not(HasSubstr("second")));
 }
 
-TEST_F(Writer, WritesMoreColumnsThanTheAlphabetHasLettersNextToMergedCells) {
+TEST_F(Writer, FindsCellsBehindColumnZNextToMergedOnes) {
   constexpr int columns = 60;
   std::string row;
   std::vector<std::string> texts;
@@ -87,17 +88,24 @@ TEST_F(Writer, WritesMoreColumnsThanTheAlphabetHasLettersNextToMergedCells) {
   }
   WriteFile(folder / "wide.html", "<html><body><table><tr><td colspan=60>Heading</td></tr><tr>" + row +
                                       "</tr></table></body></html>");
+  WriteFile(folder / "photo", ReadFile(TESSARINE_RESOURCES "/pictures/tessarine-16.png"));
   const auto document = Office().Add(folder / "wide.html");
   document->WriteCells(1, 2, 1, texts);
+  const int withPicture[] = {1, 26, 27, 52, 53, 60};
+  for (const int column : withPicture) {
+    document->AddPicture(1, 2, column, folder / "photo");
+  }
+  EXPECT_EQ(NumberThrownBy([&] { document->AddPicture(1, 2, columns + 1, folder / "photo"); }), 440);
   document->SaveAs(folder / "wide.doc");
-  texts.emplace_back("one too many");
-  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 2, 1, texts); }), 440);
   document->Close();
-  const std::string text = TextOf(folder / "wide.doc");
-  std::size_t at = 0;
+  Convert({folder / "wide.doc"}, "fodt");
+  const std::string sheet = ReadFile(folder / "wide.fodt");
   for (int column = 1; column <= columns; ++column) {
-    at = text.find("Text" + std::to_string(column) + ".", at);
-    ASSERT_NE(at, std::string::npos) << column;
+    const std::string text = texts[static_cast<std::size_t>(column) - 1];
+    const bool has =
+        std::find(std::begin(withPicture), std::end(withPicture), column) != std::end(withPicture);
+    EXPECT_EQ(sheet.find("</draw:frame>" + text) != std::string::npos, has) << column;
+    EXPECT_NE(sheet.find(text), std::string::npos) << column;
   }
 }
 
@@ -198,6 +206,38 @@ TEST_F(Writer, CountsNoTableInATextBox) {
     EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {}); }), 9) << name;
     document->Close();
   }
+}
+
+TEST_F(Writer, CountsNoTableInAFrameThatTextRunsThroughOrThatKeepsADistance) {
+  const auto frame = [](const std::string& style) {
+    return "<text:p><draw:frame draw:style-name='" + style +
+           "' text:anchor-type='paragraph' svg:width='5cm'><draw:text-box><table:table><table:table-column/>"
+           "<table:table-row><table:table-cell><text:p/></table:table-cell></table:table-row></table:table>"
+           "</draw:text-box></draw:frame></text:p>";
+  };
+  const auto style = [](const std::string& name, const std::string& wrap, const std::string& padding) {
+    return "<style:style style:name='" + name +
+           "' style:family='graphic' style:parent-style-name='Frame'><style:graphic-properties style:wrap='" +
+           wrap + "' fo:padding='" + padding + "' fo:border='none'/></style:style>";
+  };
+  WriteFile(folder / "frames.fodt",
+            R"(<?xml version="1.0" encoding="UTF-8"?><office:document
+              xmlns:office="urn:oasis:names:tc:opendocument:xmlns:office:1.0"
+              xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
+              xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
+              xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
+              xmlns:style="urn:oasis:names:tc:opendocument:xmlns:style:1.0"
+              xmlns:fo="urn:oasis:names:tc:opendocument:xmlns:xsl-fo-compatible:1.0"
+              xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
+              office:mimetype="application/vnd.oasis.opendocument.text"><office:automatic-styles>)" +
+                style("through", "run-through", "0mm") + style("padded", "parallel", "1mm") +
+                style("floating", "parallel", "0mm") +
+                "</office:automatic-styles><office:body><office:text>" + frame("through") + frame("padded") +
+                frame("floating") + "</office:text></office:body></office:document>");
+  const auto document = Office().Add(folder / "frames.fodt");
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 1, 20, {"x"}); }), 0);
+  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {}); }), 9);
+  document->Close();
 }
 
 TEST_F(Writer, CountsAFloatingTableOfAWordFile) {
