@@ -26,7 +26,7 @@ class ReaderWords {
   }
   ReaderWords& Number(std::uint64_t value, std::size_t bytes) {
     for (std::size_t i = 0; i < bytes; ++i) {
-      bytes_ += static_cast<char>(value >> (8 * i) & 255U);
+      bytes_ += i < sizeof value ? static_cast<char>(value >> (8 * i) & 255U) : '\0';
     }
     return *this;
   }

@@ -7,7 +7,7 @@
 #include <vector>
 
 /// The number in `size` bytes, little-endian.
-inline std::string LittleEndian(std::uint32_t number, int size) {
+inline std::string LittleEndian(std::uint64_t number, int size) {
   std::string bytes;
   for (int i = 0; i < size; ++i) {
     bytes += static_cast<char>(number >> (8 * i) & 0xFFU);
