@@ -8,7 +8,7 @@
 
 namespace {
 
-constexpr std::chrono::milliseconds BusyTimeout(1000);
+constexpr std::chrono::milliseconds BusyTimeout(100);  // at the start, hardly anyone else has the files open
 
 void Attach(SqliteConnection& connection, const Value& path, const std::string& name) {
   SqliteStatement attach(connection, "ATTACH ?1 AS " + name);

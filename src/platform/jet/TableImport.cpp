@@ -9,7 +9,7 @@
 
 namespace {
 
-constexpr std::chrono::milliseconds BusyTimeout(1000);
+constexpr std::chrono::milliseconds BusyTimeout(100);  // at the start, hardly anyone else has the files open
 
 /// A value's share of its row's checksum. An integer and a double of equal value hash alike, since a column
 /// may store a whole number as either.
