@@ -122,7 +122,7 @@ class OldMembers {
   std::size_t MapPage() const {
     const auto place = NumberAt<std::uint32_t>(bytes_, table_ * PageSize + TableMapOffset);
     const std::size_t page = (place >> 8U) * PageSize;
-    const std::size_t entry = page + RowCountOffset + 2 + 2 * (place & 0xFFU);
+    const std::size_t entry = page + RowCountOffset + 2 + std::size_t{2} * (place & 0xFFU);
     const std::size_t map = page + (NumberAt<std::uint16_t>(bytes_, entry) & OffsetMask);
     return bytes_[map] == 1 ? NumberAt<std::uint32_t>(bytes_, map + 1) : 0;
   }

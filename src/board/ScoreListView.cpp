@@ -144,6 +144,7 @@ int ScoreListView::NeededWidth(int column) const {
 void ScoreListView::ShareWidth() {
   FitCaptions();
   std::vector<int> needed;
+  needed.reserve(shares_.size());
   for (int column = 0; column < ColumnCount(); ++column) {
     needed.push_back(NeededWidth(column));
   }

@@ -37,8 +37,8 @@ class OrdinaryPointer {
     }
   }
   ~OrdinaryPointer() {
-    for (auto cursor = covered_.rbegin(); cursor != covered_.rend(); ++cursor) {
-      QGuiApplication::setOverrideCursor(*cursor);
+    for (; !covered_.empty(); covered_.pop_back()) {
+      QGuiApplication::setOverrideCursor(covered_.back());
     }
   }
   OrdinaryPointer(const OrdinaryPointer&) = delete;

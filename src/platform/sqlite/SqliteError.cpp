@@ -72,7 +72,7 @@ RuntimeError SqliteError(sqlite3* database, const std::string& path, int systemE
   if (NoSpaceLeft(database, code, systemError)) {
     return {Fault::DatabaseDiskFull, "Not enough space on disk: " + path};
   }
-  const RuntimeError diskError(Fault::DatabaseDiskError, "Disk error: " + path);
+  RuntimeError diskError(Fault::DatabaseDiskError, "Disk error: " + path);
   if (IsUnreadable(database, code)) {
     return diskError;
   }
