@@ -10,29 +10,16 @@
 #include "platform/linux/LinuxFiles.h"
 #include "tests/support/Controls.h"
 #include "tests/support/ConversionAnswers.h"
+#include "tests/support/ReaderWords.h"
 #include "tests/support/TemporaryFolder.h"
 
 namespace {
-
-/// What a reader writes of one member.
-std::string OneMember() {
-  const auto number = [](std::size_t value, std::size_t bytes) {
-    std::string text;
-    for (std::size_t i = 0; i < bytes; ++i) {
-      text += static_cast<char>(value >> (8 * i) & 255);
-    }
-    return text;
-  };
-  const auto text = [&number](const std::string& value) { return "S" + number(value.size(), 4) + value; };
-  return "T" + text("Members") + number(2, 4) + text("ContactID") + text("FirstName") + "RI" + number(7, 8) +
-         text("Ada") + "E";
-}
 
 class ConversionWindow : public testing::TestWithParam<Language> {
  protected:
   ConversionWindow() {
     WriteFile(Path, std::string(4096, '\0'));
-    WriteFile(folder / "written", OneMember());
+    WriteFile(folder / "written", MembersAsRead({{7, "Ada"}}));
     WriteFile(Reader, "#!/bin/sh\ncat '" + (folder / "written") + "'\n");
     std::filesystem::permissions(Reader, std::filesystem::perms(0755));
   }
@@ -82,7 +69,7 @@ class WindowDuringQuestion : public ConversionAnswers {
 };
 
 TEST_P(ConversionWindow, GoesBeforeAQuestion) {
-  std::string words = OneMember();
+  std::string words = MembersAsRead({{7, "Ada"}});
   words.insert(words.find("RI") + 10, "U");
   WriteFile(folder / "written", words);
   const StringTable strings(GetParam());

@@ -9,29 +9,16 @@
 #include "tests/faults/FaultLoop.h"
 #include "tests/support/ConversionAnswers.h"
 #include "tests/support/DatabaseContents.h"
+#include "tests/support/ReaderWords.h"
 #include "tests/support/TestDatabase.h"
 
 namespace {
-
-/// What a reader writes of two members.
-std::string TwoMembers() {
-  const auto number = [](std::size_t value, std::size_t bytes) {
-    std::string text;
-    for (std::size_t i = 0; i < bytes; ++i) {
-      text += static_cast<char>(value >> (8 * i) & 255);
-    }
-    return text;
-  };
-  const auto text = [&number](const std::string& value) { return "S" + number(value.size(), 4) + value; };
-  return "T" + text("Members") + number(2, 4) + text("ContactID") + text("FirstName") + "RI" + number(7, 8) +
-         text("Ada") + "RI" + number(8, 8) + text("Sean") + "E";
-}
 
 /// What does not change while files fail: the reader, what it writes, and the empty database.
 class Sound {
  public:
   Sound() {
-    WriteFile(folder_ / "written", TwoMembers());
+    WriteFile(folder_ / "written", MembersAsRead({{7, "Ada"}, {8, "Sean"}}));
     WriteFile(Reader(), "#!/bin/sh\nexec cat '" + (folder_ / "written") + "'\n");
     std::filesystem::permissions(Reader(), std::filesystem::perms(0755));
     OtherConnection(folder_ / "empty.mdb").Execute(ReadFile(TESSARINE_RESOURCES "/members_default.sql"));
