@@ -32,7 +32,7 @@ enum class SessionChange {
   Saved,       ///< the game was written to a file
   Committed,   ///< the game was added to its members' totals, as far as that succeeded
   Missions,    ///< the list of missions was reread; the choice of its first entry comes next
-  Mission,     ///< a mission was chosen, perhaps the same one again
+  Mission,     ///< a mission was chosen, perhaps the same one again, or a choice that failed was taken back
   MissionRow,  ///< its row was looked up: MissionIsActive and MissionDescription now apply to it
 };
 
@@ -98,7 +98,8 @@ class Session {
   /// Reads the missions anew and makes "None" the active one. A failure to read them leaves list and active
   /// mission as they were.
   void FillMissionList();
-  /// Makes entry `index` of the missions the active one. A box reports a mission whose row is gone.
+  /// Makes entry `index` of the missions the active one and recalculates. A box reports a mission whose row
+  /// is gone. If the row cannot be read, the choice is taken back.
   void SelectMission(int index);
   /// True if the active entry is a mission whose row existed when it was chosen.
   bool MissionIsActive() const { return missionIsActive_; }
@@ -112,6 +113,7 @@ class Session {
   CommitResult CommitGame();
 
  private:
+  void LookUpMission();
   void ChooseMission(const std::string& name);
 
   const StringTable& strings_;
