@@ -7,6 +7,7 @@
 
 #include "core/data/FirstRun.h"
 #include "devices/buttons/ButtonSwipe.h"
+#include "platform/qt/UprightPicture.h"
 
 namespace {
 
@@ -57,6 +58,7 @@ Composition::Composition()
           .Devices = devices_,
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
+          .UprightPicture = UprightPicture,
           .ButtonSwipe = [this] { return SwipeButton(); }};
 }
 

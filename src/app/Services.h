@@ -30,6 +30,8 @@ struct Services {
   const SerialDevices& Devices;
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;
+  /// Turns a picture file as the camera noted in it.
+  std::function<std::string(const std::string& bytes)> UprightPicture;
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
 };

@@ -121,6 +121,7 @@ void frmRx::PrintScores() {
                          .Disk = services_.Disk,
                          .Boxes = services_.Boxes,
                          .WordApp = services_.WordProcessor,
+                         .UprightPicture = services_.UprightPicture,
                          .Progress = progress,
                          .UserDataFolder = userDataFolder_,
                          .MissionName = session_.Missions().Text()};

@@ -64,6 +64,7 @@ class Sheets : public testing::Test {
                            .Disk = files,
                            .Boxes = venue.Boxes,
                            .WordApp = word,
+                           .UprightPicture = upright,
                            .Progress = progress,
                            .UserDataFolder = "/data",
                            .MissionName = mission};
@@ -95,6 +96,7 @@ class Sheets : public testing::Test {
   FakeFiles files;
   FakeWordProcessor word;
   FakeSheetProgress progress;
+  std::function<std::string(const std::string&)> upright = [](const std::string& photo) { return photo; };
   PrintChoice choice;
   std::string mission = "Sniper Hunt";
 };
@@ -155,6 +157,19 @@ TEST_F(Sheets, PutThePhotoInAndDeleteItsFile) {
   EXPECT_EQ(Sheet(0).Picture, "/tmp/per1");
   EXPECT_EQ(files.Contents().count("/tmp/per1"), 0u);
   EXPECT_EQ(Sheet(1).Picture, "");
+}
+
+TEST_F(Sheets, TurnThePhotoUpright) {
+  std::string photo;
+  upright = [](const std::string& bytes) { return "upright " + bytes; };
+  word.OnOperation = [&](const std::string& operation) {
+    if (operation == "AddPicture 1 1 1") {
+      photo = files.Contents().at("/tmp/per1");
+    }
+  };
+  Run();
+  EXPECT_EQ(photo, std::string("upright \1\2\3\4"));
+  EXPECT_EQ(files.Contents().count("/tmp/per1"), 0u);
 }
 
 TEST_F(Sheets, ShowTheOwnPhotoWhenACommandMeanwhileLooksAnotherMemberUp) {

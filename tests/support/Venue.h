@@ -16,6 +16,7 @@
 #include "app/frmRx.h"
 #include "platform/jet/JetConverter.h"
 #include "platform/qt/QtEventPump.h"
+#include "platform/qt/UprightPicture.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
 #include "tests/fakes/FakeSerialDevices.h"
@@ -55,6 +56,7 @@ class Venue : public DataSite {
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
+                                                .UprightPicture = UprightPicture,
                                                 .ButtonSwipe = ButtonSwipe});
     return *Window;
   }
