@@ -27,19 +27,18 @@ inline constexpr Setting AmmoAdds = {"soldiering_calc", "ammo_adds", "-1",
 inline constexpr Setting Accuracy = {"soldiering_calc", "accuracy", "1",
                                      "Soldiering points for each percent of accuracy."};
 inline constexpr Setting FriendlyFire = {"soldiering_calc", "friendly_fire_factor", "-1",
-                                         "Factor by which damage to the own team counts."};
+                                         "Factor applied to damage done to one's own team."};
 
 inline constexpr Setting ReaderPort = {
     "onewire", "port", "",
-    "Number of the serial port with the reader of membership buttons; without it port 1, with an adapter of "
-    "kind 5."};
+    "Number of the serial port with the reader of membership buttons; without it, port 1 with an adapter of "
+    "type 5."};
 inline constexpr Setting ReaderType = {
-    "onewire", "type", "5", "Kind of the reader's adapter; 5 is a serial one with a DS2480B chip."};
+    "onewire", "type", "5", "Type of the reader's adapter; 5 is a serial adapter with a DS2480B chip."};
 
 /// One key for each port number n.
 inline constexpr Setting PortDevice = {
-    "ports", "com<n>", "",
-    "Device that port number n stands for; without it the n-th serial port of the machine."};
+    "ports", "com<n>", "", "Device for port number n; without it, the machine's n-th serial port."};
 
 }  // namespace Keys
 

@@ -85,9 +85,9 @@ class Session {
   Database& DbMembers() { return *dbMembers_; }
   Recordset& RsMembers() { return *rsMembers_; }
 
-  /// Throws as ScoreAnalysis::CalculateScores does; the lists are then empty, and Scores is not told. Nor is
-  /// it told by a calculation that a command in one of its boxes has overtaken. While a box is open, other
-  /// programs can write both databases.
+  /// Throws as ScoreAnalysis::CalculateScores does, with both lists left empty. Listeners hear of Scores only
+  /// when a calculation is complete, not when it fails or when a command given in one of its boxes has
+  /// replaced it. While a box is open, other programs can write both databases.
   void CalculateScores();
   /// Does the same, but only if there is a game and the databases are open.
   void CalculateScoresWhenPresent();
@@ -95,8 +95,8 @@ class Session {
   /// Sorts the players as a click on column header `header` (counted from 1) does.
   void SortByHeader(int header);
 
-  /// Reads the missions anew and makes "None" the active one. A failure to read them leaves list and active
-  /// mission as they were.
+  /// Rereads the missions and makes "None" the active one. If they cannot be read, the list and the active
+  /// mission stay as they were.
   void FillMissionList();
   /// Makes entry `index` of the missions the active one and recalculates. A box reports a mission whose row
   /// is gone. If the row cannot be read, the choice is taken back.
