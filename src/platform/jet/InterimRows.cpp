@@ -1,7 +1,6 @@
 #include "platform/jet/InterimRows.h"
 
 #include "platform/RuntimeError.h"
-#include "platform/jet/ConversionBusyTimeout.h"
 #include "platform/sqlite/SqliteStatement.h"
 #include "platform/sqlite/SqliteTable.h"
 
@@ -21,8 +20,9 @@ std::int64_t RowsOf(SqliteConnection& connection, const std::string& table) {
 
 }  // namespace
 
-InterimRows::InterimRows(const std::string& newFile, const OldDatabase& old)
-    : connection_(newFile, ConversionBusyTimeout) {
+InterimRows::InterimRows(const std::string& newFile, const OldDatabase& old,
+                         std::chrono::milliseconds lockWait)
+    : connection_(newFile, lockWait) {
   const SqliteTable table(connection_, old.Table);
   tableName_ = table.Name();
   table_ = "[" + tableName_ + "]";

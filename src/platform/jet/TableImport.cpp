@@ -6,7 +6,6 @@
 #include <string_view>
 
 #include "platform/RuntimeError.h"
-#include "platform/jet/ConversionBusyTimeout.h"
 
 namespace {
 
@@ -45,8 +44,9 @@ std::string TextOfNumber(const Value& value) {
 
 }  // namespace
 
-TableImport::TableImport(const std::string& path, const std::string& table)
-    : connection_(path, ConversionBusyTimeout), table_(connection_, table) {
+TableImport::TableImport(const std::string& path, const std::string& table,
+                         std::chrono::milliseconds lockWait)
+    : connection_(path, lockWait), table_(connection_, table) {
   connection_.Execute("PRAGMA synchronous = OFF");
   connection_.Execute("PRAGMA cache_size = -65536");  // KiB
   transaction_.emplace(connection_);
