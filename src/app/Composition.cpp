@@ -57,7 +57,8 @@ Composition::Composition()
           .Devices = devices_,
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
-          .ButtonSwipe = [this] { return SwipeButton(); }};
+          .ButtonSwipe = [this] { return SwipeButton(); },
+          .Wire = &wire_};
 }
 
 std::string Composition::SwipeButton() {

@@ -18,6 +18,7 @@
 #include "platform/qt/QtEventPump.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
+#include "tests/fakes/FakeOneWire.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
 #include "tests/fakes/FakeWordProcessor.h"
@@ -55,7 +56,8 @@ class Venue : public DataSite {
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
-                                                .ButtonSwipe = ButtonSwipe});
+                                                .ButtonSwipe = ButtonSwipe,
+                                                .Wire = HasReader ? &Wire : nullptr});
     return *Window;
   }
 
@@ -139,6 +141,8 @@ class Venue : public DataSite {
   FakeFolders Places;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
+  FakeOneWire Wire;
+  bool HasReader = true;
   FakeWordProcessor Word;
   std::unique_ptr<frmRx> Window;
 
