@@ -59,7 +59,8 @@ Composition::Composition()
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
           .UprightPicture = UprightPicture,
-          .ButtonSwipe = [this] { return SwipeButton(); }};
+          .ButtonSwipe = [this] { return SwipeButton(); },
+          .Wire = &wire_};
 }
 
 std::string Composition::SwipeButton() {

@@ -12,8 +12,10 @@
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
 #include "platform/OldDatabases.h"
+#include "platform/OneWire.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
+#include "platform/SoundPlayer.h"
 #include "platform/WordProcessor.h"
 
 /// The platform services that the main window uses; they must outlive it.
@@ -34,4 +36,8 @@ struct Services {
   std::function<std::string(const std::string& bytes)> UprightPicture;
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
+  /// The bus behind the reader; null if there is none.
+  OneWire* Wire = nullptr;
+  /// Null if nothing can be played.
+  SoundPlayer* Sounds = nullptr;
 };

@@ -14,6 +14,8 @@
 #include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
 #include "devices/baseunit/BaseUnitDownload.h"
+#include "devices/box/ProgrammedBoxes.h"
+#include "devices/charging/ChargedButtons.h"
 #include "sheets/PrintOptions.h"
 #include "ui/Commands.h"
 
@@ -73,6 +75,8 @@ class frmRx : public QMainWindow {
   void EnterMissionResults();
   void SetUpMissions();
   void ManageRemotely();
+  void ConfigureBoxes();
+  void ChargeButtons();
 
   /// The context menu of the board, for the last of the selected rows.
   void ShowPopup(const QPoint& position);
@@ -91,6 +95,8 @@ class frmRx : public QMainWindow {
   std::optional<IniReader> ini_;
   std::optional<CommPort> commPort_;
   DownloadedGuns downloadedGuns_;
+  ProgrammedBoxes programmedBoxes_;
+  ChargedButtons chargedButtons_;
   bool downloading_ = false;                    ///< a score download is on the stack
   int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again

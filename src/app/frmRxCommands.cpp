@@ -19,6 +19,8 @@
 #include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 #include "devices/baseunit/BaseUnitDownload.h"
+#include "devices/box/BoxConfig.h"
+#include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
 #include "members/MemberQueries.h"
 #include "members/Members.h"
@@ -208,6 +210,32 @@ void frmRx::ManageRemotely() {
                this)
       .exec();
   session_.CalculateScores();
+}
+
+void frmRx::ConfigureBoxes() {
+  BoxConfig({.MSComm1 = services_.MSComm1,
+             .Port = *commPort_,
+             .Events = services_.Events,
+             .Boxes = services_.Boxes,
+             .Time = services_.Time,
+             .Strings = services_.Strings,
+             .Game = session_.Game(),
+             .Programmed = programmedBoxes_,
+             .Signals = {*ini_, services_.Sounds, services_.Strings}},
+            this)
+      .exec();
+}
+
+void frmRx::ChargeButtons() {
+  ChargeiButton({.Wire = *services_.Wire,
+                 .Events = services_.Events,
+                 .Boxes = services_.Boxes,
+                 .Time = services_.Time,
+                 .Strings = services_.Strings,
+                 .Charged = chargedButtons_,
+                 .Signals = {*ini_, services_.Sounds, services_.Strings}},
+                this)
+      .exec();
 }
 
 void frmRx::ShowPopup(const QPoint& position) {

@@ -19,6 +19,7 @@
 #include "platform/qt/UprightPicture.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
+#include "tests/fakes/FakeOneWire.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
 #include "tests/fakes/FakeWordProcessor.h"
@@ -57,7 +58,8 @@ class Venue : public DataSite {
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
                                                 .UprightPicture = UprightPicture,
-                                                .ButtonSwipe = ButtonSwipe});
+                                                .ButtonSwipe = ButtonSwipe,
+                                                .Wire = HasReader ? &Wire : nullptr});
     return *Window;
   }
 
@@ -141,6 +143,8 @@ class Venue : public DataSite {
   FakeFolders Places;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
+  FakeOneWire Wire;
+  bool HasReader = true;
   FakeWordProcessor Word;
   std::unique_ptr<frmRx> Window;
 

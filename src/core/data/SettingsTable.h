@@ -40,9 +40,15 @@ inline constexpr Setting ReaderType = {
 inline constexpr Setting PortDevice = {
     "ports", "com<n>", "", "Device for port number n; without it, the machine's n-th serial port."};
 
+inline constexpr Setting OutcomeSign = {
+    "outcome", "sign", "1",
+    "1 for a large sign when a box was programmed or a button charged, or was not; 0 for none."};
+inline constexpr Setting OutcomeSound = {"outcome", "sound", "1", "The same for a sound."};
+
 }  // namespace Keys
 
 /// In the order of the manual.
-inline constexpr std::array AllSettings = {
-    Keys::CommPort, Keys::TotalDamage,  Keys::Respawns,   Keys::Heals,      Keys::AmmoAdds,
-    Keys::Accuracy, Keys::FriendlyFire, Keys::ReaderPort, Keys::ReaderType, Keys::PortDevice};
+inline constexpr std::array AllSettings = {Keys::CommPort,     Keys::TotalDamage, Keys::Respawns,
+                                           Keys::Heals,        Keys::AmmoAdds,    Keys::Accuracy,
+                                           Keys::FriendlyFire, Keys::ReaderPort,  Keys::ReaderType,
+                                           Keys::PortDevice,   Keys::OutcomeSign, Keys::OutcomeSound};
