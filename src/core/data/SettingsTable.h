@@ -36,6 +36,9 @@ inline constexpr Setting ReaderPort = {
 inline constexpr Setting ReaderType = {
     "onewire", "type", "5", "Kind of the reader's adapter; 5 is a serial one with a DS2480B chip."};
 
+inline constexpr Setting LastSoundFolder = {"Media Player", "1", "",
+                                            "Folder of the sound file that was chosen last."};
+
 /// One key for each port number n.
 inline constexpr Setting PortDevice = {
     "ports", "com<n>", "",
@@ -46,4 +49,4 @@ inline constexpr Setting PortDevice = {
 /// In the order of the manual.
 inline constexpr std::array AllSettings = {
     Keys::CommPort, Keys::TotalDamage,  Keys::Respawns,   Keys::Heals,      Keys::AmmoAdds,
-    Keys::Accuracy, Keys::FriendlyFire, Keys::ReaderPort, Keys::ReaderType, Keys::PortDevice};
+    Keys::Accuracy, Keys::FriendlyFire, Keys::ReaderPort, Keys::ReaderType, Keys::LastSoundFolder, Keys::PortDevice};
