@@ -59,6 +59,7 @@ Composition::Composition()
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
           .UprightPicture = UprightPicture,
+          .Awake = awake_,
           .ButtonSwipe = [this] { return SwipeButton(); },
           .Wire = &wire_};
 }

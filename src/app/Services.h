@@ -16,6 +16,7 @@
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
 #include "platform/SoundPlayer.h"
+#include "platform/WakeLock.h"
 #include "platform/WordProcessor.h"
 
 /// The platform services that the main window uses; they must outlive it.
@@ -32,6 +33,7 @@ struct Services {
   const SerialDevices& Devices;
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;
+  WakeLock& Awake;
   /// Turns a picture file as the camera noted in it.
   std::function<std::string(const std::string& bytes)> UprightPicture;
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.

@@ -22,6 +22,7 @@
 #include "tests/fakes/FakeOneWire.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
+#include "tests/fakes/FakeWakeLock.h"
 #include "tests/fakes/FakeWordProcessor.h"
 #include "tests/support/Controls.h"
 #include "tests/support/DataSite.h"
@@ -58,6 +59,7 @@ class Venue : public DataSite {
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
                                                 .UprightPicture = UprightPicture,
+                                                .Awake = Awake,
                                                 .ButtonSwipe = ButtonSwipe,
                                                 .Wire = HasReader ? &Wire : nullptr});
     return *Window;
@@ -145,6 +147,7 @@ class Venue : public DataSite {
   FakeSerialPort Port;
   FakeOneWire Wire;
   bool HasReader = true;
+  FakeWakeLock Awake;
   FakeWordProcessor Word;
   std::unique_ptr<frmRx> Window;
 

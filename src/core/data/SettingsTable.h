@@ -36,6 +36,9 @@ inline constexpr Setting ReaderPort = {
 inline constexpr Setting ReaderType = {
     "onewire", "type", "5", "Type of the reader's adapter; 5 is a serial adapter with a DS2480B chip."};
 
+inline constexpr Setting LastSoundFolder = {"Media Player", "1", "",
+                                            "Folder of the sound file that was chosen last."};
+
 /// One key for each port number n.
 inline constexpr Setting PortDevice = {
     "ports", "com<n>", "", "Device for port number n; without it, the machine's n-th serial port."};
@@ -48,7 +51,7 @@ inline constexpr Setting OutcomeSound = {"outcome", "sound", "1", "The same for 
 }  // namespace Keys
 
 /// In the order of the manual.
-inline constexpr std::array AllSettings = {Keys::CommPort,     Keys::TotalDamage, Keys::Respawns,
-                                           Keys::Heals,        Keys::AmmoAdds,    Keys::Accuracy,
-                                           Keys::FriendlyFire, Keys::ReaderPort,  Keys::ReaderType,
-                                           Keys::PortDevice,   Keys::OutcomeSign, Keys::OutcomeSound};
+inline constexpr std::array AllSettings = {
+    Keys::CommPort,   Keys::TotalDamage,  Keys::Respawns,    Keys::Heals,      Keys::AmmoAdds,
+    Keys::Accuracy,   Keys::FriendlyFire, Keys::ReaderPort,  Keys::ReaderType, Keys::LastSoundFolder,
+    Keys::PortDevice, Keys::OutcomeSign,  Keys::OutcomeSound};
