@@ -57,6 +57,7 @@ Composition::Composition()
           .Devices = devices_,
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
+          .Awake = awake_,
           .ButtonSwipe = [this] { return SwipeButton(); }};
 }
 

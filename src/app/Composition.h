@@ -11,6 +11,7 @@
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxFiles.h"
+#include "platform/qt/DBusWakeLock.h"
 #include "platform/qt/QtClock.h"
 #include "platform/qt/QtEventPump.h"
 #include "platform/qt/QtFileDialog.h"
@@ -69,4 +70,5 @@ class Composition {
   IniReader readerSettings_;
   SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
+  DBusWakeLock awake_;
 };

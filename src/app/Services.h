@@ -14,6 +14,7 @@
 #include "platform/OldDatabases.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
+#include "platform/WakeLock.h"
 #include "platform/WordProcessor.h"
 
 /// The platform services that the main window uses; they must outlive it.
@@ -30,6 +31,7 @@ struct Services {
   const SerialDevices& Devices;
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;
+  WakeLock& Awake;
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
 };

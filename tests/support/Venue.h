@@ -20,6 +20,7 @@
 #include "tests/fakes/FakeFolders.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
+#include "tests/fakes/FakeWakeLock.h"
 #include "tests/fakes/FakeWordProcessor.h"
 #include "tests/support/Controls.h"
 #include "tests/support/DataSite.h"
@@ -55,6 +56,7 @@ class Venue : public DataSite {
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
+                                                .Awake = Awake,
                                                 .ButtonSwipe = ButtonSwipe});
     return *Window;
   }
@@ -139,6 +141,7 @@ class Venue : public DataSite {
   FakeFolders Places;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
+  FakeWakeLock Awake;
   FakeWordProcessor Word;
   std::unique_ptr<frmRx> Window;
 
