@@ -11,6 +11,7 @@
 #include "platform/Files.h"
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
+#include "platform/MonotonicClock.h"
 #include "platform/OldDatabases.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
@@ -24,6 +25,7 @@ struct Services {
   DatabaseEngine& Databases;
   OldDatabases& Old;
   EventPump& Events;
+  const MonotonicClock& Elapsed;
   FileDialog& CommonDialog1;
   Files& Disk;
   const Folders& Places;

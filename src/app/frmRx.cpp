@@ -98,6 +98,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuUnassignMember, &frmRx::UnassignMember},
                                {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
                                {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
+                               {ui_->mnuFirmwareUpdate, &frmRx::UpdateFirmware},
                                {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context

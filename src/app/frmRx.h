@@ -72,6 +72,7 @@ class frmRx : public QMainWindow {
   void ShowAdminData();
   void EnterMissionResults();
   void SetUpMissions();
+  void UpdateFirmware();
   void ManageRemotely();
 
   /// The context menu of the board, for the last of the selected rows.
