@@ -51,6 +51,7 @@ Composition::Composition()
           .Databases = databases_,
           .Old = old_,
           .Events = events_,
+          .Elapsed = events_,
           .CommonDialog1 = fileDialog_,
           .Disk = files_,
           .Places = folders_,

@@ -11,6 +11,7 @@
 #include "platform/Files.h"
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
+#include "platform/MonotonicClock.h"
 #include "platform/OldDatabases.h"
 #include "platform/OneWire.h"
 #include "platform/SerialDevices.h"
@@ -26,6 +27,7 @@ struct Services {
   DatabaseEngine& Databases;
   OldDatabases& Old;
   EventPump& Events;
+  const MonotonicClock& Elapsed;
   FileDialog& CommonDialog1;
   Files& Disk;
   const Folders& Places;

@@ -99,6 +99,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuUnassignMember, &frmRx::UnassignMember},
                                {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
                                {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
+                               {ui_->mnuFirmwareUpdate, &frmRx::UpdateFirmware},
                                {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
                                {ui_->mnuBoxConfig, &frmRx::ConfigureBoxes},
                                {ui_->mnuChargeiButton, &frmRx::ChargeButtons},

@@ -74,6 +74,7 @@ class frmRx : public QMainWindow {
   void ShowAdminData();
   void EnterMissionResults();
   void SetUpMissions();
+  void UpdateFirmware();
   void ManageRemotely();
   void ConfigureBoxes();
   void ChargeButtons();

@@ -22,6 +22,7 @@
 #include "devices/box/BoxConfig.h"
 #include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
+#include "firmware/download/FirmwareFlash.h"
 #include "members/MemberQueries.h"
 #include "members/Members.h"
 #include "missions/Scenarios.h"
@@ -197,6 +198,24 @@ void frmRx::SetUpMissions() {
   Scenarios(session_.DbScenarios(), session_.RsScenarios(), services_.Boxes, services_.Strings, this).exec();
   session_.RsScenarios().MoveFirst();
   session_.FillMissionList();
+}
+
+void frmRx::UpdateFirmware() {
+  commPort_->CloseIfOpen();
+  FirmwareFlash({.MSComm1 = services_.MSComm1,
+                 .Devices = services_.Devices,
+                 .Ini = *ini_,
+                 .Events = services_.Events,
+                 .Boxes = services_.Boxes,
+                 .Cd1 = services_.CommonDialog1,
+                 .Disk = services_.Disk,
+                 .Time = services_.Time,
+                 .Elapsed = services_.Elapsed,
+                 .Strings = services_.Strings,
+                 .Awake = services_.Awake,
+                 .LogFolder = userDataFolder_ + "/logs"},
+                this)
+      .exec();
 }
 
 void frmRx::ManageRemotely() {

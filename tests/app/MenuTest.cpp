@@ -42,7 +42,7 @@ const std::vector<Menu> Menus = {
       {"mnuCheckButton", 0, "&Check Membership Button", true}}},
     {{"mnuTools", 0, "&Tools", true},
      {{"mnuBoxConfig", 0, "&Utility Box Configuration", true},
-      {"mnuFirmwareUpdate", 0, "F&irmware Update", false},
+      {"mnuFirmwareUpdate", 0, "F&irmware Update", true},
       {"mnuSoundRecorder", 0, "Sound &Recorder", false},
       {"mnuChargeiButton", 0, "Charge &iButton", true},
       {"mnuRemoteManage", 0, "Remote &Manage", true}}},

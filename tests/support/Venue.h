@@ -51,6 +51,7 @@ class Venue : public DataSite {
                                                 .Databases = Databases,
                                                 .Old = Old,
                                                 .Events = *events,
+                                                .Elapsed = Events,
                                                 .CommonDialog1 = Dialog,
                                                 .Disk = Disk,
                                                 .Places = Places,

@@ -17,6 +17,9 @@ namespace Keys {
 inline constexpr Setting CommPort = {"comm", "commport", "1",
                                      "Number of the serial port with the base unit or the radio modem."};
 
+inline constexpr Setting FirmwarePath = {"Paths", "firmware_path", "Select a File",
+                                         "The last firmware file."};
+
 inline constexpr Setting TotalDamage = {"soldiering_calc", "total_damage", "1",
                                         "Soldiering points for each point of damage."};
 inline constexpr Setting Respawns = {"soldiering_calc", "respawns", "-1",
@@ -52,6 +55,6 @@ inline constexpr Setting OutcomeSound = {"outcome", "sound", "1", "The same for 
 
 /// In the order of the manual.
 inline constexpr std::array AllSettings = {
-    Keys::CommPort,   Keys::TotalDamage,  Keys::Respawns,    Keys::Heals,      Keys::AmmoAdds,
-    Keys::Accuracy,   Keys::FriendlyFire, Keys::ReaderPort,  Keys::ReaderType, Keys::LastSoundFolder,
-    Keys::PortDevice, Keys::OutcomeSign,  Keys::OutcomeSound};
+    Keys::CommPort,        Keys::FirmwarePath, Keys::TotalDamage,  Keys::Respawns,    Keys::Heals,
+    Keys::AmmoAdds,        Keys::Accuracy,     Keys::FriendlyFire, Keys::ReaderPort,  Keys::ReaderType,
+    Keys::LastSoundFolder, Keys::PortDevice,   Keys::OutcomeSign,  Keys::OutcomeSound};
