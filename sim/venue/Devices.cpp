@@ -3,7 +3,7 @@
 namespace sim {
 
 const std::vector<DeviceEntry>& Devices() {
-  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(), RadioEntry()};
+  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(), RadioEntry(), BoxEntry()};
   return devices;
 }
 
