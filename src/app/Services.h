@@ -35,9 +35,9 @@ struct Services {
   const SerialDevices& Devices;
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;
-  WakeLock& Awake;
   /// Turns a picture file as the camera noted in it.
   std::function<std::string(const std::string& bytes)> UprightPicture;
+  WakeLock& Awake;
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
   /// The bus behind the reader; null if there is none.
