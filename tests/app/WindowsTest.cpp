@@ -4,6 +4,8 @@
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
 #include "board/PlayerDetails.h"
+#include "devices/box/BoxConfig.h"
+#include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
 #include "members/Members.h"
 #include "missions/MissionNameEntry.h"
@@ -68,6 +70,8 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<AdminData>("mnuAdminData");
   LookAt<Scenarios>("mnuSetupMissions");
   LookAt<RemoteManage>("mnuRemoteManage");
+  LookAt<BoxConfig>("mnuBoxConfig");
+  LookAt<ChargeiButton>("mnuChargeiButton");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }

@@ -22,14 +22,15 @@ bool MayBeCutShort(const ChargeBlock& block) {
 
 void ButtonCharger::Tick() {
   try {
-    if (poll_.Begin()) {
-      readerMissing_ = false;
+    const bool began = poll_.Begin();
+    if (began) {
       parts_.Display.SetReader(true);
       Step();
     } else if (MissReader() && !parts_.Display.Closing()) {
       parts_.Boxes.Show("Error loading button driver", "Button Error", BoxIcon::None);
     }
     poll_.End();
+    readerMissing_ = !began;  // not before: a driver may begin each session and then fail
   } catch (const std::exception&) {
     poll_.EndFailed();
     if (MissReader()) {

@@ -283,10 +283,16 @@ TEST_F(MissingReader, IsNotToldInAWindowThatCloses) {
 }
 
 TEST_F(MissingReader, OfADriverThatThrowsIsReportedOnce) {
-  bus.Broken = "TMExtendedStartSession";
-  EXPECT_EQ(NumberThrownBy([this] { Ticks(1); }), Fault::FileNotFound);
-  EXPECT_EQ(NumberThrownBy([this] { Ticks(1); }), 0);
-  EXPECT_TRUE(charger.ReaderMissing());
+  for (const char* operation : {"TMReadDefaultPort", "TMExtendedStartSession", "TMNext", "TMEndSession"}) {
+    bus.Broken = operation;
+    EXPECT_EQ(NumberThrownBy([this] { Ticks(1); }), Fault::FileNotFound) << operation;
+    EXPECT_TRUE(charger.ReaderMissing()) << operation;
+    EXPECT_EQ(NumberThrownBy([this] { Ticks(3); }), 0) << operation;
+    EXPECT_FALSE(display.Reader) << operation;
+    bus.Broken = "";
+    Ticks(1);
+    EXPECT_FALSE(charger.ReaderMissing()) << operation;
+  }
   EXPECT_THAT(boxes.Boxes, IsEmpty());
 }
 

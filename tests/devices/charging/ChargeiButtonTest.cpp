@@ -152,7 +152,7 @@ TEST_P(ChargeWindow, ListsWhatWasNotChargedAndWhy) {
                                   In("Unknown, not charged", "类型未知，未充值")));
   MemoryButton& gone = TouchedButton({1, 0});
   bus.BeforeByte = [&](std::size_t) { bus.TakeAway(gone); };
-  Ticks(3);
+  Ticks(4);
   EXPECT_THAT(Row(0), ElementsAre("2", "14:30:05", "", "A20000000000020C", In("Not read", "未能读取")));
 }
 
