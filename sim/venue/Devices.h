@@ -9,6 +9,7 @@ namespace sim {
 DeviceEntry BaseUnitEntry();
 DeviceEntry OneWireEntry();
 DeviceEntry RadioEntry();
+DeviceEntry RecorderEntry();
 
 /// All devices of the venue, in output order.
 const std::vector<DeviceEntry>& Devices();

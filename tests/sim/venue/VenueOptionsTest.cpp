@@ -8,6 +8,7 @@
 #include "sim/baseunit/BaseUnitFailure.h"
 #include "sim/onewire/OneWireFailure.h"
 #include "sim/radio/RadioFailure.h"
+#include "sim/recorder/RecorderFailure.h"
 #include "sim/venue/VenueUsage.h"
 
 namespace sim {
@@ -97,6 +98,26 @@ TEST(VenueOptions, TakeEveryOptionOfTheRadioModem) {
   EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::None);
 }
 
+TEST(VenueOptions, TakeEveryOptionOfTheSoundRecorder) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("recorder");
+  EXPECT_FALSE(untold.Served);
+  EXPECT_EQ(untold.Choice("kind"), 0U);
+  EXPECT_EQ(untold.Number("erase-time"), 500U);
+  EXPECT_EQ(untold.File("folder"), std::nullopt);
+  const DeviceOptions told =
+      ParseVenueOptions({"--recorder", "--recorder-kind", "stand-alone", "--recorder-erase-time", "9",
+                         "--recorder-folder", "sounds", "--recorder-failure", "lost-byte", "--recorder-at",
+                         "7", "--recorder-link", "chip"})
+          .Of("recorder");
+  EXPECT_TRUE(told.Served);
+  EXPECT_EQ(told.Choice("kind"), 2U);
+  EXPECT_EQ(told.Number("erase-time"), 9U);
+  EXPECT_EQ(told.File("folder"), "sounds");
+  EXPECT_EQ(told.FailureAs<RecorderFailure>(), RecorderFailure::LostByte);
+  EXPECT_EQ(told.Place, 7U);
+  EXPECT_EQ(told.Link, "chip");
+}
+
 TEST(VenueOptions, KnowEveryFailureByItsName) {
   for (const RadioFailureInfo& info : RadioFailures) {
     EXPECT_EQ(RadioIn({"--radio-failure", std::string(info.Name)}).FailureAs<RadioFailure>(), info.Failure);
@@ -157,6 +178,8 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--radio-answer-time", "10001"},
                                                       {"--radio-frames", ""},
                                                       {"--radio-link", ""},
+                                                      {"--recorder-kind", "gum"},
+                                                      {"--recorder-folder", ""},
                                                       {"--link", ""},
                                                       {"--no-base-unit"},
                                                       {"--no-radio"},
