@@ -8,6 +8,7 @@ namespace sim {
 
 DeviceEntry BaseUnitEntry();
 DeviceEntry OneWireEntry();
+DeviceEntry Pic24fEntry();
 DeviceEntry RadioEntry();
 DeviceEntry RecorderEntry();
 

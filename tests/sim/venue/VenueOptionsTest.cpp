@@ -7,6 +7,7 @@
 
 #include "sim/baseunit/BaseUnitFailure.h"
 #include "sim/onewire/OneWireFailure.h"
+#include "sim/pic24f/Pic24fFailure.h"
 #include "sim/radio/RadioFailure.h"
 #include "sim/recorder/RecorderFailure.h"
 #include "sim/venue/VenueUsage.h"
@@ -118,6 +119,36 @@ TEST(VenueOptions, TakeEveryOptionOfTheSoundRecorder) {
   EXPECT_EQ(told.Link, "chip");
 }
 
+TEST(VenueOptions, TakeEveryOptionOfThePic24fBootloader) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("pic24f");
+  EXPECT_FALSE(untold.Served);
+  for (const char* option : {"device", "identity", "pages", "eeprom-words", "user-reset", "boot-delay"}) {
+    EXPECT_EQ(untold.Number(option), 0U) << option;
+  }
+  EXPECT_EQ(untold.Number("row-time"), 2U);
+  EXPECT_EQ(untold.Number("page-time"), 20U);
+  const DeviceOptions told =
+      ParseVenueOptions({"--pic24f", "--pic24f-device",     "small", "--pic24f-identity",
+                         "32769",    "--pic24f-pages",      "15872", "--pic24f-eeprom-words",
+                         "32764",    "--pic24f-user-reset", "3072",  "--pic24f-boot-delay",
+                         "3074",     "--pic24f-row-time",   "0",     "--pic24f-page-time",
+                         "1",        "--pic24f-failure",    "noise", "--pic24f-at",
+                         "4",        "--pic24f-link",       "port"})
+          .Of("pic24f");
+  EXPECT_TRUE(told.Served);
+  EXPECT_EQ(told.Choice("device"), 2U);
+  EXPECT_EQ(told.Number("identity"), 32769U);
+  EXPECT_EQ(told.Number("pages"), 15872U);
+  EXPECT_EQ(told.Number("eeprom-words"), 32764U);
+  EXPECT_EQ(told.Number("user-reset"), 3072U);
+  EXPECT_EQ(told.Number("boot-delay"), 3074U);
+  EXPECT_EQ(told.Number("row-time"), 0U);
+  EXPECT_EQ(told.Number("page-time"), 1U);
+  EXPECT_EQ(told.FailureAs<Pic24fFailure>(), Pic24fFailure::Noise);
+  EXPECT_EQ(told.Place, 4U);
+  EXPECT_EQ(told.Link, "port");
+}
+
 TEST(VenueOptions, KnowEveryFailureByItsName) {
   for (const RadioFailureInfo& info : RadioFailures) {
     EXPECT_EQ(RadioIn({"--radio-failure", std::string(info.Name)}).FailureAs<RadioFailure>(), info.Failure);
@@ -179,6 +210,8 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--radio-frames", ""},
                                                       {"--radio-link", ""},
                                                       {"--recorder-kind", "gum"},
+                                                      {"--pic24f-device", "tiny"},
+                                                      {"--pic24f-identity", "65536"},
                                                       {"--recorder-folder", ""},
                                                       {"--link", ""},
                                                       {"--no-base-unit"},
