@@ -12,6 +12,7 @@
 #include "board/PlayerDelegate.h"
 #include "board/ScoreListModel.h"
 #include "core/data/FirstRun.h"
+#include "core/data/UserDatabase.h"
 #include "ui/Choice.h"
 #include "ui_frmRx.h"
 
@@ -122,7 +123,7 @@ void frmRx::ConnectCommands() {
 
 void frmRx::TellOfMissingBackup() {
   if (const std::string reason = session_.TakeBackupFailure(); !reason.empty()) {
-    services_.Boxes.Show(reason, "Database status", BoxIcon::Exclamation);
+    services_.Boxes.Show(reason, DatabaseBoxTitle, BoxIcon::Exclamation);
   }
 }
 
