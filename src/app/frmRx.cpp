@@ -75,7 +75,7 @@ void frmRx::SetUpLists() {
   ui_->ScoreDisplay->horizontalHeader()->setSectionsClickable(true);
   ui_->TeamScores->setModel(new ScoreListModel(session_, BoardList::Teams, strings, this));
   ui_->TeamScores->SetColumnShares(std::vector<double>(TeamColumnCount, 1.0 / TeamColumnCount));
-  ui_->TeamScores->setFixedHeight(ui_->TeamScores->HeightForRows(TeamCount));
+  ui_->TeamScores->ShowWholeRows(TeamCount);
 }
 
 void frmRx::ConnectCommands() {

@@ -1,3 +1,5 @@
+#include <QScrollBar>
+
 #include "app/About.h"
 #include "app/UploadProgress.h"
 #include "board/AdminData.h"
@@ -134,6 +136,7 @@ TEST_P(Windows, TheMainOneIsCaredForAtTheSmallestSize) {
   EXPECT_TRUE(venue.Window->isMaximized() || venue.Window->width() == 1024);
   auto& board = venue.Find<QTableView>("ScoreDisplay");
   EXPECT_GE(board.columnWidth(1), board.sizeHintForIndex(board.model()->index(0, 1)).width());
+  EXPECT_FALSE(venue.Find<QTableView>("TeamScores").verticalScrollBar()->isVisible());
 }
 
 INSTANTIATE_TEST_SUITE_P(Looks, Windows,
