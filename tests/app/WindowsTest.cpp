@@ -5,6 +5,7 @@
 #include "board/MissionResultEntry.h"
 #include "board/PlayerDetails.h"
 #include "devices/radio/RemoteManage.h"
+#include "firmware/download/FirmwareFlash.h"
 #include "members/Members.h"
 #include "missions/MissionNameEntry.h"
 #include "missions/Scenarios.h"
@@ -67,6 +68,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<Scenarios>("mnuSetupMissions");
+  LookAt<FirmwareFlash>("mnuFirmwareUpdate");
   LookAt<RemoteManage>("mnuRemoteManage");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
