@@ -9,6 +9,7 @@
 #include "devices/box/BoxConfig.h"
 #include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
+#include "firmware/download/FirmwareFlash.h"
 #include "members/Members.h"
 #include "missions/MissionNameEntry.h"
 #include "missions/Scenarios.h"
@@ -71,6 +72,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<Scenarios>("mnuSetupMissions");
+  LookAt<FirmwareFlash>("mnuFirmwareUpdate");
   LookAt<RemoteManage>("mnuRemoteManage");
   LookAt<BoxConfig>("mnuBoxConfig");
   LookAt<ChargeiButton>("mnuChargeiButton");

@@ -144,7 +144,7 @@ std::string FirmwareDownload::End(FirmwareEnd end, DownloadLine& line) {
   if (told.Resets) {
     ResetWindow();
   }
-  if (end != FirmwareEnd::LineFailed) {
+  if (end != FirmwareEnd::LineFailed && end != FirmwareEnd::ProgramCloses) {
     line.LeaveOpen();
   }
   if (end == FirmwareEnd::WrongProduct) {

@@ -7,13 +7,14 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeSerialPort.h"
 
-/// The boot code of a device at the far end of a fake line, as far as a test needs it: it answers each command
-/// with the good answer, unless the test wants another one.
+/// The boot code of a device at the far end of a fake line, as far as a test needs it: it answers each
+/// command with the good answer, unless the test wants another one.
 class BootCode {
  public:
   /// Commands are told apart by their first character.
@@ -48,7 +49,13 @@ class BootCode {
   void SayAt(std::chrono::milliseconds delay, const std::string& text) {
     events_.At(delay, [this, text] { Say(text); });
   }
-  void SwitchOnAt(std::chrono::milliseconds delay) { SayAt(delay, "BOOT"); }
+  void SwitchOnAt(std::chrono::milliseconds delay) {
+    events_.At(delay, [this] {
+      coming_.clear();
+      buffers_ = 0;
+      Say("BOOT");
+    });
+  }
 
   /// The first characters of all commands.
   std::string Letters() const {

@@ -87,6 +87,7 @@ class DownloadSite : public testing::Test {
   }
 
   void RunQvm2(const std::string& contents) {
+    boot.Product = 'd';
     Disk.Put(Qvm2Name, contents);
     boot.SwitchOnAt(Milliseconds(100));
     Run(Qvm2Name);
@@ -94,8 +95,8 @@ class DownloadSite : public testing::Test {
 
   /// The only box, an exclamation with one button.
   void ExpectBox(const std::string& text) {
-    EXPECT_THAT(Boxes.Boxes, testing::ElementsAre(FakeMessageBoxes::Box{text, "Tessarine", BoxIcon::Exclamation,
-                                                                        BoxButtons::Ok}));
+    EXPECT_THAT(Boxes.Boxes, testing::ElementsAre(FakeMessageBoxes::Box{
+                                 text, "Tessarine", BoxIcon::Exclamation, BoxButtons::Ok}));
   }
 
   /// The window is back to idle, as after most failures; the port stays open.
@@ -117,11 +118,10 @@ class DownloadSite : public testing::Test {
 
   /// The two boxes and the state of a run-time failure.
   void ExpectRunTimeFailure(int number, const std::string& text) {
-    EXPECT_THAT(Boxes.Boxes,
-                testing::ElementsAre(FakeMessageBoxes::Box{"Error Occured, " + text, "Tessarine",
-                                                           BoxIcon::Exclamation, BoxButtons::Ok},
-                                     FakeMessageBoxes::Box{std::to_string(number), "Tessarine", BoxIcon::None,
-                                                           BoxButtons::Ok}));
+    EXPECT_THAT(Boxes.Boxes, testing::ElementsAre(FakeMessageBoxes::Box{"Error Occured, " + text, "Tessarine",
+                                                                        BoxIcon::Exclamation, BoxButtons::Ok},
+                                                  FakeMessageBoxes::Box{std::to_string(number), "Tessarine",
+                                                                        BoxIcon::None, BoxButtons::Ok}));
     EXPECT_EQ(shown.Status, "Error");
     EXPECT_EQ(shown.Buffer, "Buffer Empty");
     EXPECT_EQ(shown.Download, "Idle");
@@ -152,11 +152,12 @@ class DownloadSite : public testing::Test {
   ShownDownload shown;
   std::string device = "/dev/ttyS0";
   StringTable strings{Language::English};
-  FirmwareDownload download{{.MSComm1 = Port,
-                             .Events = Events,
-                             .Boxes = Boxes,
-                             .Strings = strings,
-                             .Awake = Awake,
-                             .Record = {.Disk = Disk, .Folder = "/data/logs", .Elapsed = Events, .Time = Time}},
-                            shown};
+  FirmwareDownload download{
+      {.MSComm1 = Port,
+       .Events = Events,
+       .Boxes = Boxes,
+       .Strings = strings,
+       .Awake = Awake,
+       .Record = {.Disk = Disk, .Folder = "/data/logs", .Elapsed = Events, .Time = Time}},
+      shown};
 };

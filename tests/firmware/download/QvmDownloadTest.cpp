@@ -39,9 +39,10 @@ std::string Line(std::size_t count) {
 TEST_F(QvmDownload, SendsEachLineAsOneBuffer) {
   boot.BufferSizes = {3, 2};
   RunQvm("; a comment\r\n:0aFf10\r\n\r\n:7001\r\n");
-  const std::string expected("XPBS\x00\x70\x8FZ\x0A\xFF\x10Z\x70\x01"
-                             "F",
-                             15);
+  const std::string expected(
+      "XPBS\x00\x70\x8FZ\x0A\xFF\x10Z\x70\x01"
+      "F",
+      15);
   EXPECT_EQ(std::string(Port.Sent.begin(), Port.Sent.end()), expected);
   ExpectComplete();
 }
@@ -57,9 +58,9 @@ TEST_F(QvmDownload, ShowsItsStepsAndCountsCodeWordsOneLineLate) {
   RunQvm(Line(51) + Line(51) + Line(2) + Line(1));
   // 0, then 25.5 to even, 26 + 25.5 to even, 52 + 1
   EXPECT_THAT(shown.Statuses,
-              ElementsAre("Power up device now. Waiting for device response...", "Syncronising with device...",
-                          "Loaded 0 code words", "Loaded 26 code words", "Loaded 52 code words",
-                          "Loaded 53 code words"));
+              ElementsAre("Power up device now. Waiting for device response...",
+                          "Syncronising with device...", "Loaded 0 code words", "Loaded 26 code words",
+                          "Loaded 52 code words", "Loaded 53 code words"));
   EXPECT_THAT(shown.Bars, ElementsAre(0, 0, 1 / 3.0, 2 / 3.0, 1));
   EXPECT_THAT(buffers, ElementsAre(":" + std::string(102, '1'), ":" + std::string(102, '1'), ":1111", ":11"));
   EXPECT_EQ(shown.Buffer, ":11");

@@ -57,11 +57,16 @@ TEST_F(Synchronise, SendsNothingMoreForAFileOfNoKind) {
 }
 
 TEST_F(Synchronise, TellsTheKindByTheNamesEndInSmallLettersOnly) {
-  for (const auto& [name, type] :
-       {std::pair{"a.qvm", FirmwareFileType::Qvm}, {"qvm", FirmwareFileType::Qvm}, {"x.hexqvm", FirmwareFileType::Qvm},
-        {"a.qvm2", FirmwareFileType::Qvm2}, {"a.QVM", FirmwareFileType::None}, {"a.Qvm2", FirmwareFileType::None},
-        {"a.qvm ", FirmwareFileType::None}, {"a.qvm3", FirmwareFileType::None}, {"vm2", FirmwareFileType::None},
-        {"", FirmwareFileType::None}}) {
+  for (const auto& [name, type] : {std::pair{"a.qvm", FirmwareFileType::Qvm},
+                                   {"qvm", FirmwareFileType::Qvm},
+                                   {"x.hexqvm", FirmwareFileType::Qvm},
+                                   {"a.qvm2", FirmwareFileType::Qvm2},
+                                   {"a.QVM", FirmwareFileType::None},
+                                   {"a.Qvm2", FirmwareFileType::None},
+                                   {"a.qvm ", FirmwareFileType::None},
+                                   {"a.qvm3", FirmwareFileType::None},
+                                   {"vm2", FirmwareFileType::None},
+                                   {"", FirmwareFileType::None}}) {
     EXPECT_EQ(TypeOf(name), type) << name;
   }
 }
@@ -242,8 +247,12 @@ TEST_F(Synchronise, AFileThatCannotBeLoadedIsThrownBeforeTheLineOpens) {
   Disk.Put("/fw/secret.qvm", ":00\r\n");
   Disk.AddFolder("/fw/folder.qvm2");
   Disk.FailRead("/fw/secret.qvm", RuntimeError(75));
-  for (const auto& [name, number] : {std::pair{"/fw/none.qvm", 53}, {"/fw/none.qvm2", 53}, {"/fw/bad.qvm2", 9},
-                                     {"/fw/odd.qvm2", 6}, {"/fw/secret.qvm", 75}, {"/fw/folder.qvm2", 75}}) {
+  for (const auto& [name, number] : {std::pair{"/fw/none.qvm", 53},
+                                     {"/fw/none.qvm2", 53},
+                                     {"/fw/bad.qvm2", 9},
+                                     {"/fw/odd.qvm2", 6},
+                                     {"/fw/secret.qvm", 75},
+                                     {"/fw/folder.qvm2", 75}}) {
     EXPECT_EQ(NumberThrownBy([this, name = name] { Run(name); }), number) << name;
     EXPECT_FALSE(shown.Running);
     EXPECT_EQ(shown.Busy, 0);

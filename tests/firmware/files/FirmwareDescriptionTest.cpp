@@ -21,8 +21,9 @@ class Description : public testing::TestWithParam<Language> {
 
 TEST_P(Description, TellsOfAQvmFile) {
   const std::string text = Of("/a/b.qvm", ":0102\r\n:0304\r\n");
-  EXPECT_EQ(text, IsEnglish() ? "QVM file: 2 lines, 14 bytes, checksum 6C968F73. Sending takes about 0 min 0 s."
-                              : "QVM 文件：2 行，14 字节，校验和 6C968F73。发送约需 0 分 0 秒。");
+  EXPECT_EQ(text, IsEnglish()
+                      ? "QVM file: 2 lines, 14 bytes, checksum 6C968F73. Sending takes about 0 min 0 s."
+                      : "QVM 文件：2 行，14 字节，校验和 6C968F73。发送约需 0 分 0 秒。");
 }
 
 TEST_P(Description, TellsOfAQvm2FileAndHowLongAFullDeviceTakes) {
@@ -44,9 +45,10 @@ TEST_P(Description, TellsOfAQvm2FileAndHowLongAFullDeviceTakes) {
 
 TEST_P(Description, SaysThatAFileOfNoKindIsNotSent) {
   EXPECT_EQ(Of("A.QVM2", "123456789"),
-            IsEnglish() ? "9 bytes, checksum CBF43926. The name ends neither in qvm nor in qvm2 (small letters): "
-                          "nothing of it would be sent."
-                        : "9 字节，校验和 CBF43926。文件名不以小写的 qvm 或 qvm2 结尾：其内容不会发送。");
+            IsEnglish()
+                ? "9 bytes, checksum CBF43926. The name ends neither in qvm nor in qvm2 (small letters): "
+                  "nothing of it would be sent."
+                : "9 字节，校验和 CBF43926。文件名不以小写的 qvm 或 qvm2 结尾：其内容不会发送。");
 }
 
 TEST_P(Description, SaysWhyAFileCannotBeLoaded) {
@@ -78,9 +80,10 @@ TEST(OddFirmware, IsWhatADeviceWouldNotGet) {
   EXPECT_EQ(OddIn("a.qvm", ""), "no lines of data");
   EXPECT_EQ(OddIn("a.qvm", ":01\r\n"), "a single line of data, which cannot be sent");
   EXPECT_EQ(OddIn("a.qvm", ":01\r\n; note\r\n:02\r\n"), "other lines, which are left out: 1");
-  EXPECT_EQ(OddIn("a.qvm", ":01\n:02\n"),
-            "line feeds without carriage returns; a single line of data, which cannot be sent; lines with an odd "
-            "count of digits: 1; lines with characters that are no hexadecimal digits: 1");
+  EXPECT_EQ(
+      OddIn("a.qvm", ":01\n:02\n"),
+      "line feeds without carriage returns; a single line of data, which cannot be sent; lines with an odd "
+      "count of digits: 1; lines with characters that are no hexadecimal digits: 1");
 }
 
 TEST(OddFirmware, IsALineThatCannotBeSent) {

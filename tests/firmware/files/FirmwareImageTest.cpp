@@ -184,7 +184,9 @@ TEST_F(Image, TakesAnyBytesWithoutHarm) {
     every += static_cast<char>(code);
   }
   EXPECT_NE(FailureOf(every), 0);
-  EXPECT_NE(FailureOf("\xEF\xBB\xBF" "0\r\n0\r\n"), 0);
+  EXPECT_NE(FailureOf("\xEF\xBB\xBF"
+                      "0\r\n0\r\n"),
+            0);
   EXPECT_NE(FailureOf("0\r\n0\r\n" + every), 0);
 }
 
