@@ -12,6 +12,7 @@
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
 #include "platform/OldDatabases.h"
+#include "platform/Programs.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
 #include "platform/WordProcessor.h"
@@ -27,6 +28,7 @@ struct Services {
   Files& Disk;
   const Folders& Places;
   MessageBoxes& Boxes;
+  Programs& OtherPrograms;
   const SerialDevices& Devices;
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;

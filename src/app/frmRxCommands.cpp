@@ -20,6 +20,9 @@
 #include "core/text/NumberForms.h"
 #include "devices/baseunit/BaseUnitDownload.h"
 #include "devices/radio/RemoteManage.h"
+#include "firmware/pic24f/PortNames.h"
+#include "firmware/pic24f/SerialPicBoot.h"
+#include "firmware/pic24f/frmBootload.h"
 #include "members/MemberQueries.h"
 #include "members/Members.h"
 #include "missions/Scenarios.h"
@@ -207,6 +210,30 @@ void frmRx::ManageRemotely() {
                this)
       .exec();
   session_.CalculateScores();
+}
+
+void frmRx::UpdateTypeB() {
+  commPort_->CloseIfOpen();
+  const CommPortSetting ports(*ini_, services_.Devices);
+  const auto makeLibrary = [&](std::function<bool()> stopped) {
+    return std::make_unique<SerialPicBoot>(SerialPicBoot::Parts{
+        .Port = services_.MSComm1,
+        .Events = services_.Events,
+        .DeviceOf = [&ports](const std::string& port) { return DeviceOfPort(port, ports); },
+        .Stopped = std::move(stopped)});
+  };
+  frmBootload({.MakeLibrary = makeLibrary,
+               .Disk = services_.Disk,
+               .Events = services_.Events,
+               .CommonDialog1 = services_.CommonDialog1,
+               .Boxes = services_.Boxes,
+               .OtherPrograms = services_.OtherPrograms,
+               .Ini = *ini_,
+               .Devices = services_.Devices,
+               .Strings = services_.Strings,
+               .Folder = {userDataFolder_, services_.Places.Program()}},
+              this)
+      .exec();
 }
 
 void frmRx::ShowPopup(const QPoint& position) {

@@ -18,6 +18,7 @@
 #include "platform/qt/QtEventPump.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
+#include "tests/fakes/FakePrograms.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
 #include "tests/fakes/FakeWordProcessor.h"
@@ -52,6 +53,7 @@ class Venue : public DataSite {
                                                 .Disk = Disk,
                                                 .Places = Places,
                                                 .Boxes = Boxes,
+                                                .OtherPrograms = Started,
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
@@ -140,6 +142,7 @@ class Venue : public DataSite {
   FakeSerialDevices Devices;
   FakeSerialPort Port;
   FakeWordProcessor Word;
+  FakePrograms Started;
   std::unique_ptr<frmRx> Window;
 
  private:

@@ -78,8 +78,10 @@ void Comparison::AddHexText(std::string_view text) {
       case HexRecordType::End:
         return;
       case HexRecordType::SegmentAddress:
-        base = std::uint32_t{record.UpperAddress()} << 4U;
-        isSegment = true;
+        if (record.Count() >= 2) {  // a shorter one sets nothing
+          base = std::uint32_t{record.UpperAddress()} << 4U;
+          isSegment = true;
+        }
         break;
       case HexRecordType::LinearAddress:
         base = std::uint32_t{record.UpperAddress()} << 16U;
