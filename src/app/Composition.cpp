@@ -56,6 +56,7 @@ Composition::Composition()
           .Disk = files_,
           .Places = folders_,
           .Boxes = boxes_,
+          .OtherPrograms = otherPrograms_,
           .Devices = devices_,
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,

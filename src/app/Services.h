@@ -14,6 +14,7 @@
 #include "platform/MonotonicClock.h"
 #include "platform/OldDatabases.h"
 #include "platform/OneWire.h"
+#include "platform/Programs.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
 #include "platform/SoundPlayer.h"
@@ -32,6 +33,7 @@ struct Services {
   Files& Disk;
   const Folders& Places;
   MessageBoxes& Boxes;
+  Programs& OtherPrograms;
   const SerialDevices& Devices;
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;

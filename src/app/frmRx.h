@@ -37,6 +37,9 @@ class frmRx : public QMainWindow {
   /// Throws RuntimeError if the program cannot continue; returns false if the operator chose to end it.
   bool FormLoad();
 
+  /// The firmware update of devices with a PIC24F boot loader. No menu item gives this command.
+  void UpdateTypeB();
+
  protected:
   void closeEvent(QCloseEvent* event) override;
 

@@ -23,6 +23,9 @@
 #include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
 #include "firmware/download/FirmwareFlash.h"
+#include "firmware/pic24f/PortNames.h"
+#include "firmware/pic24f/SerialPicBoot.h"
+#include "firmware/pic24f/frmBootload.h"
 #include "members/MemberQueries.h"
 #include "members/Members.h"
 #include "missions/Scenarios.h"
@@ -254,6 +257,30 @@ void frmRx::ChargeButtons() {
                  .Charged = chargedButtons_,
                  .Signals = {*ini_, services_.Sounds, services_.Strings}},
                 this)
+      .exec();
+}
+
+void frmRx::UpdateTypeB() {
+  commPort_->CloseIfOpen();
+  const CommPortSetting ports(*ini_, services_.Devices);
+  const auto makeLibrary = [&](std::function<bool()> stopped) {
+    return std::make_unique<SerialPicBoot>(SerialPicBoot::Parts{
+        .Port = services_.MSComm1,
+        .Events = services_.Events,
+        .DeviceOf = [&ports](const std::string& port) { return DeviceOfPort(port, ports); },
+        .Stopped = std::move(stopped)});
+  };
+  frmBootload({.MakeLibrary = makeLibrary,
+               .Disk = services_.Disk,
+               .Events = services_.Events,
+               .CommonDialog1 = services_.CommonDialog1,
+               .Boxes = services_.Boxes,
+               .OtherPrograms = services_.OtherPrograms,
+               .Ini = *ini_,
+               .Devices = services_.Devices,
+               .Strings = services_.Strings,
+               .Folder = {userDataFolder_, services_.Places.Program()}},
+              this)
       .exec();
 }
 

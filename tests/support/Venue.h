@@ -20,6 +20,7 @@
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
 #include "tests/fakes/FakeOneWire.h"
+#include "tests/fakes/FakePrograms.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
 #include "tests/fakes/FakeWakeLock.h"
@@ -56,6 +57,7 @@ class Venue : public DataSite {
                                                 .Disk = Disk,
                                                 .Places = Places,
                                                 .Boxes = Boxes,
+                                                .OtherPrograms = Started,
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
@@ -150,6 +152,7 @@ class Venue : public DataSite {
   bool HasReader = true;
   FakeWakeLock Awake;
   FakeWordProcessor Word;
+  FakePrograms Started;
   std::unique_ptr<frmRx> Window;
 
  private:
