@@ -58,6 +58,10 @@ Composition::Composition()
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
           .Awake = awake_,
+          .Elapsed = events_,
+          .SoundPort = loggedSoundPort_,
+          .SoundPlayer = soundPlayer_,
+          .SoundConverter = soundConverter_,
           .ButtonSwipe = [this] { return SwipeButton(); }};
 }
 

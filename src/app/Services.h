@@ -11,9 +11,12 @@
 #include "platform/Files.h"
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
+#include "platform/MonotonicClock.h"
 #include "platform/OldDatabases.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
+#include "platform/SoundConverter.h"
+#include "platform/SoundPlayer.h"
 #include "platform/WakeLock.h"
 #include "platform/WordProcessor.h"
 
@@ -32,6 +35,10 @@ struct Services {
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;
   WakeLock& Awake;
+  const MonotonicClock& Elapsed;
+  SerialPort& SoundPort;  ///< the sound recorder's own, on the device of the settings
+  ::SoundPlayer& SoundPlayer;
+  const ::SoundConverter& SoundConverter;
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
 };

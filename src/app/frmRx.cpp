@@ -99,6 +99,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
                                {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
                                {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
+                               {ui_->mnuSoundRecorder, &frmRx::RecordSounds},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
   // menu.

@@ -73,6 +73,7 @@ class frmRx : public QMainWindow {
   void EnterMissionResults();
   void SetUpMissions();
   void ManageRemotely();
+  void RecordSounds();
 
   /// The context menu of the board, for the last of the selected rows.
   void ShowPopup(const QPoint& position);

@@ -27,6 +27,7 @@
 #include "settings/SoldieringCalc.h"
 #include "sheets/ScoreSheets.h"
 #include "sheets/SheetProgressWindow.h"
+#include "sound/ISD_rec.h"
 #include "ui/WaitCursor.h"
 #include "ui_frmRx.h"
 
@@ -207,6 +208,24 @@ void frmRx::ManageRemotely() {
                this)
       .exec();
   session_.CalculateScores();
+}
+
+void frmRx::RecordSounds() {
+  ISD_rec({.MSComm1 = services_.SoundPort,
+           .Ini = *ini_,
+           .Devices = services_.Devices,
+           .Events = services_.Events,
+           .Elapsed = services_.Elapsed,
+           .Boxes = services_.Boxes,
+           .CD = services_.CommonDialog1,
+           .Disk = services_.Disk,
+           .Player = services_.SoundPlayer,
+           .Converter = services_.SoundConverter,
+           .Awake = services_.Awake,
+           .Strings = services_.Strings,
+           .ProgramFolder = services_.Places.Program()},
+          this)
+      .exec();
 }
 
 void frmRx::ShowPopup(const QPoint& position) {

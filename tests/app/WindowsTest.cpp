@@ -10,6 +10,7 @@
 #include "missions/Scenarios.h"
 #include "settings/Settings.h"
 #include "settings/SoldieringCalc.h"
+#include "sound/ISD_rec.h"
 #include "tests/support/CaredFor.h"
 #include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
@@ -68,6 +69,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<AdminData>("mnuAdminData");
   LookAt<Scenarios>("mnuSetupMissions");
   LookAt<RemoteManage>("mnuRemoteManage");
+  LookAt<ISD_rec>("mnuSoundRecorder");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }

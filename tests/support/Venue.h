@@ -20,6 +20,8 @@
 #include "tests/fakes/FakeFolders.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
+#include "tests/fakes/FakeSoundConverter.h"
+#include "tests/fakes/FakeSoundPlayer.h"
 #include "tests/fakes/FakeWakeLock.h"
 #include "tests/fakes/FakeWordProcessor.h"
 #include "tests/support/Controls.h"
@@ -57,6 +59,10 @@ class Venue : public DataSite {
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
                                                 .Awake = Awake,
+                                                .Elapsed = Events,
+                                                .SoundPort = SoundPort,
+                                                .SoundPlayer = Player,
+                                                .SoundConverter = Converter,
                                                 .ButtonSwipe = ButtonSwipe});
     return *Window;
   }
@@ -142,6 +148,9 @@ class Venue : public DataSite {
   FakeSerialDevices Devices;
   FakeSerialPort Port;
   FakeWakeLock Awake;
+  FakeSerialPort SoundPort;
+  FakeSoundPlayer Player{Events};
+  FakeSoundConverter Converter;
   FakeWordProcessor Word;
   std::unique_ptr<frmRx> Window;
 
