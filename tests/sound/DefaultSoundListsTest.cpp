@@ -3,17 +3,18 @@
 #include <set>
 
 #include "sound/SoundDefinition.h"
-#include "tests/resources/DefaultFile.h"
+#include "tests/support/TemporaryFolder.h"
 
 namespace {
 
+/// The lists that the program comes with.
 class SoundListOf : public testing::TestWithParam<const char*> {};
 
 INSTANTIATE_TEST_SUITE_P(EachProduct, SoundListOf,
                          testing::Values("sound_list_mainboard.xml", "sound_list_maltrone.xml"));
 
 TEST_P(SoundListOf, NamesEachEventOnce) {
-  const auto events = ReadSoundDefinition(DefaultFileBytes(GetParam()));
+  const auto events = ReadSoundDefinition(ReadFile(std::string(TESSARINE_PROGRAM_FOLDER "/") + GetParam()));
   ASSERT_TRUE(events.has_value());
   EXPECT_GE(events->size(), 20U);
   EXPECT_LE(events->size(), 60U);
