@@ -217,6 +217,8 @@ void ISD_rec::PlaySelected(int row) {
 }
 
 void ISD_rec::PreviewAll() {
+  previewing_ = true;
+  const auto ended = qScopeGuard([this] { previewing_ = false; });
   tmrCheck_->start();
   preview_.PlayAll(list_, *this, [this] { return StopRequested(); });
 }

@@ -106,7 +106,9 @@ void ISD_rec::ShowLevel() {
 
 void ISD_rec::ShowPlayingTime() {
   if (!parts_.Player.Playing()) {
-    tmrCheck_->stop();
+    if (!previewing_) {
+      tmrCheck_->stop();
+    }
     ui_->LblTime->clear();
     return;
   }

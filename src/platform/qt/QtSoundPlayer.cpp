@@ -4,6 +4,7 @@
 #include <QAudioSink>
 #include <QBuffer>
 #include <QByteArray>
+#include <QElapsedTimer>
 #include <QMediaDevices>
 #include <algorithm>
 
@@ -48,6 +49,7 @@ class QtSoundPlayer::Sound {
     QObject::connect(&sink_, &QAudioSink::stateChanged, &source_,
                      [this](QAudio::State state) { Follow(state); });
     sink_.start(&source_);
+    since_.start();
     if (sink_.error() != QAudio::NoError && sink_.error() != QAudio::UnderrunError) {
       throw RuntimeError(Fault::DeviceUnavailable);
     }
@@ -60,10 +62,14 @@ class QtSoundPlayer::Sound {
   Sound(const Sound&) = delete;
   Sound& operator=(const Sound&) = delete;
 
-  bool Ended() const { return ended_; }
+  /// A device that stalls must not keep anyone waiting for the end.
+  bool Ended() const {
+    constexpr milliseconds patience(3000);
+    return ended_ || milliseconds(since_.elapsed()) > length_ + patience;
+  }
 
   milliseconds Position() const {
-    const microseconds heard = ended_ ? length_ : std::min(microseconds(sink_.processedUSecs()), length_);
+    const microseconds heard = Ended() ? length_ : std::min(microseconds(sink_.processedUSecs()), length_);
     return std::chrono::duration_cast<milliseconds>(heard);
   }
 
@@ -83,6 +89,7 @@ class QtSoundPlayer::Sound {
   QByteArray bytes_;
   QBuffer source_;
   QAudioSink sink_;
+  QElapsedTimer since_;
   bool ended_ = false;
 };
 
