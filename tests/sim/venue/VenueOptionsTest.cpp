@@ -6,6 +6,7 @@
 #include <stdexcept>
 
 #include "sim/baseunit/BaseUnitFailure.h"
+#include "sim/box/BoxFailure.h"
 #include "sim/onewire/OneWireFailure.h"
 #include "sim/pic24f/Pic24fFailure.h"
 #include "sim/radio/RadioFailure.h"
@@ -97,6 +98,23 @@ TEST(VenueOptions, TakeEveryOptionOfTheRadioModem) {
   EXPECT_EQ(modem.File("frames"), "guns.bin");
   EXPECT_EQ(modem.Link, "modem");
   EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::None);
+}
+
+TEST(VenueOptions, TakeEveryOptionOfTheUtilityBox) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("box");
+  EXPECT_FALSE(untold.Served);
+  EXPECT_EQ(untold.Number("times"), 0U);
+  EXPECT_EQ(untold.Number("late"), 2500U);
+  const DeviceOptions box =
+      ParseVenueOptions({"--box", "--box-failure", "unplugged", "--box-at", "10", "--box-times", "2",
+                         "--box-late", "60000", "--box-link", "cable"})
+          .Of("box");
+  EXPECT_TRUE(box.Served);
+  EXPECT_EQ(box.FailureAs<BoxFailure>(), BoxFailure::Unplugged);
+  EXPECT_EQ(box.Place, 10U);
+  EXPECT_EQ(box.Number("times"), 2U);
+  EXPECT_EQ(box.Number("late"), 60000U);
+  EXPECT_EQ(box.Link, "cable");
 }
 
 TEST(VenueOptions, TakeEveryOptionOfTheSoundRecorder) {
@@ -216,7 +234,9 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--link", ""},
                                                       {"--no-base-unit"},
                                                       {"--no-radio"},
-                                                      {"--onewire-games", "1"}};
+                                                      {"--onewire-games", "1"},
+                                                      {"--box-at", "11"},
+                                                      {"--box-late", "60001"}};
   for (const std::vector<std::string>& arguments : refused) {
     EXPECT_THROW(ParseVenueOptions(arguments), std::invalid_argument) << testing::PrintToString(arguments);
   }

@@ -11,6 +11,7 @@
 #include "sim/game/GameMaker.h"
 #include "sim/radio/RadioAnswer.h"
 #include "tests/support/AdapterHost.h"
+#include "tests/support/BoxHost.h"
 #include "tests/support/RadioLiterals.h"
 #include "tests/support/RawHost.h"
 #include "tests/support/VenueProcess.h"
@@ -316,6 +317,24 @@ TEST_F(VenueByRadio, GoesOnWithItsOtherDevicesWhenTheModemHasBeenPulledOut) {
   EXPECT_TRUE(venue.IsRunning());
 }
 
+TEST_F(VenueProgram, ServesAUtilityBoxThatTellsWhatItWasTold) {
+  VenueProcess venue({"--no-base-unit", "--box", "--box-link", File("port"), "--log", File("log")});
+  BoxHost host(venue.ReadDevice("utility box"));
+  venue.WriteInput("told\n");
+  EXPECT_EQ(venue.ReadLine(), "told nothing");
+  host.Send({0x42, 0x43, 0x38, 0x14, 0x05, 0x64, 0x02, 0x01, 0x00, 0x00});
+  EXPECT_EQ(host.Read(1), Bytes{0xAA});
+  const std::string told =
+      "told Dom. (iBtn), yellow, 20 points per activation, 5 to recharge, 100 to give, automatic after 20 s, "
+      "destroyable";
+  venue.WriteInput("box told\n");
+  EXPECT_EQ(venue.ReadLine(), told);
+  venue.Signal(SIGTERM);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_EQ(venue.RestOfErrors(), "");
+  EXPECT_THAT(Content(File("log")), HasSubstr("box -> AA\n"));
+}
+
 TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
   const std::vector<std::vector<std::string>> refused{
       {"--players", "225"},
@@ -327,6 +346,7 @@ TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
       {"--failure", "hang-up", "--players", "0"},
       {"--failure", "silence", "--players", "0", "--at", "2"},
       {"--radio", "--radio-failure", "silent-gun", "--radio-at", "41"},
+      {"--box", "--box-failure", "unplugged", "--box-at", "0"},
       {"--no-base-unit"}};
   for (const std::vector<std::string>& arguments : refused) {
     VenueProcess venue(arguments);
