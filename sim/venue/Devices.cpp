@@ -3,7 +3,8 @@
 namespace sim {
 
 const std::vector<DeviceEntry>& Devices() {
-  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(), RadioEntry(), BoxEntry()};
+  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(), RadioEntry(), BoxEntry(),
+                                                BootCodeEntry()};
   return devices;
 }
 
