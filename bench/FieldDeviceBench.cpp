@@ -58,14 +58,26 @@ class SilentDisplay : public ChargingDisplay {
 };
 
 /// A real line that notes when each byte is handed over.
-class TimedPort : public QtSerialPort {
+class TimedPort : public SerialPort {
  public:
   std::vector<Clock::time_point> HandOvers;
 
   void Output(std::uint8_t byte) override {
     HandOvers.push_back(Clock::now());
-    QtSerialPort::Output(byte);
+    port_.Output(byte);
   }
+
+  void Open(const std::string& device, const std::string& settings) override { port_.Open(device, settings); }
+  void Close() override { port_.Close(); }
+  bool PortOpen() const override { return port_.PortOpen(); }
+  void SetSettings(const std::string& settings) override { port_.SetSettings(settings); }
+  std::size_t InBufferCount() override { return port_.InBufferCount(); }
+  std::uint8_t Input() override { return port_.Input(); }
+  void Drain() override { port_.Drain(); }
+  void ClearInput() override { port_.ClearInput(); }
+
+ private:
+  QtSerialPort port_;
 };
 
 bool MeasureFrame() {

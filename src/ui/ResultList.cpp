@@ -14,12 +14,12 @@ ResultList::ResultList(QWidget* parent) : QTableWidget(parent) {
   horizontalHeader()->setHighlightSections(false);
 }
 
-void ResultList::SetCaptions(const QStringList& captions) {
+void ResultList::SetCaptions(const QStringList& captions, int widest) {
   setColumnCount(static_cast<int>(captions.size()));
   setHorizontalHeaderLabels(captions);
   horizontalHeader()->setDefaultAlignment(Qt::AlignVCenter | Qt::AlignLeft);
   horizontalHeader()->setSectionResizeMode(QHeaderView::ResizeToContents);
-  horizontalHeader()->setStretchLastSection(true);
+  horizontalHeader()->setSectionResizeMode(widest, QHeaderView::Stretch);
 }
 
 void ResultList::AddRow(const QStringList& cells, bool success, int most) {

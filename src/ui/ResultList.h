@@ -10,8 +10,8 @@ class ResultList : public QTableWidget {
  public:
   explicit ResultList(QWidget* parent = nullptr);
 
-  /// Must be called before the first row is added. The last column takes the room that is left.
-  void SetCaptions(const QStringList& captions);
+  /// Must be called before the first row is added. Column `widest` takes the room that is left.
+  void SetCaptions(const QStringList& captions, int widest);
 
   /// Adds a row at the top and makes it the current one. Keeps at most `most` rows.
   void AddRow(const QStringList& cells, bool success, int most);

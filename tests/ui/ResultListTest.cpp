@@ -6,7 +6,7 @@ namespace {
 
 TEST(ResultList, HasTheNewestRowAtTheTopAndChosen) {
   ResultList list;
-  list.SetCaptions({QStringLiteral("No."), QStringLiteral("Result")});
+  list.SetCaptions({QStringLiteral("No."), QStringLiteral("Result")}, 0);
   list.AddRow({QStringLiteral("1"), QStringLiteral("old")}, true, 9);
   list.AddRow({QStringLiteral("2"), QStringLiteral("new")}, true, 9);
   EXPECT_EQ(list.horizontalHeaderItem(1)->text(), QStringLiteral("Result"));
@@ -17,7 +17,7 @@ TEST(ResultList, HasTheNewestRowAtTheTopAndChosen) {
 
 TEST(ResultList, TintsFailures) {
   ResultList list;
-  list.SetCaptions({QStringLiteral("Result")});
+  list.SetCaptions({QStringLiteral("Result")}, 0);
   list.AddRow({QStringLiteral("good")}, true, 9);
   list.AddRow({QStringLiteral("bad")}, false, 9);
   EXPECT_EQ(list.item(1, 0)->background().style(), Qt::NoBrush);
@@ -26,7 +26,7 @@ TEST(ResultList, TintsFailures) {
 
 TEST(ResultList, LetsTheOldestRowsGo) {
   ResultList list;
-  list.SetCaptions({QStringLiteral("No.")});
+  list.SetCaptions({QStringLiteral("No.")}, 0);
   for (int i = 1; i <= 5; ++i) {
     list.AddRow({QString::number(i)}, true, 3);
   }

@@ -7,6 +7,8 @@
 
 namespace {
 
+constexpr int ResultColumn = 4;
+
 constexpr double MostPoints = 100;
 constexpr double MostTime = 255;
 
@@ -124,9 +126,10 @@ std::optional<EntryFault> BoxConfig::FaultOfBoxType() {
 void BoxConfig::SetUpResults() {
   const StringTable& strings = parts_.Strings;
   ui_->ResultsLabel->setText(Text(strings, OwnText::BoxesOfThisRun));
-  ui_->Results->SetCaptions({Text(strings, OwnText::ResultNumber), Text(strings, OwnText::ResultTime),
-                             Text(strings, OwnText::ResultKind), Text(strings, 113),
-                             Text(strings, OwnText::Result), QString()});
+  ui_->Results->SetCaptions(
+      {Text(strings, OwnText::ResultNumber), Text(strings, OwnText::ResultTime),
+       Text(strings, OwnText::ResultKind), Text(strings, 113), Text(strings, OwnText::Result), QString()},
+      ResultColumn);
   std::size_t number = parts_.Programmed.Count() - parts_.Programmed.All().size();
   for (const ProgrammedBox& box : parts_.Programmed.All()) {
     AddRow(++number, box);

@@ -7,6 +7,8 @@
 
 namespace {
 
+constexpr int ResultColumn = 4;
+
 constexpr int PollMilliseconds = 200;
 constexpr int MissingReaderMilliseconds = 2000;
 
@@ -61,7 +63,8 @@ void ChargeiButton::SetUpResults() {
   ui_->ResultsLabel->setText(Text(strings, OwnText::ButtonsOfThisRun));
   ui_->Results->SetCaptions({Text(strings, OwnText::ResultNumber), Text(strings, OwnText::ResultTime),
                              Text(strings, OwnText::ResultKind), Text(strings, OwnText::ResultButton),
-                             Text(strings, OwnText::Result)});
+                             Text(strings, OwnText::Result)},
+                            ResultColumn);
   std::size_t number = parts_.Charged.Count() - parts_.Charged.All().size();
   for (const ChargedButton& button : parts_.Charged.All()) {
     AddRow(++number, button);
