@@ -29,7 +29,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Require(CheckHexText(text + "\n#") == HexCode::Good);
   }
 
-  HexImage image;
+  FirmwareImage image;
   FakeMessageBoxes boxes;
   try {
     const bool loaded = LoadHexImage(text, image, boxes);

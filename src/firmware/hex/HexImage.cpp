@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <limits>
 
+#include "firmware/files/HexConvert.h"
 #include "firmware/hex/HexRecord.h"
 #include "platform/RuntimeError.h"
 
@@ -22,30 +23,8 @@ constexpr std::size_t BootLoaderRows = 24;
 constexpr std::size_t JumpBytes = 6;
 constexpr std::size_t JumpCopy = BootLoader / 2 * 3 - JumpBytes;
 
-/// A number in hexadecimal digits. Any other character counts with its own code in place of a digit's value.
-/// Throws RuntimeError 6 above 31 bits.
-std::int32_t LenientHex(std::string_view text) {
-  std::int64_t number = 0;
-  for (const char character : text) {
-    const auto code = static_cast<unsigned char>(character);
-    int digit = code;
-    if (code >= 'A' && code <= 'F') {
-      digit = code - 'A' + 10;
-    } else if (code >= 'a' && code <= 'f') {
-      digit = code - 'a' + 10;
-    } else if (code >= '0' && code <= '9') {
-      digit = code - '0';
-    }
-    number = number * 16 + digit;
-    if (number > std::numeric_limits<std::int32_t>::max()) {
-      throw RuntimeError(Fault::Overflow);
-    }
-  }
-  return static_cast<std::int32_t>(number);
-}
-
-std::uint8_t LenientByte(std::string_view text) {
-  const std::int32_t number = LenientHex(text);
+std::uint8_t ByteOf(std::string_view text) {
+  const std::int16_t number = Hex_Convert(text);
   if (number > std::numeric_limits<std::uint8_t>::max()) {
     throw RuntimeError(Fault::Overflow);
   }
@@ -54,7 +33,7 @@ std::uint8_t LenientByte(std::string_view text) {
 
 class HexImageReader {
  public:
-  explicit HexImageReader(HexImage& image) : image_(image) {}
+  explicit HexImageReader(FirmwareImage& image) : image_(image) {}
 
   void Read(LineReader lines) {
     while (!lines.AtEnd()) {
@@ -62,12 +41,12 @@ class HexImageReader {
       if (!line.starts_with(HexRecord::Start)) {
         continue;
       }
-      const std::int32_t type = LenientHex(Middle(line, 7, 2));
+      const std::int32_t type = Hex_Convert2(Middle(line, 7, 2));
       if (type == HexRecordType::End) {
         return;
       }
       if (type == HexRecordType::LinearAddress) {
-        upper_ = LenientHex(Middle(line, HexRecord::DataColumn, 4));
+        upper_ = Hex_Convert2(Middle(line, HexRecord::DataColumn, 4));
       } else if (type == HexRecordType::Data) {
         ReadData(line);
       }
@@ -76,8 +55,8 @@ class HexImageReader {
 
  private:
   void ReadData(std::string_view line) {
-    const std::int32_t count = LenientHex(Middle(line, 1, 2));
-    const std::int64_t address = ((upper_ << 16U) + LenientHex(Middle(line, 3, 4))) / 2;
+    const std::int32_t count = Hex_Convert2(Middle(line, 1, 2));
+    const std::int64_t address = ((upper_ << 16U) + Hex_Convert2(Middle(line, 3, 4))) / 2;
     if (address > LastAddress && (address < FirstOfConfig || address > LastOfConfig)) {
       return;
     }
@@ -93,7 +72,7 @@ class HexImageReader {
       throw RuntimeError(Fault::SubscriptOutOfRange);
     }
     for (std::size_t i = 0; i < BytesOfInstruction; ++i) {
-      image_.ImageBuffer[at + i] = LenientByte(Middle(digits, 2 * i, 2));
+      image_.ImageBuffer[at + i] = ByteOf(Middle(digits, 2 * i, 2));
     }
   }
 
@@ -105,22 +84,32 @@ class HexImageReader {
     image_.RowUsed[static_cast<std::size_t>(instruction / InstructionsOfRow)] = true;
   }
 
-  HexImage& image_;
+  FirmwareImage& image_;
   std::int64_t upper_ = 0;
 };
 
-bool MeetsBootLoader(const HexImage& image) {
-  const auto first = image.RowUsed.begin() + BootLoaderRow;
-  return std::find(first, first + BootLoaderRows, true) != first + BootLoaderRows;
+bool MeetsBootLoader(const FirmwareImage& image) {
+  for (std::size_t row = BootLoaderRow; row < BootLoaderRow + BootLoaderRows; ++row) {
+    if (image.RowUsed.test(row)) {
+      return true;
+    }
+  }
+  return false;
 }
 
-bool HasResetJump(const HexImage& image) {
+bool HasResetJump(const FirmwareImage& image) {
   const auto jump = image.ImageBuffer.begin();
   return image.RowUsed[0] &&
          std::any_of(jump, jump + JumpBytes, [](std::uint8_t byte) { return byte != 0xFF; });
 }
 
-void CopyResetJump(HexImage& image) {
+/// The last entry of a table is never counted.
+template <std::size_t Counted>
+std::int16_t CountOf(const std::bitset<Counted + 1>& used) {
+  return static_cast<std::int16_t>(used.count() - (used.test(Counted) ? 1 : 0));
+}
+
+void CopyResetJump(FirmwareImage& image) {
   std::copy_n(image.ImageBuffer.begin(), JumpBytes, image.ImageBuffer.begin() + JumpCopy);
   image.PageUsed[JumpCopy / (InstructionsOfPage * BytesOfInstruction)] = true;
   image.RowUsed[JumpCopy / (InstructionsOfRow * BytesOfInstruction)] = true;
@@ -128,8 +117,9 @@ void CopyResetJump(HexImage& image) {
 
 }  // namespace
 
-bool LoadHexImage(std::string_view text, HexImage& image, MessageBoxes& boxes) {
+bool LoadHexImage(std::string_view text, FirmwareImage& image, MessageBoxes& boxes) {
   image = {};
+  std::fill(image.ImageBuffer.begin(), image.ImageBuffer.end(), std::uint8_t{0xFF});
   HexImageReader(image).Read(LineReader(text));
   if (MeetsBootLoader(image)) {
     boxes.Show("The hex-file contains code that will overwrite the bootloader, aborting", DefaultBoxTitle,
@@ -141,9 +131,7 @@ bool LoadHexImage(std::string_view text, HexImage& image, MessageBoxes& boxes) {
     return false;
   }
   CopyResetJump(image);
-  const auto pages = image.PageUsed.begin();
-  image.PageCount = static_cast<std::int16_t>(std::count(pages, pages + HexImage::Pages, true));
-  const auto rows = image.RowUsed.begin();
-  image.RowCount = static_cast<std::int16_t>(std::count(rows, rows + HexImage::Rows, true));
+  image.PageCount = CountOf<FirmwareImage::MostPages>(image.PageUsed);
+  image.RowCount = CountOf<FirmwareImage::MostRows>(image.RowUsed);
   return true;
 }

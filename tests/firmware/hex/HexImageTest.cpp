@@ -15,10 +15,11 @@ class LoadHexImageTest : public testing::Test {
  protected:
   bool Load(const std::string& text) { return LoadHexImage(text, image, boxes); }
 
-  std::vector<int> Set(const std::vector<bool>& flags) const {
+  template <std::size_t Size>
+  static std::vector<int> Set(const std::bitset<Size>& flags) {
     std::vector<int> indices;
-    for (std::size_t i = 0; i < flags.size(); ++i) {
-      if (flags[i]) {
+    for (std::size_t i = 0; i < Size; ++i) {
+      if (flags.test(i)) {
         indices.push_back(static_cast<int>(i));
       }
     }
@@ -27,7 +28,7 @@ class LoadHexImageTest : public testing::Test {
 
   const std::string jump = HexFile::Data(0, {0x00, 0x02, 0x04, 0x00, 0x01, 0x03, 0x05, 0x00});
   FakeMessageBoxes boxes;
-  HexImage image;
+  FirmwareImage image;
 };
 
 TEST_F(LoadHexImageTest, DropsTheFourthByteOfAnInstruction) {

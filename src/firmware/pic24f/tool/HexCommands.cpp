@@ -116,12 +116,11 @@ int RunImport(const ToolParts& parts, const ToolOptions& options) {
 
 int RunImage(const ToolParts& parts, const ToolOptions& options) {
   PrintedBoxes boxes;
-  HexImage image;
+  FirmwareImage image;
   if (!LoadHexImage(parts.Disk.Read(options.File), image, boxes)) {
     return ToolExit::Failed;
   }
-  parts.Disk.Replace(options.Out,
-                     std::string(image.ImageBuffer.begin(), image.ImageBuffer.begin() + HexImage::Bytes));
+  parts.Disk.Replace(options.Out, std::string(image.ImageBuffer.begin(), image.ImageBuffer.end() - 1));
   std::printf("pages %d\nrows %d\n", image.PageCount, image.RowCount);
   return ToolExit::Good;
 }
