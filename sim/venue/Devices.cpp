@@ -3,8 +3,8 @@
 namespace sim {
 
 const std::vector<DeviceEntry>& Devices() {
-  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(), RadioEntry(), BoxEntry(),
-                                                BootCodeEntry()};
+  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(),  RadioEntry(), BoxEntry(),
+                                                RecorderEntry(), BootCodeEntry(), Pic24fEntry()};
   return devices;
 }
 

@@ -11,6 +11,8 @@
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxFiles.h"
+#include "platform/linux/LinuxPrograms.h"
+#include "platform/qt/DBusWakeLock.h"
 #include "platform/qt/QtClock.h"
 #include "platform/qt/QtEventPump.h"
 #include "platform/qt/QtFileDialog.h"
@@ -50,6 +52,7 @@ class Composition {
   ProgramLog log_;
   QtMessageBoxes shownBoxes_{[this] { return parent_.Window(); }};
   LoggedBoxes boxes_{shownBoxes_, log_};
+  LinuxPrograms otherPrograms_;
   QtSerialDevices devices_;
   const std::string logFolder_;
   QtSerialPort port_;
@@ -69,4 +72,5 @@ class Composition {
   IniReader readerSettings_;
   SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
+  DBusWakeLock awake_;
 };

@@ -246,6 +246,7 @@ class SheetsMade : public OnFiles {
                  .Disk = Disk,
                  .Boxes = venue_.Boxes,
                  .WordApp = word_,
+                 .UprightPicture = [](const std::string& photo) { return photo + "turned"; },
                  .Progress = progress_,
                  .UserDataFolder = Folder(),
                  .MissionName = "None"},

@@ -16,10 +16,14 @@
 #include "app/frmRx.h"
 #include "platform/jet/JetConverter.h"
 #include "platform/qt/QtEventPump.h"
+#include "platform/qt/UprightPicture.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
+#include "tests/fakes/FakeOneWire.h"
+#include "tests/fakes/FakePrograms.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
+#include "tests/fakes/FakeWakeLock.h"
 #include "tests/fakes/FakeWordProcessor.h"
 #include "tests/support/Controls.h"
 #include "tests/support/DataSite.h"
@@ -48,14 +52,19 @@ class Venue : public DataSite {
                                                 .Databases = Databases,
                                                 .Old = Old,
                                                 .Events = *events,
+                                                .Elapsed = Events,
                                                 .CommonDialog1 = Dialog,
                                                 .Disk = Disk,
                                                 .Places = Places,
                                                 .Boxes = Boxes,
+                                                .OtherPrograms = Started,
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
-                                                .ButtonSwipe = ButtonSwipe});
+                                                .UprightPicture = UprightPicture,
+                                                .Awake = Awake,
+                                                .ButtonSwipe = ButtonSwipe,
+                                                .Wire = HasReader ? &Wire : nullptr});
     return *Window;
   }
 
@@ -139,7 +148,11 @@ class Venue : public DataSite {
   FakeFolders Places;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
+  FakeOneWire Wire;
+  bool HasReader = true;
+  FakeWakeLock Awake;
   FakeWordProcessor Word;
+  FakePrograms Started;
   std::unique_ptr<frmRx> Window;
 
  private:

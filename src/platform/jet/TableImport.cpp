@@ -6,10 +6,9 @@
 #include <string_view>
 
 #include "platform/RuntimeError.h"
+#include "platform/jet/ConversionBusyTimeout.h"
 
 namespace {
-
-constexpr std::chrono::milliseconds BusyTimeout(100);  // at the start, hardly anyone else has the files open
 
 /// A value's share of its row's checksum. An integer and a double of equal value hash alike, since a column
 /// may store a whole number as either.
@@ -47,7 +46,7 @@ std::string TextOfNumber(const Value& value) {
 }  // namespace
 
 TableImport::TableImport(const std::string& path, const std::string& table)
-    : connection_(path, BusyTimeout), table_(connection_, table) {
+    : connection_(path, ConversionBusyTimeout), table_(connection_, table) {
   connection_.Execute("PRAGMA synchronous = OFF");
   connection_.Execute("PRAGMA cache_size = -65536");  // KiB
   transaction_.emplace(connection_);

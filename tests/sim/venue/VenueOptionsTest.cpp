@@ -9,7 +9,9 @@
 #include "sim/bootcode/BootFailure.h"
 #include "sim/box/BoxFailure.h"
 #include "sim/onewire/OneWireFailure.h"
+#include "sim/pic24f/Pic24fFailure.h"
 #include "sim/radio/RadioFailure.h"
+#include "sim/recorder/RecorderFailure.h"
 #include "sim/venue/VenueUsage.h"
 
 namespace sim {
@@ -147,6 +149,56 @@ TEST(VenueOptions, TakeEveryOptionOfTheBootCode) {
   EXPECT_EQ(device.Link, "cable");
 }
 
+TEST(VenueOptions, TakeEveryOptionOfTheSoundRecorder) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("recorder");
+  EXPECT_FALSE(untold.Served);
+  EXPECT_EQ(untold.Choice("kind"), 0U);
+  EXPECT_EQ(untold.Number("erase-time"), 500U);
+  EXPECT_EQ(untold.File("folder"), std::nullopt);
+  const DeviceOptions told =
+      ParseVenueOptions({"--recorder", "--recorder-kind", "stand-alone", "--recorder-erase-time", "9",
+                         "--recorder-folder", "sounds", "--recorder-failure", "lost-byte", "--recorder-at",
+                         "7", "--recorder-link", "chip"})
+          .Of("recorder");
+  EXPECT_TRUE(told.Served);
+  EXPECT_EQ(told.Choice("kind"), 2U);
+  EXPECT_EQ(told.Number("erase-time"), 9U);
+  EXPECT_EQ(told.File("folder"), "sounds");
+  EXPECT_EQ(told.FailureAs<RecorderFailure>(), RecorderFailure::LostByte);
+  EXPECT_EQ(told.Place, 7U);
+  EXPECT_EQ(told.Link, "chip");
+}
+
+TEST(VenueOptions, TakeEveryOptionOfThePic24fBootloader) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("pic24f");
+  EXPECT_FALSE(untold.Served);
+  for (const char* option : {"device", "identity", "pages", "eeprom-words", "user-reset", "boot-delay"}) {
+    EXPECT_EQ(untold.Number(option), 0U) << option;
+  }
+  EXPECT_EQ(untold.Number("row-time"), 2U);
+  EXPECT_EQ(untold.Number("page-time"), 20U);
+  const DeviceOptions told =
+      ParseVenueOptions({"--pic24f", "--pic24f-device",     "small", "--pic24f-identity",
+                         "32769",    "--pic24f-pages",      "15872", "--pic24f-eeprom-words",
+                         "32764",    "--pic24f-user-reset", "3072",  "--pic24f-boot-delay",
+                         "3074",     "--pic24f-row-time",   "0",     "--pic24f-page-time",
+                         "1",        "--pic24f-failure",    "noise", "--pic24f-at",
+                         "4",        "--pic24f-link",       "port"})
+          .Of("pic24f");
+  EXPECT_TRUE(told.Served);
+  EXPECT_EQ(told.Choice("device"), 2U);
+  EXPECT_EQ(told.Number("identity"), 32769U);
+  EXPECT_EQ(told.Number("pages"), 15872U);
+  EXPECT_EQ(told.Number("eeprom-words"), 32764U);
+  EXPECT_EQ(told.Number("user-reset"), 3072U);
+  EXPECT_EQ(told.Number("boot-delay"), 3074U);
+  EXPECT_EQ(told.Number("row-time"), 0U);
+  EXPECT_EQ(told.Number("page-time"), 1U);
+  EXPECT_EQ(told.FailureAs<Pic24fFailure>(), Pic24fFailure::Noise);
+  EXPECT_EQ(told.Place, 4U);
+  EXPECT_EQ(told.Link, "port");
+}
+
 TEST(VenueOptions, KnowEveryFailureByItsName) {
   for (const RadioFailureInfo& info : RadioFailures) {
     EXPECT_EQ(RadioIn({"--radio-failure", std::string(info.Name)}).FailureAs<RadioFailure>(), info.Failure);
@@ -207,6 +259,10 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--radio-answer-time", "10001"},
                                                       {"--radio-frames", ""},
                                                       {"--radio-link", ""},
+                                                      {"--recorder-kind", "gum"},
+                                                      {"--pic24f-device", "tiny"},
+                                                      {"--pic24f-identity", "65536"},
+                                                      {"--recorder-folder", ""},
                                                       {"--link", ""},
                                                       {"--no-base-unit"},
                                                       {"--no-radio"},
