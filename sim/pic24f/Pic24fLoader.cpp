@@ -53,7 +53,7 @@ void Pic24fLoader::Reset() {
 }
 
 void Pic24fLoader::Run() {
-  while (const std::optional<std::uint8_t> byte = Line().ReadByte()) {
+  while (const std::optional<std::uint8_t> byte = Read()) {
     if (traffic_.Ask([](const Pic24fTraffic& traffic) { return traffic.Runs; })) {
       Log().FromHost(*byte, "not for the application");
       continue;
@@ -68,6 +68,19 @@ void Pic24fLoader::Run() {
       Take(std::get<Pic24fPacket>(*taken));
     }
   }
+}
+
+// None when the line has ended.
+std::optional<std::uint8_t> Pic24fLoader::Read() {
+  if (reader_.IsWithinPacket()) {
+    const std::optional<std::uint8_t> byte = Line().ReadByte(settings_.Patience);
+    if (byte || !Line().IsUp()) {
+      return byte;
+    }
+    Fault("a packet cut short");
+    reader_.Reset();
+  }
+  return Line().ReadByte();
 }
 
 void Pic24fLoader::Take(const Pic24fPacket& packet) {

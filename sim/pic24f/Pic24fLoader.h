@@ -26,7 +26,8 @@ struct Pic24fLoaderSettings {
   std::chrono::microseconds RowTime{0};   ///< to program one
   std::chrono::microseconds PageTime{0};  ///< to erase one
   std::chrono::milliseconds Lateness{3'000};
-  std::ostream* Log = nullptr;  ///< receives the traffic in both directions
+  std::chrono::milliseconds Patience{1'000};  ///< silence in a packet after which the rest will not come
+  std::ostream* Log = nullptr;                ///< receives the traffic in both directions
 };
 
 struct Pic24fTraffic {
@@ -56,6 +57,7 @@ class Pic24fLoader : public Device {
   using Bytes = std::vector<std::uint8_t>;
 
   void Run();
+  std::optional<std::uint8_t> Read();
   void Take(const Pic24fPacket& packet);
   std::optional<Bytes> CarryOut(const Pic24fRequest& request);
   std::optional<Bytes> AnswerToRead(const Pic24fRequest& request) const;

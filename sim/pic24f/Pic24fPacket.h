@@ -34,6 +34,11 @@ class Pic24fPacketReader {
   /// stray bytes is one fault. An unescaped start in the middle begins anew.
   std::optional<std::variant<Pic24fPacket, BadPacket>> Take(std::uint8_t byte);
 
+  /// True if a packet has begun and is not complete.
+  bool IsWithinPacket() const { return state_ == State::InPacket || state_ == State::Escaped; }
+  /// Forgets what has begun.
+  void Reset() { state_ = State::Idle; }
+
   /// The bytes of the packet in progress or just ended as they came, or the latest stray byte.
   const std::vector<std::uint8_t>& Bytes() const { return bytes_; }
 

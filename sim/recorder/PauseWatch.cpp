@@ -11,13 +11,14 @@ struct PauseInfo {
 };
 
 // In the order of the enumeration.
-constexpr std::array<PauseInfo, 6> Pauses{{
+constexpr std::array<PauseInfo, 7> Pauses{{
     {std::chrono::milliseconds(10), "leaves less than 10 ms between the bytes of a command"},
     {std::chrono::milliseconds(20), "leaves less than 20 ms before the page count"},
     {std::chrono::milliseconds(20), "leaves less than 20 ms in the page count"},
     {std::chrono::milliseconds(20), "leaves less than 20 ms before a page or header"},
     {std::chrono::milliseconds(255), "leaves less than 1 ms between the bytes of a page"},
     {std::chrono::milliseconds(20), "leaves less than 20 ms before the check byte"},
+    {std::chrono::milliseconds(1000), "leaves less than 1 s between two sounds"},
 }};
 
 const PauseInfo& InfoOf(RecorderPause pause) {

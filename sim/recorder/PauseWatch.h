@@ -9,7 +9,15 @@
 namespace sim {
 
 /// The pauses that a host must leave. InData is that of a whole block: 255 times 1 ms.
-enum class RecorderPause { InCommand, BeforePageCount, InPageCount, BeforePage, InData, BeforeCheckByte };
+enum class RecorderPause {
+  InCommand,
+  BeforePageCount,
+  InPageCount,
+  BeforePage,
+  InData,
+  BeforeCheckByte,
+  BetweenSounds,
+};
 
 /// Tells when a host leaves out pauses. On a busy machine the recorder may be late to see a byte and then
 /// finds the pause behind it too short, so one short pause proves nothing: a fault is told once at least
@@ -29,7 +37,7 @@ class PauseWatch {
     bool Told = false;
   };
 
-  std::array<Count, 6> counts_;
+  std::array<Count, 7> counts_;
 };
 
 }  // namespace sim

@@ -99,6 +99,10 @@ void SoundRecorder::Obey(RecorderCommand command) {
     const bool goesOn = state_ == State::Started && Clock::now() - startedAt_ < settings_.Patience;
     command.Kind = goesOn ? RecorderCommandKind::Erase : RecorderCommandKind::Start;
   }
+  const bool isPlay = command.Kind == RecorderCommandKind::Play;
+  if (std::exchange(played_, isPlay) && isPlay) {
+    See(RecorderPause::BetweenSounds, gapBeforeCommand_);
+  }
   traffic_.Note([&](SoundRecorderTraffic& traffic) { traffic.Commands.push_back(command); });
   switch (command.Kind) {
     case RecorderCommandKind::Start:
@@ -381,7 +385,9 @@ void SoundRecorder::Fault(std::span<const std::uint8_t> bytes, const std::string
 }
 
 void SoundRecorder::KeepRecording() {
-  if (!std::exchange(unkept_, false) || !settings_.Files) {
+  const bool isEmpty =
+      traffic_.Ask([](const SoundRecorderTraffic& traffic) { return traffic.Chip.IsEmpty(); });
+  if (!std::exchange(unkept_, false) || !settings_.Files || isEmpty) {
     return;
   }
   try {

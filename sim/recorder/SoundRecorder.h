@@ -96,6 +96,7 @@ class SoundRecorder : public Device {
   RecorderInput input_{Line()};
   std::chrono::nanoseconds gapBeforeCommand_{};
   bool astray_ = false;
+  bool played_ = false;  // by the command before
 
   State state_ = State::Idle;
   Clock::time_point startedAt_;

@@ -4,7 +4,7 @@ namespace sim {
 
 const std::vector<DeviceEntry>& Devices() {
   static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(),  RadioEntry(), BoxEntry(),
-                                                RecorderEntry(), BootCodeEntry(), Pic24fEntry()};
+                                                BootCodeEntry(), RecorderEntry(), Pic24fEntry()};
   return devices;
 }
 

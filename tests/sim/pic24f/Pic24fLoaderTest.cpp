@@ -82,6 +82,18 @@ TEST(Pic24fLoader, DoesNotAnswerAWrongChecksum) {
   EXPECT_EQ(host.Ask(AskVersion, Version.size()), Version);
 }
 
+TEST(Pic24fLoader, ForgetsAPacketThatIsCutShort) {
+  Pic24fLoaderSettings settings = Quick();
+  settings.Patience = milliseconds(100);
+  Pic24fLoader loader(settings);
+  LoaderHost host(loader.DevicePath());
+  // The escape would take the next packet's first start for data.
+  host.Write({0x55, 0x55, 0x01, 0x05});
+  ASSERT_TRUE(loader.WaitUntilHostFaults(1, Limit));
+  EXPECT_EQ(loader.HostFaults(), std::vector<std::string>{"the host sent a packet cut short"});
+  EXPECT_EQ(host.Ask(AskVersion, Version.size()), Version);
+}
+
 TEST(Pic24fLoader, DoesNotAnswerWhatTheDeviceCannotDo) {
   Pic24fLoader loader(Quick());
   LoaderHost host(loader.DevicePath());

@@ -34,7 +34,8 @@ TEST(PauseWatch, ForgivesShortPausesAmongGoodOnes) {
 TEST(PauseWatch, TakesThreeQuartersForEnough) {
   for (const RecorderPause pause :
        {RecorderPause::InCommand, RecorderPause::BeforePageCount, RecorderPause::InPageCount,
-        RecorderPause::BeforePage, RecorderPause::InData, RecorderPause::BeforeCheckByte}) {
+        RecorderPause::BeforePage, RecorderPause::InData, RecorderPause::BeforeCheckByte,
+        RecorderPause::BetweenSounds}) {
     const auto enough = PauseWatch::Due(pause) * 3 / 4;
     PauseWatch watch;
     for (int i = 0; i < 9; ++i) {
@@ -63,6 +64,7 @@ TEST(PauseWatch, KnowsWhatIsDue) {
   EXPECT_EQ(PauseWatch::Due(RecorderPause::BeforePage), milliseconds(20));
   EXPECT_EQ(PauseWatch::Due(RecorderPause::InData), milliseconds(255));
   EXPECT_EQ(PauseWatch::Due(RecorderPause::BeforeCheckByte), milliseconds(20));
+  EXPECT_EQ(PauseWatch::Due(RecorderPause::BetweenSounds), milliseconds(1000));
 }
 
 }  // namespace

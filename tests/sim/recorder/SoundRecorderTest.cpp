@@ -315,6 +315,16 @@ TEST(SoundRecorder, NotesAHostThatLeavesNoPauses) {
                                    "the host leaves less than 1 ms between the bytes of a page"));
 }
 
+TEST(SoundRecorder, NotesAHostThatPlaysOneSoundRightBehindTheOther) {
+  constexpr int mostSounds = 200;
+  SoundRecorder recorder(Quick());
+  RecorderHost host(recorder.DevicePath(), Alone);
+  for (int i = 0; i < mostSounds && recorder.HostFaults().size() < 2; ++i) {
+    EXPECT_EQ(host.Ask({3, 2, 0}), Ack);
+  }
+  EXPECT_THAT(recorder.HostFaults(), Contains("the host leaves less than 1 s between two sounds"));
+}
+
 // Leaves the pauses of both modes as a program does, by waiting for bytes that do not come.
 class PatientHost : public RecorderHost {
  public:
@@ -398,6 +408,18 @@ TEST(SoundRecorder, KeepsWhatCameOfARecordingThatWasBrokenOff) {
   }
   EXPECT_EQ(ReadFile(folder / "recording-1/sound-000.wav").substr(44),
             std::string(RisingPage.begin(), RisingPage.end()));
+}
+
+TEST(SoundRecorder, KeepsNothingOfARecordingThatBroughtNothing) {
+  const TemporaryFolder folder;
+  {
+    SoundRecorderSettings settings = Quick();
+    settings.Files.emplace(folder.Path());
+    SoundRecorder recorder(settings);
+    RecorderHost host(recorder.DevicePath(), Alone);
+    BeginStandAlone(host);
+  }
+  EXPECT_TRUE(std::filesystem::is_empty(folder.Path()));
 }
 
 TEST(SoundRecorder, GoesOnWhenItCannotKeepARecording) {
