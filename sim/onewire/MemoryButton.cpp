@@ -1,6 +1,6 @@
 #include "sim/onewire/MemoryButton.h"
 
-#include <algorithm>
+#include <string_view>
 #include <utility>
 
 namespace sim {

@@ -1,6 +1,7 @@
 #include "sim/onewire/OneWireAdapter.h"
 
 #include <algorithm>
+#include <array>
 #include <stdexcept>
 #include <utility>
 

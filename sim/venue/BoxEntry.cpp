@@ -1,5 +1,5 @@
-#include <algorithm>
 #include <chrono>
+#include <sstream>
 #include <stdexcept>
 
 #include "sim/box/UtilityBox.h"
@@ -8,12 +8,15 @@
 namespace sim {
 namespace {
 
-std::string Obey(const UtilityBox& box, std::string line) {
-  std::erase_if(line, [](char letter) { return letter == ' ' || letter == '\t' || letter == '\r'; });
-  if (line.empty()) {
+std::string Obey(const UtilityBox& box, const std::string& line) {
+  std::istringstream words(line);
+  std::string command;
+  std::string rest;
+  words >> command >> rest;
+  if (command.empty()) {
     return {};
   }
-  if (line != "told") {
+  if (command != "told" || !rest.empty()) {
     throw std::invalid_argument("There is no command \"" + line + "\"");
   }
   const std::optional<BoxFrame> accepted = box.Traffic().Accepted;

@@ -7,6 +7,7 @@
 namespace sim {
 
 DeviceEntry BaseUnitEntry();
+DeviceEntry BootCodeEntry();
 DeviceEntry BoxEntry();
 DeviceEntry OneWireEntry();
 DeviceEntry Pic24fEntry();

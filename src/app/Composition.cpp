@@ -62,6 +62,9 @@ Composition::Composition()
           .WordProcessor = wordProcessor_,
           .UprightPicture = UprightPicture,
           .Awake = awake_,
+          .SoundPort = loggedSoundPort_,
+          .SoundPlayer = soundPlayer_,
+          .SoundConverter = soundConverter_,
           .ButtonSwipe = [this] { return SwipeButton(); },
           .Wire = &wire_};
 }

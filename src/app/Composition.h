@@ -20,6 +20,8 @@
 #include "platform/qt/QtMessageBoxes.h"
 #include "platform/qt/QtSerialDevices.h"
 #include "platform/qt/QtSerialPort.h"
+#include "platform/qt/QtSoundPlayer.h"
+#include "platform/sndfile/SndfileConverter.h"
 #include "platform/sqlite/SqliteDatabase.h"
 #include "ui/DialogParent.h"
 
@@ -73,4 +75,15 @@ class Composition {
   SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
   DBusWakeLock awake_;
+  QtSerialPort soundPort_;
+  LoggedPort loggedSoundPort_{soundPort_,
+                              {.Disk = files_,
+                               .Folder = logFolder_,
+                               .Elapsed = events_,
+                               .Time = clock_,
+                               .OnOpening = [this](const std::string& device, const std::string& settings,
+                                                   int fault) { log_.PortOpening(device, settings, fault); }},
+                              "sound-recorder"};
+  QtSoundPlayer soundPlayer_;
+  SndfileConverter soundConverter_;
 };

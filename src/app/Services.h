@@ -17,6 +17,7 @@
 #include "platform/Programs.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
+#include "platform/SoundConverter.h"
 #include "platform/SoundPlayer.h"
 #include "platform/WakeLock.h"
 #include "platform/WordProcessor.h"
@@ -40,10 +41,11 @@ struct Services {
   /// Turns a picture file as the camera noted in it.
   std::function<std::string(const std::string& bytes)> UprightPicture;
   WakeLock& Awake;
+  SerialPort& SoundPort;  ///< the sound recorder's own, on the device of the settings
+  ::SoundPlayer& SoundPlayer;
+  const ::SoundConverter& SoundConverter;
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
   /// The bus behind the reader; null if there is none.
   OneWire* Wire = nullptr;
-  /// Null if nothing can be played.
-  SoundPlayer* Sounds = nullptr;
 };

@@ -104,6 +104,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
                                {ui_->mnuBoxConfig, &frmRx::ConfigureBoxes},
                                {ui_->mnuChargeiButton, &frmRx::ChargeButtons},
+                               {ui_->mnuSoundRecorder, &frmRx::RecordSounds},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
   // menu.

@@ -81,6 +81,7 @@ class frmRx : public QMainWindow {
   void ManageRemotely();
   void ConfigureBoxes();
   void ChargeButtons();
+  void RecordSounds();
 
   /// The context menu of the board, for the last of the selected rows.
   void ShowPopup(const QPoint& position);

@@ -33,6 +33,7 @@
 #include "settings/SoldieringCalc.h"
 #include "sheets/ScoreSheets.h"
 #include "sheets/SheetProgressWindow.h"
+#include "sound/ISD_rec.h"
 #include "ui/WaitCursor.h"
 #include "ui_frmRx.h"
 
@@ -243,7 +244,7 @@ void frmRx::ConfigureBoxes() {
              .Strings = services_.Strings,
              .Game = session_.Game(),
              .Programmed = programmedBoxes_,
-             .Signals = {*ini_, services_.Sounds, services_.Strings}},
+             .Signals = {*ini_, &services_.SoundPlayer, services_.Strings}},
             this)
       .exec();
 }
@@ -255,7 +256,7 @@ void frmRx::ChargeButtons() {
                  .Time = services_.Time,
                  .Strings = services_.Strings,
                  .Charged = chargedButtons_,
-                 .Signals = {*ini_, services_.Sounds, services_.Strings}},
+                 .Signals = {*ini_, &services_.SoundPlayer, services_.Strings}},
                 this)
       .exec();
 }
@@ -281,6 +282,24 @@ void frmRx::UpdateTypeB() {
                .Strings = services_.Strings,
                .Folder = {userDataFolder_, services_.Places.Program()}},
               this)
+      .exec();
+}
+
+void frmRx::RecordSounds() {
+  ISD_rec({.MSComm1 = services_.SoundPort,
+           .Ini = *ini_,
+           .Devices = services_.Devices,
+           .Events = services_.Events,
+           .Elapsed = services_.Elapsed,
+           .Boxes = services_.Boxes,
+           .CD = services_.CommonDialog1,
+           .Disk = services_.Disk,
+           .Player = services_.SoundPlayer,
+           .Converter = services_.SoundConverter,
+           .Awake = services_.Awake,
+           .Strings = services_.Strings,
+           .ProgramFolder = services_.Places.Program()},
+          this)
       .exec();
 }
 

@@ -12,7 +12,6 @@
 #include "sound/Playlist.h"
 #include "sound/SoundDefinition.h"
 #include "sound/SoundRecording.h"
-#include "ui/Choice.h"
 #include "ui/PollTimer.h"
 #include "ui/Text.h"
 #include "ui_ISD_rec.h"
@@ -91,8 +90,10 @@ void ISD_rec::ConnectCommands() {
   connectButton(*ui_->Preview, &ISD_rec::PreviewAll);
   connectButton(*ui_->RecordButton, &ISD_rec::Record);
   connectButton(*ui_->Test, &ISD_rec::TestAll);
-  OnChoice(*ui_->RecorderSelect, [this](int) { commands_.Run([this] { SetupComm(); }); });
-  OnChoice(*ui_->ProductSelect, [this](int index) { ChangeProduct(index); });
+  connect(ui_->RecorderSelect, &QComboBox::currentIndexChanged, this,
+          [this] { commands_.Run([this] { SetupComm(); }); });
+  // Not when the same product is chosen again, which would lose the files.
+  connect(ui_->ProductSelect, &QComboBox::currentIndexChanged, this, &ISD_rec::ChangeProduct);
   connect(ui_->SoundList, &SoundListView::RowActivated, this, [this](int row) { PlaySelected(row); });
   connect(ui_->SoundList, &SoundListView::FilesDropped, this, &ISD_rec::TakeDroppedFiles);
   connect(ui_->SoundList->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
@@ -216,6 +217,8 @@ void ISD_rec::PlaySelected(int row) {
 }
 
 void ISD_rec::PreviewAll() {
+  previewing_ = true;
+  const auto ended = qScopeGuard([this] { previewing_ = false; });
   tmrCheck_->start();
   preview_.PlayAll(list_, *this, [this] { return StopRequested(); });
 }

@@ -124,6 +124,7 @@ class ISD_rec : public QDialog, private RecorderDisplay {
   SoundListModel* model_;
   PollTimer* tmrCheck_ = nullptr;  ///< ticks while a sound plays
   int shownProduct_ = 0;
+  bool previewing_ = false;       ///< all rows are played
   bool onLine_ = false;           ///< a job on the line is on the stack
   std::int64_t pagesToSend_ = 0;  ///< of all rows
   std::int64_t pagesBegun_ = 0;   ///< in the recording that runs

@@ -28,6 +28,12 @@ std::string MinutesText(const StringTable& strings, milliseconds time, OwnText m
   return whole < 1 ? strings.Text(lessThanOne) : Filled(strings.Text(minutes), {std::to_string(whole)});
 }
 
+/// A note that shows where a path of any length begins and ends.
+QString Shortened(const QString& note) {
+  constexpr qsizetype most = 600;
+  return note.size() <= most ? note : note.left(most / 2) + QChar(0x2026) + note.right(most / 2);
+}
+
 }  // namespace
 
 void ISD_rec::SetUpAdditions() {
@@ -69,7 +75,7 @@ void ISD_rec::ShowWhatIsNew() {
 void ISD_rec::ShowNotes() {
   ui_->Notes->clear();
   for (const std::string& note : RecordingNotes(list_, parts_.Disk, SelectedRecorder(), parts_.Strings)) {
-    ui_->Notes->addItem(QString::fromStdString(note));
+    ui_->Notes->addItem(Shortened(QString::fromStdString(note)));
   }
 }
 
@@ -100,7 +106,9 @@ void ISD_rec::ShowLevel() {
 
 void ISD_rec::ShowPlayingTime() {
   if (!parts_.Player.Playing()) {
-    tmrCheck_->stop();
+    if (!previewing_) {
+      tmrCheck_->stop();
+    }
     ui_->LblTime->clear();
     return;
   }
@@ -151,7 +159,13 @@ void ISD_rec::ConvertOne() {
                                     strings.Text(OwnText::AllFiles) + "|*.*",
                           .Folder = LastFolder(),
                           .Title = strings.Text(OwnText::ConvertTitle)});
-  if (path && MayBeKept(*path)) {
+  if (!path || !MayBeKept(*path)) {
+    return;
+  }
+  if (IsWave(*path) && CheckWave(parts_.Disk, *path).Error == WaveError::None) {
+    list_.AddSoundToList(*path, *row);
+    UpdateUtilisation();
+  } else {
     ConvertInto(*path, *row);
   }
 }

@@ -4,6 +4,7 @@
 
 #include "platform/RuntimeError.h"
 #include "sound/SoundPages.h"
+#include "sound/SoundSamples.h"
 
 std::int16_t ToPage(std::int64_t value) {
   if (value < std::numeric_limits<std::int16_t>::min() || value > std::numeric_limits<std::int16_t>::max()) {
@@ -32,7 +33,7 @@ void PageIndexTable::Build(const SoundList& list, const Files& files, WaveFile& 
         wave.WaveOpenFile(row.File);
         size = std::int64_t{wave.ReadSize()} - static_cast<std::int64_t>(wave.DataOffset());
       } else {
-        size = static_cast<std::int64_t>(files.FileLen(row.File));
+        size = RawSize(files, row.File);
       }
       step = ToPage(SoundChip::PagesOf(size));
     }

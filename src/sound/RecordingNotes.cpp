@@ -9,6 +9,7 @@
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 #include "sound/SoundPages.h"
+#include "sound/SoundSamples.h"
 
 namespace {
 
@@ -72,7 +73,7 @@ class Notes {
     usable_ = true;
     if (!IsWave(path)) {
       try {
-        const auto size = std::min(static_cast<std::int64_t>(files_.FileLen(path)), MostBytes);
+        const auto size = std::min(RawSize(files_, path), MostBytes);
         return {size, size};
       } catch (const RuntimeError& error) {
         NoteUnusable(number, error.what());

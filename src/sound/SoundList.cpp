@@ -5,6 +5,7 @@
 #include "platform/RuntimeError.h"
 #include "sound/Playlist.h"
 #include "sound/SoundPages.h"
+#include "sound/SoundSamples.h"
 
 void SoundList::Fill(const std::vector<std::string>& events) {
   rows_.clear();
@@ -52,7 +53,7 @@ double SoundList::Reckon() {
       usable = wave_.WaveOpenFile(row.File);
       size = wave_.ReadSize();
     } else {
-      size = static_cast<std::int64_t>(files_.FileLen(row.File));
+      size = RawSize(files_, row.File);
     }
     const std::int32_t pages = SoundChip::PagesOf(size);
     if (usable) {

@@ -7,6 +7,9 @@
 
 namespace {
 
+/// No path is longer, but a play list may hold anything.
+constexpr qsizetype LongestToolTip = 4096;
+
 QString TextOf(const SoundRow& row, int column) {
   switch (column) {
     case SoundListModel::EventColumn:
@@ -55,8 +58,7 @@ QVariant SoundListModel::data(const QModelIndex& index, int role) const {
     case Qt::DisplayRole:
       return TextOf(row, index.column());
     case Qt::ToolTipRole:
-      return index.column() == FileColumn && !row.File.empty() ? QVariant(TextOf(row, FileColumn))
-                                                               : QVariant();
+      return index.column() == FileColumn ? TextOf(row, FileColumn).left(LongestToolTip) : QVariant();
     case Qt::TextAlignmentRole:
       return QVariant(Qt::AlignVCenter | (index.column() >= SecondsColumn ? Qt::AlignRight : Qt::AlignLeft));
     default:

@@ -7,6 +7,7 @@
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
 #include "sound/SoundPages.h"
+#include "sound/SoundSamples.h"
 
 using std::chrono::milliseconds;
 
@@ -131,7 +132,7 @@ bool SoundRecording::ProgramFile(const std::string& path, std::int16_t soundNumb
     }
     extent = {parts_.Wave.DataOffset(), parts_.Wave.ReadSize()};
   } else {
-    extent.Size = static_cast<std::int64_t>(parts_.Disk.FileLen(path));
+    extent.Size = RawSize(parts_.Disk, path);
   }
   const std::int16_t pages = ToPage(SoundChip::PagesOf(extent.Size));
   const std::string buffer = ReadPages(parts_.Disk, path, extent, pages);

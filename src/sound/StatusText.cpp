@@ -6,6 +6,8 @@
 
 namespace {
 
+/// More than any path has. A text of megabytes would take too long, and not fit the screen.
+constexpr qsizetype MostShown = 8000;
 constexpr int Wrapped = Qt::AlignLeft | Qt::AlignTop | Qt::TextWrapAnywhere;
 
 }  // namespace
@@ -24,15 +26,14 @@ QSize StatusText::minimumSizeHint() const {
 }
 
 int StatusText::heightForWidth(int width) const {
-  // More than any path has; a text of megabytes would take as long.
-  constexpr qsizetype most = 8000;
   constexpr int endless = 1 << 24;
   const QRect needed =
-      fontMetrics().boundingRect(QRect(0, 0, std::max(width, 1), endless), Wrapped, text().left(most));
+      fontMetrics().boundingRect(QRect(0, 0, std::max(width, 1), endless), Wrapped, text().left(MostShown));
   return std::max(needed.height(), fontMetrics().height());
 }
 
 void StatusText::paintEvent(QPaintEvent* /*event*/) {
   QPainter painter(this);
-  style()->drawItemText(&painter, rect(), Wrapped, palette(), isEnabled(), text(), foregroundRole());
+  style()->drawItemText(&painter, rect(), Wrapped, palette(), isEnabled(), text().left(MostShown),
+                        foregroundRole());
 }

@@ -1,5 +1,6 @@
 #include <gmock/gmock.h>
 
+#include <QLabel>
 #include <QLineEdit>
 #include <chrono>
 

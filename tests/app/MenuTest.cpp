@@ -43,7 +43,7 @@ const std::vector<Menu> Menus = {
     {{"mnuTools", 0, "&Tools", true},
      {{"mnuBoxConfig", 0, "&Utility Box Configuration", true},
       {"mnuFirmwareUpdate", 0, "F&irmware Update", true},
-      {"mnuSoundRecorder", 0, "Sound &Recorder", false},
+      {"mnuSoundRecorder", 0, "Sound &Recorder", true},
       {"mnuChargeiButton", 0, "Charge &iButton", true},
       {"mnuRemoteManage", 0, "Remote &Manage", true}}},
     {{"mnuSettings", 214, "&Settings", true},

@@ -15,6 +15,7 @@
 #include "missions/Scenarios.h"
 #include "settings/Settings.h"
 #include "settings/SoldieringCalc.h"
+#include "sound/ISD_rec.h"
 #include "tests/support/CaredFor.h"
 #include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
@@ -76,6 +77,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<RemoteManage>("mnuRemoteManage");
   LookAt<BoxConfig>("mnuBoxConfig");
   LookAt<ChargeiButton>("mnuChargeiButton");
+  LookAt<ISD_rec>("mnuSoundRecorder");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }

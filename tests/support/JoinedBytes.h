@@ -7,6 +7,7 @@
 
 namespace sim {
 
+/// `left` followed by `right`.
 inline Bytes operator+(Bytes left, const Bytes& right) {
   left.insert(left.end(), right.begin(), right.end());
   return left;

@@ -23,6 +23,8 @@
 #include "tests/fakes/FakePrograms.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
+#include "tests/fakes/FakeSoundConverter.h"
+#include "tests/fakes/FakeSoundPlayer.h"
 #include "tests/fakes/FakeWakeLock.h"
 #include "tests/fakes/FakeWordProcessor.h"
 #include "tests/support/Controls.h"
@@ -63,6 +65,9 @@ class Venue : public DataSite {
                                                 .WordProcessor = Word,
                                                 .UprightPicture = UprightPicture,
                                                 .Awake = Awake,
+                                                .SoundPort = SoundPort,
+                                                .SoundPlayer = Player,
+                                                .SoundConverter = Converter,
                                                 .ButtonSwipe = ButtonSwipe,
                                                 .Wire = HasReader ? &Wire : nullptr});
     return *Window;
@@ -151,6 +156,9 @@ class Venue : public DataSite {
   FakeOneWire Wire;
   bool HasReader = true;
   FakeWakeLock Awake;
+  FakeSerialPort SoundPort;
+  FakeSoundPlayer Player{Events};
+  FakeSoundConverter Converter;
   FakeWordProcessor Word;
   FakePrograms Started;
   std::unique_ptr<frmRx> Window;

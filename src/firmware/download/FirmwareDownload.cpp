@@ -55,7 +55,6 @@ void FirmwareDownload::Run(const std::string& fileName, const std::function<std:
     Advise(OwnText::AdviceNotStarted);
     throw;
   }
-  const StayAwake awake(parts_.Awake, parts_.Strings.Text(OwnText::FirmwareWakeReason));
   record->Write(Converse(type, *line));
 }
 
@@ -106,6 +105,7 @@ std::string FirmwareDownload::Converse(FirmwareFileType type, DownloadLine& line
 }
 
 DownloadStep FirmwareDownload::Transfer(FirmwareFileType type, DownloadLine& line) {
+  const StayAwake awake(parts_.Awake, parts_.Strings.Text(OwnText::FirmwareWakeReason));
   display_.EnableButtons(true);
   display_.SetBreakCaption("&Stop Waiting");
   if (const DownloadStep end = line.AwaitAnnouncement()) {

@@ -68,7 +68,6 @@ void FirmwareFlash::FormLoad() {
   SetBar(0);
   try {
     ReadSettings();
-    ui_->cmdDownload->setEnabled(false);
     ui_->cmdDownload->setEnabled(parts_.Disk.FileExists(ui_->txtFileName->text().toStdString()));
   } catch (const RuntimeError& error) {
     if (error.Number() == Fault::FileNotFound || error.Number() == Fault::PastEndOfFile) {

@@ -1,6 +1,7 @@
 #include "firmware/hex/HexImport.h"
 
 #include <array>
+#include <utility>
 
 #include "firmware/hex/HexCheck.h"
 #include "firmware/hex/HexRecord.h"
@@ -57,8 +58,8 @@ class Divider {
   std::uint16_t upper_ = 0;
 };
 
-void WriteImages(Files& files, const HexData& data, const ImagePaths& images) {
-  const std::string program = PaddedImage(data.ProgMem);
+void WriteImages(Files& files, HexData data, const ImagePaths& images) {
+  const std::string program = PaddedImage(std::move(data.ProgMem));
   files.Replace(images.EeData, data.EeData);
   files.Replace(images.Config, data.Config);
   files.Replace(images.ProgMem, program);

@@ -13,8 +13,9 @@ constexpr std::uint8_t NoDigit = 0xFF;
 constexpr std::array<std::uint8_t, 256> ValuesOfDigits = [] {
   std::array<std::uint8_t, 256> values{};
   values.fill(NoDigit);
-  for (std::uint8_t value = 0; value < Digits.size(); ++value) {
-    const char digit = Digits[value];
+  for (std::size_t i = 0; i < Digits.size(); ++i) {
+    const char digit = Digits[i];
+    const auto value = static_cast<std::uint8_t>(i);
     values[static_cast<unsigned char>(digit)] = value;
     if (digit >= 'A') {
       values[static_cast<unsigned char>(digit - 'A' + 'a')] = value;

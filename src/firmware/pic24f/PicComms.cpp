@@ -6,16 +6,14 @@
 
 #include "core/text/NumberForms.h"
 #include "firmware/hex/HexText.h"
-#include "firmware/hex/ImageLines.h"
+#include "firmware/pic24f/ImageBlock.h"
 #include "firmware/pic24f/PicFrame.h"
 #include "platform/RuntimeError.h"
 
 namespace {
 
-constexpr std::size_t BufferBytes = 256;
 constexpr std::size_t BytesOfInstruction = 4;
 constexpr std::uint32_t AddressesOfInstruction = 2;
-constexpr std::uint32_t FileAddressMask = 0xFFFFFF;
 
 std::uint32_t LittleEndian(std::span<const std::uint8_t> bytes) {
   std::uint32_t value = 0;
@@ -24,40 +22,6 @@ std::uint32_t LittleEndian(std::span<const std::uint8_t> bytes) {
   }
   return value;
 }
-
-std::uint32_t DeviceAddress(std::string_view line, std::uint8_t bytesPerAddress) {
-  if (bytesPerAddress == 0) {
-    throw RuntimeError(Fault::DivisionByZero);
-  }
-  return (ImageLine::AddressOf(line) & FileAddressMask) / bytesPerAddress;
-}
-
-/// The bytes of one operation: those of one line, or of as many lines as fill a block.
-class Block {
- public:
-  std::span<const std::uint8_t> Bytes() const { return {bytes_.data(), size_}; }
-  bool Empty() const { return size_ == 0; }
-  void Clear() { size_ = 0; }
-
-  void Add(const ImageLine::Data& data) {
-    if (size_ + data.size() > bytes_.size()) {
-      throw RuntimeError(Fault::SubscriptOutOfRange);
-    }
-    std::copy(data.begin(), data.end(), bytes_.begin() + static_cast<std::ptrdiff_t>(size_));
-    size_ += data.size();
-  }
-
-  bool IsFull(std::int16_t blockSize) const {
-    if (blockSize == 0) {
-      throw RuntimeError(Fault::DivisionByZero);
-    }
-    return static_cast<std::int32_t>(size_) % blockSize == 0;
-  }
-
- private:
-  std::array<std::uint8_t, BufferBytes> bytes_{};
-  std::size_t size_ = 0;
-};
 
 }  // namespace
 
@@ -145,49 +109,38 @@ std::int32_t PicComms::EachBlock(const std::string& verb, PicRecord record, cons
   parts_.Disk.Write(parts_.Folder.ForWriting(Settings.ErrorLog), "");
   record.MaxRetries = static_cast<std::uint16_t>(Settings.MaxRetry);
   record.DeviceType = static_cast<std::uint16_t>(Device.DeviceType);
-  const bool gathersLines = record.Command == PicCommand::WriteFlash;
-  const auto blockSize = static_cast<std::int16_t>(record.BlockSize);
+  ImageBlock block(record);
   const auto lineCount = static_cast<std::size_t>(std::count(image.begin(), image.end(), '\n'));
   std::size_t done = 0;
-  RunFlag = 1;
-  std::int32_t code = PicCode::Done;
   bool differs = false;
-  Block block;
+  RunFlag = 1;
   for (LineReader lines(image); !lines.AtEnd();) {
     parts_.Events.DoEvents();
     const std::string_view line = lines.Next();
     ++done;
     if (RunFlag == 0) {
-      code = PicCode::Aborted;
-      break;
+      return differs ? PicCode::NotAsFile : PicCode::Aborted;
     }
-    if (block.Empty()) {
-      record.DataLength = gathersLines ? record.BlockSize : std::uint16_t{ImageLine::Bytes};
-      record.Address = DeviceAddress(line, record.BytesPerAddress);
-    }
-    block.Add(ImageLine::DataOf(line));
-    if (gathersLines && !block.IsFull(blockSize)) {
+    if (!block.Add(line)) {
       continue;
     }
-    const std::int32_t result = step(record, block.Bytes());
-    if (result == PicCode::Different) {
-      differs = true;
-    } else if (result < 0) {
+    const std::int32_t result = step(block.Record(), block.Bytes());
+    if (result < 0 && result != PicCode::Different) {
       return result;
     }
-    parts_.ShowStatus(verb + HexText(record.Address));
+    differs = differs || result == PicCode::Different;
+    parts_.ShowStatus(verb + HexText(block.Record().Address));
     if (parts_.ShowProgress) {
       parts_.ShowProgress(done, lineCount);
     }
-    block.Clear();
   }
-  return differs ? PicCode::NotAsFile : code;
+  return differs ? PicCode::NotAsFile : PicCode::Done;
 }
 
 std::int32_t PicComms::VerifyRangeDevice(PicRecord record, std::span<const std::uint8_t> expected) {
   record.Command = PicCommand::ReadFlash;
   record.BlockSize = static_cast<std::uint16_t>(Device.ReadBlock);
-  std::array<std::uint8_t, BufferBytes + 1> buffer{};
+  std::array<std::uint8_t, ImageBlock::MostBytes + 1> buffer{};
   const std::int32_t count = parts_.Library.ReadPIC(PortHandle, record, buffer);
   if (count < 0) {
     return count;

@@ -12,6 +12,7 @@ using std::chrono::milliseconds;
 
 constexpr std::size_t HeaderBytes = 5;
 constexpr std::int32_t MostBlocks = 255;
+constexpr std::size_t BytesOfInstruction = 4;
 constexpr std::size_t BytesOfEepromWord = 2;
 
 /// More than any device needs for a page, a row or a word.
@@ -35,7 +36,19 @@ std::vector<std::uint8_t> Header(std::uint8_t command, std::size_t count, std::u
           static_cast<std::uint8_t>(address >> 8U), static_cast<std::uint8_t>(address >> 16U)};
 }
 
-/// Bytes of packets that do not name an address are all of them in the command.
+/// Bytes that the answer to a packet must have at least.
+std::size_t DueBytes(std::span<const std::uint8_t> packet) {
+  if (packet.size() < 2) {
+    return 1;
+  }
+  if (packet[0] == PicCommand::Version) {
+    return 2U + packet[1];
+  }
+  const bool isRead = packet[0] == PicCommand::ReadFlash && packet.size() == HeaderBytes;
+  return isRead ? HeaderBytes + BytesOfInstruction * packet[1] : 1;
+}
+
+/// Bytes of its packet that an answer begins with.
 std::size_t RepeatedBytes(std::span<const std::uint8_t> packet) {
   const bool isRead = packet[0] == PicCommand::ReadFlash || packet[0] == PicCommand::ReadEeprom ||
                       packet[0] == PicCommand::ReadConfig;
@@ -101,6 +114,7 @@ std::int32_t SerialPicBoot::SendGetPacket(std::int32_t handle, std::span<std::ui
                   .Longest = std::min(longest, buffer.size()),
                   .Retries = retries};
   request.Repeats = RepeatedBytes(request.Packet);
+  request.Due = std::min(DueBytes(request.Packet), request.Longest);
   const std::int32_t result = Exchange(request);
   if (result > 0) {
     std::copy(answer_.begin(), answer_.end(), buffer.begin());

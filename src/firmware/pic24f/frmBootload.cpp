@@ -71,7 +71,7 @@ void frmBootload::SetUpToolbar() {
   const auto icon = [this](QStyle::StandardPixmap which) { return style()->standardIcon(which); };
   ui_->Open->setIcon(icon(QStyle::SP_DialogOpenButton));
   ui_->Abort->setIcon(icon(QStyle::SP_BrowserStop));
-  ui_->Connect->setIcon(icon(QStyle::SP_DriveNetIcon));
+  ui_->Connect->setIcon(icon(QStyle::SP_ComputerIcon));
   ui_->Write->setIcon(icon(QStyle::SP_DialogSaveButton));
   ui_->Erase->setIcon(icon(QStyle::SP_TrashIcon));
   ui_->Run->setIcon(icon(QStyle::SP_MediaPlay));

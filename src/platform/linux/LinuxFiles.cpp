@@ -188,7 +188,7 @@ std::string LinuxFiles::ReadPart(const std::string& path, std::uint64_t offset, 
   std::string bytes;
   if (offset < file.Size) {
     bytes.reserve(std::min<std::size_t>(count, file.Size - offset));
-    if (lseek(file.Handle.Number(), static_cast<off_t>(offset), SEEK_SET) < 0) {
+    if (offset > 0 && lseek(file.Handle.Number(), static_cast<off_t>(offset), SEEK_SET) < 0) {
       throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
     }
     file.AppendUpTo(count, bytes, path);

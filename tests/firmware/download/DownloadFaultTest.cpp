@@ -158,7 +158,8 @@ TEST_F(DisturbedDownload, EndsSilentlyWithTheProgram) {
 }
 
 TEST_F(DisturbedDownload, KeepsTheComputerAwakeToTheEndAndNoLonger) {
-  Boxes.WhileOpen = [this](const auto& /*box*/) { EXPECT_EQ(Awake.Held, 1); };
+  Boxes.WhileOpen = [this](const auto& /*box*/) { EXPECT_EQ(Awake.Held, 0); };
+  boot.OnCommand = [this](const auto& /*command*/) { EXPECT_EQ(Awake.Held, 1); };
   At('Z', [this] { Port.Lose(); });
   RunQvm2(OnePage);
   EXPECT_EQ(Boxes.Boxes.size(), 2U);

@@ -180,6 +180,7 @@ TEST_P(FirmwareWindow, AsksForAFile) {
   Press("cmdBrowse");
   EXPECT_THAT(dialog.Calls, ElementsAre(FakeFileDialog::Call{
                                 .Filter = "QVM Files (*.QVM;*.QVM2)|*.QVM;*.QVM2| All Files (*.*)|*.*",
+                                .Name = "",
                                 .Title = "Select a file "}));
   EXPECT_EQ(FileName(), "/fw/gun.qvm");
   EXPECT_TRUE(IsEnabled("cmdDownload"));

@@ -207,6 +207,16 @@ TEST_F(SerialPicBootTest, RepeatsAReadWithAShortAnswer) {
   EXPECT_EQ(packets.size(), 3U);
 }
 
+TEST_F(SerialPicBootTest, RepeatsAQuestionWithAShortAnswer) {
+  Open();
+  OnPacket = [this] {
+    Answer(packets.size() == 1 ? Bytes{0x55, 0x55, 0x00, 0x02, 0x05, 0x05, 0xF9, 0x04} : VersionAnswer);
+  };
+  std::array<std::uint8_t, 11> buffer = {0x00, 0x02};
+  EXPECT_EQ(library.SendGetPacket(handle, buffer, 2, 10, 3), 4);
+  EXPECT_EQ(packets.size(), 2U);
+}
+
 TEST_F(SerialPicBootTest, PassesOverTheAnswerToAnotherRead) {
   Open();
   OnPacket = [this] {

@@ -6,6 +6,7 @@
 #include <stdexcept>
 
 #include "sim/baseunit/BaseUnitFailure.h"
+#include "sim/bootcode/BootFailure.h"
 #include "sim/box/BoxFailure.h"
 #include "sim/onewire/OneWireFailure.h"
 #include "sim/pic24f/Pic24fFailure.h"
@@ -167,6 +168,37 @@ TEST(VenueOptions, TakeEveryOptionOfThePic24fBootloader) {
   EXPECT_EQ(told.Link, "port");
 }
 
+TEST(VenueOptions, TakeEveryOptionOfTheBootCode) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("bootcode");
+  EXPECT_FALSE(untold.Served);
+  EXPECT_EQ(untold.Choice("product"), 0U);
+  EXPECT_EQ(untold.File("flash"), std::nullopt);
+  EXPECT_EQ(untold.Number("power-on"), 0U);
+  EXPECT_EQ(untold.Number("runs"), 0U);
+  EXPECT_EQ(untold.Number("times"), 1U);
+  EXPECT_EQ(untold.Number("late"), 12000U);
+  EXPECT_EQ(untold.Number("gap"), 50U);
+  const DeviceOptions device =
+      ParseVenueOptions({"--bootcode", "--bootcode-failure", "asks-again", "--bootcode-at",
+                         "9",          "--bootcode-times",   "11",         "--bootcode-product",
+                         "qvm",        "--bootcode-flash",   "f",          "--bootcode-power-on",
+                         "500",        "--bootcode-runs",    "1",          "--bootcode-late",
+                         "60000",      "--bootcode-gap",     "200",        "--bootcode-link",
+                         "cable"})
+          .Of("bootcode");
+  EXPECT_TRUE(device.Served);
+  EXPECT_EQ(device.FailureAs<BootFailure>(), BootFailure::AsksAgain);
+  EXPECT_EQ(device.Place, 9U);
+  EXPECT_EQ(device.Number("times"), 11U);
+  EXPECT_EQ(device.Choice("product"), 1U);
+  EXPECT_EQ(device.File("flash"), "f");
+  EXPECT_EQ(device.Number("power-on"), 500U);
+  EXPECT_EQ(device.Number("runs"), 1U);
+  EXPECT_EQ(device.Number("late"), 60000U);
+  EXPECT_EQ(device.Number("gap"), 200U);
+  EXPECT_EQ(device.Link, "cable");
+}
+
 TEST(VenueOptions, KnowEveryFailureByItsName) {
   for (const RadioFailureInfo& info : RadioFailures) {
     EXPECT_EQ(RadioIn({"--radio-failure", std::string(info.Name)}).FailureAs<RadioFailure>(), info.Failure);
@@ -236,7 +268,10 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--no-radio"},
                                                       {"--onewire-games", "1"},
                                                       {"--box-at", "11"},
-                                                      {"--box-late", "60001"}};
+                                                      {"--box-late", "60001"},
+                                                      {"--bootcode-product", "qvm3"},
+                                                      {"--bootcode-flash", ""},
+                                                      {"--bootcode-gap", "10001"}};
   for (const std::vector<std::string>& arguments : refused) {
     EXPECT_THROW(ParseVenueOptions(arguments), std::invalid_argument) << testing::PrintToString(arguments);
   }
