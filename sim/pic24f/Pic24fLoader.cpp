@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <thread>
-#include <utility>
 #include <variant>
 
 namespace sim {
@@ -38,7 +37,7 @@ Pic24fLoader::Pic24fLoader(Pic24fLoaderSettings settings)
                              {.Baud = 1200}},
               .LinePace = settings.LinePace,
               .Log = settings.Log}),
-      settings_(Adjusted(std::move(settings))),
+      settings_(Adjusted(settings)),
       trouble_(settings_.Failure, settings_.FailurePlace) {
   traffic_.Note([&](Pic24fTraffic& traffic) { traffic.Memory = Pic24fMemory(settings_.Device); });
 }

@@ -1,5 +1,8 @@
+#include <algorithm>
 #include <chrono>
 #include <string>
+#include <string_view>
+#include <vector>
 
 #include "sim/pic24f/Pic24fCommands.h"
 #include "sim/pic24f/Pic24fLoader.h"
@@ -9,10 +12,9 @@ namespace sim {
 namespace {
 
 std::vector<std::string_view> DeviceNames() {
-  std::vector<std::string_view> names;
-  for (const Pic24fDevice& device : Pic24fDevices) {
-    names.push_back(device.Name);
-  }
+  std::vector<std::string_view> names(Pic24fDevices.size());
+  std::transform(Pic24fDevices.begin(), Pic24fDevices.end(), names.begin(),
+                 [](const Pic24fDevice& device) { return device.Name; });
   return names;
 }
 
