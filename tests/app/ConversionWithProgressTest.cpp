@@ -4,7 +4,9 @@
 
 #include <QApplication>
 #include <QLabel>
+#include <QPushButton>
 #include <QTimer>
+#include <algorithm>
 #include <filesystem>
 
 #include "platform/linux/LinuxFiles.h"
@@ -35,12 +37,14 @@ TEST_P(ConversionWindow, StandsWhileTheReaderIsSilent) {
   const StringTable strings(GetParam());
   ConversionWithProgress conversion(strings, disk, std::chrono::milliseconds(90), Reader);
   QString first;
+  bool offersToCancel = false;
   QTimer watch;
-  QObject::connect(&watch, &QTimer::timeout, [&first] {
+  QObject::connect(&watch, &QTimer::timeout, [&] {
     for (const QWidget* window : QApplication::topLevelWidgets()) {
       const auto* progress = qobject_cast<const QProgressDialog*>(window);
       if (progress != nullptr && progress->isVisible() && first.isEmpty()) {
         first = progress->labelText();
+        offersToCancel = progress->findChild<QPushButton*>() != nullptr;
       }
     }
   });
@@ -51,32 +55,49 @@ TEST_P(ConversionWindow, StandsWhileTheReaderIsSilent) {
   EXPECT_TRUE(
       first.contains(GetParam() == Language::English ? QStringLiteral(": 0 rows") : QStringLiteral("：0 行")))
       << first.toStdString();
+  EXPECT_FALSE(offersToCancel);
 }
 
 /// Asks whether a window stands over its question.
 class WindowDuringQuestion : public ConversionAnswers {
  public:
   bool Stood = false;
+  bool StoodBefore = false;
   bool Asked = false;
+
+  WindowDuringQuestion() {
+    QObject::connect(&watch_, &QTimer::timeout, [this] { StoodBefore |= Stands(); });
+    watch_.start(0);
+  }
 
   bool GoOnWithout(const std::vector<NotTakenOver>& /*values*/) override {
     Asked = true;
-    for (const QWidget* window : QApplication::topLevelWidgets()) {
-      Stood |= qobject_cast<const QProgressDialog*>(window) != nullptr;
-    }
+    Stood = Stands();
     return true;
   }
+
+ private:
+  static bool Stands() {
+    const QWidgetList windows = QApplication::topLevelWidgets();
+    return std::any_of(windows.begin(), windows.end(), [](const QWidget* window) {
+      return qobject_cast<const QProgressDialog*>(window) != nullptr;
+    });
+  }
+
+  QTimer watch_;
 };
 
 TEST_P(ConversionWindow, GoesBeforeAQuestion) {
   std::string words = MembersAsRead({{7, "Ada"}});
   words.insert(words.find("RI") + 10, "U");
   WriteFile(folder / "written", words);
+  WriteFile(Reader, "#!/bin/sh\nsleep 2\ncat '" + (folder / "written") + "'\n");
   const StringTable strings(GetParam());
   ConversionWithProgress conversion(strings, disk, std::chrono::milliseconds(0), Reader);
   WindowDuringQuestion steps;
   conversion.Convert({Path, "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb", folder / "none"},
                      steps);
+  EXPECT_TRUE(steps.StoodBefore);
   EXPECT_TRUE(steps.Asked);
   EXPECT_FALSE(steps.Stood);
 }

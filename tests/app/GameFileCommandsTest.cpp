@@ -153,6 +153,18 @@ TEST_F(GameFileCommands, ClearTheBoardBeforeAWrongFile) {
   }
 }
 
+TEST_F(GameFileCommands, ShowTheHourglassUntilAGameIsLoaded) {
+  int boxes = 0;
+  venue.Boxes.WhileOpen = [&](const FakeMessageBoxes::Box&) {  // the real boxes take it away
+    ++boxes;
+    ASSERT_NE(QGuiApplication::overrideCursor(), nullptr);
+    EXPECT_EQ(QGuiApplication::overrideCursor()->shape(), Qt::WaitCursor);
+  };
+  venue.LoadGame("no markup");
+  EXPECT_EQ(boxes, 1);
+  EXPECT_EQ(QGuiApplication::overrideCursor(), nullptr);
+}
+
 TEST_F(GameFileCommands, SayThatAMissingFileIsNoGameFile) {
   venue.Dialog.Answers = {FileOf("missing.xml")};
   venue.Trigger("mnuLoadScores");

@@ -3,6 +3,7 @@
 #include <gmock/gmock.h>
 
 #include <QCheckBox>
+#include <QEnterEvent>
 #include <QLabel>
 
 #include "tests/support/Captions.h"
@@ -177,9 +178,17 @@ TEST_F(Results, AreTakenByEscapeAsByOk) {
 }
 
 TEST_F(Results, StayTickedForTheNextGame) {
-  Open([this] { Box("PrimaryCompleted1").setChecked(true); });
+  Open([this] {
+    Box("PrimaryCompleted1").setChecked(true);
+    Box("SecondaryCompleted2").setChecked(true);
+  });
   venue.Trigger("mnuClearScores");
-  Open([this] { EXPECT_TRUE(Box("PrimaryCompleted1").isChecked()); });
+  Open([this] {
+    EXPECT_TRUE(Box("PrimaryCompleted1").isChecked());
+    EXPECT_FALSE(Box("SecondaryCompleted1").isChecked());
+    EXPECT_FALSE(Box("PrimaryCompleted2").isChecked());
+    EXPECT_TRUE(Box("SecondaryCompleted2").isChecked());
+  });
 }
 
 TEST_F(Results, ShowTheFirstLineOfEachObjective) {
@@ -194,6 +203,9 @@ TEST_F(Results, ShowTheFirstLineOfEachObjective) {
     EXPECT_EQ(text.text(), QStringLiteral("Hold the well"));
     Box("PrimaryCompleted2").setFocus();
     EXPECT_EQ(text.text(), QString());
+    QEnterEvent mouse(QPointF(1, 1), QPointF(1, 1), QPointF(1, 1));
+    QApplication::sendEvent(&Box("SecondaryCompleted3"), &mouse);
+    EXPECT_EQ(text.text(), QStringLiteral("Run"));
   });
 }
 

@@ -77,6 +77,9 @@ TEST_F(UploadProgressWindow, PlaysItsAnimationBetweenStartAndStop) {
   EXPECT_TRUE(Moves());
   window.StopTransferAnim();
   EXPECT_FALSE(Moves());
+  window.StartTransferAnim();
+  window.Close();
+  EXPECT_FALSE(Moves());
 }
 
 TEST_F(UploadProgressWindow, KnowsWhetherTheOperatorClosedIt) {

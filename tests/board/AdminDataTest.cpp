@@ -67,6 +67,9 @@ TEST_F(Admin, HasItsCaptionsAboveTheirFigures) {
     for (int column = 0; column < 3; ++column) {
       EXPECT_EQ(list.horizontalHeaderItem(column)->textAlignment(), list.item(0, column)->textAlignment());
     }
+    EXPECT_TRUE((list.item(0, 0)->textAlignment() & Qt::AlignLeft) != 0);
+    EXPECT_TRUE((list.item(0, 1)->textAlignment() & Qt::AlignRight) != 0);
+    EXPECT_TRUE((list.item(0, 2)->textAlignment() & Qt::AlignRight) != 0);
   });
 }
 

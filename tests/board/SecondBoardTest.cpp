@@ -1,6 +1,7 @@
 #include <gmock/gmock.h>
 
 #include <QAbstractItemModelTester>
+#include <QHeaderView>
 #include <QSignalSpy>
 #include <memory>
 
@@ -14,6 +15,7 @@ namespace {
 
 using testing::ElementsAre;
 using testing::IsEmpty;
+using testing::Pair;
 
 /// Both lists of the session on a screen.
 struct Screen {
@@ -34,6 +36,10 @@ struct Screen {
 
   std::vector<std::string> Players() const { return Column(PlayerModel, 1); }
   std::vector<std::string> Teams() const { return Column(TeamModel, 1); }
+  /// Rows of players and of teams that the views know of.
+  std::pair<int, int> RowsSeen() const {
+    return {PlayerView.verticalHeader()->count(), TeamView.verticalHeader()->count()};
+  }
 
   ScoreListModel PlayerModel;
   ScoreListModel TeamModel;
@@ -63,6 +69,7 @@ TEST_F(SecondBoard, ShowsWhatTheFirstShows) {
   for (const auto* screen : {first.get(), second.get()}) {
     EXPECT_THAT(screen->Players(), ElementsAre("Blue  7", "Red  0"));
     EXPECT_THAT(screen->Teams(), ElementsAre("Blue", "Red", "Yellow"));
+    EXPECT_THAT(screen->RowsSeen(), Pair(2, 3));
   }
   venue.session.SortByHeader(2);
   EXPECT_THAT(first->Players(), ElementsAre("Red  0", "Blue  7"));
@@ -71,6 +78,7 @@ TEST_F(SecondBoard, ShowsWhatTheFirstShows) {
   for (const auto* screen : {first.get(), second.get()}) {
     EXPECT_THAT(screen->Players(), IsEmpty());
     EXPECT_THAT(screen->Teams(), IsEmpty());
+    EXPECT_THAT(screen->RowsSeen(), Pair(0, 0));
   }
 }
 

@@ -175,6 +175,16 @@ TEST_F(CursorOnMembers, StaysOnItsRowWithTheChangesWhileTheFileIsLocked) {
   EXPECT_EQ(file.Stored("City", 1), "Cardiff");
 }
 
+TEST_F(CursorOnMembers, LeavesNothingPendingWhenAMemberCannotBeAdded) {
+  Open();
+  {
+    OtherConnection other(file.Path());
+    other.Execute("BEGIN IMMEDIATE");
+    EXPECT_EQ(NumberThrownBy([&] { rows->AddMember("now"); }), 3050);
+  }
+  EXPECT_EQ(rows->Rows().EditMode(), EditMode::None);
+}
+
 TEST_F(CursorOnMembers, SaysThatAReadOnlyFileTakesNoChange) {
   std::filesystem::permissions(file.Path(), std::filesystem::perms(0444));
   const OrdinaryUser user;

@@ -135,6 +135,15 @@ TEST_F(MembersPicture, ShowsTheNewPictureDuringTheQuestionAndTheOldOneWhenItWasR
   EXPECT_EQ(StoredHex(1), Hex(old));
 }
 
+TEST_F(MembersPicture, ShowsTheOldPictureWhenNoFileIsChosen) {
+  Choose(PictureFile(Qt::red));
+  Open([this] {
+    Press("ChangePicture");
+    Press("ChangePicture");
+    EXPECT_EQ(PhotoColour(), QColor(Qt::red));
+  });
+}
+
 TEST_F(MembersPicture, ChangesNothingForAnEmptyFile) {
   const std::string old = PictureFile(Qt::red);
   Choose(old);

@@ -55,6 +55,17 @@ TEST_F(MembersWindow, SearchesWhenTheMouseLeavesTheBox) {
   });
 }
 
+TEST_F(MembersWindow, SearchesNothingWhileAMenuOrAnotherWindowHasTheKeyboard) {
+  Open([this] {
+    Enter("SearchText", "sh");
+    for (const Qt::FocusReason reason : {Qt::PopupFocusReason, Qt::ActiveWindowFocusReason}) {
+      QFocusEvent away(QEvent::FocusOut, reason);
+      QApplication::sendEvent(&Line("SearchText"), &away);
+      EXPECT_EQ(Shown("DataPlace"), "1 / 4");
+    }
+  });
+}
+
 TEST_F(MembersWindow, SearchesBeforeTheCommandOfAButtonThatIsPressedFromTheBox) {
   Open([this] {
     Enter("SearchText", "mo");
@@ -171,6 +182,19 @@ TEST_F(MembersWindow, SearchesAnewAfterAMemberWasAdded) {
     EXPECT_EQ(Shown("DataPlace"), "2 / 2");  // the new row joins the search result
     SearchFor("enter");
     EXPECT_EQ(Shown("DataPlace"), "1 / 1");
+  });
+}
+
+TEST_F(MembersWindow, EmptiesItsEntriesWithoutAHit) {
+  Open([this] {
+    const auto entries = {"FirstNameEntry", "LastNameEntry", "ClanEntry", "DOBPicker", "CityEntry"};
+    for (const char* entry : entries) {
+      EXPECT_NE(Text(entry), "") << entry;
+    }
+    SearchFor("nobody");
+    for (const char* entry : entries) {
+      EXPECT_EQ(Text(entry), "") << entry;
+    }
   });
 }
 

@@ -38,6 +38,19 @@ TEST_F(APictureBox, ReadsGif) {
   EXPECT_EQ(box.Picture().size(), QSize(1, 1));
 }
 
+TEST_F(APictureBox, TurnsAPhotoAsItsCameraWasHeld) {
+  std::string photo = PictureFile(Qt::white, "JPG");
+  // A segment behind the start mark: one entry, 0x112 (orientation), one short number, 6 (turn it to the
+  // right).
+  const std::string exif(
+      "\xFF\xE1\x00\x22"
+      "Exif\0\0MM\0\x2A\0\0\0\x08\0\x01\x01\x12\0\x03\0\0\0\x01\0\x06\0\0\0\0\0\0",
+      36);
+  photo.insert(2, exif);
+  box.Load(photo);
+  EXPECT_EQ(box.Picture().size(), QSize(60, 80));
+}
+
 TEST_F(APictureBox, IgnoresBytesBehindThePicture) {
   for (const char* format : {"BMP", "JPG", "PNG"}) {
     box.Clear();

@@ -1,5 +1,6 @@
 #include <QAccessible>
 
+#include "core/data/FieldValue.h"
 #include "tests/missions/Editor.h"
 #include "tests/support/Captions.h"
 
@@ -29,6 +30,22 @@ TEST_F(Editor, OpensLockedOnTheFirstMission) {
     }
   });
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(Editor, ShowsByTheirBackgroundWhetherEntriesCanBeChanged) {
+  Open([this] {
+    const auto background = [](QWidget& entry) {
+      const QImage image = entry.grab().toImage();
+      return image.pixelColor(image.width() - 8, image.height() / 2);
+    };
+    for (QWidget* entry : std::initializer_list<QWidget*>{&Line("GameDuration"), &Memo("Description")}) {
+      EXPECT_EQ(background(*entry), window->palette().color(QPalette::Window));
+    }
+    Press("Edit");
+    for (QWidget* entry : std::initializer_list<QWidget*>{&Line("GameDuration"), &Memo("Description")}) {
+      EXPECT_EQ(background(*entry), window->palette().color(QPalette::Base));
+    }
+  });
 }
 
 TEST_F(Editor, ShowsTheMissionThatIsClicked) {
@@ -95,14 +112,18 @@ TEST_F(Editor, UnlocksForEditingAndStaysSoOnTheNextMission) {
 
 TEST_F(Editor, NamesItsObjectiveBoxesToScreenReaders) {
   Open([this] {
-    const auto name = [](QWidget& box) {
-      return QAccessible::queryAccessibleInterface(&box)->text(QAccessible::Name).toStdString();
+    const auto text = [](QWidget& box, QAccessible::Text kind) {
+      return QAccessible::queryAccessibleInterface(&box)->text(kind).toStdString();
     };
+    const auto name = [&](QWidget& box) { return text(box, QAccessible::Name); };
+    const auto description = [&](QWidget& box) { return text(box, QAccessible::Description); };
     for (const std::string set : {"0", "1", "2"}) {
       EXPECT_EQ(name(Memo("PrimaryObjectiveDescription" + set)), "Primary  Objective");
       EXPECT_EQ(name(Memo("SecondaryObjectiveDescription" + set)), "Secondary Objective");
       EXPECT_EQ(name(Line("PrimaryPoints" + set)), "Victory points");
       EXPECT_EQ(name(Line("SecondaryPoints" + set)), "Victory points");
+      EXPECT_EQ(description(Line("PrimaryPoints" + set)), "Primary  Objective");
+      EXPECT_EQ(description(Line("SecondaryPoints" + set)), "Secondary Objective");
     }
   });
 }
@@ -225,6 +246,14 @@ TEST_F(Editor, LeavesByEscapeWithoutAQuestionWhileLocked) {
     EXPECT_FALSE(window->isVisible());
   });
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(Editor, LeavesTheRowsOnTheFirst) {
+  Open([this] {
+    List().setCurrentRow(1);
+    Press("SelectExit");
+  });
+  EXPECT_EQ(TextOf(rows->Fields("MissionName")), "One");
 }
 
 TEST_F(Editor, SavesOnTheWayOutWhenToldTo) {

@@ -23,10 +23,13 @@ class PrintOptionsWindow : public testing::TestWithParam<Language> {
  protected:
   void Choose(const char* option) { Find<QRadioButton>(window, option).click(); }
   void SetIndex(const char* list, int index) { Find<QComboBox>(window, list).setCurrentIndex(index); }
+  /// Of the three lists; each one's label must be in agreement.
   std::vector<bool> Enabled() const {
     std::vector<bool> enabled;
-    for (const char* list : {"TeamID", "PlayerID", "TeamID2"}) {
+    for (const auto& [list, label] :
+         {std::pair{"TeamID", "TeamLabel"}, {"PlayerID", "PlayerLabel"}, {"TeamID2", "TeamLabel2"}}) {
       enabled.push_back(Find<QComboBox>(window, list).isEnabled());
+      EXPECT_EQ(Find<QLabel>(window, label).isEnabled(), enabled.back()) << label;
     }
     return enabled;
   }

@@ -29,11 +29,13 @@ TEST(Captions, StandWhereEachKindOfControlShowsThem) {
 TEST(Captions, KeepTheAltLetterOfTheDesignWhereTheTextHasIt) {
   QAction about(QStringLiteral("&About"));
   QAction other(QStringLiteral("E&xit"));
-  SetCaptions(English, {{&about, 218}, {&other, 207}});
+  QAction small(QStringLiteral("&print"));
+  SetCaptions(English, {{&about, 218}, {&other, 207}, {&small, 208}});
   EXPECT_EQ(about.text().count(u'&'), 1);
   EXPECT_EQ(about.text().at(about.text().indexOf(u'&') + 1).toLower(), u'a');
   EXPECT_EQ(about.text().remove(u'&').toStdString(), English.Text(218));
   EXPECT_EQ(other.text().toStdString(), English.Text(207)) << "it has no x";
+  EXPECT_EQ(small.text().toStdString(), "&" + English.Text(208)) << "in whatever case";
 }
 
 TEST(Captions, OfMenusAreWholeWithoutALetter) {

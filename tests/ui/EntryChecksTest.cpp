@@ -4,6 +4,7 @@
 
 #include <QApplication>
 #include <QDialog>
+#include <QFocusEvent>
 #include <QLineEdit>
 #include <QVBoxLayout>
 
@@ -203,6 +204,14 @@ TEST_F(CheckedEntries, AreNotCheckedWhenAnotherWindowComesToTheFront) {
   EXPECT_THAT(boxes.Boxes, IsEmpty());
 }
 
+TEST_F(CheckedEntries, AreNotCheckedWhenAMenuOpens) {
+  window.First.setText(QStringLiteral("three"));
+  QFocusEvent away(QEvent::FocusOut, Qt::PopupFocusReason);
+  QApplication::sendEvent(&window.First, &away);
+  QApplication::processEvents();
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+}
+
 TEST_F(CheckedEntries, ReportACheckThatCannotBeMadeAndStopTheCommandButLetTheFocusGo) {
   window.First.clear();
   Click(window.Send);
@@ -217,6 +226,15 @@ TEST_F(CheckedEntries, ReportACheckThatCannotBeMadeAndStopTheCommandButLetTheFoc
 TEST_F(CheckedEntries, CanBeCheckedWhereverTheFocusIs) {
   window.Second.setText(QStringLiteral("four"));
   EXPECT_TRUE(window.Checks.Holds(window.First));
+  EXPECT_FALSE(window.Checks.Holds(window.Second));
+  QApplication::processEvents();
+  EXPECT_THAT(boxes.Boxes, ElementsAre(TooLong("four")));
+  EXPECT_TRUE(window.Second.hasFocus());
+}
+
+TEST_F(CheckedEntries, AreNotCheckedWhenAnotherTakesTheFocusBack) {
+  window.First.setText(QStringLiteral("three"));
+  window.Second.setText(QStringLiteral("four"));
   EXPECT_FALSE(window.Checks.Holds(window.Second));
   QApplication::processEvents();
   EXPECT_THAT(boxes.Boxes, ElementsAre(TooLong("four")));

@@ -3,6 +3,7 @@
 #include <gmock/gmock.h>
 
 #include <QAbstractItemModelTester>
+#include <QSignalSpy>
 
 namespace {
 
@@ -49,6 +50,20 @@ TEST_F(GunList, ChangesARowInItsPlace) {
   list.Show(guns, 128);
   EXPECT_THAT(Column(4), ElementsAre("Scores OK", "Scores Pending"));
   EXPECT_EQ(second.row(), 1);
+}
+
+TEST_F(GunList, TellsItsViewOfEachRowThatChanged) {
+  Put(1);
+  Put(8);
+  list.Show(guns, 128);
+  const QSignalSpy changes(&list, &QAbstractItemModel::dataChanged);
+  list.Show(guns, 128);
+  EXPECT_EQ(changes.count(), 0);
+  Put(8, ScoreStatus::Ok);
+  list.Show(guns, 128);
+  ASSERT_EQ(changes.count(), 1);
+  EXPECT_EQ(changes[0][0].toModelIndex(), list.index(1, 0));
+  EXPECT_EQ(changes[0][1].toModelIndex(), list.index(1, list.columnCount() - 1));
 }
 
 TEST_F(GunList, IsEmptyOnceCleared) {
