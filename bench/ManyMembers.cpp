@@ -7,6 +7,8 @@
 #include <string_view>
 #include <vector>
 
+#include "tests/support/NumbersInBytes.h"
+
 namespace {
 
 constexpr std::size_t PageSize = 4096;
@@ -30,18 +32,6 @@ constexpr unsigned int PhotographColumn = 23;
 
 // The number of columns stands before a row's first column, its key.
 constexpr std::size_t KeyInRow = 2;
-
-template <typename T>
-T NumberAt(const std::string& bytes, std::size_t at) {
-  T number{};
-  std::memcpy(&number, bytes.data() + at, sizeof number);
-  return number;
-}
-
-template <typename T>
-void PutNumber(std::string& bytes, std::size_t at, T number) {
-  std::memcpy(bytes.data() + at, &number, sizeof number);
-}
 
 /// A Jet 4 file in memory.
 class OldMembers {

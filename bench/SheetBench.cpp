@@ -18,6 +18,7 @@
 #include "platform/linux/LinuxFiles.h"
 #include "platform/qt/QtClock.h"
 #include "platform/qt/QtEventPump.h"
+#include "platform/qt/UprightPicture.h"
 #include "sheets/ScoreSheets.h"
 #include "sheets/SheetProgressWindow.h"
 #include "sheets/SheetTexts.h"
@@ -219,6 +220,7 @@ double OwnRun(Evening& evening, LibreOffice& office, std::int16_t target, Times&
                          .Disk = files,
                          .Boxes = evening.Boxes,
                          .WordApp = word,
+                         .UprightPicture = UprightPicture,
                          .Progress = progress,
                          .UserDataFolder = evening.Folder,
                          .MissionName = "Bench"};

@@ -45,6 +45,14 @@ endfunction()
 # them would take most of the build.
 function(tessarine_windows name)
   tessarine_library(${name} ${ARGN})
+  # The forms are sources too: otherwise the build does not know that the headers made of them are generated, and after a
+  # change of a form alone only the next run would compile what includes its header.
+  foreach(source IN LISTS ARGN)
+    cmake_path(REPLACE_EXTENSION source ui OUTPUT_VARIABLE form)
+    if(EXISTS ${CMAKE_CURRENT_SOURCE_DIR}/${form})
+      target_sources(${name} PRIVATE ${form})
+    endif()
+  endforeach()
   target_link_libraries(${name} PUBLIC Qt6::Widgets)
   set_target_properties(${name} PROPERTIES AUTOMOC ON AUTOUIC ON AUTORCC ON)
   tessarine_precompile(${name} windows <QtWidgets>)

@@ -7,6 +7,7 @@
 
 #include "core/data/FirstRun.h"
 #include "devices/buttons/ButtonSwipe.h"
+#include "platform/qt/UprightPicture.h"
 
 namespace {
 
@@ -50,19 +51,22 @@ Composition::Composition()
           .Databases = databases_,
           .Old = old_,
           .Events = events_,
+          .Elapsed = events_,
           .CommonDialog1 = fileDialog_,
           .Disk = files_,
           .Places = folders_,
           .Boxes = boxes_,
+          .OtherPrograms = otherPrograms_,
           .Devices = devices_,
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
+          .UprightPicture = UprightPicture,
           .Awake = awake_,
-          .Elapsed = events_,
           .SoundPort = loggedSoundPort_,
           .SoundPlayer = soundPlayer_,
           .SoundConverter = soundConverter_,
-          .ButtonSwipe = [this] { return SwipeButton(); }};
+          .ButtonSwipe = [this] { return SwipeButton(); },
+          .Wire = &wire_};
 }
 
 std::string Composition::SwipeButton() {

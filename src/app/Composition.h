@@ -11,6 +11,7 @@
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxFiles.h"
+#include "platform/linux/LinuxPrograms.h"
 #include "platform/qt/DBusWakeLock.h"
 #include "platform/qt/QtClock.h"
 #include "platform/qt/QtEventPump.h"
@@ -53,6 +54,7 @@ class Composition {
   ProgramLog log_;
   QtMessageBoxes shownBoxes_{[this] { return parent_.Window(); }};
   LoggedBoxes boxes_{shownBoxes_, log_};
+  LinuxPrograms otherPrograms_;
   QtSerialDevices devices_;
   const std::string logFolder_;
   QtSerialPort port_;

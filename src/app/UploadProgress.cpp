@@ -10,7 +10,8 @@ UploadProgress::UploadProgress(const StringTable& strings, QWidget* parent)
   ui_->setupUi(this);
   setWindowTitle(Text(strings, 172));
   ui_->Stop->setText(Text(strings, OwnText::Stop));
-  // Else the next blank, meant for the button just pressed in the main window, would press Stop.
+  // Otherwise the next press of the space bar, meant for the button just pressed in the main window, would
+  // press Stop.
   setAttribute(Qt::WA_ShowWithoutActivating);
 }
 

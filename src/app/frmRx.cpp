@@ -12,6 +12,7 @@
 #include "board/PlayerDelegate.h"
 #include "board/ScoreListModel.h"
 #include "core/data/FirstRun.h"
+#include "core/data/UserDatabase.h"
 #include "ui/Choice.h"
 #include "ui_frmRx.h"
 
@@ -51,6 +52,7 @@ bool frmRx::FormLoad() {
   }
   session_.Factors() = ReadSoldieringFactors(*ini_);
   ui_->mnuCheckButton->setEnabled(services_.ButtonSwipe != nullptr);
+  ui_->mnuChargeiButton->setEnabled(services_.Wire != nullptr);
   ConnectCommands();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
@@ -73,7 +75,7 @@ void frmRx::SetUpLists() {
   ui_->ScoreDisplay->horizontalHeader()->setSectionsClickable(true);
   ui_->TeamScores->setModel(new ScoreListModel(session_, BoardList::Teams, strings, this));
   ui_->TeamScores->SetColumnShares(std::vector<double>(TeamColumnCount, 1.0 / TeamColumnCount));
-  ui_->TeamScores->setFixedHeight(ui_->TeamScores->HeightForRows(TeamCount));
+  ui_->TeamScores->ShowWholeRows(TeamCount);
 }
 
 void frmRx::ConnectCommands() {
@@ -98,7 +100,10 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuUnassignMember, &frmRx::UnassignMember},
                                {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
                                {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
+                               {ui_->mnuFirmwareUpdate, &frmRx::UpdateFirmware},
                                {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
+                               {ui_->mnuBoxConfig, &frmRx::ConfigureBoxes},
+                               {ui_->mnuChargeiButton, &frmRx::ChargeButtons},
                                {ui_->mnuSoundRecorder, &frmRx::RecordSounds},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
@@ -119,7 +124,7 @@ void frmRx::ConnectCommands() {
 
 void frmRx::TellOfMissingBackup() {
   if (const std::string reason = session_.TakeBackupFailure(); !reason.empty()) {
-    services_.Boxes.Show(reason, "Database status", BoxIcon::Exclamation);
+    services_.Boxes.Show(reason, DatabaseBoxTitle, BoxIcon::Exclamation);
   }
 }
 

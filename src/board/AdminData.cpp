@@ -10,6 +10,14 @@
 #include "ui/Text.h"
 #include "ui_AdminData.h"
 
+namespace {
+
+Qt::Alignment AlignmentOf(int column) {
+  return Qt::AlignVCenter | (column == 0 ? Qt::AlignLeft : Qt::AlignRight);
+}
+
+}  // namespace
+
 AdminData::AdminData(const Game& game, const StringTable& strings, QWidget* parent)
     : QDialog(parent), ui_(std::make_unique<Ui::AdminData>()) {
   ui_->setupUi(this);
@@ -19,6 +27,9 @@ AdminData::AdminData(const Game& game, const StringTable& strings, QWidget* pare
   ui_->Copy->setText(Text(strings, OwnText::Copy));
   ui_->CopyButton->setText(ui_->Copy->text());
   ui_->PlayerList->setHorizontalHeaderLabels({Text(strings, 104), Text(strings, 134), Text(strings, 135)});
+  for (int column = 0; column < ui_->PlayerList->columnCount(); ++column) {
+    ui_->PlayerList->horizontalHeaderItem(column)->setTextAlignment(AlignmentOf(column));
+  }
   ui_->PlayerList->setAccessibleName(windowTitle());
   ui_->PlayerList->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
   ui_->PlayerList->verticalHeader()->hide();
@@ -39,7 +50,7 @@ void AdminData::ShowPlayers(const Game& game) {
                                  std::to_string(player.AdminKillCount)};
     for (int column = 0; column < 3; ++column) {
       auto* item = new QTableWidgetItem(QString::fromStdString(cells[column]));
-      item->setTextAlignment(Qt::AlignVCenter | (column == 0 ? Qt::AlignLeft : Qt::AlignRight));
+      item->setTextAlignment(AlignmentOf(column));
       ui_->PlayerList->setItem(index - 1, column, item);
     }
   }

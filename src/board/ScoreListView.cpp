@@ -87,9 +87,9 @@ void ScoreListView::SetColumnShares(std::vector<double> shares) {
   ShareWidth();
 }
 
-int ScoreListView::HeightForRows(int rows) const {
-  return horizontalHeader()->sizeHint().height() + rows * verticalHeader()->defaultSectionSize() +
-         2 * frameWidth();
+void ScoreListView::ShowWholeRows(int rows) {
+  wholeRows_ = rows;
+  KeepHeight();
 }
 
 void ScoreListView::reset() {
@@ -141,8 +141,17 @@ int ScoreListView::NeededWidth(int column) const {
   return std::max(horizontalHeader()->sectionSizeHint(column), sizeHintForColumn(column));
 }
 
+// Frame and header have their final heights only once the list is shown, and the captions change in size.
+void ScoreListView::KeepHeight() {
+  if (wholeRows_ > 0) {
+    setFixedHeight(horizontalHeader()->sizeHint().height() +
+                   wholeRows_ * verticalHeader()->defaultSectionSize() + 2 * frameWidth());
+  }
+}
+
 void ScoreListView::ShareWidth() {
   FitCaptions();
+  KeepHeight();
   std::vector<int> needed;
   needed.reserve(shares_.size());
   for (int column = 0; column < ColumnCount(); ++column) {

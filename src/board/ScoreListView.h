@@ -15,8 +15,8 @@ class ScoreListView : public QTableView {
   /// Shares of the list's width, one per column, adding up to 1.
   void SetColumnShares(std::vector<double> shares);
 
-  /// Height that shows `rows` rows and the header without scrolling, in pixels.
-  int HeightForRows(int rows) const;
+  /// Keeps the height at which `rows` rows and the header are seen without scrolling.
+  void ShowWholeRows(int rows);
 
   void reset() override;
 
@@ -33,8 +33,10 @@ class ScoreListView : public QTableView {
   void FitCaptions();
   /// True if captions in this font fit into their shares of `room` pixels.
   bool CaptionsFit(const QFont& captions, int room) const;
+  void KeepHeight();
   /// Width at which nothing in the column is cut, its header included.
   int NeededWidth(int column) const;
 
   std::vector<double> shares_;
+  int wholeRows_ = 0;  ///< 0: the layout chooses the height
 };

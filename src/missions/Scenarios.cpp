@@ -153,10 +153,18 @@ void Scenarios::SelectMission(int entry) {
 }
 
 void Scenarios::ShowSelectedMission() {
-  if (FindSelectedMission()) {
-    ShowMissionRecord();
-  } else {
+  try {
+    if (FindSelectedMission()) {
+      ShowMissionRecord();
+    } else {
+      ClearMissionFields();
+    }
+  } catch (const RuntimeError&) {
+    // The fields still show another mission, and the next save would put that in the place of this one.
+    const QSignalBlocker blocker(ui_->MissionSelection1);
+    ui_->MissionSelection1->setCurrentRow(-1);
     ClearMissionFields();
+    throw;
   }
 }
 

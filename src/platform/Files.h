@@ -28,7 +28,7 @@ class Files {
 
   /// Writes the whole file atomically: a failure or a crash leaves the old file (or none). Durable on return.
   /// If the path is a symbolic link, its target is replaced. Throws RuntimeError 61 (disk full), 70, 75 or
-  /// 76; the text names the file.
+  /// 76; the text names the file, and says so if the new one is in place and only its durability is in doubt.
   virtual void Replace(const std::string& path, const std::string& bytes) = 0;
 
   /// Creates an empty file in the system's temporary folder, its name beginning with "per", and returns its
@@ -50,7 +50,7 @@ class Files {
   virtual std::vector<std::string> FileNames(const std::string& folder) const = 0;
 
   /// Moves a file to another path on the same disk, replacing any file there. Durable on return. Throws
-  /// RuntimeError 53 if it does not exist, 61, 70, 75 or 76.
+  /// RuntimeError 53 if it does not exist, 61, 70, 75 or 76, with a text as that of Replace.
   virtual void Rename(const std::string& path, const std::string& newPath) = 0;
 
   /// Deletes a file. Throws RuntimeError 53 if it does not exist, 70, 75 or 76.

@@ -212,10 +212,19 @@ void ScoreSheets::AddPhoto(WordDocument& document, const Member& member) {
   const std::string file = in_.Disk.MakeTempFileName();
   // The temporary file of a member without a photo is not deleted.
   if (ExportPhoto(in_.RsMembers, "Photograph", "PhotographLength", file, in_.Disk)) {
+    TurnUpright(file);
     document.AddPicture(1, 1, 1, file);
     in_.Disk.Delete(file);
   }
   ServeEvents();
+}
+
+void ScoreSheets::TurnUpright(const std::string& file) {
+  const std::string photo = in_.Disk.Read(file);
+  const std::string upright = in_.UprightPicture(photo);
+  if (upright != photo) {
+    in_.Disk.Write(file, upright);
+  }
 }
 
 void ScoreSheets::FillGame(WordDocument& document, int index) {

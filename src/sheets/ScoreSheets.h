@@ -28,6 +28,8 @@ struct SheetParts {
   Files& Disk;
   MessageBoxes& Boxes;
   WordProcessor& WordApp;
+  /// Turns a picture file upright, which the word processor does not do.
+  std::function<std::string(const std::string& bytes)> UprightPicture;
   SheetProgress& Progress;
   std::string UserDataFolder;
   std::string MissionName;
@@ -53,6 +55,7 @@ class ScoreSheets {
   void StartWordProcessor();
   void FillPlayer(WordDocument& document, int index);
   void AddPhoto(WordDocument& document, const Member& member);
+  void TurnUpright(const std::string& file);
   void FillGame(WordDocument& document, int index);
   void Save(WordDocument& document);
   /// An unused path in the folder of sheets: `base` and the extension, with a number in between if needed.

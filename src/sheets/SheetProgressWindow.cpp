@@ -1,5 +1,7 @@
 #include "sheets/SheetProgressWindow.h"
 
+#include <QKeyEvent>
+
 #include "core/text/Filled.h"
 #include "ui/Text.h"
 #include "ui_SheetProgressWindow.h"
@@ -36,6 +38,12 @@ void SheetProgressWindow::ShowSheet(int number, int count, const std::string& na
 void SheetProgressWindow::Close() {
   hide();
   cursor_.reset();
+}
+
+void SheetProgressWindow::keyPressEvent(QKeyEvent* event) {
+  if (!event->matches(QKeySequence::Cancel)) {
+    QDialog::keyPressEvent(event);
+  }
 }
 
 void SheetProgressWindow::reject() {

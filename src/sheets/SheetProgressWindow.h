@@ -12,8 +12,8 @@ namespace Ui {
 class SheetProgressWindow;
 }
 
-/// The small window shown during a run of score sheets. Its button, Escape and the close box stop the run
-/// after the current sheet; until then the window and the hourglass stay.
+/// The small window shown during a run of score sheets. Its Stop button and its close box stop the run after
+/// the current sheet, and the window and the hourglass stay until then; Escape does nothing.
 class SheetProgressWindow : public QDialog, public SheetProgress {
   Q_OBJECT
 
@@ -27,6 +27,9 @@ class SheetProgressWindow : public QDialog, public SheetProgress {
   void Close() override;
 
   void reject() override;
+
+ protected:
+  void keyPressEvent(QKeyEvent* event) override;
 
  private:
   std::unique_ptr<Ui::SheetProgressWindow> ui_;

@@ -197,6 +197,29 @@ TEST_F(ActiveMission, SaysWhenItIsGoneAtTheMomentOfChoice) {
   EXPECT_FALSE(venue.Find<QAction>("mnuMissionResults").isEnabled());
 }
 
+TEST_F(ActiveMission, StaysWhenAnotherProgramHoldsTheFile) {
+  venue.LoadGame(GameWithFriendlyFire("Zebra"));
+  const auto expectZebra = [this] {
+    EXPECT_EQ(venue.ActiveMission().currentIndex(), 2);
+    EXPECT_EQ(ToolTip(), "One line");
+    EXPECT_EQ(ScoreOfRed0(), " 64");
+  };
+  {
+    OtherConnection other(venue.DataFile("scenarios.mdb"));
+    other.Execute("BEGIN EXCLUSIVE");
+    venue.Boxes.WhileOpen = [&expectZebra](const auto& /*box*/) { expectZebra(); };
+    venue.ActiveMission().setFocus();
+    QTest::keyClick(&venue.ActiveMission(), Qt::Key_Down);
+    venue.Boxes.WhileOpen = nullptr;
+    ASSERT_EQ(venue.Boxes.Boxes.size(), 1U);
+    EXPECT_THAT(venue.Boxes.Boxes[0].Text, testing::StartsWith("Run-time error '3050'"));
+  }
+  expectZebra();
+  QTest::keyClick(&venue.ActiveMission(), Qt::Key_Down);
+  EXPECT_EQ(venue.ActiveMission().currentIndex(), 3);
+  EXPECT_EQ(ScoreOfRed0(), " 55");
+}
+
 TEST_F(ActiveMission, SaysForEachPlayerThatItIsGoneAndScoresWithoutIt) {
   venue.LoadGame(GameWithFriendlyFire("Alpha"));
   venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1 WHERE ID = 7");

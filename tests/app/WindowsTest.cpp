@@ -1,10 +1,15 @@
+#include <QScrollBar>
+
 #include "app/About.h"
 #include "app/UploadProgress.h"
 #include "board/AdminData.h"
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
 #include "board/PlayerDetails.h"
+#include "devices/box/BoxConfig.h"
+#include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
+#include "firmware/download/FirmwareFlash.h"
 #include "members/Members.h"
 #include "missions/MissionNameEntry.h"
 #include "missions/Scenarios.h"
@@ -68,7 +73,10 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<Scenarios>("mnuSetupMissions");
+  LookAt<FirmwareFlash>("mnuFirmwareUpdate");
   LookAt<RemoteManage>("mnuRemoteManage");
+  LookAt<BoxConfig>("mnuBoxConfig");
+  LookAt<ChargeiButton>("mnuChargeiButton");
   LookAt<ISD_rec>("mnuSoundRecorder");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
@@ -132,6 +140,7 @@ TEST_P(Windows, TheMainOneIsCaredForAtTheSmallestSize) {
   EXPECT_TRUE(venue.Window->isMaximized() || venue.Window->width() == 1024);
   auto& board = venue.Find<QTableView>("ScoreDisplay");
   EXPECT_GE(board.columnWidth(1), board.sizeHintForIndex(board.model()->index(0, 1)).width());
+  EXPECT_FALSE(venue.Find<QTableView>("TeamScores").verticalScrollBar()->isVisible());
 }
 
 INSTANTIATE_TEST_SUITE_P(Looks, Windows,

@@ -62,6 +62,14 @@ TEST_F(Admin, HasItsCaptions) {
   }
 }
 
+TEST_F(Admin, HasItsCaptionsAboveTheirFigures) {
+  Open([](AdminData& /*window*/, QTableWidget& list) {
+    for (int column = 0; column < 3; ++column) {
+      EXPECT_EQ(list.horizontalHeaderItem(column)->textAlignment(), list.item(0, column)->textAlignment());
+    }
+  });
+}
+
 TEST_F(Admin, CopiesTheSelectedRowsAsTextWithTabs) {
   Open([](AdminData& window, QTableWidget& list) {
     Show(window);

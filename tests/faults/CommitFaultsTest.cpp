@@ -13,6 +13,7 @@
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/faults/FaultLoop.h"
 #include "tests/support/DatabaseContents.h"
+#include "tests/support/MadeDatabase.h"
 #include "tests/support/ScoredGame.h"
 #include "tests/support/TestDatabase.h"
 
@@ -21,16 +22,10 @@ namespace {
 constexpr int Members = 40;
 
 const std::string& MembersBytes() {
-  static const std::string bytes = [] {
-    const TemporaryFolder folder;
-    const std::string path = folder / "members.mdb";
-    ExecuteSql(path, ReadFile(std::string(TESSARINE_RESOURCES) + "/members_default.sql"));
-    ExecuteSql(path,
-               "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 40) "
-               "INSERT INTO Members (ContactID, FirstName, LastName) SELECT i, 'First', 'Last' FROM n");
-    return ReadFile(path);
-  }();
-  return bytes;
+  return MadeDatabase(
+      "members",
+      "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 40) "
+      "INSERT INTO Members (ContactID, FirstName, LastName) SELECT i, 'First', 'Last' FROM n");
 }
 
 /// A game of forty members.

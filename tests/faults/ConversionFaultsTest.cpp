@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
+#include <chrono>
 #include <filesystem>
 #include <string>
 
@@ -9,24 +10,22 @@
 #include "tests/faults/FaultLoop.h"
 #include "tests/support/ConversionAnswers.h"
 #include "tests/support/DatabaseContents.h"
+#include "tests/support/MadeDatabase.h"
 #include "tests/support/ReaderWords.h"
 #include "tests/support/TestDatabase.h"
 
 namespace {
 
-/// What does not change while files fail: the reader, what it writes, and the empty database.
+/// What does not change while files fail: the reader and what it writes.
 class Sound {
  public:
   Sound() {
     WriteFile(folder_ / "written", MembersAsRead({{7, "Ada"}, {8, "Sean"}}));
     WriteFile(Reader(), "#!/bin/sh\nexec cat '" + (folder_ / "written") + "'\n");
     std::filesystem::permissions(Reader(), std::filesystem::perms(0755));
-    OtherConnection(folder_ / "empty.mdb").Execute(ReadFile(TESSARINE_RESOURCES "/members_default.sql"));
-    empty_ = ReadFile(folder_ / "empty.mdb");
   }
 
   std::string Reader() const { return folder_ / "reader"; }
-  const std::string& Empty() const { return empty_; }
 
   static const Sound& Files() {
     static const Sound files;
@@ -35,7 +34,6 @@ class Sound {
 
  private:
   TemporaryFolder folder_;
-  std::string empty_;
 };
 
 /// An old file becomes a new one.
@@ -43,7 +41,8 @@ class OldFileConverted : public FaultyOperation {
  public:
   OldFileConverted() {
     WriteFile(*this / "members.mdb", OldBytes());
-    WriteFile(*this / "members_default.mdb", Sound::Files().Empty());
+    WriteFile(*this / "members_default.mdb", MadeDatabase("members"));
+    converter_.SetLockWait(std::chrono::milliseconds(0));  // nobody gives a lock back here
   }
 
   void Act() override {
@@ -94,9 +93,8 @@ class OldFileConverted : public FaultyOperation {
 class OldFileJoined : public OldFileConverted {
  public:
   OldFileJoined() {
-    WriteFile(*this / "members-new.mdb", Sound::Files().Empty());
-    OtherConnection(*this / "members-new.mdb")
-        .Execute("INSERT INTO Members (ContactID, FirstName) VALUES (8, 'Zoe')");
+    WriteFile(*this / "members-new.mdb",
+              MadeDatabase("members", "INSERT INTO Members (ContactID, FirstName) VALUES (8, 'Zoe')"));
   }
 
   void Check() const override {

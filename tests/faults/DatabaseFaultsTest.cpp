@@ -15,17 +15,9 @@
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/faults/FaultLoop.h"
 #include "tests/support/DatabaseContents.h"
-#include "tests/support/ScoredGame.h"
+#include "tests/support/MadeDatabase.h"
 
 namespace {
-
-/// The bytes of a database that a script makes. Making it once is much faster than once a run.
-std::string MadeBy(const std::string& script, const std::string& more) {
-  const TemporaryFolder folder;
-  ExecuteSql(folder / "new.mdb", ReadFile(std::string(TESSARINE_RESOURCES) + script));
-  ExecuteSql(folder / "new.mdb", more);
-  return ReadFile(folder / "new.mdb");
-}
 
 /// On one database, which is open.
 class OnDatabase : public FaultyOperation {
@@ -51,9 +43,9 @@ class OnMissions : public OnDatabase {
 
   static const std::string& Bytes() {
     static const std::string bytes =
-        MadeBy("/scenarios_default.sql",
-               "DELETE FROM Table1; INSERT INTO Table1 (ID, MissionName, MissionDescription) VALUES "
-               "(3, 'One', 'First text'), (5, 'Two', 'Second text')");
+        MadeDatabase("scenarios",
+                     "DELETE FROM Table1; INSERT INTO Table1 (ID, MissionName, MissionDescription) VALUES "
+                     "(3, 'One', 'First text'), (5, 'Two', 'Second text')");
     return bytes;
   }
 
@@ -101,8 +93,8 @@ class OnMembers : public OnDatabase {
   OnMembers() : OnDatabase("members.mdb", Bytes()) {}
 
   static const std::string& Bytes() {
-    static const std::string bytes = MadeBy(
-        "/members_default.sql",
+    static const std::string bytes = MadeDatabase(
+        "members",
         "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 40) "
         "INSERT INTO Members (ContactID, FirstName, LastName) SELECT i, 'First' || i, 'Last' || i FROM n; "
         "UPDATE Members SET PhotographLength = 20000, Photograph = zeroblob(20000) WHERE ContactID = 2");

@@ -24,6 +24,7 @@
 #include "tests/fakes/FakeWordProcessor.h"
 #include "tests/faults/FaultLoop.h"
 #include "tests/support/DatabaseContents.h"
+#include "tests/support/MadeDatabase.h"
 #include "tests/support/ScoredGame.h"
 
 namespace {
@@ -78,11 +79,20 @@ class OnFiles : public FaultyOperation {
 };
 
 struct GameSaved : OnFiles {
-  GameSaved() { WriteFile(*this / "game.xml", std::string(70'000, 'o')); }
+  GameSaved() { WriteFile(*this / "game.xml", Old()); }
+
+  static std::string Old() { return std::string(70'000, 'o'); }
 
   void Act() override {
     Dialog.Answers = {*this / "game.xml"};
     File.SaveGame(Played, "None");
+  }
+
+  /// The text never denies a file that is there.
+  bool Fits(const FileFault& fault, const std::string& call, const Thrown& told) const override {
+    const bool isNew = ReadFile(*this / "game.xml") != Old();
+    return OnFiles::Fits(fault, call, told) &&
+           told.Text.ends_with(" (done, but a power failure may undo it)") == isNew;
   }
 
   FakeFileDialog Dialog;
@@ -106,8 +116,8 @@ class OnDataFolder : public OnFiles {
   OnDataFolder() {
     std::filesystem::create_directories(*this / "program");
     std::filesystem::create_directories(*this / "data");
-    for (const char* name : {"scenarios_default.mdb", "members_default.mdb"}) {
-      WriteFile(*this / "program/" + name, Default(name));
+    for (const std::string name : {"scenarios", "members"}) {
+      WriteFile(*this / "program/" + name + "_default.mdb", MadeDatabase(name));
     }
     WriteFile(*this / "program/score_card_default.doc", "card");
     WriteFile(*this / "program/tessarine.ini", "[communications]\n");
@@ -115,23 +125,10 @@ class OnDataFolder : public OnFiles {
     Places.ProgramPath = *this / "program";
   }
 
-  static const std::string& Default(const std::string& name) {
-    static const std::string missions = Made("/scenarios_default.sql");
-    static const std::string members = Made("/members_default.sql");
-    return name.starts_with("members") ? members : missions;
-  }
-
   FakeFolders Places;
   FakeOldDatabases Old;
   FakeClock Time;
   SqliteEngine Databases{std::chrono::milliseconds(0)};
-
- private:
-  static std::string Made(const std::string& script) {
-    const TemporaryFolder folder;
-    ExecuteSql(folder / "new.mdb", ReadFile(std::string(TESSARINE_RESOURCES) + script));
-    return ReadFile(folder / "new.mdb");
-  }
 };
 
 /// A start of the program up to the main window.
@@ -178,10 +175,9 @@ struct LaterStart : Started {
   LaterStart() {
     const std::string folder = *this / "data/Orvalin/Tessarine";
     std::filesystem::create_directories(folder);
-    for (const char* name : {"scenarios", "members"}) {
-      WriteFile(folder + "/" + name + ".mdb", Default(name));
-    }
-    ExecuteSql(folder + "/members.mdb", "INSERT INTO Members (FirstName) VALUES ('Mine')");
+    WriteFile(folder + "/scenarios.mdb", MadeDatabase("scenarios"));
+    WriteFile(folder + "/members.mdb",
+              MadeDatabase("members", "INSERT INTO Members (FirstName) VALUES ('Mine')"));
     WriteFile(folder + "/score_card.doc", "my card");
     WriteFile(folder + "/tessarine.ini", "mine=1\n");
   }
@@ -219,9 +215,11 @@ class SheetsMade : public OnFiles {
   SheetsMade() {
     std::filesystem::create_directories(*this / "tmp");
     setenv("TMPDIR", (*this / "tmp").c_str(), 1);
-    ExecuteSql(venue_.MembersFile(),
-               "INSERT INTO Members (ContactID, FirstName, LastName, PhotographLength, Photograph) "
-               "VALUES (3, 'Ann', 'Lee', 4, x'01020304')");
+    WriteFile(
+        venue_.MembersFile(),
+        MadeDatabase("members",
+                     "INSERT INTO Members (ContactID, FirstName, LastName, PhotographLength, Photograph) "
+                     "VALUES (3, 'Ann', 'Lee', 4, x'01020304')"));
     venue_.Open();
     venue_.Activate(1).MemberIndex = 3;
     choice_.SheetSelection = SheetSelection::Active;
@@ -246,6 +244,7 @@ class SheetsMade : public OnFiles {
                  .Disk = Disk,
                  .Boxes = venue_.Boxes,
                  .WordApp = word_,
+                 .UprightPicture = [](const std::string& photo) { return photo + "turned"; },
                  .Progress = progress_,
                  .UserDataFolder = Folder(),
                  .MissionName = "None"},

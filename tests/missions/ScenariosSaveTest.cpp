@@ -286,4 +286,25 @@ TEST_F(Editor, SavesNothingOverAnotherMissionWhenItsOwnIsGone) {
   EXPECT_EQ(Stored("MissionDescription", "Three"), "Third text");
 }
 
+TEST_F(Editor, SavesNothingOverAMissionThatCouldNotBeRead) {
+  Open([this] {
+    {
+      OtherConnection other(venue.DataFile("scenarios.mdb"));
+      other.Execute("BEGIN EXCLUSIVE");
+      List().setCurrentRow(2);
+      EXPECT_EQ(venue.Boxes.Boxes.size(), 1U);
+    }
+    EXPECT_EQ(List().currentRow(), -1);
+    EXPECT_EQ(ShownName(), "");
+    Press("Edit");
+    Describe("New text");
+    Press("Save");
+    EXPECT_EQ(venue.Boxes.Boxes.back(), SaveError());
+    EXPECT_THAT(Names(), ElementsAre("One", "Two", "Three"));
+    List().setCurrentRow(2);
+    EXPECT_EQ(ShownName(), "Three");
+    EXPECT_EQ(ShownDescription(), "Third text");
+  });
+}
+
 }  // namespace

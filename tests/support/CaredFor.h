@@ -87,6 +87,14 @@ inline void ExpectCaptionsFit(const QWidget& window) {
   }
 }
 
+/// No entry reaches beyond the frame that holds it.
+inline void ExpectEntriesFit(const QWidget& window) {
+  for (const QWidget* entry : EntriesOf(window)) {
+    EXPECT_TRUE(entry->parentWidget()->rect().contains(entry->geometry()))
+        << window.objectName().toStdString() << ": " << entry->objectName().toStdString();
+  }
+}
+
 /// No caption of a list's column is cut off.
 inline void ExpectHeadersFit(const QWidget& window) {
   for (const QHeaderView* header : window.findChildren<QHeaderView*>()) {
@@ -164,6 +172,7 @@ inline void ExpectCaredFor(const QWidget& window) {
   QCoreApplication::processEvents();  // layouts follow new texts
   ExpectEntriesAreNamed(window);
   ExpectCaptionsFit(window);
+  ExpectEntriesFit(window);
   ExpectHeadersFit(window);
   ExpectInWorkArea(window);
   ExpectButtonsReachable(window);

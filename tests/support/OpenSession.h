@@ -12,6 +12,7 @@
 #include "tests/fakes/FakeClock.h"
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/fakes/FakeOldDatabases.h"
+#include "tests/support/MadeDatabase.h"
 #include "tests/support/ScoredGame.h"
 #include "tests/support/TemporaryFolder.h"
 
@@ -20,10 +21,8 @@
 class OpenSession {
  public:
   OpenSession() {
-    const auto script = [](const char* name) { return ReadFile(std::string(TESSARINE_RESOURCES) + name); };
-    ExecuteSql(ScenariosFile(), script("/scenarios_default.sql"));
-    ExecuteSql(ScenariosFile(), "DELETE FROM Table1; DELETE FROM sqlite_sequence");
-    ExecuteSql(MembersFile(), script("/members_default.sql"));
+    WriteFile(ScenariosFile(), MadeDatabase("scenarios", "DELETE FROM Table1; DELETE FROM sqlite_sequence"));
+    WriteFile(MembersFile(), MadeDatabase("members"));
   }
 
   std::string ScenariosFile() const { return Folder / "scenarios.mdb"; }

@@ -15,6 +15,7 @@
 #include "core/game/ScoreAnalysis.h"
 #include "platform/sqlite/SqliteDatabase.h"
 #include "tests/fakes/FakeMessageBoxes.h"
+#include "tests/support/MadeDatabase.h"
 #include "tests/support/TemporaryFolder.h"
 
 /// Runs SQL on the file at `path`, which is created if missing.
@@ -35,9 +36,8 @@ inline void ExecuteSql(const std::string& path, const std::string& sql) {
 class ScoredGame {
  public:
   explicit ScoredGame(Language language = Language::English) : Strings(language), game(Strings) {
-    ExecuteSql(ScenariosFile(), ReadFile(std::string(TESSARINE_RESOURCES) + "/scenarios_default.sql"));
-    ExecuteSql(ScenariosFile(), "DELETE FROM Table1; DELETE FROM sqlite_sequence");
-    ExecuteSql(MembersFile(), ReadFile(std::string(TESSARINE_RESOURCES) + "/members_default.sql"));
+    WriteFile(ScenariosFile(), MadeDatabase("scenarios", "DELETE FROM Table1; DELETE FROM sqlite_sequence"));
+    WriteFile(MembersFile(), MadeDatabase("members"));
   }
 
   /// Adds a mission: its quoted name, then the points of the sets A, B, C (primary, secondary), respawn and

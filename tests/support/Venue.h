@@ -16,8 +16,11 @@
 #include "app/frmRx.h"
 #include "platform/jet/JetConverter.h"
 #include "platform/qt/QtEventPump.h"
+#include "platform/qt/UprightPicture.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
+#include "tests/fakes/FakeOneWire.h"
+#include "tests/fakes/FakePrograms.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
 #include "tests/fakes/FakeSoundConverter.h"
@@ -51,19 +54,22 @@ class Venue : public DataSite {
                                                 .Databases = Databases,
                                                 .Old = Old,
                                                 .Events = *events,
+                                                .Elapsed = Events,
                                                 .CommonDialog1 = Dialog,
                                                 .Disk = Disk,
                                                 .Places = Places,
                                                 .Boxes = Boxes,
+                                                .OtherPrograms = Started,
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
+                                                .UprightPicture = UprightPicture,
                                                 .Awake = Awake,
-                                                .Elapsed = Events,
                                                 .SoundPort = SoundPort,
                                                 .SoundPlayer = Player,
                                                 .SoundConverter = Converter,
-                                                .ButtonSwipe = ButtonSwipe});
+                                                .ButtonSwipe = ButtonSwipe,
+                                                .Wire = HasReader ? &Wire : nullptr});
     return *Window;
   }
 
@@ -147,11 +153,14 @@ class Venue : public DataSite {
   FakeFolders Places;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
+  FakeOneWire Wire;
+  bool HasReader = true;
   FakeWakeLock Awake;
   FakeSerialPort SoundPort;
   FakeSoundPlayer Player{Events};
   FakeSoundConverter Converter;
   FakeWordProcessor Word;
+  FakePrograms Started;
   std::unique_ptr<frmRx> Window;
 
  private:

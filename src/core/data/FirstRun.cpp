@@ -1,5 +1,7 @@
 #include "core/data/FirstRun.h"
 
+#include "core/data/UserDatabase.h"
+
 namespace {
 
 struct DefaultFile {
@@ -45,7 +47,7 @@ std::string PrepareUserDataFolder(const Folders& folders, Files& files, MessageB
       continue;
     }
     if (file.Message != nullptr) {
-      boxes.Show(file.Message + folder + ".", "Database status", BoxIcon::Information);
+      boxes.Show(file.Message + folder + ".", DatabaseBoxTitle, BoxIcon::Information);
     }
     files.Replace(folder + file.UserFile, files.Read(folders.Program() + file.SourceFile));
   }

@@ -27,7 +27,7 @@ struct DatabaseParts {
   const StringTable& Strings;
 };
 
-/// Title of the boxes about the databases at start-up.
+/// Title of the boxes about the databases.
 inline constexpr const char* DatabaseBoxTitle = "Database status";
 
 /// Path of the database that is used in place of one that cannot be: "-new" behind its name.

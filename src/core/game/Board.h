@@ -66,8 +66,8 @@ class Board {
   void Sort(BoardColumn column);
 
   const std::function<void()> changed_;
-  std::vector<BoardRow> rows_;      ///< in the order of adding
-  std::vector<std::size_t> order_;  ///< indexes into `rows_` as shown
+  std::vector<BoardRow> rows_;      ///< in the order in which they were added
+  std::vector<std::size_t> order_;  ///< indexes into `rows_`, from the top of the list
   int clears_ = 0;
 };
 

@@ -46,7 +46,8 @@ class ScoreAnalysis {
   bool IsOwnTeamHit(int victim, int shooter) const;
   /// Calculates a player's score and row. Returns nullopt if the lists were cleared in a box meanwhile.
   std::optional<BoardRow> ScorePlayer(int index);
-  /// Finds the member by the button where none is assigned. Empty when there is none.
+  /// Name of the player's member, empty if there is none. A player without an assigned member first gets the
+  /// owner of the membership button that was used.
   std::string NameOfMember(Player& player);
   void CalculateAccuracy(Player& player) const;
   void CalculateSoldiering(Player& player) const;

@@ -5,6 +5,7 @@
 #include "core/data/FieldValue.h"
 #include "core/data/UserDatabase.h"
 #include "core/text/Pieces.h"
+#include "platform/RuntimeError.h"
 
 Session::Session(const StringTable& strings, const Clock& time, MessageBoxes& boxes)
     : strings_(strings), time_(time), boxes_(boxes), game_(strings) {}
@@ -95,15 +96,28 @@ void Session::FillMissionList() {
 }
 
 void Session::SelectMission(int index) {
+  const int before = missions_->ListIndex();
   missions_->Select(index);
   listeners_.Tell(SessionChange::Mission);
-  missionIsActive_ = missions_->ActivateCurrentMissionRecord();
-  missionDescription_.clear();
-  if (missionIsActive_) {
-    missionDescription_ = FirstLineOf(TextOf(missions_->Row().Fields("MissionDescription")));
+  try {
+    LookUpMission();
+  } catch (const RuntimeError&) {
+    missions_->Select(before);  // whose scores are on the board
+    listeners_.Tell(SessionChange::Mission);
+    throw;
   }
   listeners_.Tell(SessionChange::MissionRow);
   CalculateScoresWhenPresent();
+}
+
+void Session::LookUpMission() {
+  const bool isActive = missions_->ActivateCurrentMissionRecord();
+  std::string description;
+  if (isActive) {
+    description = FirstLineOf(TextOf(missions_->Row().Fields("MissionDescription")));
+  }
+  missionIsActive_ = isActive;
+  missionDescription_ = std::move(description);
 }
 
 void Session::ChooseMission(const std::string& name) {

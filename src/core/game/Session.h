@@ -32,7 +32,7 @@ enum class SessionChange {
   Saved,       ///< the game was written to a file
   Committed,   ///< the game was added to its members' totals, as far as that succeeded
   Missions,    ///< the list of missions was reread; the choice of its first entry comes next
-  Mission,     ///< a mission was chosen, perhaps the same one again
+  Mission,     ///< a mission was chosen, perhaps the same one again, or a choice that failed was taken back
   MissionRow,  ///< its row was looked up: MissionIsActive and MissionDescription now apply to it
 };
 
@@ -85,9 +85,9 @@ class Session {
   Database& DbMembers() { return *dbMembers_; }
   Recordset& RsMembers() { return *rsMembers_; }
 
-  /// Throws as ScoreAnalysis::CalculateScores does; the lists are then empty, and Scores is not told. Nor is
-  /// it told by a calculation that a command in one of its boxes has overtaken. While a box is open, other
-  /// programs can write both databases.
+  /// Throws as ScoreAnalysis::CalculateScores does, with both lists left empty. Listeners hear of Scores only
+  /// when a calculation is complete, not when it fails or when a command given in one of its boxes has
+  /// replaced it. While a box is open, other programs can write both databases.
   void CalculateScores();
   /// Does the same, but only if there is a game and the databases are open.
   void CalculateScoresWhenPresent();
@@ -95,10 +95,11 @@ class Session {
   /// Sorts the players as a click on column header `header` (counted from 1) does.
   void SortByHeader(int header);
 
-  /// Reads the missions anew and makes "None" the active one. A failure to read them leaves list and active
-  /// mission as they were.
+  /// Rereads the missions and makes "None" the active one. If they cannot be read, the list and the active
+  /// mission stay as they were.
   void FillMissionList();
-  /// Makes entry `index` of the missions the active one. A box reports a mission whose row is gone.
+  /// Makes entry `index` of the missions the active one and recalculates. A box reports a mission whose row
+  /// is gone. If the row cannot be read, the choice is taken back.
   void SelectMission(int index);
   /// True if the active entry is a mission whose row existed when it was chosen.
   bool MissionIsActive() const { return missionIsActive_; }
@@ -112,6 +113,7 @@ class Session {
   CommitResult CommitGame();
 
  private:
+  void LookUpMission();
   void ChooseMission(const std::string& name);
 
   const StringTable& strings_;

@@ -30,6 +30,7 @@ void GunSearch::SearchGuns(std::int16_t maxPlayerId) {
     }
   }
   display_.SetStatus("Idle");
+  link_.XBee_CloseCommPort();
 }
 
 void GunSearch::Ask(std::uint8_t playerId) {

@@ -11,8 +11,8 @@
 #include "platform/EventPump.h"
 #include "platform/SerialPort.h"
 
-/// The radio link to the guns for one job: a modem on the serial port of the settings. Closes the port when
-/// it ends.
+/// The radio link to the guns for one job: a modem on the serial port of the settings. A port that the job
+/// leaves open is closed in the destructor.
 ///
 /// A job that is stopped (its window closed, a later job started, the program closing) or whose line is lost
 /// sends nothing more, and every wait ends as if nobody had answered.
@@ -26,6 +26,9 @@ class RadioLink {
   /// Opens the line and starts afresh. A line that cannot be opened is not reported here: the first byte sent
   /// fails.
   void OpenXBeePort();
+
+  /// Closes the line, if it is open.
+  void XBee_CloseCommPort() { job_.Close(); }
 
   /// Sends a packet to the gun `playerId` behind the modem at `address`.
   void SendGunPacket(std::uint8_t playerId, const XBeeAddress& address, std::uint8_t byte2,

@@ -64,6 +64,7 @@ void ScoreFetch::GetScores() {
     }
   }
   display_.SetStatus("Done");
+  link_.XBee_CloseCommPort();
 }
 
 void ScoreFetch::FetchGun(int index) {

@@ -1,14 +1,10 @@
 #include "platform/jet/InterimRows.h"
 
-#include <chrono>
-
 #include "platform/RuntimeError.h"
 #include "platform/sqlite/SqliteStatement.h"
 #include "platform/sqlite/SqliteTable.h"
 
 namespace {
-
-constexpr std::chrono::milliseconds BusyTimeout(100);  // at the start, hardly anyone else has the files open
 
 void Attach(SqliteConnection& connection, const Value& path, const std::string& name) {
   SqliteStatement attach(connection, "ATTACH ?1 AS " + name);
@@ -24,8 +20,9 @@ std::int64_t RowsOf(SqliteConnection& connection, const std::string& table) {
 
 }  // namespace
 
-InterimRows::InterimRows(const std::string& newFile, const OldDatabase& old)
-    : connection_(newFile, BusyTimeout) {
+InterimRows::InterimRows(const std::string& newFile, const OldDatabase& old,
+                         std::chrono::milliseconds lockWait)
+    : connection_(newFile, lockWait) {
   const SqliteTable table(connection_, old.Table);
   tableName_ = table.Name();
   table_ = "[" + tableName_ + "]";

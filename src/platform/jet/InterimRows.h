@@ -4,6 +4,7 @@
 #include <string>
 
 #include "platform/OldDatabases.h"
+#include "platform/jet/ConversionBusyTimeout.h"
 #include "platform/sqlite/SqliteConnection.h"
 
 /// The rows that were entered into the interim file while the old one could not be used. Rows that the empty
@@ -11,7 +12,8 @@
 class InterimRows {
  public:
   /// `newFile` is the converted file. Throws RuntimeError if the interim file cannot be read.
-  InterimRows(const std::string& newFile, const OldDatabase& old);
+  InterimRows(const std::string& newFile, const OldDatabase& old,
+              std::chrono::milliseconds lockWait = ConversionBusyTimeout);
 
   std::int64_t Count() const { return count_; }
 

@@ -98,12 +98,13 @@ void RequireValues(const std::vector<NotTakenOver>& left, ConversionSteps& steps
 }
 
 /// Nothing if it is damaged or no database of ours; it then stays where it is.
-std::unique_ptr<InterimRows> ReadInterim(const std::string& newFile, const OldDatabase& old) {
+std::unique_ptr<InterimRows> ReadInterim(const std::string& newFile, const OldDatabase& old,
+                                         std::chrono::milliseconds lockWait) {
   // A single failed read can look like damage, and its rows are not offered a second time.
   constexpr int tries = 2;
   for (int count = 0; count < tries; ++count) {
     try {
-      return std::make_unique<InterimRows>(newFile, old);
+      return std::make_unique<InterimRows>(newFile, old, lockWait);
     } catch (const RuntimeError& error) {
       if (error.Number() != Fault::UnrecognizedDatabase && error.Number() != Fault::DatabaseError) {
         throw;
@@ -172,7 +173,7 @@ bool JetConverter::Join(const std::string& newFile, const OldDatabase& old, Conv
   if (!disk_.FileExists(old.InterimPath)) {
     return false;
   }
-  const std::unique_ptr<InterimRows> rows = ReadInterim(newFile, old);
+  const std::unique_ptr<InterimRows> rows = ReadInterim(newFile, old, lockWait_);
   if (!rows || rows->Count() == 0 || !steps.AddInterimRows(rows->Count())) {
     return false;
   }
@@ -181,7 +182,7 @@ bool JetConverter::Join(const std::string& newFile, const OldDatabase& old, Conv
 }
 
 OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const OldDatabase& old) const {
-  TableImport import(newFile, old.Table);
+  TableImport import(newFile, old.Table, lockWait_);
   std::vector<NotTakenOver> otherTables;
   JetStream stream({.OtherTable =
                         [&](const std::string& other, std::int64_t rows) {

@@ -8,6 +8,7 @@
 
 #include "platform/Files.h"
 #include "platform/OldDatabases.h"
+#include "platform/jet/ConversionBusyTimeout.h"
 
 /// Converts Jet files to SQLite. A separate program reads them, since a damaged file can hang or crash the
 /// library.
@@ -22,6 +23,9 @@ class JetConverter : public OldDatabases {
       std::function<void(std::int64_t rows)> onProgress = [](std::int64_t) {})
       : disk_(disk), reader_(std::move(reader)), silence_(silence), onProgress_(std::move(onProgress)) {}
 
+  /// Sets how long it waits for another program's lock.
+  void SetLockWait(std::chrono::milliseconds wait) { lockWait_ = wait; }
+
   bool IsOld(const std::string& path) const override;
   OldDatabaseReport Convert(const OldDatabase& old, ConversionSteps& steps) override;
 
@@ -34,6 +38,7 @@ class JetConverter : public OldDatabases {
   std::string reader_;
   std::chrono::milliseconds silence_;
   std::function<void(std::int64_t rows)> onProgress_;
+  std::chrono::milliseconds lockWait_ = ConversionBusyTimeout;
 };
 
 /// Path of tessarine-jet-reader beside the running program.

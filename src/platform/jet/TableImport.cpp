@@ -9,8 +9,6 @@
 
 namespace {
 
-constexpr std::chrono::milliseconds BusyTimeout(100);  // at the start, hardly anyone else has the files open
-
 /// A value's share of its row's checksum. An integer and a double of equal value hash alike, since a column
 /// may store a whole number as either.
 std::uint64_t HashOf(const Value& value) {
@@ -46,8 +44,9 @@ std::string TextOfNumber(const Value& value) {
 
 }  // namespace
 
-TableImport::TableImport(const std::string& path, const std::string& table)
-    : connection_(path, BusyTimeout), table_(connection_, table) {
+TableImport::TableImport(const std::string& path, const std::string& table,
+                         std::chrono::milliseconds lockWait)
+    : connection_(path, lockWait), table_(connection_, table) {
   connection_.Execute("PRAGMA synchronous = OFF");
   connection_.Execute("PRAGMA cache_size = -65536");  // KiB
   transaction_.emplace(connection_);

@@ -8,6 +8,7 @@
 
 #include "platform/Database.h"
 #include "platform/OldDatabases.h"
+#include "platform/jet/ConversionBusyTimeout.h"
 #include "platform/sqlite/SqliteConnection.h"
 #include "platform/sqlite/SqliteTable.h"
 
@@ -15,7 +16,8 @@
 /// is done: flush it before it is used.
 class TableImport {
  public:
-  TableImport(const std::string& path, const std::string& table);
+  TableImport(const std::string& path, const std::string& table,
+              std::chrono::milliseconds lockWait = ConversionBusyTimeout);
 
   /// The column names of the rows that follow. Columns that the table lacks are left out.
   void SetColumns(const std::vector<std::string>& columns);

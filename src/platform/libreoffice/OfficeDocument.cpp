@@ -217,7 +217,9 @@ void OfficeDocument::AddPicture(int number, int row, int column, const std::stri
   Uno::Call([&] {
     const Reference<com::sun::star::beans::XPropertySet> graphic(
         services_.Graphics->queryGraphic(Uno::Properties({{"URL", Any(Uno::UrlOf(file))}})), UNO_QUERY_THROW);
-    InsertPicture(document_, graphic, CellByName(*Table(number), row - 1, column - 1));
+    const Reference<text::XTextTable> whole = Table(number);
+    const Reference<text::XText> cell = CellByName(*whole, row - 1, column - 1);
+    InsertPicture(document_, graphic, cell, {whole->getRows()->getByIndex(row - 1), UNO_QUERY_THROW});
   });
 }
 

@@ -59,15 +59,23 @@ sal_Int32 PageRoom(const Reference<text::XTextDocument>& document, const Referen
          ifOn("HeaderIsOn", "HeaderHeight") - ifOn("FooterIsOn", "FooterHeight");
 }
 
+Reference<XPropertySet> FirstParagraph(const Reference<text::XText>& cell) {
+  return {cell->createTextCursor(), UNO_QUERY_THROW};
+}
+
+/// Height of the characters in the first line of the cell.
+sal_Int32 CharacterHeight(const Reference<XPropertySet>& paragraph) {
+  constexpr double points = 72;
+  return static_cast<sal_Int32>(Property<float>(paragraph, "CharHeight") * Inch / points);
+}
+
 /// Greatest height of a picture in the cell: a page's, less what the cell and the picture's line add to it.
 sal_Int32 HeightRoom(const Reference<text::XTextDocument>& document, const Reference<text::XText>& cell) {
   const Reference<XPropertySet> inside(cell, UNO_QUERY_THROW);
-  const Reference<XPropertySet> paragraph(cell->createTextCursor(), UNO_QUERY_THROW);
-  constexpr double points = 72;
+  const Reference<XPropertySet> paragraph = FirstParagraph(cell);
   return PageRoom(document, paragraph) - Length(inside, "TopBorderDistance") -
          Length(inside, "BottomBorderDistance") - Length(paragraph, "ParaTopMargin") -
-         Length(paragraph, "ParaBottomMargin") -
-         static_cast<sal_Int32>(Property<float>(paragraph, "CharHeight") * Inch / points);
+         Length(paragraph, "ParaBottomMargin") - CharacterHeight(paragraph);
 }
 
 /// Width of the cell as it is laid out, within its borders. Only the layout knows it: the widths of a table
@@ -90,19 +98,58 @@ Size Fit(const Size& own, const Size& room) {
           std::max(sal_Int32{1}, static_cast<sal_Int32>(own.Height * scale))};
 }
 
-}  // namespace
-
-void InsertPicture(const Reference<text::XTextDocument>& document, const Reference<XPropertySet>& graphic,
-                   const Reference<text::XText>& cell) {
+/// A small picture at the start of the cell's text.
+Reference<XPropertySet> InsertSmall(const Reference<text::XTextDocument>& document,
+                                    const Reference<XPropertySet>& graphic,
+                                    const Reference<text::XText>& cell) {
   const Reference<com::sun::star::lang::XMultiServiceFactory> factory(document, UNO_QUERY_THROW);
-  const Reference<text::XTextContent> content(factory->createInstance("com.sun.star.text.TextGraphicObject"),
-                                              UNO_QUERY_THROW);
-  const Reference<XPropertySet> picture(content, UNO_QUERY_THROW);
+  const Reference<XPropertySet> picture(factory->createInstance("com.sun.star.text.TextGraphicObject"),
+                                        UNO_QUERY_THROW);
   constexpr sal_Int32 small = 100;
   picture->setPropertyValue("Graphic", Any(graphic));
   picture->setPropertyValue("AnchorType", Any(text::TextContentAnchorType_AS_CHARACTER));
   picture->setPropertyValue("Size", Any(Size(small, small)));
+  cell->insertTextContent(cell->getStart(), Reference<text::XTextContent>(picture, UNO_QUERY_THROW), false);
+  return picture;
+}
+
+/// Height of the cell as it is laid out, within its borders; of all its rows if it is merged with cells
+/// below. It is measured by a second picture, which takes part of it.
+sal_Int32 LaidOutHeight(const Reference<text::XTextDocument>& document,
+                        const Reference<XPropertySet>& graphic, const Reference<text::XText>& cell) {
+  const Reference<XPropertySet> measure = InsertSmall(document, graphic, cell);
+  constexpr sal_Int16 half = 50;  // all of it would let a row grow that can
+  measure->setPropertyValue("RelativeHeight", Any(half));
+  const Size laidOut = Property<Size>(measure, "LayoutSize");
+  cell->removeTextContent(Reference<text::XTextContent>(measure, UNO_QUERY_THROW));
+  return laidOut.Height * 2;
+}
+
+/// Makes the picture, which has `size`, smaller if its cell has not grown with it: rows of exact height cut
+/// off what is higher.
+void FitIntoExactRow(const Reference<text::XTextDocument>& document, const Reference<XPropertySet>& graphic,
+                     const Reference<text::XText>& cell, const Reference<XPropertySet>& picture,
+                     const Size& size) {
+  const sal_Int32 height = LaidOutHeight(document, graphic, cell);
+  if (height >= size.Height) {
+    return;
+  }
+  const Reference<XPropertySet> paragraph = FirstParagraph(cell);
+  const sal_Int32 belowTheLine = CharacterHeight(paragraph) / 4;  // enough for the descenders of most fonts
+  const sal_Int32 room = height - Length(paragraph, "ParaTopMargin") - belowTheLine;
+  picture->setPropertyValue("Size", Any(Fit(size, {0, std::max(sal_Int32{1}, room)})));
+}
+
+}  // namespace
+
+void InsertPicture(const Reference<text::XTextDocument>& document, const Reference<XPropertySet>& graphic,
+                   const Reference<text::XText>& cell, const Reference<XPropertySet>& row) {
   const sal_Int32 height = HeightRoom(document, cell);
-  cell->insertTextContent(cell->getStart(), content, false);
-  picture->setPropertyValue("Size", Any(Fit(OwnSize(graphic), {WidthRoom(picture), height})));
+  const Reference<XPropertySet> picture = InsertSmall(document, graphic, cell);
+  const Size size = Fit(OwnSize(graphic), {WidthRoom(picture), height});
+  picture->setPropertyValue("Size", Any(size));
+  // The sheets of most templates need no more, and measuring takes a layout.
+  if (!Property<bool>(row, "IsAutoHeight")) {
+    FitIntoExactRow(document, graphic, cell, picture, size);
+  }
 }

@@ -49,10 +49,21 @@ class TemporaryFile {
 
   bool RenameTo(const std::string& path) {
     renamed_ = rename(path_.c_str(), path.c_str()) == 0;
+    if (!renamed_) {
+      const int error = errno;
+      renamed_ = IsAt(path);  // network file systems can report a rename as failed that was done
+      errno = error;
+    }
     return renamed_;
   }
 
  private:
+  bool IsAt(const std::string& path) const {
+    struct stat own {};
+    struct stat there {};
+    return fstat(Number(), &own) == 0 && stat(path.c_str(), &there) == 0 && own.st_dev == there.st_dev &&
+           own.st_ino == there.st_ino;
+  }
   static std::string NewName(const std::string& folder) {
     std::random_device random;
     std::array<char, 32> name{};
@@ -93,10 +104,15 @@ bool TakeOver(int file, const struct stat& old) {
   return fchmod(file, old.st_mode & 07777) == 0;
 }
 
-// Makes the folder's entries durable. File systems that do not support this (EINVAL) count as done.
-bool SyncFolder(const std::string& folder) {
+// Makes it durable that `path` now names a file which was renamed to it, in `folder`. File systems that do
+// not support this (EINVAL) count as done. The error says that the file is in its place all the same.
+void SyncRename(const std::string& folder, const std::string& path) {
   const Descriptor descriptor(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-  return descriptor.Number() >= 0 && (fsync(descriptor.Number()) == 0 || errno == EINVAL);
+  if (descriptor.Number() < 0 || (fsync(descriptor.Number()) != 0 && errno != EINVAL)) {
+    const RuntimeError error = FileError(errno, path);
+    throw RuntimeError(error.Number(),
+                       error.what() + std::string(" (done, but a power failure may undo it)"));
+  }
 }
 
 // A regular file that is open for reading.
@@ -211,9 +227,10 @@ void LinuxFiles::Replace(const std::string& path, const std::string& bytes) {
 
   TemporaryFile file(folder);
   if (file.Number() < 0 || (exists && !TakeOver(file.Number(), old)) || !WriteAll(file.Number(), bytes) ||
-      fsync(file.Number()) != 0 || !file.RenameTo(target) || !SyncFolder(folder)) {
+      fsync(file.Number()) != 0 || !file.RenameTo(target)) {
     throw FileError(errno, path);
   }
+  SyncRename(folder, path);
 }
 
 std::string LinuxFiles::MakeTempFileName() {
@@ -273,9 +290,10 @@ void LinuxFiles::Rename(const std::string& path, const std::string& newPath) {
     throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
   }
   const std::string parent = std::filesystem::path(newPath).parent_path();
-  if (rename(path.c_str(), newPath.c_str()) != 0 || !SyncFolder(parent.empty() ? "." : parent)) {
+  if (rename(path.c_str(), newPath.c_str()) != 0) {
     throw FileError(errno, newPath);
   }
+  SyncRename(parent.empty() ? "." : parent, newPath);
 }
 
 void LinuxFiles::Delete(const std::string& path) {

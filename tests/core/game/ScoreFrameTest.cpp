@@ -18,6 +18,48 @@ class Decoding : public testing::Test {
 
   Player& Red1() { return game.Players(2); }
 
+  /// Expects the counters of FrameOfRed1, added that many times.
+  void ExpectCounters(int frames) {
+    EXPECT_EQ(Red1().ShotCount, 258 * frames);
+    EXPECT_EQ(Red1().HealCount, 3 * frames);
+    EXPECT_EQ(Red1().AmmoAddCount, 4 * frames);
+    EXPECT_EQ(Red1().AdminKillCount, 5 * frames);
+    EXPECT_EQ(Red1().DeathCount, 6 * frames);
+    EXPECT_EQ(Red1().RespawnCount, 7 * frames);
+    EXPECT_EQ(Red1().ExplosiveDamage, 8 * frames);
+    EXPECT_EQ(Red1().RadiationDamage, 9 * frames);
+    EXPECT_EQ(Red1().StunCount, 10 * frames);
+  }
+
+  /// Expects the other numbers that all frames of Red 1 share.
+  void ExpectRemainders() {
+    EXPECT_EQ(Red1().RemainingClips, 2);
+    EXPECT_EQ(Red1().RemainingAmmo, 30);
+    EXPECT_EQ(Red1().SecondaryDamage, 4);
+    EXPECT_EQ(Red1().PrimaryDamage, 10);
+    EXPECT_EQ(Red1().RunCounter, 125);
+  }
+
+  static bool HasHits(const Player& player) {
+    return std::any_of(player.HitByPlayer.begin(), player.HitByPlayer.end(),
+                       [](auto hits) { return hits != 0; });
+  }
+
+  /// A frame of Red 1 that fills the buffer: all zeros, but for the number of hits, 255, at `offset`.
+  static Bytes FrameWithHitsAt(std::size_t offset) {
+    Bytes frame(1001, 0);
+    frame[2] = static_cast<std::uint8_t>((offset - 4) % 256);
+    frame[3] = static_cast<std::uint8_t>((offset - 4) / 256);
+    frame[4] = 33;
+    frame[5] = 18;
+    frame[offset] = 255;
+    return frame;
+  }
+
+  bool BufferIsEmpty() const {
+    return std::all_of(buffer.begin(), buffer.end(), [](auto byte) { return byte == 0; });
+  }
+
   FakeClock clock;
   StringTable strings{Language::English};
   Game game{strings};
@@ -38,22 +80,10 @@ TEST(MakeWord, OverflowsFrom128Up) {
 
 TEST_F(Decoding, TakesEveryFieldFromItsPlace) {
   Decode(FrameOfRed1());
-  EXPECT_EQ(Red1().ShotCount, 258);
-  EXPECT_EQ(Red1().HealCount, 3);
-  EXPECT_EQ(Red1().AmmoAddCount, 4);
-  EXPECT_EQ(Red1().AdminKillCount, 5);
-  EXPECT_EQ(Red1().DeathCount, 6);
-  EXPECT_EQ(Red1().RespawnCount, 7);
-  EXPECT_EQ(Red1().ExplosiveDamage, 8);
-  EXPECT_EQ(Red1().RadiationDamage, 9);
-  EXPECT_EQ(Red1().StunCount, 10);
+  ExpectCounters(1);
   EXPECT_EQ(Red1().DallasID, "0807060504030201");
   EXPECT_EQ(Red1().RemainingHealth, 100);
-  EXPECT_EQ(Red1().RemainingClips, 2);
-  EXPECT_EQ(Red1().RemainingAmmo, 30);
-  EXPECT_EQ(Red1().SecondaryDamage, 4);
-  EXPECT_EQ(Red1().PrimaryDamage, 10);
-  EXPECT_EQ(Red1().RunCounter, 125);
+  ExpectRemainders();
   EXPECT_EQ(Red1().PowerCheatFlag, 1);
   EXPECT_EQ(Red1().HitByPlayer(33), 260);
   EXPECT_EQ(Red1().HitByPlayer(2), 5);
@@ -64,13 +94,13 @@ TEST_F(Decoding, DatesTheGameAndEmptiesTheBuffer) {
   Decode(FrameOfBlue0());
   EXPECT_TRUE(game.DataPresent);
   EXPECT_EQ(game.GameDate, "21/05/2013 14:30");
-  EXPECT_TRUE(std::all_of(buffer.begin(), buffer.end(), [](auto byte) { return byte == 0; }));
+  EXPECT_TRUE(BufferIsEmpty());
 }
 
 TEST_F(Decoding, EmptiesTheWholeBuffer) {
   buffer.fill(7);
   Decode(FrameOfBlue0());
-  EXPECT_TRUE(std::all_of(buffer.begin(), buffer.end(), [](auto byte) { return byte == 0; }));
+  EXPECT_TRUE(BufferIsEmpty());
 }
 
 TEST_F(Decoding, TakesAHitThatEndsInTheLastByteOfTheBuffer) {
@@ -96,24 +126,12 @@ TEST_F(Decoding, OfAFrameWithoutHitsLeavesThePlayerActive) {
 TEST_F(Decoding, AddsCountersAndHitsAndReplacesTheRest) {
   Decode(FrameOfRed1());
   Decode(SecondFrameOfRed1());
-  EXPECT_EQ(Red1().ShotCount, 516);
-  EXPECT_EQ(Red1().HealCount, 6);
-  EXPECT_EQ(Red1().AmmoAddCount, 8);
-  EXPECT_EQ(Red1().AdminKillCount, 10);
-  EXPECT_EQ(Red1().DeathCount, 12);
-  EXPECT_EQ(Red1().RespawnCount, 14);
-  EXPECT_EQ(Red1().ExplosiveDamage, 16);
-  EXPECT_EQ(Red1().RadiationDamage, 18);
-  EXPECT_EQ(Red1().StunCount, 20);
+  ExpectCounters(2);
   EXPECT_EQ(Red1().HitByPlayer(33), 520);
   EXPECT_EQ(Red1().HitByPlayer(2), 10);
   EXPECT_EQ(Red1().DallasID, "08070605040302AB");
   EXPECT_EQ(Red1().RemainingHealth, 7);
-  EXPECT_EQ(Red1().RemainingClips, 2);
-  EXPECT_EQ(Red1().RemainingAmmo, 30);
-  EXPECT_EQ(Red1().SecondaryDamage, 4);
-  EXPECT_EQ(Red1().PrimaryDamage, 10);
-  EXPECT_EQ(Red1().RunCounter, 125);
+  ExpectRemainders();
   EXPECT_EQ(Red1().PowerCheatFlag, 3);
 }
 
@@ -208,21 +226,9 @@ TEST_F(Decoding, LeavesEachFieldWhoseWordOverflows) {
   frame[48] = 0x80;  // high byte of the first hit
   frame[44] = 9;
   Decode(frame);
-  EXPECT_EQ(Red1().ShotCount, 258);
-  EXPECT_EQ(Red1().HealCount, 3);
-  EXPECT_EQ(Red1().AmmoAddCount, 4);
-  EXPECT_EQ(Red1().AdminKillCount, 5);
-  EXPECT_EQ(Red1().DeathCount, 6);
-  EXPECT_EQ(Red1().RespawnCount, 7);
-  EXPECT_EQ(Red1().ExplosiveDamage, 8);
-  EXPECT_EQ(Red1().RadiationDamage, 9);
-  EXPECT_EQ(Red1().StunCount, 10);
+  ExpectCounters(1);
   EXPECT_EQ(Red1().RemainingHealth, 100);
-  EXPECT_EQ(Red1().RemainingClips, 2);
-  EXPECT_EQ(Red1().RemainingAmmo, 30);
-  EXPECT_EQ(Red1().SecondaryDamage, 4);
-  EXPECT_EQ(Red1().PrimaryDamage, 10);
-  EXPECT_EQ(Red1().RunCounter, 125);
+  ExpectRemainders();
   EXPECT_EQ(Red1().PowerCheatFlag, 9);
   EXPECT_EQ(Red1().HitByPlayer(33), 260);
   EXPECT_EQ(Red1().HitByPlayer(2), 10);
@@ -283,25 +289,13 @@ TEST_F(Decoding, FindsNoHitsBehindTheBuffer) {
 }
 
 TEST_F(Decoding, TakesAHitCountInTheBuffersLastByteForNothing) {
-  Bytes frame(1001, 0);
-  frame[2] = 0xE4;  // M = 996: the hit count is at offset 1000
-  frame[3] = 0x03;
-  frame[4] = 33;
-  frame[5] = 18;
-  frame[1000] = 255;
-  Decode(frame);
+  Decode(FrameWithHitsAt(1000));
   EXPECT_TRUE(Red1().Active);
-  EXPECT_TRUE(
-      std::all_of(Red1().HitByPlayer.begin(), Red1().HitByPlayer.end(), [](auto hits) { return hits == 0; }));
+  EXPECT_FALSE(HasHits(Red1()));
 }
 
 TEST_F(Decoding, LeavesOutHitEntriesBehindTheBuffer) {
-  Bytes frame(1001, 0);
-  frame[2] = 0xE0;  // M = 992: the hit count is at offset 996
-  frame[3] = 0x03;
-  frame[4] = 33;
-  frame[5] = 18;
-  frame[996] = 255;
+  Bytes frame = FrameWithHitsAt(996);
   frame[997] = 64;
   frame[998] = 9;
   frame[1000] = 65;
@@ -318,8 +312,7 @@ TEST_F(Decoding, LeavesOutShootersBelow32) {
     Decode(frame);
     EXPECT_EQ(Red1().HitByPlayer(2), 5);
     Red1().HitByPlayer(2) = 0;
-    EXPECT_TRUE(std::all_of(Red1().HitByPlayer.begin(), Red1().HitByPlayer.end(),
-                            [](auto hits) { return hits == 0; }));
+    EXPECT_FALSE(HasHits(Red1()));
   }
 }
 
@@ -342,7 +335,7 @@ TEST_F(Decoding, OfAGunBelow32ChangesNoPlayerButDatesTheGame) {
     EXPECT_EQ(game.GameDate, "21/05/2013 14:30");
     EXPECT_TRUE(std::none_of(game.Players.begin(), game.Players.end(),
                              [](const Player& player) { return player.Active || player.ShotCount != 0; }));
-    EXPECT_TRUE(std::all_of(buffer.begin(), buffer.end(), [](auto byte) { return byte == 0; }));
+    EXPECT_TRUE(BufferIsEmpty());
   }
 }
 

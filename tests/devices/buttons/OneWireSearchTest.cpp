@@ -12,6 +12,13 @@ using testing::Le;
 
 class OneWireSearch : public SerialAdapter {
  protected:
+  /// A further step of the walk in a session that is open.
+  std::int16_t NextStep(std::int32_t handle, const Bytes& path, const Bytes& answer) {
+    adapter.Expect({0xC1}, {0xCD});
+    ExpectSearch(path, answer);
+    return wire.TMNext(handle, state);
+  }
+
   /// The bus answers the search with `answer`, which holds no number.
   void ExpectBadRead(const Bytes& answer) {
     ExpectSearch(zeroPath, answer);
@@ -43,11 +50,7 @@ TEST_F(OneWireSearch, TakesNoByteMoreInATickThanTheDataSheetsSearch) {
     script(byte);
     answered += port.InBufferCount() - before;
   };
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, buttonAlone);
-  const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
-  ASSERT_EQ(wire.TMNext(handle, state), 1);
-  wire.TMEndSession(handle);
+  ASSERT_EQ(SearchInATick(zeroPath, buttonAlone), 1);
   EXPECT_EQ(port.Sent.size(), searchBytes);
   EXPECT_EQ(searchBytes, 24U);
   EXPECT_EQ(answered, answerBytes);
@@ -72,26 +75,15 @@ TEST_F(OneWireSearch, FindsADeviceWithAnAlarm) {
 }
 
 TEST_F(OneWireSearch, GoesOnFromSessionToSessionAndTellsTheEnd) {
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, buttonBesideReader);
-  std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
-  EXPECT_EQ(wire.TMNext(handle, state), 1);
+  EXPECT_EQ(SearchInATick(zeroPath, buttonBesideReader), 1);
   EXPECT_EQ(state.Rom, button);
-  wire.TMEndSession(handle);
 
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(pathToReader, readerBesideButton);
-  handle = wire.TMExtendedStartSession(1, 5, 0);
-  EXPECT_EQ(wire.TMNext(handle, state), 1);
+  EXPECT_EQ(SearchInATick(pathToReader, readerBesideButton), 1);
   EXPECT_EQ(state.Rom, reader);
-  wire.TMEndSession(handle);
 
-  EXPECT_EQ(EndInATick(readerAlone, readerBesideButton), 0);
+  EXPECT_EQ(SearchInATick(readerAlone, readerBesideButton), 0);
 
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, readerAlone);
-  handle = wire.TMExtendedStartSession(1, 5, 0);
-  EXPECT_EQ(wire.TMNext(handle, state), 1);
+  EXPECT_EQ(SearchInATick(zeroPath, readerAlone), 1);
   EXPECT_EQ(state.Rom, reader);
   adapter.Verify();
 }
@@ -100,9 +92,7 @@ TEST_F(OneWireSearch, ResetsTheBusBeforeASecondStepInOneSession) {
   const std::int32_t handle = Start();
   ExpectSearch(zeroPath, buttonBesideReader);
   ASSERT_EQ(wire.TMNext(handle, state), 1);
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(pathToReader, readerBesideButton);
-  EXPECT_EQ(wire.TMNext(handle, state), 1);
+  EXPECT_EQ(NextStep(handle, pathToReader, readerBesideButton), 1);
   EXPECT_EQ(state.Rom, reader);
   adapter.Verify();
 }
@@ -119,37 +109,23 @@ TEST_F(OneWireSearch, FindsTwoButtonsAndTheReader) {
   answer[0] = 0x03;
   Bytes path = zeroPath;
   path[0] = 0x02;
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(path, answer);
-  ASSERT_EQ(wire.TMNext(handle, state), 1);
+  ASSERT_EQ(NextStep(handle, path, answer), 1);
   EXPECT_EQ(state.Rom, button);
 
   answer = readerBesideButton;
   answer[0] = 0x03;
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(pathToReader, answer);
-  ASSERT_EQ(wire.TMNext(handle, state), 1);
+  ASSERT_EQ(NextStep(handle, pathToReader, answer), 1);
   EXPECT_EQ(state.Rom, reader);
-  adapter.Expect({0xC1}, {0xCD});
-  answer[0] = 0x03;
-  ExpectSearch(readerAlone, answer);
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(NextStep(handle, readerAlone, answer), 0);
   adapter.Verify();
 }
 
 /// The walk stands on the reader's device, the last one, when a button comes: one look tells the end, and the
 /// next one finds it.
 TEST_F(OneWireSearch, FindsANewButtonInTheSecondLookAtTheLatest) {
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, readerAlone);
-  std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
-  ASSERT_EQ(wire.TMNext(handle, state), 1);
-  wire.TMEndSession(handle);
-  EXPECT_EQ(EndInATick(readerAlone, readerBesideButton), 0);
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, buttonBesideReader);
-  handle = wire.TMExtendedStartSession(1, 5, 0);
-  EXPECT_EQ(wire.TMNext(handle, state), 1);
+  ASSERT_EQ(SearchInATick(zeroPath, readerAlone), 1);
+  EXPECT_EQ(SearchInATick(readerAlone, readerBesideButton), 0);
+  EXPECT_EQ(SearchInATick(zeroPath, buttonBesideReader), 1);
   EXPECT_EQ(state.Rom, button);
 }
 
@@ -158,33 +134,21 @@ TEST_F(OneWireSearch, GoesOnWithoutTheDeviceThatLeft) {
   const std::int32_t handle = Start();
   ExpectSearch(zeroPath, buttonBesideReader);
   ASSERT_EQ(wire.TMNext(handle, state), 1);
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(pathToReader, readerAlone);
-  EXPECT_EQ(wire.TMNext(handle, state), 1);
+  EXPECT_EQ(NextStep(handle, pathToReader, readerAlone), 1);
   EXPECT_EQ(state.Rom, reader);
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(readerAlone, readerAlone);
-  EXPECT_EQ(wire.TMNext(handle, state), 0);
+  EXPECT_EQ(NextStep(handle, readerAlone, readerAlone), 0);
 }
 
 /// A bit that told of devices left got lost on the way.
 TEST_F(OneWireSearch, IsNotAtTheEndWhenTheLastDeviceParts) {
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, buttonAlone);
-  const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
-  ASSERT_EQ(wire.TMNext(handle, state), 1);
-  wire.TMEndSession(handle);
-  EXPECT_EQ(EndInATick(buttonAlone, buttonBesideReader), OneWire::BadRead);
+  ASSERT_EQ(SearchInATick(zeroPath, buttonAlone), 1);
+  EXPECT_EQ(SearchInATick(buttonAlone, buttonBesideReader), OneWire::BadRead);
   EXPECT_FALSE(state.Found);
   adapter.Verify();
 }
 
 TEST_F(OneWireSearch, IsAtTheEndOnceTheLastDeviceHasLeft) {
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, buttonAlone);
-  const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
-  ASSERT_EQ(wire.TMNext(handle, state), 1);
-  wire.TMEndSession(handle);
+  ASSERT_EQ(SearchInATick(zeroPath, buttonAlone), 1);
   EXPECT_EQ(NextInATick(0xCF), 0);
   EXPECT_FALSE(state.Found);
   adapter.Verify();
@@ -193,22 +157,14 @@ TEST_F(OneWireSearch, IsAtTheEndOnceTheLastDeviceHasLeft) {
 TEST_F(OneWireSearch, DoesNotKnowTheEndFromABadReadOfTheLastDevice) {
   const Bytes nobody(16, 0xFF);
   for (const Bytes& answer : {nobody, zeroPath}) {
-    adapter.Expect({0xC1}, {0xCD});
-    ExpectSearch(zeroPath, buttonAlone);
-    const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
-    ASSERT_EQ(wire.TMNext(handle, state), 1);
-    wire.TMEndSession(handle);
-    EXPECT_EQ(EndInATick(buttonAlone, answer), OneWire::BadRead);
+    ASSERT_EQ(SearchInATick(zeroPath, buttonAlone), 1);
+    EXPECT_EQ(SearchInATick(buttonAlone, answer), OneWire::BadRead);
     EXPECT_FALSE(state.Found);
   }
 }
 
 TEST_F(OneWireSearch, BeginsAnewAfterABusWithoutDevices) {
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, buttonBesideReader);
-  const std::int32_t handle = wire.TMExtendedStartSession(1, 5, 0);
-  ASSERT_EQ(wire.TMNext(handle, state), 1);
-  wire.TMEndSession(handle);
+  ASSERT_EQ(SearchInATick(zeroPath, buttonBesideReader), 1);
   EXPECT_EQ(NextInATick(0xCF), OneWire::BadRead);  // it stood on the first of two
   EXPECT_EQ(NextInATick(0xCF), 0);
   EXPECT_FALSE(state.Found);
@@ -223,9 +179,7 @@ TEST_F(OneWireSearch, ReadsNothingFromAButtonThatLeavesInTheMiddle) {
   ExpectSearch(zeroPath, answer);
   EXPECT_EQ(wire.TMNext(handle, state), OneWire::BadRead);
   EXPECT_FALSE(state.Found);
-  adapter.Expect({0xC1}, {0xCD});
-  ExpectSearch(zeroPath, buttonAlone);
-  EXPECT_EQ(wire.TMNext(handle, state), 1);
+  EXPECT_EQ(NextStep(handle, zeroPath, buttonAlone), 1);
   adapter.Verify();
 }
 

@@ -40,8 +40,8 @@ class SerialAdapter : public testing::Test {
     return result;
   }
 
-  /// One tick of a poll whose walk stands on the last device, `path`, and asks for it once more.
-  std::int16_t EndInATick(const Bytes& path, const Bytes& answer) {
+  /// One tick of a poll whose search takes `path` and is answered with `answer`.
+  std::int16_t SearchInATick(const Bytes& path, const Bytes& answer) {
     const std::int32_t handle = Start();
     ExpectSearch(path, answer);
     const std::int16_t result = wire.TMNext(handle, state);

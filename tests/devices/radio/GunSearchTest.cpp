@@ -184,9 +184,14 @@ TEST_F(Search, ShowsItsCourse) {
 TEST_F(Search, KeepsTheLineOpenOnlyWhileItRuns) {
   display.OnRefresh = [this] { EXPECT_TRUE(Port.PortOpen()); };
   PutGun(33);
-  Run(128);
+  {
+    RadioLink link(Port, Line, Events, [] { return false; });
+    GunSearch(link, Events, Strings, guns, display).SearchGuns(128);
+    EXPECT_FALSE(Port.PortOpen());
+  }
   EXPECT_EQ(Port.Log.front(), "Open /dev/ttyS0 57600,N,8,1");
   EXPECT_EQ(Port.Log.back(), "Close");
+  EXPECT_THAT(Port.Log, testing::Contains("Close").Times(1));
 }
 
 TEST_F(Search, ListsAGunOnceAndKeepsItsFirstAnswer) {

@@ -241,6 +241,15 @@ TEST_F(Link, LeavesTheLineClosed) {
   EXPECT_FALSE(Port.PortOpen());
 }
 
+TEST_F(Link, ClosesAnOpenLineOnce) {
+  link.XBee_CloseCommPort();
+  EXPECT_THAT(Port.Log, IsEmpty());
+  link.OpenXBeePort();
+  link.XBee_CloseCommPort();
+  link.XBee_CloseCommPort();
+  EXPECT_THAT(Port.Log, ElementsAre("Open /dev/ttyS0 57600,N,8,1", "Close"));
+}
+
 TEST_F(Link, PassesAFaultOfTheFrameParserOn) {
   link.OpenXBeePort();
   Bytes data(102, 0);

@@ -39,6 +39,18 @@ TEST_F(Fetch, TakesTheAnswersOfAGunByteForByte) {
   EXPECT_TRUE(Red1().Active);
 }
 
+TEST_F(Fetch, KeepsTheLineOpenOnlyWhileItRuns) {
+  PutGun(33, BlockOfRed1(52));
+  {
+    RadioLink link(Port, Line, Events, [] { return false; });
+    ScoreFetch(link, Events, Time, Strings, game, guns, display).GetScores();
+    EXPECT_FALSE(Port.PortOpen());
+  }
+  EXPECT_EQ(Port.Log.front(), "Open /dev/ttyS0 57600,N,8,1");
+  EXPECT_EQ(Port.Log.back(), "Close");
+  EXPECT_THAT(Port.Log, testing::Contains("Close").Times(1));
+}
+
 TEST_F(Fetch, AddsTheGunsScoresToTheGame) {
   PutGun(33, BlockOfRed1(52));
   GetScores();

@@ -1,10 +1,10 @@
 #pragma once
 
 #include <cstdint>
-#include <cstring>
 #include <stdexcept>
 #include <string>
 
+#include "tests/support/NumbersInBytes.h"
 #include "tests/support/TemporaryFolder.h"
 
 inline constexpr std::size_t JetPageSize = 4096;
@@ -25,18 +25,6 @@ inline void Exchange(std::string& bytes, const std::string& old, const std::stri
     throw std::logic_error("cannot exchange these bytes");
   }
   bytes.replace(at, other.size(), other);
-}
-
-template <typename T>
-T NumberAt(const std::string& bytes, std::size_t at) {
-  T number{};
-  std::memcpy(&number, bytes.data() + at, sizeof number);
-  return number;
-}
-
-template <typename T>
-void PutNumber(std::string& bytes, std::size_t at, T number) {
-  std::memcpy(bytes.data() + at, &number, sizeof number);
 }
 
 /// Places in members.mdb.

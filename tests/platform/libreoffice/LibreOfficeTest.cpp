@@ -1,20 +1,11 @@
 #include "platform/libreoffice/LibreOffice.h"
 
 #include <gmock/gmock.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 #include <algorithm>
-#include <chrono>
-#include <csignal>
-#include <cstdlib>
 #include <filesystem>
-#include <functional>
-#include <thread>
 
-#include "platform/RuntimeError.h"
-#include "tests/platform/libreoffice/Docx.h"
-#include "tests/platform/libreoffice/OfficeStart.h"
+#include "tests/platform/libreoffice/FlatDocument.h"
 #include "tests/platform/libreoffice/Writer.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/Thrown.h"
@@ -22,9 +13,7 @@
 namespace {
 
 using testing::HasSubstr;
-using testing::IsEmpty;
 using testing::Not;
-using testing::SizeIs;
 
 const std::string Template = DefaultSheetTemplate;
 
@@ -110,24 +99,22 @@ TEST_F(Writer, FindsCellsBehindColumnZNextToMergedOnes) {
 }
 
 TEST_F(Writer, FillsBookmarksInHeadersTextBoxesAndCells) {
-  WriteFile(folder / "places.fodt",
-            R"(<?xml version="1.0" encoding="UTF-8"?><office:document
-              xmlns:office="urn:oasis:names:tc:opendocument:xmlns:office:1.0"
-              xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
-              xmlns:style="urn:oasis:names:tc:opendocument:xmlns:style:1.0"
-              xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
-              xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
-              xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
-              office:mimetype="application/vnd.oasis.opendocument.text"><office:automatic-styles>
-              <style:page-layout style:name="pm1"><style:header-style/></style:page-layout>
-              </office:automatic-styles><office:master-styles><style:master-page style:name="Standard"
-              style:page-layout-name="pm1"><style:header><text:p><text:bookmark-start text:name="A"/>?<text:bookmark-end
-              text:name="A"/></text:p></style:header></style:master-page></office:master-styles><office:body><office:text>
-              <text:p><draw:frame text:anchor-type="paragraph" svg:width="5cm"><draw:text-box><text:p><text:bookmark-start
-              text:name="B"/>?<text:bookmark-end text:name="B"/></text:p></draw:text-box></draw:frame></text:p>
-              <table:table><table:table-column/><table:table-row><table:table-cell><text:p><text:bookmark-start
-              text:name="C"/>?<text:bookmark-end text:name="C"/></text:p></table:table-cell></table:table-row></table:table>
-              </office:text></office:body></office:document>)");
+  const auto bookmark = [](const std::string& name) {
+    return "<text:p><text:bookmark-start text:name='" + name + "'/>?<text:bookmark-end text:name='" + name +
+           "'/></text:p>";
+  };
+  WriteFile(
+      folder / "places.fodt",
+      FlatDocument(
+          {.AutomaticStyles = "<style:page-layout style:name='pm1'><style:header-style/></style:page-layout>",
+           .MasterStyles =
+               "<style:master-page style:name='Standard' style:page-layout-name='pm1'><style:header>" +
+               bookmark("A") + "</style:header></style:master-page>",
+           .Body = "<text:p><draw:frame text:anchor-type='paragraph' svg:width='5cm'><draw:text-box>" +
+                   bookmark("B") +
+                   "</draw:text-box></draw:frame></text:p><table:table><table:table-column/><table:table-row>"
+                   "<table:table-cell>" +
+                   bookmark("C") + "</table:table-cell></table:table-row></table:table>"}));
   const auto document = Office().Add(folder / "places.fodt");
   document->SetBookmark("A", "InHeader");
   document->SetBookmark("B", "InBox");
@@ -138,118 +125,6 @@ TEST_F(Writer, FillsBookmarksInHeadersTextBoxesAndCells) {
   const std::string text = ReadFile(folder / "filled.fodt");
   for (const char* part : {"InHeader", "InBox", "InCell"}) {
     EXPECT_THAT(text, HasSubstr(part));
-  }
-}
-
-TEST_F(Writer, CountsTablesThatTextFlowsAround) {
-  const auto table = [](int rows) {
-    std::string text = "<table:table><table:table-column/>";
-    for (int row = 0; row < rows; ++row) {
-      text += "<table:table-row><table:table-cell><text:p/></table:table-cell></table:table-row>";
-    }
-    return text + "</table:table>";
-  };
-  const auto inFrame = [](const std::string& anchor, const std::string& inside) {
-    return "<text:p><draw:frame draw:style-name='floating' text:anchor-type='" + anchor +
-           "' svg:width='5cm'><draw:text-box>" + inside + "</draw:text-box></draw:frame>behind</text:p>";
-  };
-  WriteFile(folder / "floating.fodt",
-            R"(<?xml version="1.0" encoding="UTF-8"?><office:document
-              xmlns:office="urn:oasis:names:tc:opendocument:xmlns:office:1.0"
-              xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
-              xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
-              xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
-              xmlns:style="urn:oasis:names:tc:opendocument:xmlns:style:1.0"
-              xmlns:fo="urn:oasis:names:tc:opendocument:xmlns:xsl-fo-compatible:1.0"
-              xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
-              office:mimetype="application/vnd.oasis.opendocument.text"><office:automatic-styles><style:style
-              style:name="floating" style:family="graphic" style:parent-style-name="Frame"><style:graphic-properties style:wrap="parallel"
-              fo:padding="0mm" fo:border="none"/></style:style></office:automatic-styles><office:body><office:text>)" +
-                inFrame("paragraph", table(1)) + table(2) + inFrame("char", table(3)) +
-                inFrame("char", "<text:p>box</text:p>") + table(4) +
-                "</office:text></office:body></office:document>");
-  const auto document = Office().Add(folder / "floating.fodt");
-  for (const std::size_t rows : {1, 2, 3, 4}) {
-    const int number = static_cast<int>(rows);
-    document->WriteCells(number, 1, 20, std::vector<std::string>(rows, "x"));
-    EXPECT_EQ(
-        NumberThrownBy([&] { document->WriteCells(number, 1, 20, std::vector<std::string>(rows + 1, "x")); }),
-        440);
-  }
-  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(5, 1, 20, {}); }), 9);
-  document->Close();
-}
-
-/// A table of one column in a Word 2007 file, and a paragraph behind it.
-std::string WordTable(int rows, const std::string& place = "") {
-  std::string text =
-      "<w:tbl><w:tblPr>" + place + "</w:tblPr><w:tblGrid><w:gridCol w:w=\"2000\"/></w:tblGrid>";
-  for (int row = 0; row < rows; ++row) {
-    text += "<w:tr><w:tc><w:p/></w:tc></w:tr>";
-  }
-  return text + "</w:tbl><w:p><w:r><w:t>text</w:t></w:r></w:p>";
-}
-
-TEST_F(Writer, CountsNoTableInATextBox) {
-  const auto box = [](const std::string& wrap) {
-    return R"(<w:p><w:r><w:pict><v:shape xmlns:v="urn:schemas-microsoft-com:vml")"
-           R"( xmlns:w10="urn:schemas-microsoft-com:office:word")"
-           R"( style="position:absolute;width:200pt;height:100pt"><v:textbox><w:txbxContent>)" +
-           WordTable(1) + "</w:txbxContent></v:textbox>" + wrap + "</v:shape></w:pict></w:r></w:p>";
-  };
-  WriteFile(folder / "over.docx", Docx(box("") + WordTable(3)));
-  WriteFile(folder / "beside.docx", Docx(box(R"(<w10:wrap type="square"/>)") + WordTable(3)));
-  Convert({folder / "over.docx", folder / "beside.docx"}, "doc:MS Word 97");
-  for (const char* name : {"over.docx", "over.doc", "beside.docx", "beside.doc"}) {
-    const auto document = Office().Add(folder / name);
-    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 1, 20, {"1", "2", "3"}); }), 0) << name;
-    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {}); }), 9) << name;
-    document->Close();
-  }
-}
-
-TEST_F(Writer, CountsNoTableInAFrameThatTextRunsThroughOrThatKeepsADistance) {
-  const auto frame = [](const std::string& style) {
-    return "<text:p><draw:frame draw:style-name='" + style +
-           "' text:anchor-type='paragraph' svg:width='5cm'><draw:text-box><table:table><table:table-column/>"
-           "<table:table-row><table:table-cell><text:p/></table:table-cell></table:table-row></table:table>"
-           "</draw:text-box></draw:frame></text:p>";
-  };
-  const auto style = [](const std::string& name, const std::string& wrap, const std::string& padding) {
-    return "<style:style style:name='" + name +
-           "' style:family='graphic' style:parent-style-name='Frame'><style:graphic-properties style:wrap='" +
-           wrap + "' fo:padding='" + padding + "' fo:border='none'/></style:style>";
-  };
-  WriteFile(folder / "frames.fodt",
-            R"(<?xml version="1.0" encoding="UTF-8"?><office:document
-              xmlns:office="urn:oasis:names:tc:opendocument:xmlns:office:1.0"
-              xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
-              xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
-              xmlns:draw="urn:oasis:names:tc:opendocument:xmlns:drawing:1.0"
-              xmlns:style="urn:oasis:names:tc:opendocument:xmlns:style:1.0"
-              xmlns:fo="urn:oasis:names:tc:opendocument:xmlns:xsl-fo-compatible:1.0"
-              xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
-              office:mimetype="application/vnd.oasis.opendocument.text"><office:automatic-styles>)" +
-                style("through", "run-through", "0mm") + style("padded", "parallel", "1mm") +
-                style("floating", "parallel", "0mm") +
-                "</office:automatic-styles><office:body><office:text>" + frame("through") + frame("padded") +
-                frame("floating") + "</office:text></office:body></office:document>");
-  const auto document = Office().Add(folder / "frames.fodt");
-  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 1, 20, {"x"}); }), 0);
-  EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {}); }), 9);
-  document->Close();
-}
-
-TEST_F(Writer, CountsAFloatingTableOfAWordFile) {
-  const std::string place =
-      R"(<w:tblpPr w:vertAnchor="page" w:horzAnchor="page" w:tblpX="3000" w:tblpY="3000"/>)";
-  WriteFile(folder / "floating.docx", Docx(WordTable(2, place) + WordTable(3)));
-  Convert({folder / "floating.docx"}, "doc:MS Word 97");
-  for (const char* name : {"floating.docx", "floating.doc"}) {
-    const auto document = Office().Add(folder / name);
-    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(1, 1, 20, {"1", "2", "3"}); }), 440) << name;
-    EXPECT_EQ(NumberThrownBy([&] { document->WriteCells(2, 1, 20, {"1", "2", "3"}); }), 0) << name;
-    document->Close();
   }
 }
 
@@ -317,112 +192,6 @@ TEST_F(Writer, JoinsPdfs) {
   EXPECT_EQ(NumberThrownBy([&] { Office().JoinPdfs({folder / "missing.pdf"}, folder / "none.pdf", [] {}); }),
             75);
   EXPECT_FALSE(std::filesystem::exists(folder / "none.pdf"));
-}
-
-TEST_F(Writer, CannotEndTheProgramByEndingInACall) {
-  struct sigaction onLostPipe {};
-  ASSERT_EQ(sigaction(SIGPIPE, nullptr, &onLostPipe), 0);
-  EXPECT_EQ(onLostPipe.sa_handler, SIG_IGN);
-}
-
-TEST_F(Writer, IsStartedAfreshWhenItWasKilled) {
-  const std::vector<pid_t> hosts = Hosts();
-  ASSERT_THAT(hosts, SizeIs(1));
-  const std::vector<pid_t> offices = ChildrenOf(hosts[0], "soffice.bin");
-  ASSERT_THAT(offices, SizeIs(1));
-  const auto document = Office().Add(Template);
-  kill(offices[0], SIGKILL);
-  EXPECT_TRUE(WaitUntil([] { return Office().State() == WordState::Ended; }));
-  EXPECT_EQ(NumberThrownBy([&] { document->SetBookmark("PlayerName", "x"); }), 440);
-  EXPECT_EQ(NumberThrownBy([&] { Office().Add(Template); }), 429);
-  ASSERT_TRUE(StartAndWait(Office()));
-  EXPECT_THAT(Hosts(), SizeIs(1));
-  EXPECT_EQ(Profiles(), 1u);
-  Office().Add(Template)->Close();
-}
-
-TEST_F(Writer, IsStartedOnce) {
-  Office().Start();
-  Office().Start();
-  EXPECT_THAT(Hosts(), SizeIs(1));
-}
-
-TEST_F(Writer, EndsWithAProgramThatCrashes) {
-  const std::size_t profiles = Profiles();
-  int ready[2];
-  ASSERT_EQ(pipe(ready), 0);
-  const pid_t program = fork();
-  if (program == 0) {
-    execl(TESSARINE_PROGRAM_FOLDER "/office-runner", "office-runner", TESSARINE_PROGRAM_FOLDER,
-          std::to_string(ready[1]).c_str(), nullptr);
-    _exit(1);
-  }
-  close(ready[1]);
-  char byte = 0;
-  ASSERT_EQ(read(ready[0], &byte, 1), 1);
-  close(ready[0]);
-  const std::vector<pid_t> hosts = Hosts(program);
-  ASSERT_THAT(hosts, SizeIs(1));
-  const std::vector<pid_t> offices = ChildrenOf(hosts[0], "soffice.bin");
-  ASSERT_THAT(offices, SizeIs(1));
-  kill(program, SIGKILL);
-  waitpid(program, nullptr, 0);
-  const auto runs = [](pid_t id) {
-    for (const ProcessInfo& process : Processes()) {
-      if (process.Id == id) {
-        return true;
-      }
-    }
-    return false;
-  };
-  EXPECT_TRUE(WaitUntil([&] { return !runs(hosts[0]) && !runs(offices[0]); }));
-  EXPECT_EQ(Profiles(), profiles);
-}
-
-class LibreOfficeInLocale : public testing::TestWithParam<const char*> {};
-
-TEST_P(LibreOfficeInLocale, ReadsAndSavesFilesNamedInAnyScript) {
-  const TemporaryFolder folder;
-  std::filesystem::create_directory(folder / "目录");
-  std::filesystem::copy(Template, folder / "目录/样张.doc");
-  setenv("LC_ALL", GetParam(), 1);
-  LibreOffice office(TESSARINE_PROGRAM_FOLDER);
-  const bool ready = StartAndWait(office);
-  unsetenv("LC_ALL");
-  ASSERT_TRUE(ready);
-  const auto document = office.Add(folder / "目录/样张.doc");
-  document->SaveAs(folder / "目录/Red 5-王小明 é.doc");
-  document->Close();
-  EXPECT_TRUE(std::filesystem::exists(folder / "目录/Red 5-王小明 é.doc"));
-}
-
-INSTANTIATE_TEST_SUITE_P(OfAnyKind, LibreOfficeInLocale, testing::Values("C", "C.UTF-8", "tlh_XX.UTF-8"));
-
-TEST(LibreOfficeThatHangs, EndsAndLeavesNoFiles) {
-  const TemporaryFolder folder;
-  setenv("TMPDIR", folder.Path().c_str(), 1);
-  LibreOffice office(TESSARINE_PROGRAM_FOLDER);
-  const bool ready = StartAndWait(office);
-  unsetenv("TMPDIR");
-  ASSERT_TRUE(ready);
-  const std::vector<pid_t> hosts = Hosts();
-  ASSERT_THAT(hosts, SizeIs(1));
-  const std::vector<pid_t> offices = ChildrenOf(hosts[0], "soffice.bin");
-  ASSERT_THAT(offices, SizeIs(1));
-  office.Add(Template)->Close();
-  kill(offices[0], SIGSTOP);
-  office.Quit();
-  EXPECT_EQ(office.State(), WordState::Ended);
-  EXPECT_THAT(Hosts(), IsEmpty());
-  EXPECT_TRUE(std::filesystem::is_empty(folder.Path()));
-}
-
-TEST(LibreOfficeThatIsNotThere, IsAFailureOfTheStart) {
-  const TemporaryFolder folder;
-  LibreOffice office(folder.Path());
-  EXPECT_EQ(NumberThrownBy([&] { office.Start(); }), 429);
-  EXPECT_EQ(office.State(), WordState::Ended);
-  office.Quit();
 }
 
 }  // namespace

@@ -1,6 +1,7 @@
 #include <regex>
 
 #include "tests/platform/libreoffice/Docx.h"
+#include "tests/platform/libreoffice/FlatDocument.h"
 #include "tests/platform/libreoffice/Writer.h"
 
 namespace {
@@ -58,29 +59,37 @@ std::string Table(const std::string& width, const std::vector<int>& cells, const
          "</w:tblGrid><w:tr>" + whole + "</w:tr></w:tbl><w:p/>";
 }
 
+/// A table whose first cell is merged from that many rows of 20 mm; `rule` is "exact" or "atLeast".
+std::string Rows(int count, const std::string& rule) {
+  const std::string cell = R"(<w:tc><w:tcPr><w:tcW w:w="3000" w:type="dxa"/>)";
+  std::string rows;
+  for (int row = 0; row < count; ++row) {
+    rows += R"(<w:tr><w:trPr><w:trHeight w:val="1134" w:hRule=")" + rule + "\"/></w:trPr>" + cell +
+            (row == 0 ? R"(<w:vMerge w:val="restart"/>)" : "<w:vMerge/>") + "</w:tcPr><w:p/></w:tc>" + cell +
+            "</w:tcPr><w:p/></w:tc></w:tr>";
+  }
+  return R"(<w:tbl><w:tblPr><w:tblW w:w="0" w:type="auto"/></w:tblPr><w:tblGrid><w:gridCol w:w="3000"/>)"
+         R"(<w:gridCol w:w="3000"/></w:tblGrid>)" +
+         rows + "</w:tbl><w:p/>";
+}
+
 const std::string Automatic = R"(w:w="0" w:type="auto")";
 const std::string WholePage = R"(w:w="5000" w:type="pct")";
 
 /// A4 with margins of 20 mm, a header and a footer of 30 mm each, spacing included, and a table of one cell.
-const std::string PageWithHeaderAndFooter =
-    R"(<?xml version="1.0" encoding="UTF-8"?><office:document
-      xmlns:office="urn:oasis:names:tc:opendocument:xmlns:office:1.0"
-      xmlns:text="urn:oasis:names:tc:opendocument:xmlns:text:1.0"
-      xmlns:style="urn:oasis:names:tc:opendocument:xmlns:style:1.0"
-      xmlns:table="urn:oasis:names:tc:opendocument:xmlns:table:1.0"
-      xmlns:fo="urn:oasis:names:tc:opendocument:xmlns:xsl-fo-compatible:1.0"
-      xmlns:svg="urn:oasis:names:tc:opendocument:xmlns:svg-compatible:1.0" office:version="1.3"
-      office:mimetype="application/vnd.oasis.opendocument.text"><office:automatic-styles>
-      <style:page-layout style:name="pm1"><style:page-layout-properties fo:page-width="210mm"
-        fo:page-height="297mm" fo:margin-top="20mm" fo:margin-bottom="20mm" fo:margin-left="20mm"
-        fo:margin-right="20mm"/>
+std::string PageWithHeaderAndFooter() {
+  return FlatDocument(
+      {.AutomaticStyles = R"(<style:page-layout style:name="pm1"><style:page-layout-properties
+        fo:page-width="210mm" fo:page-height="297mm" fo:margin-top="20mm" fo:margin-bottom="20mm"
+        fo:margin-left="20mm" fo:margin-right="20mm"/>
       <style:header-style><style:header-footer-properties svg:height="30mm" fo:margin-bottom="5mm"/></style:header-style>
       <style:footer-style><style:header-footer-properties svg:height="30mm" fo:margin-top="5mm"/></style:footer-style>
-      </style:page-layout></office:automatic-styles><office:master-styles><style:master-page
-      style:name="Standard" style:page-layout-name="pm1"><style:header><text:p>head</text:p></style:header>
-      <style:footer><text:p>foot</text:p></style:footer></style:master-page></office:master-styles>
-      <office:body><office:text><table:table><table:table-column/><table:table-row><table:table-cell><text:p/>
-      </table:table-cell></table:table-row></table:table></office:text></office:body></office:document>)";
+      </style:page-layout>)",
+       .MasterStyles = R"(<style:master-page style:name="Standard" style:page-layout-name="pm1">
+      <style:header><text:p>head</text:p></style:header><style:footer><text:p>foot</text:p></style:footer>
+      </style:master-page>)",
+       .Body = FlatTable(1)});
+}
 
 /// A template, the picture that comes into its first cell, and the size which that has on the sheet.
 struct SheetCase {
@@ -186,7 +195,26 @@ TEST_F(APictureOnASheet, IsNoHigherThanThePage) {
 }
 
 TEST_F(APictureOnASheet, IsNoHigherThanAPageBetweenHeaderAndFooter) {
-  ExpectSizes({{OtherTemplate(PageWithHeaderAndFooter), Bmp(400, 3000), {25.70, 192.8}}});
+  ExpectSizes({{OtherTemplate(PageWithHeaderAndFooter()), Bmp(400, 3000), {25.70, 192.8}}});
+}
+
+TEST_F(APictureOnASheet, IsNoHigherThanARowOfExactHeight) {
+  const PictureSize own = {31.75, 42.33};
+  const PictureSize fitted = {14.27, 19.03};  // the row has 20 mm, the line needs a little below the picture
+  const PictureSize small = {15.88, 15.88};
+  const std::string exact = Rows(1, "exact");
+  ExpectSizes({{WordTemplate(exact), Bmp(120, 160), fitted},
+               {OldWordTemplate(exact), Bmp(120, 160), fitted},
+               {WordTemplate(exact), Bmp(60, 60), small},
+               {WordTemplate(Rows(1, "atLeast")), Bmp(120, 160), own},
+               {OldWordTemplate(Rows(1, "atLeast")), Bmp(120, 160), own}});
+}
+
+TEST_F(APictureOnASheet, MayTakeAllRowsOfAMergedCell) {
+  const PictureSize fitted = {29.27, 39.03};
+  ExpectSizes({{WordTemplate(Rows(2, "exact")), Bmp(120, 160), fitted},
+               {OldWordTemplate(Rows(2, "exact")), Bmp(120, 160), fitted},
+               {WordTemplate(Rows(2, "atLeast")), Bmp(120, 160), {31.75, 42.33}}});
 }
 
 TEST_F(APictureOnASheet, IsAsLargeAsItTells) {

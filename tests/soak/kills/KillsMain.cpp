@@ -8,6 +8,7 @@
 #include <map>
 #include <random>
 
+#include "tests/soak/Options.h"
 #include "tests/soak/kills/Life.h"
 #include "tests/support/TemporaryFolder.h"
 
@@ -34,26 +35,15 @@ Lie LieNamed(const std::string& name) {
   return lies.at(name);
 }
 
-/// Throws std::exception.
-Options ParseOptions(const std::vector<std::string>& arguments) {
+Options OptionsIn(int argc, char** argv) {
   Options options;
-  for (std::size_t i = 0; i < arguments.size(); i += 2) {
-    const std::string& value = arguments.at(i + 1);
-    if (arguments[i] == "--seconds") {
-      options.Seconds = std::stod(value);
-    } else if (arguments[i] == "--seed") {
-      options.Seed = static_cast<unsigned>(std::stoul(value));
-    } else if (arguments[i] == "--only") {
-      options.Only = value;
-    } else if (arguments[i] == "--lie") {
-      options.Lies = LieNamed(value);
-    } else {
-      throw std::invalid_argument(arguments[i]);
-    }
-  }
-  if (options.Seconds <= 0) {
-    throw std::invalid_argument("--seconds");
-  }
+  ReadOptions(
+      argc, argv,
+      {{"--seconds", [&](const std::string& value) { options.Seconds = std::stod(value); }},
+       {"--seed", [&](const std::string& value) { options.Seed = static_cast<unsigned>(std::stoul(value)); }},
+       {"--only", [&](const std::string& value) { options.Only = value; }},
+       {"--lie", [&](const std::string& value) { options.Lies = LieNamed(value); }}},
+      Usage, [&] { return options.Seconds > 0; });
   return options;
 }
 
@@ -150,12 +140,5 @@ class Soak {
 }  // namespace
 
 int main(int argc, char** argv) {
-  Options options;
-  try {
-    options = ParseOptions({argv + 1, argv + argc});
-  } catch (const std::exception&) {
-    std::fputs(Usage, stderr);
-    return 2;
-  }
-  return Soak(options).Run() ? 0 : 1;
+  return Soak(OptionsIn(argc, argv)).Run() ? 0 : 1;
 }

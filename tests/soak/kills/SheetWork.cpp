@@ -106,6 +106,7 @@ class SheetWork : public Work {
                            .Disk = desk.Disk,
                            .Boxes = desk.Boxes,
                            .WordApp = office,
+                           .UprightPicture = [](const std::string& photo) { return photo; },
                            .Progress = progress,
                            .UserDataFolder = folder,
                            .MissionName = MissionOf(number)};

@@ -6,6 +6,7 @@
 #include <optional>
 
 #include "app/Program.h"
+#include "tests/soak/Options.h"
 #include "tests/soak/operator/Field.h"
 #include "tests/soak/operator/RandomHand.h"
 #include "tests/soak/operator/Watchdog.h"
@@ -31,30 +32,18 @@ struct Options {
   std::string Stumble;
 };
 
-/// Throws std::exception.
-Options ParseOptions(const std::vector<std::string>& arguments) {
+Options OptionsIn(int argc, char** argv) {
   Options options;
-  for (std::size_t i = 0; i < arguments.size(); i += 2) {
-    const std::string& value = arguments.at(i + 1);
-    if (arguments[i] == "--seed") {
-      options.Seed = static_cast<unsigned>(std::stoul(value));
-    } else if (arguments[i] == "--commands") {
-      options.Commands = std::stoi(value);
-    } else if (arguments[i] == "--seconds") {
-      options.Seconds = std::stod(value);
-    } else if (arguments[i] == "--patience") {
-      options.Patience = std::chrono::seconds(std::stoi(value));
-    } else if (arguments[i] == "--folder") {
-      options.Folder = value;
-    } else if (arguments[i] == "--stumble") {
-      options.Stumble = value;
-    } else {
-      throw std::invalid_argument(arguments[i]);
-    }
-  }
-  if (options.Commands <= 0 || options.Folder.empty()) {
-    throw std::invalid_argument("");
-  }
+  ReadOptions(
+      argc, argv,
+      {{"--seed", [&](const std::string& value) { options.Seed = static_cast<unsigned>(std::stoul(value)); }},
+       {"--commands", [&](const std::string& value) { options.Commands = std::stoi(value); }},
+       {"--seconds", [&](const std::string& value) { options.Seconds = std::stod(value); }},
+       {"--patience",
+        [&](const std::string& value) { options.Patience = std::chrono::seconds(std::stoi(value)); }},
+       {"--folder", [&](const std::string& value) { options.Folder = value; }},
+       {"--stumble", [&](const std::string& value) { options.Stumble = value; }}},
+      Usage, [&] { return options.Commands > 0 && !options.Folder.empty(); });
   return options;
 }
 
@@ -206,13 +195,7 @@ int Run(const Options& options) {
 }  // namespace
 
 int main(int argc, char** argv) {
-  Options options;
-  try {
-    options = ParseOptions({argv + 1, argv + argc});
-  } catch (const std::exception&) {
-    std::fputs(Usage, stderr);
-    return 2;
-  }
+  const Options options = OptionsIn(argc, argv);
   for (const char* name : {"XDG_DATA_HOME", "XDG_CONFIG_HOME", "XDG_RUNTIME_DIR", "HOME", "TMPDIR"}) {
     qputenv(name, QByteArray::fromStdString(options.Folder.string()));
   }
