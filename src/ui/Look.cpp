@@ -24,6 +24,7 @@ ScoreListView, #DataList, #SoundList { border: 1px solid palette(mid); selection
 ScoreListView QHeaderView::section, #DataList QHeaderView::section, #SoundList QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid palette(mid);
   background: palette(button); color: palette(button-text); }
 #DataList QHeaderView::section { padding: 5px 3px; font-weight: bold; }
+#SoundList QHeaderView::section { padding: 5px 3px; }
 )";
 
 /// Some desktops with a dark palette leave the colour of placeholders black.
