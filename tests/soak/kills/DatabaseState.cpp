@@ -13,8 +13,10 @@
 
 namespace {
 
-/// Ten are kept. A kill can come between the making of a new one and the deletion of the oldest.
-constexpr int MostCopies = 11;
+/// Ten are kept. Each of several processes in a row can be killed between the making of its copy and the
+/// deletion of the oldest; the first one that lives on deletes what is too much.
+constexpr int MostDeathsInARow = 5;
+constexpr int MostCopies = 10 + MostDeathsInARow;
 
 using Connection = std::unique_ptr<sqlite3, decltype(&sqlite3_close)>;
 
