@@ -35,6 +35,8 @@ void ResultList::AddRow(const QStringList& cells, bool success, int most) {
   if (rowCount() > most) {
     removeRow(rowCount() - 1);
   }
-  setCurrentCell(0, 0);
+  // Current for the keyboard, but not selected: that would cover the tint.
+  setCurrentCell(0, 0, QItemSelectionModel::NoUpdate);
+  clearSelection();
   scrollToTop();
 }

@@ -13,6 +13,6 @@ class ResultList : public QTableWidget {
   /// Must be called before the first row is added. Column `widest` takes the room that is left.
   void SetCaptions(const QStringList& captions, int widest);
 
-  /// Adds a row at the top and makes it the current one. Keeps at most `most` rows.
+  /// Adds a row at the top and makes it the current one, but selects none. Keeps at most `most` rows.
   void AddRow(const QStringList& cells, bool success, int most);
 };

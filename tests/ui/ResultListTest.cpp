@@ -4,7 +4,7 @@
 
 namespace {
 
-TEST(ResultList, HasTheNewestRowAtTheTopAndChosen) {
+TEST(ResultList, HasTheNewestRowAtTheTopForTheKeyboard) {
   ResultList list;
   list.SetCaptions({QStringLiteral("No."), QStringLiteral("Result")}, 0);
   list.AddRow({QStringLiteral("1"), QStringLiteral("old")}, true, 9);
@@ -13,6 +13,7 @@ TEST(ResultList, HasTheNewestRowAtTheTopAndChosen) {
   EXPECT_EQ(list.item(0, 1)->text(), QStringLiteral("new"));
   EXPECT_EQ(list.item(1, 1)->text(), QStringLiteral("old"));
   EXPECT_EQ(list.currentRow(), 0);
+  EXPECT_TRUE(list.selectedItems().isEmpty());
 }
 
 TEST(ResultList, TintsFailures) {
