@@ -450,12 +450,12 @@ TEST_P(FirmwareWindow, IsDrivenByTheKeyboard) {
   Open();
   events.At(1s, [this] {
     EXPECT_TRUE(Find<QPushButton>(*window, "cmdBreak").hasFocus());
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::AltModifier);
+    Type(*window, Qt::Key_S, Qt::AltModifier);
   });
-  QTest::keyClick(window.get(), Qt::Key_D, Qt::AltModifier);
+  Type(*window, Qt::Key_D, Qt::AltModifier);
   ExpectBox("The device did not enter load mode.");
   EXPECT_TRUE(Find<QPushButton>(*window, "cmdDownload").hasFocus());
-  QTest::keyClick(window.get(), Qt::Key_O, Qt::AltModifier);
+  Type(*window, Qt::Key_O, Qt::AltModifier);
   EXPECT_EQ(dialog.Calls.size(), 1U);
 }
 
