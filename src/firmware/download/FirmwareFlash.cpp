@@ -51,7 +51,10 @@ FirmwareFlash::FirmwareFlash(const Parts& parts, QWidget* parent)
   FormLoad();
 }
 
-FirmwareFlash::~FirmwareFlash() = default;
+FirmwareFlash::~FirmwareFlash() {
+  // A window that is destroyed while it is shown takes the focus from its entry.
+  ui_->txtFileName->disconnect(this);
+}
 
 void FirmwareFlash::SetUpLook() {
   const QFont fixed = QFontDatabase::systemFont(QFontDatabase::FixedFont);

@@ -217,6 +217,13 @@ TEST_P(FirmwareWindow, KeepsANameThatWasTyped) {
   EXPECT_EQ(StoredPath(), "/fw/gun.qvm");
 }
 
+TEST_P(FirmwareWindow, CanBeDestroyedWhileItsNameIsBeingTyped) {
+  for (int window = 0; window < 10; ++window) {
+    Find<QLineEdit>(Open(), "txtFileName").setFocus();
+  }
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+}
+
 TEST_P(FirmwareWindow, ANameThatWasTypedOffersNoDownload) {
   Open("");
   auto& name = Find<QLineEdit>(*window, "txtFileName");
