@@ -218,7 +218,7 @@ TEST_P(FirmwareWindow, KeepsANameThatWasTyped) {
 }
 
 TEST_P(FirmwareWindow, CanBeDestroyedWhileItsNameIsBeingTyped) {
-  for (int window = 0; window < 10; ++window) {
+  for (int round = 0; round < 10; ++round) {
     Find<QLineEdit>(Open(), "txtFileName").setFocus();
   }
   EXPECT_THAT(boxes.Boxes, IsEmpty());
