@@ -62,6 +62,7 @@ void FirmwareFlash::SetUpLook() {
     digits->setFont(fixed);
   }
   ui_->lblCurrentBuffer->setMinimumWidth(QFontMetrics(fixed).horizontalAdvance(u'0') * LongestLine + 4);
+  ui_->lblDownloadBarFG->setBackgroundRole(QPalette::Highlight);
   ui_->Text1->setAccessibleName(Text(parts_.Strings, OwnText::DigitsLeft));
   ui_->lblConnect->setText(Text(parts_.Strings, OwnText::DeviceLamp));
   ui_->lblComplete->setText(Text(parts_.Strings, OwnText::TransferLamp));

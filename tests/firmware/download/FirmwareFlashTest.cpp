@@ -6,6 +6,7 @@
 #include <QImage>
 #include <QLabel>
 #include <QLineEdit>
+#include <cstdlib>
 #include <memory>
 #include <string>
 
@@ -503,6 +504,10 @@ TEST_P(FirmwareWindow, KeepsItsBarAtTheSameShareWhenItIsResized) {
     QCoreApplication::processEvents();
     EXPECT_NEAR(Bar(), 0.25, 0.002);
   }
+  const QImage picture = bar.grab().toImage();
+  const QColor filled = picture.pixelColor(picture.width() / 8, picture.height() / 2);
+  const QColor empty = picture.pixelColor(picture.width() / 2, picture.height() / 2);
+  EXPECT_GT(std::abs(filled.lightness() - empty.lightness()), 30);
   bar.SetShare(1.5);
   EXPECT_EQ(Bar(), 1);
 }
