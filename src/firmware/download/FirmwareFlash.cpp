@@ -51,7 +51,10 @@ FirmwareFlash::FirmwareFlash(const Parts& parts, QWidget* parent)
   FormLoad();
 }
 
-FirmwareFlash::~FirmwareFlash() = default;
+FirmwareFlash::~FirmwareFlash() {
+  // A window that is destroyed while it is shown takes the focus from its entry.
+  ui_->txtFileName->disconnect(this);
+}
 
 void FirmwareFlash::SetUpLook() {
   const QFont fixed = QFontDatabase::systemFont(QFontDatabase::FixedFont);
@@ -59,6 +62,7 @@ void FirmwareFlash::SetUpLook() {
     digits->setFont(fixed);
   }
   ui_->lblCurrentBuffer->setMinimumWidth(QFontMetrics(fixed).horizontalAdvance(u'0') * LongestLine + 4);
+  ui_->lblDownloadBarFG->setBackgroundRole(QPalette::Highlight);
   ui_->Text1->setAccessibleName(Text(parts_.Strings, OwnText::DigitsLeft));
   ui_->lblConnect->setText(Text(parts_.Strings, OwnText::DeviceLamp));
   ui_->lblComplete->setText(Text(parts_.Strings, OwnText::TransferLamp));

@@ -6,6 +6,7 @@
 #include <QImage>
 #include <QLabel>
 #include <QLineEdit>
+#include <cstdlib>
 #include <memory>
 #include <string>
 
@@ -215,6 +216,13 @@ TEST_P(FirmwareWindow, KeepsANameThatWasTyped) {
               HasSubstr(GetParam() == Language::English ? "QVM file: 2" : "QVM 文件：2"));
   window->close();
   EXPECT_EQ(StoredPath(), "/fw/gun.qvm");
+}
+
+TEST_P(FirmwareWindow, CanBeDestroyedWhileItsNameIsBeingTyped) {
+  for (int round = 0; round < 10; ++round) {
+    Find<QLineEdit>(Open(), "txtFileName").setFocus();
+  }
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
 }
 
 TEST_P(FirmwareWindow, ANameThatWasTypedOffersNoDownload) {
@@ -450,13 +458,15 @@ TEST_P(FirmwareWindow, IsDrivenByTheKeyboard) {
   Open();
   events.At(1s, [this] {
     EXPECT_TRUE(Find<QPushButton>(*window, "cmdBreak").hasFocus());
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::AltModifier);
+    Type(*window, Qt::Key_Space);
   });
-  QTest::keyClick(window.get(), Qt::Key_D, Qt::AltModifier);
+  // A button that is pressed by its Alt key stays down for a moment first.
+  Type(*window, Qt::Key_D, Qt::AltModifier);
+  EXPECT_TRUE(QTest::qWaitFor([this] { return !boxes.Boxes.empty(); }));
   ExpectBox("The device did not enter load mode.");
   EXPECT_TRUE(Find<QPushButton>(*window, "cmdDownload").hasFocus());
-  QTest::keyClick(window.get(), Qt::Key_O, Qt::AltModifier);
-  EXPECT_EQ(dialog.Calls.size(), 1U);
+  Type(*window, Qt::Key_O, Qt::AltModifier);
+  EXPECT_TRUE(QTest::qWaitFor([this] { return dialog.Calls.size() == 1; }));
 }
 
 TEST_P(FirmwareWindow, NamesItsLampsAndNothingElseSo) {
@@ -494,6 +504,10 @@ TEST_P(FirmwareWindow, KeepsItsBarAtTheSameShareWhenItIsResized) {
     QCoreApplication::processEvents();
     EXPECT_NEAR(Bar(), 0.25, 0.002);
   }
+  const QImage picture = bar.grab().toImage();
+  const QColor filled = picture.pixelColor(picture.width() / 8, picture.height() / 2);
+  const QColor empty = picture.pixelColor(picture.width() / 2, picture.height() / 2);
+  EXPECT_GT(std::abs(filled.lightness() - empty.lightness()), 30);
   bar.SetShare(1.5);
   EXPECT_EQ(Bar(), 1);
 }
