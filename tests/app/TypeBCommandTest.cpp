@@ -53,6 +53,7 @@ TEST_P(TypeBCommand, IsGivenByNoMenuItem) {
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Languages, TypeBCommand, testing::Values(Language::English, Language::SimplifiedChinese));
+INSTANTIATE_TEST_SUITE_P(Languages, TypeBCommand,
+                         testing::Values(Language::English, Language::SimplifiedChinese));
 
 }  // namespace
