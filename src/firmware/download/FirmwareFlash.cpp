@@ -69,7 +69,7 @@ void FirmwareFlash::SetUpLook() {
 }
 
 void FirmwareFlash::FormLoad() {
-  SetBar(0);
+  FirmwareFlash::SetBar(0);  // this class's own, since it is under construction
   try {
     ReadSettings();
     ui_->cmdDownload->setEnabled(parts_.Disk.FileExists(ui_->txtFileName->text().toStdString()));
