@@ -80,7 +80,8 @@ function CheckWithinProgram(file, target, from, to,    part) {
     return
   }
   part = Best(to, parts, partCount)
-  if (part && !Matches(from, Root(parts[part])) && index(partUsers[part], " " FloorName(from) " ") == 0) {
+  if (part && !Matches(from, Root(parts[part])) && index(partUsers[part], " " FloorName(from) " ") == 0 &&
+      !Excepted(from, to)) {
     Fault(file ": " FloorName(from) " knows no real part of the platform: " target)
   }
   if (FloorName(from) != "subject" || FloorName(to) != "subject" || Subject(from) == Subject(to)) return

@@ -9,7 +9,7 @@
 namespace sim {
 
 /// What the number given with a failure counts, from 1. None: the failure ignores it.
-enum class FailurePlace { None, Frame, Byte, Bit, Gun };
+enum class FailurePlace { None, Frame, Byte, Bit, Gun, Answer, Page, Row };
 
 /// A row of a device's table of failures. Each device has its own enumeration `Kind`, in which 0 is the
 /// faultless device, and a table that has every failure once, in the order of the enumeration.

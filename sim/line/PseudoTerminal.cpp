@@ -3,6 +3,7 @@
 #include <fcntl.h>
 #include <poll.h>
 #include <stdlib.h>
+#include <sys/eventfd.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -63,6 +64,10 @@ PseudoTerminal::PseudoTerminal(std::vector<LineSettings> understood, Pace pace)
   }
   wakeReader_ = FileDescriptor(wake[0]);
   wakeWriter_ = FileDescriptor(wake[1]);
+  nudges_ = FileDescriptor(::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK));
+  if (!nudges_.IsOpen()) {
+    ThrowSystemError("eventfd");
+  }
 }
 
 void PseudoTerminal::SetUnderstood(std::vector<LineSettings> understood) {
@@ -75,7 +80,7 @@ std::optional<std::uint8_t> PseudoTerminal::ReadByte(std::optional<std::chrono::
   if (timeout) {
     deadline = Clock::now() + *timeout;
   }
-  while (IsUp() && TakeArrivals()) {
+  while (IsUp() && !TakeNudge() && TakeArrivals()) {
     const Clock::time_point now = Clock::now();
     std::optional<Clock::time_point> wake = deadline;
     if (!arrivals_.empty()) {
@@ -148,6 +153,15 @@ void PseudoTerminal::Interrupt() {
   [[maybe_unused]] const ssize_t written = ::write(wakeWriter_.Get(), &wake, 1);
 }
 
+void PseudoTerminal::Nudge() {
+  ::eventfd_write(nudges_.Get(), 1);
+}
+
+bool PseudoTerminal::TakeNudge() {
+  eventfd_t count = 0;
+  return ::eventfd_read(nudges_.Get(), &count) == 0;
+}
+
 std::chrono::nanoseconds PseudoTerminal::DurationOf(std::size_t bytes) const {
   if (!IsPaced()) {
     return std::chrono::nanoseconds(0);
@@ -203,7 +217,10 @@ bool PseudoTerminal::WaitFor(short events, std::optional<std::chrono::nanosecond
       left.tv_sec = nanoseconds / std::nano::den;
       left.tv_nsec = nanoseconds % std::nano::den;
     }
-    std::array<pollfd, 2> watched{pollfd{master_.Get(), events, 0}, pollfd{wakeReader_.Get(), POLLIN, 0}};
+    // Only a read can be nudged.
+    const int nudges = (events & POLLIN) != 0 ? nudges_.Get() : -1;
+    std::array<pollfd, 3> watched{pollfd{master_.Get(), events, 0}, pollfd{wakeReader_.Get(), POLLIN, 0},
+                                  pollfd{nudges, POLLIN, 0}};
     const int ready = ::ppoll(watched.data(), watched.size(), timeout ? &left : nullptr, nullptr);
     if (ready > 0) {
       return watched[1].revents == 0;

@@ -22,7 +22,7 @@ enum class Pace { AsWired, Fast };
 
 /// A device's end of a serial line, 10 bits per byte. The other end is a slave device that a client opens by
 /// its path; the client may close and reopen it without breaking the line. For use by one thread; only
-/// Interrupt may be called from another.
+/// Interrupt and Nudge may be called from another.
 ///
 /// Bytes from a client whose settings are not among those understood never arrive. A real line would turn
 /// them into noise; with silence, nothing can pass for a request or a reply by chance, so such a client
@@ -62,8 +62,8 @@ class PseudoTerminal {
   /// Time that `bytes` bytes take on the line; 0 if it is not paced.
   std::chrono::nanoseconds DurationOf(std::size_t bytes) const;
 
-  /// The next byte from the client, once its last bit has arrived; none after `timeout` (if given), an
-  /// interruption or the end of the line. Bytes that the client wrote together follow each other without a
+  /// The next byte from the client, once its last bit has arrived; none after `timeout` (if given), a nudge,
+  /// an interruption or the end of the line. Bytes that the client wrote together follow each other without a
   /// gap, however late they are read.
   std::optional<std::uint8_t> ReadByte(std::optional<std::chrono::nanoseconds> timeout = std::nullopt);
 
@@ -90,6 +90,9 @@ class PseudoTerminal {
   /// Makes the current wait and all later ones return at once.
   void Interrupt();
 
+  /// Makes the current ReadByte, or else the next one, return at once without a byte.
+  void Nudge();
+
  private:
   struct Arrival {
     std::uint8_t Byte;
@@ -98,6 +101,7 @@ class PseudoTerminal {
 
   bool IsPaced() const { return pace_ == Pace::AsWired; }
   bool TakeArrivals();
+  bool TakeNudge();
   bool Understands(std::span<const std::uint8_t> bytes);
   bool WaitFor(short events, std::optional<std::chrono::nanoseconds> timeout);
   std::size_t WriteAtOnce(std::span<const std::uint8_t> bytes);
@@ -106,6 +110,7 @@ class PseudoTerminal {
   FileDescriptor slave_;
   FileDescriptor wakeReader_;
   FileDescriptor wakeWriter_;
+  FileDescriptor nudges_;
   std::string slavePath_;
   std::vector<LineSettings> understood_;
   LineSettings current_;

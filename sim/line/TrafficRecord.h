@@ -15,6 +15,14 @@ class TrafficRecord {
     return traffic_;
   }
 
+  /// Calls `look` with the record and returns what it returns, for records that are too large to copy each
+  /// time.
+  template <class Look>
+  auto Ask(Look look) const {
+    const std::scoped_lock lock(mutex_);
+    return look(traffic_);
+  }
+
   /// Calls `change` with the record, and wakes all who wait.
   template <class Change>
   void Note(Change change) {

@@ -1,6 +1,9 @@
 #include "sim/onewire/OneWireAdapter.h"
 
+#include <algorithm>
+#include <array>
 #include <stdexcept>
+#include <utility>
 
 namespace sim {
 namespace {
@@ -21,8 +24,26 @@ OneWireAdapterSettings Checked(OneWireAdapterSettings settings) {
   return settings;
 }
 
-OneWireBusSettings BusOf(const OneWireAdapterSettings& settings) {
+MemoryTroubleSettings TroubleOf(const OneWireAdapterSettings& settings) {
+  using Kind = MemoryTroubleSettings::Kind;
+  constexpr std::array<std::pair<OneWireFailure, Kind>, 6> kinds{{
+      {OneWireFailure::RemovedInRead, Kind::RemovedInRead},
+      {OneWireFailure::RemovedInWrite, Kind::RemovedInWrite},
+      {OneWireFailure::TornCopy, Kind::TornCopy},
+      {OneWireFailure::DisturbedRead, Kind::DisturbedRead},
+      {OneWireFailure::DisturbedWrite, Kind::DisturbedWrite},
+      {OneWireFailure::WriteProtected, Kind::WriteProtected},
+  }};
+  const auto* found = std::find_if(kinds.begin(), kinds.end(),
+                                   [&](const auto& kind) { return kind.first == settings.Failure; });
+  return {.What = found == kinds.end() ? Kind::None : found->second, .Place = settings.FailurePlace};
+}
+
+OneWireBusSettings BusOf(const OneWireAdapterSettings& settings,
+                         std::function<void(const std::string&)> tell) {
   OneWireBusSettings bus;
+  bus.Trouble = TroubleOf(settings);
+  bus.Tell = std::move(tell);
   if (settings.Failure != OneWireFailure::NoOwnDevice) {
     bus.OwnDevice = MakeRomId(IdentityFamily, IdentitySerial);
   }
@@ -50,7 +71,7 @@ OneWireAdapter::OneWireAdapter(OneWireAdapterSettings settings)
               .LinePace = settings.LinePace,
               .Log = settings.Log}),
       settings_(Checked(settings)),
-      bus_(BusOf(settings_)),
+      bus_(BusOf(settings_, [this](const std::string& what) { Log().Note(what); })),
       chip_(bus_) {}
 
 void OneWireAdapter::Touch(const RomId& rom) {
@@ -72,6 +93,28 @@ bool OneWireAdapter::Leave(const RomId& rom) {
 void OneWireAdapter::LeaveAll() {
   const std::scoped_lock lock(busMutex_);
   bus_.LeaveAll();
+}
+
+void OneWireAdapter::Fill(const RomId& rom, ButtonContent content) {
+  const std::scoped_lock lock(busMutex_);
+  const ChargeBlock block = MakeChargeBlock(content, rom);
+  std::copy(block.begin(), block.end(), BlockIn(rom).begin());
+}
+
+ChargeBlock OneWireAdapter::BlockOf(const RomId& rom) {
+  const std::scoped_lock lock(busMutex_);
+  const std::span<const std::uint8_t> bytes = BlockIn(rom);
+  ChargeBlock block{};
+  std::copy(bytes.begin(), bytes.end(), block.begin());
+  return block;
+}
+
+std::span<std::uint8_t> OneWireAdapter::BlockIn(const RomId& rom) {
+  MemoryButton* memory = bus_.MemoryOf(rom);
+  if (memory == nullptr) {
+    throw std::invalid_argument("A button of another family than 06 and 08 has no memory: " + RomIdText(rom));
+  }
+  return std::span(memory->Memory()).subspan(ChargeBlockAddress, ChargeBlock().size());
 }
 
 void OneWireAdapter::Run() {

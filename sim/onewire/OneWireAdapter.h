@@ -5,9 +5,11 @@
 #include <mutex>
 #include <optional>
 #include <ostream>
+#include <span>
 #include <vector>
 
 #include "sim/line/Device.h"
+#include "sim/onewire/ButtonContent.h"
 #include "sim/onewire/Ds2480b.h"
 #include "sim/onewire/OneWireBus.h"
 #include "sim/onewire/OneWireFailure.h"
@@ -21,7 +23,7 @@ struct OneWireAdapterSettings {
   std::ostream* Log = nullptr;  ///< receives the traffic in both directions
 };
 
-/// The reader of membership buttons at the operator's desk: a DS2480B on a serial line that starts at 9600
+/// The reader of buttons at the operator's desk: a DS2480B on a serial line that starts at 9600
 /// baud, with an identity device of its own on the bus. It is powered up once, at construction: a host that
 /// goes away and comes back finds the chip as it left it. It serves until its line is pulled out or it is
 /// destroyed. It receives and sends in turn, so a block takes up to twice as long as on a real line.
@@ -37,12 +39,19 @@ class OneWireAdapter : public Device {
   bool Leave(const RomId& rom);
   void LeaveAll();
 
+  /// Gives a button, at the reader or not, new content. Throws std::invalid_argument, with a text for the
+  /// user, if buttons of its family have no memory.
+  void Fill(const RomId& rom, ButtonContent content);
+  /// What lies at ChargeBlockAddress in the button's memory; throws like Fill.
+  ChargeBlock BlockOf(const RomId& rom);
+
  private:
   void Run();
   std::optional<std::uint8_t> AnswerTo(std::uint8_t byte);
   bool Send(std::uint8_t answer);
   bool Fails(OneWireFailure failure) const { return settings_.Failure == failure; }
   std::vector<RomId> OnTheBus(const RomId& rom) const;
+  std::span<std::uint8_t> BlockIn(const RomId& rom);
 
   OneWireAdapterSettings settings_;
   std::size_t answers_ = 0;

@@ -1,10 +1,21 @@
 #include "sim/onewire/OneWireBus.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace sim {
+namespace {
 
-OneWireBus::OneWireBus(OneWireBusSettings settings) : settings_(settings) {
+std::size_t MemoryBytes(std::uint8_t family) {
+  constexpr std::uint8_t large = 0x06;
+  constexpr std::uint8_t small = 0x08;
+  return family == large ? 512 : family == small ? 128 : 0;
+}
+
+}  // namespace
+
+OneWireBus::OneWireBus(OneWireBusSettings settings)
+    : settings_(std::move(settings)), trouble_(settings_.Trouble) {
   if (settings_.OwnDevice) {
     own_.emplace(*settings_.OwnDevice);
   }
@@ -39,13 +50,14 @@ bool OneWireBus::Slot(bool level) {
       button.LoseContact();
     }
   }
+  std::erase_if(buttons_, [](OneWireDevice& button) { return button.TakeRemoval(); });
   return heard;
 }
 
 void OneWireBus::Touch(const RomId& rom) {
   if (std::none_of(buttons_.begin(), buttons_.end(),
                    [&](const OneWireDevice& button) { return button.Rom() == rom; })) {
-    buttons_.emplace_back(rom);
+    buttons_.emplace_back(rom, MemoryOf(rom));
   }
 }
 
@@ -55,6 +67,19 @@ bool OneWireBus::Leave(const RomId& rom) {
 
 void OneWireBus::LeaveAll() {
   buttons_.clear();
+}
+
+MemoryButton* OneWireBus::MemoryOf(const RomId& rom) {
+  const std::size_t bytes = MemoryBytes(rom[0]);
+  if (bytes == 0) {
+    return nullptr;
+  }
+  const auto tell = [this, rom](const std::string& what) {
+    if (settings_.Tell) {
+      settings_.Tell("button " + RomIdText(rom) + ' ' + what);
+    }
+  };
+  return &memories_.try_emplace(rom, bytes, trouble_, tell).first->second;
 }
 
 }  // namespace sim

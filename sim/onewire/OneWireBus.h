@@ -1,9 +1,14 @@
 #pragma once
 
 #include <cstddef>
+#include <functional>
+#include <map>
 #include <optional>
+#include <string>
 #include <vector>
 
+#include "sim/onewire/MemoryButton.h"
+#include "sim/onewire/MemoryTrouble.h"
 #include "sim/onewire/OneWireDevice.h"
 
 namespace sim {
@@ -13,6 +18,8 @@ struct OneWireBusSettings {
   bool Shorted = false;              ///< data line shorted to ground
   /// Buttons lose contact after this many bits of a ROM number, 1 to 64, until the next reset pulse.
   std::optional<std::size_t> ContactLostAfterBits{};
+  MemoryTroubleSettings Trouble{};
+  std::function<void(const std::string&)> Tell{};  ///< told what the memories of buttons do, in words
 };
 
 /// The data line with everything connected to it. It is high only while nobody pulls it low.
@@ -21,6 +28,8 @@ class OneWireBus {
   enum class Presence { Shorted, Present, Absent };
 
   explicit OneWireBus(OneWireBusSettings settings = {});
+  OneWireBus(const OneWireBus&) = delete;
+  OneWireBus& operator=(const OneWireBus&) = delete;
 
   /// Sends a reset pulse and returns what responds.
   Presence Reset();
@@ -34,10 +43,16 @@ class OneWireBus {
   bool Leave(const RomId& rom);
   void LeaveAll();
 
+  /// The memory of a button, at the reader or not: 512 bytes in family 0x06, 128 in family 0x08. nullptr for
+  /// other families.
+  MemoryButton* MemoryOf(const RomId& rom);
+
  private:
   OneWireBusSettings settings_;
   std::optional<OneWireDevice> own_;
   std::vector<OneWireDevice> buttons_;
+  MemoryTrouble trouble_;
+  std::map<RomId, MemoryButton> memories_;
 };
 
 }  // namespace sim

@@ -16,6 +16,9 @@ void OneWireDevice::Reset() {
   bit_ = 0;
   command_ = 0;
   romBitsGiven_ = 0;
+  if (memory_ != nullptr) {
+    memory_->Reset();
+  }
 }
 
 bool OneWireDevice::Releases() const {
@@ -25,11 +28,12 @@ bool OneWireDevice::Releases() const {
       return RomBit();
     case State::SearchComplement:
       return !RomBit();
+    case State::Selected:
+      return memory_ == nullptr || memory_->Releases();
     case State::Deaf:
     case State::Command:
     case State::SearchSelect:
     case State::Match:
-    case State::Selected:
       break;
   }
   return true;
@@ -38,7 +42,11 @@ bool OneWireDevice::Releases() const {
 void OneWireDevice::Slot(bool level) {
   switch (state_) {
     case State::Deaf:
+      break;
     case State::Selected:
+      if (memory_ != nullptr) {
+        memory_->Slot(level);
+      }
       break;
     case State::Command:
       command_ |= (level ? 1U : 0U) << bit_;

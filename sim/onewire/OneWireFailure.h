@@ -6,7 +6,7 @@
 
 namespace sim {
 
-/// What can go wrong at the reader of membership buttons.
+/// What can go wrong at the reader of buttons.
 enum class OneWireFailure {
   None,
   Silence,
@@ -19,12 +19,18 @@ enum class OneWireFailure {
   TornWrites,
   TwoButtons,
   NoOwnDevice,
+  RemovedInRead,
+  RemovedInWrite,
+  TornCopy,
+  DisturbedRead,
+  DisturbedWrite,
+  WriteProtected,
 };
 
 using OneWireFailureInfo = FailureInfo<OneWireFailure>;
 
-/// Answer bytes are counted from the adapter's start.
-inline constexpr std::array<OneWireFailureInfo, 11> OneWireFailures{{
+/// Bytes are counted from the adapter's start.
+inline constexpr std::array<OneWireFailureInfo, 17> OneWireFailures{{
     {OneWireFailure::None, "none", FailurePlace::None, "a faultless adapter"},
     {OneWireFailure::Silence, "silence", FailurePlace::Byte, "answer byte K and all behind it stay away"},
     {OneWireFailure::NoDetection, "no-detection", FailurePlace::None,
@@ -45,6 +51,18 @@ inline constexpr std::array<OneWireFailureInfo, 11> OneWireFailures{{
      "a second button comes and goes with each"},
     {OneWireFailure::NoOwnDevice, "no-own-device", FailurePlace::None,
      "an adapter without an identity of its own"},
+    {OneWireFailure::RemovedInRead, "removed-in-read", FailurePlace::Byte,
+     "a button leaves behind byte K that is read from a memory"},
+    {OneWireFailure::RemovedInWrite, "removed-in-write", FailurePlace::Byte,
+     "a button leaves behind byte K of the scratchpad commands (of 43 in a block)"},
+    {OneWireFailure::TornCopy, "torn-copy", FailurePlace::Byte,
+     "a button leaves when K bytes of a block have got into its memory"},
+    {OneWireFailure::DisturbedRead, "disturbed-read", FailurePlace::Byte,
+     "byte K that is read from a memory is wrong on the bus"},
+    {OneWireFailure::DisturbedWrite, "disturbed-write", FailurePlace::Byte,
+     "byte K of the scratchpad commands is wrong on the bus"},
+    {OneWireFailure::WriteProtected, "write-protected", FailurePlace::None,
+     "no button takes a block into its memory"},
 }};
 static_assert(IsInOrder(OneWireFailures));
 

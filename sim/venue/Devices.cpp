@@ -3,7 +3,8 @@
 namespace sim {
 
 const std::vector<DeviceEntry>& Devices() {
-  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(), RadioEntry()};
+  static const std::vector<DeviceEntry> devices{BaseUnitEntry(), OneWireEntry(),  RadioEntry(), BoxEntry(),
+                                                BootCodeEntry(), RecorderEntry(), Pic24fEntry()};
   return devices;
 }
 

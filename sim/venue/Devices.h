@@ -7,8 +7,12 @@
 namespace sim {
 
 DeviceEntry BaseUnitEntry();
+DeviceEntry BootCodeEntry();
+DeviceEntry BoxEntry();
 DeviceEntry OneWireEntry();
+DeviceEntry Pic24fEntry();
 DeviceEntry RadioEntry();
+DeviceEntry RecorderEntry();
 
 /// All devices of the venue, in output order.
 const std::vector<DeviceEntry>& Devices();

@@ -20,14 +20,18 @@ StartedDevice Start(const DeviceStart& start) {
 DeviceEntry OneWireEntry() {
   return {.Name = "onewire",
           .Title = "1-wire adapter",
-          .Purpose = "the reader of membership buttons, with the commands below",
+          .Purpose = "the reader of buttons, with the commands below",
           .Failures = FailureRows(OneWireFailures),
           .NoSuchFailure = "The 1-wire adapter has no failure",
           .PlaceMeaning = "the byte or bit that the failure affects, counted from 1 (1)",
           .Commands = {{"touch ID",
                         "hold a button to the reader: 16 hexadecimal digits, CRC first, family code last"},
                        {"leave ID", "take that button away"},
-                       {"leave", "take all buttons away"}},
+                       {"leave", "take all buttons away"},
+                       {"fill ID CONTENT",
+                        "give a button of family 06 or 08 an ammo-mag, bandage, blank, zeros, wrong-check or "
+                        "unknown-kind"},
+                       {"show ID", "print the charge block in the memory of a button"}},
           .Start = Start};
 }
 

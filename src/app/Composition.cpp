@@ -51,15 +51,22 @@ Composition::Composition()
           .Databases = databases_,
           .Old = old_,
           .Events = events_,
+          .Elapsed = events_,
           .CommonDialog1 = fileDialog_,
           .Disk = files_,
           .Places = folders_,
           .Boxes = boxes_,
+          .OtherPrograms = otherPrograms_,
           .Devices = devices_,
           .MSComm1 = loggedPort_,
           .WordProcessor = wordProcessor_,
           .UprightPicture = UprightPicture,
-          .ButtonSwipe = [this] { return SwipeButton(); }};
+          .Awake = awake_,
+          .SoundPort = loggedSoundPort_,
+          .SoundPlayer = soundPlayer_,
+          .SoundConverter = soundConverter_,
+          .ButtonSwipe = [this] { return SwipeButton(); },
+          .Wire = &wire_};
 }
 
 std::string Composition::SwipeButton() {

@@ -11,6 +11,8 @@
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxFiles.h"
+#include "platform/linux/LinuxPrograms.h"
+#include "platform/qt/DBusWakeLock.h"
 #include "platform/qt/QtClock.h"
 #include "platform/qt/QtEventPump.h"
 #include "platform/qt/QtFileDialog.h"
@@ -18,6 +20,8 @@
 #include "platform/qt/QtMessageBoxes.h"
 #include "platform/qt/QtSerialDevices.h"
 #include "platform/qt/QtSerialPort.h"
+#include "platform/qt/QtSoundPlayer.h"
+#include "platform/sndfile/SndfileConverter.h"
 #include "platform/sqlite/SqliteDatabase.h"
 #include "ui/DialogParent.h"
 
@@ -50,6 +54,7 @@ class Composition {
   ProgramLog log_;
   QtMessageBoxes shownBoxes_{[this] { return parent_.Window(); }};
   LoggedBoxes boxes_{shownBoxes_, log_};
+  LinuxPrograms otherPrograms_;
   QtSerialDevices devices_;
   const std::string logFolder_;
   QtSerialPort port_;
@@ -69,4 +74,16 @@ class Composition {
   IniReader readerSettings_;
   SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
+  DBusWakeLock awake_;
+  QtSerialPort soundPort_;
+  LoggedPort loggedSoundPort_{soundPort_,
+                              {.Disk = files_,
+                               .Folder = logFolder_,
+                               .Elapsed = events_,
+                               .Time = clock_,
+                               .OnOpening = [this](const std::string& device, const std::string& settings,
+                                                   int fault) { log_.PortOpening(device, settings, fault); }},
+                              "sound-recorder"};
+  QtSoundPlayer soundPlayer_;
+  SndfileConverter soundConverter_;
 };

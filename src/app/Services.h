@@ -11,9 +11,15 @@
 #include "platform/Files.h"
 #include "platform/Folders.h"
 #include "platform/MessageBoxes.h"
+#include "platform/MonotonicClock.h"
 #include "platform/OldDatabases.h"
+#include "platform/OneWire.h"
+#include "platform/Programs.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
+#include "platform/SoundConverter.h"
+#include "platform/SoundPlayer.h"
+#include "platform/WakeLock.h"
 #include "platform/WordProcessor.h"
 
 /// The platform services that the main window uses; they must outlive it.
@@ -23,15 +29,23 @@ struct Services {
   DatabaseEngine& Databases;
   OldDatabases& Old;
   EventPump& Events;
+  const MonotonicClock& Elapsed;
   FileDialog& CommonDialog1;
   Files& Disk;
   const Folders& Places;
   MessageBoxes& Boxes;
+  Programs& OtherPrograms;
   const SerialDevices& Devices;
   SerialPort& MSComm1;
   ::WordProcessor& WordProcessor;
   /// Turns a picture file as the camera noted in it.
   std::function<std::string(const std::string& bytes)> UprightPicture;
+  WakeLock& Awake;
+  SerialPort& SoundPort;  ///< the sound recorder's own, on the device of the settings
+  ::SoundPlayer& SoundPlayer;
+  const ::SoundConverter& SoundConverter;
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
+  /// The bus behind the reader; null if there is none.
+  OneWire* Wire = nullptr;
 };

@@ -52,6 +52,7 @@ bool frmRx::FormLoad() {
   }
   session_.Factors() = ReadSoldieringFactors(*ini_);
   ui_->mnuCheckButton->setEnabled(services_.ButtonSwipe != nullptr);
+  ui_->mnuChargeiButton->setEnabled(services_.Wire != nullptr);
   ConnectCommands();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
@@ -99,7 +100,11 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuUnassignMember, &frmRx::UnassignMember},
                                {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
                                {ui_->mnuBonusPoints, &frmRx::EnterBonusPoints},
+                               {ui_->mnuFirmwareUpdate, &frmRx::UpdateFirmware},
                                {ui_->mnuRemoteManage, &frmRx::ManageRemotely},
+                               {ui_->mnuBoxConfig, &frmRx::ConfigureBoxes},
+                               {ui_->mnuChargeiButton, &frmRx::ChargeButtons},
+                               {ui_->mnuSoundRecorder, &frmRx::RecordSounds},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
   // menu.

@@ -14,6 +14,8 @@
 #include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
 #include "devices/baseunit/BaseUnitDownload.h"
+#include "devices/box/ProgrammedBoxes.h"
+#include "devices/charging/ChargedButtons.h"
 #include "sheets/PrintOptions.h"
 #include "ui/Commands.h"
 
@@ -34,6 +36,9 @@ class frmRx : public QMainWindow {
   /// Finds the user's data, opens the databases and fills the window, in the order that the operator sees.
   /// Throws RuntimeError if the program cannot continue; returns false if the operator chose to end it.
   bool FormLoad();
+
+  /// The firmware update of devices with a PIC24F boot loader. No menu item gives this command.
+  void UpdateTypeB();
 
  protected:
   void closeEvent(QCloseEvent* event) override;
@@ -72,7 +77,11 @@ class frmRx : public QMainWindow {
   void ShowAdminData();
   void EnterMissionResults();
   void SetUpMissions();
+  void UpdateFirmware();
   void ManageRemotely();
+  void ConfigureBoxes();
+  void ChargeButtons();
+  void RecordSounds();
 
   /// The context menu of the board, for the last of the selected rows.
   void ShowPopup(const QPoint& position);
@@ -91,6 +100,8 @@ class frmRx : public QMainWindow {
   std::optional<IniReader> ini_;
   std::optional<CommPort> commPort_;
   DownloadedGuns downloadedGuns_;
+  ProgrammedBoxes programmedBoxes_;
+  ChargedButtons chargedButtons_;
   bool downloading_ = false;                    ///< a score download is on the stack
   int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again

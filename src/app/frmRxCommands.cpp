@@ -19,7 +19,13 @@
 #include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 #include "devices/baseunit/BaseUnitDownload.h"
+#include "devices/box/BoxConfig.h"
+#include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
+#include "firmware/download/FirmwareFlash.h"
+#include "firmware/pic24f/PortNames.h"
+#include "firmware/pic24f/SerialPicBoot.h"
+#include "firmware/pic24f/frmBootload.h"
 #include "members/MemberQueries.h"
 #include "members/Members.h"
 #include "missions/Scenarios.h"
@@ -27,6 +33,7 @@
 #include "settings/SoldieringCalc.h"
 #include "sheets/ScoreSheets.h"
 #include "sheets/SheetProgressWindow.h"
+#include "sound/ISD_rec.h"
 #include "ui/WaitCursor.h"
 #include "ui_frmRx.h"
 
@@ -197,6 +204,24 @@ void frmRx::SetUpMissions() {
   session_.FillMissionList();
 }
 
+void frmRx::UpdateFirmware() {
+  commPort_->CloseIfOpen();
+  FirmwareFlash({.MSComm1 = services_.MSComm1,
+                 .Devices = services_.Devices,
+                 .Ini = *ini_,
+                 .Events = services_.Events,
+                 .Boxes = services_.Boxes,
+                 .Cd1 = services_.CommonDialog1,
+                 .Disk = services_.Disk,
+                 .Time = services_.Time,
+                 .Elapsed = services_.Elapsed,
+                 .Strings = services_.Strings,
+                 .Awake = services_.Awake,
+                 .LogFolder = userDataFolder_ + "/logs"},
+                this)
+      .exec();
+}
+
 void frmRx::ManageRemotely() {
   RemoteManage({.MSComm1 = services_.MSComm1,
                 .Port = *commPort_,
@@ -208,6 +233,74 @@ void frmRx::ManageRemotely() {
                this)
       .exec();
   session_.CalculateScores();
+}
+
+void frmRx::ConfigureBoxes() {
+  BoxConfig({.MSComm1 = services_.MSComm1,
+             .Port = *commPort_,
+             .Events = services_.Events,
+             .Boxes = services_.Boxes,
+             .Time = services_.Time,
+             .Strings = services_.Strings,
+             .Game = session_.Game(),
+             .Programmed = programmedBoxes_,
+             .Signals = {*ini_, &services_.SoundPlayer, services_.Strings}},
+            this)
+      .exec();
+}
+
+void frmRx::ChargeButtons() {
+  ChargeiButton({.Wire = *services_.Wire,
+                 .Events = services_.Events,
+                 .Boxes = services_.Boxes,
+                 .Time = services_.Time,
+                 .Strings = services_.Strings,
+                 .Charged = chargedButtons_,
+                 .Signals = {*ini_, &services_.SoundPlayer, services_.Strings}},
+                this)
+      .exec();
+}
+
+void frmRx::UpdateTypeB() {
+  commPort_->CloseIfOpen();
+  const CommPortSetting ports(*ini_, services_.Devices);
+  const auto makeLibrary = [&](std::function<bool()> stopped) {
+    return std::make_unique<SerialPicBoot>(SerialPicBoot::Parts{
+        .Port = services_.MSComm1,
+        .Events = services_.Events,
+        .DeviceOf = [&ports](const std::string& port) { return DeviceOfPort(port, ports); },
+        .Stopped = std::move(stopped)});
+  };
+  frmBootload({.MakeLibrary = makeLibrary,
+               .Disk = services_.Disk,
+               .Events = services_.Events,
+               .CommonDialog1 = services_.CommonDialog1,
+               .Boxes = services_.Boxes,
+               .OtherPrograms = services_.OtherPrograms,
+               .Ini = *ini_,
+               .Devices = services_.Devices,
+               .Strings = services_.Strings,
+               .Folder = {userDataFolder_, services_.Places.Program()}},
+              this)
+      .exec();
+}
+
+void frmRx::RecordSounds() {
+  ISD_rec({.MSComm1 = services_.SoundPort,
+           .Ini = *ini_,
+           .Devices = services_.Devices,
+           .Events = services_.Events,
+           .Elapsed = services_.Elapsed,
+           .Boxes = services_.Boxes,
+           .CD = services_.CommonDialog1,
+           .Disk = services_.Disk,
+           .Player = services_.SoundPlayer,
+           .Converter = services_.SoundConverter,
+           .Awake = services_.Awake,
+           .Strings = services_.Strings,
+           .ProgramFolder = services_.Places.Program()},
+          this)
+      .exec();
 }
 
 void frmRx::ShowPopup(const QPoint& position) {

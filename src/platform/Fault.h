@@ -23,6 +23,7 @@ inline constexpr int PermissionDenied = 70;
 inline constexpr int PathAccess = 75;
 inline constexpr int PathNotFound = 76;
 
+inline constexpr int ObjectNotSet = 91;
 inline constexpr int InvalidPattern = 93;
 inline constexpr int InvalidFileFormat = 321;
 inline constexpr int InvalidPropertyValue = 380;
@@ -83,6 +84,7 @@ inline constexpr NumberedText Texts[] = {
     {PermissionDenied, "Permission denied"},
     {PathAccess, "Path/File access error"},
     {PathNotFound, "Path not found"},
+    {ObjectNotSet, "Object variable or With block variable not set"},
     {InvalidPattern, "Invalid pattern string"},
     {InvalidFileFormat, "Invalid file format"},
     {InvalidPropertyValue, "Invalid property value"},

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
 #include <vector>
@@ -21,6 +22,9 @@ class Files {
 
   /// The whole file. Throws RuntimeError 53 when it does not exist, 75 when it cannot be read.
   virtual std::string Read(const std::string& path) const = 0;
+
+  /// Up to `count` bytes from `offset` on; fewer where the file ends. Throws as Read does.
+  virtual std::string ReadPart(const std::string& path, std::uint64_t offset, std::size_t count) const = 0;
 
   /// Writes the whole file atomically: a failure or a crash leaves the old file (or none). Durable on return.
   /// If the path is a symbolic link, its target is replaced. Throws RuntimeError 61 (disk full), 70, 75 or

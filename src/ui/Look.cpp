@@ -20,10 +20,11 @@ constexpr const char* StyleSheet = R"(
 #GetScores:focus, #RemoteManageButton:focus { border: 2px solid white; }
 #RemoteManageButton:disabled { background: #222a3d; border-color: #2c3650; color: #7d879b; }
 #centralwidget > #Label1, #centralwidget > #Label2 { font-weight: bold; }
-ScoreListView, #DataList { border: 1px solid palette(mid); selection-background-color: #2f6fd6; selection-color: white; }
-ScoreListView QHeaderView::section, #DataList QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid palette(mid);
+ScoreListView, #DataList, #SoundList { border: 1px solid palette(mid); selection-background-color: #2f6fd6; selection-color: white; }
+ScoreListView QHeaderView::section, #DataList QHeaderView::section, #SoundList QHeaderView::section { padding: 5px 8px; border: 0; border-bottom: 2px solid palette(mid);
   background: palette(button); color: palette(button-text); }
 #DataList QHeaderView::section { padding: 5px 3px; font-weight: bold; }
+#SoundList QHeaderView::section { padding: 5px 3px; }
 )";
 
 /// Some desktops with a dark palette leave the colour of placeholders black.

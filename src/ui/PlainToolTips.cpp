@@ -3,15 +3,44 @@
 #include <QApplication>
 #include <QEvent>
 #include <QLabel>
+#include <QScreen>
+
+namespace {
+
+/// The toolkit shows a plain text on one line, though it be wider than the screen. Reuses its label, and then
+/// sets it back to one line.
+void Wrap(QLabel& tip) {
+  const int most = tip.screen()->availableGeometry().width() / 2;
+  if (tip.width() > most) {
+    tip.setWordWrap(true);
+    tip.resize(most, tip.heightForWidth(most));
+  }
+}
+
+}  // namespace
 
 PlainToolTips::PlainToolTips() {
   qApp->installEventFilter(this);
 }
 
 bool PlainToolTips::eventFilter(QObject* watched, QEvent* event) {
-  // The toolkit polishes its label before it gives it the first text and measures that.
-  if (event->type() == QEvent::Polish && watched->inherits("QTipLabel")) {
-    static_cast<QLabel*>(watched)->setTextFormat(Qt::PlainText);
+  switch (event->type()) {
+    case QEvent::Polish:
+    case QEvent::Show:
+    case QEvent::Resize:
+      break;
+    default:
+      return false;
   }
-  return QObject::eventFilter(watched, event);
+  if (!watched->inherits("QTipLabel")) {
+    return false;
+  }
+  auto& tip = *static_cast<QLabel*>(watched);
+  if (event->type() == QEvent::Polish) {
+    // The toolkit polishes its label before it gives it the first text and measures that.
+    tip.setTextFormat(Qt::PlainText);
+  } else {
+    Wrap(tip);
+  }
+  return false;
 }

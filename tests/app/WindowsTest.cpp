@@ -6,12 +6,16 @@
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
 #include "board/PlayerDetails.h"
+#include "devices/box/BoxConfig.h"
+#include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
+#include "firmware/download/FirmwareFlash.h"
 #include "members/Members.h"
 #include "missions/MissionNameEntry.h"
 #include "missions/Scenarios.h"
 #include "settings/Settings.h"
 #include "settings/SoldieringCalc.h"
+#include "sound/ISD_rec.h"
 #include "tests/support/CaredFor.h"
 #include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
@@ -69,7 +73,11 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<Scenarios>("mnuSetupMissions");
+  LookAt<FirmwareFlash>("mnuFirmwareUpdate");
   LookAt<RemoteManage>("mnuRemoteManage");
+  LookAt<BoxConfig>("mnuBoxConfig");
+  LookAt<ChargeiButton>("mnuChargeiButton");
+  LookAt<ISD_rec>("mnuSoundRecorder");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <map>
 #include <set>
@@ -95,6 +96,11 @@ class FakeFiles : public Files {
       throw RuntimeError(FolderExists(path) ? 75 : 53);
     }
     return file->second;
+  }
+
+  std::string ReadPart(const std::string& path, std::uint64_t offset, std::size_t count) const override {
+    const std::string bytes = Read(path);
+    return offset < bytes.size() ? bytes.substr(static_cast<std::size_t>(offset), count) : std::string();
   }
 
   void Replace(const std::string& path, const std::string& bytes) override {

@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "sim/radio/RadioGun.h"
+#include "tests/support/JoinedBytes.h"
 #include "tests/support/RawHost.h"
 
 namespace sim {
@@ -78,11 +79,6 @@ inline const Bytes CloseBlue0{0x7E, 0x00, 0x11, 0x00, 0x00, 0x00, 0x13, 0xA2, 0x
                               0xC0, 0x40, 0x00, 0x01, 0x40, 0x00, 0x00, 0x04, 0x03, 0x44};
 inline const Bytes ClosedBlue0{0x7E, 0x00, 0x11, 0x80, 0x00, 0x13, 0xA2, 0x00, 0x40, 0x7E, 0xC0,
                                0x40, 0x28, 0x00, 0x01, 0x40, 0x00, 0x00, 0x05, 0x03, 0x9B};
-
-inline Bytes operator+(Bytes left, const Bytes& right) {
-  left.insert(left.end(), right.begin(), right.end());
-  return left;
-}
 
 /// `frame` with another byte at `place`.
 inline Bytes With(Bytes frame, std::size_t place, std::uint8_t byte) {

@@ -19,8 +19,13 @@
 #include "platform/qt/UprightPicture.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
+#include "tests/fakes/FakeOneWire.h"
+#include "tests/fakes/FakePrograms.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
+#include "tests/fakes/FakeSoundConverter.h"
+#include "tests/fakes/FakeSoundPlayer.h"
+#include "tests/fakes/FakeWakeLock.h"
 #include "tests/fakes/FakeWordProcessor.h"
 #include "tests/support/Controls.h"
 #include "tests/support/DataSite.h"
@@ -49,15 +54,22 @@ class Venue : public DataSite {
                                                 .Databases = Databases,
                                                 .Old = Old,
                                                 .Events = *events,
+                                                .Elapsed = Events,
                                                 .CommonDialog1 = Dialog,
                                                 .Disk = Disk,
                                                 .Places = Places,
                                                 .Boxes = Boxes,
+                                                .OtherPrograms = Started,
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
                                                 .WordProcessor = Word,
                                                 .UprightPicture = UprightPicture,
-                                                .ButtonSwipe = ButtonSwipe});
+                                                .Awake = Awake,
+                                                .SoundPort = SoundPort,
+                                                .SoundPlayer = Player,
+                                                .SoundConverter = Converter,
+                                                .ButtonSwipe = ButtonSwipe,
+                                                .Wire = HasReader ? &Wire : nullptr});
     return *Window;
   }
 
@@ -141,7 +153,14 @@ class Venue : public DataSite {
   FakeFolders Places;
   FakeSerialDevices Devices;
   FakeSerialPort Port;
+  FakeOneWire Wire;
+  bool HasReader = true;
+  FakeWakeLock Awake;
+  FakeSerialPort SoundPort;
+  FakeSoundPlayer Player{Events};
+  FakeSoundConverter Converter;
   FakeWordProcessor Word;
+  FakePrograms Started;
   std::unique_ptr<frmRx> Window;
 
  private:

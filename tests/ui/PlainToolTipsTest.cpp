@@ -4,6 +4,7 @@
 
 #include <QApplication>
 #include <QLabel>
+#include <QScreen>
 #include <QToolTip>
 
 namespace {
@@ -31,6 +32,30 @@ TEST(PlainToolTips, ShowMarkupAsItStands) {
     EXPECT_GE(tip->height(), tip->heightForWidth(tip->width()));
     QToolTip::hideText();
   }
+}
+
+TEST(PlainToolTips, WrapLongTextsAndLeaveShortOnesOnOneLine) {
+  const PlainToolTips plain;
+  QWidget window;
+  window.show();
+  const QString shortText = QStringLiteral("Short");
+  const QString longText = QStringLiteral("word ").repeated(100);
+  const int most = window.screen()->availableGeometry().width() / 2;
+  int lineHeight = 0;
+  for (const QString& text : {shortText, longText, shortText, longText}) {
+    QToolTip::showText(QPoint(10, 10), text, &window);
+    const QLabel* tip = Tip();
+    ASSERT_NE(tip, nullptr);
+    EXPECT_EQ(tip->text(), text);
+    EXPECT_LE(tip->width(), most);
+    EXPECT_GE(tip->height(), tip->heightForWidth(tip->width()));
+    if (text == shortText) {
+      lineHeight = tip->height();
+    } else {
+      EXPECT_GT(tip->height(), 2 * lineHeight);
+    }
+  }
+  QToolTip::hideText();
 }
 
 }  // namespace

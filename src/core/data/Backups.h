@@ -25,7 +25,6 @@ class Backups {
  private:
   bool TryCopy(Database& database, const std::string& path);
   void Copy(Database& database, const std::string& name);
-  void DeleteOldest(const std::string& name, const std::string& newest);
 
   const std::string folder_;
   Files& disk_;

@@ -17,6 +17,9 @@ namespace Keys {
 inline constexpr Setting CommPort = {"comm", "commport", "1",
                                      "Number of the serial port with the base unit or the radio modem."};
 
+inline constexpr Setting FirmwarePath = {"Paths", "firmware_path", "Select a File",
+                                         "The last firmware file."};
+
 inline constexpr Setting TotalDamage = {"soldiering_calc", "total_damage", "1",
                                         "Soldiering points for each point of damage."};
 inline constexpr Setting Respawns = {"soldiering_calc", "respawns", "-1",
@@ -36,13 +39,22 @@ inline constexpr Setting ReaderPort = {
 inline constexpr Setting ReaderType = {
     "onewire", "type", "5", "Type of the reader's adapter; 5 is a serial adapter with a DS2480B chip."};
 
+inline constexpr Setting LastSoundFolder = {"Media Player", "1", "",
+                                            "Folder of the sound file that was chosen last."};
+
 /// One key for each port number n.
 inline constexpr Setting PortDevice = {
     "ports", "com<n>", "", "Device for port number n; without it, the machine's n-th serial port."};
+
+inline constexpr Setting OutcomeSign = {
+    "outcome", "sign", "1",
+    "1 for a large sign when a box was programmed or a button charged, or was not; 0 for none."};
+inline constexpr Setting OutcomeSound = {"outcome", "sound", "1", "The same for a sound."};
 
 }  // namespace Keys
 
 /// In the order of the manual.
 inline constexpr std::array AllSettings = {
-    Keys::CommPort, Keys::TotalDamage,  Keys::Respawns,   Keys::Heals,      Keys::AmmoAdds,
-    Keys::Accuracy, Keys::FriendlyFire, Keys::ReaderPort, Keys::ReaderType, Keys::PortDevice};
+    Keys::CommPort,        Keys::FirmwarePath, Keys::TotalDamage,  Keys::Respawns,    Keys::Heals,
+    Keys::AmmoAdds,        Keys::Accuracy,     Keys::FriendlyFire, Keys::ReaderPort,  Keys::ReaderType,
+    Keys::LastSoundFolder, Keys::PortDevice,   Keys::OutcomeSign,  Keys::OutcomeSound};

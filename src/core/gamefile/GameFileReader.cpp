@@ -6,26 +6,9 @@
 
 #include "core/gamefile/GameFile.h"
 #include "core/text/NumberForms.h"
-#include "core/text/TextEncoding.h"
+#include "core/text/Xml.h"
 
 namespace {
-
-/// Text of the first child element `name`, without comments, or `fallback` if there is none.
-std::string GetChildText(pugi::xml_node node, const char* name, const char* fallback) {
-  const pugi::xml_node child = node.child(name);
-  if (!child) {
-    return fallback;
-  }
-  std::string text = child.value();
-  for (const pugi::xml_node part : child.children()) {
-    if (part.type() == pugi::node_pcdata || part.type() == pugi::node_cdata) {
-      text += part.value();
-    }
-  }
-  // Besides old encodings this repairs references such as "&#xD800;", whose bytes are not UTF-8 and would
-  // spoil the next save.
-  return IsUtf8(text) ? text : Windows1252ToUtf8(text);
-}
 
 std::int32_t GetNumber(pugi::xml_node node, const char* name) {
   return ToInt32(GetChildText(node, name, "0"));
@@ -33,52 +16,6 @@ std::int32_t GetNumber(pugi::xml_node node, const char* name) {
 
 bool GetFlag(pugi::xml_node node, const char* name, const char* fallback) {
   return ToDouble(GetChildText(node, name, fallback)) == 1;
-}
-
-/// True for a document with one root element and no text beside it; a declaration may only come first, and a
-/// document type only before the root.
-bool IsWellFormed(const pugi::xml_document& document) {
-  int elements = 0;
-  int documentTypes = 0;
-  for (const pugi::xml_node node : document.children()) {
-    switch (node.type()) {
-      case pugi::node_element:
-        ++elements;
-        break;
-      case pugi::node_doctype:
-        if (++documentTypes > 1 || elements > 0) {
-          return false;
-        }
-        break;
-      case pugi::node_declaration:
-        if (node.previous_sibling()) {
-          return false;
-        }
-        break;
-      case pugi::node_pcdata:
-      case pugi::node_cdata:
-        return false;
-      default:
-        break;
-    }
-  }
-  return elements == 1;
-}
-
-/// Parses in place: the document points into `bytes`.
-bool Parse(std::string& bytes, pugi::xml_document& document) {
-  // embed_pcdata keeps a leaf's text in its element: a hit takes 4 nodes instead of 7, and a game can hold
-  // 50,176 hits.
-  constexpr unsigned int options = pugi::parse_default | pugi::parse_declaration | pugi::parse_doctype |
-                                   pugi::parse_ws_pcdata_single | pugi::parse_fragment |
-                                   pugi::parse_embed_pcdata;
-  const bool isWide = bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF");
-  if (!isWide && bytes.find('\0') != std::string::npos) {
-    return false;
-  }
-  const auto encoding = isWide ? pugi::encoding_auto : pugi::encoding_utf8;
-  return document.load_buffer_inplace(bytes.data(), bytes.size(), options, encoding) &&
-         IsWellFormed(document);
 }
 
 /// The "Player" elements of a file, as far as a plain text search can find them. The tree of a full game
@@ -104,7 +41,7 @@ std::vector<std::string_view> CutPlayers(std::string_view bytes) {
 /// Parses one of the texts from CutPlayers, with `text` as work space.
 bool ParsePlayer(std::string_view player, std::string& text, pugi::xml_document& document) {
   text = player;
-  return Parse(text, document);
+  return ParseXml(text, document);
 }
 
 /// Parses the file without its players. Returns false unless parsing these one by one gives the same players
@@ -117,7 +54,7 @@ bool ParseAround(std::string_view bytes, const std::vector<std::string_view>& pl
   const auto hole = static_cast<std::size_t>(players.front().data() - bytes.data());
   const auto end = static_cast<std::size_t>(players.back().data() - bytes.data()) + players.back().size();
   text.assign(bytes.substr(0, hole)).append("<Player/>").append(bytes.substr(end));
-  if (!Parse(text, document)) {
+  if (!ParseXml(text, document)) {
     return false;
   }
   const pugi::xml_node root = document.child("GameData");
@@ -203,7 +140,7 @@ bool ReadGameFile(std::string bytes, Game& game,
   std::string around;
   if (!ParseAround(bytes, players, around, document)) {
     players.clear();
-    if (!Parse(bytes, document)) {
+    if (!ParseXml(bytes, document)) {
       return false;
     }
   }

@@ -12,9 +12,14 @@ constexpr std::size_t RememberedConversations = 4;
 
 }  // namespace
 
+Transcript::Transcript(std::function<void(const std::string& rows)> write, std::string instrument,
+                       const MonotonicClock& time, Repeats repeats)
+    : time_(time), repeats_(repeats), write_(std::move(write)), instrument_(std::move(instrument)) {}
+
 Transcript::Transcript(const LogRing& ring, std::string instrument, const MonotonicClock& time,
                        Repeats repeats)
-    : time_(time), repeats_(repeats), ring_(ring), instrument_(std::move(instrument)) {}
+    : Transcript([ring = ring](const std::string& rows) mutable { ring.Append(rows); }, std::move(instrument),
+                 time, repeats) {}
 
 Transcript::~Transcript() {
   EndRow();
@@ -104,6 +109,6 @@ std::string Transcript::RepeatsRow() {
 }
 
 void Transcript::Write() {
-  ring_.Append(RepeatsRow() + rows_);
+  write_(RepeatsRow() + rows_);
   rows_.clear();
 }

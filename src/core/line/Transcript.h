@@ -5,6 +5,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <deque>
+#include <functional>
 #include <string>
 #include <string_view>
 
@@ -28,7 +29,9 @@ class Transcript {
   /// the same one ten times a second, or cycles through as many as a walk along its bus has steps.
   enum class Repeats { Written, Counted };
 
-  /// `time` must outlive this object.
+  /// `time` must outlive this object. `write` takes the rows, each with its line end.
+  Transcript(std::function<void(const std::string& rows)> write, std::string instrument,
+             const MonotonicClock& time, Repeats repeats);
   Transcript(const LogRing& ring, std::string instrument, const MonotonicClock& time, Repeats repeats);
   /// Writes what is left.
   ~Transcript();
@@ -72,7 +75,7 @@ class Transcript {
   std::array<std::uint8_t, RowBytes> row_{};
 
   const Repeats repeats_;
-  LogRing ring_;
+  const std::function<void(const std::string& rows)> write_;
   const std::string instrument_;
   std::string rows_;                  ///< not written yet
   std::string passed_;                ///< the present conversation without its times

@@ -19,7 +19,7 @@ bool ButtonReader::Tick() {
     Poll();
   } catch (const std::exception&) {
     finished_ = true;
-    EndFailedPoll();
+    poll_.EndFailed();
     boxes_.Show("Error loading membership driver. Please ensure it has been installed.", "Driver Error",
                 BoxIcon::Exclamation);
   }
@@ -45,13 +45,4 @@ void ButtonReader::TakeDevice() {
   finished_ = true;
   boxes_.Show("Membership button read sucessfully, code = " + dallasId_, "Membership Button Status",
               BoxIcon::Information);
-}
-
-void ButtonReader::EndFailedPoll() {
-  try {
-    poll_.End();
-  } catch (const std::exception&) {
-    // The same failure again, which the caller reports.
-    return;
-  }
 }

@@ -3,7 +3,7 @@
 #include <string>
 
 #include "core/game/DallasId.h"
-#include "devices/buttons/ReaderPoll.h"
+#include "core/line/ReaderPoll.h"
 #include "platform/MessageBoxes.h"
 
 /// Waits for a membership button to touch the reader, tick by tick.
@@ -28,7 +28,6 @@ class ButtonReader {
  private:
   void Poll();
   void TakeDevice();
-  void EndFailedPoll();
 
   ReaderPoll poll_;
   MessageBoxes& boxes_;

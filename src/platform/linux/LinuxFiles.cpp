@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <array>
 #include <filesystem>
+#include <limits>
 #include <random>
 #include <string_view>
 #include <utility>
@@ -114,6 +115,42 @@ void SyncRename(const std::string& folder, const std::string& path) {
   }
 }
 
+// A regular file that is open for reading.
+struct RegularFile {
+  // Throws as Files::Read does.
+  explicit RegularFile(const std::string& path)
+      : Handle(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK)) {
+    if (Handle.Number() < 0 && (errno == ENOENT || errno == ENOTDIR)) {
+      throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
+    }
+    struct stat info {};
+    if (Handle.Number() < 0 || fstat(Handle.Number(), &info) != 0 || !S_ISREG(info.st_mode)) {
+      throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
+    }
+    Size = static_cast<std::size_t>(info.st_size);
+  }
+
+  // Appends what follows, at most `count` bytes, to `bytes`.
+  void AppendUpTo(std::size_t count, std::string& bytes, const std::string& path) const {
+    std::array<char, 65536> buffer;
+    while (count > 0) {
+      const ssize_t got = read(Handle.Number(), buffer.data(), std::min(buffer.size(), count));
+      if (got == 0) {
+        return;
+      }
+      if (got < 0 && errno != EINTR) {
+        throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
+      }
+      const std::size_t taken = got < 0 ? 0 : static_cast<std::size_t>(got);
+      bytes.append(buffer.data(), taken);
+      count -= taken;
+    }
+  }
+
+  Descriptor Handle;
+  std::size_t Size = 0;
+};
+
 }  // namespace
 
 bool LinuxFiles::FileExists(const std::string& path) const {
@@ -155,27 +192,24 @@ std::uint64_t LinuxFiles::FileLen(const std::string& path) const {
 }
 
 std::string LinuxFiles::Read(const std::string& path) const {
-  const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
-  if (file.Number() < 0 && (errno == ENOENT || errno == ENOTDIR)) {
-    throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
-  }
-  struct stat info {};
-  if (file.Number() < 0 || fstat(file.Number(), &info) != 0 || !S_ISREG(info.st_mode)) {
-    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
-  }
+  const RegularFile file(path);
   std::string bytes;
-  bytes.reserve(static_cast<std::size_t>(info.st_size));
-  std::array<char, 65536> buffer;
-  for (;;) {
-    const ssize_t count = read(file.Number(), buffer.data(), buffer.size());
-    if (count == 0) {
-      return bytes;
-    }
-    if (count < 0 && errno != EINTR) {
+  bytes.reserve(file.Size);
+  file.AppendUpTo(std::numeric_limits<std::size_t>::max(), bytes, path);
+  return bytes;
+}
+
+std::string LinuxFiles::ReadPart(const std::string& path, std::uint64_t offset, std::size_t count) const {
+  const RegularFile file(path);
+  std::string bytes;
+  if (offset < file.Size) {
+    bytes.reserve(std::min<std::size_t>(count, file.Size - offset));
+    if (offset > 0 && lseek(file.Handle.Number(), static_cast<off_t>(offset), SEEK_SET) < 0) {
       throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
     }
-    bytes.append(buffer.data(), count < 0 ? 0 : static_cast<std::size_t>(count));
+    file.AppendUpTo(count, bytes, path);
   }
+  return bytes;
 }
 
 void LinuxFiles::Replace(const std::string& path, const std::string& bytes) {

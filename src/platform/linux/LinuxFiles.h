@@ -13,6 +13,7 @@ class LinuxFiles : public Files {
   void CreateFolder(const std::string& path) override;
   std::uint64_t FileLen(const std::string& path) const override;
   std::string Read(const std::string& path) const override;
+  std::string ReadPart(const std::string& path, std::uint64_t offset, std::size_t count) const override;
 
   /// Keeps the old file's permissions, and its owner where that is allowed; a new file gets 0644 less the
   /// umask. A write-protected file is refused (70), even where its folder would allow replacing it.

@@ -51,4 +51,10 @@ TEST(Crc8, IsZeroOverDataWithItsOwnCheckByte) {
   EXPECT_NE(Crc8(data), 0);
 }
 
+TEST(Crc32, IsTheCheckValueOfArchives) {
+  EXPECT_EQ(Crc32("123456789"), 0xCBF43926U);
+  EXPECT_EQ(Crc32(""), 0U);
+  EXPECT_EQ(Crc32(std::string_view("\0\xFF", 2)), 0x6CDBFD72U);
+}
+
 }  // namespace

@@ -41,6 +41,21 @@ TEST(LinuxFilesRead, GivesAnEmptyFile) {
   EXPECT_EQ(LinuxFiles().Read(folder / "empty"), "");
 }
 
+TEST(LinuxFilesRead, GivesAPartAsFarAsTheFileGoes) {
+  const TemporaryFolder folder;
+  const std::string bytes = std::string(100'000, 'a') + "0123456789";
+  WriteFile(folder / "parts", bytes);
+  const LinuxFiles files;
+  EXPECT_EQ(files.ReadPart(folder / "parts", 0, 3), "aaa");
+  EXPECT_EQ(files.ReadPart(folder / "parts", 99'999, 4), "a012");
+  EXPECT_EQ(files.ReadPart(folder / "parts", 100'007, 50), "789");
+  EXPECT_EQ(files.ReadPart(folder / "parts", 0, std::size_t{1} << 40U), bytes);
+  EXPECT_EQ(files.ReadPart(folder / "parts", 100'010, 5), "");
+  EXPECT_EQ(files.ReadPart(folder / "parts", std::uint64_t{1} << 62U, 5), "");
+  EXPECT_EQ(NumberThrownBy([&] { files.ReadPart(folder / "none", 0, 1); }), 53);
+  EXPECT_EQ(NumberThrownBy([&] { files.ReadPart(folder.Path(), 0, 1); }), 75);
+}
+
 TEST(LinuxFilesRead, MissingFileIs53AndNamesIt) {
   const TemporaryFolder folder;
   const Thrown thrown = ThrownBy([&] { LinuxFiles().Read(folder / "none"); });

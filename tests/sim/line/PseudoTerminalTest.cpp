@@ -194,6 +194,19 @@ TEST(PseudoTerminal, AnInterruptionEndsAWaitForAByte) {
   EXPECT_EQ(line.ReadByte(), std::nullopt);
 }
 
+TEST(PseudoTerminal, ANudgeEndsOneWaitForAByteAndNoOther) {
+  PseudoTerminal line(19200, Pace::Fast);
+  RawHost host(line.SlavePath());
+  std::thread device([&] { EXPECT_EQ(line.ReadByte(), std::nullopt); });
+  line.Nudge();
+  device.join();
+  EXPECT_TRUE(line.IsUp());
+  line.Nudge();
+  host.Write({7});
+  EXPECT_EQ(line.ReadByte(Limit), std::nullopt);
+  EXPECT_EQ(line.ReadByte(Limit), 7);
+}
+
 TEST(PseudoTerminal, AnInterruptionEndsAWriteInTheMiddle) {
   PseudoTerminal line(300, Pace::AsWired);
   RawHost host(line.SlavePath());

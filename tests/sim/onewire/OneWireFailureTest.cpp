@@ -75,6 +75,12 @@ TEST_P(FailureOfTheAdapter, ReachesTheHostAsItsNameSays) {
   switch (GetParam().Failure) {
     case OneWireFailure::None:
     case OneWireFailure::TornWrites:
+    case OneWireFailure::RemovedInRead:  // these strike only at memories
+    case OneWireFailure::RemovedInWrite:
+    case OneWireFailure::TornCopy:
+    case OneWireFailure::DisturbedRead:
+    case OneWireFailure::DisturbedWrite:
+    case OneWireFailure::WriteProtected:
       ExpectDetection();
       ExpectSearches(FoundButton, FoundReader);
       break;

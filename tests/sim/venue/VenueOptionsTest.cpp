@@ -6,8 +6,12 @@
 #include <stdexcept>
 
 #include "sim/baseunit/BaseUnitFailure.h"
+#include "sim/bootcode/BootFailure.h"
+#include "sim/box/BoxFailure.h"
 #include "sim/onewire/OneWireFailure.h"
+#include "sim/pic24f/Pic24fFailure.h"
 #include "sim/radio/RadioFailure.h"
+#include "sim/recorder/RecorderFailure.h"
 #include "sim/venue/VenueUsage.h"
 
 namespace sim {
@@ -97,6 +101,104 @@ TEST(VenueOptions, TakeEveryOptionOfTheRadioModem) {
   EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::None);
 }
 
+TEST(VenueOptions, TakeEveryOptionOfTheUtilityBox) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("box");
+  EXPECT_FALSE(untold.Served);
+  EXPECT_EQ(untold.Number("times"), 0U);
+  EXPECT_EQ(untold.Number("late"), 2500U);
+  const DeviceOptions box =
+      ParseVenueOptions({"--box", "--box-failure", "unplugged", "--box-at", "10", "--box-times", "2",
+                         "--box-late", "60000", "--box-link", "cable"})
+          .Of("box");
+  EXPECT_TRUE(box.Served);
+  EXPECT_EQ(box.FailureAs<BoxFailure>(), BoxFailure::Unplugged);
+  EXPECT_EQ(box.Place, 10U);
+  EXPECT_EQ(box.Number("times"), 2U);
+  EXPECT_EQ(box.Number("late"), 60000U);
+  EXPECT_EQ(box.Link, "cable");
+}
+
+TEST(VenueOptions, TakeEveryOptionOfTheSoundRecorder) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("recorder");
+  EXPECT_FALSE(untold.Served);
+  EXPECT_EQ(untold.Choice("kind"), 0U);
+  EXPECT_EQ(untold.Number("erase-time"), 500U);
+  EXPECT_EQ(untold.File("folder"), std::nullopt);
+  const DeviceOptions told =
+      ParseVenueOptions({"--recorder", "--recorder-kind", "stand-alone", "--recorder-erase-time", "9",
+                         "--recorder-folder", "sounds", "--recorder-failure", "lost-byte", "--recorder-at",
+                         "7", "--recorder-link", "chip"})
+          .Of("recorder");
+  EXPECT_TRUE(told.Served);
+  EXPECT_EQ(told.Choice("kind"), 2U);
+  EXPECT_EQ(told.Number("erase-time"), 9U);
+  EXPECT_EQ(told.File("folder"), "sounds");
+  EXPECT_EQ(told.FailureAs<RecorderFailure>(), RecorderFailure::LostByte);
+  EXPECT_EQ(told.Place, 7U);
+  EXPECT_EQ(told.Link, "chip");
+}
+
+TEST(VenueOptions, TakeEveryOptionOfThePic24fBootloader) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("pic24f");
+  EXPECT_FALSE(untold.Served);
+  for (const char* option : {"device", "identity", "pages", "eeprom-words", "user-reset", "boot-delay"}) {
+    EXPECT_EQ(untold.Number(option), 0U) << option;
+  }
+  EXPECT_EQ(untold.Number("row-time"), 2U);
+  EXPECT_EQ(untold.Number("page-time"), 20U);
+  const DeviceOptions told =
+      ParseVenueOptions({"--pic24f", "--pic24f-device",     "small", "--pic24f-identity",
+                         "32769",    "--pic24f-pages",      "15872", "--pic24f-eeprom-words",
+                         "32764",    "--pic24f-user-reset", "3072",  "--pic24f-boot-delay",
+                         "3074",     "--pic24f-row-time",   "0",     "--pic24f-page-time",
+                         "1",        "--pic24f-failure",    "noise", "--pic24f-at",
+                         "4",        "--pic24f-link",       "port"})
+          .Of("pic24f");
+  EXPECT_TRUE(told.Served);
+  EXPECT_EQ(told.Choice("device"), 2U);
+  EXPECT_EQ(told.Number("identity"), 32769U);
+  EXPECT_EQ(told.Number("pages"), 15872U);
+  EXPECT_EQ(told.Number("eeprom-words"), 32764U);
+  EXPECT_EQ(told.Number("user-reset"), 3072U);
+  EXPECT_EQ(told.Number("boot-delay"), 3074U);
+  EXPECT_EQ(told.Number("row-time"), 0U);
+  EXPECT_EQ(told.Number("page-time"), 1U);
+  EXPECT_EQ(told.FailureAs<Pic24fFailure>(), Pic24fFailure::Noise);
+  EXPECT_EQ(told.Place, 4U);
+  EXPECT_EQ(told.Link, "port");
+}
+
+TEST(VenueOptions, TakeEveryOptionOfTheBootCode) {
+  const DeviceOptions untold = ParseVenueOptions({}).Of("bootcode");
+  EXPECT_FALSE(untold.Served);
+  EXPECT_EQ(untold.Choice("product"), 0U);
+  EXPECT_EQ(untold.File("flash"), std::nullopt);
+  EXPECT_EQ(untold.Number("power-on"), 0U);
+  EXPECT_EQ(untold.Number("runs"), 0U);
+  EXPECT_EQ(untold.Number("times"), 1U);
+  EXPECT_EQ(untold.Number("late"), 12000U);
+  EXPECT_EQ(untold.Number("gap"), 50U);
+  const DeviceOptions device =
+      ParseVenueOptions({"--bootcode", "--bootcode-failure", "asks-again", "--bootcode-at",
+                         "9",          "--bootcode-times",   "11",         "--bootcode-product",
+                         "qvm",        "--bootcode-flash",   "f",          "--bootcode-power-on",
+                         "500",        "--bootcode-runs",    "1",          "--bootcode-late",
+                         "60000",      "--bootcode-gap",     "200",        "--bootcode-link",
+                         "cable"})
+          .Of("bootcode");
+  EXPECT_TRUE(device.Served);
+  EXPECT_EQ(device.FailureAs<BootFailure>(), BootFailure::AsksAgain);
+  EXPECT_EQ(device.Place, 9U);
+  EXPECT_EQ(device.Number("times"), 11U);
+  EXPECT_EQ(device.Choice("product"), 1U);
+  EXPECT_EQ(device.File("flash"), "f");
+  EXPECT_EQ(device.Number("power-on"), 500U);
+  EXPECT_EQ(device.Number("runs"), 1U);
+  EXPECT_EQ(device.Number("late"), 60000U);
+  EXPECT_EQ(device.Number("gap"), 200U);
+  EXPECT_EQ(device.Link, "cable");
+}
+
 TEST(VenueOptions, KnowEveryFailureByItsName) {
   for (const RadioFailureInfo& info : RadioFailures) {
     EXPECT_EQ(RadioIn({"--radio-failure", std::string(info.Name)}).FailureAs<RadioFailure>(), info.Failure);
@@ -157,10 +259,19 @@ TEST(VenueOptions, RefuseWhatTheyDoNotUnderstand) {
                                                       {"--radio-answer-time", "10001"},
                                                       {"--radio-frames", ""},
                                                       {"--radio-link", ""},
+                                                      {"--recorder-kind", "gum"},
+                                                      {"--pic24f-device", "tiny"},
+                                                      {"--pic24f-identity", "65536"},
+                                                      {"--recorder-folder", ""},
                                                       {"--link", ""},
                                                       {"--no-base-unit"},
                                                       {"--no-radio"},
-                                                      {"--onewire-games", "1"}};
+                                                      {"--onewire-games", "1"},
+                                                      {"--box-at", "11"},
+                                                      {"--box-late", "60001"},
+                                                      {"--bootcode-product", "qvm3"},
+                                                      {"--bootcode-flash", ""},
+                                                      {"--bootcode-gap", "10001"}};
   for (const std::vector<std::string>& arguments : refused) {
     EXPECT_THROW(ParseVenueOptions(arguments), std::invalid_argument) << testing::PrintToString(arguments);
   }

@@ -11,6 +11,8 @@
 #include "sim/game/GameMaker.h"
 #include "sim/radio/RadioAnswer.h"
 #include "tests/support/AdapterHost.h"
+#include "tests/support/BootHost.h"
+#include "tests/support/BoxHost.h"
 #include "tests/support/RadioLiterals.h"
 #include "tests/support/RawHost.h"
 #include "tests/support/VenueProcess.h"
@@ -316,6 +318,82 @@ TEST_F(VenueByRadio, GoesOnWithItsOtherDevicesWhenTheModemHasBeenPulledOut) {
   EXPECT_TRUE(venue.IsRunning());
 }
 
+TEST_F(VenueProgram, ServesAUtilityBoxThatTellsWhatItWasTold) {
+  VenueProcess venue({"--no-base-unit", "--box", "--box-link", File("port"), "--log", File("log")});
+  BoxHost host(venue.ReadDevice("utility box"));
+  venue.WriteInput("told\n");
+  EXPECT_EQ(venue.ReadLine(), "told nothing");
+  host.Send({0x42, 0x43, 0x38, 0x14, 0x05, 0x64, 0x02, 0x01, 0x00, 0x00});
+  EXPECT_EQ(host.Read(1), Bytes{0xAA});
+  const std::string told =
+      "told Dom. (iBtn), yellow, 20 points per activation, 5 to recharge, 100 to give, automatic after 20 s, "
+      "destroyable";
+  venue.WriteInput("box told\n");
+  EXPECT_EQ(venue.ReadLine(), told);
+  venue.Signal(SIGTERM);
+  EXPECT_EQ(venue.WaitForExit(), 0);
+  EXPECT_EQ(venue.RestOfErrors(), "");
+  EXPECT_THAT(Content(File("log")), HasSubstr("box -> AA\n"));
+}
+
+TEST_F(VenueProgram, ServesBootCodeThatKeepsItsFlashFromRunToRun) {
+  const std::vector<std::string> arguments{"--no-base-unit", "--fast", "--bootcode", "--bootcode-flash",
+                                           File("flash")};
+  {
+    VenueProcess venue(arguments);
+    BootHost host(venue.ReadDevice("boot code"));
+    venue.WriteInput("power\n");
+    EXPECT_EQ(venue.ReadLine(), "switched on");
+    EXPECT_EQ(host.Hear(4), "BOOT");
+    EXPECT_EQ(host.Begin(), "xds");
+    EXPECT_EQ(host.Ask(wire::WriteCountingRow1), "f");
+    venue.Signal(SIGTERM);
+    EXPECT_EQ(venue.WaitForExit(), 0);
+    EXPECT_EQ(venue.RestOfErrors(), "");
+  }
+  const std::string before = Content(File("flash"));
+  EXPECT_EQ(before.size(), 786432U);
+  EXPECT_EQ(before.substr(192, 3), std::string("\0\1\2", 3));
+  VenueProcess venue(arguments);
+  BootHost host(venue.ReadDevice("boot code"));
+  venue.WriteInput("bootcode power bad-address 1\n");
+  EXPECT_EQ(venue.ReadLine(), "switched on");
+  EXPECT_EQ(host.Hear(4), "BOOT");
+  EXPECT_EQ(host.Begin(), "xds");
+  EXPECT_EQ(host.Ask(wire::ErasePage0), "e");
+  EXPECT_EQ(Content(File("flash")), before);
+}
+
+TEST_F(VenueProgram, SwitchesADeviceOnByItselfOnceItsLineIsOpenedWhenTold) {
+  VenueProcess venue(
+      {"--no-base-unit", "--fast", "--bootcode", "--bootcode-product", "qvm", "--bootcode-power-on", "1"});
+  BootHost host(venue.ReadDevice("boot code"));
+  EXPECT_EQ(host.Hear(4), "BOOT");
+  EXPECT_EQ(host.Begin(), "xpb");
+}
+
+TEST_F(VenueProgram, SaysWhenItCannotUseAFlashFile) {
+  std::ofstream(File("flash")) << "short";
+  VenueProcess venue({"--no-base-unit", "--bootcode", "--bootcode-flash", File("flash")});
+  EXPECT_EQ(venue.WaitForExit(), 1);
+  EXPECT_THAT(venue.RestOfErrors(), HasSubstr("flash is no program memory of 786432 bytes"));
+  EXPECT_EQ(Content(File("flash")), "short");
+}
+
+TEST_F(VenueProgram, ChargesAButtonOnCommand) {
+  VenueProcess venue({"--no-base-unit", "--fast", "--onewire", "--onewire-failure", "no-own-device"});
+  AdapterHost host(venue.ReadDevice("1-wire adapter"));
+  venue.WriteInput("fill 5600000001B81C06 zeros\ntouch 5600000001B81C06\n");
+  EXPECT_EQ(venue.ReadLine(), "filled 5600000001B81C06");
+  EXPECT_EQ(venue.ReadLine(), "touched 5600000001B81C06");
+  EXPECT_EQ(host.Ask({0xC1, 0xE1, 0xCC, 0x0F, 0x21, 0x00, 0x01, 0xE3}, 6),
+            (Bytes{0xCD, 0xCC, 0x0F, 0x21, 0x00, 0x01}));
+  EXPECT_EQ(host.Ask({0xC1, 0xE1, 0xCC, 0x55, 0x21, 0x00, 0x01, 0xE3}, 6),
+            (Bytes{0xCD, 0xCC, 0x55, 0x21, 0x00, 0x01}));
+  venue.WriteInput("show 5600000001B81C06\n");
+  EXPECT_THAT(venue.ReadLine(), testing::StartsWith("5600000001B81C06 00 01 00 00 "));
+}
+
 TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
   const std::vector<std::vector<std::string>> refused{
       {"--players", "225"},
@@ -327,6 +405,8 @@ TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
       {"--failure", "hang-up", "--players", "0"},
       {"--failure", "silence", "--players", "0", "--at", "2"},
       {"--radio", "--radio-failure", "silent-gun", "--radio-at", "41"},
+      {"--box", "--box-failure", "unplugged", "--box-at", "0"},
+      {"--bootcode", "--bootcode-failure", "silence", "--bootcode-at", "0"},
       {"--no-base-unit"}};
   for (const std::vector<std::string>& arguments : refused) {
     VenueProcess venue(arguments);
