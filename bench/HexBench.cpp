@@ -104,7 +104,7 @@ class Imports {
 };
 
 bool MeasureImport(const std::string& folder) {
-  constexpr std::size_t program = 256 * 1024;
+  constexpr std::size_t program = std::size_t{256} * 1024;
   Imports imports(folder);
   const double ten = imports.Time(10 * program);
   const double one = imports.Time(program);
@@ -129,7 +129,7 @@ bool MeasureWrite(const std::string& folder) {
   QtEventPump events;
   QtSerialPort port;
   NoBoxes boxes;
-  files.Write(folder + "/new.hex", HexProgram(64 * 1024));
+  files.Write(folder + "/new.hex", HexProgram(std::size_t{64} * 1024));
   ImportHexFile(files, boxes, folder + "/new.hex",
                 {folder + "/progmem.img", folder + "/eedata.img", folder + "/config.img"});
   SerialPicBoot library(

@@ -27,7 +27,7 @@ QAudioFormat FormatOf(int samplesPerSecond) {
 
 QByteArray Widened(const std::vector<std::uint8_t>& samples) {
   QByteArray bytes;
-  bytes.reserve(static_cast<qsizetype>(samples.size() * sizeof(qint16)));
+  bytes.reserve(static_cast<qsizetype>(samples.size()) * qsizetype{sizeof(qint16)});
   for (const std::uint8_t sample : samples) {
     const auto wide = static_cast<qint16>((sample - Silence) * 256);
     bytes.append(reinterpret_cast<const char*>(&wide), sizeof wide);

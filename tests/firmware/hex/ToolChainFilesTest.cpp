@@ -10,7 +10,6 @@
 namespace {
 
 using Cause = LostStretch::Cause;
-using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::StartsWith;
 

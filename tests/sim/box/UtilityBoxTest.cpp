@@ -12,7 +12,6 @@ namespace sim {
 namespace {
 
 using testing::ContainsRegex;
-using testing::HasSubstr;
 
 const Bytes Zeros{0x42, 0x43, 0, 0, 0, 0, 0, 0, 0, 0};
 const Bytes Domination{0x42, 0x43, 0x38, 0x14, 0x05, 0x64, 0x02, 0x01, 0x00, 0x00};
