@@ -129,6 +129,33 @@ TEST_F(Charging, ChargesAButtonAgainAfterItLeftForAPass) {
   EXPECT_EQ(mag.Memory[33], 1);
 }
 
+TEST_F(Charging, TellsWhenAPassHasMetNoButton) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Pass();
+  Pass();
+  EXPECT_EQ(display.Left, 0);
+  bus.TakeAway(mag);
+  Pass();
+  EXPECT_EQ(display.Left, 1);
+}
+
+TEST_F(Charging, TellsItAlsoWithoutTheReadersDevice) {
+  bus.Devices.clear();
+  MemoryButton& mag = TouchedButton({0, 0});
+  Pass();
+  Pass();
+  EXPECT_EQ(display.Left, 0);
+  bus.TakeAway(mag);
+  Pass();
+  EXPECT_EQ(display.Left, 1);
+}
+
+TEST_F(Charging, DoesNotTellItOfASpoiledPass) {
+  bus.NextResults = {OneWire::BadRead};
+  Ticks(1);
+  EXPECT_EQ(display.Left, 0);
+}
+
 TEST_F(Charging, DoesNotChargeAgainAButtonThatLeftForLessThanAPass) {
   MemoryButton& mag = TouchedButton({0, 0});
   Ticks(1);

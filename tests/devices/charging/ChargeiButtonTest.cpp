@@ -188,6 +188,50 @@ TEST_P(ChargeWindow, SignalsAButtonThatCannotBeReadOnlyOnce) {
   EXPECT_THAT(sounds.Played, SizeIs(1));
 }
 
+TEST_P(ChargeWindow, KeepsTheSignOfAButtonThatCannotBeRead) {
+  TouchedButton({0, 0});
+  bus.FailingAccesses = 9;
+  for (int tick = 0; tick < 7; ++tick) {
+    Ticks(1);
+    EXPECT_EQ(TextOf("Sign"), In("\u2717 Not read", "\u2717 未能读取")) << tick;
+  }
+}
+
+TEST_P(ChargeWindow, SignalsAButtonThatCannotBeReadAtEachTouch) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  bus.FailingAccesses = 6;
+  Ticks(1);
+  bus.TakeAway(mag);
+  Ticks(4);
+  bus.Put(mag);
+  Ticks(4);
+  EXPECT_EQ(Results().rowCount(), 2);
+  EXPECT_THAT(sounds.Played, SizeIs(2));
+}
+
+TEST_P(ChargeWindow, SignalsAButtonThatCannotBeReadWhenItIsOpenedAgainToo) {
+  TouchedButton({0, 0});
+  bus.FailingAccesses = 6;
+  Ticks(1);
+  Press(*window, "Close");
+  Open();
+  Ticks(1);
+  EXPECT_EQ(Results().rowCount(), 2);
+  EXPECT_THAT(sounds.Played, SizeIs(2));
+}
+
+TEST_P(ChargeWindow, TakesTheSignAwayWhileItAsks) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Ticks(1);
+  bus.TakeAway(mag);
+  MemoryButton& torn = TouchedButton({1, 0});
+  torn.Memory[63] ^= 1;
+  std::string signAtBox = "none";
+  boxes.WhileOpen = [&](const FakeMessageBoxes::Box&) { signAtBox = TextOf("Sign"); };
+  Ticks(4);
+  EXPECT_EQ(signAtBox, "");
+}
+
 TEST_P(ChargeWindow, TellsOfAMissingReaderOnceAndLooksEveryTwoSeconds) {
   const auto& line = Find<QLabel>(*window, "ReaderLabel");
   EXPECT_FALSE(line.isVisible());
