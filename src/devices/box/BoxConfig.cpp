@@ -146,7 +146,10 @@ void BoxConfig::AddRow(std::size_t number, const ProgrammedBox& box) {
   again->setObjectName(QStringLiteral("SendAgain%1").arg(number));
   commands_.Connect(
       *again, [this, entries = box.Entries] { ProgramAgain(entries); }, WhileBusy::Ignore);
-  ui_->Results->setCellWidget(0, ui_->Results->columnCount() - 1, again);
+  const int column = ui_->Results->columnCount() - 1;
+  ui_->Results->setCellWidget(0, column, again);
+  // The list measured its row before the button was there.
+  ui_->Results->resizeColumnToContents(column);
   setTabOrder(ui_->Results, again);
 }
 

@@ -45,6 +45,21 @@ TEST_P(BoxWindow, FindsTheListAgainButNotTheEntries) {
   EXPECT_THAT(Row(0), ElementsAre("1", "14:30:05", "Medic", "All", In("Accepted", "已接受")));
 }
 
+TEST_P(BoxWindow, CountsOnWhereTheListNoLongerHoldsTheFirstBoxes) {
+  for (std::size_t i = 0; i < ProgrammedBoxes::Most + 2; ++i) {
+    programmed.Add({"09:00:00", {}, BoxResult::Accepted});
+  }
+  Open();
+  EXPECT_EQ(Results().rowCount(), static_cast<int>(ProgrammedBoxes::Most));
+  EXPECT_EQ(Row(0)[0], "502");
+  EXPECT_EQ(Row(Results().rowCount() - 1)[0], "3");
+  AnswerWith({0xAA});
+  Results().scrollToBottom();
+  Press("SendAgain3");
+  EXPECT_EQ(Row(0)[0], "503");
+  EXPECT_EQ(Row(Results().rowCount() - 1)[0], "4");
+}
+
 TEST_P(BoxWindow, ProgramsABoxOfTheListAgainWithOneClick) {
   AnswerWith({0xAA});
   List("BoxType").setCurrentIndex(3);
@@ -91,6 +106,14 @@ TEST_P(BoxWindow, SignalsSuccessAndFailureBeforeTheBoxOpens) {
   EXPECT_EQ(signAtBox, In("\u2717 Rejected", "\u2717 已拒绝"));
   ASSERT_EQ(soundsAtBox, 2U);
   EXPECT_NE(sounds.Played[0], sounds.Played[1]);
+}
+
+TEST_P(BoxWindow, TakesABoxThatDidNotConfirmForAFailure) {
+  Meanwhile(400, [this] { Port.Lose(); });
+  Press("ProgramButton");
+  EXPECT_EQ(Sign(), In("\u2717 Not confirmed", "\u2717 未确认"));
+  EXPECT_THAT(Row(0), ElementsAre("1", "14:30:05", "Medic", "All", In("Not confirmed", "未确认")));
+  EXPECT_NE(Results().item(0, 0)->background().style(), Qt::NoBrush);
 }
 
 TEST_P(BoxWindow, TakesTheSignAwayAtTheNextPress) {

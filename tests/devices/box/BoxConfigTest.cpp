@@ -292,8 +292,8 @@ TEST_P(BoxWindow, IsCaredForWithAndWithoutBoxes) {
   AnswerWith({0xAA});
   for (int i = 0; i < 3; ++i) {
     Press("ProgramButton");
+    ExpectCaredFor(*window);
   }
-  ExpectCaredFor(*window);
 }
 
 TEST_P(BoxWindow, WritesNoSettings) {
