@@ -238,6 +238,28 @@ TEST_F(Charging, ChargesNothingInASpoiledPassAndBeginsAtTheFirstDevice) {
   EXPECT_EQ(display.Status, "");
 }
 
+TEST_F(Charging, CountsFromTheStartAfterASpoiledPass) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Pass();
+  bus.TakeAway(mag);
+  Ticks(1);
+  bus.NextResults = {OneWire::BadRead};
+  Ticks(3);
+  EXPECT_EQ(display.Status, "");
+}
+
+TEST_F(Charging, ClearsTheStatusBeforeItJudgesTheNextButton) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Ticks(1);
+  bus.TakeAway(mag);
+  MemoryButton& torn = TouchedButton({1, 0});
+  torn.Memory[63] ^= 1;
+  std::string statusAtBox = "none";
+  boxes.WhileOpen = [&](const FakeMessageBoxes::Box&) { statusAtBox = display.Status; };
+  Pass();
+  EXPECT_EQ(statusAtBox, "");
+}
+
 TEST_F(Charging, WritesThroughTheScratchpad) {
   MemoryButton& mag = TouchedButton({0, 0});
   std::vector<std::uint8_t> sent;
@@ -314,6 +336,7 @@ TEST_F(MissingReader, OfADriverThatThrowsIsReportedOnce) {
     bus.Broken = operation;
     EXPECT_EQ(NumberThrownBy([this] { Ticks(1); }), Fault::FileNotFound) << operation;
     EXPECT_TRUE(charger.ReaderMissing()) << operation;
+    EXPECT_EQ(bus.Log.back(), "TMEndSession") << operation;
     EXPECT_EQ(NumberThrownBy([this] { Ticks(3); }), 0) << operation;
     EXPECT_FALSE(display.Reader) << operation;
     bus.Broken = "";

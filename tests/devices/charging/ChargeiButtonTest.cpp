@@ -143,6 +143,8 @@ TEST_P(ChargeWindow, ListsTheButtonsNewestFirst) {
                                   In("Different when read back", "回读不一致")));
   EXPECT_THAT(Row(1), ElementsAre("1", "14:30:05", In("Ammo Mag", "弹匣"), "A10000000000010C",
                                   In("Charged", "已充值")));
+  EXPECT_NE(Results().item(0, 0)->background().style(), Qt::NoBrush);
+  EXPECT_EQ(Results().item(1, 0)->background().style(), Qt::NoBrush);
 }
 
 TEST_P(ChargeWindow, ListsWhatWasNotChargedAndWhy) {
@@ -302,6 +304,21 @@ TEST_P(ChargeWindow, ClosesByButtonEscapeAndCloseBoxEvenInATick) {
     bus.OnCall = {};
   }
   EXPECT_FALSE(bus.SessionOpen());
+}
+
+TEST_P(ChargeWindow, EndsAWriteSilentlyWhenItIsClosedInIt) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  bus.BeforeByte = [this](std::size_t byte) {
+    constexpr std::size_t inTheWrite = 40;
+    if (byte == inTheWrite) {
+      window->close();
+    }
+  };
+  Ticks(1);
+  EXPECT_FALSE(window->isVisible());
+  EXPECT_EQ(mag.Copies, 1U);
+  EXPECT_THAT(charged.All(), SizeIs(1));
+  EXPECT_THAT(sounds.Played, IsEmpty());
 }
 
 TEST_P(ChargeWindow, IsCaredForWithAndWithoutButtons) {
