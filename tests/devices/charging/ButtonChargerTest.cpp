@@ -150,6 +150,15 @@ TEST_F(Charging, TellsItAlsoWithoutTheReadersDevice) {
   EXPECT_EQ(display.Left, 1);
 }
 
+TEST_F(Charging, TellsItAfterAPassThatWasSpoiled) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Ticks(1);
+  bus.TakeAway(mag);
+  bus.NextResults = {OneWire::BadRead};
+  Ticks(3);
+  EXPECT_EQ(display.Left, 1);
+}
+
 TEST_F(Charging, DoesNotTellItOfASpoiledPass) {
   bus.NextResults = {OneWire::BadRead};
   Ticks(1);

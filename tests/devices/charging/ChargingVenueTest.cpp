@@ -29,7 +29,6 @@ namespace {
 using sim::ButtonContent;
 using sim::OneWireFailure;
 using testing::AnyOf;
-using testing::ElementsAre;
 using testing::IsEmpty;
 
 using Block = sim::ChargeBlock;
