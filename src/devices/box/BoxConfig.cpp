@@ -146,10 +146,7 @@ void BoxConfig::AddRow(std::size_t number, const ProgrammedBox& box) {
   again->setObjectName(QStringLiteral("SendAgain%1").arg(number));
   commands_.Connect(
       *again, [this, entries = box.Entries] { ProgramAgain(entries); }, WhileBusy::Ignore);
-  const int column = ui_->Results->columnCount() - 1;
-  ui_->Results->setCellWidget(0, column, again);
-  // The list measured its row before the button was there.
-  ui_->Results->resizeColumnToContents(column);
+  ui_->Results->setCellWidget(0, ui_->Results->columnCount() - 1, again);
   setTabOrder(ui_->Results, again);
 }
 
@@ -192,6 +189,8 @@ void BoxConfig::Note(const BoxEntries& entries, BoxResult result) {
     const std::string time = parts_.Time.Now();
     parts_.Programmed.Add({time.substr(time.find(' ') + 1), entries, result});
     AddRow(parts_.Programmed.Count(), parts_.Programmed.All().back());
+    // The list measured its row before the button was there.
+    ui_->Results->resizeColumnToContents(ui_->Results->columnCount() - 1);
   }
 }
 

@@ -293,6 +293,9 @@ TEST_P(BoxWindow, IsCaredForWithAndWithoutBoxes) {
   for (int i = 0; i < 3; ++i) {
     Press("ProgramButton");
     ExpectCaredFor(*window);
+    Press("Close");
+    Open();
+    ExpectCaredFor(*window);
   }
 }
 
