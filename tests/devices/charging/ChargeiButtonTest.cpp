@@ -34,10 +34,10 @@ class ChargeWindow : public testing::TestWithParam<Language> {
                                                                   .Charged = charged,
                                                                   .Signals = {ini, &sounds, strings}},
                                              nullptr);
-    Show(*window);
     started = Timer().isActive();
     interval = Timer().interval();
-    Timer().stop();  // ticks come from the test
+    Timer().stop();  // ticks come from the test, however long the window takes to come up
+    Show(*window);
   }
 
   QTimer& Timer() const { return Find<QTimer>(*window, "Timer1"); }
@@ -165,6 +165,19 @@ TEST_P(ChargeWindow, FindsItsListAgain) {
   Open();
   ASSERT_EQ(Results().rowCount(), 1);
   EXPECT_EQ(Row(0)[3], "A10000000000010C");
+}
+
+TEST_P(ChargeWindow, CountsOnWhereTheListNoLongerHoldsTheFirstButtons) {
+  for (std::size_t i = 0; i < ChargedButtons::Most + 2; ++i) {
+    charged.Add({"09:00:00", 0, "A10000000000010C", ChargeResult::Charged});
+  }
+  Open();
+  TouchedButton({0, 0});
+  Ticks(1);
+  EXPECT_EQ(Results().rowCount(), static_cast<int>(ChargedButtons::Most));
+  EXPECT_EQ(Row(0)[0], "503");
+  EXPECT_EQ(Row(1)[0], "502");
+  EXPECT_EQ(Row(Results().rowCount() - 1)[0], "4");
 }
 
 TEST_P(ChargeWindow, SignalsWhatTheReadingBackShowed) {
