@@ -50,6 +50,7 @@ class SilentDisplay : public ChargingDisplay {
   int Charged = 0;
   void SetStatus(const std::string&) override {}
   void BeginButton() override {}
+  void ButtonsLeft() override {}
   void SetReader(bool) override {}
   void Note(const ChargedButton& button) override {
     Charged += button.Result == ChargeResult::Charged ? 1 : 0;

@@ -236,6 +236,7 @@ void frmRx::ManageRemotely() {
 }
 
 void frmRx::ConfigureBoxes() {
+  commPort_->CloseIfOpen();
   BoxConfig({.MSComm1 = services_.MSComm1,
              .Port = *commPort_,
              .Events = services_.Events,

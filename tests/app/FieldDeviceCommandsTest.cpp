@@ -1,7 +1,9 @@
 #include <gmock/gmock.h>
 
+#include <QLabel>
 #include <QLineEdit>
 #include <QPointer>
+#include <chrono>
 
 #include "devices/box/BoxConfig.h"
 #include "devices/charging/ChargeiButton.h"
@@ -11,6 +13,9 @@
 
 namespace {
 
+using namespace std::chrono_literals;
+using testing::HasSubstr;
+using testing::IsEmpty;
 using testing::SizeIs;
 
 /// The windows of utility boxes and of charging as the program opens them.
@@ -51,6 +56,19 @@ TEST_F(FieldDeviceCommands, ProgramABoxOnThePortOfTheSettings) {
   EXPECT_THAT(venue.Port.Sent, SizeIs(10));
   ASSERT_THAT(venue.Boxes.Boxes, SizeIs(1));
   EXPECT_EQ(venue.Boxes.Boxes[0].Text, "Programming Successful");
+}
+
+TEST_F(FieldDeviceCommands, CloseThePortOfTheMainWindowBeforeTheWindowOfBoxes) {
+  venue.Port.Open("/dev/ttyS0", "19200,N,8,1");
+  In<BoxConfig>("mnuBoxConfig", [this](BoxConfig&) { EXPECT_FALSE(venue.Port.PortOpen()); });
+}
+
+TEST_F(FieldDeviceCommands, EndAScoreDownloadWithoutABoxForTheWindowOfBoxes) {
+  venue.Events.At(1s, [this] { In<BoxConfig>("mnuBoxConfig", [](BoxConfig&) {}); });
+  venue.Press("GetScores");
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+  EXPECT_FALSE(venue.Port.PortOpen());
+  EXPECT_THAT(venue.Find<QLabel>("Status").text().toStdString(), HasSubstr("Download stopped"));
 }
 
 TEST_F(FieldDeviceCommands, KeepTheBoxesOfTheRunButNotTheEntries) {

@@ -189,6 +189,8 @@ void BoxConfig::Note(const BoxEntries& entries, BoxResult result) {
     const std::string time = parts_.Time.Now();
     parts_.Programmed.Add({time.substr(time.find(' ') + 1), entries, result});
     AddRow(parts_.Programmed.Count(), parts_.Programmed.All().back());
+    // The list measured its row before the button was there.
+    ui_->Results->resizeColumnToContents(ui_->Results->columnCount() - 1);
   }
 }
 

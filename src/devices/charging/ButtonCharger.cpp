@@ -53,10 +53,15 @@ void ButtonCharger::Step() {
         parts_.Display.SetStatus({});
         lastRom_ = {};
       }
+      if (!metButton_) {
+        parts_.Display.ButtonsLeft();
+      }
       deviceCount_ = 0;
+      metButton_ = false;
       break;
     case BusStep::BadRead:
       deviceCount_ = 0;
+      metButton_ = false;
       break;
     case BusStep::Device:
       ++deviceCount_;
@@ -67,11 +72,14 @@ void ButtonCharger::Step() {
 
 void ButtonCharger::TakeDevice() {
   currentRom_ = poll_.Rom();
-  if (currentRom_.front() == ReaderFamily || currentRom_ == lastRom_) {
+  if (currentRom_.front() == ReaderFamily) {
+    return;
+  }
+  metButton_ = true;
+  if (currentRom_ == lastRom_) {
     return;
   }
   parts_.Display.SetStatus({});
-  parts_.Display.BeginButton();
   if (ChargeButton()) {
     lastRom_ = currentRom_;
   }
@@ -87,6 +95,7 @@ bool ButtonCharger::ChargeButton() {
     Note(ChargeResult::NotRead);
     return false;
   }
+  parts_.Display.BeginButton();
   if (reading == Reading::Invalid) {
     const BoxAnswer answer =
         parts_.Boxes.Show("Was this an Ammo Mag iButton?", "iButton Invalid - Recovering",

@@ -50,5 +50,6 @@ class ButtonCharger {
   ReaderPoll::RomNumber currentRom_{};  ///< of the device just found
   ReaderPoll::RomNumber lastRom_{};     ///< of the button charged last; zeros when it has left
   std::int16_t deviceCount_ = 0;        ///< devices in this pass over the bus
+  bool metButton_ = false;              ///< one of them was not the reader's own
   bool readerMissing_ = false;
 };

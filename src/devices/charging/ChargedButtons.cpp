@@ -1,7 +1,7 @@
 #include "devices/charging/ChargedButtons.h"
 
 bool ChargedButtons::Add(const ChargedButton& button) {
-  const bool again = button.Result == ChargeResult::NotRead && !buttons_.empty() &&
+  const bool again = touching_ && button.Result == ChargeResult::NotRead && !buttons_.empty() &&
                      buttons_.back().Result == ChargeResult::NotRead &&
                      buttons_.back().DallasID == button.DallasID;
   if (again) {
@@ -12,5 +12,6 @@ bool ChargedButtons::Add(const ChargedButton& button) {
   }
   buttons_.push_back(button);
   ++count_;
+  touching_ = true;
   return true;
 }

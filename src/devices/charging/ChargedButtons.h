@@ -32,6 +32,9 @@ class ChargedButtons {
   /// is added; returns false for the others.
   bool Add(const ChargedButton& button);
 
+  /// The buttons have left the reader: the next try is one of a new touch.
+  void BeginTouch() { touching_ = false; }
+
   const std::vector<ChargedButton>& All() const { return buttons_; }
 
   /// Buttons added in this run, with those that went.
@@ -40,4 +43,5 @@ class ChargedButtons {
  private:
   std::vector<ChargedButton> buttons_;
   std::size_t count_ = 0;
+  bool touching_ = false;  ///< the last button may still be at the reader
 };

@@ -50,6 +50,7 @@ ChargeiButton::ChargeiButton(const Parts& parts, QWidget* parent)
   ui_->ReaderLabel->hide();
   ui_->Signals->SetUp(parts.Signals);
   SetUpResults();
+  parts_.Charged.BeginTouch();
   // Escape works at any time, unlike in windows that it would take out of a job: a poll is soon over.
   connect(ui_->Close, &QPushButton::clicked, this, &QDialog::reject);
   timer1_->setObjectName(QStringLiteral("Timer1"));

@@ -42,6 +42,7 @@ class ChargeiButton : public QDialog, private ChargingDisplay {
 
   void SetStatus(const std::string& text) override;
   void BeginButton() override;
+  void ButtonsLeft() override { parts_.Charged.BeginTouch(); }
   void SetReader(bool present) override;
   void Note(const ChargedButton& button) override;
   bool Closing() const override { return commands_.CloseRequested(); }

@@ -72,6 +72,7 @@ TEST_F(BoxProgramming, TakesAnyOtherByteForARejection) {
     programmer.Program(medic);
     EXPECT_THAT(Boxes.Boxes, ElementsAre(RejectedByBox())) << int{answer};
     EXPECT_THAT(results, ElementsAre(Pair("5", BoxResult::Rejected)));
+    EXPECT_EQ(boxesAtResult.back(), 0U);
     EXPECT_FALSE(Port.PortOpen());
   }
 }
@@ -101,6 +102,7 @@ TEST_F(BoxProgramming, TellsOfASilentBoxAfterTwoSeconds) {
   EXPECT_EQ(Events.Now(), 2009ms);
   EXPECT_THAT(Boxes.Boxes, ElementsAre(NoResponse()));
   EXPECT_THAT(results, ElementsAre(Pair("5", BoxResult::NoResponse)));
+  EXPECT_THAT(boxesAtResult, ElementsAre(0U));
   EXPECT_FALSE(Port.PortOpen());
 }
 

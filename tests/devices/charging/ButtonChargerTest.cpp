@@ -129,6 +129,42 @@ TEST_F(Charging, ChargesAButtonAgainAfterItLeftForAPass) {
   EXPECT_EQ(mag.Memory[33], 1);
 }
 
+TEST_F(Charging, TellsWhenAPassHasMetNoButton) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Pass();
+  Pass();
+  EXPECT_EQ(display.Left, 0);
+  bus.TakeAway(mag);
+  Pass();
+  EXPECT_EQ(display.Left, 1);
+}
+
+TEST_F(Charging, TellsItAlsoWithoutTheReadersDevice) {
+  bus.Devices.clear();
+  MemoryButton& mag = TouchedButton({0, 0});
+  Pass();
+  Pass();
+  EXPECT_EQ(display.Left, 0);
+  bus.TakeAway(mag);
+  Pass();
+  EXPECT_EQ(display.Left, 1);
+}
+
+TEST_F(Charging, TellsItAfterAPassThatWasSpoiled) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Ticks(1);
+  bus.TakeAway(mag);
+  bus.NextResults = {OneWire::BadRead};
+  Ticks(3);
+  EXPECT_EQ(display.Left, 1);
+}
+
+TEST_F(Charging, DoesNotTellItOfASpoiledPass) {
+  bus.NextResults = {OneWire::BadRead};
+  Ticks(1);
+  EXPECT_EQ(display.Left, 0);
+}
+
 TEST_F(Charging, DoesNotChargeAgainAButtonThatLeftForLessThanAPass) {
   MemoryButton& mag = TouchedButton({0, 0});
   Ticks(1);
@@ -211,6 +247,28 @@ TEST_F(Charging, ChargesNothingInASpoiledPassAndBeginsAtTheFirstDevice) {
   EXPECT_EQ(display.Status, "");
 }
 
+TEST_F(Charging, CountsFromTheStartAfterASpoiledPass) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Pass();
+  bus.TakeAway(mag);
+  Ticks(1);
+  bus.NextResults = {OneWire::BadRead};
+  Ticks(3);
+  EXPECT_EQ(display.Status, "");
+}
+
+TEST_F(Charging, ClearsTheStatusBeforeItJudgesTheNextButton) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Ticks(1);
+  bus.TakeAway(mag);
+  MemoryButton& torn = TouchedButton({1, 0});
+  torn.Memory[63] ^= 1;
+  std::string statusAtBox = "none";
+  boxes.WhileOpen = [&](const FakeMessageBoxes::Box&) { statusAtBox = display.Status; };
+  Pass();
+  EXPECT_EQ(statusAtBox, "");
+}
+
 TEST_F(Charging, WritesThroughTheScratchpad) {
   MemoryButton& mag = TouchedButton({0, 0});
   std::vector<std::uint8_t> sent;
@@ -287,6 +345,7 @@ TEST_F(MissingReader, OfADriverThatThrowsIsReportedOnce) {
     bus.Broken = operation;
     EXPECT_EQ(NumberThrownBy([this] { Ticks(1); }), Fault::FileNotFound) << operation;
     EXPECT_TRUE(charger.ReaderMissing()) << operation;
+    EXPECT_EQ(bus.Log.back(), "TMEndSession") << operation;
     EXPECT_EQ(NumberThrownBy([this] { Ticks(3); }), 0) << operation;
     EXPECT_FALSE(display.Reader) << operation;
     bus.Broken = "";

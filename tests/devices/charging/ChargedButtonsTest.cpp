@@ -28,6 +28,15 @@ TEST(ChargedButtons, TakesRepeatedTriesOfAnUnreadButtonForOne) {
   EXPECT_EQ(buttons.Count(), 5U);
 }
 
+TEST(ChargedButtons, TakesAnUnreadButtonThatWasTouchedAgainForAnother) {
+  ChargedButtons buttons;
+  EXPECT_TRUE(buttons.Add(Button("A", ChargeResult::NotRead)));
+  buttons.BeginTouch();
+  EXPECT_TRUE(buttons.Add(Button("A", ChargeResult::NotRead)));
+  EXPECT_FALSE(buttons.Add(Button("A", ChargeResult::NotRead)));
+  EXPECT_EQ(buttons.Count(), 2U);
+}
+
 TEST(ChargedButtons, LetsTheOldestGoAndCountsOn) {
   ChargedButtons buttons;
   for (std::size_t i = 0; i < ChargedButtons::Most + 3; ++i) {

@@ -34,10 +34,10 @@ class ChargeWindow : public testing::TestWithParam<Language> {
                                                                   .Charged = charged,
                                                                   .Signals = {ini, &sounds, strings}},
                                              nullptr);
-    Show(*window);
     started = Timer().isActive();
     interval = Timer().interval();
-    Timer().stop();  // ticks come from the test
+    Timer().stop();  // ticks come from the test, however long the window takes to come up
+    Show(*window);
   }
 
   QTimer& Timer() const { return Find<QTimer>(*window, "Timer1"); }
@@ -143,6 +143,8 @@ TEST_P(ChargeWindow, ListsTheButtonsNewestFirst) {
                                   In("Different when read back", "回读不一致")));
   EXPECT_THAT(Row(1), ElementsAre("1", "14:30:05", In("Ammo Mag", "弹匣"), "A10000000000010C",
                                   In("Charged", "已充值")));
+  EXPECT_NE(Results().item(0, 0)->background().style(), Qt::NoBrush);
+  EXPECT_EQ(Results().item(1, 0)->background().style(), Qt::NoBrush);
 }
 
 TEST_P(ChargeWindow, ListsWhatWasNotChargedAndWhy) {
@@ -163,6 +165,19 @@ TEST_P(ChargeWindow, FindsItsListAgain) {
   Open();
   ASSERT_EQ(Results().rowCount(), 1);
   EXPECT_EQ(Row(0)[3], "A10000000000010C");
+}
+
+TEST_P(ChargeWindow, CountsOnWhereTheListNoLongerHoldsTheFirstButtons) {
+  for (std::size_t i = 0; i < ChargedButtons::Most + 2; ++i) {
+    charged.Add({"09:00:00", 0, "A10000000000010C", ChargeResult::Charged});
+  }
+  Open();
+  TouchedButton({0, 0});
+  Ticks(1);
+  EXPECT_EQ(Results().rowCount(), static_cast<int>(ChargedButtons::Most));
+  EXPECT_EQ(Row(0)[0], "503");
+  EXPECT_EQ(Row(1)[0], "502");
+  EXPECT_EQ(Row(Results().rowCount() - 1)[0], "4");
 }
 
 TEST_P(ChargeWindow, SignalsWhatTheReadingBackShowed) {
@@ -186,6 +201,50 @@ TEST_P(ChargeWindow, SignalsAButtonThatCannotBeReadOnlyOnce) {
   Ticks(7);
   EXPECT_EQ(Results().rowCount(), 1);
   EXPECT_THAT(sounds.Played, SizeIs(1));
+}
+
+TEST_P(ChargeWindow, KeepsTheSignOfAButtonThatCannotBeRead) {
+  TouchedButton({0, 0});
+  bus.FailingAccesses = 9;
+  for (int tick = 0; tick < 7; ++tick) {
+    Ticks(1);
+    EXPECT_EQ(TextOf("Sign"), In("\u2717 Not read", "\u2717 未能读取")) << tick;
+  }
+}
+
+TEST_P(ChargeWindow, SignalsAButtonThatCannotBeReadAtEachTouch) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  bus.FailingAccesses = 6;
+  Ticks(1);
+  bus.TakeAway(mag);
+  Ticks(4);
+  bus.Put(mag);
+  Ticks(4);
+  EXPECT_EQ(Results().rowCount(), 2);
+  EXPECT_THAT(sounds.Played, SizeIs(2));
+}
+
+TEST_P(ChargeWindow, SignalsAButtonThatCannotBeReadWhenItIsOpenedAgainToo) {
+  TouchedButton({0, 0});
+  bus.FailingAccesses = 6;
+  Ticks(1);
+  Press(*window, "Close");
+  Open();
+  Ticks(1);
+  EXPECT_EQ(Results().rowCount(), 2);
+  EXPECT_THAT(sounds.Played, SizeIs(2));
+}
+
+TEST_P(ChargeWindow, TakesTheSignAwayWhileItAsks) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  Ticks(1);
+  bus.TakeAway(mag);
+  MemoryButton& torn = TouchedButton({1, 0});
+  torn.Memory[63] ^= 1;
+  std::string signAtBox = "none";
+  boxes.WhileOpen = [&](const FakeMessageBoxes::Box&) { signAtBox = TextOf("Sign"); };
+  Ticks(4);
+  EXPECT_EQ(signAtBox, "");
 }
 
 TEST_P(ChargeWindow, TellsOfAMissingReaderOnceAndLooksEveryTwoSeconds) {
@@ -258,6 +317,21 @@ TEST_P(ChargeWindow, ClosesByButtonEscapeAndCloseBoxEvenInATick) {
     bus.OnCall = {};
   }
   EXPECT_FALSE(bus.SessionOpen());
+}
+
+TEST_P(ChargeWindow, EndsAWriteSilentlyWhenItIsClosedInIt) {
+  MemoryButton& mag = TouchedButton({0, 0});
+  bus.BeforeByte = [this](std::size_t byte) {
+    constexpr std::size_t inTheWrite = 40;
+    if (byte == inTheWrite) {
+      window->close();
+    }
+  };
+  Ticks(1);
+  EXPECT_FALSE(window->isVisible());
+  EXPECT_EQ(mag.Copies, 1U);
+  EXPECT_THAT(charged.All(), SizeIs(1));
+  EXPECT_THAT(sounds.Played, IsEmpty());
 }
 
 TEST_P(ChargeWindow, IsCaredForWithAndWithoutButtons) {

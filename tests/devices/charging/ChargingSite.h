@@ -18,11 +18,13 @@ class FakeChargingDisplay : public ChargingDisplay {
   std::string Status;
   bool Reader = true;
   int Begun = 0;
+  int Left = 0;
   bool IsClosing = false;
   std::vector<ChargedButton> Notes;
 
   void SetStatus(const std::string& text) override { Status = text; }
   void BeginButton() override { ++Begun; }
+  void ButtonsLeft() override { ++Left; }
   void SetReader(bool present) override { Reader = present; }
   void Note(const ChargedButton& button) override { Notes.push_back(button); }
   bool Closing() const override { return IsClosing; }

@@ -68,6 +68,20 @@ TEST_F(TornTouch, ReadsAgainWhenTheCommandWasDisturbed) {
   EXPECT_THAT(boxes.Boxes, IsEmpty());
 }
 
+/// Zeros have the right check byte: a Bandage would become an Ammo Mag.
+TEST_F(TornTouch, DoesNotTakeWhatLiesElsewhereForTheBlock) {
+  MemoryButton& bandage = TouchedButton({1, 0});
+  std::fill_n(bandage.Memory.begin(), 32, std::uint8_t{0});
+  const auto onByte = bus.OnByte;
+  bus.OnByte = [&](std::uint8_t byte) {
+    constexpr std::size_t lowByteOfTheAddress = 1;
+    return onByte(static_cast<std::uint8_t>(bus.Bytes == lowByteOfTheAddress ? byte ^ 0x20U : byte));
+  };
+  Ticks(1);
+  EXPECT_EQ(BlockOf(bandage)[0], 1);
+  EXPECT_EQ(display.Status, "Charged Bandage OK");
+}
+
 TEST_F(TornTouch, WritesNothingWhenTheButtonDoesNotAnswer) {
   MemoryButton& bandage = TouchedButton({1, 0});
   const auto before = bandage.Memory;
@@ -239,6 +253,15 @@ TEST_F(TornTouch, AsksNothingWhenTheWindowCloses) {
   Ticks(1);
   EXPECT_THAT(boxes.Boxes, IsEmpty());
   EXPECT_EQ(torn.Copies, 0U);
+}
+
+TEST_F(TornTouch, WritesNothingWhenTheWindowClosesWhileItAsks) {
+  MemoryButton& torn = TouchedButton({7, 0});
+  torn.Memory[63] ^= 1;
+  boxes.WhileOpen = [this](const FakeMessageBoxes::Box&) { display.IsClosing = true; };
+  Ticks(1);
+  EXPECT_EQ(torn.Copies, 0U);
+  EXPECT_THAT(display.Notes, IsEmpty());
 }
 
 /// The button bounces while it is read, or leaves for good at any time.
