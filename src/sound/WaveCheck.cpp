@@ -164,6 +164,12 @@ WaveCheck CheckWave(const Files& files, const std::string& path) {
   return CheckChunks(*chunks);
 }
 
+bool IsPlainChipWave(const WaveCheck& check) {
+  constexpr std::uint16_t aLaw = 6;
+  constexpr std::uint16_t muLaw = 7;
+  return check.Error == WaveError::None && check.Format.Tag != aLaw && check.Format.Tag != muLaw;
+}
+
 bool IsWave(std::string_view path) {
   constexpr std::string_view extension = "wav";
   const std::string_view end =

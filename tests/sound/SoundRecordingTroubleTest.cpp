@@ -163,6 +163,21 @@ TEST_F(Interrupted, WaitsForTheHeaderOfTheFirstSoundOnly) {
   EXPECT_EQ(display.Statuses.back(), "Recording Failed.");
 }
 
+TEST_F(Interrupted, IsNotAnsweredByWhatCameTooLateForTheTryBefore) {
+  Use(Recorder::InProduct);
+  Fill({{"", ""}});
+  hardware.Acknowledges = [](const std::string&) { return false; };
+  Record();
+  port.Receive({0xAA});
+  Record();
+  ExpectTimeOuts(2);
+  EXPECT_THAT(hardware.Log, ElementsAre("start", "start"));
+  port.Receive({0xAA});
+  Test();
+  ExpectTimeOuts(3);
+  EXPECT_EQ(display.Statuses[display.Statuses.size() - 2], "Test of sound 1 failed.");
+}
+
 TEST_F(Interrupted, TakesTwoMergedAnswersOneByOne) {
   hardware.EraseTime = hardware.AnswerTime;  // both bytes are there when the wait looks
   Fill({{"", ""}});
