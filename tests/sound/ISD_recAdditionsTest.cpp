@@ -106,6 +106,24 @@ TEST_F(SoundAdditions, ShowTheLevelOfTheSelectedSound) {
   EXPECT_EQ(TextOf("LevelText"), "Peak: -6.0 dB");
 }
 
+TEST_F(SoundAdditions, LeaveTheLevelAloneWhileARecordingRuns) {
+  Disk.Put("/sounds/half.raw", std::string(300, char(64)));
+  Disk.Put("/sounds/loud.raw", std::string(300, char(255)));
+  SetSound(1, "/sounds/loud.raw");
+  SetSound(0, "/sounds/half.raw");
+  std::string meanwhile;
+  Hardware.Acknowledges = [&](const std::string& what) {
+    if (what == "header 1") {
+      EXPECT_EQ(List().SelectedRow(), 1);
+      meanwhile = TextOf("LevelText");
+    }
+    return true;
+  };
+  Press("RecordButton");
+  EXPECT_EQ(meanwhile, "Peak: -6.0 dB");
+  EXPECT_EQ(TextOf("LevelText"), "Peak: -0.1 dB, clipped samples: 300");
+}
+
 TEST_F(SoundAdditions, ConvertASoundOfAnotherFormatBesideItsOriginal) {
   List().SelectRow(1);
   Dialog.Answers = {"/sounds/stereo.wav"};
@@ -156,6 +174,20 @@ TEST_F(SoundAdditions, EndAConversionWhenTheWindowCloses) {
   Press("ConvertSound");
   EXPECT_FALSE(Window->isVisible());
   EXPECT_FALSE(Disk.FileExists("/sounds/stereo-chip.wav"));
+}
+
+TEST_F(SoundAdditions, SayNothingMoreWhenTheWindowClosesInAConversion) {
+  Disk.Put("/sounds/later-bad.wav", Wave(Samples(300)));
+  SetSound(2, "/sounds/later-bad.wav");
+  Disk.Put("/sounds/later-bad.wav", "text");
+  Converter.InTheMidst = [this] { Events.At(milliseconds(0), [this] { Window->close(); }); };
+  Dialog.Answers = {"/sounds/stereo.wav"};
+  Press("ConvertSound");
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  Window->show();
+  Drop(0, {"/sounds/stereo.wav", "/sounds/a.flac"});
+  EXPECT_THAT(BoxTexts(), ElementsAre(HasSubstr("stereo.wav is not in the sound chip's format.")));
+  EXPECT_FALSE(Window->isVisible());
 }
 
 TEST_F(SoundAdditions, LandDroppedSoundsOnTheirRows) {

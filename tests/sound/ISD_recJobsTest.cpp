@@ -221,6 +221,16 @@ TEST_F(SoundJobs, ReportASoundOfNoPagesAndCloseTheLine) {
   EXPECT_THAT(Hardware.Log, ElementsAre("start", "erase"));
 }
 
+TEST_F(SoundJobs, FailAtASoundOfNoPagesBehindAnother) {
+  Disk.Put("/sounds/128.raw", std::string(128, 'x'));
+  SetSound(0, "/sounds/400.raw");
+  SetSound(1, "/sounds/128.raw");
+  Press("RecordButton");
+  EXPECT_THAT(Hardware.Log, ElementsAre("start", "erase", "header 0", "pages 2", "data", "data"));
+  EXPECT_EQ(TextOf("StatusLabel"), "Recording Failed.");
+  EXPECT_EQ(TextOf("Status2"), "");
+}
+
 TEST_F(SoundJobs, ReportMoreThan128RowsBeforeTheLineIsOpened) {
   Disk.Put("/program/sound_list_maltrone.xml", Definition(std::vector<std::string>(130, "Event")));
   Combo("ProductSelect").setCurrentIndex(1);

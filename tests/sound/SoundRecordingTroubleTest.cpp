@@ -179,8 +179,22 @@ TEST_F(Interrupted, IsNotAnsweredByWhatCameTooLateForTheTryBefore) {
 }
 
 TEST_F(Interrupted, TakesTwoMergedAnswersOneByOne) {
-  hardware.EraseTime = hardware.AnswerTime;  // both bytes are there when the wait looks
   Fill({{"", ""}});
+  hardware.Erases = false;
+  hardware.Acknowledges = [this](const std::string& what) {
+    if (what == "erase") {
+      pump.At(milliseconds(2000), [this] { port.Receive({0xAA, 0xAA}); });
+    }
+    return what != "erase";
+  };
+  Record();
+  ExpectTimeOuts(0);
+  EXPECT_EQ(display.Statuses.back(), "Recording Complete.");
+}
+
+TEST_F(Interrupted, HearsAnAnswerBetweenOtherBytes) {
+  Fill({{"/a.raw", Samples(300)}});
+  hardware.Answer = {0x55, 0xAA, 0x55};
   Record();
   ExpectTimeOuts(0);
   EXPECT_EQ(display.Statuses.back(), "Recording Complete.");
