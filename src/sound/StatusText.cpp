@@ -1,5 +1,6 @@
 #include "sound/StatusText.h"
 
+#include <QFontInfo>
 #include <QPainter>
 #include <QStyle>
 #include <cmath>
@@ -40,7 +41,15 @@ int StatusText::NeededHeight(const QFont& font, int width) const {
 
 QFont StatusText::FontFor(int width) const {
   const bool fits = NeededHeight(font(), width) <= MostLines * fontMetrics().lineSpacing();
-  return fits || parentWidget() == nullptr ? font() : parentWidget()->font();
+  if (fits || parentWidget() == nullptr) {
+    return font();
+  }
+  // A painter takes from the widget's own font what is not set here.
+  const QFont& around = parentWidget()->font();
+  QFont plain = font();
+  plain.setBold(around.bold());
+  plain.setPixelSize(QFontInfo(around).pixelSize());
+  return plain;
 }
 
 int StatusText::heightForWidth(int width) const {

@@ -5,6 +5,7 @@
 #include <QTest>
 
 #include "platform/RuntimeError.h"
+#include "sound/StatusText.h"
 #include "tests/sound/SoundWindow.h"
 #include "tests/support/Captions.h"
 
@@ -326,6 +327,26 @@ TEST_F(SoundRecorder, KeepsItsButtonsApartWhateverThePath) {
     Press("RecordButton");
     EXPECT_EQ(looks, 1);
   }
+}
+
+TEST(StatusText, LooksPlainWhenItIsLongAndLargeWhenItIsShort) {
+  QWidget around;
+  StatusText plain(&around);
+  StatusText large(&around);
+  QFont font = large.font();
+  font.setPointSize(13);
+  font.setBold(true);
+  large.setFont(font);
+  for (StatusText* text : {&plain, &large}) {
+    text->resize(500, 100);
+    text->setText(QString(300, QLatin1Char('n')));
+  }
+  EXPECT_EQ(large.grab().toImage(), plain.grab().toImage());
+  EXPECT_EQ(large.heightForWidth(500), plain.heightForWidth(500));
+  for (StatusText* text : {&plain, &large}) {
+    text->setText(QStringLiteral("Idle"));
+  }
+  EXPECT_NE(large.grab().toImage(), plain.grab().toImage());
 }
 
 TEST_F(SoundRecorder, TellsWhatIsTooLongForACellInItsToolTip) {
