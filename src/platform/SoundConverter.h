@@ -25,7 +25,7 @@ class SoundConverter {
   /// Mixes the channels of a file, whatever its rate and sample form, down to unsigned 8-bit mono at
   /// `samplesPerSecond`. `progress` is called now and then with the share that is done, 0 to 1; false from it
   /// stops, and nothing is returned. Throws RuntimeError 53 if there is no such file, 321 if it cannot be
-  /// read or converted; the text says why.
+  /// read or converted; the text names it and says why.
   virtual std::optional<ConvertedSound> Convert(const std::string& path, int samplesPerSecond,
                                                 const std::function<bool(double)>& progress) const = 0;
 };

@@ -143,11 +143,18 @@ void ISD_rec::ChangeProduct(int index) {
 }
 
 void ISD_rec::SetupComm() {
-  if (parts_.MSComm1.PortOpen()) {
-    parts_.MSComm1.SetSettings(LineSettings(SelectedRecorder()));
+  const auto shown = qScopeGuard([this] {
+    ShowNotes();
+    ShowEstimate();
+  });
+  if (link_ != nullptr) {
+    link_->SetupComm();  // a line that fails now is told of by the job
+  } else if (parts_.MSComm1.PortOpen()) {
+    RecorderLink link = Link();
+    link.SetupComm();
+    link.Job().LeaveOpen();
+    link.ThrowIfLineLost();
   }
-  ShowNotes();
-  ShowEstimate();
 }
 
 void ISD_rec::UpdateUtilisation() {
@@ -246,20 +253,24 @@ void ISD_rec::TestAll() {
 }
 
 void ISD_rec::WorkOnLine(const std::function<void(RecorderLink&)>& job) {
-  onLine_ = true;
+  RecorderLink link = Link();
+  link_ = &link;
   const auto ended = qScopeGuard([this] {
-    onLine_ = false;
+    link_ = nullptr;
     HideProgress();
     ShowLevel();
   });
-  RecorderLink link({.MSComm1 = parts_.MSComm1,
-                     .Events = parts_.Events,
-                     .Boxes = parts_.Boxes,
-                     .RecorderSelect = [this] { return SelectedRecorder(); },
-                     .StopRequested = [this] { return StopRequested(); }});
   link.Open(port_.Device());
   job(link);
   link.ThrowIfLineLost();
+}
+
+RecorderLink ISD_rec::Link() {
+  return RecorderLink({.MSComm1 = parts_.MSComm1,
+                       .Events = parts_.Events,
+                       .Boxes = parts_.Boxes,
+                       .RecorderSelect = [this] { return SelectedRecorder(); },
+                       .StopRequested = [this] { return StopRequested(); }});
 }
 
 Recorder ISD_rec::SelectedRecorder() const {

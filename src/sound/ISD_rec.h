@@ -71,7 +71,7 @@ class ISD_rec : public QDialog, private RecorderDisplay {
 
   void LoadProduct();
   void ChangeProduct(int index);
-  /// Sets the speed of the line if it is open.
+  /// Sets the speed of the line if it is open. One that is lost is closed.
   void SetupComm();
   void UpdateUtilisation();
 
@@ -88,6 +88,7 @@ class ISD_rec : public QDialog, private RecorderDisplay {
   void TestAll();
   /// Runs a job on the line, which is opened if need be.
   void WorkOnLine(const std::function<void(RecorderLink&)>& job);
+  RecorderLink Link();
 
   Recorder SelectedRecorder() const;
   /// The selected row, if there is one.
@@ -105,9 +106,13 @@ class ISD_rec : public QDialog, private RecorderDisplay {
   void BeginProgress();
   void HideProgress();
   void ConvertOne();
-  void ConvertInto(const std::string& path, std::size_t row);
+  /// Converts a sound and gives it to a row. Returns what the operator should read; nothing if the window
+  /// closes.
+  std::optional<std::string> ConvertInto(const std::string& path, std::size_t row);
+  void ShowOutcomes(const std::vector<std::string>& outcomes);
   void TakeDroppedFiles(int row, const QStringList& paths);
-  void PlaceDroppedFile(const std::string& path, std::size_t row);
+  /// Returns the outcome if the file was converted.
+  std::optional<std::string> PlaceDroppedFile(const std::string& path, std::size_t row);
 
   void SetStatus(const std::string& text) override;
   void SetStatus2(const std::string& text) override;
@@ -125,7 +130,7 @@ class ISD_rec : public QDialog, private RecorderDisplay {
   PollTimer* tmrCheck_ = nullptr;  ///< ticks while a sound plays
   int shownProduct_ = 0;
   bool previewing_ = false;       ///< all rows are played
-  bool onLine_ = false;           ///< a job on the line is on the stack
+  RecorderLink* link_ = nullptr;  ///< of the job that is on the stack
   std::int64_t pagesToSend_ = 0;  ///< of all rows
   std::int64_t pagesBegun_ = 0;   ///< in the recording that runs
   std::chrono::microseconds jobStart_{0};

@@ -86,7 +86,7 @@ void ISD_rec::ShowEstimate() {
 }
 
 void ISD_rec::ShowLevel() {
-  if (onLine_) {
+  if (link_ != nullptr) {
     return;  // the disk serves the job
   }
   SoundLevels levels;
@@ -162,15 +162,22 @@ void ISD_rec::ConvertOne() {
   if (!path || !MayBeKept(*path)) {
     return;
   }
-  if (IsWave(*path) && CheckWave(parts_.Disk, *path).Error == WaveError::None) {
+  std::optional<std::string> outcome;
+  if (IsWave(*path) && IsPlainChipWave(CheckWave(parts_.Disk, *path))) {
     list_.AddSoundToList(*path, *row);
-    UpdateUtilisation();
   } else {
-    ConvertInto(*path, *row);
+    outcome = ConvertInto(*path, *row);
+  }
+  if (StopRequested()) {
+    return;
+  }
+  UpdateUtilisation();
+  if (outcome) {
+    ShowOutcomes({*outcome});
   }
 }
 
-void ISD_rec::ConvertInto(const std::string& path, std::size_t row) {
+std::optional<std::string> ISD_rec::ConvertInto(const std::string& path, std::size_t row) {
   jobStart_ = parts_.Elapsed.Elapsed();
   const auto ended = qScopeGuard([this] { HideProgress(); });
   const auto sound = parts_.Converter.Convert(path, SoundChip::SamplesPerSecond, [this](double done) {
@@ -179,19 +186,24 @@ void ISD_rec::ConvertInto(const std::string& path, std::size_t row) {
     return !StopRequested();
   });
   if (!sound) {
-    return;
+    return std::nullopt;
   }
   const std::string converted = ConvertedName(parts_.Disk, path);
   parts_.Disk.Replace(converted, WaveBytes(sound->Samples));
   list_.AddSoundToList(converted, row);
-  UpdateUtilisation();
   const std::string peak = DecibelText(sound->Peak);
   const StringTable& strings = parts_.Strings;
   const OwnText words = peak.empty()         ? OwnText::ConvertedSilent
                         : sound->Clipped > 0 ? OwnText::ConvertedClipped
                                              : OwnText::Converted;
-  ui_->Notes->insertItem(0, QString::fromStdString(Filled(
-                                strings.Text(words), {converted, peak, std::to_string(sound->Clipped)})));
+  return Filled(strings.Text(words), {converted, peak, std::to_string(sound->Clipped)});
+}
+
+void ISD_rec::ShowOutcomes(const std::vector<std::string>& outcomes) {
+  int row = 0;
+  for (const std::string& outcome : outcomes) {
+    ui_->Notes->insertItem(row++, QString::fromStdString(outcome));
+  }
   ui_->Notes->scrollToTop();
 }
 
@@ -200,29 +212,42 @@ void ISD_rec::TakeDroppedFiles(int row, const QStringList& paths) {
     return;
   }
   commands_.Run([&] {
-    for (qsizetype i = 0; i < paths.size() && row + i < model_->rowCount() && !StopRequested(); ++i) {
-      PlaceDroppedFile(paths[i].toStdString(), static_cast<std::size_t>(row + i));
+    std::vector<std::string> outcomes;
+    bool goesOn = true;
+    for (qsizetype i = 0; i < paths.size() && row + i < model_->rowCount() && goesOn; ++i) {
+      // A failure ends the rest, but what was done until then is shown.
+      goesOn = commands_.Run([&] {
+        if (const auto outcome =
+                PlaceDroppedFile(paths[i].toStdString(), static_cast<std::size_t>(row + i))) {
+          outcomes.push_back(*outcome);
+        }
+      });
+      goesOn = goesOn && !StopRequested();
+      model_->Refresh();
+    }
+    if (!StopRequested()) {
+      UpdateUtilisation();
+      ShowOutcomes(outcomes);
     }
   });
 }
 
-void ISD_rec::PlaceDroppedFile(const std::string& path, std::size_t row) {
-  if (!MayBeKept(path)) {
-    return;
+std::optional<std::string> ISD_rec::PlaceDroppedFile(const std::string& path, std::size_t row) {
+  if (parts_.Disk.FolderExists(path) || !MayBeKept(path)) {
+    return std::nullopt;
   }
   SelectRow(row);
-  const WaveError error = IsWave(path) ? CheckWave(parts_.Disk, path).Error : WaveError::None;
-  const bool fits = IsWave(path) ? error == WaveError::None : IsRawSamples(path);
+  const WaveCheck check = IsWave(path) ? CheckWave(parts_.Disk, path) : WaveCheck();
+  const bool fits = IsWave(path) ? IsPlainChipWave(check) : IsRawSamples(path);
   if (!fits && parts_.Converter.CanRead(path)) {
     const BoxAnswer answer = parts_.Boxes.Show(Filled(parts_.Strings.Text(OwnText::ConvertQuestion), {path}),
                                                DefaultBoxTitle, BoxIcon::Question, BoxButtons::YesNo);
-    if (answer == BoxAnswer::Yes) {
-      ConvertInto(path, row);
-    }
-  } else if (error != WaveError::None) {
-    ShowWaveError(parts_.Boxes, error);
-  } else {
-    list_.AddSoundToList(path, row);
-    UpdateUtilisation();
+    return answer == BoxAnswer::Yes ? ConvertInto(path, row) : std::nullopt;
   }
+  if (check.Error == WaveError::None) {
+    list_.AddSoundToList(path, row);
+  } else {
+    ShowWaveError(parts_.Boxes, check.Error);
+  }
+  return std::nullopt;
 }

@@ -12,9 +12,15 @@ RecorderLink::RecorderLink(const Parts& parts)
     : parts_(parts), job_(parts.MSComm1, parts.Events, "sound-recorder", parts.StopRequested) {}
 
 void RecorderLink::Open(const std::string& device) {
-  if (!parts_.MSComm1.PortOpen()) {
+  if (parts_.MSComm1.PortOpen()) {
+    job_.ClearInput();
+  } else {
     job_.Open(device, LineSettings(Mode()));
   }
+}
+
+void RecorderLink::SetupComm() {
+  job_.SetSettings(LineSettings(Mode()));
 }
 
 void RecorderLink::SendCommand(std::initializer_list<std::uint8_t> bytes) {

@@ -55,8 +55,12 @@ class RecorderLink {
 
   explicit RecorderLink(const Parts& parts);
 
-  /// Opens the line unless an earlier job left it open. Throws as SerialPort::Open does.
+  /// Opens the line. If an earlier job left it open, what came too late for that one is dropped. Throws as
+  /// SerialPort::Open does.
   void Open(const std::string& device);
+
+  /// Gives the open line the speed of the selected recorder.
+  void SetupComm();
 
   Recorder Mode() const { return parts_.RecorderSelect(); }
   SerialJob& Job() { return job_; }

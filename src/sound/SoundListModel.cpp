@@ -58,7 +58,7 @@ QVariant SoundListModel::data(const QModelIndex& index, int role) const {
     case Qt::DisplayRole:
       return TextOf(row, index.column());
     case Qt::ToolTipRole:
-      return index.column() == FileColumn ? TextOf(row, FileColumn).left(LongestToolTip) : QVariant();
+      return index.column() <= FileColumn ? TextOf(row, index.column()).left(LongestToolTip) : QVariant();
     case Qt::TextAlignmentRole:
       return QVariant(Qt::AlignVCenter | (index.column() >= SecondsColumn ? Qt::AlignRight : Qt::AlignLeft));
     default:

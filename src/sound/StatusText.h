@@ -2,8 +2,8 @@
 
 #include <QLabel>
 
-/// A label that shows all of its text in as many lines as it takes, and breaks a path where it must. The text
-/// never widens the window.
+/// A label that shows its text in as many lines as it takes, and breaks a path where it must. A long text is
+/// shown in the window's own font. The text never widens the window, nor pushes its buttons together.
 class StatusText : public QLabel {
  public:
   explicit StatusText(QWidget* parent = nullptr);
@@ -14,4 +14,8 @@ class StatusText : public QLabel {
 
  protected:
   void paintEvent(QPaintEvent* event) override;
+
+ private:
+  int NeededHeight(const QFont& font, int width) const;
+  QFont FontFor(int width) const;
 };

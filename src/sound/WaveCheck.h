@@ -44,5 +44,9 @@ struct WaveCheck {
 /// which count only behind the format. Declared sizes are trusted.
 WaveCheck CheckWave(const Files& files, const std::string& path);
 
+/// True if the check found samples that are plain numbers. It takes companded ones (A-law, mu-law) as well,
+/// since it does not look at the tag.
+bool IsPlainChipWave(const WaveCheck& check);
+
 /// True if the path's last three characters are "wav" in any case; every other file is raw samples.
 bool IsWave(std::string_view path);

@@ -34,6 +34,17 @@ class FakeRecorder {
   std::vector<std::vector<std::uint8_t>> Data;
   std::vector<std::uint8_t> CheckBytes;
 
+  /// As after its power was off for a moment.
+  void Forget() {
+    Log.clear();
+    Data.clear();
+    CheckBytes.clear();
+    bytes_.clear();
+    dataLeft_ = 0;
+    pageCountComes_ = false;
+    started_ = false;
+  }
+
  private:
   void Take(std::uint8_t byte) {
     bytes_.push_back(byte);

@@ -106,6 +106,24 @@ TEST_F(SoundAdditions, ShowTheLevelOfTheSelectedSound) {
   EXPECT_EQ(TextOf("LevelText"), "Peak: -6.0 dB");
 }
 
+TEST_F(SoundAdditions, LeaveTheLevelAloneWhileARecordingRuns) {
+  Disk.Put("/sounds/half.raw", std::string(300, char(64)));
+  Disk.Put("/sounds/loud.raw", std::string(300, char(255)));
+  SetSound(1, "/sounds/loud.raw");
+  SetSound(0, "/sounds/half.raw");
+  std::string meanwhile;
+  Hardware.Acknowledges = [&](const std::string& what) {
+    if (what == "header 1") {
+      EXPECT_EQ(List().SelectedRow(), 1);
+      meanwhile = TextOf("LevelText");
+    }
+    return true;
+  };
+  Press("RecordButton");
+  EXPECT_EQ(meanwhile, "Peak: -6.0 dB");
+  EXPECT_EQ(TextOf("LevelText"), "Peak: -0.1 dB, clipped samples: 300");
+}
+
 TEST_F(SoundAdditions, ConvertASoundOfAnotherFormatBesideItsOriginal) {
   List().SelectRow(1);
   Dialog.Answers = {"/sounds/stereo.wav"};
@@ -158,6 +176,20 @@ TEST_F(SoundAdditions, EndAConversionWhenTheWindowCloses) {
   EXPECT_FALSE(Disk.FileExists("/sounds/stereo-chip.wav"));
 }
 
+TEST_F(SoundAdditions, SayNothingMoreWhenTheWindowClosesInAConversion) {
+  Disk.Put("/sounds/later-bad.wav", Wave(Samples(300)));
+  SetSound(2, "/sounds/later-bad.wav");
+  Disk.Put("/sounds/later-bad.wav", "text");
+  Converter.InTheMidst = [this] { Events.At(milliseconds(0), [this] { Window->close(); }); };
+  Dialog.Answers = {"/sounds/stereo.wav"};
+  Press("ConvertSound");
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+  Window->show();
+  Drop(0, {"/sounds/stereo.wav", "/sounds/a.flac"});
+  EXPECT_THAT(BoxTexts(), ElementsAre(HasSubstr("stereo.wav is not in the sound chip's format.")));
+  EXPECT_FALSE(Window->isVisible());
+}
+
 TEST_F(SoundAdditions, LandDroppedSoundsOnTheirRows) {
   Drop(1, {"/sounds/300.wav", "/sounds/400.raw", "/sounds/300.wav"});
   EXPECT_THAT(Paths(), ElementsAre("", "/sounds/300.wav", "/sounds/400.raw"));
@@ -175,6 +207,49 @@ TEST_F(SoundAdditions, AskBeforeTheyConvertADroppedSound) {
   Boxes.Answers = {BoxAnswer::No};
   Drop(1, {"/sounds/a.flac"});
   EXPECT_THAT(Paths(), ElementsAre("/sounds/stereo-chip.wav", "", ""));
+}
+
+TEST_F(SoundAdditions, TellTheOutcomeOfEachDroppedSoundThatTheyConvert) {
+  Drop(0, {"/sounds/stereo.wav", "/sounds/300.wav", "/sounds/a.flac"});
+  EXPECT_THAT(Paths(), ElementsAre("/sounds/stereo-chip.wav", "/sounds/300.wav", "/sounds/a-chip.wav"));
+  EXPECT_THAT(Notes(), ElementsAre("Converted to /sounds/stereo-chip.wav. Peak: -6.0 dB",
+                                   HasSubstr("Converted to /sounds/a-chip.wav. Too loud: 300 samples")));
+}
+
+TEST_F(SoundAdditions, ReckonOnceForAllDroppedSounds) {
+  SetSound(2, "/sounds/300.wav");
+  Disk.Put("/sounds/300.wav", "text");
+  Boxes.Boxes.clear();
+  Drop(0, {"/sounds/400.raw", "/sounds/400.raw"});
+  EXPECT_THAT(BoxTexts(), ElementsAre("Sound File Format error: Not a Wave file."));
+}
+
+TEST_F(SoundAdditions, KeepWhatLandedBeforeADroppedSoundThatFails) {
+  Disk.FailReplace("/sounds/stereo-chip.wav",
+                   RuntimeError(Fault::DiskFull, "Disk full: /sounds/stereo-chip.wav"));
+  Drop(0, {"/sounds/400.raw", "/sounds/stereo.wav", "/sounds/300.wav"});
+  EXPECT_THAT(BoxTexts(), ElementsAre(HasSubstr("Convert it?"),
+                                      "Run-time error '61': Disk full: /sounds/stereo-chip.wav"));
+  EXPECT_THAT(Paths(), ElementsAre("/sounds/400.raw", "", ""));
+  EXPECT_THAT(TextOf("Utilisation"), HasSubstr("0.02 seconds"));
+}
+
+TEST_F(SoundAdditions, TakeNoDroppedFolder) {
+  Disk.AddFolder("/sounds/folder");
+  Drop(0, {"/sounds/folder"});
+  EXPECT_THAT(Paths(), ElementsAre("", "", ""));
+  EXPECT_THAT(Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(SoundAdditions, ConvertACompandedWaveThoughItPassesTheCheck) {
+  Disk.Put("/sounds/law.wav", Riff(FormatChunk(1, 22050, 8, 7) + Chunk("data", "1234")));
+  Converter.Sounds["/sounds/law.wav"] = {.Samples = std::vector<std::uint8_t>(512, 130), .Peak = 0.5};
+  Dialog.Answers = {"/sounds/law.wav"};
+  Press("ConvertSound");
+  Drop(1, {"/sounds/law.wav"});
+  EXPECT_THAT(Paths(), ElementsAre("/sounds/law-chip.wav", "/sounds/law-chip-2.wav", ""));
+  SetSound(2, "/sounds/law.wav");
+  EXPECT_EQ(Paths()[2], "/sounds/law.wav");
 }
 
 TEST_F(SoundAdditions, TellADroppedWaveThatIsNone) {

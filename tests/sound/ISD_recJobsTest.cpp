@@ -101,6 +101,45 @@ TEST_F(SoundJobs, ChangeTheSpeedOfAnOpenLineAtOnce) {
   EXPECT_THAT(Port.Log, Contains("Settings 19200,N,8,1"));
 }
 
+TEST_F(SoundJobs, CloseAnOpenLineThatIsLostWhenItsSpeedChanges) {
+  Hardware.Acknowledges = [](const std::string&) { return false; };
+  Press("RecordButton");
+  Boxes.Boxes.clear();
+  Port.Lose();
+  Combo("RecorderSelect").setCurrentIndex(0);
+  EXPECT_THAT(BoxTexts(), ElementsAre("Run-time error '8012': The device is not open"));
+  EXPECT_FALSE(Port.PortOpen());
+  Combo("RecorderSelect").setCurrentIndex(1);
+  EXPECT_EQ(Boxes.Boxes.size(), 1U);
+}
+
+TEST_F(SoundJobs, ReportALineThatIsLostWhenItsSpeedChangesMeanwhileOnce) {
+  SetSound(0, "/sounds/400.raw");
+  Events.At(milliseconds(500), [this] {
+    Port.Lose();
+    Combo("RecorderSelect").setCurrentIndex(0);
+  });
+  Press("RecordButton");
+  EXPECT_THAT(BoxTexts(), ElementsAre("Run-time error '8012': The device is not open"));
+  EXPECT_FALSE(Port.PortOpen());
+  EXPECT_EQ(TextOf("StatusLabel"), "Idle");
+}
+
+TEST_F(SoundJobs, ChangeTheSpeedMeanwhile) {
+  SetSound(0, "/sounds/400.raw");
+  Hardware.Acknowledges = [this](const std::string& what) {
+    if (what == "start") {
+      Combo("RecorderSelect").setCurrentIndex(0);
+      Hardware.StandAlone = false;
+    }
+    return true;
+  };
+  Press("RecordButton");
+  EXPECT_THAT(Hardware.Log, ElementsAre("start", "erase", "data", "data", "data", "end"));
+  EXPECT_EQ(Port.Settings, "19200,N,8,1");
+  EXPECT_EQ(TextOf("StatusLabel"), "Recording Complete.");
+}
+
 TEST_F(SoundJobs, LeaveAClosedLineAlone) {
   Combo("RecorderSelect").setCurrentIndex(0);
   EXPECT_THAT(Port.Log, IsEmpty());
@@ -180,6 +219,16 @@ TEST_F(SoundJobs, ReportASoundOfNoPagesAndCloseTheLine) {
   EXPECT_THAT(BoxTexts(), ElementsAre("Run-time error '9': Subscript out of range"));
   EXPECT_FALSE(Port.PortOpen());
   EXPECT_THAT(Hardware.Log, ElementsAre("start", "erase"));
+}
+
+TEST_F(SoundJobs, FailAtASoundOfNoPagesBehindAnother) {
+  Disk.Put("/sounds/128.raw", std::string(128, 'x'));
+  SetSound(0, "/sounds/400.raw");
+  SetSound(1, "/sounds/128.raw");
+  Press("RecordButton");
+  EXPECT_THAT(Hardware.Log, ElementsAre("start", "erase", "header 0", "pages 2", "data", "data"));
+  EXPECT_EQ(TextOf("StatusLabel"), "Recording Failed.");
+  EXPECT_EQ(TextOf("Status2"), "");
 }
 
 TEST_F(SoundJobs, ReportMoreThan128RowsBeforeTheLineIsOpened) {

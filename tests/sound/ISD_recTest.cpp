@@ -5,6 +5,7 @@
 #include <QTest>
 
 #include "platform/RuntimeError.h"
+#include "sound/StatusText.h"
 #include "tests/sound/SoundWindow.h"
 #include "tests/support/Captions.h"
 
@@ -14,7 +15,21 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
-class SoundRecorder : public SoundWindow {};
+class SoundRecorder : public SoundWindow {
+ protected:
+  void ExpectButtonsApart() const {
+    const auto buttons = Window->findChildren<QPushButton*>();
+    for (const QPushButton* one : buttons) {
+      const QRect place(one->mapTo(Window.get(), QPoint(0, 0)), one->size());
+      EXPECT_TRUE(Window->rect().contains(place)) << one->objectName().toStdString();
+      for (const QPushButton* other : buttons) {
+        const QRect otherPlace(other->mapTo(Window.get(), QPoint(0, 0)), other->size());
+        EXPECT_TRUE(one == other || !place.intersects(otherPlace))
+            << one->objectName().toStdString() << " " << other->objectName().toStdString();
+      }
+    }
+  }
+};
 
 TEST_F(SoundRecorder, OpensAsTold) {
   Open();
@@ -290,6 +305,56 @@ TEST_F(SoundRecorder, IsNotWidenedByALongPath) {
   QCoreApplication::processEvents();
   EXPECT_EQ(Paths()[0], folder + ".raw");
   EXPECT_EQ(Window->minimumSizeHint().width(), width);
+}
+
+TEST_F(SoundRecorder, KeepsItsButtonsApartWhateverThePath) {
+  Open();
+  const std::string name(200, 'n');
+  for (const std::string& path : {"/" + name + ".raw", "/" + name + "/" + name + "/" + name + "/a.raw",
+                                  "/" + std::string(4000, 'n') + ".raw"}) {
+    Disk.Put(path, Samples(300));
+    SetSound(0, path);
+    int looks = 0;
+    Hardware.Acknowledges = [&](const std::string& what) {
+      if (what == "data") {
+        ++looks;
+        QCoreApplication::processEvents();
+        ExpectButtonsApart();
+        EXPECT_EQ(TextOf("StatusLabel"), "Programming File: " + path);
+      }
+      return true;
+    };
+    Press("RecordButton");
+    EXPECT_EQ(looks, 1);
+  }
+}
+
+TEST(StatusText, LooksPlainWhenItIsLongAndLargeWhenItIsShort) {
+  QWidget around;
+  StatusText plain(&around);
+  StatusText large(&around);
+  QFont font = large.font();
+  font.setPointSize(13);
+  font.setBold(true);
+  large.setFont(font);
+  for (StatusText* text : {&plain, &large}) {
+    text->resize(500, 100);
+    text->setText(QString(300, QLatin1Char('n')));
+  }
+  EXPECT_EQ(large.grab().toImage(), plain.grab().toImage());
+  EXPECT_EQ(large.heightForWidth(500), plain.heightForWidth(500));
+  for (StatusText* text : {&plain, &large}) {
+    text->setText(QStringLiteral("Idle"));
+  }
+  EXPECT_NE(large.grab().toImage(), plain.grab().toImage());
+}
+
+TEST_F(SoundRecorder, TellsWhatIsTooLongForACellInItsToolTip) {
+  Open();
+  SetSound(0, "/sounds/300.wav");
+  const QAbstractItemModel& model = *List().model();
+  EXPECT_EQ(model.index(0, 0).data(Qt::ToolTipRole).toString(), QStringLiteral("Shot"));
+  EXPECT_EQ(model.index(0, 1).data(Qt::ToolTipRole).toString(), QStringLiteral("/sounds/300.wav"));
 }
 
 TEST_F(SoundRecorder, ShowsAPathOfMegabytes) {

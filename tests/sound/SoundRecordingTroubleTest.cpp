@@ -163,9 +163,38 @@ TEST_F(Interrupted, WaitsForTheHeaderOfTheFirstSoundOnly) {
   EXPECT_EQ(display.Statuses.back(), "Recording Failed.");
 }
 
-TEST_F(Interrupted, TakesTwoMergedAnswersOneByOne) {
-  hardware.EraseTime = hardware.AnswerTime;  // both bytes are there when the wait looks
+TEST_F(Interrupted, IsNotAnsweredByWhatCameTooLateForTheTryBefore) {
+  Use(Recorder::InProduct);
   Fill({{"", ""}});
+  hardware.Acknowledges = [](const std::string&) { return false; };
+  Record();
+  port.Receive({0xAA});
+  Record();
+  ExpectTimeOuts(2);
+  EXPECT_THAT(hardware.Log, ElementsAre("start", "start"));
+  port.Receive({0xAA});
+  Test();
+  ExpectTimeOuts(3);
+  EXPECT_EQ(display.Statuses[display.Statuses.size() - 2], "Test of sound 1 failed.");
+}
+
+TEST_F(Interrupted, TakesTwoMergedAnswersOneByOne) {
+  Fill({{"", ""}});
+  hardware.Erases = false;
+  hardware.Acknowledges = [this](const std::string& what) {
+    if (what == "erase") {
+      pump.At(milliseconds(2000), [this] { port.Receive({0xAA, 0xAA}); });
+    }
+    return what != "erase";
+  };
+  Record();
+  ExpectTimeOuts(0);
+  EXPECT_EQ(display.Statuses.back(), "Recording Complete.");
+}
+
+TEST_F(Interrupted, HearsAnAnswerBetweenOtherBytes) {
+  Fill({{"/a.raw", Samples(300)}});
+  hardware.Answer = {0x55, 0xAA, 0x55};
   Record();
   ExpectTimeOuts(0);
   EXPECT_EQ(display.Statuses.back(), "Recording Complete.");

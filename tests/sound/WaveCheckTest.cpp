@@ -64,6 +64,19 @@ TEST_F(WaveChecked, TakesALongFormatChunkUpToTheBuffer) {
   EXPECT_EQ(check.DataOffset, 12U + 8 + 218 + 8);
 }
 
+TEST_F(WaveChecked, NeedsOfALongFormatChunkAsMuchAsTheBufferHolds) {
+  const std::string start =
+      "RIFF" + Little(1000, 4) + "WAVEfmt " + Little(60, 4) + FormatChunk().substr(8);  // of these 60, 16
+  EXPECT_EQ(ErrorOf(start + std::string(49 - 16, '\0')), WaveError::CannotReadFormat);
+  EXPECT_EQ(ErrorOf(start + std::string(50 - 16, '\0')), WaveError::NoData);
+}
+
+TEST_F(WaveChecked, FindsAWaveBehindAnotherForm) {
+  const WaveCheck check = Check("RIFF" + Little(20, 4) + "AVI " + std::string(16, 'a') + Wave("1234"));
+  EXPECT_EQ(check.Error, WaveError::None);
+  EXPECT_EQ(check.DataOffset, 28U + 44);
+}
+
 TEST_F(WaveChecked, TakesAFormatChunkThatIsTooShortAsZeros) {
   EXPECT_EQ(ErrorOf(Riff(Chunk("fmt ", "") + Chunk("data", "12"))), WaveError::NotChipFormat);
   EXPECT_EQ(ErrorOf(Riff(Chunk("fmt ", FormatChunk().substr(8, 14)) + Chunk("data", "12"))),

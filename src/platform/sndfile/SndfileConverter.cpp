@@ -19,8 +19,15 @@ using Resampler = std::unique_ptr<SRC_STATE, decltype(&src_delete)>;
 /// Many times what the chip holds, and still little memory.
 constexpr sf_count_t MostSeconds = 3600;
 
-RuntimeError Unreadable(const std::string& why) {
-  return {Fault::InvalidFileFormat, why};
+/// What the library says about a file. It is made a RuntimeError where the file's name is known.
+struct Unreadable {
+  std::string Why;
+};
+
+/// The library would wait for ever for somebody to write into a pipe.
+bool IsFile(const std::string& path) {
+  std::error_code none;
+  return std::filesystem::is_regular_file(path, none);
 }
 
 /// A sound file, mixed down to one channel.
@@ -28,7 +35,7 @@ class MonoReader {
  public:
   explicit MonoReader(const std::string& path) : file_(sf_open(path.c_str(), SFM_READ, &info_), &sf_close) {
     if (!file_) {
-      throw Unreadable(sf_strerror(nullptr));
+      throw Unreadable{sf_strerror(nullptr)};
     }
   }
 
@@ -45,7 +52,7 @@ class MonoReader {
     frames_.resize(mono.size() * channels);
     const sf_count_t got = sf_readf_float(file_.get(), frames_.data(), static_cast<sf_count_t>(mono.size()));
     if (got <= 0 && sf_error(file_.get()) != SF_ERR_NO_ERROR) {
-      throw Unreadable(sf_strerror(file_.get()));
+      throw Unreadable{sf_strerror(file_.get())};
     }
     const auto count = static_cast<std::size_t>(std::max<sf_count_t>(got, 0));
     for (std::size_t i = 0; i < count; ++i) {
@@ -110,7 +117,7 @@ class Stream {
     int error = 0;
     resampler_.reset(src_new(SRC_SINC_BEST_QUALITY, 1, &error));
     if (!resampler_) {
-      throw Unreadable(src_strerror(error));
+      throw Unreadable{src_strerror(error)};
     }
   }
 
@@ -124,7 +131,7 @@ class Stream {
       data.data_in = samples;
       data.input_frames = static_cast<long>(count);
       if (const int error = src_process(resampler_.get(), &data); error != 0) {
-        throw Unreadable(src_strerror(error));
+        throw Unreadable{src_strerror(error)};
       }
       samples += data.input_frames_used;
       count -= static_cast<std::size_t>(data.input_frames_used);
@@ -139,28 +146,19 @@ class Stream {
   std::array<float, 8192> block_{};
 };
 
-}  // namespace
-
-bool SndfileConverter::CanRead(const std::string& path) const {
-  SF_INFO info{};
-  return File(sf_open(path.c_str(), SFM_READ, &info), &sf_close) != nullptr;
-}
-
-std::optional<ConvertedSound> SndfileConverter::Convert(const std::string& path, int samplesPerSecond,
-                                                        const std::function<bool(double)>& progress) const {
+std::optional<ConvertedSound> ConvertFile(const std::string& path, int samplesPerSecond,
+                                          const std::function<bool(double)>& progress) {
   constexpr std::size_t blockSamples = 8192;
-  if (!std::filesystem::exists(path)) {
-    throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
-  }
   MonoReader reader(path);
-  if (reader.Length() / reader.SamplesPerSecond() > MostSeconds) {
-    throw Unreadable("The sound is too long");
-  }
   const double ratio = double(samplesPerSecond) / reader.SamplesPerSecond();
   Quantizer output;
   Stream stream(ratio, output);
   std::vector<float> block(blockSamples);
   for (std::size_t count = blockSamples; count > 0;) {
+    // Not every file tells its length, or the truth about it.
+    if (std::max(reader.Length(), reader.Position()) / reader.SamplesPerSecond() > MostSeconds) {
+      throw Unreadable{"The sound is too long."};
+    }
     count = reader.Read(block);
     if (samplesPerSecond == reader.SamplesPerSecond()) {
       output.Add(block.data(), count);
@@ -173,4 +171,23 @@ std::optional<ConvertedSound> SndfileConverter::Convert(const std::string& path,
     }
   }
   return std::move(output.Sound());
+}
+
+}  // namespace
+
+bool SndfileConverter::CanRead(const std::string& path) const {
+  SF_INFO info{};
+  return IsFile(path) && File(sf_open(path.c_str(), SFM_READ, &info), &sf_close) != nullptr;
+}
+
+std::optional<ConvertedSound> SndfileConverter::Convert(const std::string& path, int samplesPerSecond,
+                                                        const std::function<bool(double)>& progress) const {
+  if (!IsFile(path)) {
+    throw RuntimeError(Fault::FileNotFound, "File not found: " + path);
+  }
+  try {
+    return ConvertFile(path, samplesPerSecond, progress);
+  } catch (const Unreadable& error) {
+    throw RuntimeError(Fault::InvalidFileFormat, "Invalid file format: " + path + ". " + error.Why);
+  }
 }

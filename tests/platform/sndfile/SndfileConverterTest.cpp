@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 #include <sndfile.h>
+#include <sys/stat.h>
 
 #include <algorithm>
 #include <cmath>
@@ -168,7 +169,23 @@ TEST_F(Converted, SaysWhyAFileCannotBeRead) {
   EXPECT_FALSE(converter.CanRead(folder / "text.wav"));
   const Thrown thrown = ThrownBy([&] { Convert(folder / "text.wav"); });
   EXPECT_EQ(thrown.Number, 321);
-  EXPECT_NE(thrown.Text, "");
+  const std::string start = "Invalid file format: " + folder / "text.wav. ";
+  EXPECT_EQ(thrown.Text.substr(0, start.size()), start);
+  EXPECT_GT(thrown.Text.size(), start.size());
+}
+
+TEST_F(Converted, IsNotMadeOfMoreThanAnHour) {
+  const std::string path = Write("a.wav", SF_FORMAT_WAV | SF_FORMAT_PCM_U8, 8, 1, std::vector<float>(29'000));
+  const Thrown thrown = ThrownBy([&] { Convert(path); });
+  EXPECT_EQ(thrown.Text, "Invalid file format: " + path + ". The sound is too long.");
+}
+
+TEST_F(Converted, DoesNotWaitForAPipeOrTakeAFolder) {
+  ASSERT_EQ(mkfifo((folder / "pipe.wav").c_str(), 0600), 0);
+  for (const std::string& path : {folder / "pipe.wav", folder.Path(), "/" + std::string(5000, 'x')}) {
+    EXPECT_FALSE(converter.CanRead(path));
+    EXPECT_EQ(NumberThrownBy([&] { Convert(path); }), 53);
+  }
 }
 
 }  // namespace

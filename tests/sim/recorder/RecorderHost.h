@@ -2,8 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <chrono>
 #include <string>
 
+#include "sim/recorder/SoundRecorder.h"
 #include "tests/support/JoinedBytes.h"
 
 namespace sim {
@@ -48,6 +50,34 @@ inline void BeginInProduct(RecorderHost& host) {
 inline void BeginStandAlone(RecorderHost& host) {
   EXPECT_EQ(host.Ask({2, 3}), Ack);
   EXPECT_EQ(host.Ask({2, 3}, 2), Ack + Ack);
+}
+
+inline constexpr int Gun = 19200;
+inline constexpr int Alone = 115200;
+
+/// A recorder without waits.
+inline SoundRecorderSettings Quick() {
+  return {.LinePace = Pace::Fast, .Patience = std::chrono::milliseconds(400)};
+}
+
+/// A whole recording of two sounds, of two pages and of one.
+inline void RecordTwoInProduct(RecorderHost& host) {
+  BeginInProduct(host);
+  EXPECT_EQ(host.Ask(Bytes{1, 0, 0, 0} + TableOfTwo + Bytes{TableOfTwoCheck}), Ack);
+  EXPECT_EQ(host.Ask(Bytes{1, 0, 0, 0} + RisingPage + Bytes{RisingCheck}), Ack);
+  EXPECT_EQ(host.Ask(Bytes{1, 0, 1, 0} + SilentPage + Bytes{0x2C}), Ack);
+  EXPECT_EQ(host.Ask(Bytes{1, 0, 2, 0} + SilentPage + Bytes{0xA4}), Ack);
+  EXPECT_EQ(host.Ask({0, 0}), Ack);
+}
+
+inline void RecordTwoStandAlone(RecorderHost& host) {
+  BeginStandAlone(host);
+  EXPECT_EQ(host.Ask({1, 0}), Ack);
+  EXPECT_EQ(host.Ask(Bytes{2, 0} + RisingPage + Bytes{RisingCheck}), Ack);
+  EXPECT_EQ(host.Ask(SilentPage + Bytes{SilentCheck}), Ack);
+  // The host does not wait for the answer to a later header.
+  EXPECT_EQ(host.Ask(Bytes{1, 9, 1, 0} + SilentPage + Bytes{SilentCheck}, 2), Ack + Ack);
+  EXPECT_EQ(host.Ask({0, 0}), Ack);
 }
 
 }  // namespace sim

@@ -3,51 +3,21 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <filesystem>
 #include <map>
+#include <optional>
 #include <sstream>
 #include <tuple>
 
 #include "sim/recorder/RecorderReport.h"
 #include "tests/sim/recorder/RecorderHost.h"
-#include "tests/support/TemporaryFolder.h"
 
 namespace sim {
 namespace {
 
 using std::chrono::milliseconds;
 using testing::Contains;
-using testing::HasSubstr;
-using testing::IsEmpty;
-using testing::UnorderedElementsAre;
 using Kind = RecorderCommandKind;
 using Sounds = std::map<std::uint8_t, Bytes>;
-
-constexpr int Gun = 19200;
-constexpr int Alone = 115200;
-
-SoundRecorderSettings Quick() {
-  return {.LinePace = Pace::Fast, .Patience = milliseconds(400)};
-}
-
-void RecordTwoInProduct(RecorderHost& host) {
-  BeginInProduct(host);
-  EXPECT_EQ(host.Ask(Bytes{1, 0, 0, 0} + TableOfTwo + Bytes{TableOfTwoCheck}), Ack);
-  EXPECT_EQ(host.Ask(Bytes{1, 0, 0, 0} + RisingPage + Bytes{RisingCheck}), Ack);
-  EXPECT_EQ(host.Ask(Bytes{1, 0, 1, 0} + SilentPage + Bytes{0x2C}), Ack);
-  EXPECT_EQ(host.Ask(Bytes{1, 0, 2, 0} + SilentPage + Bytes{0xA4}), Ack);
-  EXPECT_EQ(host.Ask({0, 0}), Ack);
-}
-
-void RecordTwoStandAlone(RecorderHost& host) {
-  BeginStandAlone(host);
-  EXPECT_EQ(host.Ask({1, 0}), Ack);
-  EXPECT_EQ(host.Ask(Bytes{2, 0} + RisingPage + Bytes{RisingCheck}), Ack);
-  EXPECT_EQ(host.Ask(SilentPage + Bytes{SilentCheck}), Ack);
-  // The host does not wait for the answer to a later header.
-  EXPECT_EQ(host.Ask(Bytes{1, 9, 1, 0} + SilentPage + Bytes{SilentCheck}, 2), Ack + Ack);
-  EXPECT_EQ(host.Ask({0, 0}), Ack);
-}
 
 bool ComesToFault(const SoundRecorder& recorder, const std::string& fault) {
   for (std::size_t count = 1; recorder.WaitUntilHostFaults(count, Limit); ++count) {
@@ -298,143 +268,6 @@ TEST(SoundRecorder, ServesBothSpeedsUnlessItIsOneOfTheTwo) {
     RecorderHost host(recorder.DevicePath(), own);
     EXPECT_EQ(host.Ask(own == Gun ? Bytes{10, 0} : Bytes{2, 3}), Ack);
   }
-}
-
-// One recording would do, but a busy machine makes pauses of its own.
-TEST(SoundRecorder, NotesAHostThatLeavesNoPauses) {
-  constexpr int mostRecordings = 50;
-  SoundRecorder recorder(Quick());
-  RecorderHost host(recorder.DevicePath(), Gun);
-  for (int i = 0; i < mostRecordings && recorder.HostFaults().size() < 4; ++i) {
-    RecordTwoInProduct(host);
-  }
-  EXPECT_THAT(recorder.HostFaults(),
-              UnorderedElementsAre("the host leaves less than 20 ms before the check byte",
-                                   "the host leaves less than 10 ms between the bytes of a command",
-                                   "the host leaves less than 20 ms before a page or header",
-                                   "the host leaves less than 1 ms between the bytes of a page"));
-}
-
-TEST(SoundRecorder, NotesAHostThatPlaysOneSoundRightBehindTheOther) {
-  constexpr int mostSounds = 200;
-  SoundRecorder recorder(Quick());
-  RecorderHost host(recorder.DevicePath(), Alone);
-  for (int i = 0; i < mostSounds && recorder.HostFaults().size() < 2; ++i) {
-    EXPECT_EQ(host.Ask({3, 2, 0}), Ack);
-  }
-  EXPECT_THAT(recorder.HostFaults(), Contains("the host leaves less than 1 s between two sounds"));
-}
-
-// Leaves the pauses of both modes as a program does, by waiting for bytes that do not come.
-class PatientHost : public RecorderHost {
- public:
-  using RecorderHost::RecorderHost;
-
-  void Pause(int length) { EXPECT_EQ(ReadByte(milliseconds(length)), std::nullopt); }
-  void WriteSlowly(const Bytes& bytes, int pause) {
-    for (const std::uint8_t byte : bytes) {
-      Write({byte});
-      Pause(pause);
-    }
-  }
-  Bytes CheckedBy(std::uint8_t check) {
-    Pause(20);
-    return Ask({check});
-  }
-};
-
-TEST(SoundRecorder, FindsNoFaultInAHostThatKeepsToThePauses) {
-  SoundRecorder recorder({});
-  {
-    PatientHost host(recorder.DevicePath(), Gun);
-    host.WriteSlowly({10}, 10);
-    EXPECT_EQ(host.Ask({0}), Ack);
-    host.WriteSlowly({2}, 10);
-    EXPECT_EQ(host.Ask({0}, 2), Ack + Ack);
-    for (const auto& [number, page, check] :
-         {std::tuple{0, TableOfTwo, TableOfTwoCheck}, std::tuple{0, SilentPage, SilentCheck},
-          std::tuple{1, SilentPage, std::uint8_t{0x2C}}}) {
-      host.Pause(20);
-      host.WriteSlowly({1, 0, static_cast<std::uint8_t>(number), 0}, 10);
-      host.WriteSlowly(page, 1);
-      EXPECT_EQ(host.CheckedBy(check), Ack);
-    }
-  }
-  PatientHost host(recorder.DevicePath(), Alone);
-  host.WriteSlowly({2}, 10);
-  EXPECT_EQ(host.Ask({3}), Ack);
-  host.WriteSlowly({2}, 10);
-  EXPECT_EQ(host.Ask({3}, 2), Ack + Ack);
-  for (std::uint8_t sound = 0; sound < 3; ++sound) {
-    host.Pause(20);
-    host.WriteSlowly({1}, 10);
-    EXPECT_EQ(host.Ask({sound}), Ack);
-    host.Pause(20);
-    host.WriteSlowly({1}, 20);
-    host.WriteSlowly({0}, 20);
-    host.Write(SilentPage);
-    host.Pause(23);
-    EXPECT_EQ(host.CheckedBy(SilentCheck), Ack);
-  }
-  EXPECT_THAT(recorder.HostFaults(), IsEmpty());
-}
-
-TEST(SoundRecorder, KeepsEachRecordingAsFilesBeforeItAnswersTheEnd) {
-  const TemporaryFolder folder;
-  SoundRecorderSettings settings = Quick();
-  settings.Files.emplace(folder.Path());
-  SoundRecorder recorder(settings);
-  {
-    RecorderHost host(recorder.DevicePath(), Gun);
-    RecordTwoInProduct(host);
-  }
-  EXPECT_EQ(ReadFile(folder / "recording-1/table.bin"), std::string(TableOfTwo.begin(), TableOfTwo.end()));
-  EXPECT_EQ(ReadFile(folder / "recording-1/sound-001.wav").substr(44), std::string(256, '\x80'));
-  RecorderHost host(recorder.DevicePath(), Alone);
-  RecordTwoStandAlone(host);
-  EXPECT_EQ(ReadFile(folder / "recording-2/sound-009.wav").substr(44), std::string(256, '\x80'));
-}
-
-TEST(SoundRecorder, KeepsWhatCameOfARecordingThatWasBrokenOff) {
-  const TemporaryFolder folder;
-  {
-    SoundRecorderSettings settings = Quick();
-    settings.Files.emplace(folder.Path());
-    SoundRecorder recorder(settings);
-    RecorderHost host(recorder.DevicePath(), Alone);
-    BeginStandAlone(host);
-    EXPECT_EQ(host.Ask({1, 0}), Ack);
-    EXPECT_EQ(host.Ask(Bytes{2, 0} + RisingPage + Bytes{RisingCheck}), Ack);
-  }
-  EXPECT_EQ(ReadFile(folder / "recording-1/sound-000.wav").substr(44),
-            std::string(RisingPage.begin(), RisingPage.end()));
-}
-
-TEST(SoundRecorder, KeepsNothingOfARecordingThatBroughtNothing) {
-  const TemporaryFolder folder;
-  {
-    SoundRecorderSettings settings = Quick();
-    settings.Files.emplace(folder.Path());
-    SoundRecorder recorder(settings);
-    RecorderHost host(recorder.DevicePath(), Alone);
-    BeginStandAlone(host);
-  }
-  EXPECT_TRUE(std::filesystem::is_empty(folder.Path()));
-}
-
-TEST(SoundRecorder, GoesOnWhenItCannotKeepARecording) {
-  const TemporaryFolder folder;
-  std::ostringstream log;
-  {
-    SoundRecorderSettings settings = Quick();
-    settings.Log = &log;
-    settings.Files.emplace(folder / "gone");
-    std::filesystem::remove(folder / "gone");
-    SoundRecorder recorder(settings);
-    RecorderHost host(recorder.DevicePath(), Alone);
-    RecordTwoStandAlone(host);
-  }
-  EXPECT_THAT(log.str(), HasSubstr("recorder -- not kept: "));
 }
 
 TEST(SoundRecorder, LogsBothDirections) {
