@@ -96,6 +96,25 @@ TEST_F(Record, OfAShortTranscriptLeavesNothingOut) {
   EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 9 + 1000);
 }
 
+TEST_F(Record, NamesAThousandAnswersAndCountsTheOthers) {
+  FirmwareRecord record = Make();
+  record.Received('?');
+  for (int answer = 0; answer < 1000; ++answer) {
+    record.BadAnswer("line 1", '?');
+  }
+  FirmwareRecord noisy = Make();
+  noisy.Received('?');
+  for (int answer = 0; answer < 1003; ++answer) {
+    noisy.BadAnswer("line 1", '?');
+  }
+  record.Write("ended");
+  EXPECT_THAT(Written(), Not(HasSubstr("more")));
+  noisy.Write("ended");
+  const std::string text = Written();
+  EXPECT_THAT(text, HasSubstr(" 3F to line 1\n... 3 more ...\n\nTranscript:"));
+  EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 7 + 1000 + 3);
+}
+
 TEST_F(Record, IsNotWrittenWithoutAByte) {
   Make().Write("ended");
   EXPECT_THAT(disk.FileNames("/data/logs"), IsEmpty());
