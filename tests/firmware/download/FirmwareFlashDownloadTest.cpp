@@ -90,6 +90,34 @@ TEST_P(FirmwareWindow, SaysHowMuchTimeIsLeft) {
   EXPECT_EQ(TextOf("lblTimeLeft"), "");
 }
 
+TEST_P(FirmwareWindow, ReckonsTheTimeLeftAnewInEachDownload) {
+  Open();
+  port.Pump = &events;
+  boot.AnswerTime = 500ms;
+  for (int round = 0; round < 2; ++round) {
+    boot.Commands.clear();
+    boot.SwitchOnAt(100ms);
+    boot.OnCommand = [&](const std::string& command) {
+      if (command[0] == 'E' && boot.CountOf('E') == 2) {
+        EXPECT_EQ(TextOf("lblTimeLeft"),
+                  GetParam() == Language::English ? "0 min 4 s left" : "剩余 0 分 4 秒");
+      }
+    };
+    Press("cmdDownload");
+    EXPECT_EQ(TextOf("lblDownload"), "Download Complete!");
+    events.Sleep(10min);
+  }
+}
+
+TEST_P(FirmwareWindow, DescribesTheFileAsItIsWhenItIsSent) {
+  Open();
+  disk.Put("/fw/gun.qvm2", "1,2\r\n0,8\r\n");
+  boot.SwitchOnAt(100ms);
+  Press("cmdDownload");
+  EXPECT_EQ(boot.CountOf('E'), 3U);
+  EXPECT_THAT(TextOf("lblDescription"), HasSubstr(GetParam() == Language::English ? "3 pages" : "3 页"));
+}
+
 TEST_P(FirmwareWindow, StopsWaitingWhenAsked) {
   Open();
   events.At(5s, [this] { Press("cmdBreak"); });
@@ -191,7 +219,10 @@ TEST_P(FirmwareWindow, ClosedInAWaitGoesAfterItsOneBox) {
     boxes.Boxes.clear();
     Open();
     bool there = false;
-    boxes.WhileOpen = [&](const auto& /*box*/) { there = window->isVisible(); };
+    boxes.WhileOpen = [&](const auto& /*box*/) {
+      there = window->isVisible();
+      ExpectIdle();
+    };
     events.At(5s, [this, way] {
       if (std::string(way) == "Close") {
         Press("Close");

@@ -36,6 +36,7 @@ TEST_P(FirmwareWindow, HasItsCaptionsInBothLanguages) {
                            {"lblCurrentBuffer", "Buffer Empty"}});
   EXPECT_EQ(Find<QLineEdit>(*window, "Text1").text(), QString());
   EXPECT_EQ(Bar(), 0);
+  EXPECT_EQ(Find<QLabel>(*window, "lblDownloadBarBG").accessibleName(), QStringLiteral("0 %"));
   EXPECT_EQ(Lamps(), "red red");
   EXPECT_FALSE(IsEnabled("cmdBreak"));
   EXPECT_THAT(boxes.Boxes, IsEmpty());
@@ -77,6 +78,26 @@ TEST_P(FirmwareWindow, SaysThatThePortIsNoNumber) {
   EXPECT_THAT(port.Log, IsEmpty());
   ASSERT_EQ(boxes.Boxes.size(), 1U);
   EXPECT_THAT(boxes.Boxes[0].Text, HasSubstr("Run-time error '8002'"));
+}
+
+TEST_P(FirmwareWindow, UsesPortOneWhenTheFileIsNotFoundOrEnds) {
+  for (const int fault : {53, 62}) {
+    port.Device.clear();
+    OpenInDoubt(fault);
+    EXPECT_THAT(boxes.Boxes, IsEmpty());
+    EXPECT_FALSE(IsEnabled("cmdDownload"));
+    dialog.Answers = {"/fw/gun.qvm2"};
+    Press("cmdBrowse");
+    boot.SwitchOnAt(1s);
+    Press("cmdDownload");
+    EXPECT_EQ(port.Device, "/dev/ttyS0");
+  }
+}
+
+TEST_P(FirmwareWindow, SaysThatItCannotTellWhetherTheFileExists) {
+  OpenInDoubt(70);
+  ExpectBox("70 = Permission denied");
+  EXPECT_FALSE(IsEnabled("cmdDownload"));
 }
 
 TEST_P(FirmwareWindow, UsesThePortOfTheSettings) {

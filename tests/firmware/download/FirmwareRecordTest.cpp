@@ -170,6 +170,14 @@ TEST_F(RecordedDownload, NamesTheFileAndEachBadAnswer) {
   EXPECT_THAT(Written(), HasSubstr(" boot-code <- 58\n"));
 }
 
+TEST_F(RecordedDownload, SaysThatAFileOfNoKindIsNotLoaded) {
+  RunQvm2("\r\n\r\n");
+  Time.DateAndTime = "2013-05-21 15:00:00";
+  boot.SwitchOnAt(100ms);
+  Run("/fw/GUN.QVM");
+  EXPECT_THAT(Written(), HasSubstr("File: /fw/GUN.QVM\nnot loaded\n"));
+}
+
 TEST_F(RecordedDownload, TellsHowItFailed) {
   boot.Instead = [](const std::string& command) -> std::optional<std::string> {
     return command[0] == 'Z' ? std::optional<std::string>("?") : std::nullopt;

@@ -5,6 +5,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <memory>
+#include <optional>
 #include <string>
 
 #include "firmware/download/FirmwareFlash.h"
@@ -19,6 +20,19 @@
 #include "tests/fakes/FakeWakeLock.h"
 #include "tests/firmware/download/BootCode.h"
 #include "tests/support/Controls.h"
+
+/// Files on a disk that may not let tell whether one exists.
+class UnsureFiles : public FakeFiles {
+ public:
+  std::optional<int> Doubt;
+
+  bool FileExists(const std::string& path) const override {
+    if (Doubt) {
+      throw RuntimeError(*Doubt);
+    }
+    return FakeFiles::FileExists(path);
+  }
+};
 
 /// The window between fake files and a fake device, in both languages.
 class FirmwareWindow : public testing::TestWithParam<Language> {
@@ -49,6 +63,14 @@ class FirmwareWindow : public testing::TestWithParam<Language> {
                                              nullptr);
     Show(*window);
     return *window;
+  }
+
+  /// The same with port 2, on a disk that fails when it is asked for the file.
+  FirmwareFlash& OpenInDoubt(int fault) {
+    disk.Doubt = fault;
+    FirmwareFlash& opened = Open("[comm]\ncommport=2\n[Paths]\nfirmware_path=/fw/gun.qvm2\n");
+    disk.Doubt.reset();
+    return opened;
   }
 
   void Press(const char* button) { ::Press(*window, button); }
@@ -83,7 +105,7 @@ class FirmwareWindow : public testing::TestWithParam<Language> {
                 testing::ElementsAre(FakeMessageBoxes::Box{text, "Tessarine", icon, BoxButtons::Ok}));
   }
 
-  FakeFiles disk;
+  UnsureFiles disk;
   FakeEventPump events;
   FakeClock time;
   FakeMessageBoxes boxes;

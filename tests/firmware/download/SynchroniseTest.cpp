@@ -262,6 +262,26 @@ TEST_F(Synchronise, AFileThatCannotBeLoadedIsThrownBeforeTheLineOpens) {
   EXPECT_THAT(Boxes.Boxes, IsEmpty());
 }
 
+TEST_F(Synchronise, AFileThatCannotBeLoadedFindsThePortClosed) {
+  AbortAt(1s);
+  RunNothing();
+  EXPECT_TRUE(Port.PortOpen());
+  EXPECT_EQ(NumberThrownBy([this] { Run("/fw/none.qvm"); }), 53);
+  EXPECT_FALSE(Port.PortOpen());
+  EXPECT_EQ(shown.Download, "Downloading...");
+  EXPECT_EQ(shown.Status, "Idle");
+}
+
+TEST_F(Synchronise, AdvisesAnewInEachDownload) {
+  boot.SwitchOnAt(1s);
+  boot.Instead = [](const auto& /*command*/) { return ""; };
+  RunNothing();
+  EXPECT_EQ(shown.Advice, Text(OwnText::AdviceUnchanged));
+  AbortAt(1s);
+  RunNothing();
+  EXPECT_EQ(shown.Advice, Text(OwnText::AdviceNoDevice));
+}
+
 TEST_F(Synchronise, AFileThatIsTooLargeIsThrownByWhatIsWrongInItsStart) {
   constexpr std::size_t tooMuch = (8U << 20U) + 1;
   Disk.Put("/fw/large.qvm", std::string(tooMuch, '1'));
