@@ -111,6 +111,7 @@ TEST_P(FirmwareWindow, ReckonsTheTimeLeftAnewInEachDownload) {
 
 TEST_P(FirmwareWindow, DescribesTheFileAsItIsWhenItIsSent) {
   Open();
+  Find<QPushButton>(*window, "cmdDownload").setFocus();
   disk.Put("/fw/gun.qvm2", "1,2\r\n0,8\r\n");
   boot.SwitchOnAt(100ms);
   Press("cmdDownload");
