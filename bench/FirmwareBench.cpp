@@ -87,6 +87,18 @@ bool MeasureLoad(const TemporaryFolder& folder) {
          same;
 }
 
+constexpr int LargeBytes = 200 << 20;
+
+/// A file of 200 MB: ten of data, then nothing but zeros.
+void WriteLargeFile(const std::string& path) {
+  std::string lines = "0\r\n0\r\n";
+  while (lines.size() < LargeBytes / 20) {
+    lines += ":" + std::string(102, 'A') + "\r\n";
+  }
+  WriteFile(path, lines);
+  std::filesystem::resize_file(path, LargeBytes);
+}
+
 /// The window on a real line.
 class Site {
  public:
@@ -111,6 +123,7 @@ class Site {
   }
 
   void Press(const char* button) { window_->findChild<QPushButton*>(QString::fromLatin1(button))->click(); }
+  bool Refused() const { return boxes_.Boxes.size() == 1 && !port_.PortOpen(); }
   bool Complete() const {
     return window_->findChild<QLabel*>(QStringLiteral("lblDownload"))->text() ==
            QStringLiteral("Download Complete!");
@@ -146,6 +159,20 @@ bool MeasureDownload(const char* name, double goal, const TemporaryFolder& folde
   std::array<char, 64> detail{};
   std::snprintf(detail.data(), detail.size(), "%.3f s to %.3f s", time, told);
   return ReportGoal(name, time / told, goal, detail.data()) && site.Complete();
+}
+
+/// How long the window does not answer while it refuses a file of 200 MB.
+bool MeasureRefusal(const char* name, const TemporaryFolder& folder, const std::string& file) {
+  constexpr double longestStall = 0.1;
+  WriteLargeFile(folder / file);
+  const PacedBootCode boot(0);
+  Site site(folder, boot, file);
+  const auto start = Clock::now();
+  site.Press("cmdDownload");
+  const double stall = Seconds(Clock::now() - start).count();
+  std::array<char, 64> detail{};
+  std::snprintf(detail.data(), detail.size(), "%.0f ms to %.0f ms", stall * 1e3, longestStall * 1e3);
+  return ReportGoal(name, stall / longestStall, 1, detail.data()) && site.Refused();
 }
 
 bool MeasureWait(const TemporaryFolder& folder) {
@@ -186,5 +213,7 @@ int main(int argc, char** argv) {
   PacedBootCode buffers(51);
   met &= MeasureDownload("60 lines of QVM / wire and answers", 1.05, folder, buffers, "sixty.qvm");
   met &= MeasureWait(folder);
+  met &= MeasureRefusal("a QVM file of 200 MB, refused / 100 ms", folder, "large.qvm");
+  met &= MeasureRefusal("a QVM2 file of 200 MB, refused / 100 ms", folder, "large.qvm2");
   return met ? 0 : 1;
 }

@@ -90,6 +90,9 @@ void PacedBootCode::Run(const std::atomic<bool>& stop) {
     pollfd line{master_, POLLIN, 0};
     std::array<char, 256> bytes{};
     if (::poll(&line, 1, 20) <= 0 || (line.revents & POLLIN) == 0) {
+      if ((line.revents & POLLHUP) != 0) {
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));  // closed: it would hang up at each look
+      }
       continue;
     }
     const ssize_t count = ::read(master_, bytes.data(), bytes.size());

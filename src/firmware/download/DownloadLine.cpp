@@ -20,6 +20,10 @@ DownloadLine::DownloadLine(SerialPort& port, EventPump& events, MessageBoxes& bo
 
 DownloadStep DownloadLine::CheckAbort() {
   events_.DoEvents();
+  return Ended();
+}
+
+DownloadStep DownloadLine::Ended() const {
   if (flags_.AbortRequested || job_.Stopped()) {
     return Stopped();
   }

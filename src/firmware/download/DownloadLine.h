@@ -51,6 +51,8 @@ class DownloadLine {
 
   /// Lets pending events run, then looks whether the download must end.
   DownloadStep CheckAbort();
+  /// Whether it must end by what happened so far, without letting events run.
+  DownloadStep Ended() const;
 
   DownloadStep SendString(std::string_view text);
   /// Sends bytes one at a time and lets events run after each. The packet is sent whole even if the operator

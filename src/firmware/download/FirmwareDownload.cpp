@@ -12,6 +12,15 @@
 
 namespace {
 
+/// Five times a full image of a device, so that no file holds the window up.
+constexpr std::size_t MostFileBytes = 8U << 20U;
+
+void ThrowIfTooLarge(std::string_view bytes) {
+  if (bytes.size() > MostFileBytes) {
+    throw RuntimeError(Fault::OutOfMemory);
+  }
+}
+
 /// Shows the hourglass as long as it exists.
 class BusyPointer {
  public:
@@ -77,7 +86,8 @@ bool FirmwareDownload::Load(FirmwareFileType type, const std::string& fileName) 
       return false;
     }
     const BusyPointer busy(display_);
-    std::string bytes = parts_.Record.Disk.Read(fileName);
+    std::string bytes = ReadStart(fileName);
+    ThrowIfTooLarge(bytes);
     contents_ = ContentsText(bytes);
     lines_ = std::make_unique<QvmLines>(std::move(bytes));
   } else if (type == FirmwareFileType::Qvm2 && !LoadQvm2File(fileName)) {
@@ -89,9 +99,17 @@ bool FirmwareDownload::Load(FirmwareFileType type, const std::string& fileName) 
 
 bool FirmwareDownload::LoadQvm2File(const std::string& fileName) {
   const BusyPointer busy(display_);
-  const std::string bytes = parts_.Record.Disk.Read(fileName);
+  const std::string bytes = ReadStart(fileName);
+  const std::size_t whole = bytes.size() > MostFileBytes ? bytes.rfind('\n') + 1 : bytes.size();
+  // Of a file that is too large the start may tell more: above all that there is more data than room for it.
+  const bool loaded = image_.LoadQvm2File(std::string_view(bytes).substr(0, whole));
+  ThrowIfTooLarge(bytes);
   contents_ = ContentsText(bytes);
-  return image_.LoadQvm2File(bytes);
+  return loaded;
+}
+
+std::string FirmwareDownload::ReadStart(const std::string& fileName) const {
+  return parts_.Record.Disk.ReadPart(fileName, 0, MostFileBytes + 1);
 }
 
 std::string FirmwareDownload::Converse(FirmwareFileType type, DownloadLine& line) {

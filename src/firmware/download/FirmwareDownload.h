@@ -36,7 +36,7 @@ class FirmwareDownload {
   FirmwareDownload(const Parts& parts, FirmwareDisplay& display);
 
   /// Runs one download, boxes included. `device` gives the device to open, and may throw. Throws RuntimeError
-  /// if the file cannot be loaded or the line does not open; nothing was sent then.
+  /// if the file cannot be loaded (7 for one beyond 8 MB) or the line does not open; nothing was sent then.
   void Run(const std::string& fileName, const std::function<std::string()>& device);
 
   /// Ends a running download with its box. Without one nothing happens.
@@ -53,6 +53,8 @@ class FirmwareDownload {
   /// False if the download ends here, after its box.
   bool Load(FirmwareFileType type, const std::string& fileName);
   bool LoadQvm2File(const std::string& fileName);
+  /// The whole file, unless it is too large.
+  std::string ReadStart(const std::string& fileName) const;
 
   /// The conversation over the open line. Returns how it ended, for the record.
   std::string Converse(FirmwareFileType type, DownloadLine& line);

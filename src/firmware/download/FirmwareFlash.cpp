@@ -117,6 +117,7 @@ void FirmwareFlash::reject() {
   download_.Close();
   download_.ResetWindow();
   if (commands_.MayClose()) {
+    setEnabled(false);  // nothing starts while events run for the last time
     CleanUp();
     QDialog::reject();
   }

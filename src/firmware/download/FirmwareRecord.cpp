@@ -31,6 +31,9 @@ void FirmwareRecord::Received(std::uint8_t byte) {
 }
 
 void FirmwareRecord::BadAnswer(std::string_view toWhat, char answer) {
+  if (++answerCount_ > MostAnswers) {
+    return;
+  }
   const std::chrono::duration<double> time = parts_.Elapsed.Elapsed();
   std::array<char, 40> row{};
   std::snprintf(row.data(), row.size(), "%12.6f %02X to ", time.count(), static_cast<unsigned char>(answer));
@@ -61,6 +64,9 @@ std::string FirmwareRecord::Text(std::string_view end) {
   std::string text = head_ + "Ended: " + parts_.Time.Now() + ' ';
   text.append(end) += "\n\nAnswers other than the good one:\n";
   text += answers_.empty() ? "none\n" : answers_;
+  if (answerCount_ > MostAnswers) {
+    text += "... " + std::to_string(answerCount_ - MostAnswers) + " more ...\n";
+  }
   text += "\nTranscript:\n" + first_;
   if (leftOut_ > 0) {
     text += "... " + std::to_string(leftOut_) + " bytes left out ...\n";

@@ -14,7 +14,8 @@
 /// the folder of the logs. A record never makes a download fail.
 class FirmwareRecord {
  public:
-  static constexpr std::size_t KeptBytes = 65536;  ///< of the transcript's start, and as many of its end
+  static constexpr std::size_t KeptBytes = 65536;   ///< of the transcript's start, and as many of its end
+  static constexpr std::size_t MostAnswers = 1000;  ///< told one by one; noise can bring any number
 
   /// What it is written with; all must outlive the record.
   struct Parts {
@@ -43,7 +44,8 @@ class FirmwareRecord {
   const Parts parts_;
   std::string head_;     ///< what the record says of the file
   std::string answers_;  ///< rows of the answers that were not good
-  std::string first_;    ///< rows of the transcript
+  std::size_t answerCount_ = 0;
+  std::string first_;  ///< rows of the transcript
   std::string last_;
   std::uint64_t leftOut_ = 0;  ///< bytes of rows between these two
   bool isEmpty_ = true;

@@ -109,9 +109,9 @@ DownloadStep QvmRoute::Begin() {
 }
 
 DownloadStep QvmRoute::SendLine(std::string_view digits) {
-  if (const DownloadStep end = Convert(digits)) {
-    return end;
-  }
+  // Events run again in the wait for the reply, so that the window is painted while the line is busy and not
+  // while it idles. Until then less than a millisecond passes.
+  Convert(digits);
   for (int errors = 0;;) {
     if (const DownloadStep end = SendBuffer()) {
       return end;
@@ -136,7 +136,7 @@ DownloadStep QvmRoute::SendLine(std::string_view digits) {
   }
 }
 
-DownloadStep QvmRoute::Convert(std::string_view digits) {
+void QvmRoute::Convert(std::string_view digits) {
   lineBytes_.clear();
   const ShownDigits shown(display_, digits);
   while (!digits.empty()) {
@@ -146,11 +146,7 @@ DownloadStep QvmRoute::Convert(std::string_view digits) {
     }
     lineBytes_.push_back(value);
     RemovePair(digits);
-    if (const DownloadStep end = line_.CheckAbort()) {
-      return end;
-    }
   }
-  return std::nullopt;
 }
 
 DownloadStep QvmRoute::SendBuffer() {
@@ -159,7 +155,7 @@ DownloadStep QvmRoute::SendBuffer() {
   }
   for (const std::int16_t value : lineBytes_) {
     line_.SendByte(ByteOf(value));
-    if (const DownloadStep end = line_.CheckAbort()) {
+    if (const DownloadStep end = line_.Ended()) {
       return end;
     }
   }

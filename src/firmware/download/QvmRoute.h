@@ -20,7 +20,7 @@ class QvmRoute {
  private:
   DownloadStep Begin();
   DownloadStep SendLine(std::string_view digits);
-  DownloadStep Convert(std::string_view digits);
+  void Convert(std::string_view digits);
   DownloadStep SendBuffer();
 
   DownloadLine& line_;

@@ -46,8 +46,8 @@ std::string DescriptionText(const FirmwareDescription& description, const String
 /// too, and one beyond `MostDescribedBytes` is not looked into.
 std::string DescribeFile(const Files& disk, const std::string& fileName, const StringTable& strings);
 
-/// Ten times a full image of a device, so that describing a file never takes long.
-inline constexpr std::uint64_t MostDescribedBytes = 16U << 20U;
+/// More than twice a full image of a device. Describing a file never holds the window up.
+inline constexpr std::uint64_t MostDescribedBytes = 4U << 20U;
 
 /// "7 min 4 s"
 std::string MinutesText(std::int64_t seconds, const StringTable& strings);

@@ -157,6 +157,70 @@ TEST_F(DisturbedDownload, EndsSilentlyWithTheProgram) {
   EXPECT_FALSE(Port.PortOpen());
 }
 
+/// The operator's stop at the very moment of an answer.
+class StoppedWithAnAnswer : public DownloadSite {
+ protected:
+  /// Both come as one event, with the `count`th command of this letter.
+  void StopWith(char letter, std::size_t count, const std::string& answer) {
+    boot.Instead = [this, letter, count, answer](const std::string& command) -> std::optional<std::string> {
+      if (command[0] != letter || boot.CountOf(letter) != count) {
+        return std::nullopt;
+      }
+      Events.At(boot.AnswerTime, [this, answer] {
+        boot.Say(answer);
+        download.RequestAbort();
+      });
+      return "";
+    };
+  }
+
+  /// The stop comes right after the answer.
+  void StopBehind(char letter, std::size_t count) {
+    boot.OnCommand = [this, letter, count](const std::string& command) {
+      if (command[0] == letter && boot.CountOf(letter) == count) {
+        Events.At(boot.AnswerTime / 2, [this] {
+          Events.At(boot.AnswerTime - boot.AnswerTime / 2, [this] { download.RequestAbort(); });
+        });
+      }
+    };
+  }
+};
+
+TEST_F(StoppedWithAnAnswer, TakesTheSynchronisationButNotTheIdentification) {
+  for (const bool isQvm : {true, false}) {
+    for (const auto& [letter, answer, letters] :
+         {std::tuple{'X', "x", "XP"}, {'P', isQvm ? "p" : "d", "XP"}}) {
+      Boxes.Boxes.clear();
+      boot.Commands.clear();
+      StopWith(letter, 1, answer);
+      isQvm ? RunQvm(TwoLines) : RunQvm2(OnePage);
+      EXPECT_EQ(boot.Letters(), letters);
+      ExpectBox(AbortText);
+      ExpectReset();
+    }
+  }
+}
+
+TEST_F(StoppedWithAnAnswer, ToItsLastLineDoesNotFinish) {
+  StopWith('Z', 2, "f");
+  RunQvm(TwoLines);
+  EXPECT_EQ(boot.Letters(), "XPBSZZ");
+  ExpectBox(AbortText);
+}
+
+TEST_F(StoppedWithAnAnswer, ToALineOrARowSendsNoOther) {
+  StopBehind('Z', 1);
+  RunQvm(TwoLines);
+  EXPECT_EQ(boot.Letters(), "XPBSZ");
+  ExpectBox(AbortText);
+  Boxes.Boxes.clear();
+  boot.Commands.clear();
+  StopBehind('Z', 3);
+  RunQvm2(OnePage);
+  EXPECT_EQ(boot.Letters(), "XPBEZZZ");
+  ExpectBox(AbortText);
+}
+
 TEST_F(DisturbedDownload, KeepsTheComputerAwakeToTheEndAndNoLonger) {
   Boxes.WhileOpen = [this](const auto& /*box*/) { EXPECT_EQ(Awake.Held, 0); };
   boot.OnCommand = [this](const auto& /*command*/) { EXPECT_EQ(Awake.Held, 1); };

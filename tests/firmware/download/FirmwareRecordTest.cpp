@@ -96,6 +96,25 @@ TEST_F(Record, OfAShortTranscriptLeavesNothingOut) {
   EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 9 + 1000);
 }
 
+TEST_F(Record, NamesAThousandAnswersAndCountsTheOthers) {
+  FirmwareRecord record = Make();
+  record.Received('?');
+  for (int answer = 0; answer < 1000; ++answer) {
+    record.BadAnswer("line 1", '?');
+  }
+  FirmwareRecord noisy = Make();
+  noisy.Received('?');
+  for (int answer = 0; answer < 1003; ++answer) {
+    noisy.BadAnswer("line 1", '?');
+  }
+  record.Write("ended");
+  EXPECT_THAT(Written(), Not(HasSubstr("more")));
+  noisy.Write("ended");
+  const std::string text = Written();
+  EXPECT_THAT(text, HasSubstr(" 3F to line 1\n... 3 more ...\n\nTranscript:"));
+  EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 7 + 1000 + 3);
+}
+
 TEST_F(Record, IsNotWrittenWithoutAByte) {
   Make().Write("ended");
   EXPECT_THAT(disk.FileNames("/data/logs"), IsEmpty());
@@ -149,6 +168,14 @@ TEST_F(RecordedDownload, NamesTheFileAndEachBadAnswer) {
   EXPECT_THAT(Written(), HasSubstr(" complete\n"));
   EXPECT_THAT(Written(), HasSubstr(" boot-code -> 42 4F 4F 54\n"));
   EXPECT_THAT(Written(), HasSubstr(" boot-code <- 58\n"));
+}
+
+TEST_F(RecordedDownload, SaysThatAFileOfNoKindIsNotLoaded) {
+  RunQvm2("\r\n\r\n");
+  Time.DateAndTime = "2013-05-21 15:00:00";
+  boot.SwitchOnAt(100ms);
+  Run("/fw/GUN.QVM");
+  EXPECT_THAT(Written(), HasSubstr("File: /fw/GUN.QVM\nnot loaded\n"));
 }
 
 TEST_F(RecordedDownload, TellsHowItFailed) {

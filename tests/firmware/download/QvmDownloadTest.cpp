@@ -47,6 +47,21 @@ TEST_F(QvmDownload, SendsEachLineAsOneBuffer) {
   ExpectComplete();
 }
 
+TEST_F(QvmDownload, HandsALineOverBeforeEventsRun) {
+  boot.BufferSizes = {51};
+  std::vector<std::size_t> sentAtEvent;
+  Port.OnOutput = [&, take = Port.OnOutput](std::uint8_t byte) {
+    if (byte == 'Z') {
+      Events.At(0ms, [&] { sentAtEvent.push_back(Port.Sent.size()); });
+    }
+    take(byte);
+  };
+  RunQvm(Line(51) + Line(51));
+  // "XPBS", three bytes, and then one line and both.
+  EXPECT_THAT(sentAtEvent, ElementsAre(7 + 52, 7 + 104));
+  ExpectComplete();
+}
+
 TEST_F(QvmDownload, ShowsItsStepsAndCountsCodeWordsOneLineLate) {
   boot.BufferSizes = {51, 51, 2, 1};
   std::vector<std::string> buffers;

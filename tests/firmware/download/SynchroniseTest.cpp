@@ -262,6 +262,74 @@ TEST_F(Synchronise, AFileThatCannotBeLoadedIsThrownBeforeTheLineOpens) {
   EXPECT_THAT(Boxes.Boxes, IsEmpty());
 }
 
+TEST_F(Synchronise, AFileThatCannotBeLoadedFindsThePortClosed) {
+  AbortAt(1s);
+  RunNothing();
+  EXPECT_TRUE(Port.PortOpen());
+  EXPECT_EQ(NumberThrownBy([this] { Run("/fw/none.qvm"); }), 53);
+  EXPECT_FALSE(Port.PortOpen());
+  EXPECT_EQ(shown.Download, "Downloading...");
+  EXPECT_EQ(shown.Status, "Idle");
+}
+
+TEST_F(Synchronise, AdvisesAnewInEachDownload) {
+  boot.SwitchOnAt(1s);
+  boot.Instead = [](const auto& /*command*/) { return ""; };
+  RunNothing();
+  EXPECT_EQ(shown.Advice, Text(OwnText::AdviceUnchanged));
+  AbortAt(1s);
+  RunNothing();
+  EXPECT_EQ(shown.Advice, Text(OwnText::AdviceNoDevice));
+}
+
+TEST_F(Synchronise, AFileThatIsTooLargeIsThrownByWhatIsWrongInItsStart) {
+  constexpr std::size_t tooMuch = (8U << 20U) + 1;
+  Disk.Put("/fw/large.qvm", std::string(tooMuch, '1'));
+  Disk.Put(
+      "/fw/data.qvm2", "\r\n\r\n" + [] {
+        std::string lines;
+        for (int line = 0; line < 90'000; ++line) {
+          lines += std::string(96, 'F') + "\r\n";
+        }
+        return lines;
+      }());
+  Disk.Put("/fw/feeds.qvm2", std::string(tooMuch, '\n'));
+  Disk.Put("/fw/zeros.qvm2", std::string(tooMuch, '\0'));
+  Disk.Put("/fw/empty.qvm2", [] {
+    std::string lines;
+    while (lines.size() < tooMuch) {
+      lines += "\r\n";
+    }
+    return lines;
+  }());
+  for (const auto& [name, number] : {std::pair{"/fw/large.qvm", 7},
+                                     {"/fw/data.qvm2", 9},
+                                     {"/fw/feeds.qvm2", 6},
+                                     {"/fw/zeros.qvm2", 62},
+                                     {"/fw/empty.qvm2", 7}}) {
+    EXPECT_EQ(NumberThrownBy([this, name = name] { Run(name); }), number) << name;
+    EXPECT_EQ(shown.Busy, 0);
+  }
+  EXPECT_THAT(Port.Log, IsEmpty());
+}
+
+TEST_F(Synchronise, AFileIsNotTooLargeUpToEightMegabytes) {
+  boot.BufferSizes = {0};
+  std::string contents(8U << 20U, ';');
+  contents.replace(0, 6, ":\r\n:\r\n", 6);
+  RunQvm(contents);
+  EXPECT_EQ(boot.Letters(), "XPBSZZF");
+  ExpectComplete();
+}
+
+TEST_F(Synchronise, AFileOfNoKindIsNotReadHoweverLarge) {
+  Disk.Put("/fw/GUN.QVM", std::string((8U << 20U) + 1, '1'));
+  Disk.FailRead("/fw/GUN.QVM", RuntimeError(75));
+  boot.SwitchOnAt(100ms);
+  RunNothing();
+  ExpectComplete();
+}
+
 TEST_F(Synchronise, ADownloadAfterAFailedLoadIsAsGoodAsAny) {
   Disk.Put("/fw/bad.qvm2", "201\r\n\r\n");
   EXPECT_EQ(NumberThrownBy([this] { Run("/fw/bad.qvm2"); }), 9);

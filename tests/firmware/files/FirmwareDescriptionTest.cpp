@@ -130,7 +130,7 @@ TEST_F(DescribedFile, IsNotExaminedIfItIsTooLarge) {
   disk.Put("/a.qvm", std::string(MostDescribedBytes, ':'));
   EXPECT_THAT(Text(), HasSubstr("QVM file"));
   disk.Put("/a.qvm", std::string(MostDescribedBytes + 1, ':'));
-  EXPECT_EQ(Text(), "16777217 bytes: more than any device holds. The file has not been examined.");
+  EXPECT_EQ(Text(), "4194305 bytes: more than any device holds. The file has not been examined.");
 }
 
 }  // namespace
