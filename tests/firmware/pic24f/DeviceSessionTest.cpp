@@ -207,6 +207,34 @@ TEST_F(DeviceSessionTest, EndsAWaitAtASecondStop) {
   EXPECT_LT(Events.Now(), milliseconds(200));
 }
 
+TEST_F(DeviceSessionTest, EndsAtTheFirstStopAsLongAsNothingWasChanged) {
+  for (const std::vector<std::string>& command :
+       {std::vector<std::string>{"identify"}, {"erase"}, {"write", "/home/new.hex"}}) {
+    stops = 0;
+    loader.OnPacket = [&](const Bytes&) {
+      Events.At(milliseconds(10), [this] { stops = 1; });
+      return false;
+    };
+    const auto start = Events.Now();
+    EXPECT_EQ(Run(command), -100) << command[0];
+    EXPECT_LT(Events.Now() - start, milliseconds(200)) << command[0];
+    EXPECT_EQ(said, command[0] == "identify" ? "" : "tessarine-pic24f: the device is as it was\n");
+  }
+}
+
+TEST_F(DeviceSessionTest, EndsAComparisonAtTheFirstStop) {
+  loader.OnPacket = [&](const Bytes& packet) {
+    if (packet[1] == 64) {
+      Events.At(milliseconds(10), [this] { stops = 1; });
+      return false;
+    }
+    return true;
+  };
+  EXPECT_EQ(Run({"verify", "/home/new.hex"}), -100);
+  EXPECT_LT(Events.Now(), milliseconds(200));
+  EXPECT_THAT(said, HasSubstr("is as it was"));
+}
+
 TEST_F(DeviceSessionTest, SaysWhatALostLineLeaves) {
   loader.OnPacket = [&](const Bytes& packet) {
     if (packet[0] == 2) {
