@@ -3,6 +3,7 @@
 #include <QContextMenuEvent>
 #include <QMouseEvent>
 #include <QStyle>
+#include <QToolButton>
 
 #include "core/line/CommPortSetting.h"
 #include "core/text/Filled.h"
@@ -75,6 +76,10 @@ void frmBootload::SetUpToolbar() {
   ui_->Write->setIcon(icon(QStyle::SP_DialogSaveButton));
   ui_->Erase->setIcon(icon(QStyle::SP_TrashIcon));
   ui_->Run->setIcon(icon(QStyle::SP_MediaPlay));
+  for (auto* button : ui_->Toolbar1->findChildren<QToolButton*>()) {
+    button->setFocusPolicy(
+        Qt::TabFocus);  // a tool bar's buttons are out of the keyboard's reach by themselves
+  }
   for (QAction* button : {ui_->Connect, ui_->Run}) {
     // The toolkit toggles a check button however it is pressed; during an operation nothing is to change.
     connect(button, &QAction::triggered, this, [this, button](bool checked) {

@@ -46,6 +46,22 @@ TEST_P(BootloadWindow, HasNinePositionsInItsToolBar) {
   EXPECT_TRUE(Action("Run").isCheckable());
 }
 
+TEST_P(BootloadWindow, GivesTheToolBarToTheKeyboard) {
+  Open();
+  Show(*window);
+  Find<QLineEdit>(*window, "txtFileName").setFocus();
+  const auto& bar = Find<QToolBar>(*window, "Toolbar1");
+  const auto* const run = bar.widgetForAction(&Action("Run"));
+  int steps = 0;
+  while (window->focusWidget() != run && steps++ < 30) {
+    Type(*window, Qt::Key_Tab);
+  }
+  ASSERT_EQ(window->focusWidget(), run);
+  Type(*window, Qt::Key_Space);
+  EXPECT_EQ(Status(), "Run mode is set...");
+  EXPECT_TRUE(Action("Run").isChecked());
+}
+
 TEST_P(BootloadWindow, HasToolTipsOnItsPanels) {
   Open();
   EXPECT_EQ(Find<QLabel>(*window, "StatusPanel1").toolTip(),
