@@ -11,7 +11,7 @@ namespace sim {
 
 /// What a PIC24F device has.
 struct Pic24fDevice {
-  std::string_view Name;           ///< for the command line
+  std::string_view Name{};         ///< for the command line
   std::uint16_t Identity = 0;      ///< 0 to 65535, from 0xFF0000
   std::uint32_t Instructions = 0;  ///< whole pages of 512
   /// An even number, at most 32,764. The chip has them at the end of its program addresses, 512 bytes from
