@@ -88,6 +88,23 @@ TEST_F(DeviceSessionTest, TellsADeviceThatDoesNotAnswer) {
   EXPECT_THAT(said, HasSubstr("is as it was"));
 }
 
+TEST_F(DeviceSessionTest, HasATimeOutAndRetriesOfItsOwnWhereTheIniFileHasNone) {
+  std::string ini = Ini;
+  for (const std::string line : {"CommTimeOut=1000\r\n", "maxretry=3\r\n"}) {
+    ini.erase(ini.find(line), line.size());
+  }
+  Disk.Put("/data/P24qp.ini", ini);
+  std::vector<Bytes> packets;
+  loader.OnPacket = [&](const Bytes& packet) {
+    packets.push_back(packet);
+    return false;
+  };
+  EXPECT_EQ(Run({"erase"}), 0);
+  EXPECT_EQ(packets, std::vector<Bytes>(4, Bytes{0x01, 0x01, 0x00, 0x00, 0xFF}));
+  EXPECT_GE(Events.Now(), milliseconds(4000));
+  EXPECT_LE(Events.Now(), milliseconds(4100));
+}
+
 TEST_F(DeviceSessionTest, TellsAPortThatDoesNotOpen) {
   port.FailNextOpen(8005);
   EXPECT_LT(Run({"identify"}), 0);

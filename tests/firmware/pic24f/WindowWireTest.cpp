@@ -1,6 +1,7 @@
 #include <gmock/gmock.h>
 
 #include <QLabel>
+#include <QTimer>
 #include <optional>
 
 #include "firmware/pic24f/SerialPicBoot.h"

@@ -226,6 +226,19 @@ TEST_P(BootloadWindow, ListsBytesThatTheDeviceWouldNotGet) {
   EXPECT_FALSE(list.isVisible());
 }
 
+TEST_P(BootloadWindow, ListsAThousandStretchesAndTheCountOfTheOthers) {
+  Open();
+  std::string hex = HexFile::Data(0, {1});
+  // One of them is the configuration memory's, which is never lost.
+  for (unsigned int i = 0; i < 1004; ++i) {
+    hex += HexFile::Upper(0x101 + i) + HexFile::Data(0, {1});
+  }
+  Browse(hex + HexFile::End());
+  ASSERT_EQ(LostBytes().size(), 1001U);
+  EXPECT_THAT(LostBytes()[999], StartsWith("04E90000"));
+  EXPECT_THAT(LostBytes()[1000], testing::HasSubstr(" 3"));
+}
+
 INSTANTIATE_TEST_SUITE_P(Languages, BootloadWindow,
                          testing::Values(Language::English, Language::SimplifiedChinese),
                          [](const auto& tested) {
