@@ -7,7 +7,8 @@
 namespace sim {
 namespace {
 
-constexpr std::uint32_t EepromEnd = 0x1000000;  // byte address
+constexpr std::uint32_t EepromEnd = 0x1000000;  // in a HEX file
+constexpr std::size_t FileBytesOfAddress = 2;
 constexpr std::uint32_t ConfigurationBegin = 0xF80000;
 constexpr std::size_t ConfigurationBytes = 16;
 constexpr std::uint32_t IdentityAddress = 0xFF0000;
@@ -32,7 +33,7 @@ std::vector<std::uint8_t> Part(const std::vector<std::uint8_t>& bytes, std::size
 Pic24fMemory::Pic24fMemory(const Pic24fDevice& device)
     : device_(device),
       program_(device.Instructions * InstructionBytes, 0xFF),
-      eeprom_(device.EepromBytes, 0xFF),
+      eeprom_(device.EepromBytes * FileBytesOfAddress, 0xFF),
       configuration_(ConfigurationBytes, 0xFF),
       applicationStart_(BlankInstruction) {
   ErasePages(0, device.Instructions / PageInstructions);

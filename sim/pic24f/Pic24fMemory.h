@@ -11,10 +11,12 @@ namespace sim {
 
 /// What a PIC24F device has.
 struct Pic24fDevice {
-  std::string_view Name;           ///< for the command line
+  std::string_view Name{};         ///< for the command line
   std::uint16_t Identity = 0;      ///< 0 to 65535, from 0xFF0000
   std::uint32_t Instructions = 0;  ///< whole pages of 512
-  std::uint32_t EepromBytes = 0;   ///< they end at byte address 0xFFFFFF; at most 65,528, an even number
+  /// An even number, at most 32,764. The chip has them at the end of its program addresses, 512 bytes from
+  /// 0x7FFE00 to 0x7FFFFF.
+  std::uint32_t EepromBytes = 0;
   /// Program addresses of words that the loader keeps for itself, 0 for none: the application's start, taken
   /// from the reset words that a host writes, and the time that the loader waits before it.
   std::uint32_t UserResetVector = 0;
@@ -32,6 +34,9 @@ inline constexpr std::array<Pic24fDevice, 3> Pic24fDevices{{
 /// shown as four bytes, the last of them always 0. Programming only clears bits, an erased instruction is FF
 /// FF FF. The two instructions of the reset vector always lead to the loader, whatever is written there; the
 /// loader's own code is not shown.
+///
+/// The EEPROM goes by the byte addresses of HEX files, which have two for each program address: 512 bytes of
+/// it are 0xFFFC00 to 0xFFFFFF there. What is written in this range is kept and shown byte for byte.
 ///
 /// All operations return false or none, and change nothing, for addresses that the device does not have or
 /// that are not those of a whole row, page, instruction or word.

@@ -64,7 +64,7 @@ DeviceEntry Pic24fEntry() {
                {"pages", "N", "its pages of 512 instructions; 0: 86, 171 or 11 (0)",
                 NumberValue{.Highest = 15'872}},
                {"eeprom-words", "N", "its words of EEPROM; 0: none, or 256 if small (0)",
-                NumberValue{.Highest = 32'764}},
+                NumberValue{.Highest = 16'382}},
                {"user-reset", "N", "program address where the loader keeps the application's start (0: none)",
                 NumberValue{.Highest = 0xFFFFFF}},
                {"boot-delay", "N", "program address where the loader keeps its delay (0: none)",

@@ -21,6 +21,8 @@ class FakePicBoot : public PicBoot {
   /// 3 retries", "WritePIC 2 at 80, 256 bytes in blocks of 256", "ErasePIC 0 43 5 retries".
   std::vector<std::string> Log;
 
+  PicRecord Written;  ///< that of the last WritePIC
+
   /// What OpenPIC returns.
   std::int32_t Handle = 3;
 
@@ -98,6 +100,7 @@ class FakePicBoot : public PicBoot {
   std::int32_t WritePIC(std::int32_t handle, const PicRecord& record,
                         std::span<const std::uint8_t> bytes) override {
     Begin("WritePIC", std::to_string(handle) + TextOf(record));
+    Written = record;
     if (const auto result = Told("WritePIC")) {
       return *result;
     }

@@ -38,6 +38,9 @@ class PicFrameDecoder {
   /// True if the byte completes a packet whose checksum is right.
   bool Receive(std::uint8_t byte);
 
+  /// True if a packet has begun and is not complete.
+  bool IsWithin() const { return state_ == State::Inside || state_ == State::Escaped; }
+
   /// The packet completed last, without its checksum: at least one byte.
   const std::vector<std::uint8_t>& Data() const { return data_; }
 

@@ -20,6 +20,10 @@ constexpr milliseconds ErasePageTime{100};
 constexpr milliseconds WriteRowTime{20};
 constexpr milliseconds WriteWordTime{20};
 
+/// Between the pieces of an answer that comes in slowly, once the time for it is over.
+constexpr milliseconds PauseInAnswer{200};
+constexpr milliseconds SlowestByte{20};
+
 bool IsEeprom(std::uint8_t command) {
   return command == PicCommand::ReadEeprom || command == PicCommand::WriteEeprom;
 }
@@ -29,6 +33,11 @@ std::size_t CountOf(const PicRecord& record) {
   const std::size_t size = IsEeprom(record.Command) ? BytesOfEepromWord : record.BlockSize;
   const std::size_t count = size == 0 ? 0 : record.DataLength / size;
   return count > MostBlocks ? 0 : count;
+}
+
+/// Bytes of a packet on the line: each one of data may be escaped, and there are the marks and the checksum.
+std::size_t LineBytes(std::size_t dataBytes) {
+  return 2 * dataBytes + 5;
 }
 
 std::vector<std::uint8_t> Header(std::uint8_t command, std::size_t count, std::uint32_t address) {
@@ -213,16 +222,23 @@ std::int32_t SerialPicBoot::Exchange(const Request& request) {
 LineWait SerialPicBoot::Await(std::size_t longest, Milliseconds limit,
                               const std::function<bool(const Bytes&)>& isDue) {
   PicFrameDecoder decoder(longest);
-  const LineWait wait = job_->WaitUntil(
-      [&] {
-        while (const auto byte = job_->Take()) {
-          if (decoder.Receive(*byte) && isDue(decoder.Data())) {
-            return true;
-          }
-        }
-        return false;
-      },
-      limit);
+  bool comesIn = false;
+  const auto isThere = [&] {
+    while (const auto byte = job_->Take()) {
+      comesIn = true;
+      if (decoder.Receive(*byte) && isDue(decoder.Data())) {
+        return true;
+      }
+    }
+    return false;
+  };
+  LineWait wait = job_->WaitUntil(isThere, limit);
+  for (Milliseconds more = SlowestByte * LineBytes(longest);
+       wait == LineWait::TimedOut && comesIn && decoder.IsWithin() && more > Milliseconds(0);
+       more -= PauseInAnswer) {
+    comesIn = false;
+    wait = job_->WaitUntil(isThere, PauseInAnswer);
+  }
   answer_ = decoder.Data();
   return wait;
 }
@@ -234,11 +250,9 @@ void SerialPicBoot::Send(std::span<const std::uint8_t> packet) {
   }
 }
 
-/// Each byte may be escaped, and there are the marks and the checksum.
 milliseconds SerialPicBoot::LineTime(std::size_t dataBytes) const {
   constexpr std::size_t bitsOfByte = 10;
-  const std::size_t bytes = 2 * dataBytes + 5;
-  return milliseconds(1 + 1000 * bitsOfByte * bytes / static_cast<std::size_t>(bitRate_));
+  return milliseconds(1 + 1000 * bitsOfByte * LineBytes(dataBytes) / static_cast<std::size_t>(bitRate_));
 }
 
 std::int32_t SerialPicBoot::GiveUp(LineWait wait) {

@@ -16,7 +16,7 @@
 /// that comes in is passed over, and what came before a packet is sent is dropped.
 ///
 /// An operation waits for the time-out, and besides for as long as its bytes take on the line and the
-/// device's memory needs.
+/// device's memory needs. An answer that comes in slowly is waited for as long as it goes on.
 class SerialPicBoot final : public PicBoot {
  public:
   struct Parts {

@@ -3,6 +3,7 @@
 #include <QContextMenuEvent>
 #include <QMouseEvent>
 #include <QStyle>
+#include <QToolButton>
 
 #include "core/line/CommPortSetting.h"
 #include "core/text/Filled.h"
@@ -71,10 +72,15 @@ void frmBootload::SetUpToolbar() {
   const auto icon = [this](QStyle::StandardPixmap which) { return style()->standardIcon(which); };
   ui_->Open->setIcon(icon(QStyle::SP_DialogOpenButton));
   ui_->Abort->setIcon(icon(QStyle::SP_BrowserStop));
-  ui_->Connect->setIcon(icon(QStyle::SP_ComputerIcon));
+  // It comes in 16 and 32 pixels, and the smaller one would leave the caption higher than the others.
+  ui_->Connect->setIcon(icon(QStyle::SP_ComputerIcon).pixmap(32));
   ui_->Write->setIcon(icon(QStyle::SP_DialogSaveButton));
   ui_->Erase->setIcon(icon(QStyle::SP_TrashIcon));
   ui_->Run->setIcon(icon(QStyle::SP_MediaPlay));
+  // A tool bar leaves its buttons out of the keyboard's reach.
+  for (auto* button : ui_->Toolbar1->findChildren<QToolButton*>()) {
+    button->setFocusPolicy(Qt::TabFocus);
+  }
   for (QAction* button : {ui_->Connect, ui_->Run}) {
     // The toolkit toggles a check button however it is pressed; during an operation nothing is to change.
     connect(button, &QAction::triggered, this, [this, button](bool checked) {

@@ -70,6 +70,28 @@ TEST(CompareImages, ReadsSegmentAddresses) {
               IsEmpty());
 }
 
+TEST(CompareImages, WrapsTheAddressesOfASegment) {
+  const std::string hex =
+      HexFile::Record(2, 0, {0x10, 0x00}) + HexFile::Data(0xFFFE, {1, 2, 3, 4}) + HexFile::End();
+  EXPECT_THAT(CompareImages(hex, "", ""),
+              ElementsAre(LostStretch{0x10000, 2, Cause::Missing}, LostStretch{0x1FFFE, 2, Cause::Missing}));
+}
+
+TEST(CompareImages, PassesOverASegmentThatIsTooShort) {
+  EXPECT_THAT(LostOf(Program(0, 0x10) + HexFile::Record(2, 0, {0x10}) + Program(0x10, 0x20) + HexFile::End()),
+              IsEmpty());
+}
+
+TEST(CompareImages, WritesABlockFromTheEvenAddressBelow) {
+  // The device has one address for two bytes.
+  std::string image;
+  for (int line = 0; line < 16; ++line) {
+    image += "000101 01 02 03 00 05 06 07 00 09 0A 0B 00 0D 0E 0F 00 \n";
+  }
+  const std::vector<std::uint8_t> data = {1, 2, 3, 0, 5, 6, 7, 0, 9, 10, 11, 0, 13, 14, 15, 0};
+  EXPECT_THAT(CompareImages(HexFile::Data(0x100, data) + HexFile::End(), image, ""), IsEmpty());
+}
+
 TEST(CompareImages, FindsDisplacedData) {
   // 16 bytes at 4: the second line of the block takes them four bytes late.
   const std::vector<LostStretch> lost = LostOf(
@@ -98,7 +120,7 @@ TEST(CompareImages, DoesNotLookAtTheFourthByteOfAnInstruction) {
 TEST(CompareImages, NeverMissesFill) {
   EXPECT_THAT(LostOf(Program(0, 0x10) + HexFile::Data(0x500, std::vector<std::uint8_t>(16, 0xFF)) +
                      HexFile::Data(0x700, {0xFF, 0xFF, 0xFF, 0}) + HexFile::Upper(0x200) +
-                     HexFile::Data(0, {0xFF, 0xFF, 0xFF, 0}) + HexFile::End()),
+                     HexFile::Data(0, {0xFF, 0xFF, 0xFF, 0, 0xFF, 0xFF, 0xFF, 0xFF}) + HexFile::End()),
               IsEmpty());
 }
 
@@ -122,6 +144,12 @@ TEST(CompareImages, ComparesTheEeprom) {
                           HexFile::Data(0, {1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, 13, 14, 15, 16}) +
                           HexFile::End();
   EXPECT_THAT(LostOf(hex), IsEmpty());
+}
+
+TEST(CompareImages, LooksAtEachFourthByteOfTheEeprom) {
+  const std::string hex = HexFile::Upper(0xFF) + HexFile::Data(0xFC00, {1, 2, 3, 4}) + HexFile::End();
+  EXPECT_THAT(CompareImages(hex, "", "FFFC00 01 02 03 05 FF FF FF 00 FF FF FF 00 FF FF FF 00 \n"),
+              ElementsAre(LostStretch{0xFFFC03, 1, Cause::Displaced}));
 }
 
 TEST(CompareImages, FindsEepromDataThatFillOfALaterLineOverwrites) {

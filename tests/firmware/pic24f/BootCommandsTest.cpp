@@ -70,6 +70,43 @@ TEST_P(BootCommands, ShowsTheMemoriesOfADeviceWithEeprom) {
   EXPECT_TRUE(Action("M_PSendCfg").isVisible());
 }
 
+TEST_P(BootCommands, ShowsItemsOfTheProgramMenuByTheDevice) {
+  Open(true);
+  EXPECT_TRUE(Action("M_MemAccess2").isVisible());
+  EXPECT_FALSE(Action("space101").isVisible());
+  EXPECT_FALSE(Action("M_PSendCfg").isVisible());
+  Act("Run");
+  Act("Connect");
+  EXPECT_TRUE(Action("space101").isVisible());
+  EXPECT_FALSE(Action("M_PSendCfg").isVisible());
+  Connect(1103);
+  EXPECT_TRUE(Action("space101").isVisible());
+  Act("M_FPBaud7");
+  EXPECT_FALSE(Action("space101").isVisible());
+  EXPECT_TRUE(Action("M_PSendCfg").isVisible());
+}
+
+TEST_P(BootCommands, NeverDisablesTheFasterBitRates) {
+  Connect();
+  int calls = 0;
+  Library.OnCall = [&](const std::string& operation) {
+    if (operation == "ErasePIC") {
+      ++calls;
+      for (int item = 1; item <= 8; ++item) {
+        const std::string name = "M_FPBaud" + std::to_string(item);
+        EXPECT_EQ(Action(name.c_str()).isEnabled(), item > 5) << name;
+      }
+      EXPECT_TRUE(Action("Connect").isEnabled());
+      EXPECT_TRUE(Action("Open").isEnabled());
+    }
+  };
+  Boxes.Answers = {BoxAnswer::Yes};
+  Act("Erase");
+  EXPECT_EQ(calls, 1);
+  EXPECT_TRUE(Action("M_FPBaud1").isEnabled());
+  EXPECT_TRUE(Action("M_MemAccess1").isEnabled());
+}
+
 TEST_P(BootCommands, TellsAPortThatDoesNotOpen) {
   Open(true);
   Library.Handle = -1;

@@ -88,6 +88,23 @@ TEST_F(DeviceSessionTest, TellsADeviceThatDoesNotAnswer) {
   EXPECT_THAT(said, HasSubstr("is as it was"));
 }
 
+TEST_F(DeviceSessionTest, HasATimeOutAndRetriesOfItsOwnWhereTheIniFileHasNone) {
+  std::string ini = Ini;
+  for (const std::string line : {"CommTimeOut=1000\r\n", "maxretry=3\r\n"}) {
+    ini.erase(ini.find(line), line.size());
+  }
+  Disk.Put("/data/P24qp.ini", ini);
+  std::vector<Bytes> packets;
+  loader.OnPacket = [&](const Bytes& packet) {
+    packets.push_back(packet);
+    return false;
+  };
+  EXPECT_EQ(Run({"erase"}), 0);
+  EXPECT_EQ(packets, std::vector<Bytes>(4, Bytes{0x01, 0x01, 0x00, 0x00, 0xFF}));
+  EXPECT_GE(Events.Now(), milliseconds(4000));
+  EXPECT_LE(Events.Now(), milliseconds(4100));
+}
+
 TEST_F(DeviceSessionTest, TellsAPortThatDoesNotOpen) {
   port.FailNextOpen(8005);
   EXPECT_LT(Run({"identify"}), 0);
@@ -205,6 +222,34 @@ TEST_F(DeviceSessionTest, EndsAWaitAtASecondStop) {
   };
   EXPECT_LT(Run({"write", "/home/new.hex"}), 0);
   EXPECT_LT(Events.Now(), milliseconds(200));
+}
+
+TEST_F(DeviceSessionTest, EndsAtTheFirstStopAsLongAsNothingWasChanged) {
+  for (const std::vector<std::string>& command :
+       {std::vector<std::string>{"identify"}, {"erase"}, {"write", "/home/new.hex"}}) {
+    stops = 0;
+    loader.OnPacket = [&](const Bytes&) {
+      Events.At(milliseconds(10), [this] { stops = 1; });
+      return false;
+    };
+    const auto start = Events.Now();
+    EXPECT_EQ(Run(command), -100) << command[0];
+    EXPECT_LT(Events.Now() - start, milliseconds(200)) << command[0];
+    EXPECT_EQ(said, command[0] == "identify" ? "" : "tessarine-pic24f: the device is as it was\n");
+  }
+}
+
+TEST_F(DeviceSessionTest, EndsAComparisonAtTheFirstStop) {
+  loader.OnPacket = [&](const Bytes& packet) {
+    if (packet[1] == 64) {
+      Events.At(milliseconds(10), [this] { stops = 1; });
+      return false;
+    }
+    return true;
+  };
+  EXPECT_EQ(Run({"verify", "/home/new.hex"}), -100);
+  EXPECT_LT(Events.Now(), milliseconds(200));
+  EXPECT_THAT(said, HasSubstr("is as it was"));
 }
 
 TEST_F(DeviceSessionTest, SaysWhatALostLineLeaves) {

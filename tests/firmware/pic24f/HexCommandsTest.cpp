@@ -96,6 +96,12 @@ TEST_F(HexCommands, ImportLeavesNoImageOfAFileThatIsNone) {
   EXPECT_FALSE(files.FileExists("/home/images/eedata.img"));
 }
 
+TEST_F(HexCommands, ImportPrintsACodeWhereTheFolderCannotBeMade) {
+  EXPECT_EQ(Import(HexFile::Data(0, {1}) + HexFile::End(), "/home/new.hex"), 1);
+  EXPECT_EQ(printed, "code -6\n");
+  EXPECT_NE(said, "");
+}
+
 TEST_F(HexCommands, ImageWritesTheProgram) {
   EXPECT_EQ(Image(HexFile::Data(0, {1, 2, 3, 0, 4, 5, 6, 0}) + HexFile::End()), 0);
   EXPECT_EQ(printed, "pages 2\nrows 2\n");

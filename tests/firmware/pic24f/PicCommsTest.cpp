@@ -87,6 +87,17 @@ TEST_F(PicCommsTest, WritesBlocksAndReadsThemBack) {
   EXPECT_EQ(Log(), "");
 }
 
+TEST_F(PicCommsTest, TellsTheLibraryTheTypeOfTheDevice) {
+  EXPECT_EQ(WriteProgram(Image(0, 16, 0xA5)), 1);
+  EXPECT_EQ(Library.Written.DeviceType, 2);
+  EXPECT_EQ(Library.Written.BytesPerAddress, 2);
+  comms.Device.DeviceType = 1;
+  EXPECT_EQ(WriteEeprom(Image(0xFFFC00, 1, 0x33)), 1);
+  EXPECT_EQ(Library.Written.DeviceType, 1);
+  EXPECT_EQ(Library.Written.BytesPerAddress, 1);
+  EXPECT_EQ(Library.Written.Address, 0xFFFC00U);
+}
+
 TEST_F(PicCommsTest, DropsABlockThatIsNotCompleteAtTheEnd) {
   EXPECT_EQ(WriteProgram(Image(0, 17, 0xA5)), 1);
   EXPECT_EQ(Library.Flash.size(), 256U);

@@ -101,6 +101,37 @@ TEST_F(SerialPicBootTest, TakesAnAnswerThatIsTornAnywhere) {
   }
 }
 
+TEST_F(SerialPicBootTest, TakesAnAnswerThatComesInSlowly) {
+  Open();
+  OnPacket = [this] {
+    for (std::size_t i = 0; i < VersionAnswer.size(); ++i) {
+      Answer({VersionAnswer[i]}, 300 + 90 * static_cast<int>(i));  // it ends after 1020 ms
+    }
+  };
+  std::array<std::uint8_t, 11> buffer = {0x00, 0x02};
+  EXPECT_EQ(library.SendGetPacket(handle, buffer, 2, 10, 0), 4);
+}
+
+TEST_F(SerialPicBootTest, GivesUpAnAnswerThatDoesNotGoOn) {
+  Open();
+  OnPacket = [this] { Answer(Bytes(VersionAnswer.begin(), VersionAnswer.end() - 1), 400); };
+  std::array<std::uint8_t, 11> buffer = {0x00, 0x02};
+  EXPECT_EQ(library.SendGetPacket(handle, buffer, 2, 10, 0), SerialPicBoot::NoAnswer);
+  EXPECT_LE(events.Now(), milliseconds(720));
+}
+
+TEST_F(SerialPicBootTest, GivesUpAnAnswerThatNeverEnds) {
+  Open();
+  std::function<void()> babble = [&] {
+    port.Receive({0x55, 0x55, 0x01});
+    events.At(milliseconds(10), babble);
+  };
+  babble();
+  std::array<std::uint8_t, 11> buffer = {0x08};
+  EXPECT_EQ(library.SendGetPacket(handle, buffer, 1, 10, 0), SerialPicBoot::NoAnswer);
+  EXPECT_LE(events.Now(), milliseconds(1200));
+}
+
 TEST_F(SerialPicBootTest, RepeatsAPacketAsOftenAsAskedFor) {
   Open();
   std::array<std::uint8_t, 11> buffer = {0x08};

@@ -46,6 +46,22 @@ TEST_P(BootloadWindow, HasNinePositionsInItsToolBar) {
   EXPECT_TRUE(Action("Run").isCheckable());
 }
 
+TEST_P(BootloadWindow, GivesTheToolBarToTheKeyboard) {
+  Open();
+  Show(*window);
+  Find<QLineEdit>(*window, "txtFileName").setFocus();
+  const auto& bar = Find<QToolBar>(*window, "Toolbar1");
+  const auto* const run = bar.widgetForAction(&Action("Run"));
+  int steps = 0;
+  while (window->focusWidget() != run && steps++ < 30) {
+    Type(*window, Qt::Key_Tab);
+  }
+  ASSERT_EQ(window->focusWidget(), run);
+  Type(*window, Qt::Key_Space);
+  EXPECT_EQ(Status(), "Run mode is set...");
+  EXPECT_TRUE(Action("Run").isChecked());
+}
+
 TEST_P(BootloadWindow, HasToolTipsOnItsPanels) {
   Open();
   EXPECT_EQ(Find<QLabel>(*window, "StatusPanel1").toolTip(),
@@ -208,6 +224,19 @@ TEST_P(BootloadWindow, ListsBytesThatTheDeviceWouldNotGet) {
   ExpectEntriesAreNamed(*window);
   Browse(HexFile::Data(0, {1}) + HexFile::End());
   EXPECT_FALSE(list.isVisible());
+}
+
+TEST_P(BootloadWindow, ListsAThousandStretchesAndTheCountOfTheOthers) {
+  Open();
+  std::string hex = HexFile::Data(0, {1});
+  // One of them is the configuration memory's, which is never lost.
+  for (unsigned int i = 0; i < 1004; ++i) {
+    hex += HexFile::Upper(0x101 + i) + HexFile::Data(0, {1});
+  }
+  Browse(hex + HexFile::End());
+  ASSERT_EQ(LostBytes().size(), 1001U);
+  EXPECT_THAT(LostBytes()[999], StartsWith("04E90000"));
+  EXPECT_THAT(LostBytes()[1000], testing::HasSubstr(" 3"));
 }
 
 INSTANTIATE_TEST_SUITE_P(Languages, BootloadWindow,

@@ -105,9 +105,29 @@ TEST(Pic24fMemory, ShowsItsEepromAsProgramMemoryToo) {
   EXPECT_EQ(memory.ReadEeprom(0xFFFE00, 8), Bytes(16, 0xFF));
   EXPECT_TRUE(memory.WriteEeprom(0xFFFFFE, Bytes{7, 8}));
   EXPECT_FALSE(memory.WriteEeprom(0xFFFFFE, line));
-  EXPECT_FALSE(memory.WriteEeprom(0xFFFDFE, Bytes{7, 8}));
+  EXPECT_FALSE(memory.WriteEeprom(0xFFFBFE, Bytes{7, 8}));
   EXPECT_EQ(memory.ReadEeprom(0xFFFE11, 1), std::nullopt);
   EXPECT_FALSE(Pic24fMemory(Pic24fDevices[0]).WriteEeprom(0xFFFE10, line));
+}
+
+TEST(Pic24fMemory, HasItsEepromAtTwiceTheChipsProgramAddress) {
+  // 256 words from program address 7FFE00 on: FFFC00 in a HEX file.
+  Pic24fMemory memory = Small();
+  const Bytes line{1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, 13, 14, 15, 16};
+  EXPECT_TRUE(memory.WriteEeprom(0xFFFC00, line));
+  EXPECT_TRUE(memory.WriteEeprom(0xFFFFF0, line));
+  EXPECT_EQ(memory.Read(0xFFFC00, 4), line);
+  EXPECT_EQ(memory.ReadEeprom(0xFFFFF0, 8), line);
+  EXPECT_FALSE(memory.WriteEeprom(0xFE0000, line));
+  EXPECT_FALSE(memory.WriteEeprom(0xFFFBF8, line));
+}
+
+TEST(Pic24fMemory, TellsItsIdentityBesideTheLargestEeprom) {
+  Pic24fDevice device = Pic24fDevices[2];
+  device.EepromBytes = 32'764;
+  Pic24fMemory memory(device);
+  EXPECT_TRUE(memory.WriteEeprom(0xFF0008, Bytes(16, 0)));
+  EXPECT_EQ(memory.Read(0xFF0000, 1), (Bytes{0xEB, 0x03, 0x00, 0x00}));
 }
 
 TEST(Pic24fMemory, HasEightConfigurationWords) {

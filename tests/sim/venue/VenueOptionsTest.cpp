@@ -149,7 +149,7 @@ TEST(VenueOptions, TakeEveryOptionOfThePic24fBootloader) {
   const DeviceOptions told =
       ParseVenueOptions({"--pic24f", "--pic24f-device",     "small", "--pic24f-identity",
                          "32769",    "--pic24f-pages",      "15872", "--pic24f-eeprom-words",
-                         "32764",    "--pic24f-user-reset", "3072",  "--pic24f-boot-delay",
+                         "16382",    "--pic24f-user-reset", "3072",  "--pic24f-boot-delay",
                          "3074",     "--pic24f-row-time",   "0",     "--pic24f-page-time",
                          "1",        "--pic24f-failure",    "noise", "--pic24f-at",
                          "4",        "--pic24f-link",       "port"})
@@ -158,7 +158,7 @@ TEST(VenueOptions, TakeEveryOptionOfThePic24fBootloader) {
   EXPECT_EQ(told.Choice("device"), 2U);
   EXPECT_EQ(told.Number("identity"), 32769U);
   EXPECT_EQ(told.Number("pages"), 15872U);
-  EXPECT_EQ(told.Number("eeprom-words"), 32764U);
+  EXPECT_EQ(told.Number("eeprom-words"), 16382U);
   EXPECT_EQ(told.Number("user-reset"), 3072U);
   EXPECT_EQ(told.Number("boot-delay"), 3074U);
   EXPECT_EQ(told.Number("row-time"), 0U);

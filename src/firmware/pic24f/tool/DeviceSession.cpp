@@ -26,7 +26,7 @@ DeviceSession::DeviceSession(const Parts& parts, const ToolOptions& options)
       library_({.Port = parts.Line,
                 .Events = parts.Events,
                 .DeviceOf = parts.DeviceOf,
-                .Stopped = [this] { return parts_.StopRequests() > 1; }}),
+                .Stopped = [this] { return parts_.StopRequests() > (state_ == State::Untouched ? 0 : 1); }}),
       comms_({.Library = library_,
               .Disk = parts.Tool.Disk,
               .Events = parts.Events,
@@ -59,7 +59,7 @@ std::int32_t DeviceSession::Run() {
   }
   const std::int32_t code = Converse();
   library_.ClosePIC(comms_.PortHandle);
-  return code;
+  return code == SerialPicBoot::Ended && StopAsked() ? std::int32_t{PicCode::Aborted} : code;
 }
 
 bool DeviceSession::ImportFile() {
@@ -85,7 +85,7 @@ std::int32_t DeviceSession::Converse() {
     return Identify();
   }
   if (!FindDevice()) {
-    return Refused;
+    return StopAsked() ? std::int32_t{PicCode::Aborted} : Refused;
   }
   return options_.Command == "erase" ? Erase() : options_.Command == "write" ? Write() : Verify();
 }
@@ -93,6 +93,9 @@ std::int32_t DeviceSession::Converse() {
 std::int32_t DeviceSession::Identify() {
   const std::string version = comms_.ReadBootVersion();
   const std::string identity = comms_.ReadDeviceId();
+  if (identity == "0" && StopAsked()) {
+    return PicCode::Aborted;
+  }
   if (identity == "0") {
     Complain("the device does not tell its identity");
     return Refused;
@@ -108,6 +111,9 @@ bool DeviceSession::FindDevice() {
   if (section.empty()) {
     const std::string identity = comms_.ReadDeviceId();
     section = ini_.ReadBootIni(BootIni::DeviceListSection, identity);
+    if (section.empty() && StopAsked()) {
+      return false;
+    }
     if (section.empty()) {
       Complain(identity == "0" ? std::string("the device does not tell its identity; --device names it")
                                : identity + " is the identity of no device in P24qp.ini; --device names one");
@@ -132,7 +138,7 @@ std::int32_t DeviceSession::Erase() {
   if (comms_.Device.DeviceType == HasConfigAtEnd && options_.KeepConfig) {
     end -= LastPage;
   }
-  if (parts_.StopRequests() > 0) {
+  if (StopAsked()) {
     return PicCode::Aborted;
   }
   state_ = State::PartlyErased;
@@ -141,7 +147,7 @@ std::int32_t DeviceSession::Erase() {
 }
 
 std::int32_t DeviceSession::Write() {
-  if (parts_.StopRequests() > 0) {
+  if (StopAsked()) {
     return PicCode::Aborted;
   }
   state_ = State::PartlyWritten;
@@ -162,7 +168,7 @@ std::int32_t DeviceSession::Write() {
 }
 
 std::int32_t DeviceSession::Verify() {
-  if (parts_.StopRequests() > 0) {
+  if (StopAsked()) {
     return PicCode::Aborted;
   }
   std::int32_t code = comms_.CompareRangeDevice(comms_.Device.WriteBlock, comms_.Device.BytesPerAddr,
@@ -179,8 +185,12 @@ std::int32_t DeviceSession::Verify() {
   return code;
 }
 
+bool DeviceSession::StopAsked() const {
+  return parts_.StopRequests() > 0;
+}
+
 void DeviceSession::ObeyStop() {
-  if (parts_.StopRequests() > 0) {
+  if (StopAsked()) {
     comms_.RunFlag = 0;
   }
 }

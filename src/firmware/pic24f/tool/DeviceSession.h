@@ -21,12 +21,13 @@ class DeviceSession {
     BootFolder Folder;  ///< of the ini file
     std::function<std::string(const std::string& port)> DeviceOf;
     /// How often the user has asked to stop: once ends an operation after the present block, twice at once.
+    /// As long as nothing was changed, once ends it at once.
     std::function<int()> StopRequests;
     /// May be empty.
     std::function<void(std::size_t done, std::size_t whole)> ShowProgress = {};
   };
 
-  /// Code of a command that is refused before anything is sent.
+  /// Code of a command that is refused before anything is changed.
   static constexpr std::int32_t Refused = 0;
 
   /// Both must outlive the session.
@@ -54,6 +55,7 @@ class DeviceSession {
   std::int32_t Write();
   std::int32_t Verify();
   void ReadSettings();
+  bool StopAsked() const;
   void ObeyStop();
   void PrintDifferences();
 

@@ -56,6 +56,18 @@ void MakeFolder(Files& files, const std::string& path) {
   files.CreateFolder(name);
 }
 
+ImportedHex ImportIntoFolder(const ToolParts& parts, const ToolOptions& options) {
+  try {
+    MakeFolder(parts.Disk, options.Out);
+  } catch (const RuntimeError& error) {
+    Complain(error.what());
+    return {HexCode::Failure, {}};
+  }
+  const std::string folder = options.Out + "/";
+  return ImportHex(parts, options.File,
+                   {folder + "progmem.img", folder + "eedata.img", folder + "config.img"});
+}
+
 }  // namespace
 
 void PrintCode(std::int32_t code) {
@@ -102,10 +114,7 @@ int RunCheck(const ToolParts& parts, const ToolOptions& options) {
 }
 
 int RunImport(const ToolParts& parts, const ToolOptions& options) {
-  MakeFolder(parts.Disk, options.Out);
-  const std::string folder = options.Out + "/";
-  const ImportedHex imported =
-      ImportHex(parts, options.File, {folder + "progmem.img", folder + "eedata.img", folder + "config.img"});
+  const ImportedHex imported = ImportIntoFolder(parts, options);
   PrintCode(imported.Code);
   PrintWarnings(imported.Warnings, parts.Strings);
   if (imported.Code != HexCode::Good) {

@@ -156,8 +156,10 @@ std::string ToolUsage() {
          "other\n"
          "result, 3 a wrong command line.\n"
          "\n"
-         "Codes: 1 done; -1 empty file, or the port does not open; -2 no answer; -3 wrong checksum in the\n"
-         "file, or an answer that is too short; -4 a line that is no record, or no such packet; -5 no end\n"
-         "record, or stopped; -6 a file or record that cannot be read; -100 stopped by Ctrl+C; -101 the\n"
-         "device's content is not that of the file.\n";
+         "Codes: 1 done; 0 refused before anything was changed; -1 empty file, or the port does not open; "
+         "-2\n"
+         "no answer; -3 wrong checksum in the file, or an answer that is too short; -4 a line that is no\n"
+         "record, or no such packet; -5 no end record; -6 a file or record that cannot be read; -100 "
+         "stopped\n"
+         "by Ctrl+C; -101 the device's content is not that of the file.\n";
 }
