@@ -155,7 +155,8 @@ bool SoundRecording::ProgramFile(const std::string& path, std::int16_t soundNumb
     job.Pause(RecorderLink::BlockPause);
     parts_.Display.SetStatus2("Sending Page Number: " + Str(page) + " of " + Str(std::int32_t{pages} - 1));
     const auto* data = reinterpret_cast<const std::uint8_t*>(buffer.data());
-    sent = SendPage(RecorderLink::Data(data + page * SoundChip::PageBytes, RecorderLink::DataBytes));
+    sent = SendPage(
+        RecorderLink::Data(data + std::ptrdiff_t{page} * SoundChip::PageBytes, RecorderLink::DataBytes));
   }
   parts_.Display.SetStatus("Idle");
   return sent;
