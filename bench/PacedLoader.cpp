@@ -102,11 +102,13 @@ void PacedLoader::Send(std::vector<std::uint8_t> data) {
     line.push_back(byte);
   }
   line.push_back(Etx);
-  // In pieces of 16, so that this is no test of the system's timers.
+  // In pieces of 16, so that this is no test of the system's timers. The line is busy from the first to the
+  // last byte, however late this thread wakes up between them.
   constexpr std::size_t piece = 16;
+  idleAt_ = std::max(idleAt_, LineClock::now());
   for (std::size_t at = 0; at < line.size(); at += piece) {
     const std::size_t count = std::min(piece, line.size() - at);
-    idleAt_ = std::max(idleAt_, LineClock::now()) + count * timeOfByte_;
+    idleAt_ += count * timeOfByte_;
     std::this_thread::sleep_until(idleAt_);
     if (write(terminal_, line.data() + at, count) != static_cast<ssize_t>(count)) {
       return;

@@ -68,6 +68,25 @@ void frmBootload::SetUpPanels() {
   }
 }
 
+// A tool bar leaves its buttons out of the keyboard's reach, and they were made after the entries below them.
+void frmBootload::GiveToolbarToTheKeyboard() {
+  std::vector<QWidget*> below;
+  for (QWidget* widget = nextInFocusChain(); widget != this; widget = widget->nextInFocusChain()) {
+    if (widget->focusPolicy() != Qt::NoFocus) {
+      below.push_back(widget);
+    }
+  }
+  QWidget* last = ui_->Toolbar1;
+  for (auto* button : ui_->Toolbar1->findChildren<QToolButton*>()) {
+    button->setFocusPolicy(Qt::TabFocus);
+    last = button;
+  }
+  for (QWidget* widget : below) {
+    setTabOrder(last, widget);
+    last = widget;
+  }
+}
+
 void frmBootload::SetUpToolbar() {
   const auto icon = [this](QStyle::StandardPixmap which) { return style()->standardIcon(which); };
   ui_->Open->setIcon(icon(QStyle::SP_DialogOpenButton));
@@ -77,10 +96,7 @@ void frmBootload::SetUpToolbar() {
   ui_->Write->setIcon(icon(QStyle::SP_DialogSaveButton));
   ui_->Erase->setIcon(icon(QStyle::SP_TrashIcon));
   ui_->Run->setIcon(icon(QStyle::SP_MediaPlay));
-  // A tool bar leaves its buttons out of the keyboard's reach.
-  for (auto* button : ui_->Toolbar1->findChildren<QToolButton*>()) {
-    button->setFocusPolicy(Qt::TabFocus);
-  }
+  GiveToolbarToTheKeyboard();
   for (QAction* button : {ui_->Connect, ui_->Run}) {
     // The toolkit toggles a check button however it is pressed; during an operation nothing is to change.
     connect(button, &QAction::triggered, this, [this, button](bool checked) {

@@ -61,6 +61,7 @@ class frmBootload : public QDialog {
  private:
   void SetUpPanels();
   void SetUpToolbar();
+  void GiveToolbarToTheKeyboard();
   void ConnectMenus();
   void LoadSettings();
   DeviceSelector& Selector() const;
