@@ -44,20 +44,22 @@ std::vector<PacedTerminal::Clock::time_point> PacedTerminal::Arrivals() const {
 
 void PacedTerminal::Run(const std::stop_token& stop) {
   constexpr int lookMilliseconds = 50;
-  Clock::time_point idle = Clock::now();
+  idle_ = Clock::now();
   while (!stop.stop_requested()) {
     pollfd line{descriptor_, POLLIN, 0};
+    // A byte that is there already follows the one before without a gap, however late this thread woke up.
+    const bool follows = ::poll(&line, 1, 0) > 0 && Clock::now() < idle_ + byteTime_;
     std::uint8_t byte = 0;
-    if (::poll(&line, 1, lookMilliseconds) <= 0 || ::read(descriptor_, &byte, 1) != 1) {
+    if ((!follows && ::poll(&line, 1, lookMilliseconds) <= 0) || ::read(descriptor_, &byte, 1) != 1) {
       continue;
     }
-    idle = std::max(idle, Clock::now()) + byteTime_;
-    std::this_thread::sleep_until(idle);
+    idle_ = (follows ? idle_ : std::max(idle_, Clock::now())) + byteTime_;
+    std::this_thread::sleep_until(idle_);
     {
       const std::lock_guard lock(mutex_);
-      arrivals_.push_back(idle);
+      arrivals_.push_back(idle_);
     }
-    Answer(device_(byte), idle + delay_);
+    Answer(device_(byte), idle_ + delay_);
   }
 }
 
@@ -68,6 +70,7 @@ void PacedTerminal::Answer(const std::vector<std::uint8_t>& bytes, Clock::time_p
     pollfd line{descriptor_, POLLIN, 0};
     if (::poll(&line, 1, 0) == 0) {
       std::this_thread::sleep_until(answered_);
+      idle_ = std::max(idle_, answered_);  // nothing came until then
     }
     if (::write(descriptor_, &byte, 1) != 1) {
       std::perror("answer");

@@ -39,6 +39,7 @@ class PacedTerminal {
   int hostSide_ = -1;  ///< kept open, so that the line is not hung up between two sessions
   std::string path_;
   Clock::time_point answered_;
+  Clock::time_point idle_;  ///< end of the last byte from the host
   mutable std::mutex mutex_;
   std::vector<Clock::time_point> arrivals_;
   std::jthread thread_;
