@@ -70,8 +70,9 @@ function(tessarine_test_label label)
 endfunction()
 
 # tessarine_test(<name> [LABEL <label>] LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest knows
-# one by one: a process for each costs 8 ms, and a thousand of them are still seconds. Without a label those with the main
-# program of window tests are window tests, and all others logic.
+# one by one: a process for each costs 8 ms, and a thousand of them are still seconds. With sanitizers it costs up to 0.2 s,
+# so there the program is one test. Without a label those with the main program of window tests are window tests, and all
+# others logic.
 function(tessarine_test name)
   cmake_parse_arguments(ARG "" "LABEL" "LIBS;SOURCES" ${ARGN})
   if(NOT ARG_LABEL AND "tessarine_test_windows" IN_LIST ARG_LIBS)
@@ -92,7 +93,12 @@ function(tessarine_test name)
   else()
     tessarine_precompile(${name} tests <gmock/gmock.h> <gtest/gtest.h>)
   endif()
-  include(GoogleTest)
-  gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 300 LABELS ${ARG_LABEL}
-    ENVIRONMENT "QT_QPA_PLATFORM=offscreen;LC_ALL=C.UTF-8")
+  set(environment "QT_QPA_PLATFORM=offscreen;LC_ALL=C.UTF-8")
+  if(TESSARINE_SANITIZE)
+    add_test(NAME ${name} COMMAND ${name} --gtest_brief=1)
+    set_tests_properties(${name} PROPERTIES TIMEOUT 900 LABELS ${ARG_LABEL} ENVIRONMENT "${environment}")
+  else()
+    include(GoogleTest)
+    gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 300 LABELS ${ARG_LABEL} ENVIRONMENT "${environment}")
+  endif()
 endfunction()
