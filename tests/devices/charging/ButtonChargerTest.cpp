@@ -129,25 +129,26 @@ TEST_F(Charging, ChargesAButtonAgainAfterItLeftForAPass) {
   EXPECT_EQ(mag.Memory[33], 1);
 }
 
-TEST_F(Charging, TellsWhenAPassHasMetNoButton) {
-  MemoryButton& mag = TouchedButton({0, 0});
-  Pass();
-  Pass();
-  EXPECT_EQ(display.Left, 0);
-  bus.TakeAway(mag);
-  Pass();
-  EXPECT_EQ(display.Left, 1);
+class ButtonThatLeaves : public Charging {
+ protected:
+  void ExpectTold() {
+    MemoryButton& mag = TouchedButton({0, 0});
+    Pass();
+    Pass();
+    EXPECT_EQ(display.Left, 0);
+    bus.TakeAway(mag);
+    Pass();
+    EXPECT_EQ(display.Left, 1);
+  }
+};
+
+TEST_F(ButtonThatLeaves, IsToldAfterAPassThatMetNone) {
+  ExpectTold();
 }
 
-TEST_F(Charging, TellsItAlsoWithoutTheReadersDevice) {
+TEST_F(ButtonThatLeaves, IsToldAlsoWithoutTheReadersDevice) {
   bus.Devices.clear();
-  MemoryButton& mag = TouchedButton({0, 0});
-  Pass();
-  Pass();
-  EXPECT_EQ(display.Left, 0);
-  bus.TakeAway(mag);
-  Pass();
-  EXPECT_EQ(display.Left, 1);
+  ExpectTold();
 }
 
 TEST_F(Charging, TellsItAfterAPassThatWasSpoiled) {

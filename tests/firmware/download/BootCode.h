@@ -13,6 +13,10 @@
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeSerialPort.h"
 
+/// What the operator is told of a download that was ended.
+inline constexpr const char* AbortText =
+    "The device did not finish loading. You are likely to experience unexpected program execution.";
+
 /// The boot code of a device at the far end of a fake line, as far as a test needs it: it answers each
 /// command with the good answer, unless the test wants another one.
 class BootCode {

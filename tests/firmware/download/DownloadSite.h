@@ -59,8 +59,6 @@ class ShownDownload : public FirmwareDisplay {
 };
 
 inline constexpr const char* LoadModeText = "The device did not enter load mode.";
-inline constexpr const char* AbortText =
-    "The device did not finish loading. You are likely to experience unexpected program execution.";
 inline constexpr const char* TimeOutText =
     "Timed out waiting for the device. You will likely experience unexpected program execution.";
 

@@ -15,9 +15,6 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
-constexpr const char* AbortText =
-    "The device did not finish loading. You are likely to experience unexpected program execution.";
-
 TEST_P(FirmwareWindow, ShowsHowADownloadGoes) {
   Open();
   boot.SwitchOnAt(100ms);

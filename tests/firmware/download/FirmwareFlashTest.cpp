@@ -19,9 +19,6 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
-constexpr const char* AbortText =
-    "The device did not finish loading. You are likely to experience unexpected program execution.";
-
 TEST_P(FirmwareWindow, HasItsCaptionsInBothLanguages) {
   Open();
   EXPECT_EQ(window->windowTitle(), QStringLiteral("Firmware Update"));

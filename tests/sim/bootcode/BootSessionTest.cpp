@@ -96,7 +96,7 @@ TEST(BootSession, AnswersNothingButWhatIsDue) {
 TEST(BootSession, AnswersNothingWhileTheDeviceIsNotInItsBootCode) {
   Qvm2Dialect dialect{std::nullopt};
   Conversation host(dialect);
-  EXPECT_EQ(host.Say("XXX"), "");
+  EXPECT_EQ(host.Say("XPB"), "");
   EXPECT_EQ(host.Faults, std::vector<std::string>{"spoke to a device that is not in its boot code"});
   host.Session().SwitchOn();
   EXPECT_EQ(host.Say("XPBF"), "xdsf");
