@@ -8,9 +8,7 @@ namespace {
 using std::chrono::milliseconds;
 using testing::Contains;
 using testing::ElementsAre;
-using testing::ElementsAreArray;
 using testing::IsEmpty;
-using testing::Not;
 using Bytes = std::vector<std::uint8_t>;
 
 Bytes Joined(std::initializer_list<Bytes> parts) {

@@ -42,7 +42,7 @@ Passes() {
 bad='inline int* Nothing() { return 0; }'
 good='inline int* Nothing() { return nullptr; }'
 mkdir -p "$house/tools" "$house/build/asan"
-cp "$source"/tools/{tidy,files.sh} "$house/tools"
+cp "$source"/tools/{tidy,tidy_groups.awk,files.sh} "$house/tools"
 cp "$source/.clang-tidy" "$house"
 Put bin/cmake '#!/bin/sh'  # nothing is to be made here
 chmod +x "$house/bin/cmake"

@@ -12,7 +12,7 @@
 
 namespace {
 
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 
 constexpr std::size_t MostOfErrorKept = 4096;
 constexpr std::size_t MostOfError = std::size_t{1} << 20U;
@@ -30,21 +30,21 @@ class Reading {
 
   /// Reads until both streams are closed. False if the child has to be killed instead.
   bool ToTheEnd(ChildEnd& end) {
-    Clock::time_point limit = Clock::now() + silence_;
-    Clock::time_point nextWait = Clock::now() + BetweenWaits;
+    SteadyClock::time_point limit = SteadyClock::now() + silence_;
+    SteadyClock::time_point nextWait = SteadyClock::now() + BetweenWaits;
     while (sources_[0].fd >= 0 || sources_[1].fd >= 0) {
-      const Clock::time_point now = Clock::now();
+      const SteadyClock::time_point now = SteadyClock::now();
       if (now >= limit || errorBytes_ > MostOfError) {
         return false;
       }
       if (now >= nextWait) {
         listener_.OnWait();
-        nextWait = Clock::now() + BetweenWaits;
+        nextWait = SteadyClock::now() + BetweenWaits;
       }
       const auto pause = std::chrono::ceil<std::chrono::milliseconds>(std::min(limit, nextWait) - now);
       const int ready = poll(sources_.data(), sources_.size(), std::max(0, static_cast<int>(pause.count())));
       if (ready > 0 && ReadWhatIsThere(end)) {
-        limit = Clock::now() + silence_;
+        limit = SteadyClock::now() + silence_;
       }
     }
     return true;

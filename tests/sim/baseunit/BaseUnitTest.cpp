@@ -12,7 +12,7 @@
 namespace sim {
 namespace {
 
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 
 const Bytes Request{1, 0};
 const Bytes Accept{170};
@@ -152,14 +152,14 @@ TEST(BaseUnit, SendsNoFasterThanItsBaudRate) {
   settings.LinePace = Pace::AsWired;
   BaseUnit unit(settings);
   RawHost host(unit.DevicePath());
-  const Clock::time_point start = Clock::now();
+  const SteadyClock::time_point start = SteadyClock::now();
   host.Write(Request);
   host.Read(1 + Blue2.size());
   host.Write(Accept);
   host.Read(Red0.size());
   // Request, count, two frames and a reply at 19200 bits a second, ten bits each.
   const double bytes = static_cast<double>(2 + 1 + Blue2.size() + Red0.size() + 1);
-  EXPECT_GE(Clock::now() - start, std::chrono::duration<double>(bytes * 10.0 / 19200.0));
+  EXPECT_GE(SteadyClock::now() - start, std::chrono::duration<double>(bytes * 10.0 / 19200.0));
 }
 
 TEST(BaseUnit, PausesBetweenThePiecesOfATornAnswer) {
@@ -167,12 +167,12 @@ TEST(BaseUnit, PausesBetweenThePiecesOfATornAnswer) {
   settings.Answer.Torn = true;
   BaseUnit unit(settings);
   RawHost host(unit.DevicePath());
-  const Clock::time_point start = Clock::now();
+  const SteadyClock::time_point start = SteadyClock::now();
   host.Write(Request);
   EXPECT_EQ(host.Read(1), Bytes{2});
   EXPECT_EQ(host.Read(Blue2.size()), Blue2);
   // At most three bytes between two pauses of 3 ms.
-  EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(Blue2.size() / 3 * 3));
+  EXPECT_GE(SteadyClock::now() - start, std::chrono::milliseconds(Blue2.size() / 3 * 3));
 }
 
 TEST(BaseUnit, EndsTheLineAfterTheRequestsItWasToServe) {

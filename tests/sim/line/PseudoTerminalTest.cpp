@@ -10,7 +10,7 @@
 namespace sim {
 namespace {
 
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 using std::chrono::milliseconds;
 
 Bytes AllByteValues() {
@@ -55,20 +55,20 @@ TEST(PseudoTerminal, SurvivesAClientThatClosesAndComesBack) {
 
 TEST(PseudoTerminal, WaitsForAByteAsLongAsToldAndNoShorter) {
   PseudoTerminal line(19200, Pace::Fast);
-  const Clock::time_point start = Clock::now();
+  const SteadyClock::time_point start = SteadyClock::now();
   EXPECT_EQ(line.ReadByte(milliseconds(30)), std::nullopt);
-  EXPECT_GE(Clock::now() - start, milliseconds(30));
+  EXPECT_GE(SteadyClock::now() - start, milliseconds(30));
 }
 
 TEST(PseudoTerminal, NeverSendsAByteBeforeItsLastBitIsThrough) {
   for (const int baud : {19200, 57600, 115200}) {
     PseudoTerminal line(baud, Pace::AsWired);
     RawHost host(line.SlavePath());
-    const Clock::time_point start = Clock::now();
+    const SteadyClock::time_point start = SteadyClock::now();
     std::thread device([&] { line.Write(AllByteValues()); });
     for (std::size_t i = 1; i <= 256; ++i) {
       EXPECT_EQ(host.ReadByte(), static_cast<std::uint8_t>(i - 1));
-      EXPECT_GE(Clock::now() - start, WireTime(i, baud)) << "byte " << i << " at " << baud;
+      EXPECT_GE(SteadyClock::now() - start, WireTime(i, baud)) << "byte " << i << " at " << baud;
     }
     device.join();
   }
@@ -78,39 +78,39 @@ TEST(PseudoTerminal, KeepsToANewSpeedFromItsChangeOn) {
   PseudoTerminal line(115200, Pace::AsWired);
   RawHost host(line.SlavePath());
   line.SetBaud(1200);
-  const Clock::time_point start = Clock::now();
+  const SteadyClock::time_point start = SteadyClock::now();
   line.Write(Bytes(6, 0x55));
-  EXPECT_GE(Clock::now() - start, WireTime(6, 1200));
+  EXPECT_GE(SteadyClock::now() - start, WireTime(6, 1200));
   host.Speak({.Baud = 1200});
   host.Write(Bytes(6, 0x55));
   for (std::size_t i = 7; i <= 12; ++i) {
     EXPECT_EQ(line.ReadByte(Limit), 0x55);
-    EXPECT_GE(Clock::now() - start, WireTime(i, 1200)) << "byte " << i;
+    EXPECT_GE(SteadyClock::now() - start, WireTime(i, 1200)) << "byte " << i;
   }
 }
 
 TEST(PseudoTerminal, ReceivesNoFasterThanTheLineCarries) {
   PseudoTerminal line(19200, Pace::AsWired);
   RawHost host(line.SlavePath());
-  const Clock::time_point start = Clock::now();
+  const SteadyClock::time_point start = SteadyClock::now();
   host.Write(Bytes(40, 0x55));
   for (std::size_t i = 1; i <= 40; ++i) {
     EXPECT_EQ(line.ReadByte(Limit), 0x55);
-    EXPECT_GE(Clock::now() - start, WireTime(i, 19200)) << "byte " << i;
+    EXPECT_GE(SteadyClock::now() - start, WireTime(i, 19200)) << "byte " << i;
   }
 }
 
 TEST(PseudoTerminal, HoldsAByteBackUntilItsLastBitIsThroughHoweverOftenAsked) {
   PseudoTerminal line(300, Pace::AsWired);
   RawHost host(line.SlavePath());
-  const Clock::time_point start = Clock::now();
+  const SteadyClock::time_point start = SteadyClock::now();
   host.Write({1});
   std::optional<std::uint8_t> byte;
-  while (!byte && Clock::now() - start < Limit) {
+  while (!byte && SteadyClock::now() - start < Limit) {
     byte = line.ReadByte(std::chrono::microseconds(100));
   }
   EXPECT_EQ(byte, 1);
-  EXPECT_GE(Clock::now() - start, WireTime(1, 300));
+  EXPECT_GE(SteadyClock::now() - start, WireTime(1, 300));
 }
 
 TEST(PseudoTerminal, LetsBytesOfOneWriteFollowWithoutGapsHoweverLateTheyAreAskedFor) {
@@ -158,11 +158,11 @@ TEST(PseudoTerminal, WaitsForAClientThatReadsSlowerThanItSends) {
 TEST(PseudoTerminal, TearsAWriteIntoPiecesWithPauses) {
   PseudoTerminal line(19200, Pace::Fast);
   RawHost host(line.SlavePath());
-  const Clock::time_point start = Clock::now();
+  const SteadyClock::time_point start = SteadyClock::now();
   std::thread device([&] { line.WriteTorn(AllByteValues()); });
   EXPECT_EQ(host.Read(256), AllByteValues());
   // At most three bytes between two pauses of 3 ms.
-  EXPECT_GE(Clock::now() - start, milliseconds(3 * (256 / 3 - 1)));
+  EXPECT_GE(SteadyClock::now() - start, milliseconds(3 * (256 / 3 - 1)));
   device.join();
 }
 

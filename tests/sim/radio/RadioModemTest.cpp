@@ -16,7 +16,7 @@ namespace sim {
 namespace {
 
 using namespace wire;
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 
 RadioModemSettings Field() {
   return {.Guns = TwoGuns(), .LinePace = Pace::Fast};
@@ -152,10 +152,10 @@ TEST(RadioModem, AnswersNoFasterThanWireAndGunAllow) {
   settings.Guns[0].AnswerTime = std::chrono::milliseconds(30);
   RadioModem modem(settings);
   RawHost host(modem.DevicePath());
-  const Clock::time_point start = Clock::now();
+  const SteadyClock::time_point start = SteadyClock::now();
   host.Write(SearchRed2);
   EXPECT_EQ(host.Read(FoundRed2.size()), FoundRed2);
-  EXPECT_GE(Clock::now() - start,
+  EXPECT_GE(SteadyClock::now() - start,
             std::chrono::milliseconds(30) + WireTime(SearchRed2.size() + FoundRed2.size()));
 }
 

@@ -14,7 +14,7 @@
 
 namespace {
 
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 
 constexpr const char* Usage =
     "usage: soak-kills --seconds N [--seed S] [--only WORK] [--lie lost|doubled|damaged|crash]\n"
@@ -73,9 +73,10 @@ class Soak {
   }
 
   bool Run() {
-    const Clock::time_point end = Clock::now() + std::chrono::duration_cast<Clock::duration>(
-                                                     std::chrono::duration<double>(options_.Seconds));
-    while (Clock::now() < end && !jobs_.empty()) {
+    const SteadyClock::time_point end =
+        SteadyClock::now() +
+        std::chrono::duration_cast<SteadyClock::duration>(std::chrono::duration<double>(options_.Seconds));
+    while (SteadyClock::now() < end && !jobs_.empty()) {
       KillOnce(end, *std::min_element(jobs_.begin(), jobs_.end(), [](const Job& one, const Job& other) {
                  return one.Spent / one.Work->Share() < other.Spent / other.Work->Share();
                }));
@@ -84,15 +85,16 @@ class Soak {
   }
 
  private:
-  void KillOnce(Clock::time_point end, Job& job) {
-    const Clock::time_point start = Clock::now();
+  void KillOnce(SteadyClock::time_point end, Job& job) {
+    const SteadyClock::time_point start = SteadyClock::now();
     if (!job.Folder || job.Done >= job.Work->MostSteps()) {
       job.Folder = std::make_unique<TemporaryFolder>();
       job.Done = 0;
       job.Work->Prepare(job.Folder->Path());
     }
-    const auto longest = std::chrono::duration_cast<std::chrono::microseconds>(std::min<Clock::duration>(
-        job.Work->LongestLife(), std::max(end - Clock::now(), Clock::duration(1000))));
+    const auto longest =
+        std::chrono::duration_cast<std::chrono::microseconds>(std::min<SteadyClock::duration>(
+            job.Work->LongestLife(), std::max(end - SteadyClock::now(), SteadyClock::duration(1000))));
     const std::chrono::microseconds time(std::uniform_int_distribution<long>(0, longest.count())(random_));
     const Life life = LiveAndDie(*job.Work, job.Folder->Path(), job.Done, time, options_.Lies);
     job.Kills += life.Killed ? 1 : 0;
@@ -104,7 +106,7 @@ class Soak {
                   time.count(), options_.Seed, life.Reason.c_str());
       job.Folder.reset();
     }
-    job.Spent += Clock::now() - start;
+    job.Spent += SteadyClock::now() - start;
   }
 
   /// Tells how it went; true if all is well.

@@ -18,7 +18,7 @@
 
 namespace {
 
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 
 constexpr int TroubleExit = 3;
 
@@ -84,10 +84,10 @@ void TakeReports(const Pipe& pipe, int& reported) {
 bool AwaitEnd(pid_t child, int& status) {
   constexpr std::chrono::seconds limit(20);
   waitpid(child, &status, 0);
-  const Clock::time_point end = Clock::now() + limit;
+  const SteadyClock::time_point end = SteadyClock::now() + limit;
   pid_t other = 0;
   while ((other = waitpid(-1, nullptr, WNOHANG)) >= 0) {
-    if (Clock::now() > end) {
+    if (SteadyClock::now() > end) {
       return false;
     }
     if (other == 0) {
@@ -138,10 +138,10 @@ Life LiveAndDie(Work& work, const std::filesystem::path& folder, int done, std::
     Live(work, folder, done, lie, pipe);
   }
   pipe.Writing.Close();
-  const Clock::time_point death = Clock::now() + time;
-  while (Clock::now() < death) {
+  const SteadyClock::time_point death = SteadyClock::now() + time;
+  while (SteadyClock::now() < death) {
     TakeReports(pipe, life.Reported);
-    const auto left = std::chrono::duration_cast<std::chrono::microseconds>(death - Clock::now());
+    const auto left = std::chrono::duration_cast<std::chrono::microseconds>(death - SteadyClock::now());
     std::this_thread::sleep_for(
         std::clamp(left, std::chrono::microseconds(0), std::chrono::microseconds(2000)));
   }

@@ -14,7 +14,7 @@
 
 namespace {
 
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 
 constexpr const char* Usage =
     "usage: soak-operator --commands N --folder FOLDER [--seed S] [--seconds N] [--patience SECONDS]\n"
@@ -88,7 +88,7 @@ class RandomOperator : public QObject {
 
   bool IsDone() const {
     return given_ >= options_.Commands ||
-           Clock::now() - start_ > std::chrono::duration<double>(options_.Seconds);
+           SteadyClock::now() - start_ > std::chrono::duration<double>(options_.Seconds);
   }
   int Given() const { return given_; }
 
@@ -155,7 +155,7 @@ class RandomOperator : public QObject {
 
   const char* const bottom_ = static_cast<const char*>(__builtin_frame_address(0));
   const Options options_;
-  const Clock::time_point start_ = Clock::now();
+  const SteadyClock::time_point start_ = SteadyClock::now();
   int given_ = 0;
   std::mt19937 random_;
   std::ofstream trace_;
