@@ -71,8 +71,8 @@ endfunction()
 
 # tessarine_test(<name> [LABEL <label>] LIBS <libs>... SOURCES <sources>...): a GoogleTest program whose tests ctest knows
 # one by one: a process for each costs 8 ms, and a thousand of them are still seconds. With sanitizers it costs up to 0.2 s,
-# so there the program is one test. Without a label those with the main program of window tests are window tests, and all
-# others logic.
+# so there the program is one test, and also without windows, where the same tests run once more. Without a label those with
+# the main program of window tests are window tests, and all others logic.
 function(tessarine_test name)
   cmake_parse_arguments(ARG "" "LABEL" "LIBS;SOURCES" ${ARGN})
   if(NOT ARG_LABEL AND "tessarine_test_windows" IN_LIST ARG_LIBS)
@@ -86,6 +86,10 @@ function(tessarine_test name)
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/src)
   # A test's own code runs only once: building it in half the time is worth more than its speed. Qt requires -fPIC.
   target_compile_options(${name} PRIVATE -O0 -fPIC)
+  if(TESSARINE_SANITIZE)
+    # For the same reason only memory is watched in a test's own code.
+    target_compile_options(${name} PRIVATE -fno-sanitize=undefined,fuzzer-no-link)
+  endif()
   if("tessarine_test_windows" IN_LIST ARG_LIBS)
     # Qt defines these differently in each folder and its headers use them, so precompiled ones could not be shared.
     target_compile_options(${name} PRIVATE -UQT_TESTCASE_BUILDDIR -UQT_TESTCASE_SOURCEDIR)
@@ -94,7 +98,7 @@ function(tessarine_test name)
     tessarine_precompile(${name} tests <gmock/gmock.h> <gtest/gtest.h>)
   endif()
   set(environment "QT_QPA_PLATFORM=offscreen;LC_ALL=C.UTF-8")
-  if(TESSARINE_SANITIZE)
+  if(TESSARINE_SANITIZE OR NOT TESSARINE_UI)
     add_test(NAME ${name} COMMAND ${name} --gtest_brief=1)
     set_tests_properties(${name} PROPERTIES TIMEOUT 900 LABELS ${ARG_LABEL} ENVIRONMENT "${environment}")
   else()
