@@ -32,6 +32,14 @@ Build() {
   cmake --build --preset "$preset" ${1:+--target "$@"}
 }
 
+# RunTests PRESET [OPTION...]: runs the tests, more at a time than there are processors, since many only wait for a line or
+# another program.
+RunTests() {
+  local preset=$1
+  shift
+  ctest --preset "$preset" -j $((2 * $(nproc))) "$@"
+}
+
 HasDisplay() { [ -n "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ]; }
 
 # MakeData BIN FOLDER: creates below FOLDER (for XDG_DATA_HOME) the data that the program's first run would create.
