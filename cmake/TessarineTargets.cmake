@@ -23,10 +23,30 @@ add_library(tessarine_source INTERFACE)
 target_link_libraries(tessarine_source INTERFACE tessarine_options)
 target_include_directories(tessarine_source INTERFACE ${CMAKE_SOURCE_DIR}/src)
 
+# tessarine_unite(<target> <kind>): compiles several of the target's sources as one, which takes half the time, where
+# TESSARINE_UNITE asks for targets of this kind: "tests" or "product".
+function(tessarine_unite target kind)
+  if(NOT TESSARINE_UNITE MATCHES "^(all|${kind})$")
+    return()
+  endif()
+  get_target_property(sources ${target} SOURCES)
+  list(FILTER sources INCLUDE REGEX "\\.cpp$")
+  execute_process(
+    COMMAND awk -v most=8 -f ${CMAKE_SOURCE_DIR}/tools/source_names.awk -f ${CMAKE_SOURCE_DIR}/cmake/unite.awk ${sources}
+    WORKING_DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} COMMAND_ERROR_IS_FATAL ANY OUTPUT_VARIABLE groups)
+  string(REGEX MATCHALL "[^\n]+" groups "${groups}")
+  foreach(line IN LISTS groups)
+    string(REGEX MATCH "^([0-9]+) (.*)$" line "${line}")
+    set_source_files_properties(${CMAKE_MATCH_2} PROPERTIES UNITY_GROUP ${CMAKE_MATCH_1})
+  endforeach()
+  set_target_properties(${target} PROPERTIES UNITY_BUILD ON UNITY_BUILD_MODE GROUP)
+endfunction()
+
 # tessarine_library(<name> <sources>...): one folder's library of the program.
 function(tessarine_library name)
   add_library(${name} STATIC ${ARGN})
   target_link_libraries(${name} PUBLIC tessarine_source)
+  tessarine_unite(${name} product)
 endfunction()
 
 # tessarine_precompile(<target> <kind> <header>...): the first target of a kind precompiles the headers, and the others of
@@ -82,6 +102,7 @@ function(tessarine_test name)
   endif()
   tessarine_test_label(${ARG_LABEL})
   add_executable(${name} ${ARG_SOURCES})
+  tessarine_unite(${name} tests)
   target_link_libraries(${name} PRIVATE ${ARG_LIBS} tessarine_options GTest::gmock GTest::gtest_main)
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/src)
   # A test's own code runs only once: building it in half the time is worth more than its speed. Qt requires -fPIC.
