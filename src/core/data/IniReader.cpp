@@ -155,11 +155,18 @@ void IniReader::WriteIni(const std::string& section, const std::string& key, con
 }
 
 void IniReader::WriteIni(const std::string& section, const Values& values) {
+  const bool written = TryWrite(section, values);
+  if (AfterWrite) {
+    AfterWrite(written);
+  }
+}
+
+bool IniReader::TryWrite(const std::string& section, const Values& values) {
   const bool broken = std::any_of(values.begin(), values.end(), [](const auto& entry) {
     return entry.second.find_first_of("\r\n") != std::string::npos;
   });
   if (broken) {
-    return;
+    return false;
   }
   try {
     std::string bytes = files_.FileExists(path_) ? files_.Read(path_) : std::string();
@@ -167,8 +174,9 @@ void IniReader::WriteIni(const std::string& section, const Values& values) {
       bytes = WithValue(std::move(bytes), section, key, value);
     }
     files_.Replace(path_, bytes);
+    return true;
   } catch (const RuntimeError&) {
     // Callers carry on with the value in memory; the file is unchanged.
-    return;
+    return false;
   }
 }

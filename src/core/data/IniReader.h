@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -17,6 +18,9 @@
 class IniReader {
  public:
   using Values = std::vector<std::pair<std::string, std::string>>;
+
+  /// Called after each attempt to write, with whether the file now holds the values.
+  std::function<void(bool written)> AfterWrite;
 
   /// `files` must outlive the reader. The file at `path` need not exist.
   IniReader(Files& files, std::string path);
@@ -36,7 +40,7 @@ class IniReader {
   Values ReadSection(const std::string& section) const;
 
   /// Changes or adds one value; every other line is left as it is. If the file cannot be read or written, or
-  /// `value` contains a line break, the file is left unchanged and nothing is reported.
+  /// `value` contains a line break, the file is left unchanged and nobody is told but AfterWrite.
   void WriteIni(const std::string& section, const std::string& key, const std::string& value);
 
   void WriteIni(const Setting& setting, const std::string& value) {
@@ -48,5 +52,8 @@ class IniReader {
 
  private:
   Files& files_;
+  /// Returns false if the file is unchanged.
+  bool TryWrite(const std::string& section, const Values& values);
+
   std::string path_;
 };

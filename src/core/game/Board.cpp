@@ -45,10 +45,20 @@ void StoreRank(const BoardRow& row, std::int16_t rank, Game& game) {
 
 }  // namespace
 
+std::optional<int> Board::PlaceOf(int index) const {
+  for (int place = 0; place < RowCount(); ++place) {
+    if (RowAt(place).Index == index) {
+      return place;
+    }
+  }
+  return std::nullopt;
+}
+
 void Board::Clear() {
   rows_.clear();
   rows_.reserve(PlayerCount);
   order_.clear();
+  sortedBy_.reset();
   ++clears_;
   changed_();
 }
@@ -73,6 +83,8 @@ void Board::Sort(BoardColumn column) {
   });
   std::transform(entries.begin(), entries.end(), order_.begin(),
                  [](const Entry& entry) { return entry.Index; });
+  // All cells of the players sort as equal.
+  sortedBy_ = column == BoardColumn::Player ? std::nullopt : std::optional(column);
 }
 
 void SortListNumeric(Board& list, BoardColumn column, bool assignRanks, Game& game) {

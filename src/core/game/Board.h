@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <functional>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -55,6 +56,12 @@ class Board {
   /// The row at a place from the top, counted from 0.
   const BoardRow& RowAt(int place) const { return rows_[order_.at(static_cast<std::size_t>(place))]; }
 
+  /// Where the row of the player with this record stands; none if there is no such row.
+  std::optional<int> PlaceOf(int index) const;
+
+  /// The column whose figures order the rows; none while they stand in the order in which they were added.
+  std::optional<BoardColumn> SortedBy() const { return sortedBy_; }
+
   void Clear();
   /// How many times the list has been cleared.
   int Clears() const { return clears_; }
@@ -68,6 +75,7 @@ class Board {
   const std::function<void()> changed_;
   std::vector<BoardRow> rows_;      ///< in the order in which they were added
   std::vector<std::size_t> order_;  ///< indexes into `rows_`, from the top of the list
+  std::optional<BoardColumn> sortedBy_;
   int clears_ = 0;
 };
 

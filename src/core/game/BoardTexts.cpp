@@ -1,5 +1,6 @@
 #include "core/game/BoardTexts.h"
 
+#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 
 std::string BoardTexts::Header(BoardList list, BoardColumn column) const {
@@ -7,6 +8,11 @@ std::string BoardTexts::Header(BoardList list, BoardColumn column) const {
   constexpr int ofTeams[TeamColumnCount] = {112, 113, 105};
   const int at = static_cast<int>(column);
   return strings_.Text(list == BoardList::Players ? firstOfPlayers + at : ofTeams[at]);
+}
+
+std::string BoardTexts::HeaderTip(BoardList list, BoardColumn column) const {
+  const OwnText first = list == BoardList::Players ? OwnText::RankTip : OwnText::TeamRankTip;
+  return Filled(strings_.Text(static_cast<int>(first) + static_cast<int>(column)), {Header(list, column)});
 }
 
 std::string BoardTexts::Cell(const BoardRow& row, BoardColumn column) const {
@@ -47,4 +53,9 @@ std::string BoardTexts::AccuracyText(const BoardRow& row) const {
       return strings_.Text(126);
   }
   return {};
+}
+
+std::string PlayerText(int index, const Board& players, const Game& game, const BoardTexts& texts) {
+  const std::optional<int> place = players.PlaceOf(index);
+  return place ? texts.Cell(players.RowAt(*place), BoardColumn::Player) : game.DisplayName(index);
 }

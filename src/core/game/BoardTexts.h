@@ -13,6 +13,9 @@ class BoardTexts {
 
   std::string Header(BoardList list, BoardColumn column) const;
 
+  /// What the column shows: "W.I.A.: times healed".
+  std::string HeaderTip(BoardList list, BoardColumn column) const;
+
   std::string Cell(const BoardRow& row, BoardColumn column) const;
 
   /// The second column's cell without the member's name: "Blue  7", or the team "Blue".
@@ -24,3 +27,7 @@ class BoardTexts {
   const Game& game_;
   const StringTable& strings_;
 };
+
+/// The gun with this record as the board names it, with its member: "Blue  7: Mole". The gun alone if it has
+/// no row there.
+std::string PlayerText(int index, const Board& players, const Game& game, const BoardTexts& texts);

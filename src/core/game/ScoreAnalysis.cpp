@@ -1,11 +1,11 @@
 #include "core/game/ScoreAnalysis.h"
 
+#include <array>
 #include <cmath>
 #include <limits>
 #include <utility>
 #include <vector>
 
-#include "core/data/FieldValue.h"
 #include "core/text/NumberForms.h"
 
 namespace {
@@ -208,40 +208,14 @@ void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName
     if (!missions_.ActivateCurrentMissionRecord()) {
       return;
     }
-    missionPoints_ = ReadMissionPoints();
+    missionPoints_ = ReadMissionPoints(missions_.Row());
   }
-  const auto add = [&player](long double points) {
-    if (points != 0) {
-      player.Soldiering = RoundToInt32(player.Soldiering + points);
-    }
+  player.Soldiering = WithObjectivePoints(player.Soldiering, *missionPoints_, game_.ObjectiveTeams, teamName);
+  const auto subtract = [&player](long double penalty, std::int32_t count) {
+    player.Soldiering = RoundToInt32(player.Soldiering - penalty * count);
   };
-  for (int set = 0; set < TeamCount; ++set) {
-    const ObjectiveTeam& objective = game_.ObjectiveTeams(set + 1);
-    if (objective.Name != teamName) {
-      continue;
-    }
-    if (objective.PrimaryAchieved) {
-      add(missionPoints_->Primary[set]);
-    }
-    if (objective.SecondaryAchieved) {
-      add(missionPoints_->Secondary[set]);
-    }
-  }
-  add(-static_cast<long double>(missionPoints_->RespawnPenalty) * player.RespawnCount);
-  add(-static_cast<long double>(missionPoints_->HealPenalty) * player.HealCount);
-}
-
-ScoreAnalysis::MissionPoints ScoreAnalysis::ReadMissionPoints() {
-  const auto number = [this](const std::string& column) { return NumberOf(missions_.Row().Fields(column)); };
-  MissionPoints points{};
-  for (int set = 0; set < TeamCount; ++set) {
-    const char letter = static_cast<char>('A' + set);
-    points.Primary[set] = number(std::string("PrimaryObjectivePoints") + letter);
-    points.Secondary[set] = number(std::string("SecondaryObjectivePoints") + letter);
-  }
-  points.RespawnPenalty = number("RespawnPenalty");
-  points.HealPenalty = number("HealPenalty");
-  return points;
+  subtract(missionPoints_->RespawnPenalty, player.RespawnCount);
+  subtract(missionPoints_->HealPenalty, player.HealCount);
 }
 
 void ScoreAnalysis::ListTeams() {

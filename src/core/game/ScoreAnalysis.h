@@ -1,6 +1,5 @@
 #pragma once
 
-#include <array>
 #include <optional>
 #include <string>
 
@@ -8,6 +7,7 @@
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
 #include "core/game/MissionList.h"
+#include "core/game/MissionPoints.h"
 #include "core/game/SoldieringFactors.h"
 
 /// Turns the raw counters and the hit matrix into damage, accuracy, soldiering, team totals and ranks, and
@@ -29,14 +29,6 @@ class ScoreAnalysis {
   bool CalculateScores();
 
  private:
-  /// Rewards and penalties of the active mission.
-  struct MissionPoints {
-    std::array<double, TeamCount> Primary;    ///< by objective set
-    std::array<double, TeamCount> Secondary;  ///< by objective set
-    double RespawnPenalty;
-    double HealPenalty;
-  };
-
   void AddUpDamage();
   /// The fast way, for ordinary games. Returns false, with useless figures, if only the other way gives the
   /// right figures or the right error.
@@ -52,7 +44,6 @@ class ScoreAnalysis {
   void CalculateAccuracy(Player& player) const;
   void CalculateSoldiering(Player& player) const;
   void AddMissionPoints(Player& player, const std::string& teamName);
-  MissionPoints ReadMissionPoints();
   void ListTeams();
 
   Game& game_;

@@ -1,5 +1,7 @@
 #include "core/gamefile/CurrentGameFile.h"
 
+#include <filesystem>
+
 #include "core/gamefile/GameFile.h"
 #include "platform/RuntimeError.h"
 
@@ -18,12 +20,21 @@ std::string ReadOrNothing(const Files& files, const std::string& path) {
 
 }  // namespace
 
-bool CurrentGameFile::SaveGame(const Game& game, const std::string& missionName) {
-  fileName_ = dialog_.ShowSave({.Filter = Filter, .Name = fileName_}).value_or(fileName_);
+bool CurrentGameFile::SaveGame(const Game& game, const std::string& missionName,
+                               const std::string& suggestion) {
+  savedOnCancel_.clear();
+  const auto chosen = suggestion.empty()
+                          ? dialog_.ShowSave({.Filter = Filter, .Name = fileName_})
+                          : dialog_.ShowSave({.Filter = Filter, .Name = suggestion, .Folder = saveFolder_});
+  fileName_ = chosen.value_or(fileName_);
   if (fileName_.empty()) {
     return false;
   }
   files_.Replace(fileName_, WriteGameFile(game, missionName));
+  saveFolder_ = std::filesystem::path(fileName_).parent_path().string();
+  if (!chosen) {
+    savedOnCancel_ = fileName_;
+  }
   return true;
 }
 

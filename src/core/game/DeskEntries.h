@@ -1,0 +1,47 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "core/game/GameProgress.h"
+#include "core/text/StringTable.h"
+
+/// What the status line of the main window knows about the game on the board.
+struct DeskFacts {
+  bool Present = false;
+  int Players = 0;
+  std::string Time;  ///< of the game, as the operator reads it; may be empty
+  std::string Mission;
+  int CountedTwice = 0;  ///< guns
+  bool Unsaved = false;
+  CommitCount Commits;
+  bool LowestFirst = false;
+  std::optional<MissionChange> Change;
+  std::vector<std::string> SharedMembers;  ///< names of members who have several guns
+  std::string FileOfCancel;                ///< written although the dialog was cancelled; empty if none was
+  std::string UnsavedSettings;             ///< file of the settings that could not be written
+};
+
+/// What an entry of the status line is about.
+enum class DeskTopic {
+  Game,
+  CountedTwice,
+  Unsaved,
+  Committed,
+  LowestFirst,
+  MissionChanged,
+  SharedMembers,
+  FileOfCancel,
+  Settings
+};
+
+struct DeskEntry {
+  DeskTopic Topic;
+  std::string Text;
+  bool IsLink = false;   ///< something can be done about it, or shown
+  std::string Tip = {};  ///< what the link does
+};
+
+/// The entries of the status line, from left to right; there is always one.
+std::vector<DeskEntry> DeskEntries(const DeskFacts& facts, const StringTable& strings);
