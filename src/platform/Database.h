@@ -34,6 +34,9 @@ class Recordset {
   virtual void MoveNext() = 0;
   virtual void MovePrevious() = 0;
   virtual void MoveLast() = 0;
+  /// Moves to the row at `position`, counted from 0, without reading those before it. Throws RuntimeError
+  /// 3021 if there is no such row.
+  virtual void MoveTo(int position) = 0;
   virtual bool Eof() const = 0;
   virtual bool Bof() const = 0;
 

@@ -7,6 +7,14 @@
 
 enum class WordState { Ended, Starting, Ready };
 
+/// Sizes of the rows of a table, as multiples of what the template gives them.
+struct RowSizes {
+  int Used = 0;           ///< the first rows, which are in use
+  double Letters = 1;     ///< of the used rows' first column, which is widened for them
+  double UsedHeight = 1;  ///< of a used row
+  double RestHeight = 1;  ///< of each of the other rows
+};
+
 /// A document open in the word processor. It stays open until Close or until the word processor ends. All
 /// operations throw RuntimeError on failure, also if the word processor is gone. Tables are those of the
 /// document's body, in document order; tables, rows and columns count from 1.
@@ -21,6 +29,11 @@ class WordDocument {
   /// on in the next column; in one operation if the table allows it. Other cells are not changed. Throws if
   /// the table is missing (even with nothing to write) or a cell is missing.
   virtual void WriteCells(int table, int firstRow, int rows, const std::vector<std::string>& texts) = 0;
+
+  /// Changes the letters and heights of `rows` rows of a table, starting at `firstRow`, whose texts are all
+  /// in the first column. Does nothing if the table has no lines of a fixed height or no second column whose
+  /// room the first can take: then its template was laid out in another way.
+  virtual void ResizeRows(int table, int firstRow, int rows, const RowSizes& sizes) = 0;
 
   /// Inserts the picture in `file` into a cell: in its own size (96 dots per inch if it tells none), made
   /// smaller if the cell or the page has no room for that. Throws if it is not a picture.

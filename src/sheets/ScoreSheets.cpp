@@ -63,7 +63,7 @@ ScoreSheets::ScoreSheets(const SheetParts& parts, const PrintChoice& choice)
       winner_(WinningTeam(parts.Game)),
       sheetDate_(WithoutWeekday(parts.Time.LongDate(parts.Game.GameDate))) {}
 
-void ScoreSheets::GenerateScoreSheets() {
+SheetFiles ScoreSheets::GenerateScoreSheets() {
   std::optional<StageFailure> failure;
   bool closing = false;
   try {
@@ -76,13 +76,18 @@ void ScoreSheets::GenerateScoreSheets() {
   in_.Progress.Close();
   DeletePages();
   if (closing) {
-    return;
+    return {};
   }
   if (failure) {
     in_.Boxes.Show(failure->Text, failure->Title, BoxIcon::Exclamation, BoxButtons::OkCancel);
-    return;
+  } else {
+    in_.Boxes.Show(ClosingText(), in_.Strings.Text(131), BoxIcon::Information);
   }
-  in_.Boxes.Show(ClosingText(), in_.Strings.Text(131), BoxIcon::Information);
+  return Files();
+}
+
+SheetFiles ScoreSheets::Files() const {
+  return made_ > 0 ? SheetFiles{folder_, pdf_} : SheetFiles{};
 }
 
 void ScoreSheets::DeletePages() {
@@ -231,12 +236,26 @@ void ScoreSheets::FillGame(WordDocument& document, int index) {
   const Player& player = in_.Game.Players(index);
   const std::string rank = choice_.RankHidden ? in_.Strings.Text(129) : Str(std::int32_t{player.Rank});
   Write(document, GameTexts(player, in_.MissionName, sheetDate_, rank));
-  constexpr int firstRow = 2;
-  constexpr int rows = 20;
-  document.WriteCells(4, firstRow, rows, HitsScored(in_.Game, index, in_.Members));
-  ServeEvents();
-  document.WriteCells(5, firstRow, rows, HitsTaken(in_.Game, index, in_.Members));
-  ServeEvents();
+  constexpr HitRows where{.First = 2, .Count = 20};
+  const auto write = [&](int table, const CellTexts& hits) {
+    document.WriteCells(table, where.First, where.Count, hits);
+    EnlargeHits(document, table, static_cast<int>(hits.size()), where);
+    ServeEvents();
+  };
+  write(4, HitsScored(in_.Game, index, in_.Members));
+  write(5, HitsTaken(in_.Game, index, in_.Members));
+}
+
+void ScoreSheets::EnlargeHits(WordDocument& document, int table, int hits, HitRows where) {
+  const std::optional<RowSizes> sizes = SizesForHits(hits, where.Count);
+  if (!sizes) {
+    return;
+  }
+  try {
+    document.ResizeRows(table, where.First, where.Count, *sizes);
+  } catch (const RuntimeError&) {
+    return;  // the sheet is complete in small letters too
+  }
 }
 
 void ScoreSheets::Write(WordDocument& document, const BookmarkTexts& texts) {
@@ -290,8 +309,9 @@ std::string ScoreSheets::FreeName(const std::string& base, const std::string& ex
 }
 
 void ScoreSheets::JoinSheets() {
-  in_.WordApp.JoinPdfs(pages_, FreeName("Score sheets-" + sheetDate_ + "-" + in_.MissionName, ".pdf"),
-                       [this] { ServeEvents(); });
+  const std::string pdf = FreeName("Score sheets-" + sheetDate_ + "-" + in_.MissionName, ".pdf");
+  in_.WordApp.JoinPdfs(pages_, pdf, [this] { ServeEvents(); });
+  pdf_ = pdf;
 }
 
 void ScoreSheets::ServeEvents() {

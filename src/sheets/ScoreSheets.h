@@ -35,6 +35,12 @@ struct SheetParts {
   std::string MissionName;
 };
 
+/// What a run has left on the disk.
+struct SheetFiles {
+  std::string Folder;  ///< of the sheets; empty if none was made
+  std::string Pdf;     ///< all sheets in one file; empty if there is none
+};
+
 /// Makes one document for each chosen player from the template `score_card.doc` and saves it in the folder
 /// `scores`. Output to the printer also prints each document; output to files also leaves all sheets of the
 /// run in one PDF, if that succeeds.
@@ -44,10 +50,19 @@ class ScoreSheets {
 
   /// Runs to the end, until the operator stops it or to the first failure, each of which a box reports, or
   /// until the program closes, without a box. Events are processed throughout. Finished sheets are kept in
-  /// every case.
-  void GenerateScoreSheets();
+  /// every case. Returns what there is of them.
+  SheetFiles GenerateScoreSheets();
+
+  /// True once every chosen sheet has been made.
+  bool AllMade() const { return chosen_ > 0 && made_ == chosen_; }
 
  private:
+  /// Rows of a table that hold hits.
+  struct HitRows {
+    int First;
+    int Count;
+  };
+
   bool IsChosen(int index) const;
   std::vector<int> ChosenPlayers() const;
   void MakeSheets();
@@ -57,10 +72,13 @@ class ScoreSheets {
   void AddPhoto(WordDocument& document, const Member& member);
   void TurnUpright(const std::string& file);
   void FillGame(WordDocument& document, int index);
+  /// Gives few hits large letters, if the template's table allows it.
+  static void EnlargeHits(WordDocument& document, int table, int hits, HitRows where);
   void Save(WordDocument& document);
   /// An unused path in the folder of sheets: `base` and the extension, with a number in between if needed.
   std::string FreeName(const std::string& base, const std::string& extension) const;
   void JoinSheets();
+  SheetFiles Files() const;
   /// Runs one step towards the PDF of all sheets. A failure gives up the PDF, but not the run.
   void TryPdf(const std::function<void()>& step);
   void DeletePages();
@@ -78,6 +96,7 @@ class ScoreSheets {
   std::string sheetName_;           ///< of the current sheet
   int chosen_ = 0;                  ///< sheets to make
   int made_ = 0;                    ///< sheets that are finished
+  std::string pdf_;                 ///< path of the PDF of all sheets once it is made
   bool pdfFailed_ = false;          ///< there will be no PDF of all sheets
   std::vector<std::string> pages_;  ///< each sheet of the run as PDF, in temporary files
 };

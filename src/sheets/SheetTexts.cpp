@@ -1,5 +1,6 @@
 #include "sheets/SheetTexts.h"
 
+#include <algorithm>
 #include <string_view>
 
 #include "core/game/HitLines.h"
@@ -92,6 +93,21 @@ BookmarkTexts GameTexts(const Player& player, const std::string& missionName, co
           {"WIA", Str(player.HealCount)},
           {"KIA", Str(player.DeathCount)},
           {"AmmoAdds", Str(player.AmmoAddCount)}};
+}
+
+std::optional<RowSizes> SizesForHits(int hits, int rows) {
+  constexpr double leastRest = 0.35;     // of an unused row's height
+  constexpr double mostUsed = 1.6;       // of a used row's height
+  constexpr double lettersInRow = 1.15;  // what a row has room for beyond its letters
+  if (hits <= 0 || hits > rows) {
+    return std::nullopt;
+  }
+  const int rest = rows - hits;
+  const double used = std::min(mostUsed, (rows - leastRest * rest) / hits);
+  return RowSizes{.Used = hits,
+                  .Letters = used * lettersInRow,
+                  .UsedHeight = used,
+                  .RestHeight = rest > 0 ? (rows - used * hits) / rest : 1};
 }
 
 CellTexts HitsScored(const Game& game, int index, MemberLookup& members) {

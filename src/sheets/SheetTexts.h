@@ -1,11 +1,13 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "core/game/Game.h"
 #include "core/game/MemberLookup.h"
+#include "platform/WordProcessor.h"
 
 /// Bookmarks and their texts, in the order in which they are written.
 using BookmarkTexts = std::vector<std::pair<const char*, std::string>>;
@@ -30,6 +32,11 @@ BookmarkTexts GuestTexts();
 /// The game's figures. `rank` is the text of the rank.
 BookmarkTexts GameTexts(const Player& player, const std::string& missionName, const std::string& date,
                         const std::string& rank);
+
+/// How the rows of a table of hits change where its first column holds them all, so that few hits stand in
+/// large letters and the table keeps its height. `rows` is the number of rows for hits. None where letters
+/// stay as in the template.
+std::optional<RowSizes> SizesForHits(int hits, int rows);
 
 /// The hits that player `index` scored, on themselves too.
 CellTexts HitsScored(const Game& game, int index, MemberLookup& members);

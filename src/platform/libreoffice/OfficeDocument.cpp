@@ -28,6 +28,7 @@
 #include <unistd.h>
 
 #include "platform/libreoffice/OfficePicture.h"
+#include "platform/libreoffice/OfficeRows.h"
 
 namespace container = com::sun::star::container;
 namespace table = com::sun::star::table;
@@ -211,6 +212,10 @@ void OfficeDocument::WriteCells(int number, int firstRow, int rows, const std::v
       }
     }
   });
+}
+
+void OfficeDocument::ResizeRows(int number, int firstRow, int rows, const RowSizes& sizes) {
+  Uno::Call([&] { ::ResizeRows(Table(number), firstRow, rows, sizes); });
 }
 
 void OfficeDocument::AddPicture(int number, int row, int column, const std::string& file) {

@@ -31,6 +31,7 @@ class OfficeDocument : public WordDocument {
 
   void SetBookmark(const std::string& name, const std::string& text) override;
   void WriteCells(int table, int firstRow, int rows, const std::vector<std::string>& texts) override;
+  void ResizeRows(int table, int firstRow, int rows, const RowSizes& sizes) override;
   void AddPicture(int table, int row, int column, const std::string& file) override;
   void SaveAs(const std::string& path) override;
   void ExportPdf(const std::string& path) override;

@@ -7,6 +7,7 @@ KeySet::KeySet(std::vector<std::int64_t> keys) : keys_(std::move(keys)) {
   if (!std::is_sorted(keys_.begin(), keys_.end())) {
     std::sort(keys_.begin(), keys_.end());
   }
+  keys_.erase(std::unique(keys_.begin(), keys_.end()), keys_.end());
 }
 
 void KeySet::Append(std::int64_t key) {

@@ -12,7 +12,7 @@
 class KeySet {
  public:
   KeySet() = default;
-  /// Takes distinct keys in any order and sorts them.
+  /// Takes keys in any order, also several times, and sorts them.
   explicit KeySet(std::vector<std::int64_t> keys);
 
   void Append(std::int64_t key);

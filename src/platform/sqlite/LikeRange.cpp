@@ -156,3 +156,35 @@ std::string WithLikeRanges(const SqliteTable& table, const std::string& conditio
   }
   return result;
 }
+
+std::vector<std::string> LikeAlternatives(const SqliteTable& table, const std::string& condition) {
+  std::string_view rest = WithoutBlanks(condition);
+  if (rest.starts_with('(') && rest.ends_with(')')) {
+    rest = rest.substr(1, rest.size() - 2);
+  }
+  std::vector<std::string> alternatives;
+  for (;;) {
+    rest = WithoutBlanks(rest);
+    const std::size_t column = rest.starts_with('[') ? rest.find(']') + 1 : 0;  // length
+    const LikeTerm term = column != 0 ? LikeTermAt(rest.substr(column)) : LikeTerm();
+    if (term.Length == 0) {
+      return {};
+    }
+    const std::size_t end = column + term.Length;
+    const std::string_view pattern = rest.substr(end - term.QuotedText, term.QuotedText);
+    const auto range = RangeOf(table, rest.substr(0, column), pattern);
+    if (!range || pattern.find('\0') != std::string_view::npos) {
+      return {};
+    }
+    alternatives.push_back(std::string(rest.substr(0, end)) + *range);
+    rest = WithoutBlanks(rest.substr(end));
+    if (rest.empty()) {
+      return alternatives;
+    }
+    constexpr std::string_view separator = "OR";
+    if (!EqualWords(rest.substr(0, separator.size()), separator)) {
+      return {};
+    }
+    rest.remove_prefix(separator.size());
+  }
+}

@@ -72,6 +72,23 @@ void CheckFile(const std::string& path) {
   }
 }
 
+std::string KeyQuery(const SqliteTable& table, const std::string& condition, SqliteConnection::Order order) {
+  const std::string keys = "SELECT rowid FROM [" + table.Name() + "] WHERE (";
+  const bool ordered = order == SqliteConnection::Order::Table;
+  std::string query;
+  if (!ordered) {
+    for (const std::string& alternative : LikeAlternatives(table, condition)) {
+      query.append(query.empty() ? "" : " UNION ALL ").append(keys).append(alternative).append(")");
+    }
+  }
+  if (!query.empty()) {
+    return query;
+  }
+  // The line break ends a comment in the condition, which would otherwise hide the closing bracket. The plus
+  // keeps SQLite from scanning the whole table for its order where an index would find the rows.
+  return keys + WithLikeRanges(table, condition) + "\n)" + (ordered ? " ORDER BY +rowid" : "");
+}
+
 }  // namespace
 
 SqliteConnection::SqliteConnection(const std::string& path, std::chrono::milliseconds busyTimeout)
@@ -130,11 +147,8 @@ SqliteConnection::~SqliteConnection() {
 }
 
 SqliteStatement SqliteConnection::PrepareSearch(const SqliteTable& table, const std::string& condition,
-                                                int syntaxError) {
-  // The line break ends a comment in the condition, which would otherwise hide the closing bracket. The plus
-  // keeps SQLite from scanning the whole table for its order where an index would find the rows.
-  const std::string sql = "SELECT rowid FROM [" + table.Name() + "] WHERE (" +
-                          WithLikeRanges(table, condition) + "\n) ORDER BY +rowid";
+                                                Order order, int syntaxError) {
+  const std::string sql = KeyQuery(table, condition, order);
   sqlite3_stmt* prepared = nullptr;
   const char* tail = nullptr;
   const int result =

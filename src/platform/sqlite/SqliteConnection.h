@@ -24,9 +24,15 @@ class SqliteConnection {
   sqlite3* Handle() const { return handle_; }
   const std::string& Path() const { return path_; }
 
-  /// A query for the keys of the rows of `table` for which `condition` is true, in table order. Throws
-  /// RuntimeError `syntaxError` if the condition is malformed.
-  SqliteStatement PrepareSearch(const SqliteTable& table, const std::string& condition, int syntaxError);
+  enum class Order {
+    Table,
+    Any  ///< and the same key may come several times
+  };
+
+  /// A query for the keys of the rows of `table` for which `condition` is true. Throws RuntimeError
+  /// `syntaxError` if the condition is malformed.
+  SqliteStatement PrepareSearch(const SqliteTable& table, const std::string& condition, Order order,
+                                int syntaxError);
 
   /// See Database::BeginRead.
   void BeginRead() { ++readers_; }

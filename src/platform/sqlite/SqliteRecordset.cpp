@@ -34,13 +34,15 @@ SqliteRecordset::SqliteRecordset(SqliteConnection& connection, const std::string
   ReadKeys(condition);
 }
 
-// The keys of a whole table are read in whatever order is cheapest (KeySet sorts them): SQLite can then scan
-// an index, which is much smaller than the table, and a cold start is several times faster.
+// The keys are read in whatever order is cheapest, since KeySet sorts them several times faster than SQLite
+// would. The keys of a whole table can then come from an index, which is much smaller than the table: a cold
+// start is several times faster.
 void SqliteRecordset::ReadKeys(const std::string& condition) {
   connection_.PrepareRead();
-  SqliteStatement search = condition.empty()
-                               ? SqliteStatement(connection_, "SELECT rowid FROM [" + table_.Name() + "]")
-                               : connection_.PrepareSearch(table_, condition, Fault::QuerySyntax);
+  SqliteStatement search =
+      condition.empty()
+          ? SqliteStatement(connection_, "SELECT rowid FROM [" + table_.Name() + "]")
+          : connection_.PrepareSearch(table_, condition, SqliteConnection::Order::Any, Fault::QuerySyntax);
   std::vector<std::int64_t> keys;
   while (search.Step()) {
     keys.push_back(search.Integer(0));
@@ -81,6 +83,15 @@ void SqliteRecordset::MoveFirst() {
   cache_.Clear();
 }
 
+void SqliteRecordset::MoveTo(int position) {
+  if (position < 0 || position >= RecordCount()) {
+    throw RuntimeError(Fault::NoCurrentRecord);
+  }
+  pending_.Drop();
+  lookedUp_ = false;
+  GoTo(static_cast<std::size_t>(position));
+}
+
 std::optional<std::size_t> SqliteRecordset::FirstPosition(SqliteStatement& search) {
   connection_.PrepareRead();
   const ResetAtEnd reset(search);
@@ -103,7 +114,8 @@ void SqliteRecordset::FindFirst(const std::string& criterion) {
   // The query is kept: scoring looks up the same mission once for each player.
   if (!find_ || criterion != findCriterion_) {
     connection_.PrepareRead();
-    find_ = connection_.PrepareSearch(table_, criterion, Fault::CriterionSyntax);
+    find_ =
+        connection_.PrepareSearch(table_, criterion, SqliteConnection::Order::Table, Fault::CriterionSyntax);
     findCriterion_ = criterion;
   }
   const std::optional<std::size_t> position = FirstPosition(find_);

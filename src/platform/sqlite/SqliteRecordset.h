@@ -28,6 +28,7 @@ class SqliteRecordset : public Recordset {
   void MoveNext() override { Move(&KeyCursor::MoveNext); }
   void MovePrevious() override { Move(&KeyCursor::MovePrevious); }
   void MoveLast() override { Move(&KeyCursor::MoveLast); }
+  void MoveTo(int position) override;
   bool Eof() const override { return cursor_.Eof(); }
   bool Bof() const override { return cursor_.Bof(); }
   int RecordCount() const override { return static_cast<int>(cursor_.Keys().Size()); }
