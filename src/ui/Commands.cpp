@@ -33,6 +33,9 @@ void Commands::Start(const QObject& control, const std::function<void()>& comman
     CommandEvent event(control.objectName());
     QCoreApplication::sendEvent(QCoreApplication::instance(), &event);
     Run(command);
+    if (!Running() && AfterCommand) {
+      AfterCommand();
+    }
   }
 }
 

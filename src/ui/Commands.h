@@ -35,6 +35,9 @@ class Commands : public QObject {
   /// Called each time the last command has unwound, before a delayed close.
   std::function<void()> AllUnwound;
 
+  /// Called after an action's or a button's command, once no command is left on the stack.
+  std::function<void()> AfterCommand;
+
   /// Asked before the command of a pressed button that has the focus; false stops the command. Not asked when
   /// a screen reader presses the button.
   std::function<bool()> EntriesHold;

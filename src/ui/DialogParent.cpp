@@ -6,7 +6,8 @@ QWidget* DialogParent::Window() const {
   if (QWidget* modal = QApplication::activeModalWidget()) {
     return modal;
   }
-  if (QWidget* active = QApplication::activeWindow()) {
+  QWidget* active = QApplication::activeWindow();
+  if (active != nullptr && !active->property(StandsBeside).toBool()) {
     return active;
   }
   return !mainWindow_.isNull() && mainWindow_->isVisible() ? mainWindow_.data() : nullptr;

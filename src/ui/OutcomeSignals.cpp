@@ -1,8 +1,7 @@
 #include "ui/OutcomeSignals.h"
 
-#include <QAccessible>
-
 #include "platform/RuntimeError.h"
+#include "ui/Announce.h"
 #include "ui/OutcomeTones.h"
 #include "ui/Text.h"
 #include "ui_OutcomeSignals.h"
@@ -51,8 +50,7 @@ void OutcomeSignals::Tell(bool success, const QString& text) {
   ui_->Sign->setStyleSheet(success ? QStringLiteral("background: #1e7d3c; color: white;")
                                    : QStringLiteral("background: #b3261e; color: white;"));
   if (ui_->Sign->isVisible()) {
-    QAccessibleEvent told(ui_->Sign, QAccessible::Alert);
-    QAccessible::updateAccessibility(&told);
+    Announce(*ui_->Sign);
   }
   if (ui_->SoundSwitch->isChecked() && parts_->Sounds != nullptr) {
     Play(success);

@@ -149,8 +149,12 @@ void Fit(QWidget& window) {
 
 }  // namespace
 
+QSize RoomIn(const QSize& area) {
+  return area - Frame;
+}
+
 QSize RoomOn(const QScreen& screen) {
-  return screen.availableSize() - Frame;
+  return RoomIn(screen.availableSize());
 }
 
 bool WorkArea::eventFilter(QObject* watched, QEvent* event) {
