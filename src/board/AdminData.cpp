@@ -1,11 +1,10 @@
 #include "board/AdminData.h"
 
 #include <QAction>
-#include <QClipboard>
-#include <QGuiApplication>
 #include <QHeaderView>
 #include <QKeyEvent>
 
+#include "board/RowsAsText.h"
 #include "core/text/NumberForms.h"
 #include "ui/Text.h"
 #include "ui_AdminData.h"
@@ -66,22 +65,5 @@ bool AdminData::eventFilter(QObject* watched, QEvent* event) {
 }
 
 void AdminData::Copy() const {
-  const QTableWidget& list = *ui_->PlayerList;
-  QStringList lines;
-  QStringList headers;
-  for (int column = 0; column < list.columnCount(); ++column) {
-    headers.append(list.horizontalHeaderItem(column)->text());
-  }
-  lines.append(headers.join(QLatin1Char('\t')));
-  const bool all = !list.selectionModel()->hasSelection();
-  for (int row = 0; row < list.rowCount(); ++row) {
-    if (all || list.item(row, 0)->isSelected()) {
-      QStringList cells;
-      for (int column = 0; column < list.columnCount(); ++column) {
-        cells.append(list.item(row, column)->text());
-      }
-      lines.append(cells.join(QLatin1Char('\t')));
-    }
-  }
-  QGuiApplication::clipboard()->setText(lines.join(QLatin1Char('\n')) + QLatin1Char('\n'));
+  CopyRows(*ui_->PlayerList);
 }

@@ -3,6 +3,7 @@
 #include <QDialog>
 #include <cstdint>
 #include <memory>
+#include <string>
 
 #include "platform/MessageBoxes.h"
 #include "ui/Commands.h"
@@ -16,7 +17,8 @@ class BonusPoints : public QDialog {
   Q_OBJECT
 
  public:
-  BonusPoints(std::int32_t value, MessageBoxes& boxes, QWidget* parent);
+  /// `player` is named in the window where it is not empty.
+  BonusPoints(std::int32_t value, MessageBoxes& boxes, QWidget* parent, const std::string& player = {});
   ~BonusPoints() override;
 
   /// The value passed in or, after OK, the one entered: the leading number of the text, 0 if there is none.

@@ -63,6 +63,10 @@ QVariant ScoreListModel::data(const QModelIndex& index, int role) const {
       return isName ? QString::fromStdString(texts_.Name(row)) : QVariant();
     case MemberNameRole:
       return isName ? QString::fromStdString(row.MemberName) : QVariant();
+    case KeyRole:
+      return row.Index != 0 ? row.Index : -row.Team;
+    case TeamRole:
+      return row.Team;
     case Qt::TextAlignmentRole:
       return AlignmentOf(column);
     case Qt::DecorationRole:
@@ -79,13 +83,37 @@ QVariant ScoreListModel::headerData(int section, Qt::Orientation orientation, in
     return {};
   }
   const auto column = static_cast<BoardColumn>(section);
-  if (role == Qt::DisplayRole) {
-    return QString::fromStdString(texts_.Header(kind_, column));
+  switch (role) {
+    case Qt::DisplayRole:
+      return QString::fromStdString(texts_.Header(kind_, column));
+    case Qt::ToolTipRole:
+      return QString::fromStdString(texts_.HeaderTip(kind_, column));
+    case Qt::AccessibleDescriptionRole:  // what is painted and pointed at, for screen readers
+      return QString(QString::fromStdString(texts_.HeaderTip(kind_, column)) + SignOf(column));
+    case Qt::TextAlignmentRole:
+      return AlignmentOf(column);
+    case SortRole:
+      return SortOf(column);
+    default:
+      return {};
   }
-  if (role == Qt::TextAlignmentRole) {
-    return AlignmentOf(column);
+}
+
+QVariant ScoreListModel::SortOf(BoardColumn column) const {
+  if (list_.RowCount() == 0 || list_.SortedBy() != column) {
+    return {};
   }
-  return {};
+  return QVariant::fromValue(list_.SortOrder == SortOrder::Ascending ? Qt::AscendingOrder
+                                                                     : Qt::DescendingOrder);
+}
+
+QString ScoreListModel::SignOf(BoardColumn column) const {
+  const QVariant order = SortOf(column);
+  if (!order.isValid()) {
+    return {};
+  }
+  return order.value<Qt::SortOrder>() == Qt::AscendingOrder ? QStringLiteral(" \u25b2")
+                                                            : QStringLiteral(" \u25bc");
 }
 
 QString ScoreListModel::TextOf(const BoardRow& row, BoardColumn column) const {

@@ -11,8 +11,13 @@ class ScoreListModel : public QAbstractTableModel {
   Q_OBJECT
 
  public:
-  /// The text of a cell in two parts.
-  enum Role { NameRole = Qt::UserRole, MemberNameRole };
+  enum Role {
+    NameRole = Qt::UserRole,  ///< the text of a cell in two parts
+    MemberNameRole,
+    KeyRole,   ///< int: the same for a player or team in each order of the rows and each calculation
+    TeamRole,  ///< int: 1 to 3
+    SortRole   ///< of a header: the Qt::SortOrder in which its column orders the rows, nothing if it does not
+  };
 
   /// `session` and `strings` must outlive the model's views.
   ScoreListModel(Session& session, BoardList list, const StringTable& strings, QObject* parent);
@@ -24,6 +29,9 @@ class ScoreListModel : public QAbstractTableModel {
 
  private:
   void ShowRows();
+  QVariant SortOf(BoardColumn column) const;
+  /// The sign that is painted in the header, as text; empty where there is none.
+  QString SignOf(BoardColumn column) const;
   QString TextOf(const BoardRow& row, BoardColumn column) const;
 
   const BoardList kind_;
