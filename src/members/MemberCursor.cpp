@@ -80,6 +80,7 @@ void MemberCursor::WriteBack() {
     rows_->Edit();
     SetChanges(*rows_, shown_, entered);
     Update();
+    ++writtenBack_;
   } catch (const RuntimeError& error) {
     if (error.Number() == Fault::RecordDeleted) {
       shown_ = entered;  // gives up the change, or the cursor could never leave this row

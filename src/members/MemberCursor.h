@@ -56,6 +56,9 @@ class MemberCursor {
   /// Writes one column of the current row immediately.
   void SetField(const std::string& column, const std::string& text);
 
+  /// How many changed rows were written back so far.
+  int WrittenBack() const { return writtenBack_; }
+
   /// True if a row is shown.
   bool HasRow() const { return hasRow_; }
 
@@ -69,5 +72,6 @@ class MemberCursor {
   BoundControls& controls_;
   std::unique_ptr<Recordset> rows_;
   bool hasRow_ = false;
+  int writtenBack_ = 0;
   MemberDetails shown_;  ///< the controls' contents when the row was last shown or written
 };

@@ -21,6 +21,10 @@ std::string SearchQuery(const std::string& text) {
                        "' OR [NickName] LIKE '" + pattern + "')");
 }
 
+std::string HitsQuery(const std::string& text) {
+  return SearchQuery(WithDoubledApostrophes(text));
+}
+
 std::string NameQuery(const std::string& firstName, const std::string& lastName) {
   return AllMembers + (" WHERE ([FirstName] = '" + WithDoubledApostrophes(firstName) +
                        "' AND [LastName] = '" + WithDoubledApostrophes(lastName) + "')");

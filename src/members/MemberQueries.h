@@ -9,6 +9,9 @@ inline constexpr const char* AllMembers = "SELECT * FROM Members";
 /// malformed.
 std::string SearchQuery(const std::string& text);
 
+/// Selects the same members, but an apostrophe in `text` is a letter like any other.
+std::string HitsQuery(const std::string& text);
+
 /// Selects the members with exactly these first and last names.
 std::string NameQuery(const std::string& firstName, const std::string& lastName);
 

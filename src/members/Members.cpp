@@ -12,6 +12,7 @@
 #include "core/data/Photo.h"
 #include "core/game/Game.h"
 #include "core/text/NumberForms.h"
+#include "members/MemberListView.h"
 #include "members/MemberQueries.h"
 #include "platform/ErrorReport.h"
 #include "platform/qt/QtClock.h"
@@ -66,6 +67,7 @@ Members::Members(Parts parts, QWidget* parent)
   BoundControls& controls = *this;
   data1_.emplace(parts_.DbMembers, controls);
   ConnectCommands();
+  SetUpList();
 }
 
 Members::~Members() = default;
@@ -103,7 +105,7 @@ void Members::ReserveRoomForFigures() {
 
 void Members::ConnectCommands() {
   commands_.Connect(*this, {
-                               {ui_->Search, &Members::RunSearch},
+                               {ui_->Search, &Members::SearchByCommand},
                                {ui_->ClearSearch, &Members::RunClearSearch},
                                {ui_->NewMember, &Members::AddMember},
                                {ui_->Delete, &Members::DeleteMember},
@@ -175,12 +177,19 @@ bool Members::eventFilter(QObject* watched, QEvent* event) {
   if (watched == ui_->SearchText && event->type() == QEvent::KeyPress) {
     const int key = static_cast<QKeyEvent*>(event)->key();
     if (key == Qt::Key_Return || key == Qt::Key_Enter) {
-      commands_.Run([this] { RunSearch(); });  // instead of OK, which would choose the member in view
+      commands_.Run([this] { SearchByCommand(); });  // instead of OK, which would choose the member in view
+      return true;
+    }
+    if (key == Qt::Key_Down) {
+      EnterList();
       return true;
     }
   }
   if (watched == ui_->SearchText && event->type() == QEvent::FocusOut && isVisible() &&
       IsLeaving(static_cast<QFocusEvent*>(event)->reason())) {
+    if (listTimer_->isActive()) {
+      ListHits();
+    }
     RunInFocusChange([this] { RunSearch(); });
   }
   return QDialog::eventFilter(watched, event);
@@ -246,6 +255,8 @@ MemberDetails Members::Entered() const {
 
 void Members::RowChanged() {
   ShowPlace();
+  RefreshList();
+  ShowMemberInList();
   ShowMemberExtras();
 }
 
@@ -290,10 +301,12 @@ void Members::RunSearch() {
 void Members::RunClearSearch() {
   data1_->Refresh(AllMembers);
   ui_->SearchText->clear();
+  ListHits();
 }
 
 void Members::AddMember() {
   data1_->AddMember(parts_.Time.Now());
+  ListHits();
   ui_->FirstNameEntry->setFocus();
   ui_->FirstNameEntry->selectAll();
 }
@@ -304,6 +317,7 @@ void Members::DeleteMember() {
                         BoxIcon::Question, BoxButtons::OkCancel);
   if (answer == BoxAnswer::Ok) {
     data1_->Delete();
+    ListHits();
   }
   ShowMemberExtras();
 }
@@ -330,6 +344,7 @@ void Members::ChangeMemberPicture() {
     rows.Edit();
     StorePhoto(*file, rows, "Photograph", "PhotographLength", parts_.Disk, parts_.Boxes);
     rows.Update();
+    ui_->MemberHits->ForgetPhoto(ui_->Dummy->text().toLongLong());
   } catch (const RuntimeError&) {
     if (rows.EditMode() != EditMode::None) {
       rows.CancelUpdate();

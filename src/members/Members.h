@@ -14,6 +14,7 @@
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
 #include "ui/Commands.h"
+#include "ui/PollTimer.h"
 
 namespace Ui {
 class Members;
@@ -72,9 +73,21 @@ class Members : public QDialog, private BoundControls {
   void ReadPhoto();
   void PreviewPhoto(const std::string& file);
 
+  void SetUpList();
+  /// The list of members finds anew what the search box holds.
+  void ListHits();
+  /// Shows in the form the member chosen in the list.
+  void ShowHit(std::int64_t contactId);
+  void ShowMemberInList();
+  /// Shows the list's rows anew if one was written back.
+  void RefreshList();
+  void EnterList();
+
   void Activate();
   bool IsLeaving(Qt::FocusReason reason) const;
   void RunSearch();
+  /// The search, and the list of members with it.
+  void SearchByCommand();
   void RunClearSearch();
   void AddMember();
   void DeleteMember();
@@ -87,4 +100,7 @@ class Members : public QDialog, private BoundControls {
   Commands commands_;
   std::optional<MemberCursor> data1_;
   std::string selectedContact_;
+  int writtenBack_ = 0;     ///< changes of the form that the list shows
+  PollTimer* listTimer_;    ///< runs while the operator's typing pauses
+  PollTimer* detailTimer_;  ///< runs while rows of the list lack their photos and marks
 };

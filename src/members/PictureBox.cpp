@@ -1,46 +1,20 @@
 #include "members/PictureBox.h"
 
-#include <QBuffer>
-#include <QImageReader>
 #include <QPainter>
-#include <algorithm>
 
-#include "members/PictureEnd.h"
+#include "members/PictureReader.h"
+#include "members/Silhouette.h"
 
 namespace {
 
-/// Larger photos are scaled down while being read, which takes a fraction of the time and memory.
 constexpr QSize LargestPicture(1600, 1600);
-
-/// Draws a head and shoulders in place of a missing photo.
-void DrawSilhouette(QPainter& painter, const QRect& place, const QColor& colour) {
-  const double unit = std::min(place.width(), place.height()) / 10.0;
-  const QPointF centre = QRectF(place).center();
-  painter.setRenderHint(QPainter::Antialiasing);
-  painter.setClipRect(QRectF(0, 0, place.width(), centre.y() + 3.2 * unit));
-  painter.setPen(Qt::NoPen);
-  painter.setBrush(colour);
-  painter.drawEllipse(centre - QPointF(0, 1.2 * unit), 1.5 * unit, 1.7 * unit);
-  painter.drawEllipse(centre + QPointF(0, 3.4 * unit), 2.8 * unit, 2.4 * unit);
-}
 
 }  // namespace
 
 PictureBox::PictureBox(QWidget* parent) : QWidget(parent) {}
 
 void PictureBox::Load(const std::string& bytes) {
-  QByteArray content = QByteArray::fromRawData(bytes.data(), static_cast<qsizetype>(bytes.size()));
-  QBuffer buffer(&content);
-  QImageReader reader(&buffer);
-  reader.setDecideFormatFromContent(true);
-  reader.setAutoTransform(true);
-  const QSize size = reader.size();
-  if (size.width() > LargestPicture.width() || size.height() > LargestPicture.height()) {
-    reader.setScaledSize(size.scaled(LargestPicture, Qt::KeepAspectRatio));
-  }
-  // In some formats Qt does not notice itself that the end is missing.
-  const bool isWhole = reader.canRead() && !IsCutShort(bytes, reader.format().toStdString());
-  picture_ = isWhole ? reader.read() : QImage();
+  picture_ = ReadPicture(bytes, LargestPicture);
   update();
 }
 
