@@ -5,10 +5,10 @@
 #include "core/data/FieldValue.h"
 #include "core/text/NumberForms.h"
 #include "core/text/TextEncoding.h"
+#include "missions/MissionNotes.h"
 
 namespace {
 
-constexpr std::size_t MostOfDescription = 1000;
 constexpr std::size_t MostOfObjective = 255;
 
 struct DescriptionColumn {

@@ -3,7 +3,6 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QSignalBlocker>
-#include <QTextDocument>
 #include <memory>
 #include <vector>
 
@@ -11,21 +10,12 @@
 #include "core/data/Rows.h"
 #include "core/text/NumberForms.h"
 #include "missions/MissionNameEntry.h"
+#include "missions/ScenarioNotes.h"
 #include "ui/Captions.h"
 #include "ui/Text.h"
 #include "ui_Scenarios.h"
 
 namespace {
-
-/// The text with CR LF line breaks, as missions have always been stored. Not from toPlainText, which turns
-/// no-break spaces into blanks.
-std::string TextIn(const QPlainTextEdit& box) {
-  QString text = box.document()->toRawText();
-  for (const QChar lineBreak : {QChar(QChar::ParagraphSeparator), QChar(QChar::LineSeparator)}) {
-    text.replace(lineBreak, QStringLiteral("\r\n"));
-  }
-  return text.toStdString();
-}
 
 void Show(QPlainTextEdit& box, const std::string& text) {
   box.setPlainText(QString::fromStdString(text));
@@ -62,6 +52,7 @@ Scenarios::Scenarios(Database& dbScenarios, Recordset& rsScenarios, MessageBoxes
                   {ui_->PrimaryObjectiveDescription2, ui_->SecondaryObjectiveDescription2,
                    ui_->PrimaryPoints2, ui_->SecondaryPoints2}}};
   ShowTexts();
+  ShowNotes();
   LoadMissionList();
   SelectMission(0);
   BringToFront(0);
@@ -105,6 +96,25 @@ void Scenarios::ShowTexts() {
     boxes.PrimaryPoints->setAccessibleDescription(Text(strings_, 192));
     boxes.SecondaryPoints->setAccessibleDescription(Text(strings_, 194));
   }
+}
+
+void Scenarios::ShowNotes() {
+  const auto boxes = [this](QLineEdit* ObjectiveBoxes::*kind) {
+    return std::array{objectives_[0].*kind, objectives_[1].*kind, objectives_[2].*kind};
+  };
+  new ScenarioNotes({.Description = ui_->Description,
+                     .DescriptionCount = ui_->DescriptionCount,
+                     .DescriptionNote = ui_->DescriptionNote,
+                     .RespawnPenalty = ui_->RespawnPenalty,
+                     .RespawnNote = ui_->RespawnNote,
+                     .HealPenalty = ui_->HealPenalty,
+                     .HealNote = ui_->HealNote,
+                     .PrimaryPoints = boxes(&ObjectiveBoxes::PrimaryPoints),
+                     .PrimaryNote = ui_->PrimaryNote,
+                     .SecondaryPoints = boxes(&ObjectiveBoxes::SecondaryPoints),
+                     .SecondaryNote = ui_->SecondaryNote,
+                     .Tabs = ui_->ObjectivesTab},
+                    strings_, this);
 }
 
 void Scenarios::ConnectCommands() {

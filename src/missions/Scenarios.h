@@ -37,6 +37,7 @@ class Scenarios : public QDialog {
   };
 
   void ShowTexts();
+  void ShowNotes();
   void ConnectCommands();
 
   void LoadMissionList();
