@@ -7,19 +7,45 @@ void DownloadedGuns::AnalyseData(ReceiveBuffer& buffer, const Clock& clock) {
     return;
   }
   Player& player = game_.Players(index);
+  bool isFirst = !player.Active;
   if (current_.insert(index).second) {
     if (const auto earlier = unsettled_.extract(index)) {
       TakeBack(earlier.mapped(), player);
+      isFirst = earlier.mapped().First;
     }
+  }
+  if (isFirst) {
+    countedTwice_.erase(index);
+  } else {
+    countedTwice_.insert(index);
   }
   Player before = player;
   ::AnalyseData(buffer, game_, clock);
-  AddDifference(unsettled_[index], before, player);
+  Amounts& amounts =
+      unsettled_.try_emplace(index, Amounts{.Counters = {}, .Hits = {}, .First = isFirst}).first->second;
+  AddDifference(amounts, before, player);
+}
+
+void DownloadedGuns::ComesOtherwise(int index) {
+  if (!OneBased<Player, PlayerCount>::Holds(index)) {
+    return;
+  }
+  if (game_.Players(index).Active) {
+    countedTwice_.insert(index);
+  }
+  if (const auto earlier = unsettled_.find(index); earlier != unsettled_.end()) {
+    earlier->second.First = false;  // without what it gave before, the game holds this
+  }
 }
 
 void DownloadedGuns::Settle() {
   unsettled_.clear();
   current_.clear();
+}
+
+void DownloadedGuns::Forget() {
+  Settle();
+  countedTwice_.clear();
 }
 
 std::array<std::int32_t*, DownloadedGuns::CounterCount> DownloadedGuns::CountersOf(Player& player) {

@@ -21,9 +21,17 @@ class DownloadedGuns {
   /// As ::AnalyseData.
   void AnalyseData(ReceiveBuffer& buffer, const Clock& clock);
 
-  /// The download has ended with every frame: the guns so far stay counted, whatever comes next. Also to be
-  /// called when the game is emptied.
+  /// The download has ended with every frame: the guns so far stay counted, whatever comes next.
   void Settle();
+
+  /// The scores of the gun with this record are about to be added to the game by another road.
+  void ComesOtherwise(int index);
+
+  /// The game was emptied.
+  void Forget();
+
+  /// Records of the guns whose frames were added to what the game held of them already.
+  const std::set<int>& CountedTwice() const { return countedTwice_; }
 
  private:
   static constexpr std::size_t CounterCount = 9;
@@ -32,6 +40,7 @@ class DownloadedGuns {
   struct Amounts {
     std::array<std::int32_t, CounterCount> Counters{};
     std::map<int, std::int32_t> Hits;  ///< by record index of the shooter
+    bool First = false;                ///< the game held nothing of the gun before
   };
 
   static std::array<std::int32_t*, CounterCount> CountersOf(Player& player);
@@ -41,4 +50,5 @@ class DownloadedGuns {
   Game& game_;
   std::map<int, Amounts> unsettled_;  ///< by record index of the gun
   std::set<int> current_;             ///< guns that came in with the current download
+  std::set<int> countedTwice_;
 };

@@ -6,10 +6,13 @@
 #include <array>
 #include <cstddef>
 
+#include "core/game/PlayerId.h"
 #include "devices/radio/GunPictures.h"
+#include "ui/TeamColours.h"
 
 namespace {
 
+constexpr int PlayerColumn = 0;
 constexpr int BatteryColumn = 2;
 constexpr int StatusColumn = 4;
 constexpr int ColumnCount = 5;
@@ -62,12 +65,22 @@ QVariant GunListModel::data(const QModelIndex& index, int role) const {
     case Qt::DisplayRole:
       return QString::fromStdString(RowOf(row.Gun)[static_cast<std::size_t>(index.column())]);
     case Qt::DecorationRole:
-      if (index.column() == BatteryColumn) {
-        return row.Battery;
-      }
-      return index.column() == StatusColumn ? QVariant(row.Status) : QVariant();
+      return SignOf(row, index.column());
     case Qt::BackgroundRole:
       return StatusTint(row.Gun.ScoreStatus, QGuiApplication::palette().base().color());
+    default:
+      return {};
+  }
+}
+
+QVariant GunListModel::SignOf(const Row& row, int column) {
+  switch (column) {
+    case PlayerColumn:
+      return TeamBadge(TeamFromId(static_cast<std::uint8_t>(row.Gun.PlayerID)));
+    case BatteryColumn:
+      return row.Battery;
+    case StatusColumn:
+      return row.Status;
     default:
       return {};
   }

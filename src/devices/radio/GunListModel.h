@@ -34,6 +34,9 @@ class GunListModel : public QAbstractTableModel {
     QPixmap Status;
   };
 
+  /// The picture in a cell, if it has one.
+  static QVariant SignOf(const Row& row, int column);
+
   QString player_;
   std::vector<Row> rows_;
 };

@@ -55,3 +55,8 @@ std::vector<int> ListedGuns(const GunTable& guns, std::int16_t maxPlayerId) {
   }
   return listed;
 }
+
+bool AnsweredUpToEdge(const GunTable& guns, std::int16_t maxPlayerId) {
+  return maxPlayerId < GunCount && std::any_of(guns.begin() + maxPlayerId - 1, guns.end(),
+                                               [](const GunEntry& gun) { return gun.Present; });
+}

@@ -47,3 +47,6 @@ GunRow RowOf(const GunEntry& gun);
 
 /// Indexes of the guns that the list shows: those present from 0 to `maxPlayerId` inclusive.
 std::vector<int> ListedGuns(const GunTable& guns, std::int16_t maxPlayerId);
+
+/// True if guns answered up to the last id of a search that left ids out, or beyond it: there may be more.
+bool AnsweredUpToEdge(const GunTable& guns, std::int16_t maxPlayerId);

@@ -23,8 +23,8 @@ class RemoteManage;
 }
 
 /// The guns in radio range, and their scores. Both buttons stay enabled during a run; a later run ends the
-/// earlier one. If closed during a run, the window goes once the run has unwound; Escape does not close it
-/// then.
+/// earlier one, and Stop the one that is running. If closed during a run, the window goes once the run has
+/// unwound; Escape does not close it then.
 class RemoteManage : public QDialog, private RadioDisplay {
   Q_OBJECT
 
@@ -38,6 +38,8 @@ class RemoteManage : public QDialog, private RadioDisplay {
     const Clock& Time;
     const StringTable& Strings;
     ::Game& Game;
+    /// Hears the record of each gun right before its scores are added to the game.
+    std::function<void(int)> BeforeGun = {};
   };
 
   RemoteManage(const Parts& parts, QWidget* parent);
@@ -51,10 +53,20 @@ class RemoteManage : public QDialog, private RadioDisplay {
  private:
   void SetUpList();
   void ShareListWidth();
+  /// The window's font, `size` times as large.
+  QFont ListFont(double size) const;
+  /// Gives the list letters in which no text is wider than this.
+  void FitLetters(int columnWidth);
   void SearchForGuns();
   void GetScores();
   /// Runs a job on a link of its own. However it ends, the line is closed and the pointer restored.
   void Work(const std::function<void(RadioLink&)>& job);
+  void StopRun();
+  bool IsStopped(int run) const { return run <= stoppedRun_; }
+  /// Shows a remark of the window's own below its status; none if it is empty.
+  void ShowHint(const std::string& text);
+  int GunsPresent() const;
+  int GunsFetched() const;
 
   void SetStatus(const std::string& text) override;
   void SetPlayersFound(int count) override;
@@ -68,5 +80,6 @@ class RemoteManage : public QDialog, private RadioDisplay {
   GunTable guns_;
   std::int16_t maxPlayerId_;  ///< 128 or 224: number of ids that the last search tried
   int latestRun_ = 0;
+  int stoppedRun_ = 0;  ///< the last run that the operator stopped
   Commands commands_;
 };

@@ -5,6 +5,7 @@
 #include <chrono>
 #include <cstddef>
 #include <string>
+#include <utility>
 
 #include "core/line/Checksum.h"
 #include "core/text/Filled.h"
@@ -39,14 +40,15 @@ int BlocksIn(int total) {
 }  // namespace
 
 ScoreFetch::ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, const StringTable& strings,
-                       Game& game, GunTable& guns, RadioDisplay& display)
+                       Game& game, GunTable& guns, RadioDisplay& display, std::function<void(int)> beforeGun)
     : link_(link),
       events_(events),
       clock_(clock),
       strings_(strings),
       game_(game),
       guns_(guns),
-      display_(display) {}
+      display_(display),
+      beforeGun_(std::move(beforeGun)) {}
 
 void ScoreFetch::GetScores() {
   link_.OpenXBeePort();
@@ -95,6 +97,9 @@ void ScoreFetch::Attempt(GunEntry& gun, std::uint8_t playerId) {
   if (FetchBlocks(gun, playerId, total) < total ||
       Crc8(std::span(buffer_).first(static_cast<std::size_t>(total))) != check) {
     return;
+  }
+  if (beforeGun_) {
+    beforeGun_(IndexFromId(buffer_[4]));
   }
   AnalyseData(buffer_, game_, clock_);
   if (Command(gun, playerId, std::array{CloseTransfer}) && answer_.Payload[0] == CloseTransfer) {

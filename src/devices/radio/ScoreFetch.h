@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <span>
 
 #include "core/game/Game.h"
@@ -16,8 +17,9 @@
 /// commands 1 (size), 2 (read a block) and 3 (close the transfer), each sent to one gun and answered by it.
 class ScoreFetch {
  public:
+  /// `beforeGun` hears the record of each gun right before its scores are added.
   ScoreFetch(RadioLink& link, EventPump& events, const Clock& clock, const StringTable& strings, Game& game,
-             GunTable& guns, RadioDisplay& display);
+             GunTable& guns, RadioDisplay& display, std::function<void(int)> beforeGun = {});
 
   /// Throws RuntimeError 6 for a gun that reports 0 bytes, or needs a block that begins beyond byte 255; 9
   /// for an answer that is too long for its buffer. That gun then stays "in progress".
@@ -40,6 +42,7 @@ class ScoreFetch {
   Game& game_;
   GunTable& guns_;
   RadioDisplay& display_;
+  const std::function<void(int)> beforeGun_;
   GunPacket answer_{};
   ReceiveBuffer buffer_{};
 };

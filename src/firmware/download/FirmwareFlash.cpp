@@ -1,6 +1,5 @@
 #include "firmware/download/FirmwareFlash.h"
 
-#include <QAccessible>
 #include <QFontDatabase>
 #include <QGuiApplication>
 
@@ -8,6 +7,7 @@
 #include "core/text/Filled.h"
 #include "firmware/files/FirmwareDescription.h"
 #include "platform/RuntimeError.h"
+#include "ui/Announce.h"
 #include "ui/Text.h"
 #include "ui/TimeLeft.h"
 #include "ui_FirmwareFlash.h"
@@ -196,7 +196,6 @@ void FirmwareFlash::SetSent(std::uint64_t sent, std::uint64_t all) {
 void FirmwareFlash::SetAdvice(const std::string& text) {
   ui_->lblAdvice->setText(QString::fromStdString(text));
   if (!text.empty()) {
-    QAccessibleEvent told(ui_->lblAdvice, QAccessible::Alert);
-    QAccessible::updateAccessibility(&told);
+    Announce(*ui_->lblAdvice);
   }
 }
