@@ -9,6 +9,7 @@
 
 Program::Program() {
   PrepareLook();
+  qApp->installEventFilter(&altLetters_);  // behind the look's own, so before it: captions may grow
   composition_.Log().Started(SystemFacts());
   qApp->installEventFilter(this);
   window_.emplace(composition_.Services());

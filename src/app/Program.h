@@ -5,6 +5,7 @@
 
 #include "app/Composition.h"
 #include "app/frmRx.h"
+#include "ui/AltLetters.h"
 #include "ui/PlainToolTips.h"
 
 /// One run of the program with the real platform. Needs a QApplication.
@@ -27,6 +28,7 @@ class Program : public QObject {
 
  private:
   PlainToolTips toolTips_;
+  AltLetters altLetters_;
   Composition composition_;
   std::optional<frmRx> window_;
 };

@@ -30,13 +30,21 @@ void FitToScreen(QWidget& window, MessageBoxes& boxes) {
   if (fit.Height) {
     window.setGeometry(window.x(), 0, window.width(), qRound(*fit.Height / scale));
   }
+  if (fit.Maximised) {
+    window.setWindowState(window.windowState() | Qt::WindowMaximized);
+  }
+}
+
+void MaximiseOnSmallScreen(QWidget& window) {
+  const QScreen& screen = *window.screen();
+  const QSize pixels = PixelsOf(screen);
   const QSize room(screen.availableSize().width(), RoomOn(screen).height());
   const QSize least = window.size().boundedTo(room);
-  const bool isTooLarge = !fit.Height && window.size() != least;
+  const bool isTooLarge = !FitToScreen(pixels.width(), pixels.height()).Height && window.size() != least;
   if (isTooLarge) {
     window.resize(least);  // where it is no longer maximised
   }
-  if (fit.Maximised || isTooLarge) {
+  if (isTooLarge || StartsMaximised(pixels.width(), pixels.height())) {
     window.setWindowState(window.windowState() | Qt::WindowMaximized);
   }
 }

@@ -37,9 +37,25 @@ constexpr ScreenFit FitToScreen(int screenWidth, int screenHeight) {
   return fit;
 }
 
+/// True for a screen so small that the window always starts as FitToScreen says, wherever it was before.
+constexpr bool AlwaysFits(int screenWidth, int screenHeight) {
+  const ScreenFit fit = FitToScreen(screenWidth, screenHeight);
+  return fit.Warn || fit.Maximised;
+}
+
+/// True for a screen on which the window is maximised as long as the operator has given it no place.
+constexpr bool StartsMaximised(int screenWidth, int screenHeight) {
+  constexpr int mostWidth = 1366;
+  constexpr int mostHeight = 800;
+  return !AlwaysFits(screenWidth, screenHeight) && screenWidth <= mostWidth && screenHeight <= mostHeight;
+}
+
 /// Size of a screen in its own pixels, not divided by the desktop's scale factor.
 QSize PixelsOf(const QScreen& screen);
 
-/// Fits the main window to its screen, and warns in a box if the screen has few pixels. The window is
-/// maximised where it is larger than the work area.
+/// Fits the main window to its screen, and warns in a box if the screen has few pixels.
 void FitToScreen(QWidget& window, MessageBoxes& boxes);
+
+/// Maximises a window that has no place of its own yet, where it is larger than the work area or its screen
+/// not larger than a laptop's.
+void MaximiseOnSmallScreen(QWidget& window);

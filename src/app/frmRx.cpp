@@ -2,17 +2,21 @@
 
 #include <QCloseEvent>
 #include <QHeaderView>
-#include <QLabel>
+#include <QResizeEvent>
 #include <QSignalBlocker>
+#include <QToolButton>
 #include <utility>
 #include <vector>
 
 #include "app/MenuCaptions.h"
 #include "app/ScreenFit.h"
+#include "app/StateKeys.h"
+#include "board/BoardState.h"
 #include "board/PlayerDelegate.h"
 #include "board/ScoreListModel.h"
 #include "core/data/FirstRun.h"
 #include "core/data/UserDatabase.h"
+#include "ui/CalmList.h"
 #include "ui/Choice.h"
 #include "ui_frmRx.h"
 
@@ -24,12 +28,10 @@ frmRx::frmRx(const Services& services)
       gameFile_(services.CommonDialog1, services.Disk, services.Boxes),
       wordProcessor_(services.WordProcessor),
       downloadedGuns_(session_.Game()),
-      status_(new QLabel(this)),
-      commands_(*this, services.Boxes) {
+      commands_(*this, services.Boxes),
+      manual_(services.Strings, QString::fromStdString(services.Places.Program() + "/manual"), *this) {
   ui_->setupUi(this);
-  status_->setObjectName(QStringLiteral("Status"));
-  status_->setTextFormat(Qt::PlainText);
-  ui_->StatusBar->addWidget(status_, 1);
+  setAcceptDrops(true);
 }
 
 frmRx::~frmRx() = default;
@@ -41,6 +43,7 @@ bool frmRx::FormLoad() {
   SetUpLists();
   userDataFolder_ = PrepareUserDataFolder(services_.Places, services_.Disk, services_.Boxes);
   ini_.emplace(services_.Disk, userDataFolder_ + "/tessarine.ini");
+  RestorePlaces();
   commPort_.emplace(services_.MSComm1, *ini_, services_.Devices, services_.Boxes, services_.Strings,
                     [this] { ShowCommPortSettings(); });
   if (!session_.Open({.Engine = services_.Databases,
@@ -54,12 +57,47 @@ bool frmRx::FormLoad() {
   ui_->mnuCheckButton->setEnabled(services_.ButtonSwipe != nullptr);
   ui_->mnuChargeiButton->setEnabled(services_.Wire != nullptr);
   ConnectCommands();
+  SetUpDesk();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
           [this] { commands_.Run([this] { FollowWordProcessor(); }); });
   wordProcessorTimer_.start(followMilliseconds);
   return true;
+}
+
+void frmRx::SetUpDesk() {
+  ui_->GameBar->SetUp(services_.Strings, {ui_->mnuMissionResults, ui_->mnuPrintScores, ui_->mnuCommitGame,
+                                          ui_->mnuSaveScores, ui_->mnuClearScores});
+  QWidget* before = ui_->RemoteManageButton;
+  for (int step = 0; step < GameStepCount; ++step) {
+    QWidget* button = &ui_->GameBar->Button(static_cast<GameStep>(step));
+    setTabOrder(before, button);
+    before = button;
+  }
+  desk_.emplace(Desk::Parts{.Session = session_,
+                            .Guns = downloadedGuns_,
+                            .Strings = services_.Strings,
+                            .Time = services_.Time,
+                            .Run = commands_,
+                            .OtherPrograms = services_.OtherPrograms,
+                            .Line = *ui_->GameLine,
+                            .Bar = *ui_->GameBar,
+                            .Board = *ui_->ScoreDisplay,
+                            .Pull = *ui_->mnuGetKeshData,
+                            .Save = *ui_->mnuSaveScores,
+                            .Commit = *ui_->mnuCommitGame});
+  desk_->Show();
+  ini_->AfterWrite = [this](bool written) {
+    desk_->TellUnsavedSettings(written ? std::string() : userDataFolder_ + "/tessarine.ini");
+  };
+  gameFile_.SetSaveFolder(state_->ReadIni(State::Games, State::SaveFolder, {}));
+  commands_.AfterCommand = [this] {
+    desk_->Show();
+    desk_->FocusBoard();
+  };
+  KeepCalm(*ui_->ActiveMission, [this] { desk_->FocusBoard(); });
+  desk_->FocusBoard();
 }
 
 void frmRx::SetUpLists() {
@@ -76,6 +114,41 @@ void frmRx::SetUpLists() {
   ui_->TeamScores->setModel(new ScoreListModel(session_, BoardList::Teams, strings, this));
   ui_->TeamScores->SetColumnShares(std::vector<double>(TeamColumnCount, 1.0 / TeamColumnCount));
   ui_->TeamScores->ShowWholeRows(TeamCount);
+  ui_->Boards->SetLists(*ui_->ScoreDisplay, *ui_->TeamScores, *ui_->boardLayout);
+}
+
+void frmRx::RestorePlaces() {
+  state_.emplace(services_.Disk, userDataFolder_ + State::File);
+  places_.emplace(*state_);
+  const QSize pixels = PixelsOf(*screen());
+  if (AlwaysFits(pixels.width(), pixels.height()) || !places_->Restore(*this)) {
+    MaximiseOnSmallScreen(*this);
+  }
+  const BoardState board(*state_);
+  ui_->Boards->SetLetters(board.Letters());
+  for (ScoreListView* list : {ui_->ScoreDisplay, ui_->TeamScores}) {
+    list->SetDraggedShares(board.ColumnShares(list->objectName().toStdString()));
+  }
+}
+
+void frmRx::ConnectLetters() {
+  ui_->mnuLargerLetters->setShortcuts(
+      {QKeySequence(Qt::CTRL | Qt::Key_Plus), QKeySequence(Qt::CTRL | Qt::Key_Equal)});
+  connect(ui_->mnuLargerLetters, &QAction::triggered, ui_->Boards, &BoardPane::MakeLettersLarger);
+  connect(ui_->mnuSmallerLetters, &QAction::triggered, ui_->Boards, &BoardPane::MakeLettersSmaller);
+  connect(ui_->mnuUsualLetters, &QAction::triggered, ui_->Boards, &BoardPane::MakeLettersUsual);
+  connect(ui_->Boards, &BoardPane::LettersChosen, this,
+          [this] { BoardState(*state_).SetLetters(ui_->Boards->Letters()); });
+  for (ScoreListView* list : {ui_->ScoreDisplay, ui_->TeamScores}) {
+    const auto keep = [this, list] {
+      BoardState(*state_).SetColumnShares(list->objectName().toStdString(), list->DraggedShares());
+    };
+    connect(list, &ScoreListView::WidthsDragged, this, keep);
+    connect(ui_->mnuUsualColumns, &QAction::triggered, list, [list, keep] {
+      list->SetDraggedShares({});
+      keep();
+    });
+  }
 }
 
 void frmRx::ConnectCommands() {
@@ -90,6 +163,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},
                                {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
                                {ui_->mnuAbout, &frmRx::ShowAbout},
+                               {ui_->mnuManual, &frmRx::ShowManual},
                                {ui_->mnuAdminData, &frmRx::ShowAdminData},
                                {ui_->mnuMissionResults, &frmRx::EnterMissionResults},
                                {ui_->mnuSetupMissions, &frmRx::SetUpMissions},
@@ -114,12 +188,17 @@ void frmRx::ConnectCommands() {
   connect(ui_->mnuExit, &QAction::triggered, this, &QWidget::close);
   connect(ui_->GetScores, &QPushButton::clicked, ui_->mnuGetKeshData, &QAction::trigger);
   connect(ui_->RemoteManageButton, &QPushButton::clicked, ui_->mnuRemoteManage, &QAction::trigger);
-  OnChoice(*ui_->ActiveMission,
-           [this](int index) { commands_.Run([this, index] { session_.SelectMission(index); }); });
+  OnChoice(*ui_->ActiveMission, [this](int index) {
+    commands_.Run([this, index] { session_.SelectMission(index); });
+    desk_->FocusBoard();
+  });
   connect(ui_->ScoreDisplay->horizontalHeader(), &QHeaderView::sectionClicked, this,
           [this](int section) { commands_.Run([this, section] { session_.SortByHeader(section + 1); }); });
   connect(ui_->ScoreDisplay, &QWidget::customContextMenuRequested, this,
           [this](const QPoint& position) { commands_.Run([this, position] { ShowPopup(position); }); });
+  connect(ui_->ScoreDisplay, &ScoreListView::RowChosen, this,
+          [this] { commands_.Run([this] { RunPopupCommand(*ui_->mnuShowDetailed); }); });
+  ConnectLetters();
 }
 
 void frmRx::TellOfMissingBackup() {
@@ -136,17 +215,26 @@ void frmRx::closeEvent(QCloseEvent* event) {
   if (commPort_ && !commPort_->CommDisabled()) {
     commPort_->CloseIfOpen();
   }
+  if (desk_) {
+    desk_->End();
+  }
   session_.Close();
   wordProcessorTimer_.stop();
   services_.WordProcessor.Quit();
   event->accept();
 }
 
+void frmRx::resizeEvent(QResizeEvent* event) {
+  constexpr int leastHeightWithBar = 700;
+  ui_->GameBar->setVisible(event->size().height() >= leastHeightWithBar);
+  QMainWindow::resizeEvent(event);
+}
+
 void frmRx::Show(SessionChange change) {
   switch (change) {
     case SessionChange::Cleared:
-      downloadedGuns_.Settle();
-      ShowStatus({});
+      ui_->ScoreDisplay->ForgetSelection();
+      downloadedGuns_.Forget();
       break;
     case SessionChange::Missions:
       ShowMissions();

@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 
+#include "app/Desk.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
 #include "core/data/IniReader.h"
@@ -16,10 +17,12 @@
 #include "devices/baseunit/BaseUnitDownload.h"
 #include "devices/box/ProgrammedBoxes.h"
 #include "devices/charging/ChargedButtons.h"
+#include "manual/ManualKey.h"
 #include "sheets/PrintOptions.h"
 #include "ui/Commands.h"
+#include "ui/WindowPlaces.h"
 
-class QLabel;
+class QAction;
 
 namespace Ui {
 class frmRx;
@@ -42,10 +45,15 @@ class frmRx : public QMainWindow {
 
  protected:
   void closeEvent(QCloseEvent* event) override;
+  void resizeEvent(QResizeEvent* event) override;
+  void dragEnterEvent(QDragEnterEvent* event) override;
+  void dropEvent(QDropEvent* event) override;
 
  private:
   void SetUpLists();
   void ConnectCommands();
+
+  void SetUpDesk();
 
   void TellOfMissingBackup();
 
@@ -54,13 +62,15 @@ class frmRx : public QMainWindow {
   void ShowMissions();
 
   void LoadGame();
+  /// Reads the file that was chosen.
+  void ReadGame();
+  /// Loads a file that was dropped on the window, unless the operator wants to keep an unsaved game.
+  void LoadDropped(const std::string& path);
+  /// True while a command, a box or another window of the program waits for the operator.
+  bool IsBusy() const;
   void SaveGame();
   void ClearGame();
   void GetScoreData();
-  /// Says on the status line what a download left undone.
-  void Show(const DownloadResult& result);
-  /// Shows a text on the status line; without one there is no such line.
-  void ShowStatus(const QString& text);
   /// Tracks the word processor until it is ready. If it is missing, says so once and continues without
   /// printing.
   void FollowWordProcessor();
@@ -68,6 +78,7 @@ class frmRx : public QMainWindow {
   void ShowCommPortSettings();
   void ShowSoldieringCalc();
   void ShowAbout();
+  void ShowManual();
   void CommitGame();
   void ManageMembers();
   void CheckMembershipButton();
@@ -83,12 +94,23 @@ class frmRx : public QMainWindow {
   void ChargeButtons();
   void RecordSounds();
 
-  /// The context menu of the board, for the last of the selected rows.
+  /// Makes the last of the selected rows the player of the context menu's commands. Returns false if none is
+  /// selected.
+  bool SelectPlayer();
+  /// The context menu of the board, for that player.
   void ShowPopup(const QPoint& position);
+  /// Does for that player what the context menu's command of this item does.
+  void RunPopupCommand(QAction& item);
   void AssignMember();
   void UnassignMember();
   void ShowDetailed();
   void EnterBonusPoints();
+  /// The player of the context menu's commands with the member's name.
+  std::string SelectedPlayerText();
+
+  // What the board and the windows remember of the last run.
+  void RestorePlaces();
+  void ConnectLetters();
 
   const Services services_;
   std::unique_ptr<Ui::frmRx> ui_;
@@ -98,6 +120,8 @@ class frmRx : public QMainWindow {
   WordProcessorStart wordProcessor_;
   std::string userDataFolder_;
   std::optional<IniReader> ini_;
+  std::optional<IniReader> state_;  ///< places and sizes, which are no settings
+  std::optional<WindowPlaces> places_;
   std::optional<CommPort> commPort_;
   DownloadedGuns downloadedGuns_;
   ProgrammedBoxes programmedBoxes_;
@@ -106,6 +130,7 @@ class frmRx : public QMainWindow {
   int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again
   QTimer wordProcessorTimer_;
-  QLabel* status_;  ///< text of the status line
   Commands commands_;
+  std::optional<Desk> desk_;
+  ManualKey manual_;
 };

@@ -2,8 +2,6 @@
 
 #include "app/frmRx.h"
 
-#include <QAccessible>
-#include <QLabel>
 #include <QScopeGuard>
 #include <algorithm>
 #include <string>
@@ -16,7 +14,6 @@
 #include "board/MissionResultEntry.h"
 #include "board/PlayerDetails.h"
 #include "core/data/FieldValue.h"
-#include "core/text/Filled.h"
 #include "core/text/NumberForms.h"
 #include "devices/baseunit/BaseUnitDownload.h"
 #include "devices/box/BoxConfig.h"
@@ -37,22 +34,6 @@
 #include "ui/WaitCursor.h"
 #include "ui_frmRx.h"
 
-void frmRx::LoadGame() {
-  if (!gameFile_.AskForGame()) {
-    return;
-  }
-  const WaitCursor cursor;
-  session_.LoadGame([this](Game& game, const Session::MissionChoice& chooseMission) {
-    return gameFile_.LoadGame(game, chooseMission);
-  });
-}
-
-void frmRx::SaveGame() {
-  session_.SaveGame([this](const Game& game, const std::string& missionName) {
-    return gameFile_.SaveGame(game, missionName);
-  });
-}
-
 void frmRx::ClearGame() {
   const BoxAnswer answer = services_.Boxes.Show(services_.Strings.Text(123), services_.Strings.Text(124),
                                                 BoxIcon::Question, BoxButtons::OkCancel);
@@ -65,37 +46,16 @@ void frmRx::GetScoreData() {
   if (downloading_) {
     return;
   }
-  ShowStatus({});
+  desk_->ForgetDownload();
   {
     downloading_ = true;
     const auto ended = qScopeGuard([this] { downloading_ = false; });
     UploadProgress progress(services_.Strings, this);
-    Show(BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes, services_.Time,
-                          progress, downloadedGuns_)
-             .GetScores());
+    desk_->TellDownload(BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes,
+                                         services_.Time, progress, downloadedGuns_)
+                            .GetScores());
   }
   session_.CalculateScores();
-}
-
-void frmRx::Show(const DownloadResult& result) {
-  if (result.End == DownloadEnd::Complete) {
-    return;
-  }
-  const bool stopped = result.End == DownloadEnd::Stopped;
-  const OwnText text = result.Received > 0
-                           ? (stopped ? OwnText::DownloadStopped : OwnText::DownloadIncomplete)
-                           : (stopped ? OwnText::DownloadStoppedEmpty : OwnText::DownloadFailed);
-  ShowStatus(QString::fromStdString(Filled(
-      services_.Strings.Text(text), {std::to_string(result.Received), std::to_string(result.Expected)})));
-}
-
-void frmRx::ShowStatus(const QString& text) {
-  status_->setText(text);
-  ui_->StatusBar->setVisible(!text.isEmpty());
-  if (!text.isEmpty()) {
-    QAccessibleEvent told(status_, QAccessible::Alert);
-    QAccessible::updateAccessibility(&told);
-  }
 }
 
 void frmRx::FollowWordProcessor() {
@@ -132,7 +92,12 @@ void frmRx::PrintScores() {
                          .Progress = progress,
                          .UserDataFolder = userDataFolder_,
                          .MissionName = session_.Missions().Text()};
-  ScoreSheets(parts, printOptions_->Choice()).GenerateScoreSheets();
+  ScoreSheets sheets(parts, printOptions_->Choice());
+  desk_->TellSheets(sheets.GenerateScoreSheets());
+  const std::int16_t whose = printOptions_->Choice().SheetSelection;
+  if (sheets.AllMade() && (whose == SheetSelection::Active || whose == SheetSelection::All)) {
+    desk_->Progress().Printed();
+  }
 }
 
 void frmRx::ShowCommPortSettings() {
@@ -147,6 +112,10 @@ void frmRx::ShowSoldieringCalc() {
 
 void frmRx::ShowAbout() {
   About(this).exec();
+}
+
+void frmRx::ShowManual() {
+  manual_.Open();
 }
 
 void frmRx::CommitGame() {
@@ -194,7 +163,10 @@ void frmRx::ShowAdminData() {
 }
 
 void frmRx::EnterMissionResults() {
-  MissionResultEntry(session_.Game(), session_.Missions(), services_.Strings, this).exec();
+  if (MissionResultEntry(session_.Game(), session_.Missions(), services_.Strings, this).exec() ==
+      QDialog::Accepted) {
+    desk_->Progress().ResultsEntered();
+  }
   session_.CalculateScoresWhenPresent();
 }
 
@@ -229,7 +201,8 @@ void frmRx::ManageRemotely() {
                 .Boxes = services_.Boxes,
                 .Time = services_.Time,
                 .Strings = services_.Strings,
-                .Game = session_.Game()},
+                .Game = session_.Game(),
+                .BeforeGun = [this](int index) { downloadedGuns_.ComesOtherwise(index); }},
                this)
       .exec();
   session_.CalculateScores();
@@ -304,14 +277,30 @@ void frmRx::RecordSounds() {
       .exec();
 }
 
-void frmRx::ShowPopup(const QPoint& position) {
+bool frmRx::SelectPlayer() {
   const QModelIndexList selected = ui_->ScoreDisplay->selectionModel()->selectedRows();
   if (selected.isEmpty()) {
-    return;
+    return false;
   }
   const int last = std::max_element(selected.begin(), selected.end())->row();
   selectedPlayer_ = session_.List(BoardList::Players).RowAt(last).Index;
+  return true;
+}
+
+void frmRx::ShowPopup(const QPoint& position) {
+  if (!SelectPlayer()) {
+    return;
+  }
   ui_->mnuPopup->exec(ui_->ScoreDisplay->viewport()->mapToGlobal(position));
+  session_.CalculateScores();
+  services_.Events.DoEvents();
+}
+
+void frmRx::RunPopupCommand(QAction& item) {
+  if (!SelectPlayer()) {
+    return;
+  }
+  item.trigger();
   session_.CalculateScores();
   services_.Events.DoEvents();
 }
@@ -327,13 +316,27 @@ void frmRx::UnassignMember() {
   session_.Game().Players(selectedPlayer_).MemberIndex = 0;
 }
 
+std::string frmRx::SelectedPlayerText() {
+  const Game& game = session_.Game();
+  return PlayerText(selectedPlayer_, session_.List(BoardList::Players), game,
+                    BoardTexts(game, services_.Strings));
+}
+
 void frmRx::ShowDetailed() {
-  PlayerDetails(selectedPlayer_, session_.Game(), session_.Members(), this).exec();
+  PlayerDetails window(selectedPlayer_,
+                       {.Game = session_.Game(),
+                        .Players = session_.List(BoardList::Players),
+                        .Members = session_.Members(),
+                        .Strings = services_.Strings},
+                       this);
+  connect(&window, &PlayerDetails::PlayerShown, this,
+          [this](int index) { ui_->ScoreDisplay->SelectKey(index); });
+  window.exec();
 }
 
 void frmRx::EnterBonusPoints() {
   Player& player = session_.Game().Players(selectedPlayer_);
-  BonusPoints window(player.BonusPoints, services_.Boxes, this);
+  BonusPoints window(player.BonusPoints, services_.Boxes, this, SelectedPlayerText());
   window.exec();
   player.BonusPoints = window.Value();
 }

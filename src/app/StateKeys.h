@@ -1,0 +1,11 @@
+#pragma once
+
+/// Places in state.ini, which holds what the program remembers of itself and no setting of the operator's.
+namespace State {
+
+inline constexpr const char* File = "/state.ini";  ///< in the user's data folder
+
+inline constexpr const char* Games = "games";
+inline constexpr const char* SaveFolder = "save_folder";  ///< of the game saved last
+
+}  // namespace State

@@ -1,0 +1,95 @@
+// The main window's commands on game files, and files dropped on it.
+
+#include <QApplication>
+#include <QDropEvent>
+#include <QFileInfo>
+#include <QMimeData>
+#include <QTimer>
+#include <QUrl>
+
+#include "app/StateKeys.h"
+#include "app/frmRx.h"
+#include "core/gamefile/SuggestedName.h"
+#include "core/text/Filled.h"
+#include "ui/WaitCursor.h"
+#include "ui_frmRx.h"
+
+namespace {
+
+/// The path of the only file in `data`; empty if there is none or more than one.
+QString OnlyFile(const QMimeData& data) {
+  const QList<QUrl> urls = data.urls();
+  return urls.size() == 1 && QFileInfo(urls.front().toLocalFile()).isFile() ? urls.front().toLocalFile()
+                                                                            : QString();
+}
+
+}  // namespace
+
+void frmRx::LoadGame() {
+  if (gameFile_.AskForGame()) {
+    ReadGame();
+  }
+}
+
+void frmRx::ReadGame() {
+  const WaitCursor cursor;
+  session_.LoadGame([this](Game& game, const Session::MissionChoice& chooseMission) {
+    return gameFile_.LoadGame(game, chooseMission);
+  });
+}
+
+void frmRx::SaveGame() {
+  desk_->TellFileOfCancel({});
+  const bool suggests = session_.Game().DataPresent && !desk_->Progress().HasFile();
+  const std::string before = gameFile_.SaveFolder();
+  session_.SaveGame([&](const Game& game, const std::string& missionName) {
+    return gameFile_.SaveGame(
+        game, missionName,
+        suggests ? SuggestedGameName(desk_->Progress().Received(), missionName) : std::string());
+  });
+  desk_->TellFileOfCancel(gameFile_.SavedOnCancel());
+  if (gameFile_.SaveFolder() != before) {
+    state_->WriteIni(State::Games, State::SaveFolder, gameFile_.SaveFolder());
+  }
+}
+
+bool frmRx::IsBusy() const {
+  return commands_.Running() || QApplication::activeModalWidget() != nullptr ||
+         QApplication::activePopupWidget() != nullptr;
+}
+
+void frmRx::dragEnterEvent(QDragEnterEvent* event) {
+  if (!IsBusy() && !OnlyFile(*event->mimeData()).isEmpty()) {
+    event->acceptProposedAction();
+  }
+}
+
+void frmRx::dropEvent(QDropEvent* event) {
+  const QString path = OnlyFile(*event->mimeData());
+  if (IsBusy() || path.isEmpty()) {
+    event->ignore();
+    return;
+  }
+  event->acceptProposedAction();
+  // The program that it comes from waits for the end of this event, not for the operator's answer.
+  QTimer::singleShot(0, this, [this, path] {
+    if (isVisible() && !IsBusy()) {  // it may have been closed since
+      commands_.Run([&] { LoadDropped(path.toStdString()); });
+      desk_->Show();
+      desk_->FocusBoard();
+    }
+  });
+}
+
+void frmRx::LoadDropped(const std::string& path) {
+  if (desk_->Progress().Unsaved()) {
+    const std::string question =
+        Filled(services_.Strings.Text(OwnText::DropQuestion), {path.substr(path.find_last_of('/') + 1)});
+    if (services_.Boxes.Show(question, DefaultBoxTitle, BoxIcon::Question, BoxButtons::OkCancel) !=
+        BoxAnswer::Ok) {
+      return;
+    }
+  }
+  gameFile_.Choose(path);
+  ReadGame();
+}
