@@ -3,17 +3,20 @@
 #include <QDir>
 #include <QMainWindow>
 #include <QStringList>
-#include <QTimer>
+#include <QTableView>
+#include <functional>
+
+#include "demo/DemoMembers.h"
+#include "demo/Operator.h"
 
 /// Where the demo's game comes from.
 enum class DemoSource { BaseUnit, Radio };
 
-/// Acts as the operator for one game: presses the real buttons in the real windows, waits for the download,
-/// saves the game through the menu and the file dialog, prints the active players' score sheets to files, and
-/// leaves the board as text and as a picture.
-class DemoRun : public QObject {
-  Q_OBJECT
-
+/// One game of an evening, with the real buttons in the real windows: downloads it, assigns the members who
+/// came without their buttons, enters the mission's results, commits and saves the game, and prints the
+/// active players' score sheets to files. Leaves the board as text, after the download and at the end, and
+/// pictures.
+class DemoRun {
  public:
   DemoRun(QMainWindow& window, DemoSource source, const QDir& folder);
 
@@ -21,22 +24,42 @@ class DemoRun : public QObject {
   QStringList Run();
 
  private:
+  /// After which step, as part of the file names.
+  enum class Step { Download, End };
+
   void PullGame();
-  /// In the open radio window, searches for guns, fetches their scores and closes the window.
-  void PullByRadio();
-  void SaveGame();
+  /// Changes the port's number in the settings.
+  void UsePort(int number);
+  /// In the window of the radio, searches for guns, gets their scores if the game comes from them, and leaves
+  /// a picture.
+  void ManageGuns();
+
+  void AssignMembers();
+  void AssignMember(int row, const DemoMember& member);
+  /// First row of the board without a member's name, -1 if there is none.
+  int RowWithoutName() const;
+  bool IsOnBoard(const DemoMember& member) const;
+  QString PlayerIn(int row) const;
+
+  void PlayMission();
+  void CommitGame();
+  void SaveGame(const QString& name);
   void PrintSheets();
-  void WriteBoard();
+
+  void WriteBoard(Step step);
   void WriteFile(const QString& name, const QString& text);
-  /// Answers whatever dialog is open: the file dialog with `gameFile_`, the print options with output to
-  /// files, a box with its default button. Any box except the one at the end of printing counts as an error.
-  void AnswerDialogs();
+  void ShowBoard();
+  void ShowDetails();
+  void ShowMembers();
+
+  QAction& Item(const char* name) const;
+  /// Chooses an item of the menu, whose command may show a window.
+  std::function<void()> ByMenu(const char* item) const;
 
   QMainWindow& window_;
   DemoSource source_;
   QDir folder_;
-  QString gameFile_;
-  QTimer watch_;
-  QStringList faults_;
-  bool sheetsPrinted_ = false;  ///< the box at the end of printing was shown
+  QTableView& board_;
+  QTableView& teams_;
+  Operator operator_;
 };

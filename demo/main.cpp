@@ -5,8 +5,8 @@
 #include "app/Program.h"
 #include "demo/DemoRun.h"
 
-/// tessarine-demo [--radio] FOLDER: pulls, shows and saves one game without an operator, and leaves the
-/// results in FOLDER.
+/// tessarine-demo [--radio] FOLDER: takes one game from the download to the score sheets without an operator,
+/// and leaves the results in FOLDER.
 int main(int argc, char** argv) {
   QApplication::setAttribute(Qt::AA_DontUseNativeDialogs);
   QApplication application(argc, argv);
