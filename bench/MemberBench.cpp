@@ -7,6 +7,7 @@
 #include <QFile>
 #include <QImageReader>
 #include <QPushButton>
+#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <memory>
@@ -15,6 +16,7 @@
 #include "bench/Goals.h"
 #include "core/data/Photo.h"
 #include "core/game/CommitGame.h"
+#include "members/MemberListView.h"
 #include "members/MemberQueries.h"
 #include "members/Members.h"
 #include "platform/linux/LinuxFiles.h"
@@ -186,6 +188,15 @@ void StorePhotos(const Folder& folder) {
   group.Commit();
 }
 
+/// A window that has just opened still reads the small pictures of its list.
+void LetListSettle() {
+  constexpr std::chrono::milliseconds enough{800};
+  const auto end = std::chrono::steady_clock::now() + enough;
+  while (std::chrono::steady_clock::now() < end) {
+    QApplication::processEvents();
+  }
+}
+
 /// Moves to the next member and back; each is painted.
 void NextMember(benchmark::State& state, const Folder& folder) {
   const StringTable strings(Language::English);
@@ -203,12 +214,29 @@ void NextMember(benchmark::State& state, const Folder& folder) {
                   .Strings = strings},
                  nullptr);
   window.show();
-  QApplication::processEvents();
+  LetListSettle();
   auto* next = window.findChild<QPushButton*>(QStringLiteral("DataNext"));
   auto* previous = window.findChild<QPushButton*>(QStringLiteral("DataPrevious"));
   next->setFocus();
   for (bool forth = true; state.KeepRunning(); forth = !forth) {
     (forth ? next : previous)->click();
+    QApplication::processEvents();
+  }
+}
+
+/// Lists the members found for a text, as after a pause in typing, and paints the list.
+void ListMembers(benchmark::State& state, const Folder& folder, const std::string& text) {
+  const StringTable strings(Language::English);
+  SqliteEngine engine;
+  const auto database = engine.OpenDatabase(folder.Members());
+  MemberListView list(nullptr);
+  list.SetUp(*database, strings);
+  list.resize(320, 900);
+  list.show();
+  QApplication::processEvents();
+  while (state.KeepRunning()) {
+    list.Search(text);
+    list.ShowMember(1);
     QApplication::processEvents();
   }
 }
@@ -246,6 +274,9 @@ int main(int argc, char** argv) {
   add("DurableTransaction", DurableTransaction);
   add("NextMember", NextMember);
   add("DecodeFile", DecodeFile);
+  add("ListMembers/all", ListMembers, "");
+  add("ListMembers/many", ListMembers, "l");
+  add("ListMembers/scan", ListMembers, "é");
   auto times = MedianTimes(argc, argv);
   const auto report = [&times](const char* name, const char* what, const char* limit, double goal) {
     return ReportGoal(name, times[what] / times[limit], goal, TimesText(times[what], times[limit]));
@@ -255,5 +286,11 @@ int main(int argc, char** argv) {
   met &= report("  with 56 hits / engine", "Search/few", "SearchInEngine/few", 3);
   met &= report("commit of 224 members / one durable transaction", "Commit", "DurableTransaction", 5);
   met &= report("next member with a photo of 100 KB / from a file", "NextMember", "DecodeFile", 2);
+  constexpr double listLimit = 100'000;  // microseconds
+  for (const auto& [what, name] : {std::pair{"ListMembers/all", "list of 100,000 members / 100 ms"},
+                                   {"ListMembers/many", "  of those found by one letter / 100 ms"},
+                                   {"ListMembers/scan", "  without an index / 100 ms"}}) {
+    met &= ReportGoal(name, times[what] / listLimit, 1, TimesText(times[what], listLimit));
+  }
   return met ? 0 : 1;
 }

@@ -83,6 +83,9 @@ class TimedDocument : public WordDocument {
   void WriteCells(int table, int firstRow, int rows, const std::vector<std::string>& texts) override {
     times_.Measure("tables", false, [&] { document_->WriteCells(table, firstRow, rows, texts); });
   }
+  void ResizeRows(int table, int firstRow, int rows, const RowSizes& sizes) override {
+    times_.Measure("letters", false, [&] { document_->ResizeRows(table, firstRow, rows, sizes); });
+  }
   void AddPicture(int table, int row, int column, const std::string& file) override {
     times_.Measure("photographs", false, [&] { document_->AddPicture(table, row, column, file); });
   }

@@ -45,57 +45,94 @@ Run RunChild(const std::string& program, const std::string& argument) {
           static_cast<double>(usage.ru_maxrss) / 1024};
 }
 
-/// Whole-process figures of two programs that are run alternately.
+/// Whole-process figures of two programs that are run alternately, each with its argument (empty for none).
 class Pair {
  public:
-  Pair(const std::string& program, const std::string& argument, const std::string& empty) {
+  struct Command {
+    std::string Program;
+    std::string Argument;
+  };
+
+  Pair(const Command& own, const Command& other) {
     constexpr int runs = 15;
-    RunChild(program, argument);
-    RunChild(empty, "");
+    RunChild(own.Program, own.Argument);
+    RunChild(other.Program, other.Argument);
     for (int i = 0; i < runs; ++i) {
-      const Run own = RunChild(program, argument);
-      const Run bare = RunChild(empty, "");
-      times_.push_back(own.Milliseconds);
-      bareTimes_.push_back(bare.Milliseconds);
-      memory_.push_back(own.Megabytes);
-      bareMemory_.push_back(bare.Megabytes);
+      own_.Add(RunChild(own.Program, own.Argument));
+      other_.Add(RunChild(other.Program, other.Argument));
     }
   }
 
-  bool ReportTime(const char* name) const { return Report(name, times_, bareTimes_, "ms"); }
-  bool ReportMemory(const char* name) const { return Report(name, memory_, bareMemory_, "MB"); }
+  bool ReportTime(const char* name, double goal) const {
+    return Report(name, goal, Median(own_.Times), Median(other_.Times), "ms");
+  }
+  bool ReportMemory(const char* name, double goal) const {
+    return Report(name, goal, Median(own_.Memory), Median(other_.Memory), "MB");
+  }
 
  private:
-  static bool Report(const char* name, const std::vector<double>& own, const std::vector<double>& bare,
-                     const char* unit) {
+  struct Figures {
+    void Add(const Run& run) {
+      Times.push_back(run.Milliseconds);
+      Memory.push_back(run.Megabytes);
+    }
+    std::vector<double> Times;
+    std::vector<double> Memory;
+  };
+
+  static bool Report(const char* name, double goal, double own, double other, const char* unit) {
     char detail[64];
-    std::snprintf(detail, sizeof detail, "%.1f %s to %.1f %s", Median(own), unit, Median(bare), unit);
-    return ReportGoal(name, Median(own) / Median(bare), 2, detail);
+    std::snprintf(detail, sizeof detail, "%.1f %s to %.1f %s", own, unit, other, unit);
+    return ReportGoal(name, own / other, goal, detail);
   }
 
-  std::vector<double> times_;
-  std::vector<double> bareTimes_;
-  std::vector<double> memory_;
-  std::vector<double> bareMemory_;
+  Figures own_;
+  Figures other_;
 };
 
-}  // namespace
-
-/// bench-start: XDG_DATA_HOME must name a folder with the program's data.
-int main(int /*argc*/, char** argv) {
-  const char* const data = std::getenv("XDG_DATA_HOME");
-  if (data == nullptr) {
-    std::fprintf(stderr, "XDG_DATA_HOME names no folder\n");
-    return 2;
-  }
-  const std::filesystem::path bin = std::filesystem::canonical(argv[0]).parent_path();
-  const std::string empty = bin / "bench-empty-window";
-  const std::string program = bin / "bench-main-window";
-  const std::string file = std::string(data) + "/full.xml";
+/// A file with the fullest game, made in `folder`.
+std::string FullestGame(const std::string& folder) {
+  std::string file = folder + "/full.xml";
   FullGame full(0);
   full.CalculateScores();
   LinuxFiles().Replace(file, WriteGameFile(full.game, "None"));
-  bool met = Pair(program, "", empty).ReportTime("start to a usable window / empty Qt window");
-  met &= Pair(program, file, empty).ReportMemory("peak memory with the fullest game / empty Qt window");
+  return file;
+}
+
+bool CompareWithEmptyWindow(const std::string& program, const std::string& empty, const std::string& game) {
+  constexpr double goal = 2;
+  const bool fast =
+      Pair({program, {}}, {empty, {}}).ReportTime("start to a usable window / empty Qt window", goal);
+  return Pair({program, game}, {empty, {}})
+             .ReportMemory("peak memory with the fullest game / empty Qt window", goal) &&
+         fast;
+}
+
+bool CompareWithFormer(const std::string& program, const std::string& former, const std::string& game) {
+  constexpr double goal = 1.05;
+  const bool fast =
+      Pair({program, {}}, {former, {}}).ReportTime("start to a usable window / former program", goal);
+  return Pair({program, game}, {former, game})
+             .ReportMemory("peak memory with the fullest game / former program", goal) &&
+         fast;
+}
+
+}  // namespace
+
+/// bench-start [FORMER]: XDG_DATA_HOME must name a folder with the program's data. FORMER is
+/// bench-main-window of another build, with which this one is compared too.
+int main(int argc, char** argv) {
+  const char* const data = std::getenv("XDG_DATA_HOME");
+  if (data == nullptr || argc > 2) {
+    std::fprintf(stderr, "usage: XDG_DATA_HOME=FOLDER bench-start [FORMER]\n");
+    return 2;
+  }
+  const std::filesystem::path bin = std::filesystem::canonical(argv[0]).parent_path();
+  const std::string program = bin / "bench-main-window";
+  const std::string game = FullestGame(data);
+  bool met = CompareWithEmptyWindow(program, bin / "bench-empty-window", game);
+  if (argc == 2) {
+    met &= CompareWithFormer(program, argv[1], game);
+  }
   return met ? 0 : 1;
 }
