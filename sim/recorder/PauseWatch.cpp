@@ -34,7 +34,7 @@ std::optional<std::string> PauseWatch::See(RecorderPause pause, std::chrono::nan
   if (length < Due(pause) * 3 / 4) {
     ++count.Short;
   }
-  if (count.Told || count.Seen < enough || 2 * count.Short <= count.Seen) {
+  if (count.Told || count.Short < enough || 2 * count.Short <= count.Seen) {
     return std::nullopt;
   }
   count.Told = true;

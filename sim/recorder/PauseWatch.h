@@ -20,8 +20,8 @@ enum class RecorderPause {
 };
 
 /// Tells when a host leaves out pauses. On a busy machine the recorder may be late to see a byte and then
-/// finds the pause behind it too short, so one short pause proves nothing: a fault is told once at least
-/// three of a kind were seen and more than half of them are shorter than three quarters of what is due.
+/// finds the pause behind it too short, so a short pause or two prove nothing: a fault is told once at
+/// least three of a kind, and more than half of those seen, are shorter than three quarters of what is due.
 class PauseWatch {
  public:
   /// Returns the fault, worded to follow "the host ", when this pause reveals it; once for each kind.

@@ -109,6 +109,7 @@ TEST_F(ActiveMission, CanBeChosenWithKeysAndMouse) {
   QTest::keyClick(&venue.ActiveMission(), Qt::Key_Down);
   EXPECT_EQ(ToolTip(), "One line");
   QTest::keyClick(&venue.ActiveMission(), Qt::Key_A);
+  QTest::keyClick(venue.ActiveMission().view(), Qt::Key_Return);
   EXPECT_EQ(ToolTip(), "First line");
   QTest::mouseClick(&venue.ActiveMission(), Qt::LeftButton);
   QAbstractItemView& list = *venue.ActiveMission().view();
@@ -156,6 +157,7 @@ TEST_F(ActiveMission, IsClickedOnceWhenAnotherIsChosen) {
   venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1 WHERE ID IN (4, 7)");
   venue.ActiveMission().setFocus();
   QTest::keyClick(&venue.ActiveMission(), Qt::Key_Z);
+  QTest::keyClick(venue.ActiveMission().view(), Qt::Key_Return);
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(MissionGone));
   QTest::mouseClick(&venue.ActiveMission(), Qt::LeftButton);
   QTest::keyClick(venue.ActiveMission().view(), Qt::Key_Down);

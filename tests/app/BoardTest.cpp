@@ -5,8 +5,10 @@
 #include <QLineEdit>
 #include <set>
 
+#include "board/PlayerDetails.h"
 #include "board/ScoreListView.h"
 #include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 namespace {
 
@@ -211,6 +213,7 @@ TEST_F(Board, SelectsWholeRowsAndLetsNobodyWriteIntoThem) {
   QTest::mouseClick(board.viewport(), Qt::LeftButton, {}, board.visualRect(cell).center());
   EXPECT_TRUE(board.selectionModel()->isRowSelected(1));
   EXPECT_EQ(board.selectionModel()->selectedRows().size(), 1);
+  const WhileModal<PlayerDetails> details([](PlayerDetails& window) { window.close(); });
   QTest::mouseDClick(board.viewport(), Qt::LeftButton, {}, board.visualRect(cell).center());
   QTest::keyClick(&board, Qt::Key_F2);
   EXPECT_EQ(board.findChild<QLineEdit*>(), nullptr);

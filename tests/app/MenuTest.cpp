@@ -3,8 +3,11 @@
 #include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
+#include <QRegularExpression>
+#include <algorithm>
 #include <set>
 
+#include "manual/ManualWindow.h"
 #include "tests/support/Venue.h"
 
 namespace {
@@ -49,7 +52,13 @@ const std::vector<Menu> Menus = {
     {{"mnuSettings", 214, "&Settings", true},
      {{"mnuCommPort", 215, "&Communications Port", true},
       {"mnuSoldieringCalc", 216, "&Soldiering Calculation", true}}},
-    {{"mnuHelp", 217, "&Help", true}, {{"mnuAbout", 218, "&About", true}}},
+    {{"mnuShow", static_cast<int>(OwnText::ShowMenu), "Sho&w", true},
+     {{"mnuLargerLetters", static_cast<int>(OwnText::LargerLetters), "&Larger Letters", true},
+      {"mnuSmallerLetters", static_cast<int>(OwnText::SmallerLetters), "&Smaller Letters", true},
+      {"mnuUsualLetters", static_cast<int>(OwnText::UsualLetters), "&Usual Letters", true},
+      {"mnuUsualColumns", static_cast<int>(OwnText::UsualColumns), "Usual &Column Widths", true}}},
+    {{"mnuHelp", 217, "&Help", true},
+     {{"mnuAbout", 218, "&About", true}, {"mnuManual", 524, "&Manual", true}}},
 };
 
 /// The items of a menu or the menus of a bar, without the lines between them.
@@ -68,13 +77,16 @@ std::string NameOf(const QAction& action) {
   return (action.menu() != nullptr ? action.menu()->objectName() : action.objectName()).toStdString();
 }
 
+/// Without the mark of the Alt key, or without the letter that was added for it.
 std::string WithoutMark(QString caption) {
-  return caption.remove(u'&').toStdString();
+  static const QRegularExpression added(QStringLiteral("\\(&.\\)$"));
+  return caption.remove(added).remove(u'&').toStdString();
 }
 
 /// What the item is to show in `language`: a caption without a number keeps its English text.
 std::string CaptionOf(const Item& item, const StringTable& strings) {
-  return item.Text != 0 ? strings.Text(item.Text) : WithoutMark(QString::fromUtf8(item.English));
+  return item.Text != 0 ? WithoutMark(QString::fromStdString(strings.Text(item.Text)))
+                        : WithoutMark(QString::fromUtf8(item.English));
 }
 
 class MenuBar : public testing::TestWithParam<Language> {
@@ -96,8 +108,8 @@ TEST_P(MenuBar, HasEveryItemInItsPlace) {
       heads.push_back(NameOf(*action));
     }
   }
-  EXPECT_THAT(heads,
-              ElementsAre("mnuFile", "mnuMissions", "mnuMembers", "mnuTools", "mnuSettings", "mnuHelp"));
+  EXPECT_THAT(heads, ElementsAre("mnuFile", "mnuMissions", "mnuMembers", "mnuTools", "mnuSettings", "mnuShow",
+                                 "mnuHelp"));
   for (const Menu& menu : Menus) {
     std::vector<std::string> expected;
     for (const Item& item : menu.Items) {
@@ -190,6 +202,25 @@ TEST_F(MenuKeys, KeepTheLettersOfTheDesign) {
   }
 }
 
+TEST_F(MenuKeys, StandBehindTheCaptionsInChinese) {
+  Venue chinese(Language::SimplifiedChinese);
+  chinese.Start();
+  const auto expectLetter = [](const Item& item, const QString& caption) {
+    const QString design = QString::fromUtf8(item.English);
+    const QString letter = design.mid(design.indexOf(u'&') + 1, 1).toUpper();
+    EXPECT_TRUE(item.Text == 0 || caption.endsWith(QStringLiteral("(&") + letter + u')'))
+        << caption.toStdString();
+  };
+  for (const Menu& menu : Menus) {
+    expectLetter(menu.Head, chinese.Find<QMenu>(menu.Head.Name).title());
+    for (const Item& item : menu.Items) {
+      expectLetter(item, chinese.Find<QAction>(item.Name).text());
+    }
+  }
+  QTest::keyClick(chinese.Window.get(), Qt::Key_G, Qt::AltModifier);
+  EXPECT_TRUE(chinese.Find<QMenu>("mnuFile").isVisible());
+}
+
 TEST_F(MenuKeys, OpenAMenuAndChooseInIt) {
   QTest::keyClick(venue.Window.get(), Qt::Key_G, Qt::AltModifier);
   QMenu& games = venue.Find<QMenu>("mnuFile");
@@ -217,6 +248,14 @@ TEST_F(MenuKeys, LoadAndSaveAtOnce) {
   ASSERT_EQ(venue.Dialog.Calls.size(), 2u);
   EXPECT_FALSE(venue.Dialog.Calls[0].Save);
   EXPECT_TRUE(venue.Dialog.Calls[1].Save);
+}
+
+TEST_F(MenuKeys, OpenTheManual) {
+  Type(*venue.Window, Qt::Key_F1);
+  const QWidgetList windows = QApplication::topLevelWidgets();
+  EXPECT_TRUE(std::any_of(windows.begin(), windows.end(), [](const QWidget* window) {
+    return qobject_cast<const ManualWindow*>(window) != nullptr && window->isVisible();
+  }));
 }
 
 TEST_F(MenuKeys, ExitAtOnce) {

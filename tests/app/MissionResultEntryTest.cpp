@@ -6,7 +6,11 @@
 #include <QEnterEvent>
 #include <QLabel>
 
+#include "tests/support/Announcements.h"
 #include "tests/support/Captions.h"
+#include "tests/support/CaredFor.h"
+#include "tests/support/Contrast.h"
+#include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
 
@@ -223,6 +227,118 @@ TEST_F(Results, TakeATeamThatIsNoneOfTheThreeFromAFile) {
       "<PrimaryObjectiveAchieved>1</PrimaryObjectiveAchieved>"
       "<SecondryObjectiveAchieved>0</SecondryObjectiveAchieved></Team></GameHeader></GameData>");
   Open([this] { EXPECT_EQ(Team("TeamA").currentIndex(), -1); });
+}
+
+TEST_F(Results, ShowEachObjectiveWithItsPoints) {
+  Open([this] {
+    const auto text = [this](const char* label) {
+      return ::Find<QLabel>(*window, label).text().toStdString();
+    };
+    EXPECT_EQ(text("PrimaryObjective1"), "Hold the well\n100 points");
+    EXPECT_EQ(text("SecondaryObjective3"), "Run\n3 points");
+    EXPECT_EQ(text("PrimaryObjective2"), "20 points");
+    EXPECT_EQ(text("SecondaryObjective1"), "0 points");
+  });
+}
+
+TEST_F(Results, AddUpThePointsOfEachTeamWhileTheyAreEntered) {
+  Open([this] {
+    const auto sums = [this] {
+      std::vector<std::string> texts;
+      for (const char* label : {"TeamSum1", "TeamSum2", "TeamSum3"}) {
+        texts.push_back(::Find<QLabel>(*window, label).text().toStdString());
+      }
+      return texts;
+    };
+    EXPECT_THAT(sums(), ElementsAre("Red: 0", "Blue: 0", "Yellow: 0"));
+    Box("PrimaryCompleted1").setChecked(true);
+    Box("PrimaryCompleted2").setChecked(true);
+    Box("SecondaryCompleted3").setChecked(true);
+    EXPECT_THAT(sums(), ElementsAre("Red: 100", "Blue: 20", "Yellow: 3"));
+    Team("TeamB").setCurrentIndex(0);
+    EXPECT_THAT(sums(), ElementsAre("Red: 120", "Blue: 0", "Yellow: 3"));
+    Box("PrimaryCompleted1").setChecked(false);
+    EXPECT_THAT(sums(), ElementsAre("Red: 20", "Blue: 0", "Yellow: 3"));
+  });
+  EXPECT_THAT(Scores(), ElementsAre(20, 0, 3));
+}
+
+TEST_F(Results, AddUpPointsAsTheScoreTakesThem) {
+  venue.ChangeDatabase("scenarios.mdb",
+                       "UPDATE Table1 SET PrimaryObjectivePointsA = 0.4, SecondaryObjectivePointsA = 0.4, "
+                       "PrimaryObjectivePointsB = 3000000000");
+  Open([this] {
+    for (const char* box : {"PrimaryCompleted1", "SecondaryCompleted1", "PrimaryCompleted2"}) {
+      Box(box).setChecked(true);
+    }
+    EXPECT_EQ(::Find<QLabel>(*window, "PrimaryObjective1").text(),
+              QStringLiteral("Hold the well\n0.4 points"));
+    EXPECT_EQ(::Find<QLabel>(*window, "TeamSum1").text(), QStringLiteral("Red: 0"));  // each is rounded
+    EXPECT_EQ(::Find<QLabel>(*window, "TeamSum2").text(),
+              QStringLiteral("Blue: -"));  // more than a score holds
+    Box("PrimaryCompleted2").setChecked(false);
+  });
+  EXPECT_THAT(Scores(), ElementsAre(0, 0, 0));
+}
+
+TEST_F(Results, AnnounceTheSumsThatChange) {
+  Open([this] {
+    Show(*window);
+    const Announcements announced;
+    Box("PrimaryCompleted2").setChecked(true);
+    EXPECT_THAT(announced.Heard(), ElementsAre(QStringLiteral("TeamSum2")));
+    Team("TeamB").setCurrentIndex(0);
+    EXPECT_THAT(announced.Heard(), ElementsAre(QStringLiteral("TeamSum2"), QStringLiteral("TeamSum1"),
+                                               QStringLiteral("TeamSum2")));
+  });
+}
+
+TEST_F(Results, ShowObjectivesWithoutPointsIfTheseCannotBeRead) {
+  venue.ChangeDatabase(
+      "scenarios.mdb",
+      "PRAGMA ignore_check_constraints = ON; UPDATE Table1 SET PrimaryObjectivePointsB = 'many'");
+  Open([this] {
+    EXPECT_EQ(::Find<QLabel>(*window, "PrimaryObjective1").text(), QStringLiteral("Hold the well"));
+    EXPECT_EQ(::Find<QLabel>(*window, "PrimaryObjective2").text(), QString());
+    EXPECT_FALSE(::Find<QWidget>(*window, "PointsFrame").isVisible());
+  });
+}
+
+TEST_F(Results, ShowObjectivesWholeInSmallAndLargeLetters) {
+  venue.ChangeDatabase("scenarios.mdb",
+                       "UPDATE Table1 SET PrimaryObjectiveDescriptionB = 'Keep the reactor silent until the "
+                       "final horn and bring the plan of the halls to the gate'");
+  QScreen& screen = ScreenNamed("laptop");
+  venue.Window->setScreen(&screen);
+  venue.Window->move(screen.geometry().topLeft());
+  for (const int points : {9, 14}) {
+    const FontOfSize letters(points);
+    Open([this] {
+      Show(*window);
+      ExpectCaptionsFit(*window);
+      EXPECT_LE(window->minimumSizeHint().width(), 1024);
+    });
+  }
+}
+
+TEST_F(Results, AreReadableOnLightAndDarkDesktops) {
+  const auto expectReadable = [this] {
+    Show(*window);
+    for (const char* label : {"PrimaryObjective1", "SecondaryObjective3", "PointsCaption", "TeamSum1"}) {
+      EXPECT_GE(PaintedContrast(::Find<QLabel>(*window, label)), LeastContrast) << label;
+    }
+  };
+  Open(expectReadable);
+  const DarkDesktop dark;
+  Open(expectReadable);
+}
+
+TEST_F(Results, ShowNoPointsForAMissionThatIsGone) {
+  venue.ChangeDatabase("scenarios.mdb", "DELETE FROM Table1");
+  Open([this] {
+    EXPECT_FALSE(::Find<QWidget>(*window, "PointsFrame").isVisible());
+    EXPECT_EQ(::Find<QLabel>(*window, "PrimaryObjective1").text(), QString());
+  });
 }
 
 }  // namespace

@@ -1,6 +1,8 @@
 #include <gmock/gmock.h>
 
+#include <QLabel>
 #include <QRadioButton>
+#include <QToolButton>
 
 #include "sheets/PrintOptions.h"
 #include "tests/support/Venue.h"
@@ -80,6 +82,48 @@ TEST_F(PrintScores, MakesTheSheetsThatWereChosenAndKeepsTheChoice) {
   });
   venue.Trigger("mnuPrintScores");
   EXPECT_THAT(venue.Word.Documents, SizeIs(2));
+}
+
+TEST_F(PrintScores, LeavesLinksToWhatItMade) {
+  venue.Start();
+  venue.LoadGame(SmallGame());
+  const auto& links = venue.Find<QLabel>("Sheets");
+  EXPECT_FALSE(links.isVisible());
+  const WhileModal<PrintOptions> choose([](PrintOptions& window) {
+    Find<QRadioButton>(window, "PrintFile").setChecked(true);
+    window.accept();
+  });
+  venue.Trigger("mnuPrintScores");
+  EXPECT_TRUE(links.isVisible());
+  venue.Find<QToolButton>("SheetFolderLink").click();
+  venue.Find<QToolButton>("SheetPdfLink").click();
+  EXPECT_THAT(venue.Started.Started,
+              ElementsAre(ElementsAre("xdg-open", venue.DataFile("scores")),
+                          ElementsAre("xdg-open", venue.DataFile("scores/Score sheets-today-None.pdf"))));
+  EXPECT_THAT(venue.Boxes.Boxes, SizeIs(1));
+  venue.Trigger("mnuClearScores");
+  EXPECT_FALSE(links.isVisible());
+}
+
+TEST_F(PrintScores, LinksToNoPdfAfterPrinting) {
+  venue.Start();
+  venue.LoadGame(SmallGame());
+  const WhileModal<PrintOptions> choose([](PrintOptions& window) { window.accept(); });
+  venue.Trigger("mnuPrintScores");
+  EXPECT_TRUE(venue.Find<QToolButton>("SheetFolderLink").isVisible());
+  EXPECT_FALSE(venue.Find<QToolButton>("SheetPdfLink").isVisible());
+}
+
+TEST_F(PrintScores, SaysWithoutABoxThatNothingOpensTheFolder) {
+  venue.Start();
+  venue.LoadGame(SmallGame());
+  const WhileModal<PrintOptions> choose([](PrintOptions& window) { window.accept(); });
+  venue.Trigger("mnuPrintScores");
+  venue.Started.Failure = RuntimeError(Fault::FileNotFound);
+  venue.Find<QToolButton>("SheetFolderLink").click();
+  EXPECT_EQ(venue.Find<QLabel>("Unopened").text().toStdString(),
+            venue.DataFile("scores") + " could not be opened.");
+  EXPECT_THAT(venue.Boxes.Boxes, SizeIs(1));
 }
 
 }  // namespace

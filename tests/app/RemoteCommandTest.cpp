@@ -1,6 +1,7 @@
 #include <gmock/gmock.h>
 
 #include <QTableView>
+#include <QToolButton>
 #include <chrono>
 
 #include "devices/radio/RemoteManage.h"
@@ -63,6 +64,18 @@ TEST_F(RemoteCommand, RecalculatesTheBoardAfterwards) {
   EXPECT_EQ(window.Runs(), 1);
   EXPECT_THAT(venue.Column("ScoreDisplay", 1), ElementsAre("Red  1"));
   EXPECT_EQ(venue.RowCount("TeamScores"), 3);
+}
+
+TEST_F(RemoteCommand, TellsTheStatusLineWhichGunsItCountedTwice) {
+  venue.LoadGame(GameFile(PlayerOf(2) + PlayerOf(40)));
+  const WhileModal<RemoteManage> window([this](RemoteManage& remote) {
+    venue.Port.OnOutput = [this](std::uint8_t byte) { AnswerAsRed1(byte); };
+    ::Press(remote, "SearchGunsButton");
+    ::Press(remote, "GetScoresButton");
+    remote.close();
+  });
+  venue.Press("RemoteManageButton");
+  EXPECT_EQ(venue.Find<QToolButton>("DeskCountedTwiceLink").text(), QStringLiteral("Guns counted twice: 1"));
 }
 
 TEST_F(RemoteCommand, RecalculatesTheBoardAlsoWithoutAGame) {

@@ -49,6 +49,23 @@ TEST(FitToScreen, LimitsTheHeightAloneOnALowScreen) {
   }
 }
 
+TEST(FitToScreen, HoldsAlwaysOnTheRecommendedScreenAndBelow) {
+  for (const auto& [width, height] : {std::pair{1024, 768}, {800, 600}, {1280, 720}, {900, 1200}}) {
+    EXPECT_TRUE(AlwaysFits(width, height)) << width << " x " << height;
+  }
+  for (const auto& [width, height] : {std::pair{1025, 768}, {1024, 769}, {1366, 768}, {1920, 1080}}) {
+    EXPECT_FALSE(AlwaysFits(width, height)) << width << " x " << height;
+  }
+}
+
+TEST(FitToScreen, LetsTheWindowStartMaximisedUpToALaptopsScreen) {
+  EXPECT_TRUE(StartsMaximised(1366, 768));
+  EXPECT_TRUE(StartsMaximised(1366, 800));
+  EXPECT_FALSE(StartsMaximised(1367, 768));
+  EXPECT_FALSE(StartsMaximised(1280, 1024));
+  EXPECT_FALSE(StartsMaximised(900, 780));
+}
+
 TEST(PixelsOf, AreThoseOfTheScreenAtAnyScale) {
   EXPECT_EQ(PixelsOf(ScreenNamed("too low")), QSize(1280, 720));
   EXPECT_EQ(PixelsOf(ScreenNamed("scaled by 2")), QSize(1920, 1080));

@@ -29,6 +29,16 @@ TEST(FittingGunName, CutsTheTeamAndNeverTheNumber) {
   EXPECT_TRUE(FittingGunName(name, metrics, 1).endsWith(QStringLiteral(" 24")));
 }
 
+TEST(GunSizeIn, IsThatOfTodayInTheLeastRowAndAsFarAsThereIsRoom) {
+  const QFont font = QApplication::font();
+  const QString letters = QStringLiteral("Rank");
+  const int least = LeastRowOfMember(font, letters);
+  EXPECT_DOUBLE_EQ(GunSizeIn(least, 1, font, letters), GunSize(1));
+  EXPECT_DOUBLE_EQ(GunSizeIn(3 * least, 1.5, font, letters), GunSize(1.5));
+  EXPECT_LT(GunSizeIn(least + 4, 1.4, font, letters), GunSize(1.4));
+  EXPECT_GE(GunSizeIn(least, 2, font, letters), GunSize(100)) << "the smallest";
+}
+
 /// The board of a session in which Yellow 24 has played, in a list of some width.
 class NarrowBoard : public testing::Test {
  protected:

@@ -21,6 +21,7 @@ class FakeWordProcessor : public WordProcessor {
     std::map<std::string, std::string> Bookmarks;
     std::vector<std::string> BookmarkOrder;
     std::map<int, std::vector<std::string>> Cells;  ///< by table
+    std::map<int, RowSizes> Sizes;                  ///< by table
     std::string Picture;                            ///< its path
     std::string SavedAs;
     int Printed = 0;
@@ -86,6 +87,10 @@ class FakeWordProcessor : public WordProcessor {
         throw std::logic_error("Hits stand in rows 2 to 21");
       }
       document_.Cells[table] = texts;
+    }
+    void ResizeRows(int table, int, int, const RowSizes& sizes) override {
+      owner_.Note("ResizeRows " + std::to_string(table));
+      document_.Sizes[table] = sizes;
     }
     void AddPicture(int table, int row, int column, const std::string& file) override {
       owner_.Note("AddPicture " + std::to_string(table) + ' ' + std::to_string(row) + ' ' +

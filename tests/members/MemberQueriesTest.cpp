@@ -22,6 +22,14 @@ TEST_F(Query, OfASearchIsExactlyThis) {
   EXPECT_EQ(SearchQuery(""), "SELECT * FROM Members");
 }
 
+TEST_F(Query, OfTheListDoublesApostrophes) {
+  EXPECT_EQ(HitsQuery("O'B"),
+            "SELECT * FROM Members WHERE ([FirstName] LIKE 'O''B*' OR [LastName] LIKE 'O''B*' OR [NickName] "
+            "LIKE 'O''B*')");
+  EXPECT_EQ(HitsQuery("mo"), SearchQuery("mo"));
+  EXPECT_EQ(HitsQuery(""), "SELECT * FROM Members");
+}
+
 TEST_F(Query, FindsTheBeginningOfAnyOfTheThreeNames) {
   EXPECT_EQ(Numbers(SearchQuery("mo")), "1 2 ");
   EXPECT_EQ(Numbers(SearchQuery("MO")), "1 2 ");

@@ -1,6 +1,7 @@
 #include <QAccessible>
 #include <QGroupBox>
 
+#include "members/MemberListView.h"
 #include "tests/members/MembersWindow.h"
 #include "tests/support/OnScreen.h"
 
@@ -284,6 +285,28 @@ TEST_F(MembersWindowOn, StandsOnTheMemberToShowAmongAll) {
   EXPECT_EQ(Shown("DataPlace"), "3 / 4");
   Press("DataNext");
   EXPECT_EQ(Text("LastNameEntry"), "王");
+}
+
+TEST_F(MembersWindowOn, HasThatMemberInViewInItsList) {
+  for (int i = 0; i < 60; ++i) {
+    Sql("INSERT INTO Members (ContactID, FirstName, LastName) VALUES (" + std::to_string(100 + i) +
+        ", 'Member', '" + std::to_string(i) + "')");
+  }
+  OpenOn(150);
+  EXPECT_EQ(Text("LastNameEntry"), "50");
+  const auto& list = ::Find<MemberListView>(*window, "MemberHits");
+  EXPECT_EQ(list.currentIndex().data().toString(), QStringLiteral("Member 50"));
+  EXPECT_TRUE(list.viewport()->rect().contains(list.visualRect(list.currentIndex())));
+}
+
+TEST_F(MembersWindowOn, OpensWithRoomForNamesInItsListInLargeLettersToo) {
+  for (const int points : {9, 14}) {
+    const FontOfSize font(points);
+    OpenOn(5);
+    const auto& list = ::Find<MemberListView>(*window, "MemberHits");
+    EXPECT_GE(list.viewport()->width(), list.fontMetrics().horizontalAdvance(QStringLiteral("Alice Belmont")))
+        << points;
+  }
 }
 
 TEST_F(MembersWindowOn, StandsOnTheFirstMemberForNone) {

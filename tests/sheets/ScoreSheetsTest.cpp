@@ -270,4 +270,42 @@ TEST_F(Sheets, ServeEventsWithinEachSheet) {
   }
 }
 
+TEST_F(Sheets, TellWhatTheyHaveMade) {
+  Run();
+  EXPECT_EQ(made.Folder, "/data/scores");
+  EXPECT_EQ(made.Pdf, "");  // for the printer
+  choice.OutputTarget = OutputTarget::Files;
+  Run();
+  EXPECT_EQ(made.Folder, "/data/scores");
+  EXPECT_EQ(made.Pdf, "/data/scores/Score sheets-21 May 2013-Sniper Hunt.pdf");
+  word.FailAt = "JoinPdfs";
+  Run();
+  EXPECT_EQ(made.Folder, "/data/scores");
+  EXPECT_EQ(made.Pdf, "");
+  word.FailAt = "SaveAs";
+  Run();
+  EXPECT_EQ(made.Folder, "");
+}
+
+TEST_F(Sheets, EnlargeTheirHitsWhereThereAreFew) {
+  venue.game.Players(40).HitByPlayer(1) = 30;
+  for (int victim = 1; victim <= 21; ++victim) {
+    venue.game.Players(victim).HitByPlayer(40) = 10;
+  }
+  Run();
+  ASSERT_TRUE(Sheet(0).Sizes.contains(4));
+  EXPECT_EQ(Sheet(0).Sizes.at(4).Used, 1);
+  EXPECT_GT(Sheet(0).Sizes.at(4).Letters, 1.5);
+  EXPECT_FALSE(Sheet(1).Sizes.contains(4));  // 21 hits
+  EXPECT_TRUE(Sheet(1).Sizes.contains(5));
+}
+
+TEST_F(Sheets, AreMadeInSmallLettersWhereTheTemplateDoesNotAllowOthers) {
+  venue.game.Players(40).HitByPlayer(1) = 30;
+  word.FailAt = "ResizeRows";
+  Run();
+  EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(Completed));
+  EXPECT_THAT(Sheet(0).Cells.at(4), SizeIs(1));
+}
+
 }  // namespace

@@ -56,7 +56,7 @@ class Sheets : public testing::Test {
                            .Progress = progress,
                            .UserDataFolder = "/data",
                            .MissionName = mission};
-    ScoreSheets(parts, choice).GenerateScoreSheets();
+    made = ScoreSheets(parts, choice).GenerateScoreSheets();
   }
 
   const FakeWordProcessor::Document& Sheet(std::size_t at) const { return *word.Documents.at(at); }
@@ -87,4 +87,5 @@ class Sheets : public testing::Test {
   std::function<std::string(const std::string&)> upright = [](const std::string& photo) { return photo; };
   PrintChoice choice;
   std::string mission = "Sniper Hunt";
+  SheetFiles made;  ///< by the last run
 };

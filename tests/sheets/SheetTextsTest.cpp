@@ -151,4 +151,28 @@ TEST_F(Texts, OfHitsTakenEndWithTheSpecialDamage) {
               ElementsAre("Yellow 0:  3", "Explosive:  30", "Radiation:  4", "Stuns:  2"));
 }
 
+TEST(HitSizes, LetATableKeepItsHeight) {
+  for (int hits = 1; hits <= 20; ++hits) {
+    const std::optional<RowSizes> sizes = SizesForHits(hits, 20);
+    ASSERT_TRUE(sizes) << hits;
+    EXPECT_EQ(sizes->Used, hits);
+    EXPECT_NEAR(hits * sizes->UsedHeight + (20 - hits) * sizes->RestHeight, 20, 1e-9) << hits;
+    EXPECT_GE(sizes->UsedHeight, 1) << hits;
+    EXPECT_GT(sizes->RestHeight, 0.3) << hits;
+    EXPECT_GT(sizes->Letters, 1.1) << hits;
+    EXPECT_LT(sizes->Letters, 1.9) << hits;
+  }
+}
+
+TEST(HitSizes, GrowSmallerWithMoreHits) {
+  for (int hits = 2; hits <= 20; ++hits) {
+    EXPECT_LE(SizesForHits(hits, 20)->Letters, SizesForHits(hits - 1, 20)->Letters) << hits;
+  }
+}
+
+TEST(HitSizes, AreTheTemplatesOwnForNoHitsAndForMoreThanAColumn) {
+  EXPECT_FALSE(SizesForHits(0, 20));
+  EXPECT_FALSE(SizesForHits(21, 20));
+}
+
 }  // namespace

@@ -21,6 +21,7 @@
 #include "tests/fakes/FakeSoundPlayer.h"
 #include "tests/fakes/FakeWakeLock.h"
 #include "tests/sound/Waves.h"
+#include "tests/support/Bytes.h"
 #include "tests/support/Controls.h"
 #include "tests/support/TemporaryFolder.h"
 
@@ -34,7 +35,6 @@ using std::chrono::milliseconds;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using Kind = sim::RecorderCommandKind;
-using Bytes = std::vector<std::uint8_t>;
 using Sounds = std::map<std::uint8_t, Bytes>;
 
 /// The real event loop, on request with short waits: the hardware here answers at once, never, or too late

@@ -1,6 +1,7 @@
 #include "sound/SoundRecording.h"
 
 #include "tests/sound/RecordingSite.h"
+#include "tests/support/Bytes.h"
 #include "tests/support/Thrown.h"
 
 namespace {
@@ -9,7 +10,6 @@ using std::chrono::milliseconds;
 using testing::Contains;
 using testing::ElementsAre;
 using testing::IsEmpty;
-using Bytes = std::vector<std::uint8_t>;
 
 Bytes Joined(std::initializer_list<Bytes> parts) {
   Bytes all;

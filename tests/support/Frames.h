@@ -3,9 +3,9 @@
 #include <cstdint>
 #include <vector>
 
-/// Frames as a base unit sends them, written byte by byte from the layout; the last byte is the check byte.
+#include "tests/support/Bytes.h"
 
-using Bytes = std::vector<std::uint8_t>;
+/// Frames as a base unit sends them, written byte by byte from the layout; the last byte is the check byte.
 
 /// Red 1: counters 258 and 3 to 10, button 0807060504030201, health 100, clips 2, ammunition 30, damage
 /// values 4 and 10, 125 minutes, flag 1; 260 damage from Blue 0 and 5 from itself.

@@ -43,6 +43,7 @@ class OpenSession {
   std::vector<std::string> Column(BoardList list, BoardColumn column) const {
     std::vector<std::string> cells;
     const Board& rows = session.List(list);
+    cells.reserve(static_cast<std::size_t>(rows.RowCount()));
     for (int place = 0; place < rows.RowCount(); ++place) {
       cells.push_back(Texts.Cell(rows.RowAt(place), column));
     }

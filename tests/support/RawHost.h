@@ -10,10 +10,9 @@
 
 #include "sim/line/FileDescriptor.h"
 #include "sim/line/LineSettings.h"
+#include "tests/support/Bytes.h"
 
 namespace sim {
-
-using Bytes = std::vector<std::uint8_t>;
 
 /// Longest wait for something that must come; long enough for a busy machine.
 constexpr std::chrono::seconds Limit{20};

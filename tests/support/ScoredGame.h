@@ -83,6 +83,7 @@ class ScoredGame {
   /// Cells of one column of the board, in display order.
   std::vector<std::string> Column(BoardColumn column) const {
     std::vector<std::string> cells;
+    cells.reserve(static_cast<std::size_t>(Board.RowCount()));
     for (int place = 0; place < Board.RowCount(); ++place) {
       cells.push_back(Texts.Cell(Board.RowAt(place), column));
     }

@@ -42,9 +42,11 @@ Passes() {
 bad='inline int* Nothing() { return 0; }'
 good='inline int* Nothing() { return nullptr; }'
 mkdir -p "$house/tools" "$house/build/asan"
-cp "$source"/tools/{tidy,tidy_groups.awk,files.sh} "$house/tools"
+cp "$source"/tools/{tidy,tidy_groups.awk,source_names.awk,files.sh} "$house/tools"
 cp "$source/.clang-tidy" "$house"
-Put bin/cmake '#!/bin/sh'  # nothing is to be made here
+# Nothing is to be made here; the commands of sources alone are the same.
+Put bin/cmake '#!/bin/sh
+case "$*" in *" -B "*) mkdir -p "$4" && cp build/asan/compile_commands.json "$4" ;; esac'
 chmod +x "$house/bin/cmake"
 PATH=$house/bin:$PATH
 printf '/build/\n/bin/\n' > "$house/.gitignore"

@@ -7,6 +7,8 @@
 #include <QStyle>
 #include <QTableWidget>
 
+#include "tests/support/Contrast.h"
+
 namespace {
 
 QPalette Dark() {
@@ -40,6 +42,23 @@ TEST_F(Look, KeepsPlaceholdersReadableOnADarkDesktop) {
   QApplication::setPalette(Dark());
   PrepareLook();
   EXPECT_GT(QApplication::palette().color(QPalette::PlaceholderText).lightness(), 128);
+}
+
+TEST_F(Look, KeepsPlaceholdersAndLinksReadableOnLightAndDarkDesktops) {
+  for (const QPalette& desktop : {QPalette(QColor(0xef, 0xef, 0xef)), Dark()}) {
+    QApplication::setPalette(desktop);
+    PrepareLook();
+    const QPalette palette = QApplication::palette();
+    const QColor base = desktop.color(QPalette::Base);
+    const QColor text = palette.color(QPalette::PlaceholderText);
+    const double share = text.alphaF();
+    const auto painted = [share](int over, int under) { return qRound(over * share + under * (1 - share)); };
+    const QColor placeholder(painted(text.red(), base.red()), painted(text.green(), base.green()),
+                             painted(text.blue(), base.blue()));
+    EXPECT_GE(Contrast(placeholder.rgb(), base.rgb()), LeastContrast) << base.name().toStdString();
+    EXPECT_GE(Contrast(palette.color(QPalette::Link).rgb(), base.rgb()), LeastContrast)
+        << base.name().toStdString();
+  }
 }
 
 }  // namespace

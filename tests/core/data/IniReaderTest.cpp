@@ -220,4 +220,14 @@ TEST_F(WriteIni, DoesNotReportAFailure) {
   EXPECT_EQ(Ini.ReadIni("comm", "commport", ""), "3");
 }
 
+TEST_F(WriteIni, TellsWhetherTheFileHoldsTheValues) {
+  std::vector<bool> told;
+  Ini.AfterWrite = [&told](bool written) { told.push_back(written); };
+  Ini.WriteIni("comm", "commport", "3");
+  Ini.WriteIni("comm", "commport", "3\n4");
+  Store.FailReplace(Path, RuntimeError(61));
+  Ini.WriteIni("comm", "commport", "5");
+  EXPECT_EQ(told, (std::vector<bool>{true, false, false}));
+}
+
 }  // namespace

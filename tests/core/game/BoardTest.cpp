@@ -313,4 +313,28 @@ TEST(Ranks, RunUpwardAfterAClickOnOneOfTheFirstTwoColumns) {
   }
 }
 
+TEST_F(Sorting, TellsWhichColumnOrdersTheRows) {
+  EXPECT_EQ(list.SortedBy(), std::nullopt);
+  Add(0, Red(1), 5);
+  SortListNumeric(list, BoardColumn::Soldiering, true, game);
+  EXPECT_EQ(list.SortedBy(), BoardColumn::Soldiering);
+  SortByHeader(list, 9, game);
+  EXPECT_EQ(list.SortedBy(), BoardColumn::AmmoAdds);
+  SortByHeader(list, 2, game);  // for which all players are equal
+  EXPECT_EQ(list.SortedBy(), std::nullopt);
+  SortByHeader(list, 1, game);
+  EXPECT_EQ(list.SortedBy(), BoardColumn::Rank);
+  list.Clear();
+  EXPECT_EQ(list.SortedBy(), std::nullopt);
+}
+
+TEST_F(Sorting, LetsAPlayerBeFoundInTheNewOrder) {
+  Add(0, Red(1), 5);
+  Add(0, Blue(2), 9);
+  SortListNumeric(list, BoardColumn::Soldiering, true, game);
+  EXPECT_EQ(list.PlaceOf(Blue(2)), 0);
+  EXPECT_EQ(list.PlaceOf(Red(1)), 1);
+  EXPECT_EQ(list.PlaceOf(Red(2)), std::nullopt);
+}
+
 }  // namespace

@@ -2,6 +2,8 @@
 
 #include <gmock/gmock.h>
 
+#include <utility>
+
 namespace {
 
 using testing::ElementsAre;
@@ -85,6 +87,32 @@ TEST_F(TextsOfTheBoard, HeadTheColumnsOfBothLists) {
     teams.push_back(texts.Header(BoardList::Teams, static_cast<BoardColumn>(column)));
   }
   EXPECT_THAT(teams, ElementsAre("Rank", "Team", "Soldiering"));
+}
+
+TEST_F(TextsOfTheBoard, ExplainTheColumns) {
+  EXPECT_EQ(texts.HeaderTip(BoardList::Players, BoardColumn::Wia), "W.I.A.: times healed");
+  const StringTable chinese(Language::SimplifiedChinese);
+  for (const StringTable* table : {&std::as_const(strings), &chinese}) {
+    const BoardTexts tips(game, *table);
+    for (const BoardList list : {BoardList::Players, BoardList::Teams}) {
+      const int columns = list == BoardList::Players ? BoardColumnCount : TeamColumnCount;
+      for (int column = 0; column < columns; ++column) {
+        const std::string header = tips.Header(list, static_cast<BoardColumn>(column));
+        const std::string tip = tips.HeaderTip(list, static_cast<BoardColumn>(column));
+        EXPECT_EQ(tip.substr(0, header.size()), header);
+        EXPECT_GT(tip.size(), header.size() + 4);
+      }
+    }
+  }
+}
+
+TEST_F(TextsOfTheBoard, NameAPlayerWithTheMemberOnTheBoard) {
+  Board players{[] {}};
+  BoardRow row = RowOf(40);
+  row.MemberName = "Mole";
+  players.AddRow(std::move(row));
+  EXPECT_EQ(PlayerText(40, players, game, texts), "Blue  7: Mole");
+  EXPECT_EQ(PlayerText(1, players, game, texts), "Red  0");
 }
 
 }  // namespace

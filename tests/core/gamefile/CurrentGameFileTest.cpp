@@ -79,6 +79,40 @@ TEST_F(GameFiles, OfferTheLastNameWhenSavingAgainAndNoneWhenLoading) {
   EXPECT_TRUE(files.FileExists("/a.xml") && files.FileExists("/b.xml"));
 }
 
+TEST_F(GameFiles, AreOfferedASuggestedNameInTheFolderOfTheLastSave) {
+  files.AddFolder("/games");
+  dialog.Answers = {"/games/a.xml", "/b.xml"};
+  gameFile.SaveGame(game, "None");
+  gameFile.SaveGame(game, "None", "Friday.xml");
+  EXPECT_EQ(dialog.Calls.back(), (FakeFileDialog::Call{true, Filter, "Friday.xml", "/games"}));
+  EXPECT_EQ(gameFile.SaveFolder(), "/");
+}
+
+TEST_F(GameFiles, AreNeverSavedUnderASuggestedNameAfterCancel) {
+  gameFile.SetSaveFolder("/games");
+  EXPECT_FALSE(gameFile.SaveGame(game, "None", "Friday.xml"));
+  EXPECT_THAT(files.Replaced, IsEmpty());
+  EXPECT_EQ(gameFile.SavedOnCancel(), "");
+  EXPECT_EQ(dialog.Calls.back().Folder, "/games");
+  dialog.Answers = {"/a.xml", std::nullopt};
+  gameFile.SaveGame(game, "None");
+  EXPECT_TRUE(gameFile.SaveGame(game, "Keep", "Friday.xml"));
+  EXPECT_EQ(files.Read("/a.xml"), WriteGameFile(game, "Keep"));
+  EXPECT_EQ(gameFile.SavedOnCancel(), "/a.xml");
+  dialog.Answers = {"/a.xml"};
+  gameFile.SaveGame(game, "None");
+  EXPECT_EQ(gameFile.SavedOnCancel(), "");
+}
+
+TEST_F(GameFiles, ChosenWithoutADialogAreLoadedAndSavedTo) {
+  files.Put("/b.xml", "<GameData/>");
+  gameFile.Choose("/b.xml");
+  ASSERT_TRUE(Load());
+  gameFile.SaveGame(game, "None");
+  EXPECT_EQ(dialog.Calls.back(), (FakeFileDialog::Call{true, Filter, "/b.xml"}));
+  EXPECT_EQ(files.Read("/b.xml"), WriteGameFile(game, "None"));
+}
+
 TEST_F(GameFiles, ReplaceAnExistingOneWithoutAQuestion) {
   files.Put("/a.xml", "old and much longer than before");
   dialog.Answers = {"/a.xml"};

@@ -222,4 +222,60 @@ TEST_F(InterruptedDownload, TakesBackOnlyWhatItAdded) {
   EXPECT_EQ(Red1().HitByPlayer(33), hits);
 }
 
+TEST_F(InterruptedDownload, TellsWhichGunsWereCountedTwice) {
+  const int red1 = 2;
+  const int blue0 = 33;
+  Frames = {FrameOfRed1(), FrameOfBlue0()};
+  SilentFrom = 60;
+  GetScores();
+  GetScores();
+  SilentFrom = Never;
+  GetScores();
+  EXPECT_THAT(Guns.CountedTwice(), IsEmpty()) << "what the first ones gave was taken back";
+  Frames = {FrameOfBlue0()};
+  GetScores();
+  EXPECT_THAT(Guns.CountedTwice(), testing::ElementsAre(blue0));
+  Frames = {FrameOfRed1(), FrameOfBlue0()};
+  SilentFrom = 60;
+  GetScores();
+  SilentFrom = Never;
+  GetScores();
+  EXPECT_THAT(Guns.CountedTwice(), testing::ElementsAre(red1, blue0));
+  Scores.Clear();
+  Guns.Forget();
+  GetScores();
+  EXPECT_THAT(Guns.CountedTwice(), IsEmpty());
+}
+
+TEST_F(InterruptedDownload, CountsAGunOnceThatReportedTwiceOnlyInTheOneTakenBack) {
+  Frames = {FrameOfRed1(), SecondFrameOfRed1(), FrameOfBlue0()};
+  SilentFrom = 120;
+  GetScores();
+  EXPECT_THAT(Guns.CountedTwice(), testing::ElementsAre(2));
+  Frames = {FrameOfRed1(), FrameOfBlue0()};
+  SilentFrom = Never;
+  GetScores();
+  EXPECT_THAT(Guns.CountedTwice(), IsEmpty());
+}
+
+TEST_F(InterruptedDownload, TellsWhichGunsCameByAnotherRoadToo) {
+  const int red1 = 2;
+  const int blue0 = 33;
+  const int red2 = 3;
+  Guns.ComesOtherwise(0);  // ids below 32 have no record
+  Guns.ComesOtherwise(red2);
+  EXPECT_THAT(Guns.CountedTwice(), IsEmpty());
+  Scores.Players(red2).Active = true;
+  Frames = {FrameOfRed1(), FrameOfBlue0()};
+  SilentFrom = 60;
+  GetScores();
+  Guns.ComesOtherwise(red1);
+  EXPECT_THAT(Guns.CountedTwice(), testing::ElementsAre(red1));
+  SilentFrom = Never;
+  GetScores();
+  EXPECT_THAT(Guns.CountedTwice(), testing::ElementsAre(red1)) << "the other road's scores are still there";
+  Guns.ComesOtherwise(blue0);
+  EXPECT_THAT(Guns.CountedTwice(), testing::ElementsAre(red1, blue0));
+}
+
 }  // namespace

@@ -7,12 +7,12 @@
 #include "tests/devices/charging/ChargingSite.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/fakes/FakeSerialDevices.h"
+#include "tests/support/Bytes.h"
 
 // What the charging puts on the line of a serial adapter.
 
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
 using testing::ElementsAre;
 
 class ChargingLine : public testing::Test {

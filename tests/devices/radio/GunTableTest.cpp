@@ -35,6 +35,19 @@ TEST(ScoreStatuses, HaveTheirNumbersAndTexts) {
   EXPECT_EQ(StatusText(ScoreStatus::Ok), "Scores OK");
 }
 
+TEST(GunTables, TellWhetherGunsAnsweredUpToTheEdgeOfTheSearch) {
+  const auto answered = [](int index, std::int16_t ids) {
+    GunTable guns;
+    guns[static_cast<std::size_t>(index)].Present = true;
+    return AnsweredUpToEdge(guns, ids);
+  };
+  EXPECT_FALSE(answered(126, 128));
+  EXPECT_TRUE(answered(127, 128));
+  EXPECT_TRUE(answered(200, 128));
+  EXPECT_FALSE(answered(223, 224));  // there are no more
+  EXPECT_FALSE(AnsweredUpToEdge(GunTable{}, 128));
+}
+
 TEST(GunRows, HaveABlankBeforeTheBattery) {
   GunEntry gun;
   gun.PlayerName = "Red  1";

@@ -7,6 +7,7 @@
 
 #include "tests/devices/radio/RemoteWindow.h"
 #include "tests/support/CaredFor.h"
+#include "tests/support/OnScreen.h"
 
 namespace {
 
@@ -47,6 +48,42 @@ TEST_P(RemoteWindow, SharesTheListsWidthAmongItsColumns) {
     EXPECT_EQ(list.columnWidth(column), width / 5);
   }
   EXPECT_EQ(list.columnWidth(4), static_cast<int>(width / 5.1));
+}
+
+TEST_P(RemoteWindow, CutsNoTextInSmallOrLargeLetters) {
+  guns = {33, 159};
+  silent = 33;
+  for (const int points : {9, 14}) {
+    const FontOfSize letters(points);
+    RemoteManage sized({Port, Line, Events, Boxes, Time, Strings, game}, nullptr);
+    sized.show();
+    ::Press(sized, "SearchGunsButton");
+    bool looked = false;
+    Meanwhile(20, [&] {
+      looked = true;
+      const auto& list = Find<QTableView>(sized, "DataList");
+      EXPECT_EQ(list.model()->index(0, 4).data().toString(), QStringLiteral("Scores In Progress"));
+      for (int column = 0; column < 5; ++column) {
+        EXPECT_LE(list.sizeHintForIndex(list.model()->index(0, column)).width(), list.columnWidth(column))
+            << points << ' ' << column;
+      }
+      ExpectHeadersFit(sized);
+    });
+    ::Press(sized, "GetScoresButton");
+    EXPECT_TRUE(looked);
+  }
+}
+
+TEST_P(RemoteWindow, ShowsSmallerLettersInANarrowWindow) {
+  const auto letters = [this] { return Find<QTableView>(window, "DataList").font().pointSizeF(); };
+  window.resize(1300, 600);
+  QCoreApplication::processEvents();
+  const double wide = letters();
+  EXPECT_DOUBLE_EQ(wide, 1.25 * window.font().pointSizeF());
+  window.resize(window.minimumSizeHint().width(), 600);
+  QCoreApplication::processEvents();
+  EXPECT_LT(letters(), wide);
+  EXPECT_GE(letters(), 0.85 * window.font().pointSizeF());
 }
 
 TEST_P(RemoteWindow, ListsTheGunsThatAnswer) {

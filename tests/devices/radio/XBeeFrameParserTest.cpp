@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "platform/RuntimeError.h"
+#include "tests/support/Bytes.h"
 
 namespace {
 
@@ -33,8 +34,6 @@ namespace {
 
 using testing::ElementsAre;
 using testing::IsEmpty;
-
-using Bytes = std::vector<std::uint8_t>;
 
 /// From 0013A20040112233, -40 dBm: gun 33 answers the search with firmware 2.5, 85 percent, weapon 1.
 const Bytes AnswerFrame = {0x7E, 0x00, 0x14, 0x80, 0x00, 0x13, 0xA2, 0x00, 0x40, 0x11, 0x22, 0x33,

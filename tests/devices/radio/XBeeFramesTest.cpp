@@ -4,12 +4,11 @@
 
 #include "devices/radio/GunPacket.h"
 #include "platform/RuntimeError.h"
+#include "tests/support/Bytes.h"
 
 namespace {
 
 using testing::ElementsAre;
-
-using Bytes = std::vector<std::uint8_t>;
 
 TEST(TransmitRequest, AsksForABroadcastOfTheSearchOfGun32) {
   EXPECT_THAT(TransmitRequest(BroadcastAddress, MakeGunPacket(32, 0, 0, 6, {})),

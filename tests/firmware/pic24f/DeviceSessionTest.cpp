@@ -6,11 +6,11 @@
 #include "tests/firmware/hex/HexFile.h"
 #include "tests/firmware/pic24f/BootSite.h"
 #include "tests/firmware/pic24f/LoaderModel.h"
+#include "tests/support/Bytes.h"
 #include "tests/support/Thrown.h"
 
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
 using std::chrono::milliseconds;
 using testing::HasSubstr;
 using testing::Not;

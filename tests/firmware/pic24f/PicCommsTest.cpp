@@ -3,11 +3,11 @@
 #include <gmock/gmock.h>
 
 #include "tests/firmware/pic24f/BootSite.h"
+#include "tests/support/Bytes.h"
 #include "tests/support/Thrown.h"
 
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
 using testing::Contains;
 using testing::ElementsAre;
 using testing::IsEmpty;

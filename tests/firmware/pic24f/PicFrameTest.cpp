@@ -2,9 +2,10 @@
 
 #include <gmock/gmock.h>
 
+#include "tests/support/Bytes.h"
+
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
 using testing::ElementsAre;
 using testing::IsEmpty;
 

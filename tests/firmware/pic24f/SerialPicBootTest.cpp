@@ -6,11 +6,11 @@
 
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeSerialPort.h"
+#include "tests/support/Bytes.h"
 #include "tests/support/Thrown.h"
 
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
 using std::chrono::milliseconds;
 using testing::ElementsAre;
 using testing::IsEmpty;

@@ -13,9 +13,8 @@
 #include "platform/qt/QtEventPump.h"
 #include "platform/qt/QtSerialPort.h"
 #include "tests/platform/qt/PseudoTerminal.h"
+#include "tests/support/Bytes.h"
 #include "tests/support/FailureOf.h"
-
-using Bytes = std::vector<std::uint8_t>;
 
 /// A second descriptor for a terminal's near end.
 class SecondOpener {

@@ -15,6 +15,13 @@ TEST(KeySet, PutsItsFirstKeysInOrder) {
   EXPECT_EQ(keys.At(2), 9);
 }
 
+TEST(KeySet, HoldsAKeyOnce) {
+  const KeySet keys({5, 9, 5, 1, 9});
+  ASSERT_EQ(keys.Size(), 3u);
+  EXPECT_EQ(keys.At(1), 5);
+  EXPECT_EQ(keys.PositionOf(9), 2u);
+}
+
 TEST(KeySet, FindsPositionsOfAscendingKeys) {
   const KeySet keys({-3, 1, 5});
   EXPECT_TRUE(keys.Ascending());

@@ -8,8 +8,11 @@
 
 namespace {
 
+using testing::ElementsAre;
 using testing::HasSubstr;
+using testing::IsEmpty;
 using testing::Not;
+using testing::SizeIs;
 
 class LikeRange : public testing::Test {
  protected:
@@ -67,6 +70,27 @@ TEST_F(LikeRange, IsLeftOutWhereItWouldNotHold) {
   }
 }
 
+TEST_F(LikeRange, IsAddedToEachOfSeveralAlternatives) {
+  EXPECT_THAT(LikeAlternatives(members, "([FirstName] LIKE 'mo*' or [LastName]  like 'o''b*' )"),
+              ElementsAre("[FirstName] LIKE 'mo*' AND [FirstName] >= 'mo' COLLATE NOCASE AND [FirstName] < "
+                          "'mp' COLLATE NOCASE",
+                          "[LastName]  like 'o''b*' AND [LastName] >= 'o''b' COLLATE NOCASE AND [LastName] < "
+                          "'o''c' COLLATE NOCASE"));
+  EXPECT_THAT(LikeAlternatives(members, "[NickName] LIKE 'a*'"), SizeIs(1));
+  const std::string unreadable = std::string("[NickName] LIKE 'a") + '\0' + "'";
+  for (const std::string& condition :
+       {std::string("[FirstName] LIKE 'mo*' AND [LastName] LIKE 'a*'"),
+        std::string("[FirstName] LIKE 'mo*' OR NOT [LastName] LIKE 'a*'"),
+        std::string("([FirstName] LIKE 'mo*') OR ([LastName] LIKE 'a*')"),
+        std::string("[FirstName] LIKE 'mo*' OR [LastName] LIKE '*a'"),
+        std::string("[FirstName] LIKE 'mo*' OR [LastName] LIKE 'o'b*'"),
+        std::string("[FirstName] LIKE 'mo*' OR 1"), std::string("[FirstName] LIKE 'mo*' OR"),
+        std::string("[FirstName] LIKE 'mo*' --"), std::string("FirstName = 'a'"), std::string("()"),
+        std::string(), unreadable}) {
+    EXPECT_THAT(LikeAlternatives(members, condition), IsEmpty()) << condition;
+  }
+}
+
 class PrefixSearch : public testing::Test {
  protected:
   PrefixSearch() {
@@ -104,6 +128,15 @@ TEST_F(PrefixSearch, FindsWhatTheMatchingRulesFind) {
   EXPECT_EQ(Found("ZOË*"), "8 ");
   EXPECT_EQ(Found("mor#*"), "");
   EXPECT_EQ(Found("a\x7f*"), "20 ");
+}
+
+TEST_F(PrefixSearch, FindsARowOnceInTableOrderByWhicheverColumns) {
+  file.Execute(
+      "UPDATE Members SET LastName = 'Moore' WHERE ContactID IN (1, 2); "
+      "UPDATE Members SET LastName = 'mouse' WHERE ContactID = 3");
+  const auto rows =
+      database->OpenRecordset("SELECT * FROM Members WHERE ([LastName] LIKE 'mo*' OR [FirstName] LIKE 'm*')");
+  EXPECT_EQ(AllNumbers(*rows), "1 2 3 4 5 ");
 }
 
 TEST_F(PrefixSearch, ReportsAnInvalidPatternOrAnApostropheWithTheOriginalText) {

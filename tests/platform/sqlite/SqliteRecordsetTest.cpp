@@ -41,6 +41,21 @@ TEST_F(Dynaset, MoveLastStandsOnTheLastRow) {
   EXPECT_FALSE(rows->Eof());
 }
 
+TEST_F(Dynaset, MoveToStandsOnTheRowAtThatPosition) {
+  for (const auto& [position, number] : {std::pair{2, 5}, {0, 1}, {3, 9}, {1, 2}}) {
+    rows->MoveTo(position);
+    EXPECT_EQ(IntegerOf(*rows, "ContactID"), number);
+    EXPECT_EQ(rows->AbsolutePosition(), position);
+  }
+}
+
+TEST_F(Dynaset, MoveToAPositionWithoutARowIs3021) {
+  rows->MoveTo(2);
+  EXPECT_EQ(NumberThrownBy([&] { rows->MoveTo(4); }), 3021);
+  EXPECT_EQ(NumberThrownBy([&] { rows->MoveTo(-1); }), 3021);
+  EXPECT_EQ(IntegerOf(*rows, "ContactID"), 5);
+}
+
 TEST_F(Dynaset, MoveNextFromTheEndIs3021) {
   rows->MoveLast();
   rows->MoveNext();

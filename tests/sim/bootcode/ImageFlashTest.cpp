@@ -5,12 +5,11 @@
 #include <filesystem>
 #include <stdexcept>
 
+#include "tests/support/Bytes.h"
 #include "tests/support/TemporaryFolder.h"
 
 namespace sim {
 namespace {
-
-using Bytes = std::vector<std::uint8_t>;
 
 Bytes Row(const ImageFlash& flash, std::size_t row) {
   const auto begin = flash.Bytes().begin() + static_cast<std::ptrdiff_t>(row * 192);

@@ -4,10 +4,10 @@
 
 #include <stdexcept>
 
+#include "tests/support/Bytes.h"
+
 namespace sim {
 namespace {
-
-using Bytes = std::vector<std::uint8_t>;
 
 GunScores Blue2() {
   GunScores scores;

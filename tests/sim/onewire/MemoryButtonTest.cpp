@@ -4,10 +4,11 @@
 
 #include <numeric>
 
+#include "tests/support/Bytes.h"
+
 namespace sim {
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
 using Kind = MemoryTroubleSettings::Kind;
 
 // The block 0, 1, 2, ... 31.

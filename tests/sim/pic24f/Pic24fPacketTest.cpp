@@ -4,10 +4,10 @@
 
 #include <string>
 
+#include "tests/support/Bytes.h"
+
 namespace sim {
 namespace {
-
-using Bytes = std::vector<std::uint8_t>;
 
 Bytes Encoded(const Bytes& data, bool escapeAll = false) {
   return EncodePic24fPacket(data, escapeAll);

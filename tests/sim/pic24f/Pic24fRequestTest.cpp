@@ -5,10 +5,10 @@
 #include <optional>
 #include <utility>
 
+#include "tests/support/Bytes.h"
+
 namespace sim {
 namespace {
-
-using Bytes = std::vector<std::uint8_t>;
 
 std::optional<Pic24fRequest> Read(const Bytes& data) {
   const auto read = ReadPic24fRequest(data);

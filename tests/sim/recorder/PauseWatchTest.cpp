@@ -29,6 +29,7 @@ TEST(PauseWatch, ForgivesShortPausesAmongGoodOnes) {
   EXPECT_EQ(FaultsOf(RecorderPause::BeforePage, {0, 20, 0, 20, 0, 20}), 1);
   EXPECT_EQ(FaultsOf(RecorderPause::BeforePage, {20, 0, 20, 0, 20, 0}), 0);
   EXPECT_EQ(FaultsOf(RecorderPause::BeforePage, {20, 20, 20, 30, 5000}), 0);
+  EXPECT_EQ(FaultsOf(RecorderPause::BeforePage, {0, 0, 20, 20}), 0);
 }
 
 TEST(PauseWatch, TakesThreeQuartersForEnough) {

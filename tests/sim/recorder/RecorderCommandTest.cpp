@@ -5,10 +5,11 @@
 #include <utility>
 #include <vector>
 
+#include "tests/support/Bytes.h"
+
 namespace sim {
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
 using Kind = RecorderCommandKind;
 
 constexpr RecorderMode Gun = RecorderMode::InProduct;

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "sim/recorder/RecorderReport.h"
+#include "tests/support/JoinedBytes.h"
 
 namespace sim {
 namespace {
@@ -13,11 +14,6 @@ using Samples = SoundChip::Samples;
 
 Samples Page(std::uint8_t value) {
   return Samples(256, value);
-}
-
-Samples operator+(Samples left, const Samples& right) {
-  left.insert(left.end(), right.begin(), right.end());
-  return left;
 }
 
 SoundChip::Table TableOf(const std::vector<std::pair<std::size_t, int>>& entries) {
