@@ -66,7 +66,8 @@ Composition::Composition()
           .SoundPlayer = soundPlayer_,
           .SoundConverter = soundConverter_,
           .ButtonSwipe = [this] { return SwipeButton(); },
-          .Wire = &wire_};
+          .Wire = &wire_,
+          .Archives = &archives_};
 }
 
 std::string Composition::SwipeButton() {

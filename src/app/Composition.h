@@ -45,6 +45,7 @@ class Composition {
   QTranslator dialogTexts_;  ///< the toolkit's own texts ("OK", "File name:") in the program's language
   QtClock clock_;
   SqliteEngine databases_;
+  SqliteEngine archives_{std::chrono::milliseconds(50)};  // games are kept between two commands
   QtEventPump events_;
   DialogParent parent_;
   QtFileDialog fileDialog_{[this] { return parent_.Window(); }};

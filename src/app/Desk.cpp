@@ -33,6 +33,14 @@ QString NameOf(DeskTopic topic) {
       return QStringLiteral("DeskFileOfCancel");
     case DeskTopic::Settings:
       return QStringLiteral("DeskSettings");
+    case DeskTopic::Kept:
+      return QStringLiteral("DeskKept");
+    case DeskTopic::NotKept:
+      return QStringLiteral("DeskNotKept");
+    case DeskTopic::ArchiveUnusable:
+      return QStringLiteral("DeskArchiveUnusable");
+    case DeskTopic::CutGames:
+      return QStringLiteral("DeskCutGames");
   }
   return {};
 }
@@ -131,6 +139,10 @@ DeskFacts Desk::Facts() const {
   }
   facts.FileOfCancel = fileOfCancel_;
   facts.UnsavedSettings = unsavedSettings_;
+  facts.KeptAt = keeping_.KeptAt;
+  facts.NotKept = keeping_.Failure;
+  facts.UnusableArchive = keeping_.Unusable;
+  facts.CutGames = keeping_.CutGames;
   return facts;
 }
 
@@ -261,6 +273,11 @@ void Desk::TellFileOfCancel(const std::string& path) {
 
 void Desk::TellUnsavedSettings(const std::string& path) {
   unsavedSettings_ = path;
+  Show();
+}
+
+void Desk::TellKeeping(const KeptState& state) {
+  keeping_ = state;
   Show();
 }
 

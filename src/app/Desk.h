@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "app/AfterGameBar.h"
+#include "archive/GameKeeper.h"
 #include "board/ScoreListView.h"
 #include "core/game/DeskEntries.h"
 #include "core/game/GameProgress.h"
@@ -57,6 +58,8 @@ class Desk : public QObject {
   void TellFileOfCancel(const std::string& path);
   /// Says that the settings in this file could not be saved; nothing if `path` is empty.
   void TellUnsavedSettings(const std::string& path);
+  /// Says what became of keeping games.
+  void TellKeeping(const KeptState& state);
 
   /// Gives the board the keyboard, so that no stray key changes the game; once an open menu or list is
   /// closed.
@@ -88,6 +91,7 @@ class Desk : public QObject {
   std::string unopened_;  ///< folder or file that the desktop could not open; empty if none
   std::string fileOfCancel_;
   std::string unsavedSettings_;
+  KeptState keeping_;
   bool ended_ = false;
   Subscription subscription_;
 };

@@ -48,4 +48,6 @@ struct Services {
   std::function<std::string()> ButtonSwipe = {};
   /// The bus behind the reader; null if there is none.
   OneWire* Wire = nullptr;
+  /// Opens the archive of games. It does not wait long for a locked file; null for one that does.
+  DatabaseEngine* Archives = nullptr;
 };

@@ -58,6 +58,7 @@ bool frmRx::FormLoad() {
   ui_->mnuChargeiButton->setEnabled(services_.Wire != nullptr);
   ConnectCommands();
   SetUpDesk();
+  SetUpKeeping();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
@@ -98,6 +99,21 @@ void frmRx::SetUpDesk() {
   };
   KeepCalm(*ui_->ActiveMission, [this] { desk_->FocusBoard(); });
   desk_->FocusBoard();
+}
+
+void frmRx::SetUpKeeping() {
+  keeping_.emplace(
+      GameKeeper::Parts{.Session = session_,
+                        .Progress = desk_->Progress(),
+                        .Time = services_.Time,
+                        .Disk = services_.Disk,
+                        .Engine = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
+                        .Strings = services_.Strings,
+                        .UserDataFolder = userDataFolder_,
+                        .ProgramFolder = services_.Places.Program()},
+      [this] { return downloading_; }, [this](const KeptState& state) { desk_->TellKeeping(state); });
+  // Not before the window is shown.
+  QTimer::singleShot(0, &*keeping_, [this] { keeping_->CheckMembers(); });
 }
 
 void frmRx::SetUpLists() {
@@ -216,6 +232,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
     commPort_->CloseIfOpen();
   }
   if (desk_) {
+    keeping_->End();
     desk_->End();
   }
   session_.Close();

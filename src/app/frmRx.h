@@ -8,6 +8,7 @@
 #include <string>
 
 #include "app/Desk.h"
+#include "app/GameKeeping.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
 #include "core/data/IniReader.h"
@@ -54,6 +55,7 @@ class frmRx : public QMainWindow {
   void ConnectCommands();
 
   void SetUpDesk();
+  void SetUpKeeping();
 
   void TellOfMissingBackup();
 
@@ -132,5 +134,6 @@ class frmRx : public QMainWindow {
   QTimer wordProcessorTimer_;
   Commands commands_;
   std::optional<Desk> desk_;
+  std::optional<GameKeeping> keeping_;
   ManualKey manual_;
 };

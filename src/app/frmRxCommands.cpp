@@ -47,6 +47,7 @@ void frmRx::GetScoreData() {
     return;
   }
   desk_->ForgetDownload();
+  keeping_->BeginPull(GameSource::Cable);
   {
     downloading_ = true;
     const auto ended = qScopeGuard([this] { downloading_ = false; });
@@ -155,6 +156,7 @@ std::string frmRx::ShowMembers(std::int32_t contactToShow) {
                  this);
   window.ContactToShow = contactToShow;
   window.exec();
+  keeping_->NoteMembers();
   return window.SelectedContact();
 }
 
@@ -195,6 +197,7 @@ void frmRx::UpdateFirmware() {
 }
 
 void frmRx::ManageRemotely() {
+  keeping_->BeginPull(GameSource::Radio);
   RemoteManage({.MSComm1 = services_.MSComm1,
                 .Port = *commPort_,
                 .Events = services_.Events,

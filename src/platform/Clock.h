@@ -16,4 +16,8 @@ class Clock {
   /// The date in `text` (a short date, optionally followed by a time) in the locale's long format; `text`
   /// unchanged if there is none.
   virtual std::string LongDate(const std::string& text) const = 0;
+
+  /// The date and time in `text` (a short date, then a short time or nothing) as Now tells them; empty if it
+  /// is no such text.
+  virtual std::string Stamp(const std::string& text) const = 0;
 };

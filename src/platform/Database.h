@@ -9,6 +9,8 @@
 #include <variant>
 #include <vector>
 
+class Sql;
+
 /// Bytes of a long binary column.
 using Blob = std::vector<std::uint8_t>;
 
@@ -89,6 +91,14 @@ class Database {
   /// sets. Throws RuntimeError 3078 if there is no such table, 3075 for a malformed query. The database must
   /// outlive the recordset.
   virtual std::unique_ptr<Recordset> OpenRecordset(const std::string& source) = 0;
+
+  /// Statements on this database, for what no recordset can express (platform/Sql.h). They see and share the
+  /// groups of reads and writes below.
+  virtual Sql& Statements() = 0;
+
+  /// The numbers that the database gives to new rows of `table` are above `number` from now on; durable.
+  /// Does nothing if they are already. Throws RuntimeError 3000 for a table without such a counter.
+  virtual void RaiseCounter(const std::string& table, std::int64_t number) = 0;
 
   /// The reads from here to the matching EndRead take the file's lock once for the group instead of once per
   /// read. Groups nest. Use ReadScope.

@@ -21,3 +21,14 @@ class CommandEvent : public QEvent {
  private:
   QString name_;
 };
+
+/// Sent to the application when the last of a window's commands has unwound.
+class CommandsEndedEvent : public QEvent {
+ public:
+  CommandsEndedEvent() : QEvent(EventType()) {}
+
+  static QEvent::Type EventType() {
+    static const int type = QEvent::registerEventType();
+    return static_cast<QEvent::Type>(type);
+  }
+};

@@ -18,6 +18,10 @@ bool Commands::Run(const std::function<void()>& command) {
   ++running_;
   const bool done = ReportErrors(boxes_, command);
   --running_;
+  if (running_ == 0) {
+    CommandsEndedEvent event;
+    QCoreApplication::sendEvent(QCoreApplication::instance(), &event);
+  }
   if (running_ == 0 && AllUnwound) {
     ReportErrors(boxes_, AllUnwound);
   }

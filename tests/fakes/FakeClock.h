@@ -23,4 +23,12 @@ class FakeClock : public Clock {
     const auto found = LongDates.find(text);
     return found == LongDates.end() ? text : found->second;
   }
+
+  /// Stamps by the text they are requested for; any other text is no date.
+  std::map<std::string, std::string> Stamps = {{"21/05/2013 14:30", "2013-05-21 14:30:00"}};
+
+  std::string Stamp(const std::string& text) const override {
+    const auto found = Stamps.find(text);
+    return found == Stamps.end() ? std::string() : found->second;
+  }
 };

@@ -1,9 +1,10 @@
 #include "core/game/CalculationReads.h"
 
-#include <utility>
-
 BoxAnswer UnlockingBoxes::Show(const std::string& text, const std::string& title, BoxIcon icon,
                                BoxButtons buttons) {
+  if (silenced_) {
+    return BoxAnswer::Ok;
+  }
   CalculationReads* const reads = std::exchange(reads_, nullptr);
   if (reads == nullptr) {
     return boxes_.Show(text, title, icon, buttons);

@@ -2,6 +2,7 @@
 
 #include <optional>
 #include <string>
+#include <utility>
 
 #include "platform/Database.h"
 #include "platform/MessageBoxes.h"
@@ -19,9 +20,25 @@ class UnlockingBoxes : public MessageBoxes {
 
  private:
   friend class CalculationReads;
+  friend class SilencedBoxes;
 
   MessageBoxes& boxes_;
+  bool silenced_ = false;
   CalculationReads* reads_ = nullptr;  ///< those of the calculation that is running, none while a box is open
+};
+
+/// While it exists the boxes are not shown, and each counts as answered with OK.
+class SilencedBoxes {
+ public:
+  explicit SilencedBoxes(UnlockingBoxes& boxes)
+      : boxes_(boxes), before_(std::exchange(boxes.silenced_, true)) {}
+  ~SilencedBoxes() { boxes_.silenced_ = before_; }
+  SilencedBoxes(const SilencedBoxes&) = delete;
+  SilencedBoxes& operator=(const SilencedBoxes&) = delete;
+
+ private:
+  UnlockingBoxes& boxes_;
+  const bool before_;
 };
 
 /// A read scope on both databases while it exists, except while one of `boxes` is open.

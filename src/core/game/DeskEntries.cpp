@@ -76,6 +76,22 @@ void TellOfGame(const DeskFacts& facts, Writer& writer) {
     }
   }
   TellOfScores(facts, writer);
+  if (facts.NotKept.empty() && !facts.KeptAt.empty()) {
+    writer.Tell(DeskTopic::Kept, writer.Text(OwnText::DeskKept, {facts.KeptAt}));
+  }
+}
+
+void TellOfArchive(const DeskFacts& facts, Writer& writer) {
+  if (!facts.NotKept.empty()) {
+    writer.Tell(DeskTopic::NotKept, writer.Text(OwnText::DeskNotKept, {facts.NotKept}));
+  }
+  if (!facts.UnusableArchive.empty()) {
+    writer.Tell(DeskTopic::ArchiveUnusable,
+                writer.Text(OwnText::DeskArchiveUnusable, {facts.UnusableArchive}));
+  }
+  if (facts.CutGames > 0) {
+    writer.Tell(DeskTopic::CutGames, writer.Text(OwnText::DeskCutGames, {std::to_string(facts.CutGames)}));
+  }
 }
 
 }  // namespace
@@ -92,5 +108,6 @@ std::vector<DeskEntry> DeskEntries(const DeskFacts& facts, const StringTable& st
   if (!facts.UnsavedSettings.empty()) {
     writer.Tell(DeskTopic::Settings, writer.Text(OwnText::DeskSettingsUnsaved, {facts.UnsavedSettings}));
   }
+  TellOfArchive(facts, writer);
   return writer.Entries();
 }

@@ -21,6 +21,10 @@ struct DeskFacts {
   std::vector<std::string> SharedMembers;  ///< names of members who have several guns
   std::string FileOfCancel;                ///< written although the dialog was cancelled; empty if none was
   std::string UnsavedSettings;             ///< file of the settings that could not be written
+  std::string KeptAt;                      ///< time at which the game was kept; empty if it was not
+  std::string NotKept;                     ///< why it is not kept as it is; empty if it is
+  std::string UnusableArchive;  ///< file of past games that could not be used; empty if there is none
+  int CutGames = 0;             ///< past games that no longer name a member
 };
 
 /// What an entry of the status line is about.
@@ -33,7 +37,11 @@ enum class DeskTopic {
   MissionChanged,
   SharedMembers,
   FileOfCancel,
-  Settings
+  Settings,
+  Kept,
+  NotKept,
+  ArchiveUnusable,
+  CutGames
 };
 
 struct DeskEntry {

@@ -1,34 +1,13 @@
 #include "core/game/GameProgress.h"
 
 #include <map>
-#include <string_view>
 #include <utility>
+
+#include "core/game/WordDigest.h"
 
 namespace {
 
-/// FNV-1a, a word at a time: it only has to tell two states of one game apart.
-class Digester {
- public:
-  void Add(std::uint64_t value) {
-    constexpr std::uint64_t prime = 0x100000001b3U;
-    digest_ = (digest_ ^ value) * prime;
-    digest_ ^= digest_ >> 32U;
-  }
-  void Add(std::int32_t value) { Add(std::uint64_t{static_cast<std::uint32_t>(value)}); }
-  void Add(std::string_view text) {
-    Add(std::uint64_t{text.size()});
-    for (const char character : text) {
-      Add(std::uint64_t{static_cast<unsigned char>(character)});
-    }
-  }
-
-  std::uint64_t Digest() const { return digest_; }
-
- private:
-  std::uint64_t digest_ = 0xcbf29ce484222325U;
-};
-
-void AddPlayer(Digester& digester, const Player& player, bool commits) {
+void AddPlayer(WordDigest& digester, const Player& player, bool commits) {
   for (const std::int32_t value :
        {player.ShotCount, player.HealCount, player.AmmoAddCount, player.AdminKillCount, player.RespawnCount,
         player.RemainingHealth, player.RemainingClips, player.RemainingAmmo, player.DeathCount,
@@ -49,7 +28,7 @@ void AddPlayer(Digester& digester, const Player& player, bool commits) {
 }  // namespace
 
 std::uint64_t InputsDigest(const Game& game, const std::string& missionName, bool commits) {
-  Digester digester;
+  WordDigest digester;
   digester.Add(missionName);
   digester.Add(game.GameDate);
   for (const ObjectiveTeam& team : game.ObjectiveTeams) {
@@ -63,7 +42,7 @@ std::uint64_t InputsDigest(const Game& game, const std::string& missionName, boo
       AddPlayer(digester, player, commits);
     }
   }
-  return digester.Digest();
+  return digester.Value();
 }
 
 CommitCount CountCommits(const Game& game) {

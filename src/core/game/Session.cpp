@@ -69,6 +69,16 @@ void Session::CalculateScores() {
   }
 }
 
+::Game Session::ScoredCopy() {
+  ::Game copy = game_;
+  Board players([] {});
+  Board teams([] {});
+  const SilencedBoxes silence(unlockingBoxes_);
+  const CalculationReads reads(*dbMembers_, *dbScenarios_, unlockingBoxes_);
+  ScoreAnalysis(copy, factors_, *missions_, *members_, players, teams).CalculateScores();
+  return copy;
+}
+
 void Session::CalculateScoresWhenPresent() {
   if (game_.DataPresent && analysis_) {
     CalculateScores();
@@ -76,6 +86,9 @@ void Session::CalculateScoresWhenPresent() {
 }
 
 void Session::ClearPlayerData() {
+  if (BeforeClear) {
+    BeforeClear();
+  }
   players_.Clear();
   teams_.Clear();
   game_.Clear();

@@ -64,6 +64,9 @@ class Session {
   Session(const Session&) = delete;
   Session& operator=(const Session&) = delete;
 
+  /// Called before the game is cleared.
+  std::function<void()> BeforeClear;
+
   /// Calls `listener` after each change, until the returned handle ends.
   Subscription Listen(std::function<void(SessionChange)> listener);
 
@@ -91,6 +94,9 @@ class Session {
   void CalculateScores();
   /// Does the same, but only if there is a game and the databases are open.
   void CalculateScoresWhenPresent();
+  /// A copy of the game with its scores calculated; the board stays as it is, and no box is shown about a
+  /// mission or a member that is gone. Throws as CalculateScores does.
+  ::Game ScoredCopy();
   void ClearPlayerData();
   /// Sorts the players as a click on column header `header` (counted from 1) does.
   void SortByHeader(int header);

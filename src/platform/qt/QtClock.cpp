@@ -60,3 +60,16 @@ std::string LongDateText(const QLocale& locale, const QString& text) {
   }
   return text.toStdString();
 }
+
+std::string StampText(const QLocale& locale, const QString& text) {
+  const QString trimmed = text.trimmed();
+  for (auto end = trimmed.size(); end > 0; end = trimmed.lastIndexOf(u' ', end - 1)) {
+    const QDate date = DateIn(locale, trimmed.left(end));
+    const QString rest = trimmed.mid(end).trimmed();
+    const QTime time = rest.isEmpty() ? QTime(0, 0) : locale.toTime(rest, QLocale::ShortFormat);
+    if (date.isValid() && time.isValid()) {
+      return QDateTime(date, time).toString(QStringLiteral("yyyy-MM-dd HH:mm:ss")).toStdString();
+    }
+  }
+  return {};
+}

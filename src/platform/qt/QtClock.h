@@ -21,6 +21,10 @@ QDate DateIn(const QLocale& locale, const QString& text);
 /// are parsed as by DateIn.
 std::string LongDateText(const QLocale& locale, const QString& text);
 
+/// The date and the time of day that `text` consists of, as "YYYY-MM-DD HH:MM:SS"; midnight for a date alone.
+/// Empty if `text` is anything else. Dates are parsed as by DateIn, times in the short format of `locale`.
+std::string StampText(const QLocale& locale, const QString& text);
+
 class QtClock : public Clock {
  public:
   std::string ShortDate() const override { return ShortDateText(QLocale::system(), QDate::currentDate()); }
@@ -30,5 +34,8 @@ class QtClock : public Clock {
   }
   std::string LongDate(const std::string& text) const override {
     return LongDateText(QLocale::system(), QString::fromStdString(text));
+  }
+  std::string Stamp(const std::string& text) const override {
+    return StampText(QLocale::system(), QString::fromStdString(text));
   }
 };

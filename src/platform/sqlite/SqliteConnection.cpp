@@ -282,7 +282,8 @@ bool SqliteConnection::HoldsWhatWasWritten(int commitResult) {
     // SQLite takes a journal that it cannot see for one that is not there, and then reads rows that the next
     // one who sees it takes back.
     struct stat info {};
-    if (stat(sqlite3_filename_journal(sqlite3_db_filename(handle_, "main")), &info) != 0 && errno == ENOENT) {
+    if (written_.AreAllTold() &&
+        stat(sqlite3_filename_journal(sqlite3_db_filename(handle_, "main")), &info) != 0 && errno == ENOENT) {
       return true;
     }
   } catch (...) {  // the file cannot be asked now

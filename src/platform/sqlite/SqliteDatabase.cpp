@@ -58,6 +58,19 @@ std::unique_ptr<Recordset> SqliteDatabase::OpenRecordset(const std::string& sour
   return std::make_unique<SqliteRecordset>(connection_, table, std::string(rest));
 }
 
+void SqliteDatabase::RaiseCounter(const std::string& table, std::int64_t number) {
+  // The counter has no row before the table's first one.
+  const std::string highest = "SELECT max(seq) FROM sqlite_sequence WHERE name = $1";
+  if (WholeNumber(statements_, highest, {table}) >= number) {
+    return;
+  }
+  WriteTransaction transaction(connection_);
+  if (statements_.Change("UPDATE sqlite_sequence SET seq = $1 WHERE name = $2", {number, table}) == 0) {
+    statements_.Change("INSERT INTO sqlite_sequence (name, seq) VALUES ($1, $2)", {table, number});
+  }
+  transaction.Commit();
+}
+
 void SqliteDatabase::CommitTrans() {
   if (!group_) {
     throw RuntimeError(Fault::NoTransaction);

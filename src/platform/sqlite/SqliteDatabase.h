@@ -8,6 +8,7 @@
 
 #include "platform/Database.h"
 #include "platform/sqlite/SqliteConnection.h"
+#include "platform/sqlite/SqliteSql.h"
 
 /// A database in an SQLite file. Its tables must have rowids, which are the keys of a dynaset.
 class SqliteDatabase : public Database {
@@ -16,6 +17,8 @@ class SqliteDatabase : public Database {
       : connection_(path, busyTimeout) {}
 
   std::unique_ptr<Recordset> OpenRecordset(const std::string& source) override;
+  Sql& Statements() override { return statements_; }
+  void RaiseCounter(const std::string& table, std::int64_t number) override;
   void BeginRead() override { connection_.BeginRead(); }
   void EndRead() noexcept override { connection_.EndRead(); }
   void BeginTrans() override { group_.emplace(connection_); }
@@ -27,6 +30,7 @@ class SqliteDatabase : public Database {
  private:
   SqliteConnection connection_;
   std::optional<WriteTransaction> group_;
+  SqliteSql statements_{connection_};
 };
 
 class SqliteEngine : public DatabaseEngine {

@@ -58,6 +58,27 @@ void SqliteStatement::Bind(int parameter, const Value& value) {
   }
 }
 
+int SqliteStatement::ParameterCount() const {
+  return sqlite3_bind_parameter_count(statement_);
+}
+
+const char* SqliteStatement::ParameterName(int parameter) const {
+  return sqlite3_bind_parameter_name(statement_, parameter);
+}
+
+void SqliteStatement::ForgetValues() {
+  Reset();
+  sqlite3_clear_bindings(statement_);
+}
+
+bool SqliteStatement::ReadsOnly() const {
+  return sqlite3_stmt_readonly(statement_) != 0;
+}
+
+std::size_t SqliteStatement::ColumnCount() const {
+  return static_cast<std::size_t>(sqlite3_column_count(statement_));
+}
+
 bool SqliteStatement::Step() {
   const int result = sqlite3_step(statement_);
   if (result == SQLITE_ROW) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
 
@@ -26,6 +27,16 @@ class SqliteStatement {
   /// Parameters count from 1. A text or blob must outlive the statement's run.
   void Bind(int parameter, const Value& value);
   void Bind(int parameter, std::int64_t value);
+
+  /// Parameters count from 1; one that only has a number has no name: nullptr.
+  int ParameterCount() const;
+  const char* ParameterName(int parameter) const;
+  /// Values that were bound are no longer needed.
+  void ForgetValues();
+
+  /// True if the statement cannot change the file.
+  bool ReadsOnly() const;
+  std::size_t ColumnCount() const;
 
   /// Moves to the next row; false at the end. On failure resets the statement and throws RuntimeError.
   bool Step();

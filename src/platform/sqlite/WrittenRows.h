@@ -12,12 +12,20 @@ class SqliteConnection;
 /// What a transaction has written, so that the file can be asked whether it holds it.
 class WrittenRows {
  public:
-  void Clear() { rows_.clear(); }
+  void Clear() {
+    rows_.clear();
+    allTold_ = true;
+  }
 
   /// The row `key` of `table` is there now, and holds what later calls of Set tell.
   void Write(const std::string& table, std::int64_t key);
   void Set(const std::string& table, std::int64_t key, const std::string& column, const Value& value);
   void Delete(const std::string& table, std::int64_t key);
+
+  /// Rows were written that cannot be told.
+  void WriteUntold() { allTold_ = false; }
+  /// False after WriteUntold: then AreIn says little.
+  bool AreAllTold() const { return allTold_; }
 
   /// True if the file holds every row as it was last written. Throws RuntimeError if it cannot be read.
   bool AreIn(SqliteConnection& connection) const;
@@ -32,4 +40,5 @@ class WrittenRows {
   static bool IsIn(SqliteConnection& connection, const Place& place, const Row& row);
 
   std::map<Place, Row> rows_;
+  bool allTold_ = true;
 };

@@ -16,6 +16,8 @@ using testing::IsEmpty;
 class NoDatabase : public Database {
  public:
   std::unique_ptr<Recordset> OpenRecordset(const std::string& /*source*/) override { return nullptr; }
+  Sql& Statements() override { throw RuntimeError(Fault::InternalError); }
+  void RaiseCounter(const std::string& /*table*/, std::int64_t /*number*/) override {}
   void BeginTrans() override {}
   void CommitTrans() override {}
   void Rollback() noexcept override {}

@@ -1,0 +1,145 @@
+#include "archive/Entries.h"
+
+#include <zlib.h>
+
+#include <algorithm>
+#include <array>
+#include <cstdio>
+#include <ctime>
+#include <new>
+#include <optional>
+
+namespace {
+
+constexpr std::string_view Suffix = ".game.xml";
+
+/// The parts of "YYYY-MM-DD HH:MM:SS".
+std::optional<std::tm> TimeOf(std::string_view text) {
+  constexpr std::string_view form = "dddd-dd-dd dd:dd:dd";
+  if (text.size() != form.size()) {
+    return std::nullopt;
+  }
+  for (std::size_t at = 0; at < form.size(); ++at) {
+    const bool isDigit = text[at] >= '0' && text[at] <= '9';
+    if (form[at] == 'd' ? !isDigit : text[at] != form[at]) {
+      return std::nullopt;
+    }
+  }
+  const auto number = [text](std::size_t at, std::size_t length) {
+    return std::stoi(std::string(text.substr(at, length)));
+  };
+  std::tm time{};
+  time.tm_year = number(0, 4) - 1900;
+  time.tm_mon = number(5, 2) - 1;
+  time.tm_mday = number(8, 2);
+  time.tm_hour = number(11, 2);
+  time.tm_min = number(14, 2);
+  time.tm_sec = number(17, 2);
+  time.tm_isdst = -1;
+  return time;
+}
+
+std::string WithZeros(std::int64_t number) {
+  std::array<char, 32> digits{};
+  std::snprintf(digits.data(), digits.size(), "%06lld", static_cast<long long>(number));
+  return digits.data();
+}
+
+/// Ends the stream with its scope.
+class InflateStream {
+ public:
+  explicit InflateStream(const Blob& data) {
+    // zlib reads only, but has no const.
+    stream_.next_in = const_cast<Bytef*>(data.data());
+    stream_.avail_in = static_cast<uInt>(data.size());
+    if (inflateInit(&stream_) != Z_OK) {
+      throw std::bad_alloc();
+    }
+  }
+  ~InflateStream() { inflateEnd(&stream_); }
+  InflateStream(const InflateStream&) = delete;
+  InflateStream& operator=(const InflateStream&) = delete;
+
+  /// Appends up to `most` further bytes to `bytes`. Returns false at the end of the stream or a fault in it.
+  bool Read(std::string& bytes, std::size_t most) {
+    const std::size_t start = bytes.size();
+    bytes.resize(start + most);
+    stream_.next_out = reinterpret_cast<Bytef*>(bytes.data() + start);
+    stream_.avail_out = static_cast<uInt>(most);
+    const int result = inflate(&stream_, Z_NO_FLUSH);
+    bytes.resize(bytes.size() - stream_.avail_out);
+    isAtEnd_ = result == Z_STREAM_END;
+    return result == Z_OK && bytes.size() > start;
+  }
+
+  /// True if the stream ended as it should, with nothing behind it.
+  bool IsWhole() const { return isAtEnd_ && stream_.avail_in == 0; }
+
+ private:
+  z_stream stream_{};
+  bool isAtEnd_ = false;
+};
+
+Unpacking Inflate(const Blob& data, std::size_t size, std::string& bytes) {
+  constexpr std::size_t step = std::size_t{1} << 16U;
+  InflateStream stream(data);
+  // One byte more than there may be, so that a stream which holds more is seen.
+  while (bytes.size() <= size && stream.Read(bytes, std::min(step, size + 1 - bytes.size()))) {
+  }
+  return stream.IsWhole() && bytes.size() == size ? Unpacking::Done : Unpacking::Damaged;
+}
+
+}  // namespace
+
+std::string EntryName(std::string_view played, std::int64_t gameId, std::int64_t state) {
+  const std::string further = state > 0 ? "-" + std::to_string(state) : std::string();
+  const std::string number = WithZeros(gameId).append(further).append(Suffix);
+  if (!TimeOf(played)) {
+    return "undated/" + number;
+  }
+  std::string name(played.substr(0, 10));
+  return name.append("/")
+      .append(played.substr(11, 2))
+      .append(played.substr(14, 2))
+      .append("-")
+      .append(number);
+}
+
+std::int64_t SecondsOf(const std::string& localTime) {
+  std::optional<std::tm> time = TimeOf(localTime);
+  return time ? std::max<std::int64_t>(std::mktime(&*time), 0) : 0;
+}
+
+Blob Packed(std::string_view bytes) {
+  Blob packed(compressBound(static_cast<uLong>(bytes.size())));
+  uLongf length = static_cast<uLongf>(packed.size());
+  const auto* source = reinterpret_cast<const Bytef*>(bytes.data());
+  const int result =
+      compress2(packed.data(), &length, source, static_cast<uLong>(bytes.size()), Z_DEFAULT_COMPRESSION);
+  if (result != Z_OK) {
+    throw std::bad_alloc();
+  }
+  packed.resize(length);
+  // Equal lengths would tell a reader that the bytes are not deflated.
+  return packed.size() < bytes.size() ? packed : Blob(bytes.begin(), bytes.end());
+}
+
+Unpacking Unpack(const Blob& data, std::int64_t size, std::string& bytes) {
+  bytes.clear();
+  if (size < 0) {
+    return Unpacking::Damaged;
+  }
+  const auto whole = static_cast<std::size_t>(size);
+  if (whole > LargestEntry || data.size() > LargestEntry) {
+    return Unpacking::TooLarge;
+  }
+  if (data.size() == whole) {
+    bytes.assign(data.begin(), data.end());
+    return Unpacking::Done;
+  }
+  const Unpacking result = Inflate(data, whole, bytes);
+  if (result != Unpacking::Done) {
+    bytes.clear();
+  }
+  return result;
+}

@@ -1,0 +1,33 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+#include "platform/Database.h"
+
+/// The entries of the archive, each a game file, as the sqlite3 tool reads and writes them.
+
+/// Largest game file that is unpacked, in bytes. The fullest game that a gun can bring about has 10 MB.
+inline constexpr std::size_t LargestEntry = std::size_t{32} << 20U;
+
+/// "2026-11-21/2015-000123.game.xml" for a game of the local time `played` ("YYYY-MM-DD HH:MM:SS"); with a
+/// `state` above 0 "2026-11-21/2015-000123-1.game.xml". A time of another form becomes "undated/000123".
+std::string EntryName(std::string_view played, std::int64_t gameId, std::int64_t state);
+
+/// Seconds since 1970 of a local time ("YYYY-MM-DD HH:MM:SS"); 0 for a text of another form.
+std::int64_t SecondsOf(const std::string& localTime);
+
+/// `bytes` as an entry holds them: deflated, or as they are where that is not shorter.
+Blob Packed(std::string_view bytes);
+
+enum class Unpacking {
+  Done,
+  Damaged,   ///< not what was packed
+  TooLarge,  ///< more than LargestEntry
+};
+
+/// The bytes of an entry that holds `data` and says that they are `size` bytes. `bytes` are empty unless
+/// Done. Takes no more memory than LargestEntry and some, whatever the entry holds or says.
+Unpacking Unpack(const Blob& data, std::int64_t size, std::string& bytes);

@@ -1,0 +1,252 @@
+#include "archive/GameArchive.h"
+
+#include "archive/Entries.h"
+#include "archive/GameInputs.h"
+#include "core/gamefile/GameFile.h"
+#include "core/text/Filled.h"
+#include "platform/RuntimeError.h"
+#include "platform/Sql.h"
+
+namespace {
+
+/// How the sqlite3 tool is to make the file: a plain one, which its owner writes and all read.
+constexpr std::int64_t FileMode = 0100644;
+
+constexpr std::size_t BytesInMegabyte = std::size_t{1} << 20U;
+
+}  // namespace
+
+std::int64_t GameArchive::Keep(const GameState& state) {
+  const PackedState packed = Pack(state);
+  const KnownMembers::Marks marks = known_.Read(MembersIn(state.Game));
+  WriteScope scope(archive_);
+  Sql& sql = archive_.Statements();
+  const std::int64_t gameId = InsertGame(sql, state, packed.Hash);
+  WritePlayers(sql, gameId, state.Game);
+  WriteFile({gameId, 0, EntryName(state.Played, gameId, 0)}, packed, state.Played);
+  known_.Note(marks);
+  scope.Commit();
+  return gameId;
+}
+
+bool GameArchive::KeepAgain(std::int64_t gameId, const GameState& state, FormerState former) {
+  const PackedState packed = Pack(state);
+  const KnownMembers::Marks marks = known_.Read(MembersIn(state.Game));
+  WriteScope scope(archive_);
+  Sql& sql = archive_.Statements();
+  std::string played;
+  std::string formerHash;
+  sql.Query("SELECT Played, InputsHash FROM Games WHERE GameID = $1", {gameId}, [&](const SqlRow& row) {
+    played = row.Text(0);
+    formerHash = row.Text(1);
+  });
+  if (!UpdateGame(sql, gameId, state, packed.Hash)) {
+    return false;
+  }
+  if (former == FormerState::KeptToo && formerHash != packed.Hash) {
+    SetFormerFileAside(gameId, played);
+  }
+  WritePlayers(sql, gameId, state.Game);
+  WriteFile({gameId, 0, EntryName(played, gameId, 0)}, packed, played);
+  known_.Note(marks);
+  scope.Commit();
+  return true;
+}
+
+std::optional<std::int64_t> GameArchive::Find(const Game& game, const std::string& missionName) {
+  const std::string inputs = GameInputs(game, missionName);
+  const std::vector<StoredFile> candidates =
+      FilesWhere("GameFiles.InputsHash = $1 AND Games.Deleted IS NULL", {GameInputsHash(inputs)});
+  for (const StoredFile& file : candidates) {
+    if (HoldsInputs(file, inputs)) {
+      return file.GameId;
+    }
+  }
+  return std::nullopt;
+}
+
+std::string GameArchive::FileOf(std::int64_t gameId, std::int64_t state) {
+  const std::vector<StoredFile> files =
+      FilesWhere("GameFiles.GameID = $1 AND GameFiles.State = $2", {gameId, state});
+  if (files.empty()) {
+    throw RuntimeError(Fault::FileNotFound,
+                       Filled(strings_.Text(OwnText::NoArchivedGame), {std::to_string(gameId)}));
+  }
+  return ReadFile(files.front().Name);
+}
+
+std::int64_t GameArchive::EarlierStates(std::int64_t gameId) {
+  return WholeNumber(archive_.Statements(), "SELECT max(State) FROM GameFiles WHERE GameID = $1", {gameId});
+}
+
+std::vector<CutMember> GameArchive::CheckMembers() {
+  std::vector<CutMember> cut;
+  for (const std::int32_t number : known_.FindStrangers()) {
+    cut.push_back({number, CutFromGames(number)});
+  }
+  known_.RaiseCounter();
+  return cut;
+}
+
+GameArchive::PackedState GameArchive::Pack(const GameState& state) const {
+  const std::string bytes = WriteGameFile(state.Game, state.Mission);
+  if (bytes.size() > LargestEntry) {
+    throw TooLarge(EntryName(state.Played, 0, 0));
+  }
+  return {Packed(bytes), static_cast<std::int64_t>(bytes.size()),
+          GameInputsHash(GameInputs(state.Game, state.Mission))};
+}
+
+void GameArchive::WriteFile(const StoredFile& file, const PackedState& packed, const std::string& played) {
+  Sql& sql = archive_.Statements();
+  sql.Change(
+      "INSERT INTO sqlar (name, mode, mtime, sz, data) VALUES ($1, $2, $3, $4, $5) "
+      "ON CONFLICT (name) DO UPDATE SET mtime = $3, sz = $4, data = $5",
+      {file.Name, FileMode, SecondsOf(played), packed.Size, packed.Data});
+  sql.Change(
+      "INSERT INTO GameFiles (GameID, State, Name, InputsHash) VALUES ($1, $2, $3, $4) "
+      "ON CONFLICT (GameID, State) DO UPDATE SET Name = $3, InputsHash = $4",
+      {file.GameId, file.State, file.Name, packed.Hash});
+}
+
+void GameArchive::SetFormerFileAside(std::int64_t gameId, const std::string& played) {
+  Sql& sql = archive_.Statements();
+  const std::int64_t state = EarlierStates(gameId) + 1;
+  const std::string name = EntryName(played, gameId, state);
+  sql.Change("UPDATE sqlar SET name = $1 WHERE name = $2", {name, EntryName(played, gameId, 0)});
+  sql.Change("UPDATE GameFiles SET State = $1, Name = $2 WHERE GameID = $3 AND State = 0",
+             {state, name, gameId});
+}
+
+std::vector<GameArchive::StoredFile> GameArchive::FilesWhere(const std::string& condition,
+                                                             const SqlValues& values) {
+  std::vector<StoredFile> files;
+  archive_.Statements().Query(
+      "SELECT GameFiles.GameID, GameFiles.State, GameFiles.Name FROM GameFiles JOIN Games "
+      "ON Games.GameID = GameFiles.GameID WHERE " +
+          condition + " ORDER BY GameFiles.GameID, GameFiles.State",
+      values, [&files](const SqlRow& row) {
+        files.push_back({row.Integer(0), row.Integer(1), row.Text(2)});
+      });
+  return files;
+}
+
+std::string GameArchive::ReadFile(const std::string& name) {
+  Blob data;
+  std::int64_t size = -1;
+  bool isTooLarge = false;
+  archive_.Statements().Query(
+      "SELECT sz, length(data) > $2, CASE WHEN length(data) > $2 THEN NULL ELSE data END FROM sqlar "
+      "WHERE name = $1",
+      {name, std::int64_t{LargestEntry}}, [&](const SqlRow& row) {
+        size = row.Integer(0);
+        isTooLarge = row.Integer(1) != 0;
+        data = row.Bytes(2);
+      });
+  if (isTooLarge) {
+    throw TooLarge(name);
+  }
+  std::string bytes;
+  switch (Unpack(data, size, bytes)) {
+    case Unpacking::Done:
+      return bytes;
+    case Unpacking::TooLarge:
+      throw TooLarge(name);
+    case Unpacking::Damaged:
+      break;
+  }
+  throw Damaged(name);
+}
+
+std::string GameArchive::ReadGame(const std::string& name, Game& game) {
+  std::string mission;
+  bool isGame = false;
+  try {
+    isGame = ReadGameFile(ReadFile(name), game, [&mission](const std::string& text) { mission = text; });
+  } catch (const RuntimeError& error) {
+    switch (error.Number()) {
+      case Fault::TypeMismatch:
+      case Fault::Overflow:
+      case Fault::SubscriptOutOfRange:
+        break;  // what a game file with wrong contents gives
+      default:
+        throw;
+    }
+  }
+  if (!isGame) {
+    throw Damaged(name);
+  }
+  return mission;
+}
+
+bool GameArchive::HoldsInputs(const StoredFile& file, const std::string& inputs) {
+  Game game(strings_);
+  try {
+    const std::string mission = ReadGame(file.Name, game);
+    return GameInputs(game, mission) == inputs;
+  } catch (const RuntimeError& error) {
+    if (error.Number() != Fault::InvalidFileFormat) {
+      throw;
+    }
+    return false;  // it cannot be this game any more
+  }
+}
+
+int GameArchive::CutFromGames(std::int32_t number) {
+  WriteScope scope(archive_);
+  Sql& sql = archive_.Statements();
+  const Value member = std::int64_t{number};
+  const std::int64_t games =
+      WholeNumber(sql, "SELECT count(DISTINCT GameID) FROM GamePlayers WHERE MemberID = $1", {member});
+  // An earlier state may have had the member where the last one has not.
+  const std::vector<StoredFile> files = FilesWhere(
+      "GameFiles.State > 0 OR GameFiles.GameID IN (SELECT GameID FROM GamePlayers WHERE MemberID = $1)",
+      {member});
+  for (const StoredFile& file : files) {
+    CutFromFile(file, number);
+  }
+  sql.Change("UPDATE GamePlayers SET MemberID = 0 WHERE MemberID = $1", {member});
+  known_.Forget(number);
+  scope.Commit();
+  return static_cast<int>(games);
+}
+
+void GameArchive::CutFromFile(const StoredFile& file, std::int32_t number) {
+  Game game(strings_);
+  GameState state{.Game = game};
+  try {
+    state.Mission = ReadGame(file.Name, game);
+  } catch (const RuntimeError& error) {
+    if (error.Number() != Fault::InvalidFileFormat) {
+      throw;
+    }
+    return;  // nobody can read the number either
+  }
+  bool isIn = false;
+  for (Player& player : game.Players) {
+    if (player.MemberIndex == number) {
+      player.MemberIndex = 0;
+      isIn = true;
+    }
+  }
+  if (!isIn) {
+    return;
+  }
+  Sql& sql = archive_.Statements();
+  const PackedState packed = Pack(state);
+  sql.Query("SELECT Played FROM Games WHERE GameID = $1", {file.GameId},
+            [&state](const SqlRow& row) { state.Played = row.Text(0); });
+  WriteFile(file, packed, state.Played);
+  if (file.State == 0) {
+    sql.Change("UPDATE Games SET InputsHash = $1 WHERE GameID = $2", {packed.Hash, file.GameId});
+  }
+}
+
+RuntimeError GameArchive::Damaged(const std::string& name) const {
+  return {Fault::InvalidFileFormat, Filled(strings_.Text(OwnText::ArchivedGameDamaged), {name})};
+}
+
+RuntimeError GameArchive::TooLarge(const std::string& name) const {
+  return {Fault::InvalidFileFormat, Filled(strings_.Text(OwnText::ArchivedGameTooLarge),
+                                           {name, std::to_string(LargestEntry / BytesInMegabyte)})};
+}

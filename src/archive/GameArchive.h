@@ -1,0 +1,87 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "archive/GameRows.h"
+#include "archive/KnownMembers.h"
+#include "core/game/Game.h"
+#include "core/text/StringTable.h"
+#include "platform/Database.h"
+#include "platform/RuntimeError.h"
+#include "platform/Sql.h"
+
+/// Whether the state of a game that the archive has stays as a further file when a later one is kept.
+enum class FormerState { Replaced, KeptToo };
+
+/// All games that were played, each with its figures, its players and its file. A game is kept whole or not
+/// at all, and is durable once it is kept.
+///
+/// All operations throw RuntimeError as the databases do: 3026 disk full, 3027 read-only, 3050 locked, 3343
+/// damaged; 321 for a game file that cannot be packed or unpacked, in the operator's language.
+class GameArchive {
+ public:
+  /// All must outlive this object.
+  GameArchive(Database& archive, Database& members, const StringTable& strings)
+      : archive_(archive), known_(archive, members), strings_(strings) {}
+
+  /// Adds a game, and returns its number.
+  std::int64_t Keep(const GameState& state);
+
+  /// Keeps a later state of a game. What is then its figures and its file is this one; time and source stay.
+  /// A former state with equal inputs is never kept too. Returns false, with nothing changed, if the archive
+  /// no longer has the game.
+  bool KeepAgain(std::int64_t gameId, const GameState& state, FormerState former);
+
+  /// The number of the game that has, or once had, the same inputs as this one; none if there is no such
+  /// game. Deleted games do not count.
+  std::optional<std::int64_t> Find(const Game& game, const std::string& missionName);
+
+  /// The bytes of the game's file. An earlier state counts from 1, the first; 0 is the last state. Throws
+  /// RuntimeError 53 if there is no such file.
+  std::string FileOf(std::int64_t gameId, std::int64_t state = 0);
+
+  /// How many earlier states of the game have files.
+  std::int64_t EarlierStates(std::int64_t gameId);
+
+  /// Cuts the numbers of members that belong to somebody else now from all games and their files, and has the
+  /// member table give out numbers above all that the archive knows. To be called at start, and whenever the
+  /// member table has become another one.
+  std::vector<CutMember> CheckMembers();
+
+  KnownMembers& Known() { return known_; }
+
+ private:
+  struct StoredFile {
+    std::int64_t GameId;
+    std::int64_t State;
+    std::string Name;
+  };
+
+  /// A state as the archive stores it.
+  struct PackedState {
+    Blob Data;
+    std::int64_t Size;  ///< of the bytes in it
+    std::string Hash;
+  };
+
+  PackedState Pack(const GameState& state) const;
+  void WriteFile(const StoredFile& file, const PackedState& packed, const std::string& played);
+  /// Makes an earlier state of the last one; it has no last state then.
+  void SetFormerFileAside(std::int64_t gameId, const std::string& played);
+  std::vector<StoredFile> FilesWhere(const std::string& condition, const SqlValues& values);
+  std::string ReadFile(const std::string& name);
+  /// Returns the name of the mission.
+  std::string ReadGame(const std::string& name, Game& game);
+  bool HoldsInputs(const StoredFile& file, const std::string& inputs);
+  int CutFromGames(std::int32_t number);
+  void CutFromFile(const StoredFile& file, std::int32_t number);
+  RuntimeError Damaged(const std::string& name) const;
+  RuntimeError TooLarge(const std::string& name) const;
+
+  Database& archive_;
+  KnownMembers known_;
+  const StringTable& strings_;
+};

@@ -1,0 +1,110 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "archive/ArchiveFile.h"
+#include "archive/GameArchive.h"
+#include "core/game/GameProgress.h"
+#include "core/game/Session.h"
+#include "platform/Clock.h"
+#include "platform/Files.h"
+
+/// What the operator is told about the keeping of games.
+struct KeptState {
+  std::string KeptAt;   ///< time of day at which the game on the board was last kept; empty if it is not kept
+  std::string Failure;  ///< why it is not kept as it is now; empty if nothing failed
+  std::string
+      Unusable;      ///< archive file that could not be used, so that another one was begun; empty if none
+  int CutGames = 0;  ///< past games that no longer name a member whose number is somebody else's now
+
+  bool operator==(const KeptState&) const = default;
+};
+
+/// Keeps the game on the board in the archive, without being asked and without asking. A failure stops
+/// nothing: it is told, and the next call tries again.
+class GameKeeper {
+ public:
+  struct Parts {
+    ::Session& Session;
+    const GameProgress& Progress;
+    const Clock& Time;
+    Files& Disk;
+    DatabaseEngine& Engine;  ///< should not wait long for a locked file
+    const StringTable& Strings;
+    std::string UserDataFolder;
+    std::string ProgramFolder;
+  };
+
+  /// Game files, logs and copies come first: the archive writes only while so many bytes stay free.
+  static constexpr std::uint64_t LeastFreeSpace = std::uint64_t{32} << 20U;
+
+  /// The session must be open. All parts must outlive this object.
+  explicit GameKeeper(Parts parts);
+  ~GameKeeper();
+  GameKeeper(const GameKeeper&) = delete;
+  GameKeeper& operator=(const GameKeeper&) = delete;
+
+  /// Guns are about to be read into the board. What is kept of the game by then stays as a further file of
+  /// it.
+  void BeginPull(GameSource source);
+
+  /// Keeps the game on the board if it is not kept as it is: if it has other inputs than what was kept or,
+  /// where it was pulled, other figures. The archive's file is made when it is needed first.
+  void Keep();
+
+  /// Cuts the numbers of members that belong to somebody else now from all past games. To be called at start,
+  /// and when the members have been replaced as a whole. Does nothing without an archive.
+  void CheckMembers();
+
+  /// Notes what now tells the known members apart. To be called after the operator may have changed members.
+  void NoteMembers();
+
+  /// The archive's file is about to be closed: from now on nothing is kept any more.
+  void End();
+
+  const KeptState& State() const { return state_; }
+
+ private:
+  using RawDigests = std::array<std::uint64_t, PlayerCount>;
+
+  /// What tells one state of the game from the next.
+  struct Marks {
+    std::uint64_t Inputs = 0;
+    std::uint64_t Figures = 0;
+    RawDigests Raw{};  ///< of each active player's figures as the gun gave them; 0 for the others
+  };
+
+  void Hear(SessionChange change);
+  void Forget();
+  void KeepAs(const Game& game);
+  Marks MarksOf(const Game& game) const;
+  bool IsKept(const Marks& now) const;
+  void Write(const Game& game, const Marks& now);
+  FormerState FormerOf(const Marks& now) const;
+  GameState StateOf(const Game& game) const;
+  /// Local time at which the game was played, "YYYY-MM-DD HH:MM:SS".
+  std::string Played() const;
+  GameArchive Archive();
+  bool ArchiveExists() const;
+  void OpenFile();
+  /// Runs `action` and keeps what it throws as the failure to tell.
+  template <typename Action>
+  void Try(const Action& action);
+
+  const Parts parts_;
+  ArchiveFile file_;
+  KeptState state_;
+  std::optional<std::int64_t> gameId_;  ///< of the game on the board, once it is kept
+  std::optional<Marks> kept_;
+  GameSource source_ = GameSource::Cable;
+  int pulls_ = 0;
+  bool pullBegun_ = false;      ///< and nothing of it is kept yet
+  bool scoresPending_ = false;  ///< guns may have been read since the last calculation
+  bool keeping_ = false;
+  bool ended_ = false;
+  Subscription subscription_;
+};

@@ -1,0 +1,108 @@
+#include "archive/GameRows.h"
+
+#include <algorithm>
+#include <set>
+
+#include "core/game/Standings.h"
+
+namespace {
+
+std::string NameOf(GameSource source) {
+  switch (source) {
+    case GameSource::Cable:
+      return "cable";
+    case GameSource::Radio:
+      return "radio";
+    case GameSource::File:
+      return "file";
+    case GameSource::Import:
+      return "import";
+  }
+  return {};
+}
+
+/// The standings without names, which the archive does not keep.
+std::vector<Standing> StandingsOf(const Game& game) {
+  return Standings(game, [](std::int32_t) { return std::string(); });
+}
+
+std::int64_t CountPlayers(const Game& game, bool Player::*flag) {
+  return std::ranges::count_if(game.Players,
+                               [flag](const Player& player) { return player.Active && player.*flag; });
+}
+
+/// The values of $1 to $15, which both statements on a game's row share.
+SqlValues SummaryOf(const GameState& state, const std::string& inputsHash) {
+  const Game& game = state.Game;
+  const std::vector<Standing> standings = StandingsOf(game);
+  const auto whole = [](std::int64_t number) { return number; };
+  return {game.GameDate,
+          state.Mission,
+          whole(state.Pulls),
+          CountPlayers(game, &Player::Active),
+          CountPlayers(game, &Player::Committed),
+          whole(game.TeamTotals(1)),
+          whole(game.TeamTotals(2)),
+          whole(game.TeamTotals(3)),
+          whole(standings.empty() ? 0 : standings.front().Index),
+          state.Factors.Damage,
+          state.Factors.Death,
+          state.Factors.Heal,
+          state.Factors.Ammo,
+          state.Factors.Accuracy,
+          state.Factors.FriendlyFire,
+          inputsHash};
+}
+
+}  // namespace
+
+std::int64_t InsertGame(Sql& sql, const GameState& state, const std::string& inputsHash) {
+  SqlValues values = SummaryOf(state, inputsHash);
+  values.emplace_back(state.Played);
+  values.emplace_back(NameOf(state.Source));
+  return sql.Insert(
+      "INSERT INTO Games (DateText, Mission, Pulls, Players, Committed, RedTotal, BlueTotal, YellowTotal, "
+      "BestPlayer, DamageFactor, DeathFactor, HealFactor, AmmoFactor, AccuracyFactor, FriendlyFireFactor, "
+      "InputsHash, Played, Source) VALUES "
+      "($1, $2, $3, $4, $5, $6, $7, $8, $9, $10, $11, $12, $13, $14, $15, $16, $17, $18) RETURNING GameID",
+      values);
+}
+
+bool UpdateGame(Sql& sql, std::int64_t gameId, const GameState& state, const std::string& inputsHash) {
+  SqlValues values = SummaryOf(state, inputsHash);
+  values.emplace_back(gameId);
+  return sql.Change(
+             "UPDATE Games SET DateText = $1, Mission = $2, Pulls = $3, Players = $4, Committed = $5, "
+             "RedTotal = $6, BlueTotal = $7, YellowTotal = $8, BestPlayer = $9, DamageFactor = $10, "
+             "DeathFactor = $11, HealFactor = $12, AmmoFactor = $13, AccuracyFactor = $14, "
+             "FriendlyFireFactor = $15, InputsHash = $16 WHERE GameID = $17",
+             values) != 0;
+}
+
+void WritePlayers(Sql& sql, std::int64_t gameId, const Game& game) {
+  sql.Change("DELETE FROM GamePlayers WHERE GameID = $1", {gameId});
+  std::vector<Standing> standings = StandingsOf(game);
+  std::ranges::sort(standings, {}, &Standing::Index);  // the order of the rows in the file
+  for (const Standing& standing : standings) {
+    const Player& player = game.Players(standing.Index);
+    const auto whole = [](std::int64_t number) { return Value(number); };
+    sql.Change(
+        "INSERT INTO GamePlayers (GameID, PlayerIndex, MemberID, DallasID, Place, Soldiering, Accuracy, "
+        "DamageDealt, DamageTaken, Shots, Wia, Kia, AmmoAdds, Committed) VALUES "
+        "($1, $2, $3, $4, $5, $6, $7, $8, $9, $10, $11, $12, $13, $14)",
+        {gameId, whole(standing.Index), whole(player.MemberIndex), player.DallasID, whole(standing.Place),
+         whole(standing.Soldiering), standing.Accuracy ? Value(double{*standing.Accuracy}) : Value(),
+         whole(standing.DamageDealt), whole(standing.DamageTaken), whole(standing.Shots), whole(standing.Wia),
+         whole(standing.Kia), whole(standing.AmmoAdds), whole(player.Committed ? 1 : 0)});
+  }
+}
+
+std::vector<std::int32_t> MembersIn(const Game& game) {
+  std::set<std::int32_t> numbers;
+  for (const Player& player : game.Players) {
+    if (player.Active && player.MemberIndex != 0) {
+      numbers.insert(player.MemberIndex);
+    }
+  }
+  return {numbers.begin(), numbers.end()};
+}

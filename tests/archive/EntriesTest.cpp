@@ -1,0 +1,112 @@
+#include "archive/Entries.h"
+
+#include <gtest/gtest.h>
+#include <zlib.h>
+
+#include "core/gamefile/GameFile.h"
+
+namespace {
+
+std::string UnpackedOr(const Blob& data, std::int64_t size, Unpacking expected) {
+  std::string bytes = "left over";
+  EXPECT_EQ(Unpack(data, size, bytes), expected);
+  return bytes;
+}
+
+/// `bytes` deflated by the library in one go.
+Blob Deflated(const std::string& bytes) {
+  Blob data(compressBound(bytes.size()));
+  uLongf length = data.size();
+  EXPECT_EQ(compress(data.data(), &length, reinterpret_cast<const Bytef*>(bytes.data()), bytes.size()), Z_OK);
+  data.resize(length);
+  return data;
+}
+
+TEST(EntryNames, TellDayTimeAndNumber) {
+  EXPECT_EQ(EntryName("2026-11-21 20:15:59", 123, 0), "2026-11-21/2015-000123.game.xml");
+  EXPECT_EQ(EntryName("2026-11-21 20:15:59", 123, 2), "2026-11-21/2015-000123-2.game.xml");
+  EXPECT_EQ(EntryName("2026-01-02 00:00:00", 1234567, 0), "2026-01-02/0000-1234567.game.xml");
+}
+
+TEST(EntryNames, LeadNowhereElseWhateverTheTimeSays) {
+  for (const char* played :
+       {"", "N/A", "2026-11-21", "../../../etc 20:15", "../../etc/x 20:15:5", "21.11.2026 20:15:30"}) {
+    EXPECT_EQ(EntryName(played, 7, 0), "undated/000007.game.xml") << played;
+  }
+}
+
+TEST(EntryTimes, AreSecondsOfTheLocalTime) {
+  EXPECT_EQ(SecondsOf("2026-11-21 20:15:31") - SecondsOf("2026-11-21 20:15:00"), 31);
+  EXPECT_EQ(SecondsOf("2026-11-22 20:15:00") - SecondsOf("2026-11-21 20:15:00"), 86400);
+  EXPECT_NEAR(static_cast<double>(SecondsOf("2001-09-09 01:46:40")), 1e9, 86400.0);
+  EXPECT_EQ(SecondsOf("N/A"), 0);
+  EXPECT_EQ(SecondsOf(""), 0);
+}
+
+TEST(Entries, ComeBackAsTheyWere) {
+  std::string noise;
+  for (unsigned i = 0, state = 1; i < 70000; ++i, state = state * 1664525U + 1013904223U) {
+    noise += static_cast<char>(state >> 24U);
+  }
+  for (const std::string& bytes :
+       {std::string(), std::string("x"), std::string("<GameData/>"), std::string(200000, 'a'), noise}) {
+    const Blob packed = Packed(bytes);
+    EXPECT_LE(packed.size(), bytes.size());
+    EXPECT_EQ(UnpackedOr(packed, static_cast<std::int64_t>(bytes.size()), Unpacking::Done), bytes);
+  }
+  EXPECT_LT(Packed(std::string(200000, 'a')).size(), 1000U);
+}
+
+TEST(Entries, ThatClaimAnotherSizeAreDamaged) {
+  const std::string bytes(5000, 'a');
+  const Blob packed = Packed(bytes);
+  for (const std::int64_t size :
+       {std::int64_t{-1}, std::int64_t{0}, std::int64_t{4999}, std::int64_t{5001}}) {
+    EXPECT_EQ(UnpackedOr(packed, size, Unpacking::Damaged), "") << size;
+  }
+}
+
+TEST(Entries, WithAnythingButAWholeStreamAreDamaged) {
+  const std::string bytes = "some text and some more of the same text and some more";
+  const Blob packed = Deflated(bytes);
+  const auto size = static_cast<std::int64_t>(bytes.size());
+  ASSERT_LT(packed.size(), bytes.size());
+  for (std::size_t length = 0; length < packed.size(); ++length) {
+    UnpackedOr(Blob(packed.begin(), packed.begin() + static_cast<std::ptrdiff_t>(length)), size,
+               Unpacking::Damaged);
+  }
+  for (std::size_t at = 0; at < packed.size(); ++at) {
+    Blob broken = packed;
+    broken[at] ^= 0x10U;
+    std::string read;
+    EXPECT_TRUE(Unpack(broken, size, read) == Unpacking::Damaged || read == bytes) << at;
+  }
+  Blob longer = packed;
+  longer.push_back(0);
+  UnpackedOr(longer, size, Unpacking::Damaged);
+}
+
+TEST(Entries, ThatSwellBeyondAllMeasureAreRefused) {
+  UnpackedOr(Blob(4096, 0), std::int64_t{1} << 30U, Unpacking::TooLarge);
+  UnpackedOr(Blob(10, 0), std::int64_t{LargestEntry} + 1, Unpacking::TooLarge);
+  const Blob bomb = Deflated(std::string(LargestEntry + 1, '\0'));
+  ASSERT_LT(bomb.size(), 100000U);
+  UnpackedOr(bomb, std::int64_t{LargestEntry} + 1, Unpacking::TooLarge);
+  UnpackedOr(bomb, 1000, Unpacking::Damaged);
+  UnpackedOr(bomb, std::int64_t{LargestEntry}, Unpacking::Damaged);
+}
+
+TEST(Entries, HaveRoomForTheFullestGame) {
+  const StringTable strings(Language::English);
+  Game game(strings);
+  for (Player& player : game.Players) {
+    player.Active = true;
+    player.ShotCount = player.TotalDamage = player.Soldiering = player.RunCounter = -2147483647;
+    for (std::int32_t& hit : player.HitByPlayer) {
+      hit = 2147483647;
+    }
+  }
+  EXPECT_LT(WriteGameFile(game, std::string(10000, '<')).size(), LargestEntry / 4);
+}
+
+}  // namespace
