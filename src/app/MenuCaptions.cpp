@@ -34,6 +34,7 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuMissions->menuAction(), 211},
       {ui.mnuMissionResults, 212},
       {ui.mnuSetupMissions, 213},
+      {ui.mnuBackupCopies, static_cast<int>(OwnText::BackupCopiesItem)},
       {ui.mnuSettings->menuAction(), 214},
       {ui.mnuCommPort, 215},
       {ui.mnuSoldieringCalc, 216},

@@ -195,6 +195,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuBoxConfig, &frmRx::ConfigureBoxes},
                                {ui_->mnuChargeiButton, &frmRx::ChargeButtons},
                                {ui_->mnuSoundRecorder, &frmRx::RecordSounds},
+                               {ui_->mnuBackupCopies, &frmRx::ShowBackupCopies},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
   // menu.

@@ -68,6 +68,8 @@ class frmRx : public QMainWindow {
   void ReadGame();
   /// Loads a file that was dropped on the window, unless the operator wants to keep an unsaved game.
   void LoadDropped(const std::string& path);
+  /// What runs below the present command, if anything.
+  std::optional<OwnText> RunningBesidesThis() const;
   /// True while a command, a box or another window of the program waits for the operator.
   bool IsBusy() const;
   void SaveGame();
@@ -95,6 +97,7 @@ class frmRx : public QMainWindow {
   void ConfigureBoxes();
   void ChargeButtons();
   void RecordSounds();
+  void ShowBackupCopies();
 
   /// Makes the last of the selected rows the player of the context menu's commands. Returns false if none is
   /// selected.

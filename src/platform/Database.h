@@ -81,6 +81,10 @@ class Recordset {
   virtual void AppendChunk(std::string_view column, const Blob& bytes) = 0;
 };
 
+/// Asked now and then in the middle of a long operation; may process events, but must leave the database
+/// alone and must not throw. False stops the operation.
+using KeepOn = std::function<bool()>;
+
 /// One open database file.
 class Database {
  public:
@@ -120,6 +124,25 @@ class Database {
   /// Copies the file's contents to a new file at `path`, which is durable on return. Others can read and
   /// write meanwhile. A failure may leave a partial file. Throws RuntimeError 3xxx like a write.
   virtual void CopyTo(const std::string& path) = 0;
+
+  /// The same in steps. False if it was stopped. A change to the file by another program begins it anew.
+  virtual bool CopyInSteps(const std::string& path, const KeepOn& keepOn) = 0;
+
+  /// Looks through the whole file. False if it was stopped. Throws RuntimeError 3343 for a damaged file.
+  virtual bool CheckWhole(const KeepOn& keepOn) = 0;
+
+  /// Names of a table's columns, in its order. Throws RuntimeError 3078 if there is no such table.
+  virtual std::vector<std::string> ColumnNames(const std::string& table) = 0;
+
+  /// Path by which the file was opened, and that of the file itself, behind symbolic links.
+  virtual std::string Path() const = 0;
+  virtual std::string FilePath() const = 0;
+
+  /// Keeps all others from writing until ReleaseWriters, so that another file can be put in the place of this
+  /// one: no journal stands beside it meanwhile. Only reads by another Database object are allowed. Throws
+  /// RuntimeError 3xxx like a write. Use WritersHeld.
+  virtual void HoldWriters() = 0;
+  virtual void ReleaseWriters() noexcept = 0;
 };
 
 /// Makes many reads of a database cheap while it exists. It holds the lock, so other programs, and other
@@ -148,6 +171,18 @@ class WriteScope {
   WriteScope& operator=(const WriteScope&) = delete;
 
   void Commit() { database_.CommitTrans(); }
+
+ private:
+  Database& database_;
+};
+
+/// Keeps others from writing a database while it exists.
+class WritersHeld {
+ public:
+  explicit WritersHeld(Database& database) : database_(database) { database_.HoldWriters(); }
+  ~WritersHeld() { database_.ReleaseWriters(); }
+  WritersHeld(const WritersHeld&) = delete;
+  WritersHeld& operator=(const WritersHeld&) = delete;
 
  private:
   Database& database_;

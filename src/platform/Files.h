@@ -53,6 +53,12 @@ class Files {
   /// RuntimeError 53 if it does not exist, 61, 70, 75 or 76, with a text as that of Replace.
   virtual void Rename(const std::string& path, const std::string& newPath) = 0;
 
+  /// Puts the file at `path` in the place of `replaced`, a file on the same disk: it gets that one's
+  /// permissions and, where allowed, its owner. A failure or a crash leaves the old file. Durable on return.
+  /// Neither may be a symbolic link. Throws as Rename does, and RuntimeError 70 if the old file is
+  /// write-protected.
+  virtual void TakePlace(const std::string& path, const std::string& replaced) = 0;
+
   /// Deletes a file. Throws RuntimeError 53 if it does not exist, 70, 75 or 76.
   virtual void Delete(const std::string& path) = 0;
 };

@@ -9,9 +9,9 @@ namespace {
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-class BackupCopies : public testing::Test {
+class BackupCopiesOfARun : public testing::Test {
  protected:
-  BackupCopies() {
+  BackupCopiesOfARun() {
     venue.PutDefaultFiles();
     venue.ChangeDatabase("members.mdb",
                          "INSERT INTO Members (ContactID, FirstName, LastName) VALUES (4, 'Ada', 'Byron')");
@@ -28,13 +28,13 @@ class BackupCopies : public testing::Test {
   Venue venue;
 };
 
-TEST_F(BackupCopies, AreNotMadeByLooking) {
+TEST_F(BackupCopiesOfARun, AreNotMadeByLooking) {
   venue.LoadGame(GameFile(PlayerOf(1, "<MemberIndex>4</MemberIndex>")));
   venue.ActiveMission().setCurrentIndex(3);
   EXPECT_THAT(Copies(), IsEmpty());
 }
 
-TEST_F(BackupCopies, AreMadeOfTheDatabaseThatChanges) {
+TEST_F(BackupCopiesOfARun, AreMadeOfTheDatabaseThatChanges) {
   Commit();
   Commit();
   EXPECT_THAT(Copies(), ElementsAre("members-2013-05-21-143005.mdb"));
@@ -45,7 +45,7 @@ TEST_F(BackupCopies, AreMadeOfTheDatabaseThatChanges) {
             "2");
 }
 
-TEST_F(BackupCopies, AreMadeOnceARun) {
+TEST_F(BackupCopiesOfARun, AreMadeOnceARun) {
   Commit();
   venue.Window.reset();
   venue.Time.DateAndTime = "2013-05-22 14:30:05";
@@ -54,7 +54,7 @@ TEST_F(BackupCopies, AreMadeOnceARun) {
   EXPECT_THAT(Copies(), ElementsAre("members-2013-05-21-143005.mdb", "members-2013-05-22-143005.mdb"));
 }
 
-TEST_F(BackupCopies, AreMissedOnlyInAWordAfterTheCommand) {
+TEST_F(BackupCopiesOfARun, AreMissedOnlyInAWordAfterTheCommand) {
   WriteFile(venue.DataFile("backups"), "a file in place of the folder");
   Commit();
   ASSERT_EQ(venue.Boxes.Boxes.size(), 2U);

@@ -65,6 +65,7 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
       {"mnuChargeiButton", {"Charging buttons", "信息扣充值"}},
       {"mnuFirmwareUpdate", {"Firmware", "固件"}},
       {"mnuSoundRecorder", {"Sound recorder", "声音录制"}},
+      {"mnuBackupCopies", {"Backup copies", "备份副本"}},
       {"mnuCommPort", {"Settings", "设置"}},
       {"mnuSoldieringCalc", {"Soldiering calculation", "战功计算"}},
       {"mnuAbout", {"If you need help", "需要帮助时"}}};

@@ -165,6 +165,13 @@ class FakeFiles : public Files {
     contents_.erase(path);
   }
 
+  void TakePlace(const std::string& path, const std::string& replaced) override {
+    if (!FileExists(replaced)) {
+      throw RuntimeError(Fault::FileNotFound);
+    }
+    Rename(path, replaced);
+  }
+
   void Delete(const std::string& path) override {
     ThrowIfTold(deleteFailures_, path);
     if (contents_.erase(path) == 0) {

@@ -296,6 +296,28 @@ void LinuxFiles::Rename(const std::string& path, const std::string& newPath) {
   SyncRename(parent.empty() ? "." : parent, newPath);
 }
 
+void LinuxFiles::TakePlace(const std::string& path, const std::string& replaced) {
+  struct stat old {};
+  if (stat(replaced.c_str(), &old) != 0) {
+    throw errno == ENOENT ? RuntimeError(Fault::FileNotFound, "File not found: " + replaced)
+                          : FileError(errno, replaced);
+  }
+  if (faccessat(AT_FDCWD, replaced.c_str(), W_OK, AT_EACCESS) != 0) {
+    throw FileError(errno, replaced);
+  }
+  {
+    const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+    if (file.Number() < 0 || !TakeOver(file.Number(), old) || fsync(file.Number()) != 0) {
+      throw errno == ENOENT ? RuntimeError(Fault::FileNotFound, "File not found: " + path)
+                            : FileError(errno, path);
+    }
+  }
+  if (rename(path.c_str(), replaced.c_str()) != 0) {
+    throw FileError(errno, replaced);
+  }
+  SyncRename(std::filesystem::path(replaced).parent_path(), replaced);
+}
+
 void LinuxFiles::Delete(const std::string& path) {
   if (unlink(path.c_str()) != 0) {
     throw errno == ENOENT ? RuntimeError(Fault::FileNotFound, "File not found: " + path)

@@ -24,5 +24,6 @@ class LinuxFiles : public Files {
   std::uint64_t FreeSpace(const std::string& path) const override;
   std::vector<std::string> FileNames(const std::string& folder) const override;
   void Rename(const std::string& path, const std::string& newPath) override;
+  void TakePlace(const std::string& path, const std::string& replaced) override;
   void Delete(const std::string& path) override;
 };

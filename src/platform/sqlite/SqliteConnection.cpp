@@ -207,24 +207,28 @@ void SqliteConnection::PrepareChange() {
   }
 }
 
-void SqliteConnection::CopyTo(const std::string& path) {
-  sqlite3* copy = nullptr;
-  constexpr int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
-  int result = sqlite3_open_v2(path.c_str(), &copy, flags, nullptr);
-  const std::unique_ptr<sqlite3, decltype(&sqlite3_close)> closeAtEnd(copy, sqlite3_close);
-  if (result == SQLITE_OK) {
-    // A partial copy is of no use, so it needs no journal to be rolled back by.
-    sqlite3_exec(copy, "PRAGMA journal_mode = OFF", nullptr, nullptr, nullptr);
-    sqlite3_backup* backup = sqlite3_backup_init(copy, "main", handle_, "main");
-    if (backup == nullptr) {
-      throw SqliteError(copy, path);
-    }
-    sqlite3_backup_step(backup, -1);
-    result = sqlite3_backup_finish(backup);
+// A journal beside the file would be taken for the new file's by whoever opens that next. With the lock held
+// none can come: one that a crash left has been rolled back by then, and only an emptied one may be there.
+void SqliteConnection::HoldWriters() {
+  Rollback();
+  if (sqlite3_db_readonly(handle_, "main") == 1) {
+    throw RuntimeError(Fault::DatabaseReadOnly, "Cannot update. Database or object is read-only: " + path_);
   }
-  if (result != SQLITE_OK) {
-    throw SqliteError(copy, path);
+  Execute("PRAGMA journal_mode = DELETE");
+  Execute("BEGIN IMMEDIATE");
+  const char* const journal = sqlite3_filename_journal(sqlite3_db_filename(handle_, "main"));
+  if (unlink(journal) != 0 && errno != ENOENT) {
+    Undo();
+    throw RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path_);
   }
+  writing_ = true;
+  LeaveState();
+}
+
+void SqliteConnection::ReleaseWriters() noexcept {
+  writing_ = false;
+  Undo();
+  LeaveState();
 }
 
 void SqliteConnection::Execute(const char* sql) {

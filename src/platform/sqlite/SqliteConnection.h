@@ -49,9 +49,10 @@ class SqliteConnection {
   /// Releases the lock of a group of reads until its next read. Does nothing within a WriteTransaction.
   void Rollback() noexcept;
 
-  /// See Database::BeforeChange and CopyTo.
+  /// See Database::BeforeChange and HoldWriters.
   void BeforeChange(std::function<bool()> action) { beforeChange_ = std::move(action); }
-  void CopyTo(const std::string& path);
+  void HoldWriters();
+  void ReleaseWriters() noexcept;
 
   void Execute(const char* sql);
   std::int64_t LastInsertedKey() const;

@@ -1,5 +1,6 @@
 #include "platform/sqlite/SqliteDatabase.h"
 
+#include <sqlite3.h>
 #include <strings.h>
 
 #include <string_view>
@@ -77,6 +78,19 @@ void SqliteDatabase::CommitTrans() {
   }
   group_->Commit();
   group_.reset();
+}
+
+std::vector<std::string> SqliteDatabase::ColumnNames(const std::string& table) {
+  const SqliteTable described(connection_, table);
+  std::vector<std::string> names;
+  for (const SqliteColumn& column : described.Columns()) {
+    names.push_back(column.Name);
+  }
+  return names;
+}
+
+std::string SqliteDatabase::FilePath() const {
+  return sqlite3_db_filename(connection_.Handle(), "main");
 }
 
 std::unique_ptr<Database> SqliteEngine::OpenDatabase(const std::string& path) {

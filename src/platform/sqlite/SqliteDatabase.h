@@ -5,10 +5,12 @@
 #include <optional>
 #include <string>
 #include <utility>
+#include <vector>
 
 #include "platform/Database.h"
 #include "platform/sqlite/SqliteConnection.h"
 #include "platform/sqlite/SqliteSql.h"
+#include "platform/sqlite/WholeFile.h"
 
 /// A database in an SQLite file. Its tables must have rowids, which are the keys of a dynaset.
 class SqliteDatabase : public Database {
@@ -25,7 +27,16 @@ class SqliteDatabase : public Database {
   void CommitTrans() override;
   void Rollback() noexcept override { group_.reset(); }
   void BeforeChange(std::function<bool()> action) override { connection_.BeforeChange(std::move(action)); }
-  void CopyTo(const std::string& path) override { connection_.CopyTo(path); }
+  void CopyTo(const std::string& path) override { CopyWhole(connection_, path, nullptr); }
+  bool CopyInSteps(const std::string& path, const KeepOn& keepOn) override {
+    return CopyWhole(connection_, path, keepOn);
+  }
+  bool CheckWhole(const KeepOn& keepOn) override { return ::CheckWhole(connection_, keepOn); }
+  std::vector<std::string> ColumnNames(const std::string& table) override;
+  std::string Path() const override { return connection_.Path(); }
+  std::string FilePath() const override;
+  void HoldWriters() override { connection_.HoldWriters(); }
+  void ReleaseWriters() noexcept override { connection_.ReleaseWriters(); }
 
  private:
   SqliteConnection connection_;

@@ -23,6 +23,16 @@ class NoDatabase : public Database {
   void Rollback() noexcept override {}
   void BeforeChange(std::function<bool()> action) override { BeforeChangeOf = std::move(action); }
   void CopyTo(const std::string& path) override { CopiedTo = path; }
+  bool CopyInSteps(const std::string& path, const KeepOn& /*keepOn*/) override {
+    CopiedTo = path;
+    return true;
+  }
+  bool CheckWhole(const KeepOn& /*keepOn*/) override { return true; }
+  std::vector<std::string> ColumnNames(const std::string& /*table*/) override { return {}; }
+  std::string Path() const override { return {}; }
+  std::string FilePath() const override { return {}; }
+  void HoldWriters() override {}
+  void ReleaseWriters() noexcept override {}
 
   std::function<bool()> BeforeChangeOf;
   std::string CopiedTo;

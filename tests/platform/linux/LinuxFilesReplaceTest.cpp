@@ -204,4 +204,34 @@ TEST(LinuxFilesReplace, TakesAPathRelativeToTheWorkingFolder) {
   EXPECT_EQ(ReadFile(folder / "here"), "x");
 }
 
+TEST(TakePlace, PutsAFileInTheOthersPlaceWithItsPermissions) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "old", "old");
+  WriteFile(folder / "new", "new");
+  chmod((folder / "old").c_str(), 0640);
+  LinuxFiles().TakePlace(folder / "new", folder / "old");
+  EXPECT_EQ(ReadFile(folder / "old"), "new");
+  EXPECT_EQ(ModeOf(folder / "old"), 0640U);
+  EXPECT_EQ(EntriesOf(folder.Path()), 1U);
+}
+
+TEST(TakePlace, NeedsBothFiles) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "there");
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().TakePlace(folder / "gone", folder / "file"); }), 53);
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().TakePlace(folder / "file", folder / "gone"); }), 53);
+  EXPECT_EQ(ReadFile(folder / "file"), "there");
+}
+
+TEST(TakePlace, LeavesAWriteProtectedFileWhereItIs) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "old", "old");
+  WriteFile(folder / "new", "new");
+  chmod((folder / "old").c_str(), 0444);
+  const OrdinaryUser user;
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().TakePlace(folder / "new", folder / "old"); }), 70);
+  EXPECT_EQ(ReadFile(folder / "old"), "old");
+  EXPECT_EQ(ReadFile(folder / "new"), "new");
+}
+
 }  // namespace

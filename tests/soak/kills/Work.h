@@ -52,3 +52,4 @@ std::unique_ptr<Work> MakeGameFileWork(const WorkSources& sources);
 /// Null without the files of an old installation.
 std::unique_ptr<Work> MakeConversionWork(const WorkSources& sources);
 std::unique_ptr<Work> MakeSheetWork(const WorkSources& sources);
+std::unique_ptr<Work> MakeRestoreWork(const WorkSources& sources);

@@ -1,0 +1,90 @@
+#include "platform/sqlite/WholeFile.h"
+
+#include <sqlite3.h>
+
+#include <memory>
+
+#include "platform/RuntimeError.h"
+#include "platform/sqlite/SqliteConnection.h"
+#include "platform/sqlite/SqliteError.h"
+#include "platform/sqlite/SqliteStatement.h"
+
+namespace {
+
+constexpr int PagesOfAStep = 256;
+constexpr int InstructionsOfAStep = 20000;
+
+using Handle = std::unique_ptr<sqlite3, decltype(&sqlite3_close)>;
+
+/// Asks during a statement whether to keep on, as long as it exists.
+class StatementWatch {
+ public:
+  StatementWatch(sqlite3* database, const KeepOn& keepOn) : database_(database), keepOn_(keepOn) {
+    if (keepOn_) {
+      sqlite3_progress_handler(database_, InstructionsOfAStep, Ask, this);
+    }
+  }
+  ~StatementWatch() { sqlite3_progress_handler(database_, 0, nullptr, nullptr); }
+  StatementWatch(const StatementWatch&) = delete;
+  StatementWatch& operator=(const StatementWatch&) = delete;
+
+  bool Stopped() const { return stopped_; }
+
+ private:
+  static int Ask(void* watch) {
+    auto& self = *static_cast<StatementWatch*>(watch);
+    self.stopped_ = self.stopped_ || !self.keepOn_();
+    return self.stopped_ ? 1 : 0;
+  }
+
+  sqlite3* database_;
+  const KeepOn& keepOn_;
+  bool stopped_ = false;
+};
+
+}  // namespace
+
+bool CopyWhole(SqliteConnection& connection, const std::string& path, const KeepOn& keepOn) {
+  sqlite3* opened = nullptr;
+  constexpr int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
+  int result = sqlite3_open_v2(path.c_str(), &opened, flags, nullptr);
+  const Handle copy(opened, sqlite3_close);
+  bool stopped = false;
+  if (result == SQLITE_OK) {
+    // A partial copy is of no use, so it needs no journal to be rolled back by.
+    sqlite3_exec(opened, "PRAGMA journal_mode = OFF", nullptr, nullptr, nullptr);
+    sqlite3_backup* backup = sqlite3_backup_init(opened, "main", connection.Handle(), "main");
+    if (backup == nullptr) {
+      throw SqliteError(opened, path);
+    }
+    while (sqlite3_backup_step(backup, keepOn ? PagesOfAStep : -1) == SQLITE_OK) {
+      stopped = keepOn && !keepOn();
+      if (stopped) {
+        break;
+      }
+    }
+    result = sqlite3_backup_finish(backup);
+  }
+  if (result == SQLITE_OK) {
+    // A file that keeps a log would have its copy keep one too.
+    sqlite3_exec(opened, "PRAGMA journal_mode = DELETE", nullptr, nullptr, nullptr);
+    return !stopped;
+  }
+  throw SqliteError(opened, path);
+}
+
+bool CheckWhole(SqliteConnection& connection, const KeepOn& keepOn) {
+  const StatementWatch watch(connection.Handle(), keepOn);
+  try {
+    SqliteStatement check(connection, "PRAGMA integrity_check(1)");
+    if (!check.Step() || check.Text(0) != "ok") {
+      throw UnrecognizedFormat(connection.Path());
+    }
+  } catch (const RuntimeError&) {
+    if (watch.Stopped()) {
+      return false;
+    }
+    throw;
+  }
+  return true;
+}

@@ -1,0 +1,14 @@
+#pragma once
+
+#include <string>
+
+#include "platform/Database.h"
+
+class SqliteConnection;
+
+/// See Database::CopyInSteps. Without `keepOn` it is one step, which no other program's change interrupts.
+/// The copy keeps no log of its own beside it, whatever the file does.
+bool CopyWhole(SqliteConnection& connection, const std::string& path, const KeepOn& keepOn);
+
+/// See Database::CheckWhole.
+bool CheckWhole(SqliteConnection& connection, const KeepOn& keepOn);

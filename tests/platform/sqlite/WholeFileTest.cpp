@@ -1,0 +1,157 @@
+#include <gmock/gmock.h>
+
+#include <filesystem>
+#include <fstream>
+
+#include "tests/support/OrdinaryUser.h"
+#include "tests/support/TestDatabase.h"
+#include "tests/support/Thrown.h"
+
+namespace {
+
+using testing::ElementsAre;
+
+class WholeDatabaseFile : public testing::Test {
+ protected:
+  WholeDatabaseFile() {
+    file.AddMembers();
+    file.Execute("UPDATE Members SET Photograph = randomblob(600000)");
+  }
+
+  std::string Other() const { return file.Folder() / "other.mdb"; }
+  static bool Exists(const std::string& path) { return std::filesystem::exists(path); }
+
+  TestDatabase file;
+  int asked = 0;
+  KeepOn always = [this] { return ++asked > 0; };
+};
+
+TEST_F(WholeDatabaseFile, IsCopiedInSteps) {
+  EXPECT_TRUE(file.Open()->CopyInSteps(Other(), always));
+  EXPECT_GE(asked, 2);
+  EXPECT_EQ(OtherConnection(Other()).Query("SELECT sum(length(Photograph)) FROM Members"), "2400000");
+  EXPECT_EQ(OtherConnection(Other()).Query("PRAGMA integrity_check"), "ok");
+}
+
+TEST_F(WholeDatabaseFile, IsNotCopiedToItsEndWhenThatIsStopped) {
+  EXPECT_FALSE(file.Open()->CopyInSteps(Other(), [this] { return ++asked < 2; }));
+  EXPECT_EQ(asked, 2);
+}
+
+TEST_F(WholeDatabaseFile, MayBeWrittenByOthersBetweenTheSteps) {
+  EXPECT_TRUE(file.Open()->CopyInSteps(Other(), [this] {
+    if (++asked == 1) {
+      file.Execute("UPDATE Members SET Clan = 'late'");
+    }
+    return true;
+  }));
+  EXPECT_EQ(OtherConnection(Other()).Query("SELECT count(*) FROM Members WHERE Clan = 'late'"), "4");
+}
+
+TEST_F(WholeDatabaseFile, ThatKeepsALogHasACopyWithoutOne) {
+  EXPECT_EQ(file.Query("PRAGMA journal_mode = WAL"), "wal");
+  file.Open()->CopyTo(Other());
+  EXPECT_EQ(OtherConnection(Other()).Query("PRAGMA journal_mode"), "delete");
+  EXPECT_FALSE(Exists(Other() + "-wal"));
+  EXPECT_FALSE(Exists(Other() + "-shm"));
+}
+
+TEST_F(WholeDatabaseFile, IsFoundSound) {
+  EXPECT_TRUE(file.Open()->CheckWhole(always));
+  EXPECT_TRUE(file.Open()->CheckWhole(nullptr));
+}
+
+TEST_F(WholeDatabaseFile, IsFoundDamagedInsideToo) {
+  const auto size = std::filesystem::file_size(file.Path());
+  for (const double place : {0.1, 0.5, 0.9}) {
+    std::filesystem::copy_file(file.Path(), Other(), std::filesystem::copy_options::overwrite_existing);
+    std::fstream damaged(Other(), std::ios::in | std::ios::out | std::ios::binary);
+    damaged.seekp(static_cast<std::streamoff>(place * static_cast<double>(size)) / 4096 * 4096);
+    damaged << std::string(4096, '\xEE');
+    damaged.close();
+    const auto check = [this] {
+      SqliteEngine(std::chrono::milliseconds(0)).OpenDatabase(Other())->CheckWhole(always);
+    };
+    EXPECT_EQ(NumberThrownBy(check), 3343) << place;
+  }
+}
+
+TEST_F(WholeDatabaseFile, IsNotLookedThroughToItsEndWhenThatIsStopped) {
+  file.Execute(
+      "WITH RECURSIVE n(i) AS (SELECT 10 UNION ALL SELECT i + 1 FROM n WHERE i < 20000) "
+      "INSERT INTO Members (ContactID, FirstName) SELECT i, 'Ann' FROM n");
+  const std::unique_ptr<Database> database = file.Open();
+  EXPECT_FALSE(database->CheckWhole([this] { return ++asked < 2; }));
+  EXPECT_EQ(asked, 2);
+  EXPECT_EQ(database->OpenRecordset("Members")->RecordCount(), 19995);  // it is no worse for that
+}
+
+TEST_F(WholeDatabaseFile, NamesTheColumnsOfATable) {
+  EXPECT_THAT(file.Open()->ColumnNames("Members"),
+              ElementsAre("ContactID", "DallasID", "FirstName", "LastName", "NickName", "Photograph",
+                          "PhotographLength", "TotalGamesPlayed", "TotalDamage", "Clan"));
+  EXPECT_EQ(NumberThrownBy([this] { file.Open()->ColumnNames("Table1"); }), 3078);
+}
+
+TEST_F(WholeDatabaseFile, TellsItsPathAndThatBehindALink) {
+  std::filesystem::create_symlink(file.Path(), Other());
+  const auto database = SqliteEngine().OpenDatabase(Other());
+  EXPECT_EQ(database->Path(), Other());
+  EXPECT_EQ(database->FilePath(), file.Path());
+}
+
+TEST_F(WholeDatabaseFile, IsWrittenByNobodyElseWhileItIsHeld) {
+  const std::unique_ptr<Database> database = file.Open();
+  OtherConnection other(file.Path());
+  {
+    const WritersHeld held(*database);
+    EXPECT_EQ(other.Try("DELETE FROM Members"), SQLITE_BUSY);
+    EXPECT_EQ(file.Open()->OpenRecordset("Members")->RecordCount(), 4);
+    EXPECT_TRUE(file.Open()->CopyInSteps(Other(), always));
+  }
+  EXPECT_EQ(other.Try("DELETE FROM Members"), SQLITE_OK);
+}
+
+TEST_F(WholeDatabaseFile, HasNoJournalBesideItWhileItIsHeld) {
+  OtherConnection other(file.Path());
+  EXPECT_EQ(other.Query("PRAGMA journal_mode = PERSIST"), "persist");
+  other.Execute("DELETE FROM Members WHERE ContactID = 9");
+  ASSERT_TRUE(Exists(file.Path() + "-journal"));
+  const std::unique_ptr<Database> database = file.Open();
+  const WritersHeld held(*database);
+  EXPECT_FALSE(Exists(file.Path() + "-journal"));
+  EXPECT_EQ(file.Query("SELECT count(*) FROM Members"), "3");
+}
+
+TEST_F(WholeDatabaseFile, HasNoLogBesideItWhileItIsHeld) {
+  EXPECT_EQ(file.Query("PRAGMA journal_mode = WAL"), "wal");
+  const std::unique_ptr<Database> database = file.Open();
+  const WritersHeld held(*database);
+  EXPECT_FALSE(Exists(file.Path() + "-wal"));
+  EXPECT_FALSE(Exists(file.Path() + "-shm"));
+}
+
+TEST_F(WholeDatabaseFile, IsNotHeldWhileAnotherWrites) {
+  const std::unique_ptr<Database> database = file.Open();
+  OtherConnection other(file.Path());
+  other.Execute("BEGIN IMMEDIATE");
+  EXPECT_EQ(NumberThrownBy([&] { const WritersHeld held(*database); }), 3050);
+  other.Execute("COMMIT");
+  EXPECT_EQ(NumberThrownBy([&] { const WritersHeld held(*database); }), 0);
+}
+
+TEST_F(WholeDatabaseFile, IsNotHeldWhereItIsWriteProtected) {
+  std::filesystem::permissions(file.Path(), std::filesystem::perms(0444));
+  const OrdinaryUser user;
+  const std::unique_ptr<Database> database = file.Open();
+  EXPECT_EQ(NumberThrownBy([&] { const WritersHeld held(*database); }), 3027);
+}
+
+TEST_F(WholeDatabaseFile, MakesNoBackupCopyBecauseItIsHeld) {
+  const std::unique_ptr<Database> database = file.Open();
+  database->BeforeChange([this] { return ++asked > 0; });
+  { const WritersHeld held(*database); }
+  EXPECT_EQ(asked, 0);
+}
+
+}  // namespace
