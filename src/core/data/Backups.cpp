@@ -25,6 +25,9 @@ void Backups::Guard(Database& database, const std::string& path) {
 }
 
 bool Backups::TryCopy(Database& database, const std::string& path) {
+  if (copied_.contains(NameIn(path))) {
+    return true;
+  }
   try {
     Copy(database, NameIn(path));
   } catch (const RuntimeError& error) {
@@ -57,6 +60,7 @@ void Backups::Copy(Database& database, const std::string& name) {
     deletePart();
     throw;
   }
+  copied_.insert(name);
   copies.DeleteOldest(newest);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <set>
 #include <string>
 
 #include "core/text/StringTable.h"
@@ -15,8 +16,9 @@ class Backups {
   Backups(std::string folder, Files& disk, const Clock& time, const StringTable& strings)
       : folder_(std::move(folder)), disk_(disk), time_(time), strings_(strings) {}
 
-  /// From now on copies `database`, whose file is at `path` and ends in ".mdb", before its first change. The
-  /// change goes ahead even if the copy fails.
+  /// From now on copies `database`, whose file is at `path` and ends in ".mdb", before its first change,
+  /// unless a copy of that file was made in this run already: it may be opened anew. The change goes ahead
+  /// even if the copy fails.
   void Guard(Database& database, const std::string& path);
 
   /// Returns the operator's message about a copy that failed since the last call, or an empty text.
@@ -30,5 +32,6 @@ class Backups {
   Files& disk_;
   const Clock& time_;
   const StringTable& strings_;
+  std::set<std::string> copied_;  // names of the databases that were copied
   std::string failure_;
 };

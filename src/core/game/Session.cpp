@@ -1,5 +1,6 @@
 #include "core/game/Session.h"
 
+#include <algorithm>
 #include <utility>
 
 #include "core/data/FieldValue.h"
@@ -14,19 +15,21 @@ Subscription Session::Listen(std::function<void(SessionChange)> listener) {
   return listeners_.Listen(std::move(listener));
 }
 
+std::unique_ptr<Database> Session::OpenDatabase(const std::string& name, const std::string& table) {
+  return OpenUserDatabase({sources_->UserDataFolder + "/" + name + ".mdb", table,
+                           sources_->ProgramFolder + "/" + name + "_default.mdb"},
+                          {.Engine = sources_->Engine,
+                           .Old = sources_->Old,
+                           .Disk = sources_->Disk,
+                           .Boxes = boxes_,
+                           .Copies = *backups_,
+                           .Strings = strings_});
+}
+
 bool Session::Open(const Sources& sources) {
+  sources_.emplace(sources);
   backups_.emplace(sources.UserDataFolder + "/backups", sources.Disk, time_, strings_);
-  const auto open = [&](const std::string& name, const std::string& table) {
-    return OpenUserDatabase({sources.UserDataFolder + "/" + name + ".mdb", table,
-                             sources.ProgramFolder + "/" + name + "_default.mdb"},
-                            {.Engine = sources.Engine,
-                             .Old = sources.Old,
-                             .Disk = sources.Disk,
-                             .Boxes = boxes_,
-                             .Copies = *backups_,
-                             .Strings = strings_});
-  };
-  dbScenarios_ = open("scenarios", "Table1");
+  dbScenarios_ = OpenDatabase("scenarios", "Table1");
   if (!dbScenarios_) {
     return false;
   }
@@ -34,7 +37,7 @@ bool Session::Open(const Sources& sources) {
   missions_.emplace(*rsScenarios_, strings_, unlockingBoxes_);
   FillMissionList();
   rsScenarios_->MoveFirst();
-  dbMembers_ = open("members", "Members");
+  dbMembers_ = OpenDatabase("members", "Members");
   if (!dbMembers_) {
     return false;
   }
@@ -45,6 +48,9 @@ bool Session::Open(const Sources& sources) {
 }
 
 void Session::Close() {
+  if (missions_ && !missions_->Items().empty()) {
+    chosen_ = missions_->Items()[static_cast<std::size_t>(missions_->ListIndex())];
+  }
   analysis_.reset();
   members_.reset();
   missions_.reset();
@@ -52,6 +58,47 @@ void Session::Close() {
   rsMembers_.reset();
   dbScenarios_.reset();
   dbMembers_.reset();
+}
+
+void Session::Reopen() {
+  std::unique_ptr<Database> dbScenarios = OpenDatabase("scenarios", "Table1");
+  std::unique_ptr<Database> dbMembers = dbScenarios ? OpenDatabase("members", "Members") : nullptr;
+  if (!dbMembers) {
+    throw RuntimeError(Fault::UnrecognizedDatabase);
+  }
+  std::unique_ptr<Recordset> rsScenarios = dbScenarios->OpenRecordset("Table1");
+  std::unique_ptr<Recordset> rsMembers = dbMembers->OpenRecordset("Members");
+  MissionList missions(*rsScenarios, strings_, unlockingBoxes_);
+  {
+    const ReadScope scope(*dbScenarios);
+    missions.FillMissionList();
+  }
+  rsScenarios->MoveFirst();
+
+  Close();
+  missions.Select(ChosenIn(missions));
+  dbScenarios_ = std::move(dbScenarios);
+  rsScenarios_ = std::move(rsScenarios);
+  missions_.emplace(std::move(missions));
+  dbMembers_ = std::move(dbMembers);
+  rsMembers_ = std::move(rsMembers);
+  members_.emplace(*rsMembers_, unlockingBoxes_);
+  analysis_.emplace(game_, factors_, *missions_, *members_, players_, teams_);
+  listeners_.Tell(SessionChange::Missions);
+  SelectMission(missions_->ListIndex());
+}
+
+int Session::ChosenIn(const MissionList& missions) const {
+  const std::vector<MissionList::Item>& items = missions.Items();
+  const auto isSame = [this](const MissionList::Item& item) {
+    return item.Id == chosen_.Id && item.Text == chosen_.Text;
+  };
+  auto found = std::find_if(items.begin(), items.end(), isSame);
+  if (found == items.end()) {
+    found = std::find_if(items.begin(), items.end(),
+                         [this](const MissionList::Item& item) { return item.Text == chosen_.Text; });
+  }
+  return found == items.end() ? MissionList::None : static_cast<int>(found - items.begin());
 }
 
 std::string Session::TakeBackupFailure() {

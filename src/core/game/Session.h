@@ -71,6 +71,11 @@ class Session {
   /// chose to end the program.
   bool Open(const Sources& sources);
   void Close();
+  /// Opens both databases and their cursors anew, also after Close: for files that were changed or replaced
+  /// as a whole. Every reference to them ends. The mission stays the chosen one if it still exists, else one
+  /// of its name, else none; the scores of a game are calculated anew. Throws RuntimeError if one cannot be
+  /// opened or read; what was open stays open then.
+  void Reopen();
 
   /// Returns the operator's message about a backup copy that failed, or an empty text if there is none.
   std::string TakeBackupFailure();
@@ -113,6 +118,10 @@ class Session {
   CommitResult CommitGame();
 
  private:
+  /// Opens one of the user's databases; null if the operator chose to end the program.
+  std::unique_ptr<Database> OpenDatabase(const std::string& name, const std::string& table);
+  /// The entry of `missions` that stands for the one chosen before.
+  int ChosenIn(const MissionList& missions) const;
   void LookUpMission();
   void ChooseMission(const std::string& name);
 
@@ -127,6 +136,9 @@ class Session {
   bool missionIsActive_ = false;
   std::string missionDescription_;
   UnlockingBoxes unlockingBoxes_{boxes_};
+
+  std::optional<Sources> sources_;
+  MissionList::Item chosen_{{}, 0};  ///< the mission that Close left
 
   // In the order in which Open creates them.
   std::optional<Backups> backups_;
