@@ -34,6 +34,8 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuMissions->menuAction(), 211},
       {ui.mnuMissionResults, 212},
       {ui.mnuSetupMissions, 213},
+      {ui.mnuExportMembers, static_cast<int>(OwnText::ExportMembersItem)},
+      {ui.mnuImportMembers, static_cast<int>(OwnText::ImportMembersItem)},
       {ui.mnuSettings->menuAction(), 214},
       {ui.mnuCommPort, 215},
       {ui.mnuSoldieringCalc, 216},
