@@ -35,6 +35,8 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuMissionResults, 212},
       {ui.mnuSetupMissions, 213},
       {ui.mnuBackupCopies, static_cast<int>(OwnText::BackupCopiesItem)},
+      {ui.mnuExportMembers, static_cast<int>(OwnText::ExportMembersItem)},
+      {ui.mnuImportMembers, static_cast<int>(OwnText::ImportMembersItem)},
       {ui.mnuSettings->menuAction(), 214},
       {ui.mnuCommPort, 215},
       {ui.mnuSoldieringCalc, 216},

@@ -186,6 +186,8 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuCommitGame, &frmRx::CommitGame},
                                {ui_->mnuManageMembers, &frmRx::ManageMembers},
                                {ui_->mnuCheckButton, &frmRx::CheckMembershipButton},
+                               {ui_->mnuExportMembers, &frmRx::ExportMemberFile},
+                               {ui_->mnuImportMembers, &frmRx::ImportMemberFile},
                                {ui_->mnuAssignMember, &frmRx::AssignMember},
                                {ui_->mnuUnassignMember, &frmRx::UnassignMember},
                                {ui_->mnuShowDetailed, &frmRx::ShowDetailed},

@@ -86,6 +86,8 @@ class frmRx : public QMainWindow {
   void CommitGame();
   void ManageMembers();
   void CheckMembershipButton();
+  void ExportMemberFile();
+  void ImportMemberFile();
   /// Shows the members, starting at `contactToShow` (0 for none). Returns `ContactID` of the one chosen with
   /// OK, or an empty text.
   std::string ShowMembers(std::int32_t contactToShow);

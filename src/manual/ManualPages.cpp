@@ -48,6 +48,8 @@ const std::vector<WindowPage>& WindowPages() {
       {"Scenarios", "Missions", "任务"},
       {"MissionNameEntry", "Missions", "任务"},
       {"Members", "Members", "会员"},
+      {"ExportMembers", "Members", "会员"},
+      {"ImportMembers", "Members", "会员"},
       {"ButtonSwipe", "The reader of membership buttons", "会员扣读取器"},
       {"PrintOptions", "Score sheets", "成绩单"},
       {"SheetProgressWindow", "Score sheets", "成绩单"},

@@ -31,6 +31,10 @@ class Files {
   /// 76; the text names the file, and says so if the new one is in place and only its durability is in doubt.
   virtual void Replace(const std::string& path, const std::string& bytes) = 0;
 
+  /// Does the same for personal data: this user alone may read the file, also where others could read the
+  /// one before.
+  virtual void ReplacePrivately(const std::string& path, const std::string& bytes) = 0;
+
   /// Creates an empty file in the system's temporary folder, its name beginning with "per", and returns its
   /// path. Throws as Replace does.
   virtual std::string MakeTempFileName() = 0;

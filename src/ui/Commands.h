@@ -70,6 +70,9 @@ class Commands : public QObject {
   /// True while a command is on the stack.
   bool Running() const { return running_ > 0; }
 
+  /// True in a command that was given while another one is on the stack.
+  bool Nested() const { return running_ > 1; }
+
   /// True once the window was asked to close while commands run; polling jobs check this.
   bool CloseRequested() const { return closeRequested_; }
 

@@ -60,6 +60,7 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
       {"mnuMissionResults", {"Mission results", "任务结果"}},
       {"mnuSetupMissions", {"Missions", "任务"}},
       {"mnuManageMembers", {"Members", "会员"}},
+      {"mnuExportMembers", {"Members", "会员"}},
       {"mnuRemoteManage", {"Remote management", "远程管理"}},
       {"mnuBoxConfig", {"Utility boxes", "功能装置"}},
       {"mnuChargeiButton", {"Charging buttons", "信息扣充值"}},

@@ -115,6 +115,14 @@ class FakeFiles : public Files {
     contents_[path] = bytes;
   }
 
+  /// The paths of ReplacePrivately, each of them in Replaced as well.
+  std::vector<std::string> Private;
+
+  void ReplacePrivately(const std::string& path, const std::string& bytes) override {
+    Private.push_back(path);
+    Replace(path, bytes);
+  }
+
   std::string MakeTempFileName() override {
     ThrowIfTold(createFailures_, TempFolder);
     std::string path = std::string(TempFolder) + "/per" + std::to_string(++tempFiles_);

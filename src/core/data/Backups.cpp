@@ -24,6 +24,10 @@ void Backups::Guard(Database& database, const std::string& path) {
   database.BeforeChange([this, &database, path] { return TryCopy(database, path); });
 }
 
+void Backups::CopyNow(Database& database, const std::string& path) {
+  Copy(database, NameIn(path));
+}
+
 bool Backups::TryCopy(Database& database, const std::string& path) {
   if (copied_.contains(NameIn(path))) {
     return true;

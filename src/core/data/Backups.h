@@ -21,6 +21,9 @@ class Backups {
   /// even if the copy fails.
   void Guard(Database& database, const std::string& path);
 
+  /// Copies `database` as it is now, ahead of a change of many rows. Throws RuntimeError if it cannot.
+  void CopyNow(Database& database, const std::string& path);
+
   /// Returns the operator's message about a copy that failed since the last call, or an empty text.
   std::string TakeFailure();
 

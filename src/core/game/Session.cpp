@@ -101,6 +101,10 @@ int Session::ChosenIn(const MissionList& missions) const {
   return found == items.end() ? MissionList::None : static_cast<int>(found - items.begin());
 }
 
+void Session::BackUpMembers() {
+  backups_->CopyNow(*dbMembers_, sources_->UserDataFolder + "/members.mdb");
+}
+
 std::string Session::TakeBackupFailure() {
   return backups_ ? backups_->TakeFailure() : std::string();
 }

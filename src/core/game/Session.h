@@ -80,6 +80,8 @@ class Session {
   /// opened or read; what was open stays open then.
   void Reopen();
 
+  /// Copies the members as they are now to the backup copies. Throws RuntimeError if it cannot.
+  void BackUpMembers();
   /// Returns the operator's message about a backup copy that failed, or an empty text if there is none.
   std::string TakeBackupFailure();
 

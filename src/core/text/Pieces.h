@@ -1,7 +1,9 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
 #include <string_view>
+#include <vector>
 
 /// `text` without the characters at either end for which `isBlank` is true.
 template <typename Predicate>
@@ -13,6 +15,17 @@ constexpr std::string_view Trimmed(std::string_view text, Predicate isBlank) {
     text.remove_suffix(1);
   }
   return text;
+}
+
+/// The parts of `text` between its separators, at least one.
+inline std::vector<std::string> PartsOf(std::string_view text, char separator) {
+  std::vector<std::string> parts;
+  for (std::size_t at = text.find(separator); at != std::string_view::npos; at = text.find(separator)) {
+    parts.emplace_back(text.substr(0, at));
+    text.remove_prefix(at + 1);
+  }
+  parts.emplace_back(text);
+  return parts;
 }
 
 /// `text` up to its first carriage return and line feed, or all of it.

@@ -36,7 +36,8 @@ std::string FollowLinks(std::string path) {
 // A new, empty file with a unique name, deleted at the end unless it has been renamed.
 class TemporaryFile {
  public:
-  explicit TemporaryFile(const std::string& folder) : path_(NewName(folder)), file_(Create(path_)) {}
+  TemporaryFile(const std::string& folder, mode_t mode)
+      : path_(NewName(folder)), file_(Create(path_, mode)) {}
   ~TemporaryFile() {
     if (!renamed_) {
       unlink(path_.c_str());
@@ -70,8 +71,8 @@ class TemporaryFile {
     std::snprintf(name.data(), name.size(), ".new-%08x%08x", random(), random());
     return folder + "/" + name.data();
   }
-  static int Create(const std::string& path) {
-    return open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0644);
+  static int Create(const std::string& path, mode_t mode) {
+    return open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode);
   }
 
   std::string path_;
@@ -151,6 +152,30 @@ struct RegularFile {
   std::size_t Size = 0;
 };
 
+enum class Readers { AsBefore, ThisUser };
+
+void ReplaceFile(const std::string& path, const std::string& bytes, Readers readers) {
+  const std::string target = FollowLinks(path);
+  struct stat old {};
+  const bool exists = stat(target.c_str(), &old) == 0;
+  if (exists && !S_ISREG(old.st_mode)) {
+    throw FileError(EISDIR, path);
+  }
+  if (exists && faccessat(AT_FDCWD, target.c_str(), W_OK, AT_EACCESS) != 0) {
+    throw FileError(errno, path);
+  }
+  const std::string parent = std::filesystem::path(target).parent_path();
+  const std::string folder = parent.empty() ? "." : parent;
+
+  const bool isPrivate = readers == Readers::ThisUser;
+  TemporaryFile file(folder, isPrivate ? 0600 : 0644);
+  if (file.Number() < 0 || (exists && !isPrivate && !TakeOver(file.Number(), old)) ||
+      !WriteAll(file.Number(), bytes) || fsync(file.Number()) != 0 || !file.RenameTo(target)) {
+    throw FileError(errno, path);
+  }
+  SyncRename(folder, path);
+}
+
 }  // namespace
 
 bool LinuxFiles::FileExists(const std::string& path) const {
@@ -213,24 +238,11 @@ std::string LinuxFiles::ReadPart(const std::string& path, std::uint64_t offset, 
 }
 
 void LinuxFiles::Replace(const std::string& path, const std::string& bytes) {
-  const std::string target = FollowLinks(path);
-  struct stat old {};
-  const bool exists = stat(target.c_str(), &old) == 0;
-  if (exists && !S_ISREG(old.st_mode)) {
-    throw FileError(EISDIR, path);
-  }
-  if (exists && faccessat(AT_FDCWD, target.c_str(), W_OK, AT_EACCESS) != 0) {
-    throw FileError(errno, path);
-  }
-  const std::string parent = std::filesystem::path(target).parent_path();
-  const std::string folder = parent.empty() ? "." : parent;
+  ReplaceFile(path, bytes, Readers::AsBefore);
+}
 
-  TemporaryFile file(folder);
-  if (file.Number() < 0 || (exists && !TakeOver(file.Number(), old)) || !WriteAll(file.Number(), bytes) ||
-      fsync(file.Number()) != 0 || !file.RenameTo(target)) {
-    throw FileError(errno, path);
-  }
-  SyncRename(folder, path);
+void LinuxFiles::ReplacePrivately(const std::string& path, const std::string& bytes) {
+  ReplaceFile(path, bytes, Readers::ThisUser);
 }
 
 std::string LinuxFiles::MakeTempFileName() {

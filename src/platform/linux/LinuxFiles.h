@@ -18,6 +18,7 @@ class LinuxFiles : public Files {
   /// Keeps the old file's permissions, and its owner where that is allowed; a new file gets 0644 less the
   /// umask. A write-protected file is refused (70), even where its folder would allow replacing it.
   void Replace(const std::string& path, const std::string& bytes) override;
+  void ReplacePrivately(const std::string& path, const std::string& bytes) override;
   std::string MakeTempFileName() override;
   void Write(const std::string& path, const std::string& bytes) override;
   void Append(const std::string& path, const std::string& bytes) override;

@@ -19,19 +19,22 @@ void PendingRow::Start(::EditMode mode) {
 
 // Not for long columns: their first Append must start from nothing. The database fills in their defaults.
 void PendingRow::TakeDefaults() {
-  std::string defaults;
-  for (const SqliteColumn& column : table_.Columns()) {
-    defaults += (defaults.empty() ? "SELECT " : ", ") +
-                (column.Default.empty() ? "NULL" : "(" + column.Default + ")");
+  if (!defaults_) {
+    std::string defaults;
+    for (const SqliteColumn& column : table_.Columns()) {
+      defaults += (defaults.empty() ? "SELECT " : ", ") +
+                  (column.Default.empty() ? "NULL" : "(" + column.Default + ")");
+    }
+    defaults_ = SqliteStatement(connection_, defaults);
   }
-  SqliteStatement row(connection_, defaults);
-  row.Step();
+  defaults_.Step();
   for (std::size_t i = 0; i < values_.size(); ++i) {
     const SqliteColumn& column = table_.Columns()[i];
     if (!column.Default.empty() && !column.IsLong) {
-      row.Read(static_cast<int>(i), values_[i].emplace());
+      defaults_.Read(static_cast<int>(i), values_[i].emplace());
     }
   }
+  defaults_.Reset();
 }
 
 void PendingRow::Drop() {
@@ -76,22 +79,30 @@ std::vector<std::size_t> PendingRow::ColumnsSet() const {
   return columns;
 }
 
-std::int64_t PendingRow::Insert() {
-  const std::vector<std::size_t> columns = ColumnsSet();
+void PendingRow::PrepareInsertion(const std::vector<std::size_t>& columns) {
+  if (insertion_ && insertedColumns_ == columns) {
+    return;
+  }
   std::string names;
   std::string marks;
   for (const std::size_t i : columns) {
     names += (names.empty() ? "[" : ", [") + table_.Columns()[i].Name + "]";
     marks += marks.empty() ? "?" : ", ?";
   }
-  WriteTransaction transaction(connection_);
-  SqliteStatement insertion(
+  insertion_ = SqliteStatement(
       connection_, "INSERT INTO [" + table_.Name() + "] " +
                        (columns.empty() ? "DEFAULT VALUES" : "(" + names + ") VALUES (" + marks + ")"));
+  insertedColumns_ = columns;
+}
+
+std::int64_t PendingRow::Insert() {
+  const std::vector<std::size_t> columns = ColumnsSet();
+  WriteTransaction transaction(connection_);
+  PrepareInsertion(columns);
   for (std::size_t i = 0; i < columns.size(); ++i) {
-    insertion.Bind(static_cast<int>(i + 1), *values_[columns[i]]);
+    insertion_.Bind(static_cast<int>(i + 1), *values_[columns[i]]);
   }
-  insertion.Step();
+  insertion_.Step();
   const std::int64_t key = connection_.LastInsertedKey();
   TellOf(transaction, key, columns);
   transaction.Commit();
@@ -100,7 +111,9 @@ std::int64_t PendingRow::Insert() {
 
 void PendingRow::TellOf(WriteTransaction& transaction, std::int64_t key,
                         const std::vector<std::size_t>& columns) const {
-  transaction.Written().Write(table_.Name(), key);
+  if (!transaction.Written().Write(table_.Name(), key)) {
+    return;
+  }
   for (const std::size_t i : columns) {
     transaction.Written().Set(table_.Name(), key, table_.Columns()[i].Name, *values_[i]);
   }

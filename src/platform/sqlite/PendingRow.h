@@ -40,12 +40,17 @@ class PendingRow {
   void CheckStarted() const;
   std::vector<std::size_t> ColumnsSet() const;
   void TellOf(WriteTransaction& transaction, std::int64_t key, const std::vector<std::size_t>& columns) const;
+  void PrepareInsertion(const std::vector<std::size_t>& columns);
   void PrepareChange(const std::vector<std::size_t>& columns);
 
   SqliteConnection& connection_;
   const SqliteTable& table_;
   ::EditMode mode_ = ::EditMode::None;
   std::vector<std::optional<Value>> values_;
-  SqliteStatement change_;  ///< kept, since the same columns are often changed in many rows in turn
+  // Kept, since the same columns are often written in many rows in turn.
+  SqliteStatement defaults_;
+  SqliteStatement insertion_;
+  std::vector<std::size_t> insertedColumns_;
+  SqliteStatement change_;
   std::vector<std::size_t> changedColumns_;
 };

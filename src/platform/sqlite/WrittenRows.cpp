@@ -4,8 +4,13 @@
 
 #include "platform/sqlite/SqliteConnection.h"
 
-void WrittenRows::Write(const std::string& table, std::int64_t key) {
-  rows_[{table, key}].Deleted = false;
+bool WrittenRows::Write(const std::string& table, std::int64_t key) {
+  const Place place{table, key};
+  if (!IsWatched(place)) {
+    return false;
+  }
+  rows_[place].Deleted = false;
+  return true;
 }
 
 void WrittenRows::Set(const std::string& table, std::int64_t key, const std::string& column,
@@ -14,7 +19,10 @@ void WrittenRows::Set(const std::string& table, std::int64_t key, const std::str
 }
 
 void WrittenRows::Delete(const std::string& table, std::int64_t key) {
-  rows_[{table, key}] = {.Deleted = true, .Columns = {}};
+  const Place place{table, key};
+  if (IsWatched(place)) {
+    rows_[place] = {.Deleted = true, .Columns = {}};
+  }
 }
 
 bool WrittenRows::AreIn(SqliteConnection& connection) const {

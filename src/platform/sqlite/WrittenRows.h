@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <map>
 #include <string>
@@ -9,7 +10,8 @@
 
 class SqliteConnection;
 
-/// What a transaction has written, so that the file can be asked whether it holds it.
+/// What a transaction has written, so that the file can be asked whether it holds it. That is in the file as
+/// a whole or not at all, so of a long one the first rows are enough.
 class WrittenRows {
  public:
   void Clear() {
@@ -17,8 +19,9 @@ class WrittenRows {
     allTold_ = true;
   }
 
-  /// The row `key` of `table` is there now, and holds what later calls of Set tell.
-  void Write(const std::string& table, std::int64_t key);
+  /// The row `key` of `table` is there now, and holds what later calls of Set tell. Returns false, and then
+  /// there is nothing to set, if it is not among the first rows.
+  bool Write(const std::string& table, std::int64_t key);
   void Set(const std::string& table, std::int64_t key, const std::string& column, const Value& value);
   void Delete(const std::string& table, std::int64_t key);
 
@@ -37,6 +40,9 @@ class WrittenRows {
   };
   using Place = std::pair<std::string, std::int64_t>;  ///< table and key
 
+  static constexpr std::size_t MostRows = 1000;
+
+  bool IsWatched(const Place& place) const { return rows_.size() < MostRows || rows_.contains(place); }
   static bool IsIn(SqliteConnection& connection, const Place& place, const Row& row);
 
   std::map<Place, Row> rows_;

@@ -82,6 +82,21 @@ TEST(LinuxFilesReplace, KeepsTheOldFilesMode) {
   EXPECT_EQ(ModeOf(folder / "file"), 0666u);
 }
 
+TEST(LinuxFilesReplace, LetsThisUserAloneReadPersonalData) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "old");
+  std::filesystem::permissions(folder / "file", std::filesystem::perms(0644));
+  LinuxFiles files;
+  const mode_t old = umask(0);
+  files.ReplacePrivately(folder / "file", "new");
+  files.ReplacePrivately(folder / "fresh", "x");
+  umask(old);
+  EXPECT_EQ(ModeOf(folder / "file"), 0600u);
+  EXPECT_EQ(ModeOf(folder / "fresh"), 0600u);
+  EXPECT_EQ(ReadFile(folder / "file"), "new");
+  EXPECT_EQ(EntriesOf(folder.Path()), 2u);
+}
+
 TEST(LinuxFilesReplace, ReplacesTheTargetOfALinkAndKeepsTheLink) {
   const TemporaryFolder folder;
   std::filesystem::create_directory(folder / "real");

@@ -1,0 +1,57 @@
+// The main window's commands on files of members.
+
+#include <optional>
+
+#include "app/frmRx.h"
+#include "core/text/Filled.h"
+#include "members/ExportMembers.h"
+#include "members/ImportMembers.h"
+
+void frmRx::ExportMemberFile() {
+  ExportMembers({.DbMembers = session_.DbMembers(),
+                 .Boxes = services_.Boxes,
+                 .CommonDialog1 = services_.CommonDialog1,
+                 .Disk = services_.Disk,
+                 .Events = services_.Events,
+                 .Time = services_.Time,
+                 .Strings = services_.Strings},
+                this)
+      .exec();
+}
+
+void frmRx::ImportMemberFile() {
+  constexpr std::uint64_t mostMegabytes = 256;
+  constexpr std::uint64_t megabyte = 1U << 20U;
+  const StringTable& strings = services_.Strings;
+  const auto refuse = [this](const std::string& text) {
+    services_.Boxes.Show(text, DefaultBoxTitle, BoxIcon::Exclamation);
+  };
+  if (commands_.Nested()) {  // it may use the cursors that an import closes
+    refuse(strings.Text(OwnText::ImportWhileBusy));
+    return;
+  }
+  const std::optional<std::string> path = services_.CommonDialog1.ShowOpen(
+      {.Filter = strings.Text(OwnText::CsvFilter), .Title = strings.Text(OwnText::ImportMembersTitle)});
+  if (!path) {
+    return;
+  }
+  if (services_.Disk.FileLen(*path) > mostMegabytes * megabyte) {
+    refuse(Filled(strings.Text(OwnText::CsvFileTooLarge), {*path, std::to_string(mostMegabytes)}));
+    return;
+  }
+  bool hasImported = false;
+  {
+    ImportMembers window({.DbMembers = session_.DbMembers(),
+                          .Boxes = services_.Boxes,
+                          .Events = services_.Events,
+                          .Time = services_.Time,
+                          .Strings = strings,
+                          .BackUp = [this] { session_.BackUpMembers(); }},
+                         *path, services_.Disk.Read(*path), this);
+    window.exec();
+    hasImported = window.HasImported();
+  }
+  if (hasImported) {
+    session_.Reopen();
+  }
+}
