@@ -174,6 +174,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuLoadScores, &frmRx::LoadGame},
                                {ui_->mnuSaveScores, &frmRx::SaveGame},
                                {ui_->mnuClearScores, &frmRx::ClearGame},
+                               {ui_->mnuExport, &frmRx::ExportGame},
                                {ui_->mnuGetKeshData, &frmRx::GetScoreData},
                                {ui_->mnuPrintScores, &frmRx::PrintScores},
                                {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},

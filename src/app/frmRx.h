@@ -74,6 +74,7 @@ class frmRx : public QMainWindow {
   bool IsBusy() const;
   void SaveGame();
   void ClearGame();
+  void ExportGame();
   void GetScoreData();
   /// Tracks the word processor until it is ready. If it is missing, says so once and continues without
   /// printing.

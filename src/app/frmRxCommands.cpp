@@ -302,7 +302,11 @@ void frmRx::ShowBackupCopies() {
                 .Boxes = services_.Boxes,
                 .FileDialog = services_.CommonDialog1,
                 .Busy = [this] { return RunningBesidesThis(); },
-                .Reopen = [this] { session_.Reopen(); }},
+                .Reopen =
+                    [this] {
+                      session_.Reopen();
+                      keeping_->CheckMembers();
+                    }},
                this)
       .exec();
 }

@@ -1,4 +1,4 @@
-// The main window's commands on game files, and files dropped on it.
+// The main window's commands on game files and exports, and files dropped on it.
 
 #include <QApplication>
 #include <QDropEvent>
@@ -11,6 +11,7 @@
 #include "app/frmRx.h"
 #include "core/gamefile/SuggestedName.h"
 #include "core/text/Filled.h"
+#include "exports/ExportGames.h"
 #include "ui/WaitCursor.h"
 #include "ui_frmRx.h"
 
@@ -51,6 +52,32 @@ void frmRx::SaveGame() {
   if (gameFile_.SaveFolder() != before) {
     state_->WriteIni(State::Games, State::SaveFolder, gameFile_.SaveFolder());
   }
+}
+
+void frmRx::ExportGame() {
+  const auto nickNameOf = [this](std::int32_t contactId) { return session_.Members().NickNameOf(contactId); };
+  const auto fullNameOf = [this](std::int32_t contactId) {
+    const std::optional<Member> member = session_.Members().FindMember(contactId);
+    return member ? FullName{member->FirstName, member->LastName} : FullName();
+  };
+  const std::string received = desk_->Progress().Received();
+  const auto games = [&](const std::function<void(const ExportedGame&)>& take) {
+    const ReadScope scope(session_.DbMembers());
+    take({.Game = session_.Game(),
+          .Received = received,
+          .Mission = session_.Missions().Text(),
+          .Standings = Standings(session_.Game(), nickNameOf),
+          .FullNameOf = fullNameOf});
+  };
+  ExportGames({.Games = games,
+               .HasGames = session_.Game().DataPresent,
+               .SuggestedName = SuggestedFileName(received, session_.Missions().Text(), {}),
+               .CommonDialog1 = services_.CommonDialog1,
+               .Disk = services_.Disk,
+               .Boxes = services_.Boxes,
+               .Strings = services_.Strings},
+              this)
+      .exec();
 }
 
 bool frmRx::IsBusy() const {

@@ -26,7 +26,7 @@ void frmRx::ImportMemberFile() {
   const auto refuse = [this](const std::string& text) {
     services_.Boxes.Show(text, DefaultBoxTitle, BoxIcon::Exclamation);
   };
-  if (commands_.Nested()) {  // it may use the cursors that an import closes
+  if (RunningBesidesThis()) {  // it may use the cursors that an import closes
     refuse(strings.Text(OwnText::ImportWhileBusy));
     return;
   }
@@ -53,5 +53,6 @@ void frmRx::ImportMemberFile() {
   }
   if (hasImported) {
     session_.Reopen();
+    keeping_->CheckMembers();
   }
 }

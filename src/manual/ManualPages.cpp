@@ -53,6 +53,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"ButtonSwipe", "The reader of membership buttons", "会员扣读取器"},
       {"PrintOptions", "Score sheets", "成绩单"},
       {"SheetProgressWindow", "Score sheets", "成绩单"},
+      {"ExportGames", "Export", "导出"},
       {"Settings", "Settings", "设置"},
       {"SoldieringCalc", "Soldiering calculation", "战功计算"},
       {"RemoteManage", "Remote management", "远程管理"},

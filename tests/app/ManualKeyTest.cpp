@@ -57,6 +57,7 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
   const std::pair<const char*, PageTitle> windows[] = {
       {"mnuPrintScores", {"Score sheets", "成绩单"}},
       {"mnuAdminData", {"Administration data", "管理数据"}},
+      {"mnuExport", {"Export", "导出"}},
       {"mnuMissionResults", {"Mission results", "任务结果"}},
       {"mnuSetupMissions", {"Missions", "任务"}},
       {"mnuManageMembers", {"Members", "会员"}},

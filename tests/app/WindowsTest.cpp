@@ -9,6 +9,7 @@
 #include "devices/box/BoxConfig.h"
 #include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
+#include "exports/ExportGames.h"
 #include "firmware/download/FirmwareFlash.h"
 #include "members/Members.h"
 #include "missions/MissionNameEntry.h"
@@ -72,6 +73,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<Settings>("mnuCommPort");
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
+  LookAt<ExportGames>("mnuExport");
   LookAt<Scenarios>("mnuSetupMissions");
   LookAt<FirmwareFlash>("mnuFirmwareUpdate");
   LookAt<RemoteManage>("mnuRemoteManage");

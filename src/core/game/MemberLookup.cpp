@@ -8,8 +8,15 @@ std::string Member::GetPlayerName(bool useNickName) const {
 }
 
 std::optional<Member> MemberLookup::LoadMember(std::int32_t contactId) {
-  if (!rsMembers_.WalkTo("ContactID", std::int64_t{contactId})) {
+  std::optional<Member> member = FindMember(contactId);
+  if (!member) {
     boxes_.Show("Could not locate specified Member in database!", "Member Error", BoxIcon::Exclamation);
+  }
+  return member;
+}
+
+std::optional<Member> MemberLookup::FindMember(std::int32_t contactId) {
+  if (!rsMembers_.WalkTo("ContactID", std::int64_t{contactId})) {
     return std::nullopt;
   }
   const auto text = [this](const char* column) { return TextOf(rsMembers_.Fields(column)); };

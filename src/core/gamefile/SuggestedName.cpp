@@ -30,6 +30,11 @@ std::string_view Beginning(std::string_view text, std::size_t bytes) {
 }  // namespace
 
 std::string SuggestedGameName(std::string_view received, std::string_view missionName) {
+  return SuggestedFileName(received, missionName, Suffix);
+}
+
+std::string SuggestedFileName(std::string_view received, std::string_view missionName,
+                              std::string_view ending) {
   constexpr std::size_t dateLength = 10;
   constexpr std::size_t hour = 11;
   constexpr std::size_t minute = 14;
@@ -39,6 +44,6 @@ std::string SuggestedGameName(std::string_view received, std::string_view missio
   }
   name.append(" ").append(missionName);
   std::replace_if(name.begin(), name.end(), CannotBeHeld, '-');
-  const std::string_view whole = Beginning(name, MostBytes - Suffix.size());
-  return std::string(Trimmed(whole, [](char character) { return character == ' '; })).append(Suffix);
+  const std::string_view whole = Beginning(name, MostBytes - ending.size());
+  return std::string(Trimmed(whole, [](char character) { return character == ' '; })).append(ending);
 }

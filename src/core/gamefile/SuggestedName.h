@@ -7,3 +7,7 @@
 /// `received` is "YYYY-MM-DD HH:MM:SS". What a file name cannot hold on one of the usual systems becomes "-";
 /// the name has at most 200 bytes.
 std::string SuggestedGameName(std::string_view received, std::string_view missionName);
+
+/// The same with another ending, or none.
+std::string SuggestedFileName(std::string_view received, std::string_view missionName,
+                              std::string_view ending);

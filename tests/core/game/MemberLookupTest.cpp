@@ -49,6 +49,14 @@ TEST_F(Looking, TellsNicknamesWithoutABox) {
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
+TEST_F(Looking, FindsTheMemberWithoutABox) {
+  const auto bo = venue.Members->FindMember(5);
+  ASSERT_TRUE(bo);
+  EXPECT_EQ(bo->FirstName + "/" + bo->LastName + "/" + bo->NickName, "Bo/Ray/Mole");
+  EXPECT_FALSE(venue.Members->FindMember(3));
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
 TEST_F(Looking, KeepsItsAnswerWhereverTheCursorGoes) {
   const auto bo = venue.Members->LoadMember(5);
   venue.Members->LoadMember(2);

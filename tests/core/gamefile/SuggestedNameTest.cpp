@@ -18,6 +18,11 @@ TEST(SuggestedName, HasADashForWhatAFileNameCannotHold) {
             "2026-11-21 2015 a-b-c-d-e-f-g-h-i-j-k--l-m.game.xml");
 }
 
+TEST(SuggestedName, HasAnotherEndingForOtherFiles) {
+  EXPECT_EQ(SuggestedFileName(Received, "Keep", ".csv"), "2026-11-21 2015 Keep.csv");
+  EXPECT_EQ(SuggestedFileName(Received, "Keep", ""), "2026-11-21 2015 Keep");
+}
+
 TEST(SuggestedName, HasNoBlanksBeforeItsSuffix) {
   EXPECT_EQ(SuggestedGameName(Received, ""), "2026-11-21 2015.game.xml");
   EXPECT_EQ(SuggestedGameName(Received, "Keep  "), "2026-11-21 2015 Keep.game.xml");
