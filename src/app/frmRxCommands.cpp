@@ -315,7 +315,7 @@ std::optional<OwnText> frmRx::RunningBesidesThis() const {
   if (downloading_) {
     return OwnText::ScoresComeIn;
   }
-  return commands_.Depth() > 1 ? std::optional(OwnText::CommandRuns) : std::nullopt;
+  return commands_.Nested() ? std::optional(OwnText::CommandRuns) : std::nullopt;
 }
 
 bool frmRx::SelectPlayer() {

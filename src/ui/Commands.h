@@ -76,9 +76,6 @@ class Commands : public QObject {
   /// True once the window was asked to close while commands run; polling jobs check this.
   bool CloseRequested() const { return closeRequested_; }
 
-  /// Number of commands on the stack.
-  int Depth() const { return running_; }
-
   /// True if no command is running. Otherwise ends the waits; the window closes when the last command has
   /// unwound.
   bool MayClose();
