@@ -42,6 +42,7 @@ ExportGames::ExportGames(const Parts& parts, QWidget* parent)
                                                    {ui_->MemberNumbers, OwnText::GameExportMemberNumbers},
                                                    {ui_->Buttons, OwnText::GameExportButtons},
                                                    {ui_->PersonalNote, OwnText::GameExportPersonalNote},
+                                                   {ui_->PersonalTicks, OwnText::GameExportPersonalTicks},
                                                    {ui_->ExportButton, OwnText::GameExportButton}};
   for (const auto& [control, text] : captions) {
     SetCaptions(parts_.Strings, {{control, static_cast<int>(text)}});

@@ -72,22 +72,25 @@ TEST_P(ExportWindow, IsCaredForAndHasItsCaptions) {
   Open();
   ExpectCaredFor(*window);
   EXPECT_EQ(window->windowTitle().toStdString(), In("Export", "导出"));
-  ExpectCaptions(*window,
-                 {{"FormatFrame", In("What to export", "导出内容")},
-                  {"FormatPlayers", In("Players as a table (CSV)", "玩家表格 (CSV)")},
-                  {"FormatHits", In("Hits as a table (CSV)", "命中表格 (CSV)")},
-                  {"FormatJson",
-                   In("Players and hits for other programs (JSON)", "供其他程序使用的玩家和命中数据 (JSON)")},
-                  {"FormatPage", In("Web page to read or print (HTML)", "可阅读或打印的网页 (HTML)")},
-                  {"TableFrame", In("Table", "表格")},
-                  {"ByteOrderMark", In("Mark as UTF-8 for spreadsheets (byte-order mark)",
-                                       "为电子表格标明 UTF-8 编码（字节顺序标记）")},
-                  {"PersonalFrame", In("Personal data", "个人信息")},
-                  {"FullNames", In("First and last names", "姓名")},
-                  {"MemberNumbers", In("Member numbers", "会员编号")},
-                  {"Buttons", In("Numbers of membership buttons", "会员扣号码")},
-                  {"ExportButton", In("Export...", "导出……")},
-                  {"CloseButton", In("Close", "关闭")}});
+  ExpectCaptions(
+      *window,
+      {{"FormatFrame", In("What to export", "导出内容")},
+       {"FormatPlayers", In("Players as a table (CSV)", "玩家表格 (CSV)")},
+       {"FormatHits", In("Hits as a table (CSV)", "命中表格 (CSV)")},
+       {"FormatJson",
+        In("Players and hits for other programs (JSON)", "供其他程序使用的玩家和命中数据 (JSON)")},
+       {"FormatPage", In("Web page to read or print (HTML)", "可阅读或打印的网页 (HTML)")},
+       {"TableFrame", In("Table", "表格")},
+       {"ByteOrderMark",
+        In("Mark as UTF-8 for spreadsheets (byte-order mark)", "为电子表格标明 UTF-8 编码（字节顺序标记）")},
+       {"PersonalFrame", In("Personal data", "个人信息")},
+       {"PersonalNote", In("Players always appear by nickname or gun.", "玩家始终以昵称或枪号显示。")},
+       {"PersonalTicks", In("Tick what is to be added this time:", "请勾选本次需要附加的内容：")},
+       {"FullNames", In("First and last names", "姓名")},
+       {"MemberNumbers", In("Member numbers", "会员编号")},
+       {"Buttons", In("Numbers of membership buttons", "会员扣号码")},
+       {"ExportButton", In("Export...", "导出……")},
+       {"CloseButton", In("Close", "关闭")}});
   ExpectLabels(*window, {{"Separator", In("Separator", "分隔符")}});
   const auto& separators = Find<QComboBox>(*window, "Separator");
   EXPECT_EQ(separators.itemText(0).toStdString(), In("Comma", "逗号"));
