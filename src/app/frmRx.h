@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 
+#include "app/BoardCharts.h"
 #include "app/Desk.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
@@ -86,6 +87,7 @@ class frmRx : public QMainWindow {
   /// OK, or an empty text.
   std::string ShowMembers(std::int32_t contactToShow);
   void ShowAdminData();
+  void ShowGameCharts();
   void EnterMissionResults();
   void SetUpMissions();
   void UpdateFirmware();
@@ -132,5 +134,6 @@ class frmRx : public QMainWindow {
   QTimer wordProcessorTimer_;
   Commands commands_;
   std::optional<Desk> desk_;
+  std::optional<BoardCharts> charts_;
   ManualKey manual_;
 };

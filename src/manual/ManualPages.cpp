@@ -49,6 +49,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"MissionNameEntry", "Missions", "任务"},
       {"Members", "Members", "会员"},
       {"ButtonSwipe", "The reader of membership buttons", "会员扣读取器"},
+      {"GameCharts", "Game charts", "比赛图表"},
       {"PrintOptions", "Score sheets", "成绩单"},
       {"SheetProgressWindow", "Score sheets", "成绩单"},
       {"Settings", "Settings", "设置"},
