@@ -31,6 +31,7 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuPrintScores, 208},
       {ui.mnuAdminData, 209},
       {ui.mnuExit, 210},
+      {ui.mnuGameCharts, static_cast<int>(OwnText::GameChartsItem)},
       {ui.mnuExport, static_cast<int>(OwnText::GameExportMenu)},
       {ui.mnuMissions->menuAction(), 211},
       {ui.mnuMissionResults, 212},

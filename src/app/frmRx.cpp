@@ -89,6 +89,12 @@ void frmRx::SetUpDesk() {
                             .Save = *ui_->mnuSaveScores,
                             .Commit = *ui_->mnuCommitGame});
   desk_->Show();
+  charts_.emplace(session_,
+                  GameCharts::Parts{.Strings = services_.Strings,
+                                    .Boxes = services_.Boxes,
+                                    .CommonDialog1 = services_.CommonDialog1,
+                                    .Disk = services_.Disk},
+                  *this, [this] { return desk_->Progress().Received(); });
   ini_->AfterWrite = [this](bool written) {
     desk_->TellUnsavedSettings(written ? std::string() : userDataFolder_ + "/tessarine.ini");
   };
@@ -182,6 +188,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuAbout, &frmRx::ShowAbout},
                                {ui_->mnuManual, &frmRx::ShowManual},
                                {ui_->mnuAdminData, &frmRx::ShowAdminData},
+                               {ui_->mnuGameCharts, &frmRx::ShowGameCharts},
                                {ui_->mnuMissionResults, &frmRx::EnterMissionResults},
                                {ui_->mnuSetupMissions, &frmRx::SetUpMissions},
                                {ui_->mnuCommitGame, &frmRx::CommitGame},
@@ -238,6 +245,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
   if (desk_) {
     keeping_->End();
     desk_->End();
+    charts_->Close();
   }
   session_.Close();
   wordProcessorTimer_.stop();

@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 
+#include "app/BoardCharts.h"
 #include "app/Desk.h"
 #include "app/GameKeeping.h"
 #include "app/Services.h"
@@ -93,6 +94,7 @@ class frmRx : public QMainWindow {
   /// OK, or an empty text.
   std::string ShowMembers(std::int32_t contactToShow);
   void ShowAdminData();
+  void ShowGameCharts();
   void EnterMissionResults();
   void SetUpMissions();
   void UpdateFirmware();
@@ -141,5 +143,6 @@ class frmRx : public QMainWindow {
   Commands commands_;
   std::optional<Desk> desk_;
   std::optional<GameKeeping> keeping_;
+  std::optional<BoardCharts> charts_;
   ManualKey manual_;
 };

@@ -165,6 +165,10 @@ void frmRx::ShowAdminData() {
   AdminData(session_.Game(), services_.Strings, this).exec();
 }
 
+void frmRx::ShowGameCharts() {
+  charts_->Open();
+}
+
 void frmRx::EnterMissionResults() {
   if (MissionResultEntry(session_.Game(), session_.Missions(), services_.Strings, this).exec() ==
       QDialog::Accepted) {

@@ -4,8 +4,8 @@
 #include <QHeaderView>
 #include <QKeyEvent>
 
-#include "board/RowsAsText.h"
 #include "core/text/NumberForms.h"
+#include "ui/RowsAsText.h"
 #include "ui/Text.h"
 #include "ui_AdminData.h"
 

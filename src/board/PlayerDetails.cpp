@@ -3,7 +3,7 @@
 #include <QShortcut>
 #include <utility>
 
-#include "board/HitBars.h"
+#include "charts/HitBars.h"
 #include "core/game/PlayerId.h"
 #include "core/text/NumberForms.h"
 #include "ui/Announce.h"

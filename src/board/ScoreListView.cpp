@@ -16,9 +16,9 @@
 #include "board/ColumnWidths.h"
 #include "board/ListFonts.h"
 #include "board/PlayerDelegate.h"
-#include "board/RowsAsText.h"
 #include "board/ScoreListHeader.h"
 #include "board/ScoreListModel.h"
+#include "ui/RowsAsText.h"
 
 namespace {
 

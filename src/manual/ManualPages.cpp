@@ -51,6 +51,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"ExportMembers", "Members", "会员"},
       {"ImportMembers", "Members", "会员"},
       {"ButtonSwipe", "The reader of membership buttons", "会员扣读取器"},
+      {"GameCharts", "Game charts", "比赛图表"},
       {"PrintOptions", "Score sheets", "成绩单"},
       {"SheetProgressWindow", "Score sheets", "成绩单"},
       {"ExportGames", "Export", "导出"},

@@ -1,6 +1,7 @@
 // F1 in the windows of the program, as they open.
 
 #include <QListWidget>
+#include <algorithm>
 
 #include "app/UploadProgress.h"
 #include "manual/ManualWindow.h"
@@ -80,6 +81,17 @@ TEST_P(ManualKeyIn, TheWindowsAboutAPlayerOpensTheirPages) {
   venue.LoadGame(GameOfManyHits());
   ExpectPage([this] { venue.ChooseInPopup(0, "mnuShowDetailed"); }, {"Player details", "玩家详情"});
   ExpectPage([this] { venue.ChooseInPopup(0, "mnuBonusPoints"); }, {"Bonus points", "奖励分"});
+}
+
+TEST_P(ManualKeyIn, TheChartsOpenTheirPage) {
+  venue.Trigger("mnuGameCharts");
+  const QWidgetList windows = QApplication::topLevelWidgets();
+  const auto charts = std::find_if(windows.begin(), windows.end(), [](const QWidget* window) {
+    return window->objectName() == QStringLiteral("GameCharts") && window->isVisible();
+  });
+  ASSERT_NE(charts, windows.end());
+  Show(**charts);
+  ExpectPage(**charts, {"Game charts", "比赛图表"});
 }
 
 TEST_P(ManualKeyIn, AWindowOfAWindowOpensItsPage) {

@@ -37,6 +37,7 @@ const std::vector<Menu> Menus = {
       {"mnuPrintScores", 208, "&Print Score Sheets", true},
       {"mnuAdminData", 209, "&Admin Data", true},
       {"mnuExit", 210, "E&xit", true},
+      {"mnuGameCharts", static_cast<int>(OwnText::GameChartsItem), "Game Cha&rts", true},
       {"mnuExport", static_cast<int>(OwnText::GameExportMenu), "&Export", true}}},
     {{"mnuMissions", 211, "&Missions", true},
      {{"mnuMissionResults", 212, "Set Mission &Results", false},

@@ -16,20 +16,46 @@ MissionPoints ReadMissionPoints(Recordset& mission) {
   return points;
 }
 
+namespace {
+
+/// Calls `add` with the points of each objective that the team has achieved, in their order.
+template <typename Add>
+void ForEachAchieved(const MissionPoints& points, const OneBased<ObjectiveTeam, TeamCount>& objectives,
+                     const std::string& teamName, Add add) {
+  for (int set = 0; set < TeamCount; ++set) {
+    const ObjectiveTeam& objective = objectives(set + 1);
+    if (objective.Name == teamName && objective.PrimaryAchieved) {
+      add(points.Primary[set]);
+    }
+    if (objective.Name == teamName && objective.SecondaryAchieved) {
+      add(points.Secondary[set]);
+    }
+  }
+}
+
+}  // namespace
+
 std::int32_t WithObjectivePoints(std::int32_t score, const MissionPoints& points,
                                  const OneBased<ObjectiveTeam, TeamCount>& objectives,
                                  const std::string& teamName) {
-  const auto add = [&score](bool achieved, long double amount) {
-    if (achieved) {
-      score = RoundToInt32(score + amount);
-    }
+  ForEachAchieved(points, objectives, teamName,
+                  [&score](long double amount) { score = RoundToInt32(score + amount); });
+  return score;
+}
+
+long double ObjectivePointsOf(const MissionPoints& points,
+                              const OneBased<ObjectiveTeam, TeamCount>& objectives,
+                              const std::string& teamName) {
+  long double sum = 0;
+  ForEachAchieved(points, objectives, teamName, [&sum](long double amount) { sum += amount; });
+  return sum;
+}
+
+std::int32_t WithPenalties(std::int32_t score, const MissionPoints& points, const Player& player) {
+  const auto subtract = [&score](long double penalty, std::int32_t count) {
+    score = RoundToInt32(score - penalty * count);
   };
-  for (int set = 0; set < TeamCount; ++set) {
-    const ObjectiveTeam& objective = objectives(set + 1);
-    if (objective.Name == teamName) {
-      add(objective.PrimaryAchieved, points.Primary[set]);
-      add(objective.SecondaryAchieved, points.Secondary[set]);
-    }
-  }
+  subtract(points.RespawnPenalty, player.RespawnCount);
+  subtract(points.HealPenalty, player.HealCount);
   return score;
 }

@@ -25,3 +25,12 @@ MissionPoints ReadMissionPoints(Recordset& mission);
 std::int32_t WithObjectivePoints(std::int32_t score, const MissionPoints& points,
                                  const OneBased<ObjectiveTeam, TeamCount>& objectives,
                                  const std::string& teamName);
+
+/// What the player of team `teamName` gets for the objectives achieved, before any rounding.
+long double ObjectivePointsOf(const MissionPoints& points,
+                              const OneBased<ObjectiveTeam, TeamCount>& objectives,
+                              const std::string& teamName);
+
+/// `score` less the mission's penalties for the player's respawns, then for the heals; rounded after each.
+/// Throws as WithObjectivePoints does.
+std::int32_t WithPenalties(std::int32_t score, const MissionPoints& points, const Player& player);

@@ -6,6 +6,7 @@
 #include <utility>
 #include <vector>
 
+#include "core/game/SoldieringTerms.h"
 #include "core/text/NumberForms.h"
 
 namespace {
@@ -156,7 +157,7 @@ std::optional<BoardRow> ScoreAnalysis::ScorePlayer(int index) {
     return std::nullopt;
   }
   CalculateAccuracy(player);
-  CalculateSoldiering(player);
+  player.Soldiering = RoundToInt32(SoldieringTermsOf(player, factors_).Sum());
   AddMissionPoints(player, game_.TeamNames(team));
   if (overtaken()) {
     return std::nullopt;
@@ -195,14 +196,6 @@ void ScoreAnalysis::CalculateAccuracy(Player& player) const {
                                          : 0.0F;
 }
 
-void ScoreAnalysis::CalculateSoldiering(Player& player) const {
-  using Wide = long double;
-  const Wide sum = player.HealCount * Wide{factors_.Heal} + player.TotalDamage * Wide{factors_.Damage} +
-                   player.DeathCount * Wide{factors_.Death} + player.AmmoAddCount * Wide{factors_.Ammo} +
-                   player.Accuracy * Wide{100} * Wide{factors_.Accuracy} + player.BonusPoints;
-  player.Soldiering = RoundToInt32(sum);
-}
-
 void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName) {
   if (!missionPoints_) {
     if (!missions_.ActivateCurrentMissionRecord()) {
@@ -211,11 +204,7 @@ void ScoreAnalysis::AddMissionPoints(Player& player, const std::string& teamName
     missionPoints_ = ReadMissionPoints(missions_.Row());
   }
   player.Soldiering = WithObjectivePoints(player.Soldiering, *missionPoints_, game_.ObjectiveTeams, teamName);
-  const auto subtract = [&player](long double penalty, std::int32_t count) {
-    player.Soldiering = RoundToInt32(player.Soldiering - penalty * count);
-  };
-  subtract(missionPoints_->RespawnPenalty, player.RespawnCount);
-  subtract(missionPoints_->HealPenalty, player.HealCount);
+  player.Soldiering = WithPenalties(player.Soldiering, *missionPoints_, player);
 }
 
 void ScoreAnalysis::ListTeams() {

@@ -28,6 +28,9 @@ class ScoreAnalysis {
   /// left stays.
   bool CalculateScores();
 
+  /// The points of the mission that the last calculation used; none if it was without a mission or a player.
+  const std::optional<MissionPoints>& PointsOfMission() const { return missionPoints_; }
+
  private:
   void AddUpDamage();
   /// The fast way, for ordinary games. Returns false, with useless figures, if only the other way gives the
@@ -42,7 +45,6 @@ class ScoreAnalysis {
   /// owner of the membership button that was used.
   std::string NameOfMember(Player& player);
   void CalculateAccuracy(Player& player) const;
-  void CalculateSoldiering(Player& player) const;
   void AddMissionPoints(Player& player, const std::string& teamName);
   void ListTeams();
 

@@ -119,6 +119,9 @@ class Session {
   /// First line of that mission's description; empty without one.
   const std::string& MissionDescription() const { return missionDescription_; }
 
+  /// The points of the mission that the last calculation used; none if it was without a mission or a player.
+  const std::optional<MissionPoints>& PointsOfMission() const { return analysis_->PointsOfMission(); }
+
   /// Clears the game and has `read` fill it. An exception from `read` is passed on; what it has read by then
   /// stays, without scores.
   void LoadGame(const GameReader& read);

@@ -1,4 +1,4 @@
-#include "board/HitBars.h"
+#include "charts/HitBars.h"
 
 #include <gtest/gtest.h>
 

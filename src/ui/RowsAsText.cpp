@@ -1,4 +1,4 @@
-#include "board/RowsAsText.h"
+#include "ui/RowsAsText.h"
 
 #include <QAbstractItemView>
 #include <QClipboard>
