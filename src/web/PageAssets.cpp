@@ -18,12 +18,12 @@ a{color:var(--link)}
 nav{display:flex;flex-wrap:wrap;gap:.2rem 1rem;border-bottom:1px solid var(--line)}
 nav a{padding:.7rem 0}
 h1{font-size:1.5rem;line-height:1.2;margin:.9rem 0 .5rem}
-h2{font-size:1.15rem;margin:1.2rem 0 .3rem}
+.hits{margin-top:1.2rem}
 .lead{font-size:1.2rem;margin:.2rem 0}
 table{border-collapse:collapse;width:100%}
 th,td{padding:.4rem .2rem;border-bottom:1px solid var(--line);text-align:left;vertical-align:middle}
 th{font-weight:600;font-size:.85rem;overflow-wrap:normal}
-td:nth-child(n+4),.board th:nth-child(n+4),.figures td,.hits td:last-child{text-align:right;
+td:nth-child(n+4),th:nth-child(n+4),.figures td,.hits :nth-child(3){text-align:right;
 font-variant-numeric:tabular-nums;overflow-wrap:normal}
 .figures th{font-size:1rem}
 td a{display:inline-block;padding:.2rem 0}

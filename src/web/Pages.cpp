@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <span>
+#include <utility>
 
 #include "core/game/PlayerId.h"
 #include "core/text/Filled.h"
@@ -16,7 +17,7 @@ using PageParts::Code;
 namespace {
 
 /// More would make the pages of the fullest game too large together.
-constexpr std::size_t MostHitsOnPage = 60;
+constexpr std::size_t MostGunsOnPage = 60;
 
 /// The players of a game by their guns; null where nobody played with one.
 using PlayersByGun = std::array<const PublicPlayer*, PlayerCount + 1>;
@@ -80,37 +81,79 @@ std::string Guns(const PublicGame& game, const StringTable& texts) {
   return guns;
 }
 
-/// One row for the hits that the list does not tell one by one.
-std::string OtherHits(std::span<const PublicHit> hits, const StringTable& texts) {
-  std::int64_t sum = 0;
-  for (const PublicHit& hit : hits) {
-    sum += hit.Amount;
+/// What passed between a player and another gun.
+struct Duel {
+  int Gun;
+  std::int64_t Given;
+  std::int64_t Taken;
+};
+
+/// Those whom the player hit, most damage first, then those who only hit the player.
+std::vector<Duel> DuelsOf(const PublicPlayer& player) {
+  std::vector<Duel> duels;
+  std::array<std::int32_t, PlayerCount + 1> taken{};
+  for (const PublicHit& hit : player.HitsTaken) {
+    taken.at(static_cast<std::size_t>(hit.Gun)) = hit.Amount;
   }
-  return Filled(
-      "<tr><td><td>%1<td>%2\n",
-      {Escaped(Filled(texts.Text(OwnText::OtherGuns), {std::to_string(hits.size())})), std::to_string(sum)});
+  for (const PublicHit& hit : player.HitsGiven) {
+    duels.push_back({.Gun = hit.Gun,
+                     .Given = hit.Amount,
+                     .Taken = std::exchange(taken.at(static_cast<std::size_t>(hit.Gun)), 0)});
+  }
+  for (const PublicHit& hit : player.HitsTaken) {
+    if (taken.at(static_cast<std::size_t>(hit.Gun)) != 0) {
+      duels.push_back({.Gun = hit.Gun, .Given = 0, .Taken = hit.Amount});
+    }
+  }
+  return duels;
 }
 
-std::string Hits(const std::vector<PublicHit>& hits, OwnText title, const PlayersByGun& players,
-                 const StringTable& texts) {
-  std::string list = Filled("<h2>%1</h2>", {Escaped(texts.Text(title))});
-  if (hits.empty()) {
-    list += Filled("<p>%1</p>", {Escaped(texts.Text(OwnText::NobodyHit))});
-    return list;
+std::string Amounts(std::int64_t given, std::int64_t taken) {
+  const auto text = [](std::int64_t amount) { return amount != 0 ? std::to_string(amount) : "-"; };
+  return Filled("<td>%1<td>%2\n", {text(given), text(taken)});
+}
+
+/// One row for the guns that the list does not tell one by one.
+std::string OtherDuels(std::span<const Duel> duels, const StringTable& texts) {
+  std::int64_t given = 0;
+  std::int64_t taken = 0;
+  for (const Duel& duel : duels) {
+    given += duel.Given;
+    taken += duel.Taken;
   }
-  list += "<table class=hits><tbody>";
-  for (const PublicHit& hit : std::span(hits).first(std::min(hits.size(), MostHitsOnPage))) {
-    const PublicPlayer* player = players.at(static_cast<std::size_t>(hit.Gun));
-    list += Filled("<tr><td>%1<td>", {PageParts::Badge(TeamOfGun(hit.Gun), texts)});
-    if (player != nullptr) {
-      list += Filled("<a href=%1>%2</a>", {std::to_string(hit.Gun), PageParts::NameOf(*player, texts)});
-    } else {
-      list += Escaped(PageParts::Gun(hit.Gun, texts));
-    }
-    list += Filled("<td>%1\n", {std::to_string(hit.Amount)});
+  std::string row = Filled("<tr><td><td>%1",
+                           {Escaped(Filled(texts.Text(OwnText::OtherGuns), {std::to_string(duels.size())}))});
+  row += Amounts(given, taken);
+  return row;
+}
+
+std::string DuelRow(const Duel& duel, const PlayersByGun& players, const StringTable& texts) {
+  const PublicPlayer* player = players.at(static_cast<std::size_t>(duel.Gun));
+  std::string row = Filled("<tr><td>%1<td>", {PageParts::Badge(TeamOfGun(duel.Gun), texts)});
+  if (player != nullptr) {
+    row += Filled("<a href=%1>%2</a>", {std::to_string(duel.Gun), PageParts::NameOf(*player, texts)});
+  } else {
+    row += Escaped(PageParts::Gun(duel.Gun, texts));
   }
-  if (hits.size() > MostHitsOnPage) {
-    list += OtherHits(std::span(hits).subspan(MostHitsOnPage), texts);
+  row += Amounts(duel.Given, duel.Taken);
+  return row;
+}
+
+/// Whom the player hit, and who hit the player.
+std::string Duels(const PublicPlayer& player, const PlayersByGun& players, const StringTable& texts) {
+  const std::vector<Duel> duels = DuelsOf(player);
+  std::string list = Filled("<table class=hits><thead><tr><th><th>%1<th>%2<th>%3</thead><tbody>",
+                            {Escaped(texts.Text(104)), Escaped(texts.Text(OwnText::WhomIHit)),
+                             Escaped(texts.Text(OwnText::WhoHitMe))});
+  if (duels.empty()) {
+    list += Filled("<tr><td><td>%1<td>-<td>-", {Escaped(texts.Text(OwnText::NobodyHit))});
+  }
+  const auto told = std::span(duels).first(std::min(duels.size(), MostGunsOnPage));
+  for (const Duel& duel : told) {
+    list += DuelRow(duel, players, texts);
+  }
+  if (told.size() < duels.size()) {
+    list += OtherDuels(std::span(duels).subspan(told.size()), texts);
   }
   list += "</tbody></table>";
   return list;
@@ -144,8 +187,7 @@ std::string OwnResults(const PublicPlayer& player, const PublicGame& game, const
   page += Filled("<p class=lead>%1</p><p><a href=\"./\">%2</a></p>",
                  {Escaped(place), Escaped(PageParts::TitleOf(game, texts))});
   page += Figures(player, texts);
-  page += Hits(player.HitsGiven, OwnText::WhomIHit, players, texts);
-  page += Hits(player.HitsTaken, OwnText::WhoHitMe, players, texts);
+  page += Duels(player, players, texts);
   return page;
 }
 

@@ -91,24 +91,24 @@ TEST(PageOfAGun, HasItsFiguresAndHits) {
         "<th>Shots Fired<td>77", "<th>W.I.A.<td>2", "<th>K.I.A.<td>1", "<th>Ammo Adds<td>4"}) {
     EXPECT_THAT(page, HasSubstr(figure));
   }
-  EXPECT_THAT(page, HasSubstr("<b class=t1>R</b><td><a href=1>Red 0</a><td>200"));
-  EXPECT_THAT(page, HasSubstr("<b class=t3>Y</b><td><a href=68>Yellow 3</a><td>100"));
+  EXPECT_THAT(page, HasSubstr("<b class=t1>R</b><td><a href=1>Red 0</a><td>200<td>50\n"));
+  EXPECT_THAT(page, HasSubstr("<b class=t3>Y</b><td><a href=68>Yellow 3</a><td>100<td>-\n"));
 }
 
 TEST(PageOfAGun, SaysWhenItHitNobodyAndHasNoAccuracy) {
   EXPECT_THAT(BodyOf(SmallGame(), "/en/g/1/68"),
-              AllOf(HasSubstr("<p>Nobody</p>"), HasSubstr("<th>Accuracy<td>-")));
+              AllOf(HasSubstr("<td>Nobody<td>-<td>-"), HasSubstr("<th>Accuracy<td>-")));
 }
 
 TEST(PageOfAGun, NamesAGunThatTookNoPartWithoutALink) {
   PublicGame game = SmallGame();
   game.Players[0].HitsTaken = {{.Gun = 2, .Amount = 9}};
-  EXPECT_THAT(BodyOf(game, "/en/g/1/40"), HasSubstr("<td>Red 1<td>9"));
+  EXPECT_THAT(BodyOf(game, "/en/g/1/40"), HasSubstr("<td>Red 1<td>-<td>9\n"));
 }
 
 TEST(PageOfAGun, AddsUpTheHitsBeyondSixty) {
   const std::string page = BodyOf(FullGameOf(62), "/en/g/1/1");
-  EXPECT_THAT(page, AllOf(HasSubstr("<td>2 more<td>2123"), Not(HasSubstr("<a href=61>"))));
+  EXPECT_THAT(page, AllOf(HasSubstr("<td>2 more<td>2123<td>2123"), Not(HasSubstr("<a href=61>"))));
 }
 
 TEST(PageOfABoard, HasTheRowsInTheirPlaces) {

@@ -72,7 +72,7 @@ TEST_F(PagesOfAnEvening, DropGamesWhenTheyAreTwelveHoursOld) {
 }
 
 TEST_F(PagesOfAnEvening, StayWithinTheirBytes) {
-  ResultsPages small(Language::English, {.Games = 20, .Age = 12h, .Bytes = 100'000});
+  ResultsPages small(Language::English, {.Games = 20, .Age = 12h, .Bytes = 30'000});
   small.Put(FullGameOf(10, 1), 0h);
   small.Put(FullGameOf(10, 2), 0h);
   EXPECT_FALSE(small.Pages().contains("/en/g/1/"));

@@ -110,6 +110,7 @@ class ResultsProgram {
     streams.Output = reports.WriteEnd.Number();
     process_ =
         StartProcess({TESSARINE_RESULTS_PROGRAM, address, std::to_string(port)}, streams, ProcessKind::Child);
+    reports.WriteEnd.Close();  // or the end of the program would not end the stream
     input_ = std::move(orders.WriteEnd);
     output_ = std::move(reports.ReadEnd);
     if (const auto report = NextReport(); report && report->Kind == ReportKind::Port) {
