@@ -1,0 +1,189 @@
+#include "web/server/PageHost.h"
+
+#include <microhttpd.h>
+#include <strings.h>
+#include <sys/socket.h>
+
+#include <algorithm>
+#include <cstring>
+#include <list>
+#include <string>
+#include <vector>
+
+#include "web/server/Answers.h"
+
+namespace {
+
+/// What is read of a request's head.
+struct RequestHead {
+  std::string_view Host;
+  int Hosts = 0;
+  std::string_view Known;
+  bool HasBody = false;
+};
+
+MHD_Result ReadHead(void* cls, MHD_ValueKind /*kind*/, const char* key, const char* value) {
+  auto& head = *static_cast<RequestHead*>(cls);
+  if (value != nullptr && strcasecmp(key, MHD_HTTP_HEADER_HOST) == 0) {
+    head.Host = value;
+    ++head.Hosts;
+  } else if (value != nullptr && strcasecmp(key, MHD_HTTP_HEADER_IF_NONE_MATCH) == 0) {
+    head.Known = value;
+  } else if (strcasecmp(key, MHD_HTTP_HEADER_CONTENT_LENGTH) == 0 ||
+             strcasecmp(key, MHD_HTTP_HEADER_TRANSFER_ENCODING) == 0) {
+    head.HasBody = true;
+  }
+  return MHD_YES;
+}
+
+MHD_Result AcceptPrivate(void* /*cls*/, const sockaddr* address, socklen_t /*length*/) {
+  return IsPrivate(*address) ? MHD_YES : MHD_NO;
+}
+
+/// Paths are compared as they come: none of ours needs an escape.
+std::size_t KeepEscapes(void* /*cls*/, MHD_Connection* /*connection*/, char* text) {
+  return std::strlen(text);
+}
+
+bool SameHost(std::string_view host, const std::string& ours) {
+  return host.size() == ours.size() && strncasecmp(host.data(), ours.data(), ours.size()) == 0;
+}
+
+struct OpenConnection {
+  int Handle;
+  Visitors::Time Since;  ///< end of its last answer
+};
+
+}  // namespace
+
+class PageHost::Daemon {
+ public:
+  Daemon(const ListenSocket& socket, const ServedPages& pages, Visitors& visitors, const Limits& limits)
+      : answers_(pages), visitors_(visitors), hosts_(HostsOf(socket.Served)), limits_(limits) {
+    daemon_ = MHD_start_daemon(MHD_USE_EPOLL | MHD_USE_TURBO, 0, &AcceptPrivate, nullptr, &Daemon::Asked,
+                               this, MHD_OPTION_LISTEN_SOCKET, socket.Handle, MHD_OPTION_CONNECTION_LIMIT,
+                               limits.Connections, MHD_OPTION_PER_IP_CONNECTION_LIMIT, limits.OfAddress,
+                               MHD_OPTION_CONNECTION_MEMORY_LIMIT, limits.Head, MHD_OPTION_CONNECTION_TIMEOUT,
+                               static_cast<unsigned>(limits.Request.count()), MHD_OPTION_STRICT_FOR_CLIENT, 1,
+                               MHD_OPTION_SIGPIPE_HANDLED_BY_APP, 1, MHD_OPTION_UNESCAPE_CALLBACK,
+                               &KeepEscapes, nullptr, MHD_OPTION_NOTIFY_CONNECTION, &Daemon::Connected, this,
+                               MHD_OPTION_NOTIFY_COMPLETED, &Daemon::Answered, this, MHD_OPTION_END);
+  }
+  ~Daemon() {
+    if (daemon_ != nullptr) {
+      MHD_stop_daemon(daemon_);
+    }
+  }
+  Daemon(const Daemon&) = delete;
+  Daemon& operator=(const Daemon&) = delete;
+
+  MHD_Daemon* Library() const { return daemon_; }
+  std::size_t Connections() const { return open_.size(); }
+  void Forget() { answers_.Forget(); }
+
+  void EndSlowOnes(Visitors::Time now) {
+    for (const OpenConnection& connection : open_) {
+      if (now - connection.Since >= limits_.Request) {
+        shutdown(connection.Handle, SHUT_RDWR);
+      }
+    }
+  }
+
+ private:
+  using Place = std::list<OpenConnection>::iterator;
+
+  static MHD_Result Asked(void* cls, MHD_Connection* connection, const char* url, const char* method,
+                          const char* /*version*/, const char* /*upload*/, std::size_t* /*uploadSize*/,
+                          void** request) {
+    RequestHead head;
+    MHD_get_connection_values(connection, MHD_HEADER_KIND, &ReadHead, &head);
+    const std::string_view asked = method;
+    const bool reads = asked == MHD_HTTP_METHOD_GET || asked == MHD_HTTP_METHOD_HEAD;
+    // An answer to the first call, when only the head was read, ends the connection: right for those who want
+    // to send something, but phones shall keep theirs.
+    if (reads && !head.HasBody && *request == nullptr) {
+      *request = connection;
+      return MHD_YES;
+    }
+    const Answers::Choice choice = static_cast<Daemon*>(cls)->Choose(connection, url, reads, head);
+    return MHD_queue_response(connection, choice.Status, choice.What);
+  }
+
+  Answers::Choice Choose(MHD_Connection* connection, std::string_view path, bool reads,
+                         const RequestHead& head) {
+    const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
+    visitors_.Note(AddressKey(*info->client_addr), std::chrono::steady_clock::now());
+    const bool ours = head.Hosts == 1 && std::ranges::any_of(hosts_, [&head](const std::string& host) {
+                        return SameHost(head.Host, host);
+                      });
+    if (!ours) {
+      return answers_.ForOtherHost();
+    }
+    return reads ? answers_.For(path, head.Known) : answers_.ForOtherMethod();
+  }
+
+  static void Connected(void* cls, MHD_Connection* connection, void** context,
+                        MHD_ConnectionNotificationCode what) {
+    auto& open = static_cast<Daemon*>(cls)->open_;
+    if (what == MHD_CONNECTION_NOTIFY_STARTED) {
+      const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD);
+      open.push_front({.Handle = info->connect_fd, .Since = std::chrono::steady_clock::now()});
+      *context = new Place(open.begin());
+    } else {
+      const std::unique_ptr<Place> place(static_cast<Place*>(*context));
+      open.erase(*place);
+      *context = nullptr;
+    }
+  }
+
+  static void Answered(void* /*cls*/, MHD_Connection* connection, void** /*request*/,
+                       MHD_RequestTerminationCode /*how*/) {
+    const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
+    if (info->socket_context != nullptr) {
+      (*static_cast<Place*>(info->socket_context))->Since = std::chrono::steady_clock::now();
+    }
+  }
+
+  Answers answers_;
+  Visitors& visitors_;
+  std::vector<std::string> hosts_;
+  Limits limits_;
+  std::list<OpenConnection> open_;
+  MHD_Daemon* daemon_ = nullptr;
+};
+
+PageHost::PageHost(const ListenSocket& socket, const ServedPages& pages, Visitors& visitors,
+                   const Limits& limits)
+    : daemon_(std::make_unique<Daemon>(socket, pages, visitors, limits)) {}
+
+PageHost::~PageHost() = default;
+
+bool PageHost::Serving() const {
+  return daemon_->Library() != nullptr;
+}
+
+int PageHost::Handle() const {
+  return MHD_get_daemon_info(daemon_->Library(), MHD_DAEMON_INFO_EPOLL_FD)->epoll_fd;
+}
+
+void PageHost::Run() {
+  MHD_run(daemon_->Library());
+}
+
+std::chrono::milliseconds PageHost::Due() const {
+  MHD_UNSIGNED_LONG_LONG pause = 0;
+  return std::chrono::milliseconds(
+      MHD_get_timeout(daemon_->Library(), &pause) == MHD_YES ? static_cast<std::int64_t>(pause) : -1);
+}
+
+void PageHost::EndSlowOnes(Visitors::Time now) {
+  daemon_->EndSlowOnes(now);
+}
+
+std::size_t PageHost::Connections() const {
+  return daemon_->Connections();
+}
+
+void PageHost::Forget() {
+  daemon_->Forget();
+}

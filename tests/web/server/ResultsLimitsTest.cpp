@@ -1,0 +1,148 @@
+#include <gmock/gmock.h>
+#include <sys/resource.h>
+
+#include <algorithm>
+#include <memory>
+#include <vector>
+
+#include "tests/web/server/ResultsProgram.h"
+#include "web/server/PageHost.h"
+
+namespace {
+
+using testing::AnyOf;
+using testing::StartsWith;
+
+constexpr const char* Found = "HTTP/1.1 200 ";
+
+class CrowdedServer : public testing::Test {
+ protected:
+  void SetUp() override {
+    ASSERT_GT(program.Port, 0);
+    program.Put("/", "<p>front</p>");
+    program.Settle();
+  }
+
+  ResultsProgram program{18'300};
+};
+
+/// Lets this program have that many handles.
+void AllowHandles(rlim_t count) {
+  rlimit limit{};
+  getrlimit(RLIMIT_NOFILE, &limit);
+  limit.rlim_cur = std::min(limit.rlim_max, std::max(limit.rlim_cur, count));
+  setrlimit(RLIMIT_NOFILE, &limit);
+}
+
+TEST_F(CrowdedServer, AnswersWhileOthersSendOnlyHalfARequest) {
+  std::vector<std::unique_ptr<RawClient>> half;
+  for (int i = 0; i < 100; ++i) {
+    half.push_back(std::make_unique<RawClient>(program.Port));
+    half.back()->Send("GET / HTTP/1.1\r\nHost: 127.");
+  }
+  EXPECT_THAT(program.Get("/"), StartsWith(Found));
+}
+
+TEST_F(CrowdedServer, ReadsARequestThatComesByteByByte) {
+  RawClient slow(program.Port);
+  for (const char byte : "GET / HTTP/1.1\r\n" + program.Host() + "Connection: close\r\n\r\n") {
+    ASSERT_TRUE(slow.Send(std::string(1, byte)));
+    ASSERT_THAT(program.Get("/"), StartsWith(Found));
+  }
+  EXPECT_THAT(slow.ReadAll(), StartsWith(Found));
+}
+
+TEST_F(CrowdedServer, RefusesHeadsAndPathsBeyondTheirLimit) {
+  for (const std::size_t size : {7'000U, 100'000U, 10'000'000U}) {
+    for (const std::string& request :
+         {"GET /" + std::string(size, 'a') + " HTTP/1.1\r\n" + program.Host() + "\r\n",
+          "GET / HTTP/1.1\r\n" + program.Host() + "X: " + std::string(size, 'a') + "\r\n\r\n"}) {
+      RawClient client(program.Port);
+      client.Send(request);
+      // The rest of a long request may end the connection before the answer is read.
+      EXPECT_THAT(client.ReadAll(), AnyOf("", StartsWith("HTTP/1.1 414 "), StartsWith("HTTP/1.1 431 "),
+                                          StartsWith("HTTP/1.1 413 ")));
+    }
+  }
+  EXPECT_THAT(program.Get("/"), StartsWith(Found));
+}
+
+TEST_F(CrowdedServer, OutlivesWhatIsNoRequest) {
+  for (const std::string& rubbish :
+       {std::string(5000, '\0'), std::string("\r\n\r\n\r\n"), std::string("\x16\x03\x01\x02\x00", 5),
+        std::string("GET\r\n\r\n"), std::string("GET / HTTP/9.9\r\n\r\n"), std::string(100'000, '\xFF'),
+        "GET / HTTP/1.1\r\n" + program.Host() + "Content-Length: -1\r\n\r\n",
+        "GET / HTTP/1.1\r\n" + program.Host() + "Transfer-Encoding: chunked\r\n\r\nFFFFFFFFFFFFFFFFFF\r\n",
+        "GET / HTTP/1.1\r\n" + program.Host() + " folded\r\n\r\n"}) {
+    RawClient(program.Port).Send(rubbish);
+    EXPECT_THAT(program.Get("/"), StartsWith(Found));
+  }
+}
+
+TEST_F(CrowdedServer, EndsTheConnectionOfAGetWithABody) {
+  RawClient client(program.Port);
+  client.Send("GET / HTTP/1.1\r\n" + program.Host() + "Content-Length: 1000000000\r\n\r\nabc");
+  EXPECT_TRUE(client.IsClosed());
+}
+
+TEST_F(CrowdedServer, RefusesMoreThanFiveHundredOfOneAddressAndServesAgainAfterThem) {
+  AllowHandles(2000);
+  std::vector<std::unique_ptr<RawClient>> many;
+  for (int i = 0; i < 1000; ++i) {
+    many.push_back(std::make_unique<RawClient>(program.Port));
+  }
+  EXPECT_TRUE(many[999]->IsClosed());
+  ASSERT_TRUE(many[0]->Send("GET / HTTP/1.1\r\n" + program.Host() + "\r\n"));
+  EXPECT_THAT(many[0]->ReadAnswer(), StartsWith(Found));
+  many.clear();
+  std::string answer;
+  for (int tries = 0; tries < 1000 && !answer.starts_with(Found); ++tries) {
+    answer = program.Get("/");  // until it has noticed that they went
+  }
+  EXPECT_THAT(answer, StartsWith(Found));
+}
+
+/// The part that answers, run by the test step by step.
+class OwnHost : public testing::Test {
+ protected:
+  void SetUp() override {
+    socket = Listen({.Address = "127.0.0.1", .Port = 18'400});
+    ASSERT_GE(socket.Handle, 0);
+    host = std::make_unique<PageHost>(socket, pages, visitors);
+    ASSERT_TRUE(host->Serving());
+  }
+
+  /// Runs the host until it has that many connections.
+  void RunUntil(std::size_t connections) {
+    for (int tries = 0; tries < 1000 && host->Connections() != connections; ++tries) {
+      pollfd wait{.fd = host->Handle(), .events = POLLIN, .revents = 0};
+      poll(&wait, 1, 100);
+      host->Run();
+    }
+    ASSERT_EQ(host->Connections(), connections);
+  }
+
+  ServedPages pages;
+  Visitors visitors;
+  ListenSocket socket;
+  std::unique_ptr<PageHost> host;
+};
+
+TEST_F(OwnHost, EndsAConnectionWhoseRequestTakesTooLong) {
+  RawClient slow(socket.Served.Port);
+  slow.Send("GET / HTTP/1.1\r\nHos");
+  RunUntil(1);
+  const auto now = std::chrono::steady_clock::now();
+  host->EndSlowOnes(now);
+  host->Run();
+  EXPECT_EQ(host->Connections(), 1U);
+  host->EndSlowOnes(now + PageHost::Limits().Request);
+  RunUntil(0);
+  EXPECT_TRUE(slow.IsClosed());
+}
+
+TEST_F(OwnHost, WaitsForNothingWithoutConnections) {
+  EXPECT_LT(host->Due().count(), 0);
+}
+
+}  // namespace
