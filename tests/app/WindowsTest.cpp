@@ -2,6 +2,7 @@
 
 #include "app/About.h"
 #include "app/UploadProgress.h"
+#include "archive/copies/BackupCopies.h"
 #include "board/AdminData.h"
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
@@ -80,6 +81,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<BoxConfig>("mnuBoxConfig");
   LookAt<ChargeiButton>("mnuChargeiButton");
   LookAt<ISD_rec>("mnuSoundRecorder");
+  LookAt<BackupCopies>("mnuBackupCopies");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }

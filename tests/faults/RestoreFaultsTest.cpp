@@ -46,7 +46,7 @@ class CopyRestored : public FaultyOperation {
       case EACCES:
         return general || has("Permission denied") || has("read-only");
       case EAGAIN:
-        return has("Could not lock file");
+        return has("Could not lock file") || has("Disk error");
       case EIO:
         // A page that cannot be read makes a copy as unusable as one that is damaged.
         return general || has("read-only") || has("Unrecognized database format");
