@@ -16,6 +16,10 @@ std::optional<Member> MemberLookup::LoadMember(std::int32_t contactId) {
   return Member{contactId, text("FirstName"), text("LastName"), text("NickName")};
 }
 
+std::string MemberLookup::NickNameOf(std::int32_t contactId) {
+  return rsMembers_.WalkTo("ContactID", std::int64_t{contactId}) ? TextOf(rsMembers_.Fields("NickName")) : "";
+}
+
 MemberHistory MemberLookup::LoadHistory(std::int32_t contactId) {
   rsMembers_.WalkTo("ContactID", std::int64_t{contactId});
   const auto number = [this](const char* column) { return NumberOf(rsMembers_.Fields(column)); };

@@ -36,6 +36,9 @@ class MemberLookup {
   /// The member with this `ContactID`. If there is none, a box says so.
   std::optional<Member> LoadMember(std::int32_t contactId);
 
+  /// The nickname of the member with this `ContactID`, without a box: empty if there is none.
+  std::string NickNameOf(std::int32_t contactId);
+
   /// Throws RuntimeError 3021 if the member does not exist (any more).
   MemberHistory LoadHistory(std::int32_t contactId);
 

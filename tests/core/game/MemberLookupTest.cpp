@@ -41,6 +41,14 @@ TEST_F(Looking, TakesTheFullNameWithoutANickname) {
   EXPECT_EQ(cy->GetPlayerName(true), "Cy Fox");
 }
 
+TEST_F(Looking, TellsNicknamesWithoutABox) {
+  EXPECT_EQ(venue.Members->NickNameOf(5), "Mole");
+  EXPECT_EQ(venue.Members->NickNameOf(2), "");
+  EXPECT_EQ(venue.Members->NickNameOf(6), "");
+  EXPECT_EQ(venue.Members->NickNameOf(3), "");
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
 TEST_F(Looking, KeepsItsAnswerWhereverTheCursorGoes) {
   const auto bo = venue.Members->LoadMember(5);
   venue.Members->LoadMember(2);
