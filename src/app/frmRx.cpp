@@ -58,6 +58,7 @@ bool frmRx::FormLoad() {
   ui_->mnuChargeiButton->setEnabled(services_.Wire != nullptr);
   ConnectCommands();
   SetUpDesk();
+  SetUpAudience();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
@@ -179,6 +180,12 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuBoxConfig, &frmRx::ConfigureBoxes},
                                {ui_->mnuChargeiButton, &frmRx::ChargeButtons},
                                {ui_->mnuSoundRecorder, &frmRx::RecordSounds},
+                               {ui_->mnuAudienceBoard, &frmRx::ToggleAudienceBoard},
+                               {ui_->mnuAudienceResults, &frmRx::ShowAudienceResults},
+                               {ui_->mnuAudienceVenue, &frmRx::ShowAudienceVenue},
+                               {ui_->mnuAudienceBlank, &frmRx::BlankAudienceBoard},
+                               {ui_->mnuGuestNames, &frmRx::EnterGuestNames},
+                               {ui_->mnuAudienceSettings, &frmRx::ShowAudienceSettings},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
   // menu.
@@ -218,6 +225,9 @@ void frmRx::closeEvent(QCloseEvent* event) {
   if (desk_) {
     desk_->End();
   }
+  if (audience_) {
+    audience_->End();
+  }
   session_.Close();
   wordProcessorTimer_.stop();
   services_.WordProcessor.Quit();
@@ -235,6 +245,7 @@ void frmRx::Show(SessionChange change) {
     case SessionChange::Cleared:
       ui_->ScoreDisplay->ForgetSelection();
       downloadedGuns_.Forget();
+      guests_.Forget();
       break;
     case SessionChange::Missions:
       ShowMissions();

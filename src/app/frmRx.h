@@ -10,7 +10,10 @@
 #include "app/Desk.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
+#include "audience/AudienceBoard.h"
+#include "audience/AudienceCopy.h"
 #include "core/data/IniReader.h"
+#include "core/game/GuestList.h"
 #include "core/game/Session.h"
 #include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
@@ -108,6 +111,17 @@ class frmRx : public QMainWindow {
   /// The player of the context menu's commands with the member's name.
   std::string SelectedPlayerText();
 
+  // The board for the audience.
+  void SetUpAudience();
+  void ToggleAudienceBoard();
+  void ShowAudienceResults();
+  void ShowAudienceVenue();
+  void BlankAudienceBoard();
+  void EnterGuestNames();
+  void ShowAudienceSettings();
+  /// Shows whether the board is on, and a small copy of it.
+  void FollowAudienceBoard();
+
   // What the board and the windows remember of the last run.
   void RestorePlaces();
   void ConnectLetters();
@@ -132,5 +146,7 @@ class frmRx : public QMainWindow {
   QTimer wordProcessorTimer_;
   Commands commands_;
   std::optional<Desk> desk_;
+  GuestList guests_;
+  std::optional<AudienceBoard> audience_;
   ManualKey manual_;
 };

@@ -59,6 +59,8 @@ const std::vector<WindowPage>& WindowPages() {
       {"FirmwareFlash", "Firmware", "固件"},
       {"frmBootload", "Devices with a PIC24F boot loader", "带 PIC24F 引导程序的设备"},
       {"ISD_rec", "Sound recorder", "声音录制"},
+      {"AudienceSettings", "Audience board", "观众大屏"},
+      {"GuestNameEntry", "Audience board", "观众大屏"},
       {"About", "If you need help", "需要帮助时"}};
   return pages;
 }

@@ -2,6 +2,8 @@
 
 #include "app/About.h"
 #include "app/UploadProgress.h"
+#include "audience/AudienceSettings.h"
+#include "audience/GuestNameEntry.h"
 #include "board/AdminData.h"
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
@@ -72,6 +74,8 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<Settings>("mnuCommPort");
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
+  LookAt<AudienceSettings>("mnuAudienceSettings");
+  LookAt<GuestNameEntry>("mnuGuestNames");
   LookAt<Scenarios>("mnuSetupMissions");
   LookAt<FirmwareFlash>("mnuFirmwareUpdate");
   LookAt<RemoteManage>("mnuRemoteManage");
@@ -107,6 +111,11 @@ TEST_P(Windows, OfAPlayerAreCaredFor) {
   });
   venue.ChooseInPopup(0, "mnuBonusPoints");
   EXPECT_EQ(bonus.Runs(), 1);
+}
+
+TEST_P(Windows, OfTheGuestsIsCaredFor) {
+  venue.LoadGame(GameOfManyHits());
+  LookAt<GuestNameEntry>("mnuGuestNames");
 }
 
 TEST_P(Windows, OfANewMissionIsCaredFor) {
