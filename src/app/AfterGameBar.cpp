@@ -100,6 +100,23 @@ void AfterGameBar::ShowStep(GameStep step) {
   shown.Button->setToolTip(done.isEmpty() ? TipOf(*shown.Item) : TipOf(*shown.Item) + u'\n' + done);
 }
 
+void AfterGameBar::SetEnd(QWidget* end) {
+  end_ = end;
+  end_->hide();
+  static_cast<QHBoxLayout*>(layout())->addWidget(end_);
+}
+
+void AfterGameBar::SetEndWanted(bool isWanted) {
+  isEndWanted_ = isWanted;
+  ShowEnd();
+}
+
+void AfterGameBar::ShowEnd() {
+  if (end_ != nullptr) {
+    end_->setVisible(isEndWanted_ && NeededWidth(true) + Gap + end_->sizeHint().width() <= width());
+  }
+}
+
 QSize AfterGameBar::minimumSizeHint() const {
   return strings_ == nullptr ? QFrame::minimumSizeHint()
                              : QSize(NeededWidth(false), layout()->minimumSize().height());
@@ -123,6 +140,7 @@ void AfterGameBar::FitCaptions() {
   if (strings_ == nullptr) {
     return;
   }
+  ShowEnd();
   const Qt::ToolButtonStyle style =
       NeededWidth(true) <= width() ? Qt::ToolButtonTextBesideIcon : Qt::ToolButtonIconOnly;
   for (const Step& step : steps_) {

@@ -24,6 +24,10 @@ class AfterGameBar : public QFrame {
   /// The button of a step.
   QToolButton& Button(GameStep step) const { return *steps_[static_cast<std::size_t>(step)].Button; }
 
+  /// A widget at the right end, shown while it is wanted and has room beside the captions. The bar owns it.
+  void SetEnd(QWidget* end);
+  void SetEndWanted(bool isWanted);
+
   QSize minimumSizeHint() const override;
 
  protected:
@@ -42,7 +46,10 @@ class AfterGameBar : public QFrame {
   void FitCaptions();
   /// Width of the bar with captions or with signs alone.
   int NeededWidth(bool captions) const;
+  void ShowEnd();
 
   const StringTable* strings_ = nullptr;
   std::array<Step, GameStepCount> steps_{};
+  QWidget* end_ = nullptr;
+  bool isEndWanted_ = false;
 };

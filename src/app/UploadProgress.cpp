@@ -42,6 +42,9 @@ void UploadProgress::SetMaximum(int maximum) {
 void UploadProgress::SetProgress(int value) {
   ui_->Progress->setValue(value);
   ui_->UploadIndex->setText(QString::number(value));
+  if (Received) {
+    Received(value - 1, ui_->Progress->maximum());
+  }
 }
 
 void UploadProgress::StartTransferAnim() {

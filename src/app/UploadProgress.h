@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QDialog>
+#include <functional>
 #include <memory>
 
 #include "devices/baseunit/BaseUnitDownload.h"
@@ -28,6 +29,9 @@ class UploadProgress : public QDialog, public DownloadProgress {
   void StopTransferAnim();
 
   void reject() override;
+
+  /// Called with how many guns have come in, and of how many, before each further one.
+  std::function<void(int received, int expected)> Received;
 
  protected:
   void keyPressEvent(QKeyEvent* event) override;

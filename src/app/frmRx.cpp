@@ -59,6 +59,7 @@ bool frmRx::FormLoad() {
   ConnectCommands();
   SetUpDesk();
   SetUpKeeping();
+  SetUpAudience();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
@@ -206,6 +207,12 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuChargeiButton, &frmRx::ChargeButtons},
                                {ui_->mnuSoundRecorder, &frmRx::RecordSounds},
                                {ui_->mnuBackupCopies, &frmRx::ShowBackupCopies},
+                               {ui_->mnuAudienceBoard, &frmRx::ToggleAudienceBoard},
+                               {ui_->mnuAudienceResults, &frmRx::ShowAudienceResults},
+                               {ui_->mnuAudienceVenue, &frmRx::ShowAudienceVenue},
+                               {ui_->mnuAudienceBlank, &frmRx::BlankAudienceBoard},
+                               {ui_->mnuGuestNames, &frmRx::EnterGuestNames},
+                               {ui_->mnuAudienceSettings, &frmRx::ShowAudienceSettings},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
   // menu.
@@ -247,6 +254,9 @@ void frmRx::closeEvent(QCloseEvent* event) {
     desk_->End();
     charts_->Close();
   }
+  if (audience_) {
+    audience_->End();
+  }
   session_.Close();
   wordProcessorTimer_.stop();
   services_.WordProcessor.Quit();
@@ -264,6 +274,7 @@ void frmRx::Show(SessionChange change) {
     case SessionChange::Cleared:
       ui_->ScoreDisplay->ForgetSelection();
       downloadedGuns_.Forget();
+      guests_.Forget();
       break;
     case SessionChange::Missions:
       ShowMissions();

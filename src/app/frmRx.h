@@ -12,7 +12,10 @@
 #include "app/GameKeeping.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
+#include "audience/AudienceBoard.h"
+#include "audience/AudienceCopy.h"
 #include "core/data/IniReader.h"
+#include "core/game/GuestList.h"
 #include "core/game/Session.h"
 #include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
@@ -118,6 +121,17 @@ class frmRx : public QMainWindow {
   /// The player of the context menu's commands with the member's name.
   std::string SelectedPlayerText();
 
+  // The board for the audience.
+  void SetUpAudience();
+  void ToggleAudienceBoard();
+  void ShowAudienceResults();
+  void ShowAudienceVenue();
+  void BlankAudienceBoard();
+  void EnterGuestNames();
+  void ShowAudienceSettings();
+  /// Shows whether the board is on, and a small copy of it.
+  void FollowAudienceBoard();
+
   // What the board and the windows remember of the last run.
   void RestorePlaces();
   void ConnectLetters();
@@ -144,5 +158,7 @@ class frmRx : public QMainWindow {
   std::optional<Desk> desk_;
   std::optional<GameKeeping> keeping_;
   std::optional<BoardCharts> charts_;
+  GuestList guests_;
+  std::optional<AudienceBoard> audience_;
   ManualKey manual_;
 };

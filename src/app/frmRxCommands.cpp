@@ -51,11 +51,21 @@ void frmRx::GetScoreData() {
   keeping_->BeginPull(GameSource::Cable);
   {
     downloading_ = true;
-    const auto ended = qScopeGuard([this] { downloading_ = false; });
+    DownloadResult result;
+    AudienceState& audience = audience_->State();
+    const auto ended = qScopeGuard([&] {
+      downloading_ = false;
+      audience.EndPull(result.Received > 0);
+    });
     UploadProgress progress(services_.Strings, this);
-    desk_->TellDownload(BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes,
-                                         services_.Time, progress, downloadedGuns_)
-                            .GetScores());
+    progress.Received = [&audience](int received, int expected) {
+      audience.TellReceived(received, expected);
+    };
+    audience.BeginPull();
+    result = BaseUnitDownload(services_.MSComm1, *commPort_, services_.Events, services_.Boxes,
+                              services_.Time, progress, downloadedGuns_)
+                 .GetScores();
+    desk_->TellDownload(result);
   }
   session_.CalculateScores();
 }
@@ -203,6 +213,7 @@ void frmRx::UpdateFirmware() {
 
 void frmRx::ManageRemotely() {
   keeping_->BeginPull(GameSource::Radio);
+  bool withGuns = false;
   RemoteManage({.MSComm1 = services_.MSComm1,
                 .Port = *commPort_,
                 .Events = services_.Events,
@@ -210,9 +221,14 @@ void frmRx::ManageRemotely() {
                 .Time = services_.Time,
                 .Strings = services_.Strings,
                 .Game = session_.Game(),
-                .BeforeGun = [this](int index) { downloadedGuns_.ComesOtherwise(index); }},
+                .BeforeGun =
+                    [&](int index) {
+                      downloadedGuns_.ComesOtherwise(index);
+                      withGuns = true;
+                    }},
                this)
       .exec();
+  audience_->State().EndPull(withGuns);
   session_.CalculateScores();
 }
 

@@ -29,8 +29,10 @@ bool IsRemembered(const QObject& watched) {
   const auto& widget = static_cast<const QWidget&>(watched);
   const bool isBox = qobject_cast<const QMessageBox*>(&widget) != nullptr ||
                      qobject_cast<const QFileDialog*>(&widget) != nullptr;
+  // One without a frame has no place of the operator's choice.
+  const bool hasFrame = !widget.windowFlags().testFlag(Qt::FramelessWindowHint);
   const Qt::WindowType type = widget.windowType();
-  return !isBox && (type == Qt::Window || type == Qt::Dialog);
+  return !isBox && hasFrame && (type == Qt::Window || type == Qt::Dialog);
 }
 
 int OverlapOf(const QRect& first, const QRect& second) {

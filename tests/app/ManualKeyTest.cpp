@@ -71,6 +71,8 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
       {"mnuBackupCopies", {"Backup copies", "备份副本"}},
       {"mnuCommPort", {"Settings", "设置"}},
       {"mnuSoldieringCalc", {"Soldiering calculation", "战功计算"}},
+      {"mnuGuestNames", {"Audience board", "观众大屏"}},
+      {"mnuAudienceSettings", {"Audience board", "观众大屏"}},
       {"mnuAbout", {"If you need help", "需要帮助时"}}};
   for (const auto& [item, page] : windows) {
     ExpectPage([this, item = item] { venue.Trigger(item); }, page);

@@ -3,6 +3,8 @@
 #include "app/About.h"
 #include "app/UploadProgress.h"
 #include "archive/copies/BackupCopies.h"
+#include "audience/AudienceSettings.h"
+#include "audience/GuestNameEntry.h"
 #include "board/AdminData.h"
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
@@ -75,6 +77,8 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<ExportGames>("mnuExport");
+  LookAt<AudienceSettings>("mnuAudienceSettings");
+  LookAt<GuestNameEntry>("mnuGuestNames");
   LookAt<Scenarios>("mnuSetupMissions");
   LookAt<FirmwareFlash>("mnuFirmwareUpdate");
   LookAt<RemoteManage>("mnuRemoteManage");
@@ -111,6 +115,11 @@ TEST_P(Windows, OfAPlayerAreCaredFor) {
   });
   venue.ChooseInPopup(0, "mnuBonusPoints");
   EXPECT_EQ(bonus.Runs(), 1);
+}
+
+TEST_P(Windows, OfTheGuestsIsCaredFor) {
+  venue.LoadGame(GameOfManyHits());
+  LookAt<GuestNameEntry>("mnuGuestNames");
 }
 
 TEST_P(Windows, OfANewMissionIsCaredFor) {

@@ -51,10 +51,40 @@ inline constexpr Setting OutcomeSign = {
     "1 for a large sign when a box was programmed or a button charged, or was not; 0 for none."};
 inline constexpr Setting OutcomeSound = {"outcome", "sound", "1", "The same for a sound."};
 
+inline constexpr Setting AudienceScreen = {
+    "audience", "screen", "", "Name of the screen with the audience board; without it, the second one."};
+inline constexpr Setting AudienceDistance = {
+    "audience", "distance", "5", "Metres from that screen to those who read it from farthest away."};
+inline constexpr Setting AudienceDiagonal = {"audience", "diagonal", "0",
+                                             "Its diagonal in inches; 0 for what the screen says of itself."};
+inline constexpr Setting AudienceSeconds = {"audience", "seconds", "8",
+                                            "Seconds that each page of the board stays."};
+inline constexpr Setting AudienceVenue = {"audience", "venue", "", "Name of the venue on the board."};
+inline constexpr Setting AudiencePicture = {"audience", "picture", "", "File with its picture."};
+inline constexpr Setting AudienceFollow = {
+    "audience", "follow", "1", "1: the board shows each game once its scores are in; 0: by command alone."};
+
 }  // namespace Keys
 
 /// In the order of the manual.
-inline constexpr std::array AllSettings = {
-    Keys::CommPort,        Keys::FirmwarePath, Keys::TotalDamage,  Keys::Respawns,    Keys::Heals,
-    Keys::AmmoAdds,        Keys::Accuracy,     Keys::FriendlyFire, Keys::ReaderPort,  Keys::ReaderType,
-    Keys::LastSoundFolder, Keys::PortDevice,   Keys::OutcomeSign,  Keys::OutcomeSound};
+inline constexpr std::array AllSettings = {Keys::CommPort,
+                                           Keys::FirmwarePath,
+                                           Keys::TotalDamage,
+                                           Keys::Respawns,
+                                           Keys::Heals,
+                                           Keys::AmmoAdds,
+                                           Keys::Accuracy,
+                                           Keys::FriendlyFire,
+                                           Keys::ReaderPort,
+                                           Keys::ReaderType,
+                                           Keys::LastSoundFolder,
+                                           Keys::PortDevice,
+                                           Keys::OutcomeSign,
+                                           Keys::OutcomeSound,
+                                           Keys::AudienceScreen,
+                                           Keys::AudienceDistance,
+                                           Keys::AudienceDiagonal,
+                                           Keys::AudienceSeconds,
+                                           Keys::AudienceVenue,
+                                           Keys::AudiencePicture,
+                                           Keys::AudienceFollow};

@@ -1,0 +1,188 @@
+#include "audience/AudienceLayout.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numbers>
+
+namespace {
+
+constexpr double MillimetresPerInch = 25.4;
+
+// In heights of a capital.
+constexpr double ColumnGap = 1.2;
+constexpr double TotalSign = 1.9;  ///< the team's badge and the gap behind it
+constexpr double TotalGap = 1.2;
+constexpr double WidthBesidesTexts = 3.4;  ///< of a row: the badge and gaps
+constexpr double GapsWithoutNames = 0.6;
+constexpr double ShortestName = 5;
+constexpr double UsefulName = 9;  ///< what a name gets at least where there are two columns
+
+constexpr double LeastSqueeze = 0.6;
+constexpr double LeastSqueezeWithNames = 0.8;
+
+constexpr int HeadingLines = 1;
+constexpr int FewestLines = 3;  ///< heading, total, one row
+
+/// Distances between lines, in heights of a capital.
+struct Spacing {
+  double Pitch;
+  double Margin;
+};
+constexpr Spacing Roomy{1.75, 0.6};
+constexpr Spacing Tight{1.35, 0.08};
+constexpr int FewestRoomyLines = 6;
+
+constexpr double LargestGrowth = 2;
+constexpr double GrowthStep = 0.0625;
+
+int LinesIn(double height, const Spacing& spacing) {
+  return static_cast<int>((height - 2 * spacing.Margin) / spacing.Pitch);
+}
+
+int DividedUp(int count, int by) {
+  return (count + by - 1) / by;
+}
+
+double NamedRow(const AudienceContents& contents, double name) {
+  return contents.Place + contents.Points + WidthBesidesTexts + name;
+}
+
+double UnnamedRow(const AudienceContents& contents) {
+  return contents.Place + contents.Gun + contents.Points + GapsWithoutNames;
+}
+
+double LeastNamedRow(const AudienceContents& contents) {
+  return NamedRow(contents, std::min(contents.Name, ShortestName));
+}
+
+/// Largest capital with which a page holds what it must.
+double LargestCapital(const AudiencePlace& place, const AudienceContents& contents) {
+  const double byHeight = place.Height / (FewestLines * Tight.Pitch + 2 * Tight.Margin);
+  const double byWidth = place.Width / (LeastSqueeze * UnnamedRow(contents) + 2 * Tight.Margin);
+  return std::min(byHeight, byWidth);
+}
+
+/// Gives the first page its large rows: three winners, or fewer where the others would have no row left.
+void PlaceWinners(AudienceLayout& layout, double rowLines, double width, const AudienceContents& contents) {
+  constexpr int most = 3;
+  constexpr double largest = 1.6;
+  constexpr double smallest = 1.25;
+  layout.FirstRows = layout.Rows;
+  if (!layout.Names) {
+    return;
+  }
+  const double wide = width / LeastNamedRow(contents);
+  for (int winners = std::min(most, contents.Players); winners > 0; --winners) {
+    const int others = contents.Players > winners ? 1 : 0;
+    const double scale = std::min({largest, wide, (rowLines - others) / winners});
+    if (scale >= smallest) {
+      layout.Winners = winners;
+      layout.WinnerScale = scale;
+      layout.FirstRows = static_cast<int>(rowLines - winners * scale + 1e-9);
+      return;
+    }
+  }
+}
+
+AudienceLayout LayOutWith(double capital, int columns, const AudiencePlace& place,
+                          const AudienceContents& contents) {
+  AudienceLayout layout;
+  const double height = place.Height / capital;
+  const bool isRoomy = LinesIn(height, Roomy) >= FewestRoomyLines;
+  const Spacing spacing = isRoomy ? Roomy : Tight;
+  const double width = place.Width / capital - 2 * spacing.Margin;
+  layout.Capital = capital;
+  layout.Margin = spacing.Margin * capital;
+  layout.Columns = columns;
+  const double column = (width - (columns - 1) * ColumnGap) / columns;
+  layout.Squeeze = std::min(1.0, column / LeastNamedRow(contents));
+  layout.Names = layout.Squeeze >= LeastSqueezeWithNames;
+  if (!layout.Names) {
+    layout.Squeeze = std::min(1.0, column / UnnamedRow(contents));
+  }
+  const int lines = std::max(FewestLines, LinesIn(height, spacing));
+  const double total = TotalSign + contents.Total + TotalGap;
+  layout.TotalsPerLine = std::clamp(static_cast<int>((width + TotalGap) / total), 1, 3);
+  layout.Pitch = (place.Height - 2 * layout.Margin) / lines;  // no strip stays empty
+  layout.TotalLines =
+      std::min(DividedUp(contents.Teams, layout.TotalsPerLine), std::max(1, (lines - HeadingLines) / 2));
+  if (isRoomy && layout.TotalLines > 1) {
+    layout.TotalLines = std::min(layout.TotalLines, lines / 4);
+  }
+  layout.Rows = std::max(1, lines - HeadingLines - layout.TotalLines);
+  PlaceWinners(layout, layout.Rows, width, contents);
+  const int onFirst = layout.Winners + columns * layout.FirstRows;
+  layout.Pages = 1 + DividedUp(std::max(0, contents.Players - onFirst), columns * layout.Rows);
+  return layout;
+}
+
+bool FitsTwice(double capital, const AudiencePlace& place, const AudienceContents& contents) {
+  const double width = place.Width / capital - 2 * Roomy.Margin;
+  return (width - ColumnGap) / 2 >= NamedRow(contents, std::min(contents.Name, UsefulName));
+}
+
+/// With two columns where they fit and save a page.
+AudienceLayout BestWith(double capital, const AudiencePlace& place, const AudienceContents& contents) {
+  const AudienceLayout one = LayOutWith(capital, 1, place, contents);
+  if (one.Pages == 1 || !FitsTwice(capital, place, contents)) {
+    return one;
+  }
+  const AudienceLayout two = LayOutWith(capital, 2, place, contents);
+  return two.Pages < one.Pages ? two : one;
+}
+
+/// True if names are not shortened: letters that need not be larger must not cost them.
+bool ShowsWholeNames(const AudienceLayout& layout, const AudiencePlace& place,
+                     const AudienceContents& contents) {
+  const double width = (place.Width - 2 * layout.Margin) / layout.Capital;
+  const double column = (width - (layout.Columns - 1) * ColumnGap) / layout.Columns;
+  return column >= NamedRow(contents, contents.Name) &&
+         width >= layout.WinnerScale * NamedRow(contents, contents.Name);
+}
+
+}  // namespace
+
+double CapitalMillimetres(double metres, double minutes) {
+  constexpr double minutesOfHalfCircle = 180 * 60;
+  constexpr double millimetresPerMetre = 1000;
+  return metres * millimetresPerMetre * std::tan(minutes * std::numbers::pi / minutesOfHalfCircle);
+}
+
+double MillimetresPerPixel(double diagonalInches, int width, int height) {
+  return diagonalInches * MillimetresPerInch / std::hypot(width, height);
+}
+
+AudienceLayout LayOut(const AudiencePlace& place, const AudienceContents& contents) {
+  const double legible = CapitalMillimetres(place.Metres) / place.MillimetresPerPixel;
+  const double capital = std::min(legible, LargestCapital(place, contents));
+  AudienceLayout best = BestWith(capital, place, contents);
+  for (double growth = LargestGrowth; growth > 1; growth -= GrowthStep) {
+    const double larger = growth * capital;
+    if (LinesIn(place.Height / larger, Roomy) < FewestRoomyLines) {
+      continue;
+    }
+    const AudienceLayout grown = BestWith(larger, place, contents);
+    if (grown.Pages <= best.Pages && grown.Winners >= best.Winners &&
+        ShowsWholeNames(grown, place, contents)) {
+      best = grown;
+      break;
+    }
+  }
+  best.Minutes = LegibleMinutes * best.Capital / legible;
+  return best;
+}
+
+AudienceRows RowsOfPage(const AudienceLayout& layout, int players, int page) {
+  const int onFirst = layout.Winners + layout.Columns * layout.FirstRows;
+  if (page == 0) {
+    return {0, std::min(players, onFirst)};
+  }
+  const int onPage = layout.Columns * layout.Rows;
+  const int first = std::min(players, onFirst + (page - 1) * onPage);
+  return {first, std::min(players - first, onPage)};
+}
+
+int FirstTotalOfPage(const AudienceLayout& layout, int teams, int page) {
+  const int shown = layout.TotalLines * layout.TotalsPerLine;
+  return teams == 0 || shown >= teams ? 0 : page * shown % teams;
+}

@@ -1,0 +1,122 @@
+#include "audience/AudiencePages.h"
+
+#include <gtest/gtest.h>
+
+#include <QFontMetricsF>
+#include <QImage>
+#include <QPainter>
+
+#include "audience/AudienceColours.h"
+#include "audience/AudienceText.h"
+#include "tests/support/Contrast.h"
+
+namespace {
+
+constexpr double LeastContrastForTheHall = 7;
+
+AudienceResults ResultsOfPlayers(int players) {
+  AudienceResults results;
+  results.Mission = "Capture the Flag";
+  for (int place = 1; place <= players; ++place) {
+    results.Players.push_back({.Place = place,
+                               .Index = place,
+                               .Team = 1 + place % 3,
+                               .Number = place % 32,
+                               .Soldiering = 5000 - 20 * place,
+                               .PublicName = "Player " + std::to_string(place)});
+  }
+  for (int team = 1; team <= 3; ++team) {
+    results.Totals.push_back({team, 9000 - 1000 * team});
+  }
+  return results;
+}
+
+AudiencePlace FullHd(double inches, double metres) {
+  return {1920, 1080, MillimetresPerPixel(inches, 1920, 1080), metres};
+}
+
+QImage Painted(const AudiencePages& pages, const AudiencePlace& place, int page) {
+  QImage picture(place.Width, place.Height, QImage::Format_RGB32);
+  picture.fill(AudienceColours::Page());
+  QPainter painter(&picture);
+  pages.Paint(painter, page);
+  painter.end();
+  return picture;
+}
+
+/// The lowest line of the picture that is no empty page.
+int LowestLine(const QImage& picture) {
+  for (int y = picture.height() - 1; y >= 0; --y) {
+    for (int x = 0; x < picture.width(); ++x) {
+      if (picture.pixelColor(x, y) != AudienceColours::Page()) {
+        return y;
+      }
+    }
+  }
+  return -1;
+}
+
+TEST(AudienceColours, AreLegibleFromAfar) {
+  using namespace AudienceColours;
+  EXPECT_GE(::Contrast(Letters().rgb(), Page().rgb()), LeastContrastForTheHall);
+  EXPECT_GE(::Contrast(QuietLetters().rgb(), Page().rgb()), LeastContrastForTheHall);
+  for (int team = 1; team <= 3; ++team) {
+    EXPECT_GE(::Contrast(Letters().rgb(), Row(team).rgb()), LeastContrastForTheHall) << team;
+    EXPECT_GE(::Contrast(Team(team).rgb(), Row(team).rgb()), LeastContrastForTheHall) << team;
+    EXPECT_GE(::Contrast(Team(team).rgb(), Page().rgb()), LeastContrastForTheHall) << team;
+    EXPECT_GE(::Contrast(BadgeLetters().rgb(), Team(team).rgb()), LeastContrastForTheHall) << team;
+    EXPECT_NE(Team(team), QColor(Qt::white)) << team;
+  }
+}
+
+TEST(AudienceText, HasCapitalsOfAtLeastTheHeightAskedFor) {
+  for (const double capital : {7.3, 16.0, 36.7, 95.2}) {
+    for (const bool bold : {false, true}) {
+      const double height = QFontMetricsF(FontWithCapitals(capital, bold)).capHeight();
+      EXPECT_GE(height, capital);
+      EXPECT_LE(height, capital + 1.5);
+    }
+  }
+}
+
+TEST(AudiencePages, EndWithinTheScreen) {
+  const StringTable strings(Language::English);
+  for (const int players : {1, 3, 12, 40, 224}) {
+    const AudienceResults results = ResultsOfPlayers(players);
+    for (const AudiencePlace& place : {FullHd(55, 5), FullHd(24, 15), FullHd(86, 3)}) {
+      const AudiencePages pages(results, strings, place);
+      const QImage picture = Painted(pages, place, 0);
+      EXPECT_GT(LowestLine(picture), place.Height / 8) << players;
+      EXPECT_LT(LowestLine(picture), place.Height) << players;
+    }
+  }
+}
+
+TEST(AudiencePages, DifferFromPageToPage) {
+  const StringTable strings(Language::SimplifiedChinese);
+  const AudienceResults results = ResultsOfPlayers(224);
+  const AudiencePlace place = FullHd(55, 8);
+  const AudiencePages pages(results, strings, place);
+  ASSERT_GT(pages.Count(), 2);
+  for (int page = 1; page < pages.Count(); ++page) {
+    EXPECT_NE(Painted(pages, place, page - 1), Painted(pages, place, page)) << page;
+  }
+}
+
+TEST(AudiencePages, ShowColourAndLetterOfEachTeam) {
+  const StringTable strings(Language::English);
+  const AudienceResults results = ResultsOfPlayers(12);
+  const AudiencePlace place = FullHd(55, 5);
+  const QImage picture = Painted(AudiencePages(results, strings, place), place, 0);
+  for (int team = 1; team <= 3; ++team) {
+    int pixels = 0;
+    for (int y = 0; y < picture.height(); ++y) {
+      for (int x = 0; x < picture.width(); ++x) {
+        pixels += picture.pixelColor(x, y) == AudienceColours::Team(team) ? 1 : 0;
+      }
+    }
+    EXPECT_GT(pixels, 2000) << team;
+  }
+}
+
+}  // namespace
