@@ -47,7 +47,10 @@ inline std::string WholeContents(const std::string& path) {
        RowsOf(opened, "SELECT name FROM sqlite_master WHERE type = 'table' ORDER BY name")) {
     table.pop_back();
     contents += table + "\n";
-    for (const std::string& row : RowsOf(opened, "SELECT * FROM [" + table + "] ORDER BY rowid")) {
+    const bool hasRowids =
+        !RowsOf(opened, "SELECT 1 FROM pragma_table_list WHERE name = '" + table + "' AND wr = 0").empty();
+    const std::string order = hasRowids ? "rowid" : "1, 2";
+    for (const std::string& row : RowsOf(opened, "SELECT * FROM [" + table + "] ORDER BY " + order)) {
       contents += "  " + row + "\n";
     }
   }

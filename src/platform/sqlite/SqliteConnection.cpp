@@ -1,5 +1,6 @@
 #include "platform/sqlite/SqliteConnection.h"
 
+#include <array>
 #include <cerrno>
 #include <filesystem>
 #include <memory>
@@ -260,6 +261,9 @@ void SqliteConnection::Commit() {
   if (sqlite3_get_autocommit(handle_) != 0) {
     throw RuntimeError(Fault::NoTransaction);  // rolled back by a fault in one of the writes
   }
+  if (!written_.AreAllTold()) {
+    counterBefore_ = ChangeCounter();
+  }
   errno = 0;
   const int result = sqlite3_exec(handle_, "COMMIT", nullptr, nullptr, nullptr);
   if (result == SQLITE_OK) {
@@ -280,14 +284,13 @@ bool SqliteConnection::HoldsWhatWasWritten(int commitResult) {
     return false;  // another program's lock, which is found before anything is written
   }
   try {
-    if (!written_.AreIn(*this)) {
+    if (!written_.AreIn(*this) || (!written_.AreAllTold() && !HasNewCounter())) {
       return false;
     }
     // SQLite takes a journal that it cannot see for one that is not there, and then reads rows that the next
     // one who sees it takes back.
     struct stat info {};
-    if (written_.AreAllTold() &&
-        stat(sqlite3_filename_journal(sqlite3_db_filename(handle_, "main")), &info) != 0 && errno == ENOENT) {
+    if (stat(sqlite3_filename_journal(sqlite3_db_filename(handle_, "main")), &info) != 0 && errno == ENOENT) {
       return true;
     }
   } catch (...) {  // the file cannot be asked now
@@ -297,6 +300,29 @@ bool SqliteConnection::HoldsWhatWasWritten(int commitResult) {
   // who reads the file puts the old rows back.
   return commitResult == SQLITE_IOERR_DIR_FSYNC || commitResult == SQLITE_IOERR_UNLOCK ||
          commitResult == SQLITE_IOERR_RDLOCK;
+}
+
+// For rows that are not known one by one: every commit raises the counter in the file's header.
+bool SqliteConnection::HasNewCounter() {
+  Execute("SELECT count(*) FROM sqlite_master");  // puts the old rows and the old counter back from a journal
+  return ChangeCounter() != counterBefore_;
+}
+
+// Through SQLite's own descriptor: closing another one would drop the locks on the file.
+std::uint32_t SqliteConnection::ChangeCounter() const {
+  constexpr sqlite3_int64 place = 24;
+  std::array<std::uint8_t, 4> bytes{};
+  sqlite3_file* file = nullptr;
+  if (sqlite3_file_control(handle_, "main", SQLITE_FCNTL_FILE_POINTER, &file) != SQLITE_OK ||
+      file == nullptr || file->pMethods == nullptr ||
+      file->pMethods->xRead(file, bytes.data(), static_cast<int>(bytes.size()), place) != SQLITE_OK) {
+    throw RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path_);
+  }
+  std::uint32_t counter = 0;
+  for (const std::uint8_t byte : bytes) {
+    counter = counter << 8U | byte;
+  }
+  return counter;
 }
 
 // Makes the deletion of the journal durable where SQLite failed to. Should it fail again, the change is still

@@ -67,6 +67,8 @@ class SqliteConnection {
   void PrepareChange();
   void Commit();
   bool HoldsWhatWasWritten(int commitResult);
+  bool HasNewCounter();
+  std::uint32_t ChangeCounter() const;
   void FlushFolder() noexcept;
   void Undo() noexcept;
   void CheckWritable();
@@ -77,8 +79,9 @@ class SqliteConnection {
   std::string folder_;  ///< of the file itself, behind symbolic links
   sqlite3* handle_ = nullptr;
   int readers_ = 0;
-  bool writing_ = false;  ///< a WriteTransaction is open
-  WrittenRows written_;   ///< by it
+  bool writing_ = false;             ///< a WriteTransaction is open
+  WrittenRows written_;              ///< by it
+  std::uint32_t counterBefore_ = 0;  ///< its commit; read only if not all rows are told
   SqliteStatement dataVersion_;
   std::int64_t versionRead_ = 0;  ///< last data_version; differs after a change by another connection
   std::uint64_t state_ = 1;

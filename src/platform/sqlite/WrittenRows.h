@@ -25,9 +25,9 @@ class WrittenRows {
   void Set(const std::string& table, std::int64_t key, const std::string& column, const Value& value);
   void Delete(const std::string& table, std::int64_t key);
 
-  /// Rows were written that cannot be told.
+  /// Rows were written that are not known one by one.
   void WriteUntold() { allTold_ = false; }
-  /// False after WriteUntold: then AreIn says little.
+  /// False after WriteUntold: then AreIn does not say everything.
   bool AreAllTold() const { return allTold_; }
 
   /// True if the file holds every row as it was last written. Throws RuntimeError if it cannot be read.
