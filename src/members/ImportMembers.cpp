@@ -203,6 +203,7 @@ void ImportMembers::EnableChoices(bool enabled) {
 
 void ImportMembers::CheckSoon() {
   stopped_ = true;
+  rows_->Show(nullptr, std::nullopt);
   plan_.reset();
   ui_->Import->setEnabled(false);
   checkTimer_.start(0);
@@ -210,7 +211,6 @@ void ImportMembers::CheckSoon() {
 
 void ImportMembers::Check() {
   const ImportChoices choices = Choices();
-  rows_->Show(nullptr, std::nullopt);
   if (const std::optional<std::size_t> twice = ColumnUsedTwice(choices.Use)) {
     ShowState(
         Filled(parts_.Strings.Text(OwnText::ColumnTwice), {MemberColumnTitles(parts_.Strings).at(*twice)}));
@@ -275,8 +275,8 @@ void ImportMembers::Import() {
                       BoxIcon::Exclamation);
     return;
   }
-  const std::optional<ImportPlan> plan = std::exchange(plan_, std::nullopt);
   rows_->Show(nullptr, std::nullopt);
+  const std::optional<ImportPlan> plan = std::exchange(plan_, std::nullopt);
   ui_->Import->setEnabled(false);
   ShowState(parts_.Strings.Text(OwnText::ImportingMembers));
   EnableChoices(false);
