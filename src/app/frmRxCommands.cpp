@@ -9,7 +9,6 @@
 
 #include "app/About.h"
 #include "app/UploadProgress.h"
-#include "archive/copies/BackupCopies.h"
 #include "board/AdminData.h"
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
@@ -299,43 +298,6 @@ void frmRx::RecordSounds() {
            .ProgramFolder = services_.Places.Program()},
           this)
       .exec();
-}
-
-void frmRx::ShowBackupCopies() {
-  const std::string defaults = services_.Places.Program();
-  BackupCopies({.Databases = {{.Name = "scenarios",
-                               .Table = "Table1",
-                               .DefaultPath = defaults + "/scenarios_default.mdb",
-                               .Title = OwnText::CopiedMissions,
-                               .InUse = [this]() -> Database& { return session_.DbScenarios(); }},
-                              {.Name = "members",
-                               .Table = "Members",
-                               .DefaultPath = defaults + "/members_default.mdb",
-                               .Title = OwnText::CopiedMembers,
-                               .InUse = [this]() -> Database& { return session_.DbMembers(); }}},
-                .Work = {.Engine = services_.Databases,
-                         .Disk = services_.Disk,
-                         .Time = services_.Time,
-                         .Strings = services_.Strings,
-                         .Folder = userDataFolder_ + "/backups"},
-                .Events = services_.Events,
-                .Boxes = services_.Boxes,
-                .FileDialog = services_.CommonDialog1,
-                .Busy = [this] { return RunningBesidesThis(); },
-                .Reopen =
-                    [this] {
-                      session_.Reopen();
-                      keeping_->CheckMembers();
-                    }},
-               this)
-      .exec();
-}
-
-std::optional<OwnText> frmRx::RunningBesidesThis() const {
-  if (downloading_) {
-    return OwnText::ScoresComeIn;
-  }
-  return commands_.Nested() ? std::optional(OwnText::CommandRuns) : std::nullopt;
 }
 
 bool frmRx::SelectPlayer() {

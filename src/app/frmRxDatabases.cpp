@@ -1,8 +1,9 @@
-// The main window's commands on files of members.
+// The main window's commands on the databases as a whole: members as files, backup copies.
 
 #include <optional>
 
 #include "app/frmRx.h"
+#include "archive/copies/BackupCopies.h"
 #include "core/text/Filled.h"
 #include "members/ExportMembers.h"
 #include "members/ImportMembers.h"
@@ -55,4 +56,41 @@ void frmRx::ImportMemberFile() {
     session_.Reopen();
     keeping_->CheckMembers();
   }
+}
+
+void frmRx::ShowBackupCopies() {
+  const std::string defaults = services_.Places.Program();
+  BackupCopies({.Databases = {{.Name = "scenarios",
+                               .Table = "Table1",
+                               .DefaultPath = defaults + "/scenarios_default.mdb",
+                               .Title = OwnText::CopiedMissions,
+                               .InUse = [this]() -> Database& { return session_.DbScenarios(); }},
+                              {.Name = "members",
+                               .Table = "Members",
+                               .DefaultPath = defaults + "/members_default.mdb",
+                               .Title = OwnText::CopiedMembers,
+                               .InUse = [this]() -> Database& { return session_.DbMembers(); }}},
+                .Work = {.Engine = services_.Databases,
+                         .Disk = services_.Disk,
+                         .Time = services_.Time,
+                         .Strings = services_.Strings,
+                         .Folder = userDataFolder_ + "/backups"},
+                .Events = services_.Events,
+                .Boxes = services_.Boxes,
+                .FileDialog = services_.CommonDialog1,
+                .Busy = [this] { return RunningBesidesThis(); },
+                .Reopen =
+                    [this] {
+                      session_.Reopen();
+                      keeping_->CheckMembers();
+                    }},
+               this)
+      .exec();
+}
+
+std::optional<OwnText> frmRx::RunningBesidesThis() const {
+  if (downloading_) {
+    return OwnText::ScoresComeIn;
+  }
+  return commands_.Nested() ? std::optional(OwnText::CommandRuns) : std::nullopt;
 }
