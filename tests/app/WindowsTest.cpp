@@ -2,7 +2,6 @@
 
 #include "app/About.h"
 #include "app/UploadProgress.h"
-#include "archive/copies/BackupCopies.h"
 #include "board/AdminData.h"
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
@@ -79,7 +78,6 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<BoxConfig>("mnuBoxConfig");
   LookAt<ChargeiButton>("mnuChargeiButton");
   LookAt<ISD_rec>("mnuSoundRecorder");
-  LookAt<BackupCopies>("mnuBackupCopies");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }
