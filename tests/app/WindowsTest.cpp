@@ -85,7 +85,6 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<BoxConfig>("mnuBoxConfig");
   LookAt<ChargeiButton>("mnuChargeiButton");
   LookAt<ISD_rec>("mnuSoundRecorder");
-  LookAt<BackupCopies>("mnuBackupCopies");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }
