@@ -128,6 +128,7 @@ void ImportMembers::ListColumns() {
   const std::vector<std::string> titles = MemberColumnTitles(parts_.Strings);
   ui_->FileColumns->setRowCount(0);
   ui_->FileColumns->setRowCount(static_cast<int>(columns.size()));
+  QWidget* before = ui_->FileColumns;
   for (std::size_t place = 0; place < columns.size(); ++place) {
     const int row = static_cast<int>(place);
     const QString heading = QString::fromStdString(columns[place].Heading).simplified();
@@ -143,8 +144,10 @@ void ImportMembers::ListColumns() {
     use->setCurrentIndex(matched[place] ? static_cast<int>(*matched[place]) + 1 : 0);
     connect(use, &QComboBox::currentIndexChanged, this, &ImportMembers::CheckSoon);
     ui_->FileColumns->setCellWidget(row, UseColumn, use);
+    ui_->FileColumns->setRowHeight(row, use->sizeHint().height());
+    setTabOrder(before, use);
+    before = use;
   }
-  ui_->FileColumns->resizeRowsToContents();
 }
 
 QComboBox* ImportMembers::UseList(int column) const {

@@ -14,6 +14,8 @@
 #include "devices/radio/RemoteManage.h"
 #include "exports/ExportGames.h"
 #include "firmware/download/FirmwareFlash.h"
+#include "members/ExportMembers.h"
+#include "members/ImportMembers.h"
 #include "members/Members.h"
 #include "missions/MissionNameEntry.h"
 #include "missions/Scenarios.h"
@@ -98,6 +100,13 @@ TEST_P(Windows, OfTheMembersIsCaredForWithAndWithoutAMember) {
       "AveragePrimAccuracy) VALUES ('EFCDAB8967452301', 'Ada', 'Byron', '2010-03-01 09:05:00', "
       "'2026-11-20 20:15:00', 1234, 123456.5, 1000.25, -123456, -1000.75, 1)");
   LookAt<Members>("mnuManageMembers");
+}
+
+TEST_P(Windows, OfFilesOfMembersAreCaredFor) {
+  LookAt<ExportMembers>("mnuExportMembers");
+  WriteFile(venue.Folder / "list.csv", "First name,Last name,Born\nAda,Byron,3/5/2001\nBo,Li,\n");
+  venue.Dialog.Answers = {venue.Folder / "list.csv"};
+  LookAt<ImportMembers>("mnuImportMembers");
 }
 
 TEST_P(Windows, OfAPlayerAreCaredFor) {

@@ -67,6 +67,21 @@ TEST_F(Backup, IsMadeBeforeTheFirstChangeOfARunAndNotAgain) {
   EXPECT_EQ(backups->TakeFailure(), "");
 }
 
+TEST_F(Backup, IsMadeAnewWhenAskedWhichCountsAsThatOfTheRun) {
+  Open();
+  Change("first");
+  clock.DateAndTime = "2013-05-21 15:00:00";
+  backups->CopyNow(*database, file.Path());
+  Change("second");
+  EXPECT_THAT(Copies(), ElementsAre("members-2013-05-21-143005.mdb", "members-2013-05-21-150000.mdb"));
+  EXPECT_EQ(NickNameIn("members-2013-05-21-150000.mdb"), "first");
+  Open();
+  clock.DateAndTime = "2013-05-22 15:00:00";
+  backups->CopyNow(*database, file.Path());
+  Change("third");
+  EXPECT_EQ(Copies().size(), 3U);
+}
+
 TEST_F(Backup, IsNotMadeWithoutAChange) {
   Open();
   for (rows->MoveFirst(); !rows->Eof(); rows->MoveNext()) {
