@@ -1,4 +1,6 @@
-# Functions for the scripts: install missing Debian packages, and build.
+# Functions for the scripts: install missing Debian packages, build, and make data for a run.
+
+. demo/data.sh
 
 BuildPackages=(g++ cmake ninja-build qt6-base-dev qt6-base-dev-tools qt6-serialport-dev qt6-multimedia-dev libsqlite3-dev
   sqlite3 libsndfile1-dev libsamplerate0-dev libmicrohttpd-dev libpugixml-dev zlib1g-dev nettle-dev nlohmann-json3-dev mdbtools-dev pkg-config libreoffice-dev libqpdf-dev libgtest-dev libgmock-dev libbenchmark-dev
@@ -7,6 +9,8 @@ RunPackages=(libreoffice-writer qt6-translations-l10n fonts-dejavu-core fonts-li
 TestPackages=(cups-daemon dbus-daemon)
 DisplayPackages=(xvfb xauth poppler-utils)
 PicturePackages=(pngquant)
+PackagingPackages=(debhelper git)  # to build the packages
+PackageCheckPackages=(lintian desktop-file-utils appstream shared-mime-info libglib2.0-bin man-db udev usb.ids)
 CheckPackages=(clang clang-format clang-tidy libclang-rt-14-dev git)
 
 # RequirePackages NAME...: installs the missing ones, as root or with sudo.
@@ -43,13 +47,3 @@ RunTests() {
 }
 
 HasDisplay() { [ -n "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ]; }
-
-# MakeData BIN FOLDER: creates below FOLDER (for XDG_DATA_HOME) the data that the program's first run would create.
-MakeData() {
-  local data=$2/Orvalin/Tessarine
-  mkdir -p "$data"
-  cp "$1/scenarios_default.mdb" "$data/scenarios.mdb"
-  cp "$1/members_default.mdb" "$data/members.mdb"
-  cp "$1/score_card_default.doc" "$data/score_card.doc"
-  cp "$1/tessarine.ini" "$data/tessarine.ini"
-}

@@ -208,5 +208,8 @@ OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const OldDa
 }
 
 std::string JetReaderPath() {
-  return std::filesystem::read_symlink("/proc/self/exe").parent_path() / "tessarine-jet-reader";
+  constexpr const char* name = "tessarine-jet-reader";
+  const std::filesystem::path folder = std::filesystem::read_symlink("/proc/self/exe").parent_path();
+  const std::filesystem::path beside = folder / name;
+  return exists(beside) ? beside : (folder / TESSARINE_MODULE_PATH / name).lexically_normal();
 }
