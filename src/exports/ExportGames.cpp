@@ -106,7 +106,12 @@ void ExportGames::Export() {
   }
   {
     const WaitCursor cursor;
-    parts_.Disk.Replace(*path, ExportBytes(parts_.Games, choice, parts_.Strings));
+    const std::string bytes = ExportBytes(parts_.Games, choice, parts_.Strings);
+    if (choice.Personal == PersonalData()) {
+      parts_.Disk.Replace(*path, bytes);
+    } else {
+      parts_.Disk.ReplacePrivately(*path, bytes);
+    }
   }
   Tell(Filled(parts_.Strings.Text(OwnText::GameExportSaved), {*path}));
 }

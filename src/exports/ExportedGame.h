@@ -34,6 +34,8 @@ struct PersonalData {
   bool FullNames = false;
   bool MemberNumbers = false;
   bool Buttons = false;
+
+  bool operator==(const PersonalData&) const = default;
 };
 
 /// The public name of the player at record `index`, also of one who took no part: the gun.

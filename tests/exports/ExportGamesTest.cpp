@@ -148,6 +148,16 @@ TEST_P(ExportWindow, AddsOnlyWhatIsTicked) {
   }
 }
 
+TEST_P(ExportWindow, KeepsAFileWithPersonalDataToTheUserAlone) {
+  Open();
+  Choose("FormatJson");
+  ExportTo("/home/op/public");
+  EXPECT_THAT(disk.Private, testing::IsEmpty());
+  Tick("Buttons");
+  ExportTo("/home/op/personal");
+  EXPECT_THAT(disk.Private, testing::ElementsAre("/home/op/personal"));
+}
+
 TEST_P(ExportWindow, DoesNotRememberTheTicks) {
   Open();
   for (const char* box : {"FullNames", "MemberNumbers", "Buttons"}) {
