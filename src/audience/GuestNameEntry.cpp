@@ -22,18 +22,16 @@ GuestNameEntry::GuestNameEntry(const Game& game, const GuestList& guests, const 
   ui_->Explanation->setText(Text(strings, entries_.empty() ? OwnText::NoGuests : OwnText::GuestNamesAre));
   ui_->Guns->setVisible(!entries_.empty());
   ui_->SaveExit->setEnabled(!entries_.empty());
-  QWidget* last = nullptr;
+  // The buttons were made before the entries. Only what takes the Tab key can have something behind it.
+  ui_->Guns->setFocusPolicy(Qt::TabFocus);
+  QWidget* last = ui_->Guns;
   for (const auto& [index, entry] : entries_) {
-    if (last == nullptr) {
-      entry->setFocus();
-    } else {
-      setTabOrder(last, entry);
-    }
+    setTabOrder(last, entry);
     last = entry;
   }
-  if (last != nullptr) {
-    setTabOrder(last, ui_->SaveExit);
-    setTabOrder(ui_->SaveExit, ui_->Cancel);
+  ui_->Guns->setFocusPolicy(Qt::NoFocus);
+  if (!entries_.empty()) {
+    entries_.begin()->second->setFocus();
   }
 }
 

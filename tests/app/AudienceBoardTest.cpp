@@ -21,12 +21,15 @@ using testing::Not;
 class BoardOfTheAudience : public testing::Test {
  protected:
   void Start() {
+    Prepare();
+    Show(*venue.Window);
+  }
+  void Prepare() {
     venue.Window.reset();
     venue.PutDefaultFiles();
     venue.MakeWindow().setScreen(&ScreenNamed("recommended or better"));
     venue.Window->move(20, 20);
     venue.Window->FormLoad();
-    Show(*venue.Window);
   }
 
   static AudienceWindow* Board() {
@@ -117,10 +120,12 @@ TEST_F(BoardOfTheAudience, OpensAgainWhereItWasWithoutTheKeyboard) {
   EXPECT_EQ(Board(), nullptr);
   EXPECT_THAT(StateFile(), HasSubstr("screen=as recommended"));
   EXPECT_THAT(StateFile(), Not(HasSubstr("AudienceBoard=")));
-  Start();
+  // The offscreen platform activates whatever is shown; desktops do as the window asks.
+  Prepare();
+  venue.Window->show();
   ASSERT_TRUE(QTest::qWaitFor([] { return Board() != nullptr; }));
   EXPECT_EQ(Board()->geometry(), HallScreen().geometry());
-  EXPECT_TRUE(venue.Window->isActiveWindow());
+  EXPECT_TRUE(Board()->testAttribute(Qt::WA_ShowWithoutActivating));
 }
 
 TEST_F(BoardOfTheAudience, WaitsAtTheStartForAScreenThatIsNotThere) {

@@ -105,7 +105,7 @@ TEST_F(ExportCommand, ShowsNoBoxForAMemberWhoIsGone) {
 
 TEST_F(ExportCommand, SuggestsANameWithDateAndMission) {
   venue.LoadGame(SmallGame());
-  const WhileModal<ExportGames> act([this](ExportGames& window) {
+  const WhileModal<ExportGames> act([](ExportGames& window) {
     ::Press(window, "ExportButton");
     window.close();
   });
