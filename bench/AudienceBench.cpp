@@ -52,6 +52,7 @@ double SlowestPage(const AudienceResults& results, double metres) {
   for (int page = 0; page < std::min(pages.Count(), 3); ++page) {
     std::vector<double> times;
     constexpr int runs = 9;
+    times.reserve(runs);
     for (int run = 0; run < runs; ++run) {
       times.push_back(PaintMicroseconds(pages, picture, page));
     }

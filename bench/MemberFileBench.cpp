@@ -125,14 +125,16 @@ int main() {
   std::vector<double> own;
   std::vector<double> tool;
   constexpr int runs = 3;
+  const std::string make = "sqlite3 '" + database + "' < '" + schema + "'";
+  const std::string makePlain = "sqlite3 '" + plain + "' < '" + plainSchema + "'";
+  const std::string import = "sqlite3 '" + plain + "' '.mode csv' '.import --skip 1 \"" + csv + "\" Members'";
   for (int run = 0; run < runs; ++run) {
     std::filesystem::remove(database);
     std::filesystem::remove(plain);
-    RunTool("sqlite3 '" + database + "' < '" + schema + "'");
-    RunTool("sqlite3 '" + plain + "' < '" + plainSchema + "'");
+    RunTool(make);
+    RunTool(makePlain);
     own.push_back(SecondsOf([&] { ImportFile(csv, database); }));
-    tool.push_back(SecondsOf(
-        [&] { RunTool("sqlite3 '" + plain + "' '.mode csv' '.import --skip 1 \"" + csv + "\" Members'"); }));
+    tool.push_back(SecondsOf([&] { RunTool(import); }));
   }
   constexpr double microseconds = 1e6;
   constexpr double goal = 3;

@@ -156,8 +156,9 @@ AudienceLayout LayOut(const AudiencePlace& place, const AudienceContents& conten
   const double legible = CapitalMillimetres(place.Metres) / place.MillimetresPerPixel;
   const double capital = std::min(legible, LargestCapital(place, contents));
   AudienceLayout best = BestWith(capital, place, contents);
-  for (double growth = LargestGrowth; growth > 1; growth -= GrowthStep) {
-    const double larger = growth * capital;
+  const long steps = std::lround((LargestGrowth - 1) / GrowthStep);
+  for (long step = steps; step > 0; --step) {
+    const double larger = (1 + static_cast<double>(step) * GrowthStep) * capital;
     if (LinesIn(place.Height / larger, Roomy) < FewestRoomyLines) {
       continue;
     }

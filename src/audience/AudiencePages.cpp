@@ -89,8 +89,8 @@ void AudiencePages::Paint(QPainter& painter, int page) const {
   const std::vector<QRectF> areas = AreasOf(page);
   for (int i = 0; i < rows.Count; ++i) {
     const bool isWinner = i < winners;
-    PaintRow(painter, rows_[static_cast<std::size_t>(rows.First + i)], areas[static_cast<std::size_t>(i)],
-             isWinner ? large : style_, isWinner);
+    PaintRow(painter, rows_[static_cast<std::size_t>(rows.First) + static_cast<std::size_t>(i)],
+             areas[static_cast<std::size_t>(i)], isWinner ? large : style_, isWinner);
   }
 }
 
@@ -120,8 +120,9 @@ void AudiencePages::PaintTotals(QPainter& painter, int page) const {
   const int shown = std::min(teams, layout_.TotalLines * layout_.TotalsPerLine);
   for (int i = 0; i < shown; ++i) {
     const AudienceTotal& total = results_.Totals[static_cast<std::size_t>((first + i) % teams)];
+    const int line = i / layout_.TotalsPerLine;
     const double left = layout_.Margin + (i % layout_.TotalsPerLine) * width;
-    const double top = layout_.Margin + (1 + i / layout_.TotalsPerLine) * layout_.Pitch;
+    const double top = layout_.Margin + (1 + line) * layout_.Pitch;
     QRectF area(left, top, width, layout_.Pitch);
     PaintBadge(painter, TakeLeft(area, BadgeSide * capital, TotalSignGap * capital), total.Team, style_);
     painter.setPen(AudienceColours::Team(total.Team));

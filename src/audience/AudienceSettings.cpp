@@ -4,6 +4,7 @@
 #include <QGuiApplication>
 #include <QScreen>
 #include <algorithm>
+#include <cmath>
 
 #include "audience/AudienceLayout.h"
 #include "audience/AudienceWindow.h"
@@ -150,7 +151,7 @@ void AudienceSettings::ShowConsequence() {
   const AudienceLayout layout = UsualLayout(setup, *screen);
   const bool isTooSmall = !layout.Names || layout.Minutes < LegibleMinutes - 0.01;
   const std::string millimetres =
-      std::to_string(static_cast<int>(CapitalMillimetres(setup.Metres, layout.Minutes) + 0.5));
+      std::to_string(std::lround(CapitalMillimetres(setup.Metres, layout.Minutes)));
   const std::string rows = std::to_string(layout.Columns * layout.Rows);
   const OwnText text = isTooSmall ? OwnText::AudienceTooSmall : OwnText::AudienceLetters;
   ui_->Consequence->setText(QString::fromStdString(Filled(parts_.Strings.Text(text), {millimetres, rows})));

@@ -45,8 +45,8 @@ class CellRow {
  private:
   QRgb* At(int column, int x, int y) {
     // scanLine would check each time whether the image is shared.
-    return reinterpret_cast<QRgb*>(bits_ + static_cast<std::ptrdiff_t>(top_ + y) * stride_) + column * cell_ +
-           x;
+    return reinterpret_cast<QRgb*>(bits_ + static_cast<std::ptrdiff_t>(top_ + y) * stride_) +
+           static_cast<std::ptrdiff_t>(column) * cell_ + x;
   }
 
   QImage& image_;

@@ -30,8 +30,9 @@ void DrawUpwards(QPainter& painter, const QRectF& room, int flags, const QString
 
 }  // namespace
 
-HitMapPainter::HitMapPainter(const HitMatrix& matrix, const StringTable& strings, QFont font, QColor ink)
-    : matrix_(matrix), strings_(strings), font_(std::move(font)), ink_(std::move(ink)) {
+HitMapPainter::HitMapPainter(const HitMatrix& matrix, const StringTable& strings, const QFont& font,
+                             QColor ink)
+    : matrix_(matrix), strings_(strings), font_(font), ink_(ink) {
   for (int place = 0; place < matrix.Size(); ++place) {
     names_.append(QString::fromStdString(matrix.PlayerAt(place).Name));
   }

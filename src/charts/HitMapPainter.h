@@ -33,7 +33,7 @@ struct HitMapLayout {
 class HitMapPainter {
  public:
   /// `matrix` and `strings` must outlive this. It draws in `ink` on a ground of its user's.
-  HitMapPainter(const HitMatrix& matrix, const StringTable& strings, QFont font, QColor ink);
+  HitMapPainter(const HitMatrix& matrix, const StringTable& strings, const QFont& font, QColor ink);
 
   /// The largest layout for that room, on a screen with that many pixels to a unit.
   HitMapLayout LayoutFor(QSizeF room, double pixelRatio) const;

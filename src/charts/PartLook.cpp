@@ -81,8 +81,8 @@ void DrawScoreMark(QPainter& painter, const QPointF& centre, double size) {
   painter.restore();
 }
 
-PartKey::PartKey(std::vector<ScorePart> parts, const StringTable& strings, QFont font)
-    : parts_(std::move(parts)), strings_(strings), font_(std::move(font)) {}
+PartKey::PartKey(std::vector<ScorePart> parts, const StringTable& strings, const QFont& font)
+    : parts_(std::move(parts)), strings_(strings), font_(font) {}
 
 double PartKey::Arrange(double width, std::vector<Entry>& entries) const {
   constexpr int soldiering = 105;

@@ -19,7 +19,7 @@ void DrawScoreMark(QPainter& painter, const QPointF& centre, double size);
 /// Which colour and pattern is what, and the mark of the score; in lines of that width.
 class PartKey {
  public:
-  PartKey(std::vector<ScorePart> parts, const StringTable& strings, QFont font);
+  PartKey(std::vector<ScorePart> parts, const StringTable& strings, const QFont& font);
 
   double HeightFor(double width) const;
   void Draw(QPainter& painter, const QRectF& area) const;

@@ -29,7 +29,7 @@ std::string TextOfTrouble(const RowTrouble& trouble, const StringTable& strings)
 }  // namespace
 
 std::string TextOfRow(const PlannedRow& row, const StringTable& strings) {
-  const std::string text = PartOfText(strings, OwnText::RowFates, static_cast<std::size_t>(row.Fate));
+  std::string text = PartOfText(strings, OwnText::RowFates, static_cast<std::size_t>(row.Fate));
   switch (row.Fate) {
     case RowFate::Changed:
       return Filled(text, {ChangesOf(row, strings)});

@@ -1,6 +1,7 @@
 #include "web/ResultsPages.h"
 
 #include <algorithm>
+#include <ranges>
 #include <utility>
 
 namespace {
@@ -123,8 +124,8 @@ void ResultsPages::DropBeyondLimits() {
 void ResultsPages::RenderCommon() {
   const PublicGame* newest = games_.empty() ? nullptr : &games_.back().Game;
   std::vector<const PublicGame*> newestFirst;
-  for (auto entry = games_.rbegin(); entry != games_.rend(); ++entry) {
-    newestFirst.push_back(&entry->Game);
+  for (const Entry& entry : std::views::reverse(games_)) {
+    newestFirst.push_back(&entry.Game);
   }
   Page token = TokenPage(newest);
   for (const Language language : PageLanguages) {

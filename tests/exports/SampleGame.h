@@ -98,7 +98,6 @@ inline const std::string OddNames[] = {"<script>alert('1')</script>",
                                        "=HYPERLINK(\"x\")",
                                        "'+1",
                                        "a,b;c\td\r\ne",
-                                       "\xE2\x80\xAE"
-                                       "abc\xE2\x81\xA6",
+                                       std::string("\xE2\x80\xAE").append("abc\xE2\x81\xA6"),
                                        "\x01\x7F\xEF\xBF\xBE\xF0\x9F\x98\x80",
                                        std::string(10000, 'x')};

@@ -217,8 +217,7 @@ void BackupCopies::CopySelected() {
 std::optional<std::string> BackupCopies::AskTarget(const std::string& name) {
   const StringTable& strings = parts_.Work.Strings;
   const std::string title = strings.Text(OwnText::BackupCopiesTitle);
-  const std::optional<std::string> target =
-      parts_.FileDialog.ShowSave({.Filter = title + "|*.mdb", .Name = name});
+  std::optional<std::string> target = parts_.FileDialog.ShowSave({.Filter = title + "|*.mdb", .Name = name});
   if (!target || !parts_.Work.Disk.FileExists(*target)) {
     return target;
   }

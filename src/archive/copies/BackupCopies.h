@@ -40,7 +40,6 @@ class BackupCopies : public QDialog {
   BackupCopies(Parts parts, QWidget* parent);
   ~BackupCopies() override;
 
- public slots:
   void reject() override;
 
  private:

@@ -85,9 +85,12 @@ std::string FreeCopyName(const Files& disk, const std::string& folder, const std
   std::replace(start.begin(), start.end(), ' ', '-');
   start.erase(std::remove(start.begin(), start.end(), ':'), start.end());
   start += MarkOf(kind);
-  std::string name = start + std::string(CopyExtension);
+  const auto named = [&start](const std::string& number) {
+    return std::string(start).append(number).append(CopyExtension);
+  };
+  std::string name = named({});
   for (int number = 2; disk.FileExists(folder + "/" + name); ++number) {
-    name = start + std::to_string(number) + std::string(CopyExtension);
+    name = named(std::to_string(number));
   }
   return name;
 }
