@@ -75,7 +75,7 @@ void ServerLoop::ReportVisitors() {
 int ServerLoop::PauseInMilliseconds() const {
   constexpr std::int64_t second = 1000;
   const std::int64_t due = host_.Due().count();
-  const bool watching = host_.Connections() > 0 || reported_ > 0;
+  const bool watching = host_.Connections() > 0 || visitors_.Any() || reported_ > 0;
   if (!watching) {
     return static_cast<int>(std::min<std::int64_t>(due, 60 * second));
   }

@@ -16,6 +16,8 @@ class Visitors {
 
   void Note(const std::string& address, Time now);
 
+  bool Any() const { return !seen_.empty(); }
+
   /// Forgets those whose minute is over.
   std::uint32_t Count(Time now);
 
