@@ -1,7 +1,7 @@
 #include "web/ResultsPages.h"
 
 #include <algorithm>
-#include <ranges>
+#include <iterator>
 #include <utility>
 
 namespace {
@@ -124,9 +124,8 @@ void ResultsPages::DropBeyondLimits() {
 void ResultsPages::RenderCommon() {
   const PublicGame* newest = games_.empty() ? nullptr : &games_.back().Game;
   std::vector<const PublicGame*> newestFirst;
-  for (const Entry& entry : std::views::reverse(games_)) {
-    newestFirst.push_back(&entry.Game);
-  }
+  std::transform(games_.rbegin(), games_.rend(), std::back_inserter(newestFirst),
+                 [](const Entry& entry) { return &entry.Game; });
   Page token = TokenPage(newest);
   for (const Language language : PageLanguages) {
     Page front = FrontPage(newest, token.Body, language);

@@ -89,7 +89,7 @@ std::string FreeCopyName(const Files& disk, const std::string& folder, const std
     return std::string(start).append(number).append(CopyExtension);
   };
   std::string name = named({});
-  for (int number = 2; disk.FileExists(folder + "/" + name); ++number) {
+  for (int number = 2; disk.FileExists(std::string(folder).append("/").append(name)); ++number) {
     name = named(std::to_string(number));
   }
   return name;
