@@ -120,7 +120,10 @@ void frmRx::SetUpKeeping() {
                         .ProgramFolder = services_.Places.Program()},
       [this] { return downloading_; }, [this](const KeptState& state) { desk_->TellKeeping(state); });
   // Not before the window is shown.
-  QTimer::singleShot(0, &*keeping_, [this] { keeping_->CheckMembers(); });
+  QTimer::singleShot(0, &*keeping_, [this] {
+    keeping_->CheckMembers();
+    keeping_->RemoveDeleted();
+  });
 }
 
 void frmRx::SetUpLists() {
