@@ -12,6 +12,15 @@ class Conditions {
     values_.push_back(std::move(value));
     text_.append(" AND ").append(condition).append("$").append(std::to_string(values_.size())).append(rest);
   }
+  /// The same with a list of numbers in parentheses.
+  void AddList(std::string_view condition, const std::vector<std::int32_t>& numbers, std::string_view rest) {
+    text_.append(" AND ").append(condition);
+    for (const std::int32_t number : numbers) {
+      values_.emplace_back(std::int64_t{number});
+      text_.append(&number == &numbers.front() ? "($" : ", $").append(std::to_string(values_.size()));
+    }
+    text_.append(")").append(rest);
+  }
   void AddPeriod(const std::string& from, const std::string& before) {
     if (!from.empty()) {
       Add("g.Played >= ", from);
@@ -90,6 +99,9 @@ std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter) {
   if (filter.Member != 0) {
     conditions.Add(
         "g.GameID IN (SELECT GameID FROM GamePlayers WHERE MemberID = ", std::int64_t{filter.Member}, ")");
+  }
+  if (!filter.Members.empty()) {
+    conditions.AddList("g.GameID IN (SELECT GameID FROM GamePlayers WHERE MemberID IN ", filter.Members, ")");
   }
   if (filter.Player != 0) {
     conditions.Add(

@@ -20,8 +20,9 @@ struct GameFilter {
   std::string Before = {};  ///< earliest time that is too late, in the same form
   std::string Mission = {};
   std::int32_t Member = 0;
-  int Player = 0;        ///< record of a gun, 1 to 224
-  bool Deleted = false;  ///< the deleted games in place of the others
+  std::vector<std::int32_t> Members = {};  ///< one of whom plays
+  int Player = 0;                          ///< record of a gun, 1 to 224
+  bool Deleted = false;                    ///< the deleted games in place of the others
 };
 
 /// A game's row.
