@@ -17,6 +17,12 @@ class GameKeeping : public QObject {
 
   /// Guns are about to be read into the board.
   void BeginPull(GameSource source) { keeper_.BeginPull(source); }
+  /// A past game is being loaded; see GameKeeper::Open.
+  void Open(std::int64_t gameId, std::int64_t state, const Game& game, const std::string& missionName) {
+    keeper_.Open(gameId, state, game, missionName);
+  }
+  /// Removes what was deleted long ago.
+  void RemoveDeleted() { Do(&GameKeeper::RemoveDeleted); }
   /// The operator may have changed members.
   void NoteMembers() { Do(&GameKeeper::NoteMembers); }
   /// The members may be others, all of them.

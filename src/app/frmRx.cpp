@@ -109,18 +109,28 @@ void frmRx::SetUpDesk() {
 }
 
 void frmRx::SetUpKeeping() {
+  DatabaseEngine& archives = services_.Archives != nullptr ? *services_.Archives : services_.Databases;
+  archive_.emplace(ArchiveAccess::Parts{.Session = session_,
+                                        .Disk = services_.Disk,
+                                        .Engine = archives,
+                                        .Strings = services_.Strings,
+                                        .UserDataFolder = userDataFolder_,
+                                        .ProgramFolder = services_.Places.Program()});
   keeping_.emplace(
       GameKeeper::Parts{.Session = session_,
                         .Progress = desk_->Progress(),
                         .Time = services_.Time,
                         .Disk = services_.Disk,
-                        .Engine = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
+                        .Engine = archives,
                         .Strings = services_.Strings,
                         .UserDataFolder = userDataFolder_,
                         .ProgramFolder = services_.Places.Program()},
       [this] { return downloading_; }, [this](const KeptState& state) { desk_->TellKeeping(state); });
   // Not before the window is shown.
-  QTimer::singleShot(0, &*keeping_, [this] { keeping_->CheckMembers(); });
+  QTimer::singleShot(0, &*keeping_, [this] {
+    keeping_->CheckMembers();
+    keeping_->RemoveDeleted();
+  });
 }
 
 void frmRx::SetUpLists() {
@@ -182,6 +192,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuSaveScores, &frmRx::SaveGame},
                                {ui_->mnuClearScores, &frmRx::ClearGame},
                                {ui_->mnuExport, &frmRx::ExportGame},
+                               {ui_->mnuPastGames, &frmRx::ShowPastGames},
                                {ui_->mnuGetKeshData, &frmRx::GetScoreData},
                                {ui_->mnuPrintScores, &frmRx::PrintScores},
                                {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},
@@ -275,6 +286,7 @@ void frmRx::Show(SessionChange change) {
       ui_->ScoreDisplay->ForgetSelection();
       downloadedGuns_.Forget();
       guests_.Forget();
+      fromArchive_ = false;
       break;
     case SessionChange::Missions:
       ShowMissions();
@@ -291,6 +303,9 @@ void frmRx::Show(SessionChange change) {
       ui_->ActiveMission->setToolTip(description);
       break;
     }
+    case SessionChange::Saved:
+      fromArchive_ = false;
+      break;
     default:
       break;
   }

@@ -12,6 +12,8 @@
 #include "app/GameKeeping.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
+#include "archive/ArchiveAccess.h"
+#include "archive/past/PastGames.h"
 #include "audience/AudienceBoard.h"
 #include "audience/AudienceCopy.h"
 #include "core/data/IniReader.h"
@@ -79,6 +81,12 @@ class frmRx : public QMainWindow {
   void SaveGame();
   void ClearGame();
   void ExportGame();
+  void ShowPastGames();
+  /// What the board calls a member; empty if there is none with this number.
+  std::string BoardNameOf(std::int32_t contactId);
+  void OpenPastGame(const PastGames::Opened& past);
+  void ShowPastCharts(const PastGame& past);
+  void ExportPastGames(const std::vector<std::int64_t>& games);
   void GetScoreData();
   /// Tracks the word processor until it is ready. If it is missing, says so once and continues without
   /// printing.
@@ -150,6 +158,7 @@ class frmRx : public QMainWindow {
   DownloadedGuns downloadedGuns_;
   ProgrammedBoxes programmedBoxes_;
   ChargedButtons chargedButtons_;
+  bool fromArchive_ = false;                    ///< the game on the board was opened there, and no file since
   bool downloading_ = false;                    ///< a score download is on the stack
   int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again
@@ -157,6 +166,7 @@ class frmRx : public QMainWindow {
   Commands commands_;
   std::optional<Desk> desk_;
   std::optional<GameKeeping> keeping_;
+  std::optional<ArchiveAccess> archive_;  ///< for windows; the keeper has its own
   std::optional<BoardCharts> charts_;
   GuestList guests_;
   std::optional<AudienceBoard> audience_;

@@ -41,7 +41,7 @@ void frmRx::ReadGame() {
 
 void frmRx::SaveGame() {
   desk_->TellFileOfCancel({});
-  const bool suggests = session_.Game().DataPresent && !desk_->Progress().HasFile();
+  const bool suggests = session_.Game().DataPresent && (fromArchive_ || !desk_->Progress().HasFile());
   const std::string before = gameFile_.SaveFolder();
   session_.SaveGame([&](const Game& game, const std::string& missionName) {
     return gameFile_.SaveGame(

@@ -12,6 +12,15 @@ class Conditions {
     values_.push_back(std::move(value));
     text_.append(" AND ").append(condition).append("$").append(std::to_string(values_.size())).append(rest);
   }
+  /// The same with a list of numbers in parentheses.
+  void AddList(std::string_view condition, const std::vector<std::int32_t>& numbers, std::string_view rest) {
+    text_.append(" AND ").append(condition);
+    for (const std::int32_t number : numbers) {
+      values_.emplace_back(std::int64_t{number});
+      text_.append(&number == &numbers.front() ? "($" : ", $").append(std::to_string(values_.size()));
+    }
+    text_.append(")").append(rest);
+  }
   void AddPeriod(const std::string& from, const std::string& before) {
     if (!from.empty()) {
       Add("g.Played >= ", from);
@@ -44,7 +53,9 @@ ListedGame ListedGameIn(const SqlRow& row) {
           .BestMember = Small(row, 9),
           .BestSoldiering = row.Integer(10),
           .Pulls = Small(row, 11),
-          .Committed = Small(row, 12)};
+          .Committed = Small(row, 12),
+          .Deleted = row.Text(13),
+          .EarlierStates = Small(row, 14)};
 }
 
 MemberGame MemberGameIn(const SqlRow& row) {
@@ -72,6 +83,13 @@ std::vector<MonthOfGames> ArchiveQueries::Months() {
   return months;
 }
 
+std::vector<std::string> ArchiveQueries::Missions() {
+  std::vector<std::string> missions;
+  sql_.Query("SELECT DISTINCT Mission FROM Games ORDER BY Mission", {},
+             [&missions](const SqlRow& row) { missions.push_back(row.Text(0)); });
+  return missions;
+}
+
 std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter) {
   Conditions conditions;
   conditions.AddPeriod(filter.From, filter.Before);
@@ -82,12 +100,16 @@ std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter) {
     conditions.Add(
         "g.GameID IN (SELECT GameID FROM GamePlayers WHERE MemberID = ", std::int64_t{filter.Member}, ")");
   }
+  if (!filter.Members.empty()) {
+    conditions.AddList("g.GameID IN (SELECT GameID FROM GamePlayers WHERE MemberID IN ", filter.Members, ")");
+  }
   if (filter.Player != 0) {
     conditions.Add(
         "g.GameID IN (SELECT GameID FROM GamePlayers WHERE PlayerIndex = ", std::int64_t{filter.Player}, ")");
   }
   std::vector<std::int64_t> games;
-  sql_.Query("SELECT g.GameID FROM Games g WHERE g.Deleted IS NULL" + conditions.Text() +
+  const std::string which = filter.Deleted ? "g.Deleted IS NOT NULL" : "g.Deleted IS NULL";
+  sql_.Query("SELECT g.GameID FROM Games g WHERE " + which + conditions.Text() +
                  " ORDER BY g.Played DESC, g.GameID DESC",
              conditions.Values(), [&games](const SqlRow& row) { games.push_back(row.Integer(0)); });
   return games;
@@ -97,8 +119,9 @@ std::optional<ListedGame> ArchiveQueries::Game(std::int64_t gameId) {
   std::optional<ListedGame> game;
   sql_.Query(
       "SELECT g.GameID, g.Played, g.DateText, g.Mission, g.Players, g.RedTotal, g.BlueTotal, g.YellowTotal, "
-      "g.BestPlayer, p.MemberID, p.Soldiering, g.Pulls, g.Committed FROM Games g LEFT JOIN GamePlayers p "
-      "ON p.GameID = g.GameID AND p.PlayerIndex = g.BestPlayer WHERE g.GameID = $1 AND g.Deleted IS NULL",
+      "g.BestPlayer, p.MemberID, p.Soldiering, g.Pulls, g.Committed, g.Deleted, "
+      "(SELECT max(State) FROM GameFiles WHERE GameID = $1) FROM Games g LEFT JOIN GamePlayers p "
+      "ON p.GameID = g.GameID AND p.PlayerIndex = g.BestPlayer WHERE g.GameID = $1",
       {gameId}, [&game](const SqlRow& row) { game = ListedGameIn(row); });
   return game;
 }

@@ -20,7 +20,9 @@ struct GameFilter {
   std::string Before = {};  ///< earliest time that is too late, in the same form
   std::string Mission = {};
   std::int32_t Member = 0;
-  int Player = 0;  ///< record of a gun, 1 to 224
+  std::vector<std::int32_t> Members = {};  ///< one of whom plays
+  int Player = 0;                          ///< record of a gun, 1 to 224
+  bool Deleted = false;                    ///< the deleted games in place of the others
 };
 
 /// A game's row.
@@ -35,7 +37,9 @@ struct ListedGame {
   std::int32_t BestMember = 0;  ///< 0 for a guest
   std::int64_t BestSoldiering = 0;
   int Pulls = 0;
-  int Committed = 0;  ///< players
+  int Committed = 0;         ///< players
+  std::string Deleted = {};  ///< local time of the deletion; empty for most games
+  int EarlierStates = 0;     ///< which have files of their own
 };
 
 /// A game of one member.
@@ -61,8 +65,8 @@ struct MemberPeriod {
   int AccuracyGames = 0;   ///< how many these are
 };
 
-/// Questions to the archive. Deleted games are in no answer. Each is answered through an index, however many
-/// games there are. All throw RuntimeError as Sql does.
+/// Questions to the archive. Deleted games are in no answer unless it is said. Each is answered through an
+/// index, however many games there are. All throw RuntimeError as Sql does.
 class ArchiveQueries {
  public:
   explicit ArchiveQueries(Sql& sql) : sql_(sql) {}
@@ -70,10 +74,13 @@ class ArchiveQueries {
   /// The months in which games were played, the latest first.
   std::vector<MonthOfGames> Months();
 
+  /// The missions of all games, deleted ones too, by name.
+  std::vector<std::string> Missions();
+
   /// The numbers of the games, the latest first.
   std::vector<std::int64_t> Games(const GameFilter& filter);
 
-  /// The row of one of them; none if it has meanwhile gone.
+  /// The row of one of them, deleted or not; none if it has meanwhile gone.
   std::optional<ListedGame> Game(std::int64_t gameId);
 
   /// The member's games, the latest first.

@@ -34,32 +34,40 @@ bool GameArchive::KeepAgain(std::int64_t gameId, const GameState& state, FormerS
   const KnownMembers::Marks marks = known_.Read(MembersIn(state.Game));
   WriteScope scope(archive_);
   Sql& sql = archive_.Statements();
-  std::string played;
+  std::optional<std::string> played;
   std::string formerHash;
-  sql.Query("SELECT Played, InputsHash FROM Games WHERE GameID = $1", {gameId}, [&](const SqlRow& row) {
-    played = row.Text(0);
-    formerHash = row.Text(1);
-  });
-  if (!UpdateGame(sql, gameId, state, packed.Hash)) {
+  sql.Query("SELECT Played, InputsHash FROM Games WHERE GameID = $1 AND Deleted IS NULL", {gameId},
+            [&](const SqlRow& row) {
+              played = row.Text(0);
+              formerHash = row.Text(1);
+            });
+  if (!played) {
     return false;
   }
+  UpdateGame(sql, gameId, state, packed.Hash);
   if (former == FormerState::KeptToo && formerHash != packed.Hash) {
-    SetFormerFileAside(gameId, played);
+    SetFormerFileAside(gameId, *played);
   }
   WritePlayers(sql, gameId, state.Game);
-  WriteFile({gameId, 0, EntryName(played, gameId, 0)}, packed, played);
+  WriteFile({gameId, 0, EntryName(*played, gameId, 0)}, packed, *played);
   known_.Note(marks);
   scope.Commit();
   return true;
 }
 
 std::optional<std::int64_t> GameArchive::Find(const Game& game, const std::string& missionName) {
+  const std::optional<FoundState> found = FindState(game, missionName);
+  return found ? std::optional(found->GameId) : std::nullopt;
+}
+
+std::optional<GameArchive::FoundState> GameArchive::FindState(const Game& game,
+                                                              const std::string& missionName) {
   const std::string inputs = GameInputs(game, missionName);
   const std::vector<StoredFile> candidates =
       FilesWhere("GameFiles.InputsHash = $1 AND Games.Deleted IS NULL", {GameInputsHash(inputs)});
   for (const StoredFile& file : candidates) {
     if (HoldsInputs(file, inputs)) {
-      return file.GameId;
+      return FoundState{file.GameId, file.State};
     }
   }
   return std::nullopt;
@@ -69,10 +77,81 @@ std::string GameArchive::FileOf(std::int64_t gameId, std::int64_t state) {
   const std::vector<StoredFile> files =
       FilesWhere("GameFiles.GameID = $1 AND GameFiles.State = $2", {gameId, state});
   if (files.empty()) {
-    throw RuntimeError(Fault::FileNotFound,
-                       Filled(strings_.Text(OwnText::NoArchivedGame), {std::to_string(gameId)}));
+    throw NoFile(gameId);
   }
   return ReadFile(files.front().Name);
+}
+
+PastGame GameArchive::Read(std::int64_t gameId, std::int64_t state) {
+  const std::vector<StoredFile> files =
+      FilesWhere("GameFiles.GameID = $1 AND GameFiles.State = $2", {gameId, state});
+  if (files.empty()) {
+    throw NoFile(gameId);
+  }
+  PastGame past(strings_);
+  past.GameId = gameId;
+  past.State = state;
+  archive_.Statements().Query(
+      "SELECT Played, DamageFactor, DeathFactor, HealFactor, AmmoFactor, AccuracyFactor, FriendlyFireFactor "
+      "FROM Games WHERE GameID = $1",
+      {gameId}, [&past](const SqlRow& row) {
+        past.Played = row.Text(0);
+        past.Factors = {.Damage = row.Real(1),
+                        .Death = row.Real(2),
+                        .Heal = row.Real(3),
+                        .Ammo = row.Real(4),
+                        .Accuracy = row.Real(5),
+                        .FriendlyFire = row.Real(6)};
+      });
+  past.Mission = ReadGame(files.front().Name, past.Game);
+  past.Game.DataPresent = true;
+  try {
+    CompleteScores(past.Game);
+  } catch (const RuntimeError&) {
+    throw Damaged(files.front().Name);  // such sums were never on a board
+  }
+  return past;
+}
+
+int GameArchive::Delete(const std::vector<std::int64_t>& games, const std::string& now) {
+  WriteScope scope(archive_);
+  std::int64_t deleted = 0;
+  for (const std::int64_t game : games) {
+    deleted += archive_.Statements().Change(
+        "UPDATE Games SET Deleted = $1 WHERE GameID = $2 AND Deleted IS NULL", {now, game});
+  }
+  scope.Commit();
+  return static_cast<int>(deleted);
+}
+
+int GameArchive::BringBack(const std::vector<std::int64_t>& games) {
+  WriteScope scope(archive_);
+  std::int64_t back = 0;
+  for (const std::int64_t game : games) {
+    back += archive_.Statements().Change(
+        "UPDATE Games SET Deleted = NULL WHERE GameID = $1 AND Deleted IS NOT NULL", {game});
+  }
+  scope.Commit();
+  return static_cast<int>(back);
+}
+
+int GameArchive::RemoveDeleted(const std::string& before) {
+  Sql& sql = archive_.Statements();
+  std::vector<std::int64_t> games;
+  sql.Query("SELECT GameID FROM Games WHERE Deleted < $1", {before},
+            [&games](const SqlRow& row) { games.push_back(row.Integer(0)); });
+  if (games.empty()) {
+    return 0;
+  }
+  WriteScope scope(archive_);
+  for (const std::int64_t game : games) {
+    sql.Change("DELETE FROM sqlar WHERE name IN (SELECT Name FROM GameFiles WHERE GameID = $1)", {game});
+    sql.Change("DELETE FROM GameFiles WHERE GameID = $1", {game});
+    sql.Change("DELETE FROM GamePlayers WHERE GameID = $1", {game});
+    sql.Change("DELETE FROM Games WHERE GameID = $1", {game});
+  }
+  scope.Commit();
+  return static_cast<int>(games.size());
 }
 
 std::int64_t GameArchive::EarlierStates(std::int64_t gameId) {
@@ -240,6 +319,10 @@ void GameArchive::CutFromFile(const StoredFile& file, std::int32_t number) {
   if (file.State == 0) {
     sql.Change("UPDATE Games SET InputsHash = $1 WHERE GameID = $2", {packed.Hash, file.GameId});
   }
+}
+
+RuntimeError GameArchive::NoFile(std::int64_t gameId) const {
+  return {Fault::FileNotFound, Filled(strings_.Text(OwnText::NoArchivedGame), {std::to_string(gameId)})};
 }
 
 RuntimeError GameArchive::Damaged(const std::string& name) const {

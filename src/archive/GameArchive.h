@@ -7,6 +7,7 @@
 
 #include "archive/GameRows.h"
 #include "archive/KnownMembers.h"
+#include "archive/PastGame.h"
 #include "core/game/Game.h"
 #include "core/text/StringTable.h"
 #include "platform/Database.h"
@@ -32,12 +33,33 @@ class GameArchive {
 
   /// Keeps a later state of a game. What is then its figures and its file is this one; time and source stay.
   /// A former state with equal inputs is never kept too. Returns false, with nothing changed, if the archive
-  /// no longer has the game.
+  /// no longer has the game, or has it among the deleted ones.
   bool KeepAgain(std::int64_t gameId, const GameState& state, FormerState former);
 
   /// The number of the game that has, or once had, the same inputs as this one; none if there is no such
   /// game. Deleted games do not count.
   std::optional<std::int64_t> Find(const Game& game, const std::string& missionName);
+
+  /// One of the states of a game. State 0 is the last one; earlier ones count from 1, the first.
+  struct FoundState {
+    std::int64_t GameId;
+    std::int64_t State;
+  };
+
+  /// Find, with the state that has these inputs.
+  std::optional<FoundState> FindState(const Game& game, const std::string& missionName);
+
+  /// A game with the figures that it was kept with, deleted ones too. Throws RuntimeError 53 if there is no
+  /// such game or state.
+  PastGame Read(std::int64_t gameId, std::int64_t state = 0);
+
+  /// Games that the operator no longer wants. They are in no answer until they are brought back. `now` is the
+  /// local time, "YYYY-MM-DD HH:MM:SS". Returns how many were there.
+  int Delete(const std::vector<std::int64_t>& games, const std::string& now);
+  /// Undoes Delete. Returns how many were deleted before.
+  int BringBack(const std::vector<std::int64_t>& games);
+  /// Removes the games that were deleted before that local time, with their files. Returns how many.
+  int RemoveDeleted(const std::string& before);
 
   /// The bytes of the game's file. An earlier state counts from 1, the first; 0 is the last state. Throws
   /// RuntimeError 53 if there is no such file.
@@ -78,6 +100,7 @@ class GameArchive {
   bool HoldsInputs(const StoredFile& file, const std::string& inputs);
   int CutFromGames(std::int32_t number);
   void CutFromFile(const StoredFile& file, std::int32_t number);
+  RuntimeError NoFile(std::int64_t gameId) const;
   RuntimeError Damaged(const std::string& name) const;
   RuntimeError TooLarge(const std::string& name) const;
 

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <utility>
 
+#include "archive/ArchiveQueries.h"
+#include "archive/DeletedGames.h"
 #include "core/game/WordDigest.h"
 #include "platform/RuntimeError.h"
 
@@ -56,6 +58,7 @@ void GameKeeper::Hear(SessionChange change) {
       break;
     case SessionChange::Scores:
       scoresPending_ = false;
+      EndOpening();
       break;
     default:
       break;
@@ -69,10 +72,37 @@ void GameKeeper::Forget() {
   state_.Failure.clear();
   source_ = GameSource::Cable;
   pulls_ = 0;
+  formerPulls_ = 0;
+  opening_.reset();
+  lastStateIsElse_ = false;
   // A game that is cleared in the middle of a pull goes on with the guns that are still to come.
 }
 
+void GameKeeper::Open(std::int64_t gameId, std::int64_t state, const Game& game,
+                      const std::string& missionName) {
+  gameId_ = gameId;
+  lastStateIsElse_ = state != 0;
+  opening_ = InputsDigest(game, missionName);
+  Try([this] {
+    OpenFile();
+    NotePulls();
+  });
+}
+
+void GameKeeper::EndOpening() {
+  if (!opening_) {
+    return;
+  }
+  // A mission that is gone, or a button that has an owner now, make other inputs of it without the operator.
+  const Marks now = MarksOf(parts_.Session.Game());
+  lastStateIsElse_ = lastStateIsElse_ || now.Inputs != *opening_;
+  kept_ = now;
+  opening_.reset();
+  state_.KeptAt = parts_.Time.ShortTime();
+}
+
 void GameKeeper::BeginPull(GameSource source) {
+  opening_.reset();
   Keep();
   if (!parts_.Session.Game().DataPresent) {
     source_ = source;
@@ -96,7 +126,7 @@ void GameKeeper::Try(const Action& action) {
 }
 
 void GameKeeper::Keep() {
-  if (ended_ || keeping_ || !parts_.Session.Game().DataPresent) {
+  if (ended_ || keeping_ || opening_ || !parts_.Session.Game().DataPresent) {
     return;
   }
   if (!scoresPending_) {
@@ -145,20 +175,40 @@ void GameKeeper::Write(const Game& game, const Marks& now) {
   const FormerState former = FormerOf(now);
   pulls_ += pullBegun_ && (!kept_ || kept_->Raw != now.Raw) ? 1 : 0;
   if (!gameId_ && source_ == GameSource::File && pulls_ == 0) {
-    gameId_ = archive.Find(game, parts_.Session.Missions().Text());
-  } else if (!gameId_ || !archive.KeepAgain(*gameId_, StateOf(game), former)) {
+    FindIn(archive, game);
+  } else if (gameId_ && archive.KeepAgain(*gameId_, StateOf(game), former)) {
+    lastStateIsElse_ = false;
+  } else {
     gameId_.reset();
   }
   if (!gameId_) {
+    formerPulls_ = 0;
     gameId_ = archive.Keep(StateOf(game));
+    lastStateIsElse_ = false;
   }
   kept_ = now;
   pullBegun_ = false;
   state_.KeptAt = parts_.Time.ShortTime();
 }
 
+void GameKeeper::FindIn(GameArchive& archive, const Game& game) {
+  if (const auto found = archive.FindState(game, parts_.Session.Missions().Text())) {
+    gameId_ = found->GameId;
+    lastStateIsElse_ = found->State != 0;
+    NotePulls();
+  }
+}
+
+void GameKeeper::NotePulls() {
+  const std::optional<ListedGame> row = ArchiveQueries(file_.Open->Statements()).Game(*gameId_);
+  formerPulls_ = row ? row->Pulls : 0;
+}
+
 // Guns that come in one by one complete a game; only what is added up hides what was there before.
 FormerState GameKeeper::FormerOf(const Marks& now) const {
+  if (lastStateIsElse_) {
+    return FormerState::KeptToo;
+  }
   if (!kept_ || kept_->Raw == now.Raw) {
     return FormerState::Replaced;
   }
@@ -174,7 +224,7 @@ GameState GameKeeper::StateOf(const Game& game) const {
           .Mission = parts_.Session.Missions().Text(),
           .Played = Played(),
           .Source = source_,
-          .Pulls = std::max(1, pulls_),
+          .Pulls = std::max(1, formerPulls_ + pulls_),
           .Factors = parts_.Session.Factors()};
 }
 
@@ -208,6 +258,14 @@ void GameKeeper::CheckMembers() {
     }
     for (const CutMember& cut : Archive().CheckMembers()) {
       state_.CutGames += cut.Games;
+    }
+  });
+}
+
+void GameKeeper::RemoveDeleted() {
+  Try([this] {
+    if (ArchiveExists()) {
+      Archive().RemoveDeleted(LastTimeOfRemoved(parts_.Time.Now()));
     }
   });
 }

@@ -56,6 +56,15 @@ class GameKeeper {
   /// where it was pulled, other figures. The archive's file is made when it is needed first.
   void Keep();
 
+  /// A game of the archive is being loaded: `game` as it was just read, with the mission of that name, its
+  /// scores still to come. Whatever becomes of it is that game; a state that the operator changes then does
+  /// not replace a later one. To be called once the session has cleared the board.
+  void Open(std::int64_t gameId, std::int64_t state, const Game& game, const std::string& missionName);
+
+  /// Removes the games that were deleted so long ago that they cannot be brought back. Does nothing without
+  /// an archive.
+  void RemoveDeleted();
+
   /// Cuts the numbers of members that belong to somebody else now from all past games. To be called at start,
   /// and when the members have been replaced as a whole. Does nothing without an archive.
   void CheckMembers();
@@ -79,11 +88,16 @@ class GameKeeper {
   };
 
   void Hear(SessionChange change);
+  /// The scores of the game that is being opened are there.
+  void EndOpening();
   void Forget();
   void KeepAs(const Game& game);
   Marks MarksOf(const Game& game) const;
   bool IsKept(const Marks& now) const;
   void Write(const Game& game, const Marks& now);
+  /// Looks for a loaded game among the past ones.
+  void FindIn(GameArchive& archive, const Game& game);
+  void NotePulls();
   FormerState FormerOf(const Marks& now) const;
   GameState StateOf(const Game& game) const;
   /// Local time at which the game was played, "YYYY-MM-DD HH:MM:SS".
@@ -102,8 +116,12 @@ class GameKeeper {
   std::optional<Marks> kept_;
   GameSource source_ = GameSource::Cable;
   int pulls_ = 0;
-  bool pullBegun_ = false;      ///< and nothing of it is kept yet
-  bool scoresPending_ = false;  ///< guns may have been read since the last calculation
+  int formerPulls_ = 0;  ///< of a past game, before it came onto the board again
+  /// Digest of the inputs of a game that is being opened, as they were before its scores were calculated.
+  std::optional<std::uint64_t> opening_;
+  bool lastStateIsElse_ = false;  ///< what the archive has as the last state was not on this board
+  bool pullBegun_ = false;        ///< and nothing of it is kept yet
+  bool scoresPending_ = false;    ///< guns may have been read since the last calculation
   bool keeping_ = false;
   bool ended_ = false;
   Subscription subscription_;

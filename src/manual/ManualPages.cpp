@@ -54,6 +54,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"GameCharts", "Game charts", "比赛图表"},
       {"PrintOptions", "Score sheets", "成绩单"},
       {"SheetProgressWindow", "Score sheets", "成绩单"},
+      {"PastGames", "Past games", "历史比赛"},
       {"ExportGames", "Export", "导出"},
       {"Settings", "Settings", "设置"},
       {"SoldieringCalc", "Soldiering calculation", "战功计算"},

@@ -68,6 +68,7 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
       {"mnuChargeiButton", {"Charging buttons", "信息扣充值"}},
       {"mnuFirmwareUpdate", {"Firmware", "固件"}},
       {"mnuSoundRecorder", {"Sound recorder", "声音录制"}},
+      {"mnuPastGames", {"Past games", "历史比赛"}},
       {"mnuBackupCopies", {"Backup copies", "备份副本"}},
       {"mnuCommPort", {"Settings", "设置"}},
       {"mnuSoldieringCalc", {"Soldiering calculation", "战功计算"}},

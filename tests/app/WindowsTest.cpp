@@ -3,6 +3,7 @@
 #include "app/About.h"
 #include "app/UploadProgress.h"
 #include "archive/copies/BackupCopies.h"
+#include "archive/past/PastGames.h"
 #include "audience/AudienceSettings.h"
 #include "audience/GuestNameEntry.h"
 #include "board/AdminData.h"
@@ -123,6 +124,12 @@ TEST_P(Windows, OfAPlayerAreCaredFor) {
   });
   venue.ChooseInPopup(0, "mnuBonusPoints");
   EXPECT_EQ(bonus.Runs(), 1);
+}
+
+TEST_P(Windows, OfPastGamesIsCaredForWithAndWithoutGames) {
+  LookAt<PastGames>("mnuPastGames");
+  venue.LoadGame(GameOfManyHits());
+  LookAt<PastGames>("mnuPastGames");
 }
 
 TEST_P(Windows, OfTheGuestsIsCaredFor) {

@@ -117,8 +117,10 @@ TEST_F(AskedArchive, TellsAGame) {
   EXPECT_EQ(game->Pulls, 1);
   EXPECT_EQ(game->Committed, 1);
   EXPECT_EQ(queries.Game(77), std::nullopt);
+  EXPECT_EQ(game->Deleted, "");
+  EXPECT_EQ(game->EarlierStates, 0);
   Delete(2);
-  EXPECT_EQ(queries.Game(2), std::nullopt);
+  EXPECT_EQ(queries.Game(2)->Deleted, "2027-01-01 00:00:00");
 }
 
 TEST_F(AskedArchive, TellsAGameWithoutPlayers) {
@@ -198,6 +200,12 @@ TEST_F(QueryPlans, OfAllGamesReadOneIndexInItsOrder) {
   const std::string plan = PlanOf({});
   EXPECT_THAT(plan, HasSubstr("USING COVERING INDEX GamesByPlayed"));
   EXPECT_THAT(plan, Not(HasSubstr("FOR ORDER BY")));
+}
+
+TEST_F(QueryPlans, OfMissionsAndDeletedGamesReadOneIndexOnly) {
+  queries.Missions();
+  EXPECT_THAT(Plan(), HasSubstr("USING COVERING INDEX GamesByMission"));
+  EXPECT_THAT(PlanOf({.Deleted = true}), HasSubstr("USING COVERING INDEX GamesByPlayed"));
 }
 
 TEST_F(QueryPlans, OfListsSearchAndScanNothing) {

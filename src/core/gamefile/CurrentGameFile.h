@@ -31,7 +31,7 @@ class CurrentGameFile {
   /// Asks for a game to load. Returns false, and forgets the file, if the operator cancels.
   bool AskForGame();
 
-  /// Takes this file as if the operator had chosen it.
+  /// Takes this file as if the operator had chosen it; an empty path forgets the last one.
   void Choose(std::string path) { fileName_ = std::move(path); }
 
   /// Reads the chosen file into `game`, which the caller has cleared. If it is not a game file, shows a box
