@@ -10,6 +10,7 @@
 #include "app/BoardCharts.h"
 #include "app/Desk.h"
 #include "app/GameKeeping.h"
+#include "app/IdleCopying.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
 #include "audience/AudienceBoard.h"
@@ -157,6 +158,7 @@ class frmRx : public QMainWindow {
   Commands commands_;
   std::optional<Desk> desk_;
   std::optional<GameKeeping> keeping_;
+  std::optional<IdleCopying> idleCopying_;
   std::optional<BoardCharts> charts_;
   GuestList guests_;
   std::optional<AudienceBoard> audience_;

@@ -156,6 +156,7 @@ void GameKeeper::Keep() {
   if (ended_ || keeping_) {
     return;
   }
+  LeaveMovedFile();
   if (!parts_.Session.Game().DataPresent) {
     SeeWhetherItWorksAgain();
     return;
@@ -206,14 +207,17 @@ void GameKeeper::CheckRoom() const {
   }
 }
 
-void GameKeeper::Recognise(GameArchive& archive, const Game& game, bool isLoaded) {
+bool GameKeeper::Recognise(GameArchive& archive, const Game& game, bool isLoaded) {
   const bool isLost = gameId_ && PlayedIn(file_.Open->Statements(), *gameId_) != played_;
   if (isLost) {
     gameId_.reset();
   }
-  if (!gameId_ && (isLost || isLoaded)) {
-    gameId_ = archive.Find(game, parts_.Session.Missions().Text());
+  if (!isLost && !(isLoaded && !kept_)) {
+    return false;
   }
+  const std::optional<std::int64_t> found = archive.Find(game, parts_.Session.Missions().Text());
+  gameId_ = found ? found : gameId_;
+  return found && isLoaded;
 }
 
 void GameKeeper::Write(const Game& game, const Marks& now) {
@@ -222,10 +226,8 @@ void GameKeeper::Write(const Game& game, const Marks& now) {
   const FormerState former = FormerOf(now);
   const int pulls = pulls_ + (pullBegun_ && (!kept_ || kept_->Raw != now.Raw) ? 1 : 0);
   const bool isLoaded = source_ == GameSource::File && pulls == 0;
-  const bool wasKnown = gameId_.has_value();
-  Recognise(archive, game, isLoaded);
   // A loaded game that is there already keeps the figures of its evening.
-  const bool isThere = gameId_ && !wasKnown && isLoaded;
+  const bool isThere = Recognise(archive, game, isLoaded);
   if (!isThere && gameId_ && !archive.KeepAgain(*gameId_, StateOf(game, pulls), former)) {
     gameId_.reset();
   }
@@ -267,15 +269,20 @@ std::string GameKeeper::Played() const {
 }
 
 Database& GameKeeper::OpenFile() {
-  if (file_.Open && file_.Open->HasMoved()) {
-    CloseFile();
-  }
+  LeaveMovedFile();
   if (!file_.Open) {
     file_ = OpenArchive(parts_.Engine, parts_.Disk, parts_.UserDataFolder,
                         parts_.ProgramFolder + "/games_default.mdb");
     state_.Unusable = file_.Unusable;
   }
   return *file_.Open;
+}
+
+void GameKeeper::LeaveMovedFile() {
+  if (file_.Open && file_.Open->HasMoved()) {
+    CloseFile();
+    kept_.reset();
+  }
 }
 
 void GameKeeper::CloseFile() noexcept {

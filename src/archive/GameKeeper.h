@@ -92,8 +92,9 @@ class GameKeeper {
   Marks MarksOf(const Game& game) const;
   bool IsKept(const Marks& now) const;
   void Write(const Game& game, const Marks& now);
-  /// Finds the game on the board in the archive if that has become another one, or the game was loaded.
-  void Recognise(GameArchive& archive, const Game& game, bool isLoaded);
+  /// Finds the game on the board in the archive if that has become another one, or the game was loaded. True
+  /// if a loaded game is there just as it is.
+  bool Recognise(GameArchive& archive, const Game& game, bool isLoaded);
   FormerState FormerOf(const Marks& now) const;
   GameState StateOf(const Game& game, int pulls) const;
   /// Local time at which the game was played, "YYYY-MM-DD HH:MM:SS".
@@ -101,6 +102,8 @@ class GameKeeper {
   GameArchive Archive();
   Database& OpenFile();
   void CloseFile() noexcept;
+  /// Closes the file if it is no longer the one at its path. What is in that one must be seen.
+  void LeaveMovedFile();
   void CheckRoom() const;
   void SeeWhetherItWorksAgain();
   /// True if another archive takes the place of the one that failed so.

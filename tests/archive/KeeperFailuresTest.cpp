@@ -139,6 +139,35 @@ TEST_F(ArchiveInUse, ThatWasReplacedByACopyOfItselfHasTheGameOnce) {
             std::to_string(session.Game().Players(Red0).Soldiering));
 }
 
+TEST_F(ArchiveInUse, ThatWasReplacedByAnOlderCopyGetsTheGameOnTheBoardAgain) {
+  Pull();
+  session.ClearPlayerData();
+  const std::string copy = ReadFile(ArchivePath());
+  Pull();
+  EXPECT_EQ(Games(), "2");
+  WriteFile(venue.Folder / "other.mdb", copy);
+  std::filesystem::rename(venue.Folder / "other.mdb", ArchivePath());
+  keeper->Keep();
+  ExpectKept();
+  EXPECT_EQ(Games(), "2");
+  EXPECT_EQ(Query("SELECT Pulls FROM Games WHERE GameID = 2"), "1");
+}
+
+TEST_F(ArchiveInUse, ThatWasReplacedLeavesTheFiguresOfALoadedGame) {
+  Pull();
+  const std::string file = WriteGameFile(session.Game(), session.Missions().Text());
+  const std::string soldiering = Query("SELECT Soldiering FROM GamePlayers WHERE PlayerIndex = 40");
+  session.ClearPlayerData();
+  session.Factors().Damage *= 3;
+  Load(file);
+  std::filesystem::copy_file(ArchivePath(), venue.Folder / "other.mdb");
+  std::filesystem::rename(venue.Folder / "other.mdb", ArchivePath());
+  keeper->Keep();
+  ExpectKept();
+  EXPECT_EQ(Games(), "1");
+  EXPECT_EQ(Query("SELECT Soldiering FROM GamePlayers WHERE PlayerIndex = 40"), soldiering);
+}
+
 TEST_F(ArchiveInUse, ThatWasReplacedByAnotherVenuesKeepsTheGamesOfThat) {
   Pull();
   const std::string empty = MadeDatabase(
