@@ -41,6 +41,8 @@ QString NameOf(DeskTopic topic) {
       return QStringLiteral("DeskArchiveUnusable");
     case DeskTopic::CutGames:
       return QStringLiteral("DeskCutGames");
+    case DeskTopic::WeeklyCopyFailed:
+      return QStringLiteral("DeskWeeklyCopyFailed");
   }
   return {};
 }
@@ -143,6 +145,7 @@ DeskFacts Desk::Facts() const {
   facts.NotKept = keeping_.Failure;
   facts.UnusableArchive = keeping_.Unusable;
   facts.CutGames = keeping_.CutGames;
+  facts.WeeklyCopyFailure = keeping_.CopyFailure;
   return facts;
 }
 

@@ -18,6 +18,16 @@ void GameKeeping::End() {
 
 void GameKeeping::Do(void (GameKeeper::*act)()) {
   (keeper_.*act)();
+  TellChanges();
+}
+
+bool GameKeeping::CopyAPart() {
+  const bool hasMore = keeper_.CopyAPart();
+  TellChanges();
+  return hasMore;
+}
+
+void GameKeeping::TellChanges() {
   if (keeper_.State() != told_) {
     told_ = keeper_.State();
     tell_(told_);

@@ -27,12 +27,15 @@ class GameKeeping : public QObject {
   void NoteMembers() { Do(&GameKeeper::NoteMembers); }
   /// The members may be others, all of them.
   void CheckMembers() { Do(&GameKeeper::CheckMembers); }
+  /// Does a step of the archive's weekly copy; false if there is nothing more to do for now.
+  bool CopyAPart();
 
  protected:
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
   void Do(void (GameKeeper::*act)());
+  void TellChanges();
 
   GameKeeper keeper_;
   const std::function<bool()> pulling_;

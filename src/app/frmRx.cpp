@@ -60,6 +60,9 @@ bool frmRx::FormLoad() {
   SetUpDesk();
   SetUpKeeping();
   SetUpAudience();
+  idleCopying_.emplace(IdleCopying::Parts{.CopyAPart = [this] { return keeping_->CopyAPart(); },
+                                          .Busy = [this] { return downloading_ || IsBusy(); },
+                                          .Elapsed = services_.Elapsed});
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
@@ -261,6 +264,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
     commPort_->CloseIfOpen();
   }
   if (desk_) {
+    idleCopying_->End();
     keeping_->End();
     desk_->End();
     charts_->Close();

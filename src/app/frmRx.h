@@ -10,6 +10,7 @@
 #include "app/BoardCharts.h"
 #include "app/Desk.h"
 #include "app/GameKeeping.h"
+#include "app/IdleCopying.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
 #include "archive/ArchiveAccess.h"
@@ -167,6 +168,7 @@ class frmRx : public QMainWindow {
   std::optional<Desk> desk_;
   std::optional<GameKeeping> keeping_;
   std::optional<ArchiveAccess> archive_;  ///< for windows; the keeper has its own
+  std::optional<IdleCopying> idleCopying_;
   std::optional<BoardCharts> charts_;
   GuestList guests_;
   std::optional<AudienceBoard> audience_;

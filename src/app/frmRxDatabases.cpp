@@ -3,6 +3,8 @@
 #include <optional>
 
 #include "app/frmRx.h"
+#include "archive/ArchiveCopies.h"
+#include "archive/CopiedArchive.h"
 #include "archive/copies/BackupCopies.h"
 #include "core/text/Filled.h"
 #include "members/ExportMembers.h"
@@ -60,21 +62,30 @@ void frmRx::ImportMemberFile() {
 
 void frmRx::ShowBackupCopies() {
   const std::string defaults = services_.Places.Program();
-  BackupCopies({.Databases = {{.Name = "scenarios",
-                               .Table = "Table1",
-                               .DefaultPath = defaults + "/scenarios_default.mdb",
-                               .Title = OwnText::CopiedMissions,
-                               .InUse = [this]() -> Database& { return session_.DbScenarios(); }},
-                              {.Name = "members",
-                               .Table = "Members",
-                               .DefaultPath = defaults + "/members_default.mdb",
-                               .Title = OwnText::CopiedMembers,
-                               .InUse = [this]() -> Database& { return session_.DbMembers(); }}},
+  std::vector<CopiedDatabase> databases = {
+      {.Name = "scenarios",
+       .Table = "Table1",
+       .DefaultPath = defaults + "/scenarios_default.mdb",
+       .Title = OwnText::CopiedMissions,
+       .InUse = [this]() -> Database& { return session_.DbScenarios(); }},
+      {.Name = "members",
+       .Table = "Members",
+       .DefaultPath = defaults + "/members_default.mdb",
+       .Title = OwnText::CopiedMembers,
+       .InUse = [this]() -> Database& { return session_.DbMembers(); }}};
+  CopiedArchive archive({.Engine = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
+                         .Disk = services_.Disk,
+                         .UserDataFolder = userDataFolder_,
+                         .ProgramFolder = defaults});
+  if (archive.IsThere()) {
+    databases.push_back(archive.Entry());
+  }
+  BackupCopies({.Databases = std::move(databases),
                 .Work = {.Engine = services_.Databases,
                          .Disk = services_.Disk,
                          .Time = services_.Time,
                          .Strings = services_.Strings,
-                         .Folder = userDataFolder_ + "/backups"},
+                         .Folder = BackupFolderIn(userDataFolder_)},
                 .Events = services_.Events,
                 .Boxes = services_.Boxes,
                 .FileDialog = services_.CommonDialog1,

@@ -5,6 +5,30 @@
 
 namespace {
 
+std::string UsualPath(const std::string& userDataFolder) {
+  return userDataFolder + "/games.mdb";
+}
+
+std::string FreshPath(const std::string& userDataFolder) {
+  return userDataFolder + "/games-new.mdb";
+}
+
+/// Beside an archive that was set aside: what told it from others then.
+std::string MarkPath(const std::string& path) {
+  return path + ".damaged";
+}
+
+/// The file's length and header, which holds a count of all its changes.
+std::string MarkOfArchive(const Files& disk, const std::string& path) {
+  constexpr std::size_t headerLength = 100;
+  return std::to_string(disk.FileLen(path)) + "\n" + disk.ReadPart(path, 0, headerLength);
+}
+
+bool IsSetAside(const Files& disk, const std::string& path) {
+  const std::string mark = MarkPath(path);
+  return disk.FileExists(mark) && disk.Read(mark) == MarkOfArchive(disk, path);
+}
+
 void MakeIfMissing(Files& disk, const std::string& path, const std::string& defaultPath) {
   if (disk.FileExists(path)) {
     return;
@@ -45,16 +69,34 @@ std::unique_ptr<Database> OpenChecked(DatabaseEngine& engine, Files& disk, const
 
 }  // namespace
 
+bool ArchiveExists(const Files& disk, const std::string& userDataFolder) {
+  return disk.FileExists(UsualPath(userDataFolder)) || disk.FileExists(FreshPath(userDataFolder));
+}
+
 ArchiveFile OpenArchive(DatabaseEngine& engine, Files& disk, const std::string& userDataFolder,
                         const std::string& defaultPath) {
-  const std::string usual = userDataFolder + "/games.mdb";
+  const std::string usual = UsualPath(userDataFolder);
+  const std::string fresh = FreshPath(userDataFolder);
+  const bool usualExists = disk.FileExists(usual);
+  if (!usualExists && disk.FileExists(fresh)) {  // the damaged one was taken away
+    return {OpenChecked(engine, disk, fresh, defaultPath), fresh, {}};
+  }
   try {
-    return {OpenChecked(engine, disk, usual, defaultPath), usual, {}};
+    if (!usualExists || !IsSetAside(disk, usual)) {
+      return {OpenChecked(engine, disk, usual, defaultPath), usual, {}};
+    }
   } catch (const RuntimeError& error) {
     if (error.Number() != Fault::UnrecognizedDatabase) {
       throw;
     }
   }
-  const std::string fresh = userDataFolder + "/games-new.mdb";
   return {OpenChecked(engine, disk, fresh, defaultPath), fresh, usual};
+}
+
+bool SetArchiveAside(Files& disk, const std::string& path) {
+  if (!path.ends_with("/games.mdb")) {
+    return false;
+  }
+  disk.Replace(MarkPath(path), MarkOfArchive(disk, path));
+  return true;
 }

@@ -14,9 +14,17 @@ struct ArchiveFile {
   std::string Unusable;
 };
 
-/// Opens "games.mdb" in the user's data folder. A missing file is made as a copy of `defaultPath`. In place
-/// of one that is damaged, or no archive, "games-new.mdb" beside it is opened, or made. Nobody is asked.
-/// Throws RuntimeError as DatabaseEngine::OpenDatabase and Files::Replace do, for instance 3050 for a locked
-/// file and 3343 if the one beside it is damaged too.
+/// True if there is an archive already.
+bool ArchiveExists(const Files& disk, const std::string& userDataFolder);
+
+/// Opens "games.mdb" in the user's data folder. A missing file is made as a copy of `defaultPath`, unless
+/// "games-new.mdb" is there. That one is also opened, or made, in place of one that is damaged, was set aside
+/// or is no archive. Nobody is asked. Throws RuntimeError as DatabaseEngine::OpenDatabase and Files::Replace
+/// do, for instance 3050 for a locked file and 3343 if the one beside it is damaged too.
 ArchiveFile OpenArchive(DatabaseEngine& engine, Files& disk, const std::string& userDataFolder,
                         const std::string& defaultPath);
+
+/// From now on, also in later runs, OpenArchive leaves the archive at `path` alone, since its damage was
+/// found in use, unless the file is another one by then. No database on it may be open. Returns false, having
+/// done nothing, for one that is already beside another. Throws RuntimeError as Files::Replace does.
+bool SetArchiveAside(Files& disk, const std::string& path);

@@ -5,6 +5,7 @@
 
 #include "archive/ArchiveQueries.h"
 #include "archive/DeletedGames.h"
+#include "archive/KeepingFailure.h"
 #include "core/game/WordDigest.h"
 #include "platform/RuntimeError.h"
 
@@ -36,15 +37,37 @@ std::uint64_t FiguresDigest(const Game& game) {
   return digest.Value();
 }
 
+/// When the game was played; empty if the archive has no such game, or has deleted it.
+std::string PlayedIn(Sql& sql, std::int64_t gameId) {
+  std::string played;
+  sql.Query("SELECT Played FROM Games WHERE GameID = $1 AND Deleted IS NULL", {gameId},
+            [&played](const SqlRow& row) { played = row.Text(0); });
+  return played;
+}
+
+/// True as long as it exists.
+class Flagged {
+ public:
+  explicit Flagged(bool& flag) : flag_(flag) { flag_ = true; }
+  ~Flagged() { flag_ = false; }
+  Flagged(const Flagged&) = delete;
+  Flagged& operator=(const Flagged&) = delete;
+
+ private:
+  bool& flag_;
+};
+
 }  // namespace
 
 GameKeeper::GameKeeper(Parts parts)
     : parts_(std::move(parts)),
+      copy_({parts_.Disk, parts_.Time, parts_.Strings, parts_.UserDataFolder}),
       subscription_(parts_.Session.Listen([this](SessionChange change) { Hear(change); })) {
   parts_.Session.BeforeClear = [this] { Keep(); };
 }
 
 GameKeeper::~GameKeeper() {
+  CloseFile();
   parts_.Session.BeforeClear = nullptr;
 }
 
@@ -69,7 +92,6 @@ void GameKeeper::Forget() {
   gameId_.reset();
   kept_.reset();
   state_.KeptAt.clear();
-  state_.Failure.clear();
   source_ = GameSource::Cable;
   pulls_ = 0;
   formerPulls_ = 0;
@@ -84,7 +106,7 @@ void GameKeeper::Open(std::int64_t gameId, std::int64_t state, const Game& game,
   lastStateIsElse_ = state != 0;
   opening_ = InputsDigest(game, missionName);
   Try([this] {
-    OpenFile();
+    played_ = PlayedIn(OpenFile().Statements(), *gameId_);
     NotePulls();
   });
 }
@@ -113,20 +135,60 @@ void GameKeeper::BeginPull(GameSource source) {
 
 template <typename Action>
 void GameKeeper::Try(const Action& action) {
-  if (ended_ || std::exchange(keeping_, true)) {
+  if (ended_ || keeping_) {
     return;
   }
+  const Flagged keeping(keeping_);
   try {
-    action();
+    try {
+      action();
+    } catch (const RuntimeError& failure) {
+      if (!SetAside(failure)) {
+        throw;
+      }
+      action();
+    }
     state_.Failure.clear();
-  } catch (const RuntimeError& error) {
-    state_.Failure = error.what();
+  } catch (const RuntimeError& failure) {
+    state_.Failure = TextOf(failure);
+    CloseFile();  // another mode, or another file, may do next time
   }
-  keeping_ = false;
+}
+
+bool GameKeeper::SetAside(const RuntimeError& failure) {
+  const std::string path = file_.Path;
+  if (failure.Number() != Fault::UnrecognizedDatabase || !file_.Open || !IsAboutFile(failure, path)) {
+    return false;
+  }
+  CloseFile();
+  return SetArchiveAside(parts_.Disk, path);
+}
+
+std::string GameKeeper::TextOf(const RuntimeError& failure) const {
+  for (const char* name : {"/games.mdb", "/games-new.mdb"}) {
+    if (const std::string path = parts_.UserDataFolder + name; IsAboutFile(failure, path)) {
+      return KeepingFailureText(failure, path, parts_.Strings);
+    }
+  }
+  return failure.what();
+}
+
+void GameKeeper::SeeWhetherItWorksAgain() {
+  if (!state_.Failure.empty()) {
+    Try([this] {
+      CheckRoom();
+      const WriteScope scope(OpenFile());  // which nothing is written in
+    });
+  }
 }
 
 void GameKeeper::Keep() {
-  if (ended_ || keeping_ || opening_ || !parts_.Session.Game().DataPresent) {
+  if (ended_ || keeping_ || opening_) {
+    return;
+  }
+  LeaveMovedFile();
+  if (!parts_.Session.Game().DataPresent) {
+    SeeWhetherItWorksAgain();
     return;
   }
   if (!scoresPending_) {
@@ -147,6 +209,8 @@ void GameKeeper::KeepAs(const Game& game) {
   const Marks now = MarksOf(game);
   if (!IsKept(now)) {
     Try([&] { Write(game, now); });
+  } else {
+    SeeWhetherItWorksAgain();
   }
 }
 
@@ -167,36 +231,51 @@ bool GameKeeper::IsKept(const Marks& now) const {
   return kept_ && kept_->Inputs == now.Inputs && (pulls_ == 0 || kept_->Figures == now.Figures);
 }
 
-void GameKeeper::Write(const Game& game, const Marks& now) {
+void GameKeeper::CheckRoom() const {
   if (parts_.Disk.FreeSpace(parts_.UserDataFolder) < LeastFreeSpace) {
     throw RuntimeError(Fault::DiskFull, parts_.Strings.Text(OwnText::KeeperDiskFull));
   }
-  GameArchive archive = Archive();
-  const FormerState former = FormerOf(now);
-  pulls_ += pullBegun_ && (!kept_ || kept_->Raw != now.Raw) ? 1 : 0;
-  if (!gameId_ && source_ == GameSource::File && pulls_ == 0) {
-    FindIn(archive, game);
-  } else if (gameId_ && archive.KeepAgain(*gameId_, StateOf(game), former)) {
-    lastStateIsElse_ = false;
-  } else {
-    gameId_.reset();
-  }
-  if (!gameId_) {
-    formerPulls_ = 0;
-    gameId_ = archive.Keep(StateOf(game));
-    lastStateIsElse_ = false;
-  }
-  kept_ = now;
-  pullBegun_ = false;
-  state_.KeptAt = parts_.Time.ShortTime();
 }
 
-void GameKeeper::FindIn(GameArchive& archive, const Game& game) {
-  if (const auto found = archive.FindState(game, parts_.Session.Missions().Text())) {
-    gameId_ = found->GameId;
-    lastStateIsElse_ = found->State != 0;
+bool GameKeeper::Recognise(GameArchive& archive, const Game& game, bool isLoaded) {
+  const bool isLost = gameId_ && PlayedIn(file_.Open->Statements(), *gameId_) != played_;
+  if (isLost) {
+    gameId_.reset();
+  }
+  if (!isLost && !(isLoaded && !kept_)) {
+    return false;
+  }
+  const auto found = archive.FindState(game, parts_.Session.Missions().Text());
+  if (!found) {
+    return false;
+  }
+  gameId_ = found->GameId;
+  lastStateIsElse_ = found->State != 0;
+  if (isLoaded) {
     NotePulls();
   }
+  return isLoaded;
+}
+
+void GameKeeper::Write(const Game& game, const Marks& now) {
+  CheckRoom();
+  GameArchive archive = Archive();
+  const int pulls = pulls_ + (pullBegun_ && (!kept_ || kept_->Raw != now.Raw) ? 1 : 0);
+  const bool isLoaded = source_ == GameSource::File && pulls == 0;
+  // A loaded game that is there already keeps the figures of its evening.
+  const bool isThere = Recognise(archive, game, isLoaded);
+  if (!isThere) {
+    if (!gameId_ || !archive.KeepAgain(*gameId_, StateOf(game, pulls), FormerOf(now))) {
+      formerPulls_ = 0;
+      gameId_ = archive.Keep(StateOf(game, pulls));
+    }
+    lastStateIsElse_ = false;
+  }
+  played_ = PlayedIn(file_.Open->Statements(), *gameId_);
+  kept_ = now;
+  pulls_ = pulls;
+  pullBegun_ = false;
+  state_.KeptAt = parts_.Time.ShortTime();
 }
 
 void GameKeeper::NotePulls() {
@@ -219,12 +298,12 @@ FormerState GameKeeper::FormerOf(const Marks& now) const {
   return addedUp ? FormerState::KeptToo : FormerState::Replaced;
 }
 
-GameState GameKeeper::StateOf(const Game& game) const {
+GameState GameKeeper::StateOf(const Game& game, int pulls) const {
   return {.Game = game,
           .Mission = parts_.Session.Missions().Text(),
           .Played = Played(),
           .Source = source_,
-          .Pulls = std::max(1, formerPulls_ + pulls_),
+          .Pulls = std::max(1, formerPulls_ + pulls),
           .Factors = parts_.Session.Factors()};
 }
 
@@ -234,26 +313,35 @@ std::string GameKeeper::Played() const {
   return told.empty() ? parts_.Progress.Received() : told;
 }
 
-bool GameKeeper::ArchiveExists() const {
-  return file_.Open || parts_.Disk.FileExists(parts_.UserDataFolder + "/games.mdb");
-}
-
-void GameKeeper::OpenFile() {
+Database& GameKeeper::OpenFile() {
+  LeaveMovedFile();
   if (!file_.Open) {
     file_ = OpenArchive(parts_.Engine, parts_.Disk, parts_.UserDataFolder,
                         parts_.ProgramFolder + "/games_default.mdb");
     state_.Unusable = file_.Unusable;
   }
+  return *file_.Open;
+}
+
+void GameKeeper::LeaveMovedFile() {
+  if (file_.Open && file_.Open->HasMoved()) {
+    CloseFile();
+    kept_.reset();
+  }
+}
+
+void GameKeeper::CloseFile() noexcept {
+  copy_.Stop();
+  file_.Open.reset();
 }
 
 GameArchive GameKeeper::Archive() {
-  OpenFile();
-  return {*file_.Open, parts_.Session.DbMembers(), parts_.Strings};
+  return {OpenFile(), parts_.Session.DbMembers(), parts_.Strings};
 }
 
 void GameKeeper::CheckMembers() {
   Try([this] {
-    if (!ArchiveExists()) {
+    if (!ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
       return;
     }
     for (const CutMember& cut : Archive().CheckMembers()) {
@@ -264,7 +352,7 @@ void GameKeeper::CheckMembers() {
 
 void GameKeeper::RemoveDeleted() {
   Try([this] {
-    if (ArchiveExists()) {
+    if (ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
       Archive().RemoveDeleted(LastTimeOfRemoved(parts_.Time.Now()));
     }
   });
@@ -278,9 +366,29 @@ void GameKeeper::NoteMembers() {
   });
 }
 
+bool GameKeeper::CopyAPart() {
+  if (ended_ || keeping_) {
+    return false;
+  }
+  try {
+    if (!copy_.IsRunning() && (!ArchiveExists(parts_.Disk, parts_.UserDataFolder) || !copy_.IsDue())) {
+      state_.CopyFailure.clear();
+      return false;
+    }
+    const bool isWhole = copy_.Step(OpenFile());
+    if (isWhole) {
+      state_.CopyFailure.clear();
+    }
+    return !isWhole;
+  } catch (const RuntimeError& failure) {
+    state_.CopyFailure = TextOf(failure);
+    return false;
+  }
+}
+
 void GameKeeper::End() {
   Keep();
   ended_ = true;
   subscription_.End();
-  file_.Open.reset();
+  CloseFile();
 }

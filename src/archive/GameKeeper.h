@@ -8,6 +8,7 @@
 
 #include "archive/ArchiveFile.h"
 #include "archive/GameArchive.h"
+#include "archive/WeeklyCopy.h"
 #include "core/game/GameProgress.h"
 #include "core/game/Session.h"
 #include "platform/Clock.h"
@@ -16,16 +17,18 @@
 /// What the operator is told about the keeping of games.
 struct KeptState {
   std::string KeptAt;   ///< time of day at which the game on the board was last kept; empty if it is not kept
-  std::string Failure;  ///< why it is not kept as it is now; empty if nothing failed
+  std::string Failure;  ///< why games are not kept, and what to do about it; empty if nothing failed
   std::string
-      Unusable;      ///< archive file that could not be used, so that another one was begun; empty if none
-  int CutGames = 0;  ///< past games that no longer name a member whose number is somebody else's now
+      Unusable;  ///< archive file that could not be used, so that another one was begun; empty if none
+  std::string CopyFailure;  ///< why the archive's weekly copy is not made; empty if nothing failed
+  int CutGames = 0;         ///< past games that no longer name a member whose number is somebody else's now
 
   bool operator==(const KeptState&) const = default;
 };
 
 /// Keeps the game on the board in the archive, without being asked and without asking. A failure stops
-/// nothing: it is told, and the next call tries again.
+/// nothing: it is told, and the next call tries again with the archive as it is by then. An archive that
+/// turns out damaged stays as it is from then on, and another one beside it takes its place.
 class GameKeeper {
  public:
   struct Parts {
@@ -53,7 +56,8 @@ class GameKeeper {
   void BeginPull(GameSource source);
 
   /// Keeps the game on the board if it is not kept as it is: if it has other inputs than what was kept or,
-  /// where it was pulled, other figures. The archive's file is made when it is needed first.
+  /// where it was pulled, other figures. The archive's file is made when it is needed first. After a failure
+  /// it looks whether games can be kept again, also without a game.
   void Keep();
 
   /// A game of the archive is being loaded: `game` as it was just read, with the mission of that name, its
@@ -71,6 +75,10 @@ class GameKeeper {
 
   /// Notes what now tells the known members apart. To be called after the operator may have changed members.
   void NoteMembers();
+
+  /// Does a step of a few milliseconds of the archive's weekly copy, if that is due. Returns false if there
+  /// is nothing more to do for now, also after a failure. To be called while nobody waits for the program.
+  bool CopyAPart();
 
   /// The archive's file is about to be closed: from now on nothing is kept any more.
   void End();
@@ -95,24 +103,35 @@ class GameKeeper {
   Marks MarksOf(const Game& game) const;
   bool IsKept(const Marks& now) const;
   void Write(const Game& game, const Marks& now);
-  /// Looks for a loaded game among the past ones.
-  void FindIn(GameArchive& archive, const Game& game);
+  /// Finds the game on the board in the archive if that has become another one, or the game was loaded. True
+  /// if a loaded game is there just as it is.
+  bool Recognise(GameArchive& archive, const Game& game, bool isLoaded);
   void NotePulls();
   FormerState FormerOf(const Marks& now) const;
-  GameState StateOf(const Game& game) const;
+  GameState StateOf(const Game& game, int pulls) const;
   /// Local time at which the game was played, "YYYY-MM-DD HH:MM:SS".
   std::string Played() const;
   GameArchive Archive();
-  bool ArchiveExists() const;
-  void OpenFile();
-  /// Runs `action` and keeps what it throws as the failure to tell.
+  Database& OpenFile();
+  void CloseFile() noexcept;
+  /// Closes the file if it is no longer the one at its path. What is in that one must be seen.
+  void LeaveMovedFile();
+  void CheckRoom() const;
+  void SeeWhetherItWorksAgain();
+  /// True if another archive takes the place of the one that failed so.
+  bool SetAside(const RuntimeError& failure);
+  /// Runs `action`, a second time if it can be done with another archive, and keeps what it throws as the
+  /// failure to tell.
   template <typename Action>
   void Try(const Action& action);
+  std::string TextOf(const RuntimeError& failure) const;
 
   const Parts parts_;
   ArchiveFile file_;
   KeptState state_;
+  WeeklyCopy copy_;                     ///< of the open file
   std::optional<std::int64_t> gameId_;  ///< of the game on the board, once it is kept
+  std::string played_;                  ///< in its row; no other archive has that number with that time
   std::optional<Marks> kept_;
   GameSource source_ = GameSource::Cable;
   int pulls_ = 0;

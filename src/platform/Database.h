@@ -85,6 +85,18 @@ class Recordset {
 /// alone and must not throw. False stops the operation.
 using KeepOn = std::function<bool()>;
 
+/// A copy of a database that is being made in steps. Between them the database may be used in any way. What
+/// is written through the same Database meanwhile is in the copy too; a change by anyone else begins it anew.
+class StepwiseCopy {
+ public:
+  virtual ~StepwiseCopy() = default;
+
+  /// Copies and flushes up to a megabyte. True once the copy is whole and durable; then there is no further
+  /// step. While another program has the file locked a step does nothing. Throws RuntimeError 3xxx like a
+  /// write.
+  virtual bool Step() = 0;
+};
+
 /// One open database file.
 class Database {
  public:
@@ -128,6 +140,10 @@ class Database {
   /// The same in steps. False if it was stopped. A change to the file by another program begins it anew.
   virtual bool CopyInSteps(const std::string& path, const KeepOn& keepOn) = 0;
 
+  /// Begins such a copy in a new file at `path`, which is partial until the last step. It must end before the
+  /// database does. Throws RuntimeError 3xxx like a write.
+  virtual std::unique_ptr<StepwiseCopy> BeginCopy(const std::string& path) = 0;
+
   /// Looks through the whole file. False if it was stopped. Throws RuntimeError 3343 for a damaged file.
   virtual bool CheckWhole(const KeepOn& keepOn) = 0;
 
@@ -137,6 +153,9 @@ class Database {
   /// Path by which the file was opened, and that of the file itself, behind symbolic links.
   virtual std::string Path() const = 0;
   virtual std::string FilePath() const = 0;
+
+  /// True if the file has been deleted, renamed or replaced since it was opened, or cannot be asked for.
+  virtual bool HasMoved() const = 0;
 
   /// Keeps all others from writing until ReleaseWriters, so that another file can be put in the place of this
   /// one: no journal stands beside it meanwhile. Only reads by another Database object are allowed. Throws

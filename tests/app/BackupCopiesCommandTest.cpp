@@ -22,10 +22,14 @@ class RestoreInTheProgram : public testing::Test {
     venue.Start();
   }
 
-  /// Restores the copy in this row of the list; what is in use takes the first two.
-  void Restore(int row) {
-    const WhileModal<BackupCopies> look([this, row](BackupCopies& window) {
-      Find<QTableView>(window, "CopyTable").selectRow(row);
+  /// Restores the copy in this file.
+  void Restore(const QString& file) {
+    const WhileModal<BackupCopies> look([this, file](BackupCopies& window) {
+      auto& table = Find<QTableView>(window, "CopyTable");
+      const QAbstractItemModel& rows = *table.model();
+      const QModelIndexList found = rows.match(rows.index(0, 0), Qt::ToolTipRole, file);
+      ASSERT_EQ(found.size(), 1);
+      table.selectRow(found.first().row());
       venue.Boxes.Answers = {BoxAnswer::Ok};
       ::Press(window, "Restore");
       status = Find<QLabel>(window, "Status").text();
@@ -59,7 +63,7 @@ TEST_F(RestoreInTheProgram, BringsBackMembersAndTheBoardIsRight) {
                                   "scenarios-2013-05-21-143005-kept.mdb"));
   venue.ChangeDatabase("backups/members-2013-05-21-143005-kept.mdb",
                        "UPDATE Members SET NickName = 'Countess'");
-  Restore(2);
+  Restore(QStringLiteral("members-2013-05-21-143005-kept.mdb"));
   EXPECT_EQ(venue.QueryDatabase("members.mdb", "SELECT TotalGamesPlayed || NickName FROM Members"),
             "0Countess");
   EXPECT_THAT(venue.Row("ScoreDisplay", 0)[1], testing::HasSubstr("Countess"));
@@ -77,7 +81,7 @@ TEST_F(RestoreInTheProgram, KeepsTheChosenMissionByItsName) {
       "backups/scenarios-2013-05-21-143005-kept.mdb",
       "UPDATE Table1 SET ID = ID + 1000; INSERT INTO Table1 (ID, MissionName) VALUES (1, 'First')");
   const int before = venue.ActiveMission().count();
-  Restore(3);
+  Restore(QStringLiteral("scenarios-2013-05-21-143005-kept.mdb"));
   EXPECT_EQ(venue.ActiveMission().count(), before + 1);
   EXPECT_EQ(venue.ActiveMission().currentText(), chosen);
   EXPECT_EQ(venue.ActiveMission().currentIndex(), 4);
@@ -88,9 +92,36 @@ TEST_F(RestoreInTheProgram, FallsBackToNoneWhereTheMissionIsGone) {
   venue.ActiveMission().setCurrentIndex(3);
   CopyNow();
   venue.ChangeDatabase("backups/scenarios-2013-05-21-143005-kept.mdb", "DELETE FROM Table1");
-  Restore(3);
+  Restore(QStringLiteral("scenarios-2013-05-21-143005-kept.mdb"));
   EXPECT_EQ(venue.ActiveMission().currentIndex(), 0);
   EXPECT_FALSE(venue.Find<QAction>("mnuMissionResults").isEnabled());
+}
+
+TEST_F(RestoreInTheProgram, OfThePastGamesBringsThemBackAndKeepsTheGameOnTheBoard) {
+  venue.LoadGame(GameFile(PlayerOf(1, "")));
+  CopyNow();
+  venue.ChangeDatabase("games.mdb", "DELETE FROM GamePlayers; DELETE FROM Games");
+  venue.LoadGame(GameFile(PlayerOf(2, "")));
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "1");
+  Restore(QStringLiteral("games-2013-05-21-143005-kept.mdb"));
+  EXPECT_THAT(status.toStdString(), testing::HasSubstr("games-2013-05-21-143005-replaced.mdb"));
+  EXPECT_EQ(
+      venue.QueryDatabase(
+          "games.mdb", "SELECT group_concat(PlayerIndex) FROM (SELECT * FROM GamePlayers ORDER BY GameID)"),
+      "1,2");
+  EXPECT_EQ(venue.QueryDatabase("backups/games-2013-05-21-143005-replaced.mdb",
+                                "SELECT group_concat(PlayerIndex) FROM GamePlayers"),
+            "2");
+}
+
+TEST_F(RestoreInTheProgram, OfThePastGamesIsOfferedWhenTheirFileIsGone) {
+  venue.LoadGame(GameFile(PlayerOf(1, "")));
+  CopyNow();
+  venue.Boxes.Answers = {BoxAnswer::Ok};
+  venue.Trigger("mnuClearScores");
+  std::filesystem::remove(venue.DataFile("games.mdb"));
+  Restore(QStringLiteral("games-2013-05-21-143005-kept.mdb"));
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "1");
 }
 
 TEST(RestoreDuringADownload, IsRefused) {

@@ -105,6 +105,20 @@ TEST_F(KeptGame, StopsNothingWhereItCannotBeKeptAndTellsWhy) {
   EXPECT_EQ(Says("DeskKept"), "kept 14:30");
 }
 
+TEST_F(KeptGame, GoesIntoAnotherArchiveWhenThatInUseTurnsOutDamaged) {
+  Pull();
+  std::filesystem::resize_file(venue.DataFile("games.mdb"), 4096);
+  const auto& missions = venue.Find<QComboBox>("ActiveMission");
+  ASSERT_GT(missions.count(), 1);
+  QTest::keyClick(&venue.Find<QComboBox>("ActiveMission"), Qt::Key_Down);
+  EXPECT_THAT(Says("DeskArchiveUnusable"), HasSubstr(venue.DataFile("games.mdb")));
+  EXPECT_EQ(Says("DeskNotKept"), "");
+  EXPECT_EQ(Says("DeskKept"), "kept 14:30");
+  EXPECT_EQ(std::filesystem::file_size(venue.DataFile("games.mdb")), 4096U);
+  EXPECT_EQ(venue.QueryDatabase("games-new.mdb", "SELECT count(*) FROM Games"), "1");
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
 TEST_F(KeptGame, NamesAnArchiveThatIsDamaged) {
   std::filesystem::copy_file(venue.DataFile("tessarine.ini"), venue.DataFile("games.mdb"));
   Pull();

@@ -92,6 +92,10 @@ void TellOfArchive(const DeskFacts& facts, Writer& writer) {
   if (facts.CutGames > 0) {
     writer.Tell(DeskTopic::CutGames, writer.Text(OwnText::DeskCutGames, {std::to_string(facts.CutGames)}));
   }
+  if (!facts.WeeklyCopyFailure.empty()) {
+    writer.Tell(DeskTopic::WeeklyCopyFailed,
+                writer.Text(OwnText::DeskWeeklyCopyFailed, {facts.WeeklyCopyFailure}));
+  }
 }
 
 }  // namespace

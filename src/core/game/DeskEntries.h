@@ -23,8 +23,9 @@ struct DeskFacts {
   std::string UnsavedSettings;             ///< file of the settings that could not be written
   std::string KeptAt;                      ///< time at which the game was kept; empty if it was not
   std::string NotKept;                     ///< why it is not kept as it is; empty if it is
-  std::string UnusableArchive;  ///< file of past games that could not be used; empty if there is none
-  int CutGames = 0;             ///< past games that no longer name a member
+  std::string UnusableArchive;    ///< file of past games that could not be used; empty if there is none
+  int CutGames = 0;               ///< past games that no longer name a member
+  std::string WeeklyCopyFailure;  ///< why the weekly copy of the past games is not made; empty if it is
 };
 
 /// What an entry of the status line is about.
@@ -41,7 +42,8 @@ enum class DeskTopic {
   Kept,
   NotKept,
   ArchiveUnusable,
-  CutGames
+  CutGames,
+  WeeklyCopyFailed
 };
 
 struct DeskEntry {

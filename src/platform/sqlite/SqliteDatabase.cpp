@@ -93,6 +93,12 @@ std::string SqliteDatabase::FilePath() const {
   return sqlite3_db_filename(connection_.Handle(), "main");
 }
 
+bool SqliteDatabase::HasMoved() const {
+  int moved = 0;
+  return sqlite3_file_control(connection_.Handle(), "main", SQLITE_FCNTL_HAS_MOVED, &moved) != SQLITE_OK ||
+         moved != 0;
+}
+
 std::unique_ptr<Database> SqliteEngine::OpenDatabase(const std::string& path) {
   return std::make_unique<SqliteDatabase>(path, busyTimeout_);
 }

@@ -31,10 +31,14 @@ class SqliteDatabase : public Database {
   bool CopyInSteps(const std::string& path, const KeepOn& keepOn) override {
     return CopyWhole(connection_, path, keepOn);
   }
+  std::unique_ptr<StepwiseCopy> BeginCopy(const std::string& path) override {
+    return BeginWholeCopy(connection_, path);
+  }
   bool CheckWhole(const KeepOn& keepOn) override { return ::CheckWhole(connection_, keepOn); }
   std::vector<std::string> ColumnNames(const std::string& table) override;
   std::string Path() const override { return connection_.Path(); }
   std::string FilePath() const override;
+  bool HasMoved() const override;
   void HoldWriters() override { connection_.HoldWriters(); }
   void ReleaseWriters() noexcept override { connection_.ReleaseWriters(); }
 

@@ -3,6 +3,7 @@
 #include <sqlite3.h>
 
 #include <memory>
+#include <utility>
 
 #include "platform/RuntimeError.h"
 #include "platform/sqlite/SqliteConnection.h"
@@ -42,7 +43,76 @@ class StatementWatch {
   bool stopped_ = false;
 };
 
+class SqliteStepwiseCopy : public StepwiseCopy {
+ public:
+  SqliteStepwiseCopy(SqliteConnection& source, std::string path)
+      : path_(std::move(path)), copy_(OpenCopy(path_), sqlite3_close) {
+    backup_ = sqlite3_backup_init(copy_.get(), "main", source.Handle(), "main");
+    if (backup_ == nullptr) {
+      throw SqliteError(copy_.get(), path_);
+    }
+  }
+  ~SqliteStepwiseCopy() override { sqlite3_backup_finish(backup_); }
+  SqliteStepwiseCopy(const SqliteStepwiseCopy&) = delete;
+  SqliteStepwiseCopy& operator=(const SqliteStepwiseCopy&) = delete;
+
+  bool Step() override {
+    switch (sqlite3_backup_step(backup_, PagesOfAStep)) {
+      case SQLITE_DONE:
+        Finish();
+        sqlite3_exec(copy_.get(), "PRAGMA journal_mode = DELETE", nullptr, nullptr, nullptr);
+        return true;
+      case SQLITE_OK:
+        Flush();
+        return false;
+      case SQLITE_BUSY:
+      case SQLITE_LOCKED:
+        return false;
+      default:
+        Finish();
+        throw RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path_);
+    }
+  }
+
+ private:
+  static sqlite3* OpenCopy(const std::string& path) {
+    sqlite3* opened = nullptr;
+    constexpr int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
+    if (sqlite3_open_v2(path.c_str(), &opened, flags, nullptr) != SQLITE_OK) {
+      const Handle failed(opened, sqlite3_close);
+      throw SqliteError(opened, path);
+    }
+    // Neither a journal nor a flush of all at once at the end: each step flushes its own.
+    sqlite3_exec(opened, "PRAGMA journal_mode = OFF", nullptr, nullptr, nullptr);
+    return opened;
+  }
+
+  void Finish() {
+    if (sqlite3_backup_finish(std::exchange(backup_, nullptr)) != SQLITE_OK) {
+      throw SqliteError(copy_.get(), path_);
+    }
+  }
+
+  /// What SQLite has handed to the system. It does so when its own memory for pages is full.
+  void Flush() {
+    sqlite3_file* file = nullptr;
+    if (sqlite3_file_control(copy_.get(), "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK &&
+        file != nullptr && file->pMethods != nullptr &&
+        file->pMethods->xSync(file, SQLITE_SYNC_NORMAL | SQLITE_SYNC_DATAONLY) != SQLITE_OK) {
+      throw RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path_);
+    }
+  }
+
+  const std::string path_;
+  const Handle copy_;
+  sqlite3_backup* backup_ = nullptr;
+};
+
 }  // namespace
+
+std::unique_ptr<StepwiseCopy> BeginWholeCopy(SqliteConnection& connection, const std::string& path) {
+  return std::make_unique<SqliteStepwiseCopy>(connection, path);
+}
 
 bool CopyWhole(SqliteConnection& connection, const std::string& path, const KeepOn& keepOn) {
   sqlite3* opened = nullptr;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <memory>
 #include <string>
 
 #include "platform/Database.h"
@@ -9,6 +10,9 @@ class SqliteConnection;
 /// See Database::CopyInSteps. Without `keepOn` it is one step, which no other program's change interrupts.
 /// The copy keeps no log of its own beside it, whatever the file does.
 bool CopyWhole(SqliteConnection& connection, const std::string& path, const KeepOn& keepOn);
+
+/// See Database::BeginCopy.
+std::unique_ptr<StepwiseCopy> BeginWholeCopy(SqliteConnection& connection, const std::string& path);
 
 /// See Database::CheckWhole.
 bool CheckWhole(SqliteConnection& connection, const KeepOn& keepOn);

@@ -27,10 +27,12 @@ class NoDatabase : public Database {
     CopiedTo = path;
     return true;
   }
+  std::unique_ptr<StepwiseCopy> BeginCopy(const std::string& /*path*/) override { return nullptr; }
   bool CheckWhole(const KeepOn& /*keepOn*/) override { return true; }
   std::vector<std::string> ColumnNames(const std::string& /*table*/) override { return {}; }
   std::string Path() const override { return {}; }
   std::string FilePath() const override { return {}; }
+  bool HasMoved() const override { return false; }
   void HoldWriters() override {}
   void ReleaseWriters() noexcept override {}
 

@@ -56,6 +56,49 @@ TEST_F(WholeDatabaseFile, ThatKeepsALogHasACopyWithoutOne) {
   EXPECT_FALSE(Exists(Other() + "-shm"));
 }
 
+TEST_F(WholeDatabaseFile, IsCopiedStepByStepWithWhatIsWrittenMeanwhile) {
+  const std::unique_ptr<Database> database = file.Open();
+  {
+    const std::unique_ptr<StepwiseCopy> copy = database->BeginCopy(Other());
+    EXPECT_FALSE(copy->Step());
+    const auto rows = database->OpenRecordset("Members");
+    rows->Edit();
+    rows->SetField("Clan", std::string("late"));
+    rows->Update();
+    while (!copy->Step()) {
+      ASSERT_LT(++asked, 10);
+    }
+  }
+  EXPECT_EQ(OtherConnection(Other()).Query("SELECT count(*) FROM Members WHERE Clan = 'late'"), "1");
+  EXPECT_EQ(OtherConnection(Other()).Query("SELECT sum(length(Photograph)) FROM Members"), "2400000");
+  EXPECT_EQ(OtherConnection(Other()).Query("PRAGMA integrity_check"), "ok");
+}
+
+TEST_F(WholeDatabaseFile, ThatIsLockedWaitsWithTheNextStepOfItsCopy) {
+  const std::unique_ptr<Database> database = file.Open();
+  const std::unique_ptr<StepwiseCopy> copy = database->BeginCopy(Other());
+  {
+    OtherConnection other(file.Path());
+    other.Execute("BEGIN EXCLUSIVE");
+    EXPECT_FALSE(copy->Step());
+    EXPECT_FALSE(copy->Step());
+    other.Execute("ROLLBACK");
+  }
+  while (!copy->Step()) {
+    ASSERT_LT(++asked, 10);
+  }
+  EXPECT_EQ(OtherConnection(Other()).Query("SELECT count(*) FROM Members"), "4");
+}
+
+TEST_F(WholeDatabaseFile, TellsWhetherItHasMoved) {
+  const std::unique_ptr<Database> database = file.Open();
+  EXPECT_FALSE(database->HasMoved());
+  std::filesystem::rename(file.Path(), Other());
+  EXPECT_TRUE(database->HasMoved());
+  std::filesystem::copy_file(Other(), file.Path());
+  EXPECT_TRUE(database->HasMoved());
+}
+
 TEST_F(WholeDatabaseFile, IsFoundSound) {
   EXPECT_TRUE(file.Open()->CheckWhole(always));
   EXPECT_TRUE(file.Open()->CheckWhole(nullptr));

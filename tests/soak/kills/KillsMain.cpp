@@ -17,13 +17,14 @@ namespace {
 using SteadyClock = std::chrono::steady_clock;
 
 constexpr const char* Usage =
-    "usage: soak-kills --seconds N [--seed S] [--only WORK] [--lie lost|doubled|damaged|crash]\n"
-    "Kills processes in the midst of their work for N seconds, and looks each time whether all that they "
-    "had\n"
-    "reported is there, once and whole. --lie makes them do wrong on purpose, to show that it is noticed.\n";
+    "usage: soak-kills --seconds N [--kills M] [--seed S] [--only WORK] [--lie lost|doubled|damaged|crash]\n"
+    "Kills processes in the midst of their work for N seconds, or M times if that is sooner, and looks each\n"
+    "time whether all that they had reported is there, once and whole. --lie makes them do wrong on purpose, "
+    "to show that it is noticed.\n";
 
 struct Options {
   double Seconds = 0;
+  int Kills = 0;  ///< 0 for any number
   unsigned Seed = std::random_device()();
   std::string Only;
   Lie Lies = Lie::None;
@@ -40,6 +41,7 @@ Options OptionsIn(int argc, char** argv) {
   ReadOptions(
       argc, argv,
       {{"--seconds", [&](const std::string& value) { options.Seconds = std::stod(value); }},
+       {"--kills", [&](const std::string& value) { options.Kills = std::stoi(value); }},
        {"--seed", [&](const std::string& value) { options.Seed = static_cast<unsigned>(std::stoul(value)); }},
        {"--only", [&](const std::string& value) { options.Only = value; }},
        {"--lie", [&](const std::string& value) { options.Lies = LieNamed(value); }}},
@@ -63,7 +65,7 @@ class Soak {
     const WorkSources sources{std::filesystem::read_symlink("/proc/self/exe").parent_path(),
                               TESSARINE_OLD_FILES};
     for (auto* make : {MakeCommitWork, MakeMissionWork, MakePhotoWork, MakeGameFileWork, MakeConversionWork,
-                       MakeSheetWork, MakeRestoreWork}) {
+                       MakeSheetWork, MakeRestoreWork, MakeKeepWork}) {
       if (std::unique_ptr<Work> work = make(sources);
           work && (options.Only.empty() || work->Name() == options.Only)) {
         jobs_.push_back({.Work = std::move(work)});
@@ -76,7 +78,7 @@ class Soak {
     const SteadyClock::time_point end =
         SteadyClock::now() +
         std::chrono::duration_cast<SteadyClock::duration>(std::chrono::duration<double>(options_.Seconds));
-    while (SteadyClock::now() < end && !jobs_.empty()) {
+    while (SteadyClock::now() < end && !jobs_.empty() && !HasKilledEnough()) {
       KillOnce(end, *std::min_element(jobs_.begin(), jobs_.end(), [](const Job& one, const Job& other) {
                  return one.Spent / one.Work->Share() < other.Spent / other.Work->Share();
                }));
@@ -107,6 +109,14 @@ class Soak {
       job.Folder.reset();
     }
     job.Spent += SteadyClock::now() - start;
+  }
+
+  bool HasKilledEnough() const {
+    int kills = 0;
+    for (const Job& job : jobs_) {
+      kills += job.Kills;
+    }
+    return options_.Kills > 0 && kills >= options_.Kills;
   }
 
   /// Tells how it went; true if all is well.
