@@ -11,6 +11,7 @@ namespace {
 constexpr std::string_view CopyExtension = ".mdb";
 constexpr std::string_view KeptMark = "-kept";
 constexpr std::string_view ReplacedMark = "-replaced";
+constexpr std::string_view WeeklyMark = "-weekly";
 constexpr std::string_view TimeInName = "-0000-00-00-000000";
 
 bool IsTimeInName(std::string_view text) {
@@ -46,6 +47,8 @@ std::string_view MarkOf(CopyKind kind) {
       return KeptMark;
     case CopyKind::BeforeRestore:
       return ReplacedMark;
+    case CopyKind::Weekly:
+      return WeeklyMark;
     case CopyKind::FirstChange:
       break;
   }
@@ -66,6 +69,8 @@ std::optional<BackupCopy> BackupCopyOf(const std::string& file) {
     copy.Kind = CopyKind::ByHand;
   } else if (TakeMark(name, ReplacedMark)) {
     copy.Kind = CopyKind::BeforeRestore;
+  } else if (TakeMark(name, WeeklyMark)) {
+    copy.Kind = CopyKind::Weekly;
   }
   if (name.size() <= TimeInName.size()) {
     return std::nullopt;

@@ -8,9 +8,10 @@
 
 /// Why a copy of a database was made.
 enum class CopyKind {
-  FirstChange,   ///< by the program, before the first change of a run; only the last ones are kept
-  ByHand,        ///< by the operator
-  BeforeRestore  ///< of what a restored copy took the place of
+  FirstChange,    ///< by the program, before the first change of a run; only the last ones are kept
+  ByHand,         ///< by the operator
+  BeforeRestore,  ///< of what a restored copy took the place of
+  Weekly          ///< by the program, of the archive, once a week; only the last ones are kept
 };
 
 /// A copy of a database in the folder of the backup copies.

@@ -10,6 +10,8 @@ std::string TextOf(CopyKind kind, const StringTable& strings) {
       return strings.Text(OwnText::CopyByHand);
     case CopyKind::BeforeRestore:
       return strings.Text(OwnText::CopyBeforeRestore);
+    case CopyKind::Weekly:
+      return strings.Text(OwnText::CopyWeekly);
     case CopyKind::FirstChange:
       break;
   }

@@ -28,6 +28,9 @@ TEST(CopyNames, TellDatabaseTimeAndReason) {
   EXPECT_EQ(BackupCopyOf("scenarios-2026-11-21-201500-replaced12.mdb"),
             (BackupCopy{"scenarios-2026-11-21-201500-replaced12.mdb", "scenarios", "2026-11-21 20:15:00",
                         CopyKind::BeforeRestore}));
+  EXPECT_EQ(
+      BackupCopyOf("games-2026-11-21-201500-weekly.mdb"),
+      (BackupCopy{"games-2026-11-21-201500-weekly.mdb", "games", "2026-11-21 20:15:00", CopyKind::Weekly}));
 }
 
 TEST(CopyNames, AreNotThoseOfOtherFiles) {
@@ -53,6 +56,7 @@ TEST(CopyNames, AreFree) {
   EXPECT_EQ(next(CopyKind::ByHand), "members-2026-11-21-201500-kept2.mdb");
   EXPECT_EQ(next(CopyKind::ByHand), "members-2026-11-21-201500-kept3.mdb");
   EXPECT_EQ(next(CopyKind::BeforeRestore), "members-2026-11-21-201500-replaced.mdb");
+  EXPECT_EQ(next(CopyKind::Weekly), "members-2026-11-21-201500-weekly.mdb");
 }
 
 TEST(CopyNames, AreNeitherCountedNorDeletedAmongTheLastOnesUnlessAProgramRunMadeThem) {

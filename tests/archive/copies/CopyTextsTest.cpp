@@ -19,6 +19,8 @@ TEST(CopyTexts, TellEachReasonAndStepOtherwise) {
     const StringTable strings(language);
     EXPECT_NE(TextOf(CopyKind::FirstChange, strings), TextOf(CopyKind::ByHand, strings));
     EXPECT_NE(TextOf(CopyKind::ByHand, strings), TextOf(CopyKind::BeforeRestore, strings));
+    EXPECT_NE(TextOf(CopyKind::BeforeRestore, strings), TextOf(CopyKind::Weekly, strings));
+    EXPECT_NE(TextOf(CopyKind::FirstChange, strings), TextOf(CopyKind::Weekly, strings));
     EXPECT_NE(TextOf(CopyStep::Checking, strings), TextOf(CopyStep::KeepingPresent, strings));
     EXPECT_NE(TextOf(CopyStep::KeepingPresent, strings), TextOf(CopyStep::Copying, strings));
   }
