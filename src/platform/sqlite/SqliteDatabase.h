@@ -32,6 +32,7 @@ class SqliteDatabase : public Database {
     return CopyWhole(connection_, path, keepOn);
   }
   bool CheckWhole(const KeepOn& keepOn) override { return ::CheckWhole(connection_, keepOn); }
+  void Rewrite() override { connection_.Rewrite(); }
   std::vector<std::string> ColumnNames(const std::string& table) override;
   std::string Path() const override { return connection_.Path(); }
   std::string FilePath() const override;

@@ -28,6 +28,7 @@ class NoDatabase : public Database {
     return true;
   }
   bool CheckWhole(const KeepOn& /*keepOn*/) override { return true; }
+  void Rewrite() override {}
   std::vector<std::string> ColumnNames(const std::string& /*table*/) override { return {}; }
   std::string Path() const override { return {}; }
   std::string FilePath() const override { return {}; }
