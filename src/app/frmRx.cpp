@@ -119,8 +119,18 @@ void frmRx::SetUpKeeping() {
                         .UserDataFolder = userDataFolder_,
                         .ProgramFolder = services_.Places.Program()},
       [this] { return downloading_; }, [this](const KeptState& state) { desk_->TellKeeping(state); });
+  archive_.emplace(ArchiveAccess::Parts{
+      .Session = session_,
+      .Disk = services_.Disk,
+      .Engine = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
+      .Strings = services_.Strings,
+      .UserDataFolder = userDataFolder_,
+      .ProgramFolder = services_.Places.Program()});
   // Not before the window is shown.
-  QTimer::singleShot(0, &*keeping_, [this] { keeping_->CheckMembers(); });
+  QTimer::singleShot(0, &*keeping_, [this] {
+    keeping_->CheckMembers();
+    commands_.Run([this] { DeleteOldGames(); });
+  });
 }
 
 void frmRx::SetUpLists() {
@@ -197,6 +207,8 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuCheckButton, &frmRx::CheckMembershipButton},
                                {ui_->mnuExportMembers, &frmRx::ExportMemberFile},
                                {ui_->mnuImportMembers, &frmRx::ImportMemberFile},
+                               {ui_->mnuMemberHistory, &frmRx::ShowMemberHistory},
+                               {ui_->mnuRankings, &frmRx::ShowRankings},
                                {ui_->mnuAssignMember, &frmRx::AssignMember},
                                {ui_->mnuUnassignMember, &frmRx::UnassignMember},
                                {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
@@ -251,6 +263,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
   }
   if (desk_) {
     keeping_->End();
+    archive_->Close();
     desk_->End();
     charts_->Close();
   }

@@ -12,6 +12,7 @@
 #include "app/GameKeeping.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
+#include "archive/ArchiveAccess.h"
 #include "audience/AudienceBoard.h"
 #include "audience/AudienceCopy.h"
 #include "core/data/IniReader.h"
@@ -93,6 +94,13 @@ class frmRx : public QMainWindow {
   void CheckMembershipButton();
   void ExportMemberFile();
   void ImportMemberFile();
+  void ShowMemberHistory();
+  /// The history of a member, or of the first one for 0, in front of a window.
+  void ShowHistoryOf(std::int32_t member, QWidget* parent);
+  void ShowRankings();
+  /// Deletes games that are older than the settings say. Asks the first time.
+  void DeleteOldGames();
+  bool MayDeleteOldGames(int years, int games);
   /// Shows the members, starting at `contactToShow` (0 for none). Returns `ContactID` of the one chosen with
   /// OK, or an empty text.
   std::string ShowMembers(std::int32_t contactToShow);
@@ -157,6 +165,7 @@ class frmRx : public QMainWindow {
   Commands commands_;
   std::optional<Desk> desk_;
   std::optional<GameKeeping> keeping_;
+  std::optional<ArchiveAccess> archive_;
   std::optional<BoardCharts> charts_;
   GuestList guests_;
   std::optional<AudienceBoard> audience_;

@@ -3,6 +3,8 @@
 #include "app/About.h"
 #include "app/UploadProgress.h"
 #include "archive/copies/BackupCopies.h"
+#include "archive/history/MemberHistoryWindow.h"
+#include "archive/history/RankingWindow.h"
 #include "audience/AudienceSettings.h"
 #include "audience/GuestNameEntry.h"
 #include "board/AdminData.h"
@@ -79,6 +81,8 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<ExportGames>("mnuExport");
+  LookAt<MemberHistoryWindow>("mnuMemberHistory");
+  LookAt<RankingWindow>("mnuRankings");
   LookAt<AudienceSettings>("mnuAudienceSettings");
   LookAt<GuestNameEntry>("mnuGuestNames");
   LookAt<Scenarios>("mnuSetupMissions");
