@@ -40,6 +40,8 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuBackupCopies, static_cast<int>(OwnText::BackupCopiesItem)},
       {ui.mnuExportMembers, static_cast<int>(OwnText::ExportMembersItem)},
       {ui.mnuImportMembers, static_cast<int>(OwnText::ImportMembersItem)},
+      {ui.mnuMemberHistory, static_cast<int>(OwnText::MemberHistoryItem)},
+      {ui.mnuRankings, static_cast<int>(OwnText::RankingsItem)},
       {ui.mnuSettings->menuAction(), 214},
       {ui.mnuCommPort, 215},
       {ui.mnuSoldieringCalc, 216},

@@ -133,6 +133,7 @@ void frmRx::SetUpKeeping() {
   QTimer::singleShot(0, &*keeping_, [this] {
     keeping_->CheckMembers();
     keeping_->RemoveDeleted();
+    commands_.Run([this] { DeleteOldGames(); });
   });
 }
 
@@ -211,6 +212,8 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuCheckButton, &frmRx::CheckMembershipButton},
                                {ui_->mnuExportMembers, &frmRx::ExportMemberFile},
                                {ui_->mnuImportMembers, &frmRx::ImportMemberFile},
+                               {ui_->mnuMemberHistory, &frmRx::ShowMemberHistory},
+                               {ui_->mnuRankings, &frmRx::ShowRankings},
                                {ui_->mnuAssignMember, &frmRx::AssignMember},
                                {ui_->mnuUnassignMember, &frmRx::UnassignMember},
                                {ui_->mnuShowDetailed, &frmRx::ShowDetailed},
@@ -266,6 +269,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
   if (desk_) {
     idleCopying_->End();
     keeping_->End();
+    archive_->Close();
     desk_->End();
     charts_->Close();
   }

@@ -102,6 +102,13 @@ class frmRx : public QMainWindow {
   void CheckMembershipButton();
   void ExportMemberFile();
   void ImportMemberFile();
+  void ShowMemberHistory();
+  /// The history of a member, or of the first one for 0, in front of a window.
+  void ShowHistoryOf(std::int32_t member, QWidget* parent);
+  void ShowRankings();
+  /// Deletes games that are older than the settings say. Asks the first time.
+  void DeleteOldGames();
+  bool MayDeleteOldGames(int years, int games);
   /// Shows the members, starting at `contactToShow` (0 for none). Returns `ContactID` of the one chosen with
   /// OK, or an empty text.
   std::string ShowMembers(std::int32_t contactToShow);

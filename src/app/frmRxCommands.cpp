@@ -156,14 +156,16 @@ void frmRx::CheckMembershipButton() {
 }
 
 std::string frmRx::ShowMembers(std::int32_t contactToShow) {
-  Members window({.DbMembers = session_.DbMembers(),
-                  .Boxes = services_.Boxes,
-                  .CommonDialog1 = services_.CommonDialog1,
-                  .Disk = services_.Disk,
-                  .Time = services_.Time,
-                  .Strings = services_.Strings,
-                  .ButtonSwipe = services_.ButtonSwipe},
-                 this);
+  Members window(
+      {.DbMembers = session_.DbMembers(),
+       .Boxes = services_.Boxes,
+       .CommonDialog1 = services_.CommonDialog1,
+       .Disk = services_.Disk,
+       .Time = services_.Time,
+       .Strings = services_.Strings,
+       .ButtonSwipe = services_.ButtonSwipe,
+       .ShowHistory = [this](std::int32_t member, QWidget& parent) { ShowHistoryOf(member, &parent); }},
+      this);
   window.ContactToShow = contactToShow;
   window.exec();
   keeping_->NoteMembers();

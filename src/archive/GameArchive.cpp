@@ -158,15 +158,6 @@ std::int64_t GameArchive::EarlierStates(std::int64_t gameId) {
   return WholeNumber(archive_.Statements(), "SELECT max(State) FROM GameFiles WHERE GameID = $1", {gameId});
 }
 
-std::vector<CutMember> GameArchive::CheckMembers() {
-  std::vector<CutMember> cut;
-  for (const std::int32_t number : known_.FindStrangers()) {
-    cut.push_back({number, CutFromGames(number)});
-  }
-  known_.RaiseCounter();
-  return cut;
-}
-
 GameArchive::PackedState GameArchive::Pack(const GameState& state) const {
   const std::string bytes = WriteGameFile(state.Game, state.Mission);
   if (bytes.size() > LargestEntry) {
@@ -268,56 +259,6 @@ bool GameArchive::HoldsInputs(const StoredFile& file, const std::string& inputs)
       throw;
     }
     return false;  // it cannot be this game any more
-  }
-}
-
-int GameArchive::CutFromGames(std::int32_t number) {
-  WriteScope scope(archive_);
-  Sql& sql = archive_.Statements();
-  const Value member = std::int64_t{number};
-  const std::int64_t games =
-      WholeNumber(sql, "SELECT count(DISTINCT GameID) FROM GamePlayers WHERE MemberID = $1", {member});
-  // An earlier state may have had the member where the last one has not.
-  const std::vector<StoredFile> files = FilesWhere(
-      "GameFiles.State > 0 OR GameFiles.GameID IN (SELECT GameID FROM GamePlayers WHERE MemberID = $1)",
-      {member});
-  for (const StoredFile& file : files) {
-    CutFromFile(file, number);
-  }
-  sql.Change("UPDATE GamePlayers SET MemberID = 0 WHERE MemberID = $1", {member});
-  known_.Forget(number);
-  scope.Commit();
-  return static_cast<int>(games);
-}
-
-void GameArchive::CutFromFile(const StoredFile& file, std::int32_t number) {
-  Game game(strings_);
-  GameState state{.Game = game};
-  try {
-    state.Mission = ReadGame(file.Name, game);
-  } catch (const RuntimeError& error) {
-    if (error.Number() != Fault::InvalidFileFormat) {
-      throw;
-    }
-    return;  // nobody can read the number either
-  }
-  bool isIn = false;
-  for (Player& player : game.Players) {
-    if (player.MemberIndex == number) {
-      player.MemberIndex = 0;
-      isIn = true;
-    }
-  }
-  if (!isIn) {
-    return;
-  }
-  Sql& sql = archive_.Statements();
-  const PackedState packed = Pack(state);
-  sql.Query("SELECT Played FROM Games WHERE GameID = $1", {file.GameId},
-            [&state](const SqlRow& row) { state.Played = row.Text(0); });
-  WriteFile(file, packed, state.Played);
-  if (file.State == 0) {
-    sql.Change("UPDATE Games SET InputsHash = $1 WHERE GameID = $2", {packed.Hash, file.GameId});
   }
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
@@ -73,6 +74,12 @@ class GameArchive {
   /// member table has become another one.
   std::vector<CutMember> CheckMembers();
 
+  /// Takes a member's number and button out of all rows and files, those of deleted games and of earlier
+  /// states included, and from what is known of members. A button goes out of games of guests too, but not
+  /// where it is another member's. Returns how many games had the member's number. What was there before can
+  /// still be in unused parts of the file, until Database::Rewrite.
+  int Forget(std::int32_t number);
+
   KnownMembers& Known() { return known_; }
 
  private:
@@ -99,7 +106,10 @@ class GameArchive {
   std::string ReadGame(const std::string& name, Game& game);
   bool HoldsInputs(const StoredFile& file, const std::string& inputs);
   int CutFromGames(std::int32_t number);
-  void CutFromFile(const StoredFile& file, std::int32_t number);
+  std::vector<std::string> ButtonsOf(std::int32_t number);
+  /// Changes a player of a file; false if there is nothing to change.
+  using Cut = std::function<bool(Player& player)>;
+  void CutFromFile(const StoredFile& file, const Cut& cut);
   RuntimeError NoFile(std::int64_t gameId) const;
   RuntimeError Damaged(const std::string& name) const;
   RuntimeError TooLarge(const std::string& name) const;

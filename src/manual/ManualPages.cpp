@@ -50,6 +50,8 @@ const std::vector<WindowPage>& WindowPages() {
       {"Members", "Members", "会员"},
       {"ExportMembers", "Members", "会员"},
       {"ImportMembers", "Members", "会员"},
+      {"MemberHistoryWindow", "Member history and rankings", "会员历史和排行榜"},
+      {"RankingWindow", "Member history and rankings", "会员历史和排行榜"},
       {"ButtonSwipe", "The reader of membership buttons", "会员扣读取器"},
       {"GameCharts", "Game charts", "比赛图表"},
       {"PrintOptions", "Score sheets", "成绩单"},

@@ -74,6 +74,8 @@ Members::~Members() = default;
 
 void Members::SetCaptions() {
   const StringTable& strings = parts_.Strings;
+  ui_->HistoryButton->setText(Text(strings, OwnText::HistoryButton));
+  ui_->HistoryButton->setVisible(parts_.ShowHistory != nullptr);
   ui_->SearchText->setPlaceholderText(Text(strings, OwnText::NameToSearchFor));
   ui_->MemberPhoto->setAccessibleName(Text(strings, OwnText::Photo));
   ui_->DOBPicker->SetCalendarName(Text(strings, OwnText::Calendar));
@@ -112,6 +114,7 @@ void Members::ConnectCommands() {
                                {ui_->ChangeID, &Members::ChangeMemberId},
                                {ui_->ChangePicture, &Members::ChangeMemberPicture},
                                {ui_->OK, &Members::SelectMember},
+                               {ui_->HistoryButton, &Members::ShowGames},
                            });
   commands_.Connect(*data1_, {
                                  {ui_->DataFirst, &MemberCursor::MoveFirst},
@@ -238,8 +241,9 @@ void Members::ShowNoRow() {
 }
 
 void Members::SetRowEnabled(bool enabled) {
-  for (QWidget* control : std::initializer_list<QWidget*>{
-           ui_->NameFrame, ui_->PersonalDetails, ui_->ContactDetails, ui_->ChangePicture, ui_->Delete}) {
+  for (QWidget* control :
+       std::initializer_list<QWidget*>{ui_->NameFrame, ui_->PersonalDetails, ui_->ContactDetails,
+                                       ui_->ChangePicture, ui_->Delete, ui_->HistoryButton}) {
     control->setEnabled(enabled);
   }
   ui_->ChangeID->setEnabled(enabled && parts_.ButtonSwipe != nullptr);
@@ -353,6 +357,11 @@ void Members::ChangeMemberPicture() {
     throw;
   }
   ShowMemberExtras();
+}
+
+void Members::ShowGames() {
+  data1_->WriteBack();
+  parts_.ShowHistory(ui_->Dummy->text().toInt(), *this);
 }
 
 void Members::SelectMember() {

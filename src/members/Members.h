@@ -37,6 +37,8 @@ class Members : public QDialog, private BoundControls {
     /// Waits for a membership button and returns its number, or NoDallasId. May be empty if there is no
     /// reader.
     std::function<std::string()> ButtonSwipe = {};
+    /// Shows the games of a member in front of a window. May be empty.
+    std::function<void(std::int32_t contactId, QWidget& parent)> ShowHistory = {};
   };
 
   Members(Parts parts, QWidget* parent);
@@ -94,6 +96,7 @@ class Members : public QDialog, private BoundControls {
   void ChangeMemberId();
   void ChangeMemberPicture();
   void SelectMember();
+  void ShowGames();
 
   std::unique_ptr<Ui::Members> ui_;
   const Parts parts_;

@@ -147,6 +147,10 @@ class Database {
   /// Looks through the whole file. False if it was stopped. Throws RuntimeError 3343 for a damaged file.
   virtual bool CheckWhole(const KeepOn& keepOn) = 0;
 
+  /// Writes the whole file anew, so that nothing stays in it of rows that were deleted or changed. Throws
+  /// RuntimeError 3xxx like a write; needs free space for another such file.
+  virtual void Rewrite() = 0;
+
   /// Names of a table's columns, in its order. Throws RuntimeError 3078 if there is no such table.
   virtual std::vector<std::string> ColumnNames(const std::string& table) = 0;
 

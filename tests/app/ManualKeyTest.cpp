@@ -63,6 +63,8 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
       {"mnuSetupMissions", {"Missions", "任务"}},
       {"mnuManageMembers", {"Members", "会员"}},
       {"mnuExportMembers", {"Members", "会员"}},
+      {"mnuMemberHistory", {"Member history and rankings", "会员历史和排行榜"}},
+      {"mnuRankings", {"Member history and rankings", "会员历史和排行榜"}},
       {"mnuRemoteManage", {"Remote management", "远程管理"}},
       {"mnuBoxConfig", {"Utility boxes", "功能装置"}},
       {"mnuChargeiButton", {"Charging buttons", "信息扣充值"}},

@@ -4,6 +4,8 @@
 #include "app/UploadProgress.h"
 #include "archive/copies/BackupCopies.h"
 #include "archive/past/PastGames.h"
+#include "archive/history/MemberHistoryWindow.h"
+#include "archive/history/RankingWindow.h"
 #include "audience/AudienceSettings.h"
 #include "audience/GuestNameEntry.h"
 #include "board/AdminData.h"
@@ -80,6 +82,8 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<ExportGames>("mnuExport");
+  LookAt<MemberHistoryWindow>("mnuMemberHistory");
+  LookAt<RankingWindow>("mnuRankings");
   LookAt<AudienceSettings>("mnuAudienceSettings");
   LookAt<GuestNameEntry>("mnuGuestNames");
   LookAt<Scenarios>("mnuSetupMissions");

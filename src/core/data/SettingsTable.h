@@ -64,6 +64,11 @@ inline constexpr Setting AudiencePicture = {"audience", "picture", "", "File wit
 inline constexpr Setting AudienceFollow = {
     "audience", "follow", "1", "1: the board shows each game once its scores are in; 0: by command alone."};
 
+inline constexpr Setting YearsToKeepGames = {
+    "archive", "keep_years", "",
+    "Years for which past games are kept; without it, for good. The program asks before it deletes the first "
+    "ones."};
+
 }  // namespace Keys
 
 /// In the order of the manual.
@@ -87,4 +92,5 @@ inline constexpr std::array AllSettings = {Keys::CommPort,
                                            Keys::AudienceSeconds,
                                            Keys::AudienceVenue,
                                            Keys::AudiencePicture,
-                                           Keys::AudienceFollow};
+                                           Keys::AudienceFollow,
+                                           Keys::YearsToKeepGames};
