@@ -6,12 +6,14 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "app/BoardCharts.h"
 #include "app/Desk.h"
 #include "app/GameKeeping.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
+#include "archive/ArchiveAccess.h"
 #include "audience/AudienceBoard.h"
 #include "audience/AudienceCopy.h"
 #include "core/data/IniReader.h"
@@ -79,6 +81,9 @@ class frmRx : public QMainWindow {
   void SaveGame();
   void ClearGame();
   void ExportGame();
+  /// Exports the game on the board, a period's games, or these past ones.
+  void ShowExport(const std::vector<std::int64_t>& chosen);
+  void ImportGameFiles();
   void GetScoreData();
   /// Tracks the word processor until it is ready. If it is missing, says so once and continues without
   /// printing.
@@ -156,6 +161,7 @@ class frmRx : public QMainWindow {
   QTimer wordProcessorTimer_;
   Commands commands_;
   std::optional<Desk> desk_;
+  std::optional<ArchiveAccess> archive_;  ///< for windows; the keeper has its own
   std::optional<GameKeeping> keeping_;
   std::optional<BoardCharts> charts_;
   GuestList guests_;
