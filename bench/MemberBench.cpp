@@ -39,6 +39,7 @@ class NoDialog : public FileDialog {
  public:
   std::optional<std::string> ShowOpen(const FileRequest&) override { return std::nullopt; }
   std::optional<std::string> ShowSave(const FileRequest&) override { return std::nullopt; }
+  std::optional<std::string> ShowFolder(const FileRequest&) override { return std::nullopt; }
 };
 
 /// The files used by one run of this benchmark.

@@ -147,6 +147,7 @@ class OneFile : public FileDialog {
   explicit OneFile(std::string path) : path_(std::move(path)) {}
   std::optional<std::string> ShowOpen(const FileRequest&) override { return path_; }
   std::optional<std::string> ShowSave(const FileRequest&) override { return std::nullopt; }
+  std::optional<std::string> ShowFolder(const FileRequest&) override { return std::nullopt; }
 
  private:
   const std::string path_;

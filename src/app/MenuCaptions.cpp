@@ -34,6 +34,7 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuGameCharts, static_cast<int>(OwnText::GameChartsItem)},
       {ui.mnuExport, static_cast<int>(OwnText::GameExportMenu)},
       {ui.mnuPastGames, static_cast<int>(OwnText::PastGamesItem)},
+      {ui.mnuImportGames, static_cast<int>(OwnText::ImportGamesItem)},
       {ui.mnuMissions->menuAction(), 211},
       {ui.mnuMissionResults, 212},
       {ui.mnuSetupMissions, 213},

@@ -197,6 +197,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuClearScores, &frmRx::ClearGame},
                                {ui_->mnuExport, &frmRx::ExportGame},
                                {ui_->mnuPastGames, &frmRx::ShowPastGames},
+                               {ui_->mnuImportGames, &frmRx::ImportGameFiles},
                                {ui_->mnuGetKeshData, &frmRx::GetScoreData},
                                {ui_->mnuPrintScores, &frmRx::PrintScores},
                                {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},

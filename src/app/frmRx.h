@@ -6,6 +6,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "app/BoardCharts.h"
 #include "app/Desk.h"
@@ -87,7 +88,9 @@ class frmRx : public QMainWindow {
   std::string BoardNameOf(std::int32_t contactId);
   void OpenPastGame(const PastGames::Opened& past);
   void ShowPastCharts(const PastGame& past);
-  void ExportPastGames(const std::vector<std::int64_t>& games);
+  /// Exports the game on the board, a period's games, or these past ones.
+  void ShowExport(const std::vector<std::int64_t>& chosen);
+  void ImportGameFiles();
   void GetScoreData();
   /// Tracks the word processor until it is ready. If it is missing, says so once and continues without
   /// printing.

@@ -6,8 +6,6 @@
 #include "app/frmRx.h"
 #include "archive/past/PastGames.h"
 #include "core/gamefile/GameFile.h"
-#include "core/gamefile/SuggestedName.h"
-#include "exports/ExportGames.h"
 #include "members/MemberHits.h"
 #include "ui/WaitCursor.h"
 
@@ -44,7 +42,8 @@ void frmRx::ShowPastGames() {
          .BoardIsUnsaved = [this] { return desk_->Progress().Unsaved(); },
          .Busy = [this] { return RunningBesidesThis(); },
          .ShowCharts = [this](const PastGame& game) { ShowPastCharts(game); },
-         .Export = [this](const std::vector<std::int64_t>& games) { ExportPastGames(games); }},
+         .Export = [this](const std::vector<std::int64_t>& games) { ShowExport(games); },
+         .Import = [this] { ImportGameFiles(); }},
         this);
     window.exec();
     past = window.Chosen();
@@ -85,34 +84,4 @@ void frmRx::ShowPastCharts(const PastGame& past) {
       past, [this](std::int32_t contactId) { return BoardNameOf(contactId); },
       PointsOfMission(session_.DbScenarios(), past.Mission)));
   window.exec();
-}
-
-void frmRx::ExportPastGames(const std::vector<std::int64_t>& games) {
-  const auto fullNameOf = [this](std::int32_t contactId) {
-    const std::optional<Member> member = session_.Members().FindMember(contactId);
-    return member ? FullName{member->FirstName, member->LastName} : FullName();
-  };
-  const auto each = [&](const std::function<void(const ExportedGame&)>& take) {
-    for (const std::int64_t game : games) {
-      const PastGame past = archive_->Read(game);
-      take({.Game = past.Game,
-            .Received = past.Played,
-            .Mission = past.Mission,
-            .Standings = Standings(past.Game, archive_->Names()),
-            .FullNameOf = fullNameOf});
-    }
-  };
-  std::string name;
-  if (const auto first = games.empty() ? std::nullopt : archive_->Queries().Game(games.front())) {
-    name = SuggestedFileName(first->Played, games.size() == 1 ? first->Mission : std::string(), {});
-  }
-  ExportGames({.Games = each,
-               .HasGames = !games.empty(),
-               .SuggestedName = name,
-               .CommonDialog1 = services_.CommonDialog1,
-               .Disk = services_.Disk,
-               .Boxes = services_.Boxes,
-               .Strings = services_.Strings},
-              this)
-      .exec();
 }

@@ -58,6 +58,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"SheetProgressWindow", "Score sheets", "成绩单"},
       {"PastGames", "Past games", "历史比赛"},
       {"ExportGames", "Export", "导出"},
+      {"ImportGames", "Past games", "历史比赛"},
       {"Settings", "Settings", "设置"},
       {"SoldieringCalc", "Soldiering calculation", "战功计算"},
       {"RemoteManage", "Remote management", "远程管理"},

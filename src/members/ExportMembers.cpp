@@ -8,8 +8,8 @@
 #include <optional>
 
 #include "core/text/Filled.h"
-#include "members/RunProgress.h"
 #include "ui/Announce.h"
+#include "ui/RunProgress.h"
 #include "ui/Text.h"
 #include "ui_ExportMembers.h"
 

@@ -14,9 +14,9 @@
 #include "core/text/TextEncoding.h"
 #include "members/ImportTexts.h"
 #include "members/PlannedRowsModel.h"
-#include "members/RunProgress.h"
 #include "platform/RuntimeError.h"
 #include "ui/Announce.h"
+#include "ui/RunProgress.h"
 #include "ui/Text.h"
 #include "ui_ImportMembers.h"
 

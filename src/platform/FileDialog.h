@@ -21,4 +21,7 @@ class FileDialog {
   /// the operator cancels. Does not ask before overwriting an existing file.
   virtual std::optional<std::string> ShowOpen(const FileRequest& request) = 0;
   virtual std::optional<std::string> ShowSave(const FileRequest& request) = 0;
+
+  /// Asks for an existing folder. Of the request, only folder and title are used. Otherwise like ShowOpen.
+  virtual std::optional<std::string> ShowFolder(const FileRequest& request) = 0;
 };

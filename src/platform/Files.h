@@ -2,8 +2,30 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
+
+/// Who may read a file that is written anew.
+enum class FileReaders {
+  AsBefore,
+  ThisUser  ///< nobody else, also where others could read the file before
+};
+
+/// A file in the making. It takes its place only when it is whole; until then, and if that never comes, what
+/// was there before stays, and nothing is left behind.
+class NewFile {
+ public:
+  virtual ~NewFile() = default;
+
+  /// Adds bytes at the end. Throws as Files::Replace does.
+  virtual void Write(std::string_view bytes) = 0;
+
+  /// Puts the file in its place; durable on return. Nothing may be written afterwards. Throws as
+  /// Files::Replace does.
+  virtual void Finish() = 0;
+};
 
 /// Files and folders by path (UTF-8, the platform's separator).
 class Files {
@@ -35,6 +57,9 @@ class Files {
   /// one before.
   virtual void ReplacePrivately(const std::string& path, const std::string& bytes) = 0;
 
+  /// Does the same for a file that is written piece by piece. Throws as Replace does.
+  virtual std::unique_ptr<NewFile> BeginReplace(const std::string& path, FileReaders readers) = 0;
+
   /// Creates an empty file in the system's temporary folder, its name beginning with "per", and returns its
   /// path. Throws as Replace does.
   virtual std::string MakeTempFileName() = 0;
@@ -52,6 +77,14 @@ class Files {
 
   /// Names of the files in a folder, in ascending order; none if there is no such folder.
   virtual std::vector<std::string> FileNames(const std::string& folder) const = 0;
+
+  /// Names of the folders in a folder, in ascending order; symbolic links are not among them. Throws
+  /// RuntimeError 70, 75 or 76 for a folder that cannot be read.
+  virtual std::vector<std::string> FolderNames(const std::string& folder) const = 0;
+
+  /// Local time at which a file was last changed, "YYYY-MM-DD HH:MM:SS". Throws RuntimeError 53 if it does
+  /// not exist, 75 if it cannot be told.
+  virtual std::string TimeOfChange(const std::string& path) const = 0;
 
   /// Moves a file to another path on the same disk, replacing any file there. Durable on return. Throws
   /// RuntimeError 53 if it does not exist, 61, 70, 75 or 76, with a text as that of Replace.

@@ -6,6 +6,7 @@
 #include "archive/past/PastGames.h"
 #include "archive/history/MemberHistoryWindow.h"
 #include "archive/history/RankingWindow.h"
+#include "archive/import/ImportGames.h"
 #include "audience/AudienceSettings.h"
 #include "audience/GuestNameEntry.h"
 #include "board/AdminData.h"
@@ -84,6 +85,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<ExportGames>("mnuExport");
   LookAt<MemberHistoryWindow>("mnuMemberHistory");
   LookAt<RankingWindow>("mnuRankings");
+  LookAt<ImportGames>("mnuImportGames");
   LookAt<AudienceSettings>("mnuAudienceSettings");
   LookAt<GuestNameEntry>("mnuGuestNames");
   LookAt<Scenarios>("mnuSetupMissions");

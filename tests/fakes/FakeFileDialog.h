@@ -18,6 +18,7 @@ class FakeFileDialog : public FileDialog {
     std::string Name;
     std::string Folder = {};
     std::string Title = {};
+    bool OfFolder = false;
 
     bool operator==(const Call&) const = default;
   };
@@ -33,10 +34,13 @@ class FakeFileDialog : public FileDialog {
 
   std::optional<std::string> ShowOpen(const FileRequest& request) override { return Ask(false, request); }
   std::optional<std::string> ShowSave(const FileRequest& request) override { return Ask(true, request); }
+  std::optional<std::string> ShowFolder(const FileRequest& request) override {
+    return Ask(false, request, true);
+  }
 
  private:
-  std::optional<std::string> Ask(bool save, const FileRequest& request) {
-    Calls.push_back({save, request.Filter, request.Name, request.Folder, request.Title});
+  std::optional<std::string> Ask(bool save, const FileRequest& request, bool ofFolder = false) {
+    Calls.push_back({save, request.Filter, request.Name, request.Folder, request.Title, ofFolder});
     if (const auto whileOpen = WhileOpen) {
       whileOpen();
     }

@@ -3,8 +3,10 @@
 #include <cstddef>
 #include <cstdint>
 #include <map>
+#include <memory>
 #include <set>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -123,6 +125,11 @@ class FakeFiles : public Files {
     Replace(path, bytes);
   }
 
+  std::unique_ptr<NewFile> BeginReplace(const std::string& path, FileReaders readers) override {
+    ThrowIfTold(replaceFailures_, path);
+    return std::make_unique<FileInTheMaking>(*this, path, readers);
+  }
+
   std::string MakeTempFileName() override {
     ThrowIfTold(createFailures_, TempFolder);
     std::string path = std::string(TempFolder) + "/per" + std::to_string(++tempFiles_);
@@ -164,6 +171,25 @@ class FakeFiles : public Files {
     return names;
   }
 
+  std::vector<std::string> FolderNames(const std::string& folder) const override {
+    ThrowIfTold(readFailures_, folder);
+    std::vector<std::string> names;
+    for (const std::string& path : folders_) {
+      if (ParentOf(path) == WithoutSeparator(folder)) {
+        names.push_back(path.substr(path.rfind('/') + 1));
+      }
+    }
+    return names;
+  }
+
+  /// What TimeOfChange returns for each file that is there.
+  std::string ChangeTime = "2013-05-21 12:00:00";
+
+  std::string TimeOfChange(const std::string& path) const override {
+    Read(path);
+    return ChangeTime;
+  }
+
   void Rename(const std::string& path, const std::string& newPath) override {
     ThrowIfTold(replaceFailures_, newPath);
     if (!FileExists(path)) {
@@ -188,6 +214,27 @@ class FakeFiles : public Files {
   }
 
  private:
+  class FileInTheMaking : public NewFile {
+   public:
+    FileInTheMaking(FakeFiles& disk, std::string path, FileReaders readers)
+        : disk_(disk), path_(std::move(path)), readers_(readers) {}
+
+    void Write(std::string_view bytes) override { bytes_.append(bytes); }
+    void Finish() override {
+      if (readers_ == FileReaders::ThisUser) {
+        disk_.ReplacePrivately(path_, bytes_);
+      } else {
+        disk_.Replace(path_, bytes_);
+      }
+    }
+
+   private:
+    FakeFiles& disk_;
+    const std::string path_;
+    const FileReaders readers_;
+    std::string bytes_;
+  };
+
   using Failures = std::map<std::string, RuntimeError>;
 
   static void ThrowIfTold(const Failures& failures, const std::string& path) {

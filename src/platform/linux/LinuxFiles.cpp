@@ -5,116 +5,19 @@
 #include <unistd.h>
 #include <cerrno>
 #include <cstdio>
+#include <ctime>
 
 #include <algorithm>
 #include <array>
 #include <filesystem>
 #include <limits>
-#include <random>
 #include <string_view>
-#include <utility>
 
 #include "platform/linux/Descriptor.h"
 #include "platform/linux/FileError.h"
+#include "platform/linux/ReplacingFile.h"
 
 namespace {
-
-// The path behind all symbolic links at the end of `path`; it need not exist.
-std::string FollowLinks(std::string path) {
-  constexpr int mostLinks = 40;
-  for (int links = 0; links < mostLinks; ++links) {
-    std::error_code error;
-    const std::filesystem::path target = std::filesystem::read_symlink(path, error);
-    if (error) {
-      return path;
-    }
-    path = std::filesystem::path(path).parent_path() / target;
-  }
-  throw FileError(ELOOP, path);
-}
-
-// A new, empty file with a unique name, deleted at the end unless it has been renamed.
-class TemporaryFile {
- public:
-  TemporaryFile(const std::string& folder, mode_t mode)
-      : path_(NewName(folder)), file_(Create(path_, mode)) {}
-  ~TemporaryFile() {
-    if (!renamed_) {
-      unlink(path_.c_str());
-    }
-  }
-  TemporaryFile(const TemporaryFile&) = delete;
-  TemporaryFile& operator=(const TemporaryFile&) = delete;
-
-  int Number() const { return file_.Number(); }
-
-  bool RenameTo(const std::string& path) {
-    renamed_ = rename(path_.c_str(), path.c_str()) == 0;
-    if (!renamed_) {
-      const int error = errno;
-      renamed_ = IsAt(path);  // network file systems can report a rename as failed that was done
-      errno = error;
-    }
-    return renamed_;
-  }
-
- private:
-  bool IsAt(const std::string& path) const {
-    struct stat own {};
-    struct stat there {};
-    return fstat(Number(), &own) == 0 && stat(path.c_str(), &there) == 0 && own.st_dev == there.st_dev &&
-           own.st_ino == there.st_ino;
-  }
-  static std::string NewName(const std::string& folder) {
-    std::random_device random;
-    std::array<char, 32> name{};
-    std::snprintf(name.data(), name.size(), ".new-%08x%08x", random(), random());
-    return folder + "/" + name.data();
-  }
-  static int Create(const std::string& path, mode_t mode) {
-    return open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode);
-  }
-
-  std::string path_;
-  Descriptor file_;
-  bool renamed_ = false;
-};
-
-bool WriteAll(int file, std::string_view bytes) {
-  while (!bytes.empty()) {
-    const ssize_t written = write(file, bytes.data(), bytes.size());
-    if (written < 0 && errno != EINTR) {
-      return false;
-    }
-    bytes.remove_prefix(written < 0 ? 0 : static_cast<std::size_t>(written));
-  }
-  return true;
-}
-
-// Gives the new file the old one's permissions and, where allowed, its owner.
-bool TakeOver(int file, const struct stat& old) {
-  struct stat own {};
-  if (fstat(file, &own) != 0) {
-    return false;
-  }
-  // Only root may give a file away; for anyone else the new file belongs to the writer.
-  if ((own.st_uid != old.st_uid || own.st_gid != old.st_gid) && fchown(file, old.st_uid, old.st_gid) != 0 &&
-      errno != EPERM) {
-    return false;
-  }
-  return fchmod(file, old.st_mode & 07777) == 0;
-}
-
-// Makes it durable that `path` now names a file which was renamed to it, in `folder`. File systems that do
-// not support this (EINVAL) count as done. The error says that the file is in its place all the same.
-void SyncRename(const std::string& folder, const std::string& path) {
-  const Descriptor descriptor(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-  if (descriptor.Number() < 0 || (fsync(descriptor.Number()) != 0 && errno != EINVAL)) {
-    const RuntimeError error = FileError(errno, path);
-    throw RuntimeError(error.Number(),
-                       error.what() + std::string(" (done, but a power failure may undo it)"));
-  }
-}
 
 // A regular file that is open for reading.
 struct RegularFile {
@@ -152,28 +55,10 @@ struct RegularFile {
   std::size_t Size = 0;
 };
 
-enum class Readers { AsBefore, ThisUser };
-
-void ReplaceFile(const std::string& path, const std::string& bytes, Readers readers) {
-  const std::string target = FollowLinks(path);
-  struct stat old {};
-  const bool exists = stat(target.c_str(), &old) == 0;
-  if (exists && !S_ISREG(old.st_mode)) {
-    throw FileError(EISDIR, path);
-  }
-  if (exists && faccessat(AT_FDCWD, target.c_str(), W_OK, AT_EACCESS) != 0) {
-    throw FileError(errno, path);
-  }
-  const std::string parent = std::filesystem::path(target).parent_path();
-  const std::string folder = parent.empty() ? "." : parent;
-
-  const bool isPrivate = readers == Readers::ThisUser;
-  TemporaryFile file(folder, isPrivate ? 0600 : 0644);
-  if (file.Number() < 0 || (exists && !isPrivate && !TakeOver(file.Number(), old)) ||
-      !WriteAll(file.Number(), bytes) || fsync(file.Number()) != 0 || !file.RenameTo(target)) {
-    throw FileError(errno, path);
-  }
-  SyncRename(folder, path);
+void ReplaceFile(const std::string& path, const std::string& bytes, FileReaders readers) {
+  ReplacingFile file(path, readers);
+  file.Write(bytes);
+  file.Finish();
 }
 
 }  // namespace
@@ -238,11 +123,15 @@ std::string LinuxFiles::ReadPart(const std::string& path, std::uint64_t offset, 
 }
 
 void LinuxFiles::Replace(const std::string& path, const std::string& bytes) {
-  ReplaceFile(path, bytes, Readers::AsBefore);
+  ReplaceFile(path, bytes, FileReaders::AsBefore);
 }
 
 void LinuxFiles::ReplacePrivately(const std::string& path, const std::string& bytes) {
-  ReplaceFile(path, bytes, Readers::ThisUser);
+  ReplaceFile(path, bytes, FileReaders::ThisUser);
+}
+
+std::unique_ptr<NewFile> LinuxFiles::BeginReplace(const std::string& path, FileReaders readers) {
+  return std::make_unique<ReplacingFile>(path, readers);
 }
 
 std::string LinuxFiles::MakeTempFileName() {
@@ -295,6 +184,38 @@ std::vector<std::string> LinuxFiles::FileNames(const std::string& folder) const 
   }
   std::sort(names.begin(), names.end());
   return names;
+}
+
+std::vector<std::string> LinuxFiles::FolderNames(const std::string& folder) const {
+  std::vector<std::string> names;
+  std::error_code error;
+  std::filesystem::directory_iterator entry(folder, error);
+  for (const std::filesystem::directory_iterator end; !error && entry != end; entry.increment(error)) {
+    std::error_code none;
+    if (entry->symlink_status(none).type() == std::filesystem::file_type::directory) {
+      names.push_back(entry->path().filename());
+    }
+  }
+  if (error) {
+    throw FileError(error.value(), folder);
+  }
+  std::sort(names.begin(), names.end());
+  return names;
+}
+
+std::string LinuxFiles::TimeOfChange(const std::string& path) const {
+  struct stat info {};
+  if (stat(path.c_str(), &info) != 0) {
+    throw errno == ENOENT || errno == ENOTDIR ? RuntimeError(Fault::FileNotFound, "File not found: " + path)
+                                              : FileError(errno, path);
+  }
+  std::array<char, 32> text{};
+  struct tm local {};
+  if (localtime_r(&info.st_mtime, &local) == nullptr ||
+      std::strftime(text.data(), text.size(), "%Y-%m-%d %H:%M:%S", &local) == 0) {
+    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
+  }
+  return text.data();
 }
 
 void LinuxFiles::Rename(const std::string& path, const std::string& newPath) {

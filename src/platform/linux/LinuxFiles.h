@@ -19,11 +19,14 @@ class LinuxFiles : public Files {
   /// umask. A write-protected file is refused (70), even where its folder would allow replacing it.
   void Replace(const std::string& path, const std::string& bytes) override;
   void ReplacePrivately(const std::string& path, const std::string& bytes) override;
+  std::unique_ptr<NewFile> BeginReplace(const std::string& path, FileReaders readers) override;
   std::string MakeTempFileName() override;
   void Write(const std::string& path, const std::string& bytes) override;
   void Append(const std::string& path, const std::string& bytes) override;
   std::uint64_t FreeSpace(const std::string& path) const override;
   std::vector<std::string> FileNames(const std::string& folder) const override;
+  std::vector<std::string> FolderNames(const std::string& folder) const override;
+  std::string TimeOfChange(const std::string& path) const override;
   void Rename(const std::string& path, const std::string& newPath) override;
   void TakePlace(const std::string& path, const std::string& replaced) override;
   void Delete(const std::string& path) override;

@@ -108,26 +108,35 @@ QStringList NameFilters(const std::string& filter) {
 }
 
 std::optional<std::string> QtFileDialog::ShowOpen(const FileRequest& request) {
-  return Ask(false, request);
+  return Ask(Wanted::OpenFile, request);
 }
 
 std::optional<std::string> QtFileDialog::ShowSave(const FileRequest& request) {
-  return Ask(true, request);
+  return Ask(Wanted::SaveFile, request);
 }
 
-std::optional<std::string> QtFileDialog::Ask(bool save, const FileRequest& request) {
+std::optional<std::string> QtFileDialog::ShowFolder(const FileRequest& request) {
+  return Ask(Wanted::Folder, request);
+}
+
+std::optional<std::string> QtFileDialog::Ask(Wanted wanted, const FileRequest& request) {
+  const bool save = wanted == Wanted::SaveFile;
+  const bool folder = wanted == Wanted::Folder;
   // Not on the stack: its parent may be destroyed, and the dialog with it, while it is open.
   const QPointer<NamingDialog> dialog = new NamingDialog(parent_());
   dialog->setObjectName(QStringLiteral("CommonDialog1"));
   dialog->setAcceptMode(save ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
   // The caller decides what to do if there is no such file, even when opening.
-  dialog->setFileMode(QFileDialog::AnyFile);
+  dialog->setFileMode(folder ? QFileDialog::Directory : QFileDialog::AnyFile);
+  dialog->setOption(QFileDialog::ShowDirsOnly, folder);
   dialog->setOption(QFileDialog::DontUseNativeDialog);
   dialog->setOption(QFileDialog::DontConfirmOverwrite, save);
   if (!request.Title.empty()) {
     dialog->setWindowTitle(QString::fromStdString(request.Title));
   }
-  dialog->setNameFilters(NameFilters(request.Filter));
+  if (!folder) {
+    dialog->setNameFilters(NameFilters(request.Filter));
+  }
   dialog->setDirectory(StartFolder(request, lastFolder_));
   if (!request.Name.empty()) {
     dialog->selectFile(QFileInfo(QString::fromStdString(request.Name)).fileName());
@@ -146,6 +155,6 @@ std::optional<std::string> QtFileDialog::Ask(bool save, const FileRequest& reque
   if (chosen.isEmpty()) {
     return std::nullopt;
   }
-  lastFolder_ = QFileInfo(chosen.first()).absolutePath();
+  lastFolder_ = folder ? chosen.first() : QFileInfo(chosen.first()).absolutePath();
   return chosen.first().toStdString();
 }

@@ -20,9 +20,12 @@ class QtFileDialog : public FileDialog {
 
   std::optional<std::string> ShowOpen(const FileRequest& request) override;
   std::optional<std::string> ShowSave(const FileRequest& request) override;
+  std::optional<std::string> ShowFolder(const FileRequest& request) override;
 
  private:
-  std::optional<std::string> Ask(bool save, const FileRequest& request);
+  enum class Wanted { OpenFile, SaveFile, Folder };
+
+  std::optional<std::string> Ask(Wanted wanted, const FileRequest& request);
 
   std::function<QWidget*()> parent_;
   QString lastFolder_;

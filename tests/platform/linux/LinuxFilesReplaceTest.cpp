@@ -249,4 +249,51 @@ TEST(TakePlace, LeavesAWriteProtectedFileWhereItIs) {
   EXPECT_EQ(ReadFile(folder / "new"), "new");
 }
 
+TEST(NewFile, TakesItsPlaceOnlyWhenItIsFinished) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "old");
+  chmod((folder / "file").c_str(), 0640);
+  LinuxFiles files;
+  {
+    const auto file = files.BeginReplace(folder / "file", FileReaders::AsBefore);
+    file->Write("one ");
+    file->Write(std::string("two\0", 4));
+    EXPECT_EQ(ReadFile(folder / "file"), "old");
+    file->Finish();
+  }
+  EXPECT_EQ(ReadFile(folder / "file"), std::string("one two\0", 8));
+  EXPECT_EQ(ModeOf(folder / "file"), 0640U);
+  EXPECT_EQ(EntriesOf(folder.Path()), 1U);
+}
+
+TEST(NewFile, LeavesNothingWhenItIsNotFinished) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "old");
+  LinuxFiles().BeginReplace(folder / "file", FileReaders::AsBefore)->Write("new");
+  LinuxFiles().BeginReplace(folder / "other", FileReaders::AsBefore)->Write("new");
+  EXPECT_EQ(ReadFile(folder / "file"), "old");
+  EXPECT_EQ(EntriesOf(folder.Path()), 1U);
+}
+
+TEST(NewFile, IsForThisUserAloneWhereThatIsWanted) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "old");
+  chmod((folder / "file").c_str(), 0644);
+  const auto file = LinuxFiles().BeginReplace(folder / "file", FileReaders::ThisUser);
+  file->Finish();
+  EXPECT_EQ(ModeOf(folder / "file"), 0600U);
+}
+
+TEST(NewFile, FailsAsAReplacementDoes) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  EXPECT_EQ(NumberThrownBy([&] { files.BeginReplace(folder / "none/file", FileReaders::AsBefore); }), 76);
+  EXPECT_EQ(NumberThrownBy([&] { files.BeginReplace(folder.Path(), FileReaders::AsBefore); }), 75);
+  WriteFile(folder / "file", "old");
+  const FileSizeLimit limit(10'000);
+  const auto file = files.BeginReplace(folder / "file", FileReaders::AsBefore);
+  EXPECT_EQ(NumberThrownBy([&] { file->Write(std::string(20'000, 'x')); }), 61);
+  EXPECT_EQ(ReadFile(folder / "file"), "old");
+}
+
 }  // namespace

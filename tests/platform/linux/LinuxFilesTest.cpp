@@ -273,4 +273,37 @@ TEST(Rename, FailsForAMissingFileOrAnImpossibleTarget) {
   EXPECT_EQ(ReadFile(folder / "file"), "x");
 }
 
+TEST(FolderNames, AreThoseOfTheFoldersInAFolderInOrder) {
+  const TemporaryFolder folder;
+  std::filesystem::create_directory(folder / "b");
+  std::filesystem::create_directory(folder / "a");
+  std::filesystem::create_directory_symlink(folder.Path(), folder / "link");
+  WriteFile(folder / "file", "");
+  EXPECT_EQ(LinuxFiles().FolderNames(folder.Path()), (std::vector<std::string>{"a", "b"}));
+  EXPECT_TRUE(LinuxFiles().FolderNames(folder / "a").empty());
+}
+
+TEST(FolderNames, AreNotKnownOfAFolderThatCannotBeRead) {
+  const TemporaryFolder folder;
+  std::filesystem::create_directory(folder / "closed");
+  std::filesystem::permissions(folder / "closed", std::filesystem::perms::none);
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().FolderNames(folder / "gone"); }), 76);
+  const OrdinaryUser user;
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().FolderNames(folder / "closed"); }), 70);
+}
+
+TEST(TimeOfChange, IsLocal) {
+  const TemporaryFolder folder;
+  WriteFile(folder / "file", "");
+  const timespec times[] = {{1'700'000'000, 0}, {1'700'000'000, 0}};
+  ASSERT_EQ(utimensat(AT_FDCWD, (folder / "file").c_str(), times, 0), 0);
+  const std::string before = getenv("TZ") != nullptr ? getenv("TZ") : "";
+  setenv("TZ", "XXX-5:30", 1);
+  tzset();
+  EXPECT_EQ(LinuxFiles().TimeOfChange(folder / "file"), "2023-11-15 03:43:20");
+  before.empty() ? unsetenv("TZ") : setenv("TZ", before.c_str(), 1);
+  tzset();
+  EXPECT_EQ(NumberThrownBy([&] { LinuxFiles().TimeOfChange(folder / "gone"); }), 53);
+}
+
 }  // namespace

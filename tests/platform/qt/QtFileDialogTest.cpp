@@ -280,4 +280,23 @@ TEST_F(QtFileDialogTest, GivesNoNameWhenItsWindowIsDestroyed) {
             std::nullopt);
 }
 
+TEST_F(QtFileDialogTest, GivesTheFolderChosen) {
+  ASSERT_TRUE(QDir(folder_.path()).mkdir(QStringLiteral("games")));
+  const WhileModal<QFileDialog> operatorAtWork([&](QFileDialog& dialog) {
+    EXPECT_EQ(dialog.windowTitle(), QStringLiteral("Games"));
+    EXPECT_EQ(dialog.directory().absolutePath(), folder_.path());
+    EXPECT_TRUE(dialog.testOption(QFileDialog::ShowDirsOnly));
+    Entry(dialog).setText(QStringLiteral("games"));
+    Press(dialog, QDialogButtonBox::Open);
+  });
+  EXPECT_EQ(Dialog.ShowFolder({.Filter = {}, .Folder = folder_.path().toStdString(), .Title = "Games"}),
+            Path("games"));
+  EXPECT_EQ(operatorAtWork.Runs(), 1);
+}
+
+TEST_F(QtFileDialogTest, GivesNoFolderOnCancel) {
+  const WhileModal<QFileDialog> operatorAtWork([](QFileDialog& dialog) { dialog.reject(); });
+  EXPECT_EQ(Dialog.ShowFolder({.Filter = {}}), std::nullopt);
+}
+
 }  // namespace

@@ -1,4 +1,4 @@
-#include "members/RunProgress.h"
+#include "ui/RunProgress.h"
 
 #include <QAbstractButton>
 #include <QProgressBar>
