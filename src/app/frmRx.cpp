@@ -32,6 +32,7 @@ frmRx::frmRx(const Services& services)
       manual_(services.Strings, QString::fromStdString(services.Places.Program() + "/manual"), *this) {
   ui_->setupUi(this);
   setAcceptDrops(true);
+  connect(&waitingFileTimer_, &QTimer::timeout, this, &frmRx::OpenWaitingFile);
 }
 
 frmRx::~frmRx() = default;
@@ -56,10 +57,12 @@ bool frmRx::FormLoad() {
   session_.Factors() = ReadSoldieringFactors(*ini_);
   ui_->mnuCheckButton->setEnabled(services_.ButtonSwipe != nullptr);
   ui_->mnuChargeiButton->setEnabled(services_.Wire != nullptr);
+  ui_->mnuSystemCheck->setEnabled(services_.Computer != nullptr);
   ConnectCommands();
   SetUpDesk();
   SetUpKeeping();
   SetUpAudience();
+  TellNewVersion();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
@@ -188,6 +191,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
                                {ui_->mnuAbout, &frmRx::ShowAbout},
                                {ui_->mnuManual, &frmRx::ShowManual},
+                               {ui_->mnuSystemCheck, &frmRx::ShowSystemCheck},
                                {ui_->mnuAdminData, &frmRx::ShowAdminData},
                                {ui_->mnuGameCharts, &frmRx::ShowGameCharts},
                                {ui_->mnuMissionResults, &frmRx::EnterMissionResults},
