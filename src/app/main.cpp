@@ -14,7 +14,7 @@ namespace {
 bool NeedsWindow() {
   const bool hasDisplay =
       qEnvironmentVariableIsSet("DISPLAY") || qEnvironmentVariableIsSet("WAYLAND_DISPLAY");
-  return hasDisplay && qgetenv("QT_QPA_PLATFORM") != "offscreen" && isatty(STDERR_FILENO) == 0;
+  return hasDisplay && !qgetenv("QT_QPA_PLATFORM").startsWith("offscreen") && isatty(STDERR_FILENO) == 0;
 }
 
 /// For a while only: nobody has to answer it.

@@ -27,6 +27,8 @@ class RunningProgram : public testing::Test {
     WriteFile(site.Folder / "Friday.game.xml", GameFile(PlayerOf(65), "Free For All"));
     environment.insert(QStringLiteral("XDG_DATA_HOME"), QString::fromStdString(site.Folder.Path()));
     environment.insert(QStringLiteral("XDG_RUNTIME_DIR"), QString::fromStdString(runtime.Path()));
+    environment.insert(QStringLiteral("QT_QPA_PLATFORM"),
+                       QStringLiteral("offscreen:configfile=" TESSARINE_TEST_SCREENS));
     environment.insert(QStringLiteral("LC_ALL"), QStringLiteral("C.UTF-8"));
     environment.remove(QStringLiteral("LANGUAGE"));
     environment.remove(QStringLiteral("DISPLAY"));
