@@ -3,18 +3,14 @@
 #include <QApplication>
 #include <QDir>
 #include <QLibraryInfo>
-#include <QLocale>
 
+#include "app/Release.h"
+#include "app/SystemFacts.h"
 #include "core/data/FirstRun.h"
 #include "devices/buttons/ButtonSwipe.h"
 #include "platform/qt/UprightPicture.h"
 
 namespace {
-
-Language LanguageOfSystem() {
-  const QStringList languages = QLocale::system().uiLanguages();
-  return LanguageOf(languages.isEmpty() ? std::string() : languages.first().toStdString());
-}
 
 /// Folder of the word processor's module: beside the program, or where it is installed.
 std::string ModuleFolder() {
@@ -67,11 +63,30 @@ Composition::Composition()
           .SoundConverter = soundConverter_,
           .ButtonSwipe = [this] { return SwipeButton(); },
           .Wire = &wire_,
-          .Archives = &archives_};
+          .Archives = &archives_,
+          .Computer = &computer_,
+          .Release = ReleaseText()};
 }
 
 std::string Composition::SwipeButton() {
   ButtonSwipe window(wire_, boxes_, strings_, parent_.Window());
   window.exec();
   return window.DallasID();
+}
+
+std::function<void(const std::string& device, const std::string& settings, int fault)>
+Composition::NoteOpening() {
+  return [this, note = NoteFault()](const std::string& device, const std::string& settings, int fault) {
+    log_.PortOpening(device, settings, fault);
+    note(device, settings, fault);
+  };
+}
+
+std::function<void(const std::string& device, const std::string& settings, int fault)>
+Composition::NoteFault() {
+  return [this](const std::string& /*device*/, const std::string& /*settings*/, int fault) {
+    if (fault != 0 && OnPortFault) {
+      OnPortFault();
+    }
+  };
 }

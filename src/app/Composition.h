@@ -10,6 +10,7 @@
 #include "core/text/StringTable.h"
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
+#include "platform/linux/LinuxComputer.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/linux/LinuxPrograms.h"
 #include "platform/qt/DBusWakeLock.h"
@@ -35,11 +36,18 @@ class Composition {
   /// Boxes and dialogs belong to `window` while no other window is active.
   void SetMainWindow(QWidget* window) { parent_.SetMainWindow(window); }
 
+  /// Called after a serial port could not be opened.
+  std::function<void()> OnPortFault;
+
   MessageBoxes& Boxes() { return boxes_; }
   ProgramLog& Log() { return log_; }
 
  private:
   std::string SwipeButton();
+  /// What is done after each attempt to open a port.
+  std::function<void(const std::string& device, const std::string& settings, int fault)> NoteOpening();
+  /// The same where the log would have too many rows of it.
+  std::function<void(const std::string& device, const std::string& settings, int fault)> NoteFault();
 
   StringTable strings_;
   QTranslator dialogTexts_;  ///< the toolkit's own texts ("OK", "File name:") in the program's language
@@ -56,35 +64,29 @@ class Composition {
   QtMessageBoxes shownBoxes_{[this] { return parent_.Window(); }};
   LoggedBoxes boxes_{shownBoxes_, log_};
   LinuxPrograms otherPrograms_;
+  LinuxComputer computer_;
   QtSerialDevices devices_;
   const std::string logFolder_;
   QtSerialPort port_;
-  LoggedPort loggedPort_{port_,
-                         {.Disk = files_,
-                          .Folder = logFolder_,
-                          .Elapsed = events_,
-                          .Time = clock_,
-                          .OnOpening = [this](const std::string& device, const std::string& settings,
-                                              int fault) { log_.PortOpening(device, settings, fault); }},
-                         "line"};
+  LoggedPort loggedPort_{
+      port_,
+      {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_, .OnOpening = NoteOpening()},
+      "line"};
   QtSerialPort readerPort_;
-  LoggedPort loggedReaderPort_{readerPort_,
-                               {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_},
-                               "1-wire",
-                               Transcript::Repeats::Counted};
+  LoggedPort loggedReaderPort_{
+      readerPort_,
+      {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_, .OnOpening = NoteFault()},
+      "1-wire",
+      Transcript::Repeats::Counted};
   IniReader readerSettings_;
   SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
   DBusWakeLock awake_;
   QtSerialPort soundPort_;
-  LoggedPort loggedSoundPort_{soundPort_,
-                              {.Disk = files_,
-                               .Folder = logFolder_,
-                               .Elapsed = events_,
-                               .Time = clock_,
-                               .OnOpening = [this](const std::string& device, const std::string& settings,
-                                                   int fault) { log_.PortOpening(device, settings, fault); }},
-                              "sound-recorder"};
+  LoggedPort loggedSoundPort_{
+      soundPort_,
+      {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_, .OnOpening = NoteOpening()},
+      "sound-recorder"};
   QtSoundPlayer soundPlayer_;
   SndfileConverter soundConverter_;
 };

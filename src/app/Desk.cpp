@@ -111,6 +111,7 @@ void Desk::Show() {
   for (StatusLine::Entry& entry : SheetEntries()) {
     entries.push_back(std::move(entry));
   }
+  entries.insert(entries.end(), others_.begin(), others_.end());
   parts_.Line.Show(entries);
   for (int step = 0; step < GameStepCount; ++step) {
     parts_.Bar.SetDone(static_cast<GameStep>(step), progress_.IsDone(static_cast<GameStep>(step)));
@@ -281,6 +282,17 @@ void Desk::TellUnsavedSettings(const std::string& path) {
 
 void Desk::TellKeeping(const KeptState& state) {
   keeping_ = state;
+  Show();
+}
+
+void Desk::Tell(const StatusLine::Entry& entry) {
+  const auto found =
+      std::find_if(others_.begin(), others_.end(), [&](const auto& each) { return each.Name == entry.Name; });
+  if (found != others_.end()) {
+    *found = entry;
+  } else {
+    others_.push_back(entry);
+  }
   Show();
 }
 

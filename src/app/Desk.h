@@ -61,6 +61,10 @@ class Desk : public QObject {
   /// Says what became of keeping games.
   void TellKeeping(const KeptState& state);
 
+  /// Shows an entry of another matter behind those of the game, until it is told again; one without a text
+  /// goes.
+  void Tell(const StatusLine::Entry& entry);
+
   /// Gives the board the keyboard, so that no stray key changes the game; once an open menu or list is
   /// closed.
   void FocusBoard();
@@ -92,6 +96,7 @@ class Desk : public QObject {
   std::string fileOfCancel_;
   std::string unsavedSettings_;
   KeptState keeping_;
+  std::vector<StatusLine::Entry> others_;
   bool ended_ = false;
   Subscription subscription_;
 };

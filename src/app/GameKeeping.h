@@ -15,6 +15,9 @@ class GameKeeping : public QObject {
   /// The session is about to be closed.
   void End();
 
+  /// True if the game on the board is kept as it was at the end of the last command.
+  bool IsKept() const { return !keeper_.State().KeptAt.empty() && keeper_.State().Failure.empty(); }
+
   /// Guns are about to be read into the board.
   void BeginPull(GameSource source) { keeper_.BeginPull(source); }
   /// A past game is being loaded; see GameKeeper::Open.

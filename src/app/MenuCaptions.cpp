@@ -60,6 +60,7 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuHelp->menuAction(), 217},
       {ui.mnuAbout, 218},
       {ui.mnuManual, static_cast<int>(OwnText::ManualTitle)},
+      {ui.mnuSystemCheck, static_cast<int>(OwnText::SystemCheckItem)},
   };
   for (const auto& [item, number] : items) {
     SetCaption(strings, *item, number);

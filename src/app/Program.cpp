@@ -14,6 +14,7 @@ Program::Program() {
   qApp->installEventFilter(this);
   window_.emplace(composition_.Services());
   composition_.SetMainWindow(&*window_);
+  composition_.OnPortFault = [this] { window_->PointToSystemCheck(); };
 }
 
 bool Program::Start() {
@@ -22,7 +23,20 @@ bool Program::Start() {
     return false;
   }
   window_->show();
+  started_ = true;
   return true;
+}
+
+void Program::Listen(int listener) {
+  // Behind the main window there is nothing more to bring to the front: the caller waits for this program's
+  // end.
+  const auto mayTake = [this] { return !started_ || window_->isVisible(); };
+  calls_.emplace(listener, mayTake, [this](const InstanceRequest& request) {
+    window_->ComeToFront(request.Token);
+    if (!request.Path.empty()) {
+      window_->Open(request.Path);
+    }
+  });
 }
 
 int Program::Run() {

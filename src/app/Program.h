@@ -4,6 +4,7 @@
 #include <optional>
 
 #include "app/Composition.h"
+#include "app/InstanceCalls.h"
 #include "app/frmRx.h"
 #include "ui/AltLetters.h"
 #include "ui/PlainToolTips.h"
@@ -16,6 +17,9 @@ class Program : public QObject {
   /// Prepares the main window and shows it. Returns false if the program cannot continue, which has been
   /// reported, or if the operator chose to end it.
   bool Start();
+
+  /// Takes what later starts of the program ask at this socket: see InstanceCalls.
+  void Listen(int listener);
 
   /// Starts, and runs until the main window is closed. Returns the process's exit code.
   int Run();
@@ -31,4 +35,6 @@ class Program : public QObject {
   AltLetters altLetters_;
   Composition composition_;
   std::optional<frmRx> window_;
+  bool started_ = false;
+  std::optional<InstanceCalls> calls_;
 };

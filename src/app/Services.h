@@ -5,6 +5,7 @@
 
 #include "core/text/StringTable.h"
 #include "platform/Clock.h"
+#include "platform/Computer.h"
 #include "platform/Database.h"
 #include "platform/EventPump.h"
 #include "platform/FileDialog.h"
@@ -50,4 +51,9 @@ struct Services {
   OneWire* Wire = nullptr;
   /// Opens the archive of games. It does not wait long for a locked file; null for one that does.
   DatabaseEngine* Archives = nullptr;
+  /// This computer; without it there is no System Check.
+  const ::Computer* Computer = nullptr;
+  /// Another text for each version of the program; where it is empty, versions are neither remembered nor
+  /// told.
+  std::string Release = {};
 };

@@ -6,6 +6,8 @@ namespace State {
 inline constexpr const char* File = "/state.ini";  ///< in the user's data folder
 
 inline constexpr const char* Games = "games";
+inline constexpr const char* Program = "program";
+inline constexpr const char* Release = "release";         ///< of the program at its last start
 inline constexpr const char* SaveFolder = "save_folder";  ///< of the game saved last
 
 inline constexpr const char* Archive = "archive";

@@ -1,12 +1,13 @@
 #include "app/SystemFacts.h"
 
+#include <QFontDatabase>
 #include <QGuiApplication>
 #include <QLocale>
 #include <QScreen>
 #include <QSysInfo>
 
+#include "app/Release.h"
 #include "app/ScreenFit.h"
-#include "app/Version.h"
 
 namespace {
 
@@ -20,15 +21,33 @@ QString ScreenText(const QScreen& screen) {
 
 }  // namespace
 
+Language LanguageOfSystem() {
+  const QStringList languages = QLocale::system().uiLanguages();
+  return LanguageOf(languages.isEmpty() ? std::string() : languages.first().toStdString());
+}
+
 std::vector<std::string> SystemFacts() {
   std::vector<std::string> facts = {
-      std::string("Tessarine ") + VersionText,
+      "Tessarine " + ReleaseText(),
       std::string("Qt ") + qVersion() + ", " + QGuiApplication::platformName().toStdString(),
       QSysInfo::prettyProductName().toStdString() + ", " + QSysInfo::kernelType().toStdString() + ' ' +
           QSysInfo::kernelVersion().toStdString(),
       "Locale " + QLocale::system().name().toStdString()};
-  for (const QScreen* screen : QGuiApplication::screens()) {
-    facts.push_back(ScreenText(*screen).toStdString());
+  for (std::string& screen : ScreenTexts()) {
+    facts.push_back(std::move(screen));
   }
   return facts;
+}
+
+std::vector<std::string> ScreenTexts() {
+  std::vector<std::string> texts;
+  for (const QScreen* screen : QGuiApplication::screens()) {
+    texts.push_back(ScreenText(*screen).toStdString());
+  }
+  return texts;
+}
+
+std::string ChineseLetters() {
+  const QStringList families = QFontDatabase::families(QFontDatabase::SimplifiedChinese);
+  return families.isEmpty() ? std::string() : families.first().toStdString();
 }

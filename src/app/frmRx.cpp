@@ -32,6 +32,7 @@ frmRx::frmRx(const Services& services)
       manual_(services.Strings, QString::fromStdString(services.Places.Program() + "/manual"), *this) {
   ui_->setupUi(this);
   setAcceptDrops(true);
+  connect(&waitingFileTimer_, &QTimer::timeout, this, &frmRx::OpenWaitingFile);
 }
 
 frmRx::~frmRx() = default;
@@ -56,6 +57,7 @@ bool frmRx::FormLoad() {
   session_.Factors() = ReadSoldieringFactors(*ini_);
   ui_->mnuCheckButton->setEnabled(services_.ButtonSwipe != nullptr);
   ui_->mnuChargeiButton->setEnabled(services_.Wire != nullptr);
+  ui_->mnuSystemCheck->setEnabled(services_.Computer != nullptr);
   ConnectCommands();
   SetUpDesk();
   SetUpKeeping();
@@ -63,6 +65,7 @@ bool frmRx::FormLoad() {
   idleCopying_.emplace(IdleCopying::Parts{.CopyAPart = [this] { return keeping_->CopyAPart(); },
                                           .Busy = [this] { return downloading_ || IsBusy(); },
                                           .Elapsed = services_.Elapsed});
+  TellNewVersion();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
@@ -204,6 +207,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuSoldieringCalc, &frmRx::ShowSoldieringCalc},
                                {ui_->mnuAbout, &frmRx::ShowAbout},
                                {ui_->mnuManual, &frmRx::ShowManual},
+                               {ui_->mnuSystemCheck, &frmRx::ShowSystemCheck},
                                {ui_->mnuAdminData, &frmRx::ShowAdminData},
                                {ui_->mnuGameCharts, &frmRx::ShowGameCharts},
                                {ui_->mnuMissionResults, &frmRx::EnterMissionResults},

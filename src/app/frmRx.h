@@ -49,6 +49,18 @@ class frmRx : public QMainWindow {
   /// Throws RuntimeError if the program cannot continue; returns false if the operator chose to end it.
   bool FormLoad();
 
+  /// Loads this game file as soon as no command, box or window of the program is open. Asks before it
+  /// replaces a game that is neither saved nor kept.
+  void Open(const std::string& path);
+
+  /// Comes to the front, where the desktop allows it; else the task bar asks for attention. `token` is the
+  /// desktop's permission; it may be empty.
+  void ComeToFront(const std::string& token);
+
+  /// Something of the computer that the program needs has failed: the status line leads to System Check from
+  /// now on.
+  void PointToSystemCheck();
+
   /// The firmware update of devices with a PIC24F boot loader. No menu item gives this command.
   void UpdateTypeB();
 
@@ -74,8 +86,12 @@ class frmRx : public QMainWindow {
   void LoadGame();
   /// Reads the file that was chosen.
   void ReadGame();
-  /// Loads a file that was dropped on the window, unless the operator wants to keep an unsaved game.
-  void LoadDropped(const std::string& path);
+  /// Loads a file that came from outside, if the operator agrees: asks first where `losesGame` is true.
+  void LoadFromOutside(const std::string& path, bool losesGame);
+  /// Loads the file that waits to be opened, if it can be now.
+  void OpenWaitingFile();
+  /// Says once that the program is a new version.
+  void TellNewVersion();
   /// What runs below the present command, if anything.
   std::optional<OwnText> RunningBesidesThis() const;
   /// True while a command, a box or another window of the program waits for the operator.
@@ -125,6 +141,7 @@ class frmRx : public QMainWindow {
   void ChargeButtons();
   void RecordSounds();
   void ShowBackupCopies();
+  void ShowSystemCheck();
 
   /// Makes the last of the selected rows the player of the context menu's commands. Returns false if none is
   /// selected.
@@ -174,6 +191,8 @@ class frmRx : public QMainWindow {
   int selectedPlayer_ = 0;                      ///< record index of the player under the context menu
   std::unique_ptr<PrintOptions> printOptions_;  ///< kept, since it shows the last choices again
   QTimer wordProcessorTimer_;
+  std::string waitingFile_;  ///< to be opened; empty if none
+  QTimer waitingFileTimer_;
   Commands commands_;
   std::optional<Desk> desk_;
   std::optional<GameKeeping> keeping_;

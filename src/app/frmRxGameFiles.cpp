@@ -127,15 +127,15 @@ void frmRx::dropEvent(QDropEvent* event) {
   // The program that it comes from waits for the end of this event, not for the operator's answer.
   QTimer::singleShot(0, this, [this, path] {
     if (isVisible() && !IsBusy()) {  // it may have been closed since
-      commands_.Run([&] { LoadDropped(path.toStdString()); });
+      commands_.Run([&] { LoadFromOutside(path.toStdString(), desk_->Progress().Unsaved()); });
       desk_->Show();
       desk_->FocusBoard();
     }
   });
 }
 
-void frmRx::LoadDropped(const std::string& path) {
-  if (desk_->Progress().Unsaved()) {
+void frmRx::LoadFromOutside(const std::string& path, bool losesGame) {
+  if (losesGame) {
     const std::string question =
         Filled(services_.Strings.Text(OwnText::DropQuestion), {path.substr(path.find_last_of('/') + 1)});
     if (services_.Boxes.Show(question, DefaultBoxTitle, BoxIcon::Question, BoxButtons::OkCancel) !=

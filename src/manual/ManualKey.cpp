@@ -32,10 +32,18 @@ void ManualKey::Open() {
   if (front == nullptr || front == window_.get()) {
     front = &mainWindow_;
   }
+  Window().ShowPageOf(InFrontOf(*front));
+}
+
+void ManualKey::OpenPage(const QString& title) {
+  Window().ShowPageTitled(title);
+}
+
+ManualWindow& ManualKey::Window() {
   if (!window_) {
     window_ = std::make_unique<ManualWindow>(strings_, folder_);
   }
-  window_->ShowPageOf(InFrontOf(*front));
+  return *window_;
 }
 
 bool ManualKey::eventFilter(QObject* watched, QEvent* event) {

@@ -15,11 +15,15 @@ class ManualKey : public QObject {
 
   /// Opens the manual as the key does.
   void Open();
+  /// Opens it at the page of this title.
+  void OpenPage(const QString& title);
 
  protected:
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
+  ManualWindow& Window();
+
   const StringTable& strings_;
   const QString folder_;
   const QWidget& mainWindow_;

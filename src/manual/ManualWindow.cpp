@@ -52,6 +52,14 @@ void ManualWindow::ShowPageOf(const QWidget& window) {
       break;
     }
   }
+  ShowInFront(page);
+}
+
+void ManualWindow::ShowPageTitled(const QString& title) {
+  ShowInFront(PageOfLink('#' + AnchorOf(title.toStdString()), pages_).value_or(0));
+}
+
+void ManualWindow::ShowInFront(std::size_t page) {
   ui_->Pages->setCurrentRow(static_cast<int>(page));
   BelongToModalWindow();
   show();

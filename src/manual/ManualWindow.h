@@ -25,12 +25,16 @@ class ManualWindow : public QWidget {
   /// Shows the page about `window`, or about the nearest of its parents that has one, in front of it.
   void ShowPageOf(const QWidget& window);
 
+  /// Shows the page of this title; the first one if there is none.
+  void ShowPageTitled(const QString& title);
+
  protected:
   void keyPressEvent(QKeyEvent* event) override;
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
   void ShowPage(int page);
+  void ShowInFront(std::size_t page);
   void FollowLink(const QUrl& link);
   /// A window that must be answered first blocks all others but those that belong to it.
   void BelongToModalWindow();

@@ -74,7 +74,9 @@ const std::vector<Menu> Menus = {
       {"mnuAudienceSettings", static_cast<int>(OwnText::AudienceSettingsItem), "Audience Board Se&ttings",
        true}}},
     {{"mnuHelp", 217, "&Help", true},
-     {{"mnuAbout", 218, "&About", true}, {"mnuManual", 524, "&Manual", true}}},
+     {{"mnuAbout", 218, "&About", true},
+      {"mnuManual", 524, "&Manual", true},
+      {"mnuSystemCheck", static_cast<int>(OwnText::SystemCheckItem), "&System Check", true}}},
 };
 
 /// The items of a menu or the menus of a bar, without the lines between them.

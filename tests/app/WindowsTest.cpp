@@ -13,6 +13,7 @@
 #include "board/BonusPoints.h"
 #include "board/MissionResultEntry.h"
 #include "board/PlayerDetails.h"
+#include "check/SystemCheck.h"
 #include "devices/box/BoxConfig.h"
 #include "devices/charging/ChargeiButton.h"
 #include "devices/radio/RemoteManage.h"
@@ -94,6 +95,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<BoxConfig>("mnuBoxConfig");
   LookAt<ChargeiButton>("mnuChargeiButton");
   LookAt<ISD_rec>("mnuSoundRecorder");
+  LookAt<SystemCheck>("mnuSystemCheck");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }

@@ -17,6 +17,7 @@
 #include "platform/jet/JetConverter.h"
 #include "platform/qt/QtEventPump.h"
 #include "platform/qt/UprightPicture.h"
+#include "tests/fakes/FakeComputer.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
 #include "tests/fakes/FakeOneWire.h"
@@ -69,7 +70,9 @@ class Venue : public DataSite {
                                                 .SoundPlayer = Player,
                                                 .SoundConverter = Converter,
                                                 .ButtonSwipe = ButtonSwipe,
-                                                .Wire = HasReader ? &Wire : nullptr});
+                                                .Wire = HasReader ? &Wire : nullptr,
+                                                .Computer = &Computer,
+                                                .Release = Release});
     return *Window;
   }
 
@@ -155,6 +158,8 @@ class Venue : public DataSite {
   FakeSerialPort Port;
   FakeOneWire Wire;
   bool HasReader = true;
+  FakeComputer Computer;
+  std::string Release;  ///< of the program; empty for none
   FakeWakeLock Awake;
   FakeSerialPort SoundPort;
   FakeSoundPlayer Player{Events};

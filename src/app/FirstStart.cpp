@@ -1,0 +1,82 @@
+#include "app/FirstStart.h"
+
+#include <QCryptographicHash>
+#include <cstdio>
+#include <filesystem>
+
+#include "app/Release.h"
+#include "app/StartWords.h"
+#include "core/data/FirstRun.h"
+#include "core/text/Filled.h"
+#include "platform/qt/QtFolders.h"
+
+namespace {
+
+std::string FromEnvironment(const char* name) {
+  return qgetenv(name).toStdString();
+}
+
+InstancePlace PlaceOfThisUser() {
+  std::string folder;
+  QtFolders().LocalAppData(folder);
+  return InstancePlaceOf(FromEnvironment("XDG_RUNTIME_DIR"), folder + UserDataSubfolder);
+}
+
+/// The permission to come to the front that the desktop gave this start.
+std::string ActivationToken() {
+  const std::string token = FromEnvironment("XDG_ACTIVATION_TOKEN");
+  return token.empty() ? FromEnvironment("DESKTOP_STARTUP_ID") : token;
+}
+
+void Say(std::FILE* stream, const std::string& text) {
+  std::fputs((text + '\n').c_str(), stream);
+}
+
+}  // namespace
+
+InstancePlace InstancePlaceOf(const std::string& runtimeFolder, const std::string& dataFolder) {
+  constexpr int digits = 32;
+  std::error_code error;
+  const std::filesystem::path canonical = std::filesystem::weakly_canonical(dataFolder, error);
+  const std::string path = error ? dataFolder : canonical.string();
+  const QByteArray digest =
+      QCryptographicHash::hash(QByteArray::fromStdString(path), QCryptographicHash::Sha256)
+          .toHex()
+          .left(digits);
+  return {InstanceFolder(runtimeFolder, dataFolder), ".tessarine-" + digest.toStdString()};
+}
+
+std::optional<int> FirstStart::Begin(const std::vector<std::string>& words) {
+  constexpr std::chrono::seconds patience(3);
+  constexpr int misused = 2;
+  const StartWords asked = ReadStartWords(words);
+  switch (asked.Asked) {
+    case StartWords::Kind::Version:
+      Say(stdout, "Tessarine " + ReleaseText());
+      return 0;
+    case StartWords::Kind::Help:
+      Say(stdout, strings_.Text(OwnText::StartHelp));
+      return 0;
+    case StartWords::Kind::Unknown:
+      return Refuse(Filled(strings_.Text(OwnText::StartUnknown), {asked.Word}), misused);
+    case StartWords::Kind::Run:
+      break;
+  }
+  std::error_code none;
+  file_ = asked.File.empty() ? std::string() : std::filesystem::absolute(asked.File, none).string();
+  switch (instance_.emplace(PlaceOfThisUser()).Start({file_, ActivationToken()}, patience)) {
+    case InstanceOutcome::Told:
+      return 0;
+    case InstanceOutcome::NoAnswer:
+      unanswered_ = true;
+      return Refuse(strings_.Text(OwnText::StartUnanswered), 1);
+    case InstanceOutcome::First:
+      break;
+  }
+  return std::nullopt;
+}
+
+int FirstStart::Refuse(const std::string& text, int exitCode) const {
+  Say(stderr, "tessarine: " + text);
+  return exitCode;
+}

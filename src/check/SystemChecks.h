@@ -1,0 +1,60 @@
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "check/CheckReport.h"
+#include "core/data/IniReader.h"
+#include "platform/Clock.h"
+#include "platform/Computer.h"
+#include "platform/Database.h"
+#include "platform/Files.h"
+#include "platform/SerialDevices.h"
+
+/// Looks at what the program needs of the computer, subject by subject. Changes nothing, and opens no port.
+class SystemChecks {
+ public:
+  struct Parts {
+    const StringTable& Strings;
+    const Clock& Time;
+    const ::Computer& Computer;
+    const SerialDevices& Devices;
+    const IniReader& Ini;
+    Files& Disk;
+    DatabaseEngine& Databases;
+    std::string UserDataFolder;
+    std::function<bool()> HasWordProcessor;
+    std::function<std::string()>
+        ChineseLetters;  ///< name of letters with which Chinese is written; empty if none
+    std::function<std::vector<std::string>()> Screens;  ///< a text about each
+    std::function<std::int16_t()> ReaderPort;           ///< number
+  };
+
+  /// Less free space is told as too little.
+  static constexpr std::uint64_t LeastFreeMegabytes = 500;
+
+  /// The parts must outlive this object.
+  explicit SystemChecks(Parts parts) : parts_(std::move(parts)) {}
+
+  /// What there is to tell about the subject: at least one item, unless `keepOn` said that it should stop.
+  /// `keepOn` is asked every few milliseconds where that takes long. Never throws: what fails is told.
+  std::vector<CheckItem> Look(CheckSubject subject, const KeepOn& keepOn) const;
+
+ private:
+  using Items = std::vector<CheckItem>;
+
+  std::string Text(OwnText text, std::initializer_list<std::string_view> values = {}) const;
+  Items LookAt(CheckSubject subject, const KeepOn& keepOn) const;
+  Items Ports(const KeepOn& keepOn) const;
+  CheckItem Port(CheckSubject subject, std::int16_t number) const;
+  CheckItem Printer(const KeepOn& keepOn) const;
+  CheckItem Screens() const;
+  CheckItem Disk() const;
+  CheckItem Clock() const;
+  Items DatabaseOf(CheckSubject subject, const KeepOn& keepOn) const;
+  std::string LastCopyOf(const std::string& database) const;
+
+  const Parts parts_;
+};

@@ -1,0 +1,41 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "check/SystemChecks.h"
+#include "tests/fakes/FakeComputer.h"
+#include "tests/fakes/FakeSerialDevices.h"
+#include "tests/support/DataSite.h"
+
+/// A computer that has everything, to be looked at.
+class CheckedSite : public DataSite {
+ public:
+  explicit CheckedSite(Language language = Language::English) : DataSite(language) {
+    PutDefaultFiles();
+    Devices.Ports = {"/dev/ttyS0", "/dev/ttyUSB0"};
+  }
+
+  SystemChecks Checks() {
+    return SystemChecks({.Strings = Strings,
+                         .Time = Time,
+                         .Computer = Computer,
+                         .Devices = Devices,
+                         .Ini = Ini,
+                         .Disk = Disk,
+                         .Databases = Databases,
+                         .UserDataFolder = DataFolder(),
+                         .HasWordProcessor = [this] { return HasWordProcessor; },
+                         .ChineseLetters = [this] { return Letters; },
+                         .Screens = [this] { return Screens; },
+                         .ReaderPort = [this] { return ReaderPort; }});
+  }
+
+  FakeComputer Computer;
+  FakeSerialDevices Devices;
+  IniReader Ini{Disk, DataFolder() + "/tessarine.ini"};
+  bool HasWordProcessor = true;
+  std::string Letters = "Noto Sans CJK SC";
+  std::vector<std::string> Screens = {"Screen 1920 x 1080, scale 1", "Screen 1280 x 720, scale 1"};
+  std::int16_t ReaderPort = 2;
+};

@@ -1,0 +1,170 @@
+#include "check/SystemChecks.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "tests/check/CheckedSite.h"
+
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::Not;
+
+class LookedAt : public testing::Test {
+ protected:
+  std::vector<CheckItem> All(CheckSubject subject) {
+    return site.Checks().Look(subject, [] { return true; });
+  }
+  CheckItem One(CheckSubject subject) {
+    const std::vector<CheckItem> items = All(subject);
+    EXPECT_EQ(items.size(), 1u);
+    return items.empty() ? CheckItem() : items.front();
+  }
+  static CheckItem Fine(CheckSubject subject, const std::string& text) { return {subject, true, text}; }
+  static CheckItem ToDo(CheckSubject subject, const std::string& text) { return {subject, false, text}; }
+
+  CheckedSite site;
+};
+
+TEST_F(LookedAt, ThePortsAreFineOneByOne) {
+  EXPECT_THAT(All(CheckSubject::Ports), ElementsAre(Fine(CheckSubject::Ports, "/dev/ttyS0"),
+                                                    Fine(CheckSubject::Ports, "/dev/ttyUSB0")));
+}
+
+TEST_F(LookedAt, APortThatMayNotBeUsedSaysWhatToDo) {
+  site.Computer.Forbidden = {"/dev/ttyUSB0"};
+  EXPECT_EQ(All(CheckSubject::Ports).at(1),
+            ToDo(CheckSubject::Ports,
+                 "/dev/ttyUSB0 may not be used by you: log in at this computer itself, then unplug "
+                 "the adapter and plug it in again."));
+}
+
+TEST_F(LookedAt, APortInUseNamesItsPrograms) {
+  site.Computer.Users = {{"/dev/ttyUSB0", "minicom"}, {"/dev/ttyUSB0", "cat"}};
+  EXPECT_EQ(All(CheckSubject::Ports).at(0), Fine(CheckSubject::Ports, "/dev/ttyS0"));
+  EXPECT_EQ(All(CheckSubject::Ports).at(1),
+            ToDo(CheckSubject::Ports, "/dev/ttyUSB0 is in use by minicom, cat: end that program."));
+}
+
+TEST_F(LookedAt, WithoutAPortAnAdapterIsAskedFor) {
+  site.Devices.Ports.clear();
+  EXPECT_EQ(One(CheckSubject::Ports),
+            ToDo(CheckSubject::Ports, "There is no serial port: plug the adapter in."));
+}
+
+TEST_F(LookedAt, ThePortsOfTheSettingsCountToo) {
+  site.Devices.Ports.clear();
+  site.Devices.Others = {"/dev/serial/by-id/usb-1"};
+  site.Ini.WriteIni("ports", "com1", "/dev/serial/by-id/usb-1");
+  site.Ini.WriteIni("ports", "com2", "/dev/gone");
+  EXPECT_EQ(One(CheckSubject::Ports), Fine(CheckSubject::Ports, "/dev/serial/by-id/usb-1"));
+}
+
+TEST_F(LookedAt, ThePortOfTheBaseUnitIsThatOfTheSettings) {
+  site.Ini.WriteIni("comm", "commport", "2");
+  EXPECT_EQ(One(CheckSubject::BaseUnit), Fine(CheckSubject::BaseUnit, "Port 2 is /dev/ttyUSB0"));
+  site.Ini.WriteIni("comm", "commport", "3");
+  EXPECT_EQ(One(CheckSubject::BaseUnit),
+            ToDo(CheckSubject::BaseUnit,
+                 "Port 3 is not there: plug the adapter in, or choose another port in Settings."));
+  site.Ini.WriteIni("comm", "commport", "x");
+  EXPECT_EQ(One(CheckSubject::BaseUnit),
+            ToDo(CheckSubject::BaseUnit, "This could not be found out: Type mismatch"));
+}
+
+TEST_F(LookedAt, TheReaderHasItsOwnPort) {
+  EXPECT_EQ(One(CheckSubject::Reader), Fine(CheckSubject::Reader, "Port 2 is /dev/ttyUSB0"));
+  site.ReaderPort = 7;
+  EXPECT_FALSE(One(CheckSubject::Reader).Fine);
+}
+
+TEST_F(LookedAt, WhatIsInstalledIsNamedAndWhatIsMissingToo) {
+  EXPECT_EQ(One(CheckSubject::WordProcessor), Fine(CheckSubject::WordProcessor, "LibreOffice Writer"));
+  EXPECT_EQ(One(CheckSubject::Chinese), Fine(CheckSubject::Chinese, "Noto Sans CJK SC"));
+  site.HasWordProcessor = false;
+  site.Letters.clear();
+  EXPECT_THAT(One(CheckSubject::WordProcessor).Text, HasSubstr("install the package libreoffice-writer"));
+  EXPECT_THAT(One(CheckSubject::Chinese).Text, HasSubstr("install the package fonts-noto-cjk"));
+  EXPECT_FALSE(One(CheckSubject::WordProcessor).Fine || One(CheckSubject::Chinese).Fine);
+}
+
+TEST_F(LookedAt, PrintersAreNamed) {
+  EXPECT_EQ(One(CheckSubject::Printer), Fine(CheckSubject::Printer, "Office"));
+  site.Computer.AllPrinters.clear();
+  EXPECT_THAT(One(CheckSubject::Printer).Text, HasSubstr("No printer is set up"));
+  site.Computer.PrinterFailure = RuntimeError(Fault::PathAccess, "lpstat");
+  EXPECT_EQ(One(CheckSubject::Printer), ToDo(CheckSubject::Printer, "This could not be found out: lpstat"));
+}
+
+TEST_F(LookedAt, ASecondScreenIsAskedFor) {
+  EXPECT_EQ(One(CheckSubject::Screens),
+            Fine(CheckSubject::Screens, "Screen 1920 x 1080, scale 1, Screen 1280 x 720, scale 1"));
+  site.Screens.pop_back();
+  EXPECT_THAT(One(CheckSubject::Screens).Text, HasSubstr("only one screen"));
+}
+
+TEST_F(LookedAt, TheClockMayNotBeBehindTheCopies) {
+  EXPECT_EQ(One(CheckSubject::Clock), Fine(CheckSubject::Clock, "2013-05-21 14:30:05"));
+  std::filesystem::create_directory(site.DataFile("backups"));
+  WriteFile(site.DataFile("backups/members-2013-05-21-143005.mdb"), "");
+  EXPECT_TRUE(One(CheckSubject::Clock).Fine);
+  WriteFile(site.DataFile("backups/members-2013-05-21-143006.mdb"), "");
+  EXPECT_THAT(One(CheckSubject::Clock).Text, HasSubstr("set the date and time"));
+}
+
+TEST_F(LookedAt, AClockWithoutABatteryIsSeen) {
+  site.Time.DateAndTime = "1970-01-01 00:03:00";
+  EXPECT_THAT(One(CheckSubject::Clock).Text, HasSubstr("The clock shows 1970-01-01 00:03:00"));
+}
+
+TEST_F(LookedAt, DatabasesTellTheirRowsAndLastCopy) {
+  site.ChangeDatabase("members.mdb", "INSERT INTO Members (FirstName, LastName) VALUES ('Ada', 'Byron')");
+  EXPECT_EQ(One(CheckSubject::Members), Fine(CheckSubject::Members, "1 rows, last copy: none yet"));
+  std::filesystem::create_directory(site.DataFile("backups"));
+  WriteFile(site.DataFile("backups/members-2013-05-20-201500.mdb"), "");
+  WriteFile(site.DataFile("backups/members-2013-05-19-201500.mdb"), "");
+  WriteFile(site.DataFile("backups/scenarios-2013-05-21-101500.mdb"), "");
+  EXPECT_EQ(One(CheckSubject::Members),
+            Fine(CheckSubject::Members, "1 rows, last copy: 2013-05-20 20:15:00"));
+  EXPECT_TRUE(One(CheckSubject::Missions).Fine);
+}
+
+TEST_F(LookedAt, PastGamesNeedNotBeThere) {
+  EXPECT_EQ(One(CheckSubject::Games), Fine(CheckSubject::Games, "none yet"));
+}
+
+TEST_F(LookedAt, ADamagedDatabaseSaysWhatToDoWithoutTheUsersName) {
+  site.Computer.Home = site.Folder.Path();
+  std::string bytes = ReadFile(site.DataFile("members.mdb"));
+  bytes.replace(1024, bytes.size() - 1024, bytes.size() - 1024, '\xA5');
+  WriteFile(site.DataFile("members.mdb"), bytes);
+  const CheckItem item = One(CheckSubject::Members);
+  EXPECT_FALSE(item.Fine);
+  EXPECT_THAT(item.Text, HasSubstr("Members is damaged ("));
+  EXPECT_THAT(item.Text, HasSubstr("put a copy in its place with Tools, Backup Copies."));
+  EXPECT_THAT(item.Text, Not(HasSubstr(site.Folder.Path())));
+  std::filesystem::remove(site.DataFile("scenarios.mdb"));
+  EXPECT_FALSE(One(CheckSubject::Missions).Fine);
+}
+
+TEST_F(LookedAt, NothingIsChanged) {
+  const std::string before = ReadFile(site.DataFile("members.mdb"));
+  for (int subject = 0; subject < CheckSubjectCount; ++subject) {
+    EXPECT_THAT(All(static_cast<CheckSubject>(subject)), Not(IsEmpty()));
+  }
+  EXPECT_EQ(ReadFile(site.DataFile("members.mdb")), before);
+  EXPECT_FALSE(std::filesystem::exists(site.DataFile("games.mdb")));
+}
+
+TEST_F(LookedAt, ALargeDatabaseIsLeftWhenThatIsWanted) {
+  site.ChangeDatabase("members.mdb",
+                      "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 20000) "
+                      "INSERT INTO Members (FirstName, LastName) SELECT 'Ada' || i, 'Byron' FROM n");
+  int asked = 0;
+  EXPECT_THAT(site.Checks().Look(CheckSubject::Members, [&asked] { return ++asked < 3; }), IsEmpty());
+  EXPECT_EQ(asked, 3);
+}
+
+}  // namespace
