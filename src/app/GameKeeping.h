@@ -21,6 +21,7 @@ class GameKeeping : public QObject {
   void NoteMembers() { Do(&GameKeeper::NoteMembers); }
   /// The members may be others, all of them.
   void CheckMembers() { Do(&GameKeeper::CheckMembers); }
+  const KeptState& State() const { return keeper_.State(); }
 
  protected:
   bool eventFilter(QObject* watched, QEvent* event) override;

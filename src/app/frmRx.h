@@ -6,12 +6,14 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "app/BoardCharts.h"
 #include "app/Desk.h"
 #include "app/GameKeeping.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
+#include "archive/copies/CopyWork.h"
 #include "audience/AudienceBoard.h"
 #include "audience/AudienceCopy.h"
 #include "core/data/IniReader.h"
@@ -24,6 +26,7 @@
 #include "devices/charging/ChargedButtons.h"
 #include "manual/ManualKey.h"
 #include "sheets/PrintOptions.h"
+#include "takeover/TakeOverWork.h"
 #include "ui/Commands.h"
 #include "ui/WindowPlaces.h"
 
@@ -106,6 +109,14 @@ class frmRx : public QMainWindow {
   void ChargeButtons();
   void RecordSounds();
   void ShowBackupCopies();
+  void TakeOverOldInstallation();
+  /// Missions and members, as their copies are kept.
+  std::vector<CopiedDatabase> CopiedDatabases();
+  CopyWork::Parts CopyParts() const;
+  /// What a take-over of old data works on.
+  TakeOverWork::Parts TakeOverParts();
+  /// Why no old installation can be taken over now; empty if one can.
+  std::string WhyNoTakeOver();
 
   /// Makes the last of the selected rows the player of the context menu's commands. Returns false if none is
   /// selected.

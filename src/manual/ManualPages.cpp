@@ -64,6 +64,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"frmBootload", "Devices with a PIC24F boot loader", "带 PIC24F 引导程序的设备"},
       {"ISD_rec", "Sound recorder", "声音录制"},
       {"BackupCopies", "Backup copies", "备份副本"},
+      {"TakeOver", "Files from an old installation", "旧安装的文件"},
       {"AudienceSettings", "Audience board", "观众大屏"},
       {"GuestNameEntry", "Audience board", "观众大屏"},
       {"About", "If you need help", "需要帮助时"}};
