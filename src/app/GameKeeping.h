@@ -32,6 +32,7 @@ class GameKeeping : public QObject {
   void CheckMembers() { Do(&GameKeeper::CheckMembers); }
   /// Does a step of the archive's weekly copy; false if there is nothing more to do for now.
   bool CopyAPart();
+  const KeptState& State() const { return keeper_.State(); }
 
  protected:
   bool eventFilter(QObject* watched, QEvent* event) override;

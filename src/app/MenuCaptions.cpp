@@ -39,6 +39,7 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuMissionResults, 212},
       {ui.mnuSetupMissions, 213},
       {ui.mnuBackupCopies, static_cast<int>(OwnText::BackupCopiesItem)},
+      {ui.mnuTakeOver, static_cast<int>(OwnText::TakeOverItem)},
       {ui.mnuExportMembers, static_cast<int>(OwnText::ExportMembersItem)},
       {ui.mnuImportMembers, static_cast<int>(OwnText::ImportMembersItem)},
       {ui.mnuMemberHistory, static_cast<int>(OwnText::MemberHistoryItem)},

@@ -16,9 +16,24 @@
 #include "board/ScoreListModel.h"
 #include "core/data/FirstRun.h"
 #include "core/data/UserDatabase.h"
+#include "takeover/TakeOverMark.h"
 #include "ui/CalmList.h"
 #include "ui/Choice.h"
 #include "ui_frmRx.h"
+
+namespace {
+
+/// What a take-over of old data began, unless it was completed. Nothing of the data folder is open yet.
+void FinishInterruptedTakeOver(const Folders& places, Files& disk) {
+  std::string folder;
+  places.LocalAppData(folder);
+  folder += UserDataSubfolder;
+  if (disk.FolderExists(folder)) {
+    FinishTakeOver(disk, folder);
+  }
+}
+
+}  // namespace
 
 frmRx::frmRx(const Services& services)
     : services_(services),
@@ -42,6 +57,7 @@ bool frmRx::FormLoad() {
   session_.ClearPlayerData();
   FitToScreen(*this, services_.Boxes);
   SetUpLists();
+  FinishInterruptedTakeOver(services_.Places, services_.Disk);
   userDataFolder_ = PrepareUserDataFolder(services_.Places, services_.Disk, services_.Boxes);
   ini_.emplace(services_.Disk, userDataFolder_ + "/tessarine.ini");
   RestorePlaces();
@@ -229,6 +245,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuChargeiButton, &frmRx::ChargeButtons},
                                {ui_->mnuSoundRecorder, &frmRx::RecordSounds},
                                {ui_->mnuBackupCopies, &frmRx::ShowBackupCopies},
+                               {ui_->mnuTakeOver, &frmRx::TakeOverOldInstallation},
                                {ui_->mnuAudienceBoard, &frmRx::ToggleAudienceBoard},
                                {ui_->mnuAudienceResults, &frmRx::ShowAudienceResults},
                                {ui_->mnuAudienceVenue, &frmRx::ShowAudienceVenue},

@@ -16,6 +16,7 @@
 #include "app/WordProcessorStart.h"
 #include "archive/ArchiveAccess.h"
 #include "archive/past/PastGames.h"
+#include "archive/copies/CopyWork.h"
 #include "audience/AudienceBoard.h"
 #include "audience/AudienceCopy.h"
 #include "core/data/IniReader.h"
@@ -28,6 +29,7 @@
 #include "devices/charging/ChargedButtons.h"
 #include "manual/ManualKey.h"
 #include "sheets/PrintOptions.h"
+#include "takeover/TakeOverWork.h"
 #include "ui/Commands.h"
 #include "ui/WindowPlaces.h"
 
@@ -142,6 +144,14 @@ class frmRx : public QMainWindow {
   void RecordSounds();
   void ShowBackupCopies();
   void ShowSystemCheck();
+  void TakeOverOldInstallation();
+  /// Missions and members, as their copies are kept.
+  std::vector<CopiedDatabase> CopiedDatabases();
+  CopyWork::Parts CopyParts() const;
+  /// What a take-over of old data works on.
+  TakeOverWork::Parts TakeOverParts();
+  /// Why no old installation can be taken over now; empty if one can.
+  std::string WhyNoTakeOver();
 
   /// Makes the last of the selected rows the player of the context menu's commands. Returns false if none is
   /// selected.

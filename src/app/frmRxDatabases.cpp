@@ -1,14 +1,19 @@
 // The main window's commands on the databases as a whole: members as files, backup copies.
 
 #include <optional>
+#include <set>
+#include <utility>
 
 #include "app/frmRx.h"
 #include "archive/ArchiveCopies.h"
 #include "archive/CopiedArchive.h"
 #include "archive/copies/BackupCopies.h"
+#include "core/line/CommPortSetting.h"
 #include "core/text/Filled.h"
 #include "members/ExportMembers.h"
 #include "members/ImportMembers.h"
+#include "platform/RuntimeError.h"
+#include "takeover/TakeOver.h"
 
 void frmRx::ExportMemberFile() {
   ExportMembers({.DbMembers = session_.DbMembers(),
@@ -60,32 +65,39 @@ void frmRx::ImportMemberFile() {
   }
 }
 
-void frmRx::ShowBackupCopies() {
+std::vector<CopiedDatabase> frmRx::CopiedDatabases() {
   const std::string defaults = services_.Places.Program();
-  std::vector<CopiedDatabase> databases = {
-      {.Name = "scenarios",
-       .Table = "Table1",
-       .DefaultPath = defaults + "/scenarios_default.mdb",
-       .Title = OwnText::CopiedMissions,
-       .InUse = [this]() -> Database& { return session_.DbScenarios(); }},
-      {.Name = "members",
-       .Table = "Members",
-       .DefaultPath = defaults + "/members_default.mdb",
-       .Title = OwnText::CopiedMembers,
-       .InUse = [this]() -> Database& { return session_.DbMembers(); }}};
+  return {{.Name = "scenarios",
+           .Table = "Table1",
+           .DefaultPath = defaults + "/scenarios_default.mdb",
+           .Title = OwnText::CopiedMissions,
+           .InUse = [this]() -> Database& { return session_.DbScenarios(); }},
+          {.Name = "members",
+           .Table = "Members",
+           .DefaultPath = defaults + "/members_default.mdb",
+           .Title = OwnText::CopiedMembers,
+           .InUse = [this]() -> Database& { return session_.DbMembers(); }}};
+}
+
+CopyWork::Parts frmRx::CopyParts() const {
+  return {.Engine = services_.Databases,
+          .Disk = services_.Disk,
+          .Time = services_.Time,
+          .Strings = services_.Strings,
+          .Folder = BackupFolderIn(userDataFolder_)};
+}
+
+void frmRx::ShowBackupCopies() {
+  std::vector<CopiedDatabase> databases = CopiedDatabases();
   CopiedArchive archive({.Engine = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
                          .Disk = services_.Disk,
                          .UserDataFolder = userDataFolder_,
-                         .ProgramFolder = defaults});
+                         .ProgramFolder = services_.Places.Program()});
   if (archive.IsThere()) {
     databases.push_back(archive.Entry());
   }
   BackupCopies({.Databases = std::move(databases),
-                .Work = {.Engine = services_.Databases,
-                         .Disk = services_.Disk,
-                         .Time = services_.Time,
-                         .Strings = services_.Strings,
-                         .Folder = BackupFolderIn(userDataFolder_)},
+                .Work = CopyParts(),
                 .Events = services_.Events,
                 .Boxes = services_.Boxes,
                 .FileDialog = services_.CommonDialog1,
@@ -96,6 +108,67 @@ void frmRx::ShowBackupCopies() {
                       keeping_->CheckMembers();
                     }},
                this)
+      .exec();
+}
+
+std::string frmRx::WhyNoTakeOver() {
+  const StringTable& strings = services_.Strings;
+  if (const std::optional<OwnText> reason = RunningBesidesThis()) {
+    return Filled(strings.Text(OwnText::TakeOverWaits), {strings.Text(*reason)});
+  }
+  const KeptState& kept = keeping_->State();
+  const bool isKept = !kept.KeptAt.empty() && kept.Failure.empty();
+  return desk_->Progress().Unsaved() && !isKept ? strings.Text(OwnText::TakeOverGameNotKept) : std::string();
+}
+
+TakeOverWork::Parts frmRx::TakeOverParts() {
+  std::vector<TakenDatabase> databases;
+  for (const CopiedDatabase& copied : CopiedDatabases()) {
+    databases.push_back(
+        {.What = copied.Title == OwnText::CopiedMembers ? OldItem::Members : OldItem::Missions,
+         .Table = copied.Table,
+         .DefaultPath = copied.DefaultPath,
+         .InUse = copied.InUse,
+         .KeepCopy = [copied, work = CopyWork(CopyParts())](const KeepOn& keepOn) {
+           return work.KeepPresent(copied, [&keepOn](CopyStep) { return keepOn(); });
+         }});
+  }
+  return {.Engine = services_.Databases,
+          .Old = services_.Old,
+          .Disk = services_.Disk,
+          .Time = services_.Time,
+          .Strings = services_.Strings,
+          .DataFolder = userDataFolder_,
+          .Databases = std::move(databases),
+          .Ask = {},
+          .HasPort = [this](std::int16_t number) {
+            try {
+              return services_.Devices.Exists(CommPortSetting(*ini_, services_.Devices).DeviceOf(number));
+            } catch (const RuntimeError&) {
+              return false;
+            }
+          }};
+}
+
+void frmRx::TakeOverOldInstallation() {
+  if (const std::string reason = WhyNoTakeOver(); !reason.empty()) {
+    services_.Boxes.Show(reason, services_.Strings.Text(OwnText::TakeOverTitle), BoxIcon::Exclamation);
+    return;
+  }
+  TakeOver({.Work = TakeOverParts(),
+            .Events = services_.Events,
+            .Boxes = services_.Boxes,
+            .FileDialog = services_.CommonDialog1,
+            .Busy = [this] { return RunningBesidesThis(); },
+            .Reopen =
+                [this](const std::set<OldItem>&) {
+                  session_.ClearPlayerData();
+                  session_.Reopen();
+                  session_.Factors() = ReadSoldieringFactors(*ini_);
+                  keeping_->CheckMembers();
+                },
+            .EndProgram = [this] { close(); }},
+           this)
       .exec();
 }
 

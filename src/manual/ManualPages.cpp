@@ -69,6 +69,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"ISD_rec", "Sound recorder", "声音录制"},
       {"BackupCopies", "Backup copies", "备份副本"},
       {"SystemCheck", "System check", "系统检查"},
+      {"TakeOver", "Files from an old installation", "旧安装的文件"},
       {"AudienceSettings", "Audience board", "观众大屏"},
       {"GuestNameEntry", "Audience board", "观众大屏"},
       {"About", "If you need help", "需要帮助时"}};

@@ -73,6 +73,7 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
       {"mnuSoundRecorder", {"Sound recorder", "声音录制"}},
       {"mnuPastGames", {"Past games", "历史比赛"}},
       {"mnuBackupCopies", {"Backup copies", "备份副本"}},
+      {"mnuTakeOver", {"Files from an old installation", "旧安装的文件"}},
       {"mnuCommPort", {"Settings", "设置"}},
       {"mnuSoldieringCalc", {"Soldiering calculation", "战功计算"}},
       {"mnuGuestNames", {"Audience board", "观众大屏"}},

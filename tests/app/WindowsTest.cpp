@@ -27,6 +27,7 @@
 #include "settings/Settings.h"
 #include "settings/SoldieringCalc.h"
 #include "sound/ISD_rec.h"
+#include "takeover/TakeOver.h"
 #include "tests/support/CaredFor.h"
 #include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
@@ -96,6 +97,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<ChargeiButton>("mnuChargeiButton");
   LookAt<ISD_rec>("mnuSoundRecorder");
   LookAt<SystemCheck>("mnuSystemCheck");
+  LookAt<TakeOver>("mnuTakeOver");
   venue.ActiveMission().setCurrentIndex(3);
   LookAt<MissionResultEntry>("mnuMissionResults");
 }

@@ -82,6 +82,10 @@ std::optional<std::string> CopyWork::CopyNow(const CopiedDatabase& database, con
   return Keep(database.InUse().Path(), CopyKind::ByHand, CopyStep::Copying, keepOn);
 }
 
+std::optional<std::string> CopyWork::KeepPresent(const CopiedDatabase& database, const OnStep& keepOn) const {
+  return Keep(database.InUse().Path(), CopyKind::BeforeRestore, CopyStep::KeepingPresent, keepOn);
+}
+
 bool CopyWork::CopyToFile(const std::string& path, const std::string& target, const OnStep& keepOn) const {
   const std::unique_ptr<Database> source = parts_.Engine.OpenDatabase(path);
   const PartFile part(parts_.Disk, target + ".part");
@@ -128,8 +132,7 @@ bool CopyWork::PutCopyInPlace(const BackupCopy& copy, const CopiedDatabase& data
   const WritersHeld held(inUse);  // or what others write now would be lost
   const std::string file = inUse.FilePath();
   CheckRoom(source->Path(), FolderOf(file));
-  const std::optional<std::string> kept =
-      Keep(inUse.Path(), CopyKind::BeforeRestore, CopyStep::KeepingPresent, keepOn);
+  const std::optional<std::string> kept = KeepPresent(database, keepOn);
   if (!kept) {
     return false;
   }

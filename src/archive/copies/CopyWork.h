@@ -66,6 +66,10 @@ class CopyWork {
   /// Copies a database as it is now and returns the copy's name; nothing if it was stopped.
   std::optional<std::string> CopyNow(const CopiedDatabase& database, const OnStep& keepOn) const;
 
+  /// Does the same ahead of a replacement of the whole database, so the copy's name says that. It may be held
+  /// against writers.
+  std::optional<std::string> KeepPresent(const CopiedDatabase& database, const OnStep& keepOn) const;
+
   /// Copies the database at `path` to the file `target`, replacing any file there. False if it was stopped.
   bool CopyToFile(const std::string& path, const std::string& target, const OnStep& keepOn) const;
 

@@ -44,16 +44,6 @@ std::string Lines(const std::vector<NotTakenOver>& all, const StringTable& strin
   return lines;
 }
 
-std::string ReasonOf(const OldDatabaseRefused& error, const StringTable& strings) {
-  if (!error.Parts().empty()) {
-    return Filled(strings.Text(OwnText::OldDatabaseRefused), {Lines(error.Parts(), strings)});
-  }
-  if (!error.Failure().empty()) {
-    return Filled(strings.Text(OwnText::OldDatabaseRefused), {error.Failure()});
-  }
-  return strings.Text(OwnText::OldDatabaseDamaged);
-}
-
 class Steps : public ConversionSteps {
  public:
   Steps(const UserDatabase& database, const DatabaseParts& parts) : database_(database), parts_(parts) {}
@@ -109,6 +99,20 @@ class Steps : public ConversionSteps {
 };
 
 }  // namespace
+
+std::string ReasonOf(const OldDatabaseRefused& error, const StringTable& strings) {
+  if (!error.Parts().empty()) {
+    return Filled(strings.Text(OwnText::OldDatabaseRefused), {Lines(error.Parts(), strings)});
+  }
+  if (!error.Failure().empty()) {
+    return Filled(strings.Text(OwnText::OldDatabaseRefused), {error.Failure()});
+  }
+  return strings.Text(OwnText::OldDatabaseDamaged);
+}
+
+std::string LinesOf(const std::vector<NotTakenOver>& all, const StringTable& strings) {
+  return Lines(all, strings);
+}
 
 void ConvertOldDatabase(const UserDatabase& database, const DatabaseParts& parts) {
   Steps steps(database, parts);

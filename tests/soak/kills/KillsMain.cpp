@@ -65,7 +65,7 @@ class Soak {
     const WorkSources sources{std::filesystem::read_symlink("/proc/self/exe").parent_path(),
                               TESSARINE_OLD_FILES};
     for (auto* make : {MakeCommitWork, MakeMissionWork, MakePhotoWork, MakeGameFileWork, MakeConversionWork,
-                       MakeSheetWork, MakeRestoreWork, MakeKeepWork}) {
+                       MakeSheetWork, MakeRestoreWork, MakeKeepWork, MakeTakeOverSteps}) {
       if (std::unique_ptr<Work> work = make(sources);
           work && (options.Only.empty() || work->Name() == options.Only)) {
         jobs_.push_back({.Work = std::move(work)});

@@ -54,3 +54,4 @@ std::unique_ptr<Work> MakeConversionWork(const WorkSources& sources);
 std::unique_ptr<Work> MakeSheetWork(const WorkSources& sources);
 std::unique_ptr<Work> MakeRestoreWork(const WorkSources& sources);
 std::unique_ptr<Work> MakeKeepWork(const WorkSources& sources);
+std::unique_ptr<Work> MakeTakeOverSteps(const WorkSources& sources);

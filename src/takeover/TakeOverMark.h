@@ -1,0 +1,28 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "platform/Files.h"
+
+/// The folder, inside the data folder, where everything is made that takes the place of files there.
+std::string TakeOverFolder(const std::string& dataFolder);
+
+/// Declares files in that folder complete, by name: from now on each takes the place of the file of its name
+/// in the data folder, at once or at the program's next start. Durable on return. Throws RuntimeError as
+/// Files::Replace does; HasTakeOverMark then tells whether the mark stands.
+void MarkTakeOver(Files& disk, const std::string& dataFolder, const std::vector<std::string>& names);
+
+bool HasTakeOverMark(const Files& disk, const std::string& dataFolder);
+
+/// Finishes what was marked, file by file; to be called before any file of the data folder is opened or made.
+/// Returns false if there was nothing to finish. A failure leaves the mark, and the next call begins anew.
+/// Throws RuntimeError 321 if a marked file is not as it was, with nothing changed by this call; otherwise as
+/// the operations on files do.
+bool FinishTakeOver(Files& disk, const std::string& dataFolder);
+
+/// Takes the mark back. Throws RuntimeError if the mark may still stand.
+void WithdrawTakeOver(Files& disk, const std::string& dataFolder);
+
+/// Deletes what was made without ever being marked. What cannot be deleted stays.
+void ForgetTakeOver(Files& disk, const std::string& dataFolder);
