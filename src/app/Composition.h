@@ -10,6 +10,7 @@
 #include "core/text/StringTable.h"
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
+#include "platform/linux/LinuxAddresses.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/linux/LinuxPrograms.h"
 #include "platform/qt/DBusWakeLock.h"
@@ -87,4 +88,5 @@ class Composition {
                               "sound-recorder"};
   QtSoundPlayer soundPlayer_;
   SndfileConverter soundConverter_;
+  LinuxAddresses addresses_;
 };

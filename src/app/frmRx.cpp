@@ -60,6 +60,7 @@ bool frmRx::FormLoad() {
   SetUpDesk();
   SetUpKeeping();
   SetUpAudience();
+  SetUpResults();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
@@ -213,6 +214,8 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuAudienceBlank, &frmRx::BlankAudienceBoard},
                                {ui_->mnuGuestNames, &frmRx::EnterGuestNames},
                                {ui_->mnuAudienceSettings, &frmRx::ShowAudienceSettings},
+                               {ui_->mnuResultsPage, &frmRx::ShowResultsPage},
+                               {ui_->mnuHidePlayer, &frmRx::HideSelectedPlayer},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
   // menu.
@@ -255,6 +258,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
     charts_->Close();
   }
   if (audience_) {
+    results_->End();
     audience_->End();
   }
   session_.Close();

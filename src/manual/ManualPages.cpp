@@ -66,6 +66,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"BackupCopies", "Backup copies", "备份副本"},
       {"AudienceSettings", "Audience board", "观众大屏"},
       {"GuestNameEntry", "Audience board", "观众大屏"},
+      {"ResultsPage", "Results page", "成绩网页"},
       {"About", "If you need help", "需要帮助时"}};
   return pages;
 }

@@ -68,7 +68,9 @@ const std::vector<Menu> Menus = {
       {"mnuAudienceBlank", static_cast<int>(OwnText::AudienceBlankItem), "&Blank the Board", true},
       {"mnuGuestNames", static_cast<int>(OwnText::GuestNamesItem), "&Guest Names", true},
       {"mnuAudienceSettings", static_cast<int>(OwnText::AudienceSettingsItem), "Audience Board Se&ttings",
-       true}}},
+       true},
+      {"mnuResultsPage", static_cast<int>(OwnText::ResultsPageItem), "Results &Page", true},
+      {"mnuHidePlayer", static_cast<int>(OwnText::HidePlayerItem), "&Hide Selected Player", true}}},
     {{"mnuHelp", 217, "&Help", true},
      {{"mnuAbout", 218, "&About", true}, {"mnuManual", 524, "&Manual", true}}},
 };

@@ -26,6 +26,7 @@
 #include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
+#include "web/ResultsPage.h"
 
 namespace {
 
@@ -80,6 +81,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<AdminData>("mnuAdminData");
   LookAt<ExportGames>("mnuExport");
   LookAt<AudienceSettings>("mnuAudienceSettings");
+  LookAt<ResultsPage>("mnuResultsPage");
   LookAt<GuestNameEntry>("mnuGuestNames");
   LookAt<Scenarios>("mnuSetupMissions");
   LookAt<FirmwareFlash>("mnuFirmwareUpdate");
