@@ -8,11 +8,13 @@
 #include "app/SystemFacts.h"
 #include "core/data/FirstRun.h"
 #include "devices/buttons/ButtonSwipe.h"
+#include "platform/qt/QtPipedProgram.h"
 #include "platform/qt/UprightPicture.h"
 
 namespace {
 
-/// Folder of the word processor's module: beside the program, or where it is installed.
+/// Folder of the word processor's module and of the programs that this one starts: beside the program, or
+/// where it is installed.
 std::string ModuleFolder() {
   const QDir program(QCoreApplication::applicationDirPath());
   const bool isBuildTree = program.exists(QStringLiteral("tessarine-office-host"));
@@ -61,6 +63,9 @@ Composition::Composition()
           .SoundPort = loggedSoundPort_,
           .SoundPlayer = soundPlayer_,
           .SoundConverter = soundConverter_,
+          .Addresses = addresses_,
+          .MakePipedProgram = [] { return std::make_unique<QtPipedProgram>(); },
+          .ResultsProgram = ModuleFolder() + "/tessarine-results",
           .ButtonSwipe = [this] { return SwipeButton(); },
           .Wire = &wire_,
           .Archives = &archives_,

@@ -11,6 +11,7 @@
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
 #include "platform/linux/LinuxComputer.h"
+#include "platform/linux/LinuxAddresses.h"
 #include "platform/linux/LinuxFiles.h"
 #include "platform/linux/LinuxPrograms.h"
 #include "platform/qt/DBusWakeLock.h"
@@ -89,4 +90,5 @@ class Composition {
       "sound-recorder"};
   QtSoundPlayer soundPlayer_;
   SndfileConverter soundConverter_;
+  LinuxAddresses addresses_;
 };

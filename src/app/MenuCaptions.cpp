@@ -58,6 +58,8 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuAudienceBlank, static_cast<int>(OwnText::AudienceBlankItem)},
       {ui.mnuGuestNames, static_cast<int>(OwnText::GuestNamesItem)},
       {ui.mnuAudienceSettings, static_cast<int>(OwnText::AudienceSettingsItem)},
+      {ui.mnuResultsPage, static_cast<int>(OwnText::ResultsPageItem)},
+      {ui.mnuHidePlayer, static_cast<int>(OwnText::HidePlayerItem)},
       {ui.mnuHelp->menuAction(), 217},
       {ui.mnuAbout, 218},
       {ui.mnuManual, static_cast<int>(OwnText::ManualTitle)},

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <functional>
+#include <memory>
 #include <string>
 
 #include "core/text/StringTable.h"
@@ -11,10 +12,12 @@
 #include "platform/FileDialog.h"
 #include "platform/Files.h"
 #include "platform/Folders.h"
+#include "platform/LocalAddresses.h"
 #include "platform/MessageBoxes.h"
 #include "platform/MonotonicClock.h"
 #include "platform/OldDatabases.h"
 #include "platform/OneWire.h"
+#include "platform/PipedProgram.h"
 #include "platform/Programs.h"
 #include "platform/SerialDevices.h"
 #include "platform/SerialPort.h"
@@ -45,6 +48,10 @@ struct Services {
   SerialPort& SoundPort;  ///< the sound recorder's own, on the device of the settings
   ::SoundPlayer& SoundPlayer;
   const ::SoundConverter& SoundConverter;
+  const LocalAddresses& Addresses;
+  /// Makes a program that is started and heard later.
+  std::function<std::unique_ptr<PipedProgram>()> MakePipedProgram;
+  std::string ResultsProgram;  ///< path of the one that serves the results page
   /// Waits for a membership button and returns its number, or NoDallasId. Empty if there is no reader.
   std::function<std::string()> ButtonSwipe = {};
   /// The bus behind the reader; null if there is none.

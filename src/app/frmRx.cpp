@@ -82,6 +82,7 @@ bool frmRx::FormLoad() {
                                           .Busy = [this] { return downloading_ || IsBusy(); },
                                           .Elapsed = services_.Elapsed});
   TellNewVersion();
+  SetUpResults();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
   connect(&wordProcessorTimer_, &QTimer::timeout, this,
@@ -252,6 +253,8 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuAudienceBlank, &frmRx::BlankAudienceBoard},
                                {ui_->mnuGuestNames, &frmRx::EnterGuestNames},
                                {ui_->mnuAudienceSettings, &frmRx::ShowAudienceSettings},
+                               {ui_->mnuResultsPage, &frmRx::ShowResultsPage},
+                               {ui_->mnuHidePlayer, &frmRx::HideSelectedPlayer},
                            });
   // In the menu bar, but never shown there: otherwise screen readers cannot find the items of an open context
   // menu.
@@ -296,6 +299,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
     charts_->Close();
   }
   if (audience_) {
+    results_->End();
     audience_->End();
   }
   session_.Close();

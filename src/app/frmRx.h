@@ -21,6 +21,7 @@
 #include "audience/AudienceCopy.h"
 #include "core/data/IniReader.h"
 #include "core/game/GuestList.h"
+#include "core/game/HiddenNames.h"
 #include "core/game/Session.h"
 #include "core/gamefile/CurrentGameFile.h"
 #include "core/line/CommPort.h"
@@ -32,6 +33,7 @@
 #include "takeover/TakeOverWork.h"
 #include "ui/Commands.h"
 #include "ui/WindowPlaces.h"
+#include "web/ResultsHost.h"
 
 class QAction;
 
@@ -178,6 +180,15 @@ class frmRx : public QMainWindow {
   /// Shows whether the board is on, and a small copy of it.
   void FollowAudienceBoard();
 
+  // The page for phones.
+  void SetUpResults();
+  NickNames NickNamesOfSession();
+  /// Names were hidden or shown again.
+  void ShowOtherNames();
+  void ShowResultsPage();
+  void PrintResultsPoster(const std::string& url);
+  void HideSelectedPlayer();
+
   // What the board and the windows remember of the last run.
   void RestorePlaces();
   void ConnectLetters();
@@ -210,6 +221,8 @@ class frmRx : public QMainWindow {
   std::optional<IdleCopying> idleCopying_;
   std::optional<BoardCharts> charts_;
   GuestList guests_;
+  std::optional<HiddenNames> hidden_;
   std::optional<AudienceBoard> audience_;
+  std::optional<ResultsHost> results_;
   ManualKey manual_;
 };

@@ -10,14 +10,17 @@
 #include "ui_frmRx.h"
 
 void frmRx::SetUpAudience() {
-  audience_.emplace(AudienceBoard::Parts{.Session = session_,
-                                         .Guests = guests_,
-                                         .Strings = services_.Strings,
-                                         .Ini = *ini_,
-                                         .StateIni = *state_,
-                                         .Awake = services_.Awake,
-                                         .Disk = services_.Disk,
-                                         .Operator = *this});
+  hidden_.emplace(services_.Disk, userDataFolder_ + "/hidden-names.txt");
+  audience_.emplace(AudienceBoard::Parts{
+      .Session = session_,
+      .Guests = guests_,
+      .Strings = services_.Strings,
+      .Ini = *ini_,
+      .StateIni = *state_,
+      .Awake = services_.Awake,
+      .Disk = services_.Disk,
+      .Operator = *this,
+      .NameShown = [this](const NameHolder& holder) { return results_->NameOnBoard(holder); }});
   audience_->setParent(this);
   connect(&*audience_, &AudienceBoard::Switched, this, &frmRx::FollowAudienceBoard);
   // Not before this window is shown.
@@ -64,6 +67,7 @@ void frmRx::EnterGuestNames() {
   GuestNameEntry window(session_.Game(), guests_, services_.Strings, this);
   if (window.exec() == QDialog::Accepted) {
     audience_->SetGuests(window.Names());
+    results_->ShowOtherNames();
   }
 }
 

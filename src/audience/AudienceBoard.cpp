@@ -39,13 +39,11 @@ QImage PictureAt(const std::string& path, const Files& disk) {
 AudienceBoard::AudienceBoard(const Parts& parts)
     : parts_(parts),
       setup_(ReadAudienceSetup(parts.Ini)),
-      state_(
-          [this] {
-            return parts_.Session.Game().DataPresent
-                       ? ResultsOf(parts_.Session, [this](int index) { return parts_.Guests.NameOf(index); })
-                       : AudienceResults();
-          },
-          [this] { stage_.Begin(); }),
+      state_([this] { return Results(); },
+             [this] {
+               stage_.Begin();
+               emit Changed();
+             }),
       stage_(state_, parts.Strings),
       subscription_(parts.Session.Listen([this](SessionChange change) { Hear(change); })) {
   state_.SetFollows(setup_.Follows);
@@ -57,6 +55,20 @@ AudienceBoard::AudienceBoard(const Parts& parts)
   for (QScreen* screen : QGuiApplication::screens()) {
     Watch(*screen);
   }
+}
+
+AudienceResults AudienceBoard::Results() const {
+  if (!parts_.Session.Game().DataPresent) {
+    return {};
+  }
+  AudienceResults results =
+      ResultsOf(parts_.Session, [this](int index) { return parts_.Guests.NameOf(index); });
+  ShowNames(results, parts_.NameShown);
+  return results;
+}
+
+void AudienceBoard::ShowOtherNames() {
+  state_.ChangeResults([this](AudienceResults& results) { ShowNames(results, parts_.NameShown); });
 }
 
 void AudienceBoard::Hear(SessionChange change) {

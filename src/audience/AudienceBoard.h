@@ -30,6 +30,8 @@ class AudienceBoard : public QObject {
     WakeLock& Awake;
     Files& Disk;
     QWidget& Operator;  ///< the main window, whose screen is never covered
+    /// The name to show for a holder; empty for the gun.
+    std::function<std::string(const NameHolder&)> NameShown;
   };
 
   explicit AudienceBoard(const Parts& parts);
@@ -49,6 +51,9 @@ class AudienceBoard : public QObject {
 
   void SetGuests(GuestList::Names names);
 
+  /// Other names are to be shown, whichever game is on the board.
+  void ShowOtherNames();
+
   const AudienceSetup& Setup() const { return setup_; }
   /// Writes what has changed, and shows it.
   void SetSetup(const AudienceSetup& setup);
@@ -60,7 +65,11 @@ class AudienceBoard : public QObject {
   /// The board was switched, or begins or ends to wait for its screen.
   void Switched();
 
+  /// It shows something else.
+  void Changed();
+
  private:
+  AudienceResults Results() const;
   void Hear(SessionChange change);
   void TurnOn(bool takesFocus);
   void TurnOff();

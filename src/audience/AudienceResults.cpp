@@ -9,15 +9,15 @@
 
 namespace {
 
-std::vector<Standing> StandingsOf(Session& session, const GuestNames& guests) {
+/// Players by their guns, with what else they may be called.
+void PutPlayers(AudienceResults& results, Session& session, const NickNames& nickNames,
+                const GuestNames& guests) {
   const Game& game = session.Game();
-  try {
-    const ReadScope scope(session.DbMembers());
-    return Standings(
-        game, [&session](std::int32_t contactId) { return session.Members().NickNameOf(contactId); }, guests);
-  } catch (const RuntimeError&) {
-    return Standings(
-        game, [](std::int32_t) { return std::string(); }, guests);
+  results.Players = Standings(game, [](std::int32_t) { return std::string(); });
+  results.Names.clear();
+  for (const Standing& player : results.Players) {
+    results.Names.push_back(
+        {.Holder = HolderOf(game, player.Index, nickNames, guests), .Gun = GunName(game, player.Index)});
   }
 }
 
@@ -28,7 +28,18 @@ AudienceResults ResultsOf(Session& session, const GuestNames& guests) {
   AudienceResults results;
   results.Mission = session.MissionIsActive() ? session.Missions().Text() : std::string();
   results.Time = game.GameDate;
-  results.Players = StandingsOf(session, guests);
+  try {
+    const ReadScope scope(session.DbMembers());
+    PutPlayers(
+        results, session,
+        [&session](std::int32_t contactId) { return session.Members().NickNameOf(contactId); }, guests);
+  } catch (const RuntimeError&) {
+    PutPlayers(
+        results, session, [](std::int32_t) { return std::string(); }, guests);
+  }
+  ShowNames(results, [](const NameHolder& holder) {
+    return holder.NickName.empty() ? holder.GuestName : holder.NickName;
+  });
   std::array<bool, TeamCount> present{};
   for (const Standing& player : results.Players) {
     present.at(static_cast<std::size_t>(player.Team - 1)) = true;
@@ -40,6 +51,14 @@ AudienceResults ResultsOf(Session& session, const GuestNames& guests) {
   }
   std::ranges::stable_sort(results.Totals, std::greater(), &AudienceTotal::Points);
   return results;
+}
+
+void ShowNames(AudienceResults& results, const std::function<std::string(const NameHolder&)>& nameShown) {
+  for (std::size_t at = 0; at < results.Names.size(); ++at) {
+    const AudienceName& name = results.Names[at];
+    const std::string shown = nameShown(name.Holder);
+    results.Players.at(at).PublicName = shown.empty() ? name.Gun : shown;
+  }
 }
 
 std::string TeamLetter(const StringTable& strings, int team) {

@@ -113,8 +113,8 @@ void AudienceStage::PaintTurn(QPainter& painter) const {
       break;
     }
     case AudienceView::Phone:
-      AudienceViews::PaintMessage(painter, place_, Text(strings_, OwnText::AudiencePhone),
-                                  QString::fromStdString(state_.Address()));
+      AudienceViews::PaintCode(painter, place_, Text(strings_, OwnText::AudiencePhone),
+                               QString::fromStdString(state_.Address()));
       break;
     case AudienceView::Blank:
       break;

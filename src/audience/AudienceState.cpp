@@ -75,6 +75,11 @@ void AudienceState::Take() {
   }
 }
 
+void AudienceState::ChangeResults(const std::function<void(AudienceResults&)>& change) {
+  change(shown_);
+  Tell(View() == AudienceView::Results);
+}
+
 void AudienceState::ShowResults() {
   AudienceResults results = pulling_ ? AudienceResults() : make_();
   if (!results.IsEmpty()) {

@@ -43,6 +43,12 @@ class AudienceState {
   /// Its scores were calculated.
   void TellScored();
 
+  /// Changes what stands in the results that are shown, whichever game they are of.
+  void ChangeResults(const std::function<void(AudienceResults&)>& change);
+
+  /// True while the results of the game on the operator's board are there to be seen.
+  bool ShowsGameOfBoard() const { return isOn_ && isShown_ && View() == AudienceView::Results; }
+
   // What the operator chooses. Without a game ShowResults does nothing, and during a pull it shows the last
   // results.
   void ShowResults();

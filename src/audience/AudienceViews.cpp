@@ -4,6 +4,7 @@
 
 #include "audience/AudienceColours.h"
 #include "audience/AudienceText.h"
+#include "ui/QrCode.h"
 
 namespace {
 
@@ -46,6 +47,16 @@ void PaintMessage(QPainter& painter, const AudiencePlace& place, const QString& 
   DrawLarge(painter, Band(place, 0.1, 0.4), heading, mostOfBand);
   painter.setPen(AudienceColours::Letters());
   DrawLarge(painter, Band(place, 0.4, 0.9), message, mostOfBand);
+}
+
+void PaintCode(QPainter& painter, const AudiencePlace& place, const QString& heading,
+               const QString& address) {
+  constexpr double mostOfBand = 0.6;
+  painter.setPen(AudienceColours::QuietLetters());
+  DrawLarge(painter, Band(place, 0.01, 0.11), heading, mostOfBand);
+  PaintQrCode(painter, Band(place, 0.12, 0.86), address.toStdString());
+  painter.setPen(AudienceColours::Letters());
+  DrawLarge(painter, Band(place, 0.87, 0.99), address, mostOfBand);
 }
 
 }  // namespace AudienceViews

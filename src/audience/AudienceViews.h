@@ -17,4 +17,7 @@ void PaintVenue(QPainter& painter, const AudiencePlace& place, const QString& na
 void PaintMessage(QPainter& painter, const AudiencePlace& place, const QString& heading,
                   const QString& message);
 
+/// A heading, a QR code as large as the screen allows, and the address that it holds.
+void PaintCode(QPainter& painter, const AudiencePlace& place, const QString& heading, const QString& address);
+
 }  // namespace AudienceViews

@@ -72,6 +72,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"TakeOver", "Files from an old installation", "旧安装的文件"},
       {"AudienceSettings", "Audience board", "观众大屏"},
       {"GuestNameEntry", "Audience board", "观众大屏"},
+      {"ResultsPage", "Results page", "成绩网页"},
       {"About", "If you need help", "需要帮助时"}};
   return pages;
 }

@@ -80,6 +80,9 @@ void PageServer::Take(const PageReport& report) {
     Become(state);
     return;
   }
+  if (report.Kind != ReportKind::Port) {
+    return;
+  }
   state.Port = static_cast<std::uint16_t>(report.Number);
   if (state.Now != PageServing::Phase::Serving) {
     state.Now = PageServing::Phase::Serving;

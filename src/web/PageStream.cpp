@@ -43,6 +43,8 @@ bool InRange(char kind, std::uint32_t number) {
       return number >= 1 && number <= 65535;
     case ReportKind::Visitors:
       return number <= MostVisitors;
+    case ReportKind::Answer:
+      return number <= 1;
   }
   return false;
 }

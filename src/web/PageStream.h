@@ -7,7 +7,7 @@
 #include <string_view>
 
 /// The two streams between the program and the one that serves the pages. Down: orders with finished pages.
-/// Up: two numbers and nothing else.
+/// Up: numbers and nothing else.
 
 enum class PageOrder : char {
   Put = 'P',     ///< a page, new or in place of an old one
@@ -57,8 +57,9 @@ class PageFrameReader {
 };
 
 enum class ReportKind : char {
-  Port = 'P',     ///< the port on which the pages are served, 1 to 65535
-  Visitors = 'V'  ///< addresses that asked for something within the last minute, at most MostVisitors
+  Port = 'P',      ///< the port on which the pages are served, 1 to 65535
+  Visitors = 'V',  ///< addresses that asked for something within the last minute, at most MostVisitors
+  Answer = 'A'     ///< of a trial request: 1 if the pages were answered with, else 0
 };
 
 inline constexpr std::uint32_t MostVisitors = 4096;

@@ -30,6 +30,8 @@ PlayersByGun ByGun(const PublicGame& game) {
   return players;
 }
 
+constexpr const char* RankingName = "month";
+
 std::string InFolder(Language language, std::string_view path) {
   std::string whole = "/";
   whole += Code(language);
@@ -191,18 +193,24 @@ std::string OwnResults(const PublicPlayer& player, const PublicGame& game, const
   return page;
 }
 
+std::string RankingLink(Language language, const StringTable& texts) {
+  return Filled("<p><a class=wide href=\"%1\">%2</a></p>",
+                {InFolder(language, RankingName), Escaped(texts.Text(OwnText::RankingLink))});
+}
+
 }  // namespace
 
 std::string FrontPath(Language language) {
   return InFolder(language, {});
 }
 
-Page FrontPage(const PublicGame* newest, std::string_view token, Language language) {
+Page FrontPage(const PublicGame* newest, std::string_view token, Language language, bool hasRanking) {
   const StringTable& texts = PageParts::TextsOf(language);
-  const std::string main = newest != nullptr
-                               ? Board(*newest, InFolder(language, PageParts::FolderOf(*newest)), texts)
-                               : Filled("<h1>%1</h1><p>%2</p>", {Escaped(texts.Text(OwnText::ResultsTitle)),
-                                                                 Escaped(texts.Text(OwnText::NoGameYet))});
+  std::string main = newest != nullptr
+                         ? Board(*newest, InFolder(language, PageParts::FolderOf(*newest)), texts)
+                         : Filled("<h1>%1</h1><p>%2</p>", {Escaped(texts.Text(OwnText::ResultsTitle)),
+                                                           Escaped(texts.Text(OwnText::NoGameYet))});
+  main += hasRanking ? RankingLink(language, texts) : "";
   return {.Path = FrontPath(language),
           .Body = PageParts::Whole(
               {.Title = texts.Text(OwnText::ResultsTitle), .Path = {}, .Token = token, .Main = main}, texts)};
@@ -230,7 +238,7 @@ std::vector<Page> GamePages(const PublicGame& game, Language language) {
   return pages;
 }
 
-Page GamesPage(const std::vector<const PublicGame*>& games, Language language) {
+Page GamesPage(const std::vector<const PublicGame*>& games, Language language, bool hasRanking) {
   const StringTable& texts = PageParts::TextsOf(language);
   const std::string& title = texts.Text(OwnText::LastGames);
   std::string main = Filled("<h1>%1</h1>", {Escaped(title)});
@@ -240,8 +248,34 @@ Page GamesPage(const std::vector<const PublicGame*>& games, Language language) {
                    {PageParts::FolderOf(*game), Escaped(PageParts::TitleOf(*game, texts))});
   }
   main += games.empty() ? "" : "</ul>";
+  main += hasRanking ? RankingLink(language, texts) : "";
   return {.Path = InFolder(language, "games"),
           .Body = PageParts::Whole({.Title = title, .Path = "games", .Token = {}, .Main = main}, texts)};
+}
+
+Page RankingPage(const std::string& month, const std::vector<RankedLine>& lines, Language language) {
+  const StringTable& texts = PageParts::TextsOf(language);
+  const std::string title = Filled(texts.Text(OwnText::RankingOfMonth), {month});
+  std::string main = Filled("<h1>%1</h1>", {Escaped(title)});
+  if (lines.empty()) {
+    main += Filled("<p>%1</p>", {Escaped(texts.Text(OwnText::NobodyRanked))});
+  } else {
+    main +=
+        Filled("<table class=ranks><thead><tr><th>%1<th>%2<th>%3<th>%4<th>%5<th>%6</thead><tbody>",
+               {Escaped(texts.Text(103)), Escaped(texts.Text(104)), Escaped(texts.Text(OwnText::GamesPlayed)),
+                Escaped(texts.Text(105)), Escaped(texts.Text(OwnText::BestGame)), Escaped(texts.Text(106))});
+    for (const RankedLine& line : lines) {
+      const auto accuracy =
+          line.Accuracy ? std::optional(static_cast<float>(*line.Accuracy)) : std::optional<float>();
+      main +=
+          Filled("<tr><td>%1<td>%2<td>%3<td>%4<td>%5<td>%6\n",
+                 {std::to_string(line.Place), Isolated(line.Name), std::to_string(line.Games),
+                  std::to_string(line.Soldiering), std::to_string(line.Best), PageParts::Percent(accuracy)});
+    }
+    main += "</tbody></table>";
+  }
+  return {.Path = InFolder(language, RankingName),
+          .Body = PageParts::Whole({.Title = title, .Path = RankingName, .Token = {}, .Main = main}, texts)};
 }
 
 Page MissingPage(Language language) {

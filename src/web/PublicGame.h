@@ -17,6 +17,8 @@
 struct PublicHit {
   int Gun = 0;              ///< record of the gun, 1 to 224
   std::int32_t Amount = 0;  ///< above 0
+
+  bool operator==(const PublicHit&) const = default;
 };
 
 struct PublicPlayer {
@@ -33,6 +35,8 @@ struct PublicPlayer {
   std::int32_t AmmoAdds = 0;
   std::vector<PublicHit> HitsGiven = {};  ///< most damage first
   std::vector<PublicHit> HitsTaken = {};
+
+  bool operator==(const PublicPlayer&) const = default;
 };
 
 struct PublicGame {
@@ -40,6 +44,8 @@ struct PublicGame {
   std::string Time = {};  ///< when it was played, as the pages show it
   std::vector<PublicPlayer> Players = {};
   std::array<std::int64_t, TeamCount> TeamTotals{};  ///< sums of soldiering; index 0 is team 1
+
+  bool operator==(const PublicGame&) const = default;
 };
 
 /// Which names a page may show.

@@ -46,6 +46,24 @@ void ResultsPages::Prune(std::chrono::microseconds now) {
   }
 }
 
+void ResultsPages::SetGames(std::size_t most) {
+  limits_.Games = most;
+  DropBeyondLimits();
+  RenderCommon();
+}
+
+void ResultsPages::SetRanking(const std::optional<MonthRanking>& ranking) {
+  for (const Language language : PageLanguages) {
+    if (ranking) {
+      PutPage(RankingPage(ranking->Month, ranking->Lines, language));
+    } else if (ranking_) {
+      RemovePage(RankingPage({}, {}, language).Path);
+    }
+  }
+  ranking_ = ranking;
+  RenderCommon();
+}
+
 std::vector<PageFrame> ResultsPages::TakeChanges() {
   std::vector<PageFrame> frames;
   for (const auto& [path, order] : changes_) {
@@ -128,12 +146,12 @@ void ResultsPages::RenderCommon() {
                  [](const Entry& entry) { return &entry.Game; });
   Page token = TokenPage(newest);
   for (const Language language : PageLanguages) {
-    Page front = FrontPage(newest, token.Body, language);
+    Page front = FrontPage(newest, token.Body, language, ranking_.has_value());
     if (language == language_) {
       PutPage({.Path = "/", .Body = front.Body});
     }
     PutPage(std::move(front));
-    PutPage(GamesPage(newestFirst, language));
+    PutPage(GamesPage(newestFirst, language, ranking_.has_value()));
   }
   PutPage(std::move(token));
 }

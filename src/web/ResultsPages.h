@@ -3,6 +3,7 @@
 #include <chrono>
 #include <cstddef>
 #include <map>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -29,6 +30,16 @@ class ResultsPages {
 
   /// Drops the games that have become too old.
   void Prune(std::chrono::microseconds now);
+
+  /// From now on so many games at most are shown; those that are dropped do not come back by themselves.
+  void SetGames(std::size_t most);
+
+  /// Shows the ranking of a month, or none.
+  struct MonthRanking {
+    std::string Month;  ///< "2026-11"
+    std::vector<RankedLine> Lines;
+  };
+  void SetRanking(const std::optional<MonthRanking>& ranking);
 
   /// Orders that make the served pages those of now, if they were those of the last call; empty if nothing
   /// has changed.
@@ -58,6 +69,7 @@ class ResultsPages {
   Language language_;
   Limits limits_;
   std::vector<Entry> games_;  ///< by number
+  std::optional<MonthRanking> ranking_;
   std::map<std::string, std::string> pages_;
   std::map<std::string, PageOrder> changes_;  ///< by path
 };

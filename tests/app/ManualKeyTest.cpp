@@ -79,6 +79,7 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
       {"mnuGuestNames", {"Audience board", "观众大屏"}},
       {"mnuAudienceSettings", {"Audience board", "观众大屏"}},
       {"mnuSystemCheck", {"System check", "系统检查"}},
+      {"mnuResultsPage", {"Results page", "成绩网页"}},
       {"mnuAbout", {"If you need help", "需要帮助时"}}};
   for (const auto& [item, page] : windows) {
     ExpectPage([this, item = item] { venue.Trigger(item); }, page);

@@ -32,6 +32,7 @@
 #include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
+#include "web/ResultsPage.h"
 
 namespace {
 
@@ -89,6 +90,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<RankingWindow>("mnuRankings");
   LookAt<ImportGames>("mnuImportGames");
   LookAt<AudienceSettings>("mnuAudienceSettings");
+  LookAt<ResultsPage>("mnuResultsPage");
   LookAt<GuestNameEntry>("mnuGuestNames");
   LookAt<Scenarios>("mnuSetupMissions");
   LookAt<FirmwareFlash>("mnuFirmwareUpdate");

@@ -1,6 +1,9 @@
 #pragma once
 
+#include <cstddef>
+#include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "platform/PipedProgram.h"
@@ -37,4 +40,36 @@ class FakePipedProgram : public PipedProgram {
     Running = false;
     OnEnd();
   }
+};
+
+/// Programs that a test plays, in the order in which they are asked for. Each may go while the test goes on.
+class FakePipedPrograms {
+ public:
+  std::unique_ptr<PipedProgram> Make() {
+    auto made = std::make_unique<Owned>();
+    made->Owner = this;
+    live_.push_back(made.get());
+    ++Made;
+    return made;
+  }
+
+  /// How many there have been.
+  int Made = 0;
+
+  /// How many there are now.
+  std::size_t Live() const { return live_.size(); }
+
+  /// One of those that there are now, counted from 0.
+  FakePipedProgram& At(std::size_t index) { return *live_.at(index); }
+
+ private:
+  struct Owned : FakePipedProgram {
+    FakePipedPrograms* Owner = nullptr;
+    ~Owned() override { std::erase(Owner->live_, this); }
+    Owned() = default;
+    Owned(const Owned&) = delete;
+    Owned& operator=(const Owned&) = delete;
+  };
+
+  std::vector<FakePipedProgram*> live_;
 };

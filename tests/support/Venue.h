@@ -20,7 +20,9 @@
 #include "tests/fakes/FakeComputer.h"
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFolders.h"
+#include "tests/fakes/FakeLocalAddresses.h"
 #include "tests/fakes/FakeOneWire.h"
+#include "tests/fakes/FakePipedProgram.h"
 #include "tests/fakes/FakePrograms.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/fakes/FakeSerialPort.h"
@@ -69,6 +71,9 @@ class Venue : public DataSite {
                                                 .SoundPort = SoundPort,
                                                 .SoundPlayer = Player,
                                                 .SoundConverter = Converter,
+                                                .Addresses = Addresses,
+                                                .MakePipedProgram = MakePiped,
+                                                .ResultsProgram = ResultsProgram,
                                                 .ButtonSwipe = ButtonSwipe,
                                                 .Wire = HasReader ? &Wire : nullptr,
                                                 .Computer = &Computer,
@@ -165,6 +170,10 @@ class Venue : public DataSite {
   FakeSoundPlayer Player{Events};
   FakeSoundConverter Converter;
   FakeWordProcessor Word;
+  FakeLocalAddresses Addresses;
+  FakePipedPrograms Piped;
+  std::function<std::unique_ptr<PipedProgram>()> MakePiped = [this] { return Piped.Make(); };
+  std::string ResultsProgram = "/bin/results";
   FakePrograms Started;
   std::unique_ptr<frmRx> Window;
 

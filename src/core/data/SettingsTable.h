@@ -68,6 +68,20 @@ inline constexpr Setting YearsToKeepGames = {
     "archive", "keep_years", "",
     "Years for which past games are kept; without it, for good. The program asks before it deletes the first "
     "ones."};
+inline constexpr Setting ResultsOn = {"results", "on", "0", "1: results are on a page for phones."};
+inline constexpr Setting ResultsAddress = {"results", "address", "",
+                                           "Address at which it is; without it, that of the default route."};
+inline constexpr Setting ResultsPort = {"results", "port", "8080",
+                                        "Port, 1024 to 65535; where it is taken, the next free one."};
+inline constexpr Setting ResultsNames = {
+    "results", "names", "board",
+    "Nicknames and guest names: board: on the audience board; all: also on the page; none: guns only."};
+inline constexpr Setting ResultsGames = {"results", "games", "10",
+                                         "How many of the evening's last games it shows, 1 to 30."};
+inline constexpr Setting ResultsWithBoard = {
+    "results", "with_board", "0", "1: a new game appears once the audience board shows it; 0: at once."};
+inline constexpr Setting ResultsRanking = {"results", "ranking", "0",
+                                           "1: the month's ranking is on the page, if names are."};
 
 }  // namespace Keys
 
@@ -93,4 +107,11 @@ inline constexpr std::array AllSettings = {Keys::CommPort,
                                            Keys::AudienceVenue,
                                            Keys::AudiencePicture,
                                            Keys::AudienceFollow,
-                                           Keys::YearsToKeepGames};
+                                           Keys::YearsToKeepGames,
+                                           Keys::ResultsOn,
+                                           Keys::ResultsAddress,
+                                           Keys::ResultsPort,
+                                           Keys::ResultsNames,
+                                           Keys::ResultsGames,
+                                           Keys::ResultsWithBoard,
+                                           Keys::ResultsRanking};

@@ -20,6 +20,7 @@ struct RequestHead {
   int Hosts = 0;
   std::string_view Known;
   bool HasBody = false;
+  bool IsTrial = false;  ///< asks for no page: a trial request of the program's own, or what does as that
 };
 
 MHD_Result ReadHead(void* cls, MHD_ValueKind /*kind*/, const char* key, const char* value) {
@@ -98,7 +99,8 @@ class PageHost::Daemon {
     RequestHead head;
     MHD_get_connection_values(connection, MHD_HEADER_KIND, &ReadHead, &head);
     const std::string_view asked = method;
-    const bool reads = asked == MHD_HTTP_METHOD_GET || asked == MHD_HTTP_METHOD_HEAD;
+    head.IsTrial = asked == MHD_HTTP_METHOD_HEAD;
+    const bool reads = asked == MHD_HTTP_METHOD_GET || head.IsTrial;
     // An answer to the first call, when only the head was read, ends the connection: right for those who want
     // to send something, but phones shall keep theirs.
     if (reads && !head.HasBody && *request == nullptr) {
@@ -112,7 +114,9 @@ class PageHost::Daemon {
   Answers::Choice Choose(MHD_Connection* connection, std::string_view path, bool reads,
                          const RequestHead& head) {
     const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
-    visitors_.Note(AddressKey(*info->client_addr), std::chrono::steady_clock::now());
+    if (!head.IsTrial) {
+      visitors_.Note(AddressKey(*info->client_addr), std::chrono::steady_clock::now());
+    }
     const bool ours = head.Hosts == 1 && std::ranges::any_of(hosts_, [&head](const std::string& host) {
                         return SameHost(head.Host, host);
                       });

@@ -5,10 +5,12 @@
 #include <cstdint>
 #include <cstdio>
 #include <optional>
+#include <string>
 #include <string_view>
 
 #include "web/server/Confinement.h"
 #include "web/server/ServerLoop.h"
+#include "web/server/TrialRequest.h"
 
 namespace {
 
@@ -38,10 +40,24 @@ ServerEnd Serve(const ServedAddress& wanted) {
   return loop.Run(socket.Served.Port);
 }
 
+/// Reports whether the pages are answered with there.
+int Ask(const ServedAddress& served) {
+  constexpr unsigned longestSeconds = 10;  // whatever happens, nobody finds it hanging
+  alarm(longestSeconds);
+  const std::string bytes =
+      EncodeReport({.Kind = ReportKind::Answer, .Number = IsAnswered(served) ? 1U : 0U});
+  return write(STDOUT_FILENO, bytes.data(), bytes.size()) == static_cast<ssize_t>(bytes.size()) ? 0 : 1;
+}
+
 }  // namespace
 
 /// tessarine-results ADDRESS PORT: serves the pages that come at standard input.
+/// tessarine-results --ask ADDRESS PORT: reports whether pages are served there.
 int main(int argc, char** argv) {
+  if (argc == 4 && std::string_view(argv[1]) == "--ask") {
+    const auto asked = PortIn(argv[3]);
+    return asked ? Ask({.Address = argv[2], .Port = *asked}) : static_cast<int>(ServerEnd::BadWords);
+  }
   const auto port = argc == 3 ? PortIn(argv[2]) : std::nullopt;
   if (!port) {
     std::fputs("usage: tessarine-results ADDRESS PORT\nStarted by Tessarine; serves the pages it is given.\n",

@@ -1,0 +1,315 @@
+#include "web/ResultsHost.h"
+
+#include <charconv>
+#include <utility>
+#include <vector>
+
+#include "platform/RuntimeError.h"
+#include "web/PageAddress.h"
+
+using namespace std::chrono_literals;
+
+namespace {
+
+constexpr std::chrono::milliseconds LookEvery = 5s;
+constexpr int LooksToRequest = 6;  ///< as long as requests are answered
+constexpr int LooksToRanking = 12;
+
+/// A local time "YYYY-MM-DD HH:MM:SS", as if there were one time for all; none for another text.
+std::optional<std::chrono::sys_seconds> TimeIn(const std::string& text) {
+  constexpr std::size_t length = 19;
+  if (text.size() != length) {
+    return std::nullopt;
+  }
+  const auto number = [&text](std::size_t at, std::size_t count) {
+    int value = 0;
+    const auto [end, fault] = std::from_chars(text.data() + at, text.data() + at + count, value);
+    return fault == std::errc() && end == text.data() + at + count ? value : -1;
+  };
+  const std::chrono::year_month_day day{std::chrono::year(number(0, 4)),
+                                        std::chrono::month(static_cast<unsigned>(number(5, 2))),
+                                        std::chrono::day(static_cast<unsigned>(number(8, 2)))};
+  if (!day.ok() || number(11, 2) < 0 || number(14, 2) < 0 || number(17, 2) < 0) {
+    return std::nullopt;
+  }
+  return std::chrono::sys_days(day) + std::chrono::hours(number(11, 2)) +
+         std::chrono::minutes(number(14, 2)) + std::chrono::seconds(number(17, 2));
+}
+
+std::string HoursAndMinutes(const std::string& stamp) {
+  constexpr std::size_t at = 11;
+  constexpr std::size_t length = 5;
+  return stamp.size() >= at + length ? stamp.substr(at, length) : std::string();
+}
+
+}  // namespace
+
+struct ResultsHost::Running {
+  explicit Running(const Parts& parts)
+      : Program(parts.MakeProgram()),
+        Asker(parts.MakeProgram()),
+        Pages(parts.Strings.TextLanguage()),
+        Server(*Program, parts.Elapsed, Pages, parts.Path),
+        Probe(*Asker, parts.Path) {}
+
+  std::unique_ptr<PipedProgram> Program;
+  std::unique_ptr<PipedProgram> Asker;
+  ResultsPages Pages;
+  PageServer Server;
+  PageProbe Probe;
+  EveningGames Evening;
+  std::string Address;  ///< at which the pages are to be served; empty for none
+  std::uint16_t AskedPort = 0;
+  int Looks = 0;
+  QTimer Timer;
+};
+
+ResultsHost::ResultsHost(const Parts& parts)
+    : parts_(parts),
+      setup_(ReadPageSetup(parts.Ini)),
+      subscription_(parts.Session.Listen([this](SessionChange change) { Hear(change); })) {}
+
+ResultsHost::~ResultsHost() = default;
+
+void ResultsHost::Begin() {
+  if (setup_.On && !IsOn()) {
+    TurnOn();
+  }
+}
+
+void ResultsHost::End() {
+  subscription_.End();
+  running_.reset();
+}
+
+void ResultsHost::SetSetup(const PageSetup& setup) {
+  WritePageSetup(parts_.Ini, setup_, setup);
+  const PageSetup before = std::exchange(setup_, setup);
+  if (setup.On && !IsOn()) {
+    TurnOn();
+  } else if (!setup.On && IsOn()) {
+    TurnOff();
+  } else if (IsOn()) {
+    if (setup.Address != before.Address || setup.Port != before.Port) {
+      ServeAt(AddressToServe(parts_.Addresses.Private(), setup.Address));
+    }
+    running_->Pages.SetGames(static_cast<std::size_t>(setup.Games));
+    Publish(false);
+    PutAll();
+  }
+  if (setup.Names != before.Names) {
+    emit NamesChanged();
+  }
+  emit Changed();
+}
+
+std::string ResultsHost::NameOnBoard(const NameHolder& holder) const {
+  return setup_.Names != NamesShown::Nowhere ? parts_.Hidden.NameShown(holder) : std::string();
+}
+
+std::string ResultsHost::NameOnPage(const NameHolder& holder) const {
+  return setup_.Names == NamesShown::OnBoardAndPage ? parts_.Hidden.NameShown(holder) : std::string();
+}
+
+void ResultsHost::ShowOtherNames() {
+  if (IsOn()) {
+    TakeGame();
+    PutAll();
+  }
+}
+
+void ResultsHost::Follow() {
+  if (IsOn()) {
+    Publish(false);
+  }
+}
+
+PageServing ResultsHost::Serving() const {
+  return IsOn() ? running_->Server.State() : PageServing();
+}
+
+std::string ResultsHost::Address() const {
+  return IsOn() ? running_->Address : std::string();
+}
+
+std::string ResultsHost::Url() const {
+  const bool isThere = IsOn() && Serving().Now == PageServing::Phase::Serving && running_->Probe.Answered();
+  return isThere ? UrlOfPages(running_->Address, Serving().Port) : std::string();
+}
+
+void ResultsHost::TurnOn() {
+  running_ = std::make_unique<Running>(parts_);
+  running_->Pages.SetGames(static_cast<std::size_t>(setup_.Games));
+  running_->Server.OnChange = [this] { HearServer(); };
+  running_->Probe.OnChange = [this] { emit Changed(); };
+  TakeGame();
+  PutRanking();
+  ServeWhereItBelongs();
+  connect(&running_->Timer, &QTimer::timeout, this, &ResultsHost::Look);
+  running_->Timer.start(LookEvery);
+}
+
+void ResultsHost::TurnOff() {
+  const std::unique_ptr<Running> gone = std::move(running_);
+  gone->Server.OnChange = nullptr;
+  gone->Probe.OnChange = nullptr;
+}
+
+void ResultsHost::HearServer() {
+  const PageServing state = Serving();
+  const std::uint16_t port = state.Now == PageServing::Phase::Serving ? state.Port : std::uint16_t{0};
+  if (std::exchange(running_->AskedPort, port) != port) {
+    if (port != 0) {
+      running_->Probe.Ask(running_->Address, port);
+    } else {
+      running_->Probe.Forget();
+    }
+  }
+  emit Changed();
+}
+
+void ResultsHost::ServeWhereItBelongs() {
+  const std::string address = AddressToServe(parts_.Addresses.Private(), setup_.Address);
+  if (address != running_->Address) {
+    ServeAt(address);
+  }
+}
+
+void ResultsHost::ServeAt(const std::string& address) {
+  running_->Address = address;
+  running_->AskedPort = 0;
+  running_->Probe.Forget();
+  if (address.empty()) {
+    running_->Server.SwitchOff();
+  } else {
+    running_->Server.SwitchOn(address, setup_.Port);
+  }
+  emit Changed();
+}
+
+void ResultsHost::Look() {
+  if (!IsOn()) {
+    return;
+  }
+  ++running_->Looks;
+  const std::chrono::microseconds now = parts_.Elapsed.Elapsed();
+  running_->Evening.Prune(now);
+  running_->Pages.Prune(now);
+  if (running_->Looks % LooksToRanking == 0) {
+    PutRanking();
+  }
+  running_->Server.Update();
+  ServeWhereItBelongs();
+  const bool isDue = running_->Looks % LooksToRequest == 0 || !running_->Probe.Answered();
+  if (isDue && running_->AskedPort != 0) {
+    running_->Probe.Ask(running_->Address, running_->AskedPort);
+  }
+}
+
+void ResultsHost::Hear(SessionChange change) {
+  switch (change) {
+    case SessionChange::Cleared:
+      isLoaded_ = false;
+      if (IsOn()) {
+        running_->Evening.ForgetBoard();
+      }
+      break;
+    case SessionChange::Loaded:
+      isLoaded_ = true;
+      break;
+    case SessionChange::Scores:
+      if (IsOn()) {
+        TakeGame();
+      }
+      break;
+    default:
+      break;
+  }
+}
+
+std::optional<ResultsHost::Moment> ResultsHost::Played() const {
+  const std::string now = parts_.Time.Now();
+  const std::string stamp = parts_.Time.Stamp(parts_.Session.Game().GameDate);
+  const auto nowTime = TimeIn(now);
+  const auto stampTime = TimeIn(stamp);
+  if (nowTime && stampTime && *nowTime - *stampTime < EveningGames::Age &&
+      *stampTime - *nowTime < EveningGames::Age) {
+    return Moment{parts_.Elapsed.Elapsed() - (*nowTime - *stampTime), HoursAndMinutes(stamp)};
+  }
+  return isLoaded_ ? std::nullopt : std::optional(Moment{parts_.Elapsed.Elapsed(), HoursAndMinutes(now)});
+}
+
+void ResultsHost::TakeGame() {
+  Session& session = parts_.Session;
+  const auto played = Played();
+  if (!session.Game().DataPresent || parts_.Pulling() || !played) {
+    return;
+  }
+  const auto take = [&](const NickNames& nickNames) {
+    return running_->Evening.Take({.Game = session.Game(),
+                                   .Time = played->Text,
+                                   .Played = played->Since,
+                                   .OfMembers = nickNames,
+                                   .OfGuests = [this](int index) { return parts_.Guests.NameOf(index); }});
+  };
+  bool isNew = false;
+  try {
+    const ReadScope scope(session.DbMembers());
+    isNew = take([&session](std::int32_t contactId) { return session.Members().NickNameOf(contactId); });
+  } catch (const RuntimeError&) {  // their guns are known all the same
+    isNew = take([](std::int32_t) { return std::string(); });
+  }
+  Publish(isNew);
+}
+
+void ResultsHost::Publish(bool hasChanged) {
+  const auto found = running_->Evening.All().find(running_->Evening.OnBoard());
+  if (found == running_->Evening.All().end()) {
+    return;
+  }
+  EveningGame& game = found->second;
+  if (!game.IsPublic && setup_.WithBoard && parts_.AwaitsBoard()) {
+    return;
+  }
+  const bool appears = !std::exchange(game.IsPublic, true);
+  if (appears || hasChanged) {
+    Put(game);
+    running_->Server.Update();
+  }
+}
+
+void ResultsHost::Put(const EveningGame& game) {
+  running_->Pages.Put(PublicGameOf(game, [this](const NameHolder& holder) { return NameOnPage(holder); }),
+                      game.Since);
+}
+
+void ResultsHost::PutAll() {
+  std::vector<const EveningGame*> games;
+  for (const auto& [number, game] : running_->Evening.All()) {
+    if (game.IsPublic) {
+      games.push_back(&game);
+    }
+  }
+  const auto most = static_cast<std::size_t>(setup_.Games);
+  for (std::size_t at = games.size() > most ? games.size() - most : 0; at < games.size(); ++at) {
+    Put(*games[at]);
+  }
+  PutRanking();
+  running_->Server.Update();
+}
+
+void ResultsHost::PutRanking() {
+  if (!setup_.Ranking || setup_.Names != NamesShown::OnBoardAndPage) {
+    running_->Pages.SetRanking(std::nullopt);
+    return;
+  }
+  try {
+    const PublicRanking ranking = parts_.Ranks();
+    running_->Pages.SetRanking(ResultsPages::MonthRanking{
+        ranking.Month,
+        RankedLines(ranking, [this](const NameHolder& holder) { return NameOnPage(holder); })});
+  } catch (const RuntimeError&) {
+    // The archive is locked or damaged. The ranking that was shown may hold a name that is to go.
+    running_->Pages.SetRanking(std::nullopt);
+  }
+}
