@@ -3,6 +3,7 @@
 #include <QEvent>
 #include <QFontMetrics>
 #include <QHeaderView>
+#include <QScrollBar>
 #include <QShortcut>
 #include <QTableView>
 #include <algorithm>
@@ -72,13 +73,19 @@ void SetRows(QTableView& table) {
 void SetUpMonthTable(QTableView& table) {
   SetRows(table);
   SetWidth(table, PastMonthModel::Games, QStringLiteral("000000"));
-  const int least = WidthOf(table, PastMonthModel::Month, QStringLiteral("0000-00"));
-  new RestOfWidth(table, PastMonthModel::Month, [least] { return least; });
+  int month = WidthOf(table, PastMonthModel::Month, QStringLiteral("0000-00"));
+  for (int row = 0; row < table.model()->rowCount(); ++row) {
+    month = std::max(month, WidthOf(table, PastMonthModel::Month,
+                                    table.model()->index(row, PastMonthModel::Month).data().toString()));
+  }
+  table.setColumnWidth(PastMonthModel::Month, month);
+  table.setFixedWidth(month + table.columnWidth(PastMonthModel::Games) + 2 * table.frameWidth() +
+                      table.verticalScrollBar()->sizeHint().width());
 }
 
 void SetUpGameTable(QTableView& table) {
   SetRows(table);
-  SetWidth(table, PastGameModel::Time, QStringLiteral("00/00/0000 00:00"));
+  SetWidth(table, PastGameModel::Time, PastGameModel::TimeText("2026-12-20 20:48:48"));
   for (int column = PastGameModel::Players; column <= PastGameModel::LastTeam; ++column) {
     SetWidth(table, column, QStringLiteral("-00000"));
   }
