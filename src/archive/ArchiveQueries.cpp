@@ -15,9 +15,11 @@ class Conditions {
   /// The same with a list of numbers in parentheses.
   void AddList(std::string_view condition, const std::vector<std::int32_t>& numbers, std::string_view rest) {
     text_.append(" AND ").append(condition);
+    const char* before = "($";
     for (const std::int32_t number : numbers) {
       values_.emplace_back(std::int64_t{number});
-      text_.append(&number == &numbers.front() ? "($" : ", $").append(std::to_string(values_.size()));
+      text_.append(before).append(std::to_string(values_.size()));
+      before = ", $";
     }
     text_.append(")").append(rest);
   }
@@ -85,8 +87,12 @@ std::vector<MonthOfGames> ArchiveQueries::Months() {
 
 std::vector<std::string> ArchiveQueries::Missions() {
   std::vector<std::string> missions;
-  sql_.Query("SELECT DISTINCT Mission FROM Games ORDER BY Mission", {},
-             [&missions](const SqlRow& row) { missions.push_back(row.Text(0)); });
+  // From one to the next in the index, however many games each has.
+  sql_.Query(
+      "WITH RECURSIVE m (Mission) AS (SELECT min(Mission) FROM Games UNION ALL "
+      "SELECT (SELECT min(Games.Mission) FROM Games WHERE Games.Mission > m.Mission) FROM m "
+      "WHERE m.Mission IS NOT NULL) SELECT Mission FROM m WHERE Mission IS NOT NULL ORDER BY Mission",
+      {}, [&missions](const SqlRow& row) { missions.push_back(row.Text(0)); });
   return missions;
 }
 

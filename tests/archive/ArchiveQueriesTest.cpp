@@ -100,6 +100,9 @@ TEST_F(AskedArchive, FindsGamesByPeriodMissionMemberAndGun) {
       ElementsAre(3));
   EXPECT_THAT(queries.Games({.Mission = "' OR 1 = 1 --"}), IsEmpty());
   EXPECT_THAT(queries.Games({.Member = 7}), IsEmpty());
+  EXPECT_THAT(queries.Games({.Members = {6}}), ElementsAre(4, 3));
+  EXPECT_THAT(queries.Games({.Mission = "None", .Members = {6, 5, 7}}), ElementsAre(4, 1));
+  EXPECT_THAT(queries.Games({.Members = {7, 8}}), IsEmpty());
 }
 
 TEST_F(AskedArchive, TellsAGame) {
@@ -204,7 +207,7 @@ TEST_F(QueryPlans, OfAllGamesReadOneIndexInItsOrder) {
 
 TEST_F(QueryPlans, OfMissionsAndDeletedGamesReadOneIndexOnly) {
   queries.Missions();
-  EXPECT_THAT(Plan(), HasSubstr("USING COVERING INDEX GamesByMission"));
+  EXPECT_THAT(Plan(), HasSubstr("USING COVERING INDEX GamesByMission (Mission>?)"));
   EXPECT_THAT(PlanOf({.Deleted = true}), HasSubstr("USING COVERING INDEX GamesByPlayed"));
 }
 
@@ -213,6 +216,7 @@ TEST_F(QueryPlans, OfListsSearchAndScanNothing) {
       {{.From = "2026-11", .Before = "2026-12"}, "COVERING INDEX GamesByPlayed (Played>? AND Played<?)"},
       {{.Mission = "Flag"}, "INDEX GamesByMission (Mission=?"},
       {{.Member = 5}, "COVERING INDEX GamePlayersByMember (MemberID=?)"},
+      {{.Members = {5, 6}}, "COVERING INDEX GamePlayersByMember (MemberID=?)"},
       {{.Player = 40}, "COVERING INDEX GamePlayersByGun (PlayerIndex=?)"},
       {{.From = "2026-11", .Member = 5}, "INDEX GamePlayersByMember (MemberID=?)"},
   };

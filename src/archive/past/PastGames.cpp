@@ -66,6 +66,7 @@ void PastGames::SetTexts() {
                                {ui_->BringBack, own(OwnText::PastBringBack)},
                                {ui_->Import, own(OwnText::PastImport)},
                                {ui_->Close, 137}});
+  ui_->BoardTable->setAccessibleName(Text(parts_.Strings, 203));
   ui_->Import->setVisible(parts_.Import != nullptr);
 }
 

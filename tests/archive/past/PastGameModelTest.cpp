@@ -77,7 +77,8 @@ TEST_F(ListOfPastGames, HasACaptionForEachColumn) {
   for (int column = 0; column < model.columnCount(); ++column) {
     captions << model.headerData(column, Qt::Horizontal).toString();
   }
-  EXPECT_EQ(captions.join(u'|'), "Time|Mission|Players|Red|Blue|Yellow|Best player|Pulls|Committed");
+  EXPECT_EQ(captions.join(u'|').toStdString(),
+            "Time|Mission|Players|Red|Blue|Yellow|Best player|Pulls|Committed");
 }
 
 TEST_F(ListOfPastGames, ReadsOnlyWhatIsInView) {
