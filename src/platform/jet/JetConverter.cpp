@@ -23,9 +23,10 @@
 namespace {
 
 /// A copy of a file that is deleted at the end unless it has taken the place of another.
-class NewFile {
+class ConvertedFile {
  public:
-  NewFile(Files& disk, std::string path, const std::string& source) : disk_(disk), path_(std::move(path)) {
+  ConvertedFile(Files& disk, std::string path, const std::string& source)
+      : disk_(disk), path_(std::move(path)) {
     Remove();  // a crash may have left one
     try {
       disk.Write(path_, disk.Read(source));
@@ -34,9 +35,9 @@ class NewFile {
       throw;
     }
   }
-  ~NewFile() { Remove(); }
-  NewFile(const NewFile&) = delete;
-  NewFile& operator=(const NewFile&) = delete;
+  ~ConvertedFile() { Remove(); }
+  ConvertedFile(const ConvertedFile&) = delete;
+  ConvertedFile& operator=(const ConvertedFile&) = delete;
 
   const std::string& Path() const { return path_; }
 
@@ -142,7 +143,7 @@ OldDatabaseReport JetConverter::MakeAndReplace(const OldDatabase& old, Conversio
   if (disk_.FileLen(old.Path) % smallestPage != 0) {
     throw OldDatabaseRefused();
   }
-  const NewFile newFile(disk_, old.Path + ".new", old.EmptyPath);
+  const ConvertedFile newFile(disk_, old.Path + ".new", old.EmptyPath);
   OldDatabaseReport report = ReadInto(newFile.Path(), old);
   RequireValues(report.NotTaken, steps);
   const bool joined = Join(newFile.Path(), old, steps);
