@@ -24,6 +24,10 @@ std::string FileNameIn(const std::string& path) {
   return std::filesystem::path(path).filename().string();
 }
 
+FileReaders ReadersOf(const ExportChoice& choice) {
+  return choice.Personal == PersonalData() ? FileReaders::AsBefore : FileReaders::ThisUser;
+}
+
 constexpr int DayLength = 10;  // "YYYY-MM-DD"
 
 QDate DayOf(const std::string& time) {
@@ -198,7 +202,7 @@ void ExportGames::ExportThis(const std::string& path, const ExportChoice& choice
     const std::unique_ptr<GameWriter> writer = MakeGameWriter(choice, parts_.Strings);
     parts_.Game([&writer](const ExportedGame& game) { writer->Add(game); });
     writer->End();
-    const std::unique_ptr<NewFile> file = parts_.Disk.BeginReplace(path, Readers(choice));
+    const std::unique_ptr<NewFile> file = parts_.Disk.BeginReplace(path, ReadersOf(choice));
     file->Write(writer->Take());
     file->Finish();
   }
@@ -216,7 +220,7 @@ void ExportGames::ExportPast(const std::string& path, const ExportChoice& choice
     });
     RunProgress progress(*ui_->Progress, *ui_->Stop, parts_.Events, stopped_);
     ui_->Stop->setFocus();
-    const std::unique_ptr<NewFile> file = parts_.Disk.BeginReplace(path, Readers(choice));
+    const std::unique_ptr<NewFile> file = parts_.Disk.BeginReplace(path, ReadersOf(choice));
     outcome = ExportPastGames(parts_.Past, games, choice, parts_.Strings, *file,
                               [&progress](double done) { return progress.GoOn(done); });
   }
@@ -225,13 +229,11 @@ void ExportGames::ExportPast(const std::string& path, const ExportChoice& choice
     Tell(parts_.Strings.Text(OwnText::GameExportStopped));
     return;
   }
-  std::string told =
-      Filled(parts_.Strings.Text(OwnText::GameExportSavedMany), {std::to_string(outcome.Written), path});
-  if (outcome.LeftOut > 0) {
-    told.append("  ").append(
-        Filled(parts_.Strings.Text(OwnText::GameExportLeftOut), {std::to_string(outcome.LeftOut)}));
-  }
-  Tell(told);
+  const StringTable& strings = parts_.Strings;
+  Tell(Filled(strings.Text(OwnText::GameExportSavedMany), {std::to_string(outcome.Written), path}),
+       outcome.LeftOut == 0
+           ? std::string()
+           : Filled(strings.Text(OwnText::GameExportLeftOut), {std::to_string(outcome.LeftOut)}));
 }
 
 std::vector<std::int64_t> ExportGames::PastChosen() {
@@ -248,16 +250,13 @@ std::string ExportGames::SuggestedName() const {
   return ui_->WhichChosen->isChecked() ? "games" : "games " + DayIn(*ui_->From) + " " + DayIn(*ui_->To);
 }
 
-FileReaders ExportGames::Readers(const ExportChoice& choice) const {
-  return choice.Personal == PersonalData() ? FileReaders::AsBefore : FileReaders::ThisUser;
-}
-
 bool ExportGames::MayReplace(const std::string& path) {
   return !parts_.Disk.FileExists(path) ||
          parts_.Boxes.Show(Filled(parts_.Strings.Text(OwnText::GameExportReplaces), {FileNameIn(path)}),
                            DefaultBoxTitle, BoxIcon::Question, BoxButtons::OkCancel) == BoxAnswer::Ok;
 }
 
-void ExportGames::Tell(const std::string& text) {
-  ui_->OutcomeLine->Show({{QStringLiteral("Outcome"), QString::fromStdString(text)}});
+void ExportGames::Tell(const std::string& text, const std::string& leftOut) {
+  ui_->OutcomeLine->Show({{QStringLiteral("Outcome"), QString::fromStdString(text)},
+                          {QStringLiteral("LeftOut"), QString::fromStdString(leftOut)}});
 }

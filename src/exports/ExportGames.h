@@ -63,14 +63,13 @@ class ExportGames : public QDialog {
   std::vector<std::int64_t> PastChosen();
   std::string SuggestedName() const;
   ExportChoice Choice() const;
-  FileReaders Readers(const ExportChoice& choice) const;
   /// False if there is such a file and the operator wants to keep it.
   bool MayReplace(const std::string& path);
   /// Enables only what has a use for what is chosen.
   void EnableEntries();
   /// While past games are being written, nothing else may be chosen.
   void EnableAll(bool enabled);
-  void Tell(const std::string& text);
+  void Tell(const std::string& text, const std::string& leftOut = {});
 
   const Parts parts_;
   std::unique_ptr<Ui::ExportGames> ui_;

@@ -141,7 +141,8 @@ TEST_F(ExportCommand, TakesThePastGamesOfAPeriod) {
   venue.Trigger("mnuExport");
   EXPECT_EQ(act.Runs(), 1);
   std::vector<int> soldiering;
-  for (const ordered_json& game : ordered_json::parse(ReadFile(path)).at("games")) {
+  const auto document = ordered_json::parse(ReadFile(path));
+  for (const ordered_json& game : document.at("games")) {
     soldiering.push_back(game.at("players").at(0).at("soldiering"));
   }
   EXPECT_THAT(soldiering, ElementsAre(5, 6, 7));

@@ -313,9 +313,9 @@ TEST_P(ExportWindow, TellsHowManyGamesCouldNotBeRead) {
   past.Damaged = {1, 3};
   Open();
   ExportTo("/home/op/a.csv");
-  EXPECT_EQ(Outcome(),
-            In("Saved 1 games: /home/op/a.csv  Games that cannot be read and are not in the file: 2",
-               "已保存 1 场比赛：/home/op/a.csv  无法读取、未写入文件的比赛：2 场"));
+  EXPECT_EQ(Outcome(), In("Saved 1 games: /home/op/a.csv", "已保存 1 场比赛：/home/op/a.csv"));
+  EXPECT_EQ(Find<QLabel>(*window, "LeftOut").text().toStdString(),
+            In("Games that cannot be read and are not in the file: 2", "无法读取、未写入文件的比赛：2 场"));
 }
 
 TEST_P(ExportWindow, KeepsPastGamesWithPersonalDataToTheUserAlone) {

@@ -36,7 +36,7 @@ std::string MarkupOf(pugi::xml_node node) {
 /// The element with its text, short enough for a list: "ShotCount: many".
 std::string Shown(pugi::xml_node element) {
   constexpr std::size_t most = 60;
-  std::string shown = element.name();
+  std::string shown(FirstBytes(element.name(), most));
   if (const std::string_view text = element.child_value(); !text.empty()) {
     shown.append(": ").append(FirstBytes(text, most));
   }
@@ -60,13 +60,12 @@ class Stumble {
   Stumble(const std::string& bytes, const StringTable& strings, const Breath& breathe)
       : bytes_(bytes), strings_(strings), breathe_(breathe) {}
 
-  GameFileTrouble In(pugi::xml_node root) {
+  GameFileTrouble In(pugi::xml_node root) const {
     if (const auto fault = FaultIn("", MarkupOf(root.child("GameHeader")))) {
       return InHeader(root.child("GameHeader"), *fault);
     }
     for (const pugi::xml_node players : root.children("PlayerData")) {
       for (const pugi::xml_node player : players.children("Player")) {
-        breathe_();
         if (const auto fault = FaultOfPlayer(MarkupOf(player))) {
           return InPlayer(player, *fault);
         }
@@ -81,6 +80,7 @@ class Stumble {
   }
 
   std::optional<GameFileFault> FaultIn(const std::string& players, const std::string& header) const {
+    breathe_();
     Game game(strings_);
     try {
       ReadGameFile("<GameData>" + header + "<PlayerData>" + players + "</PlayerData></GameData>", game,

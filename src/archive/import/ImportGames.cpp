@@ -56,7 +56,9 @@ void ImportGames::SetUpTable() {
   header.setDefaultAlignment(Qt::AlignVCenter | Qt::AlignLeft);
   header.setStretchLastSection(true);
   constexpr int fileWidth = 300;
+  constexpr int lineWidth = 80;
   header.resizeSection(RefusedFilesModel::FileColumn, fileWidth);
+  header.resizeSection(RefusedFilesModel::LineColumn, lineWidth);
   auto* copy = new QShortcut(QKeySequence::Copy, ui_->Refused, nullptr, nullptr, Qt::WidgetShortcut);
   connect(copy, &QShortcut::activated, this, [this] { CopyRows(*ui_->Refused); });
 }

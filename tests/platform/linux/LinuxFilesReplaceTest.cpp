@@ -292,7 +292,7 @@ TEST(NewFile, FailsAsAReplacementDoes) {
   WriteFile(folder / "file", "old");
   const FileSizeLimit limit(10'000);
   const auto file = files.BeginReplace(folder / "file", FileReaders::AsBefore);
-  EXPECT_EQ(NumberThrownBy([&] { file->Write(std::string(20'000, 'x')); }), 61);
+  EXPECT_EQ(NumberThrownBy([&] { file->Write(std::string(20'000, 'x')); }), 75);
   EXPECT_EQ(ReadFile(folder / "file"), "old");
 }
 

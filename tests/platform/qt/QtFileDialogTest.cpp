@@ -281,16 +281,17 @@ TEST_F(QtFileDialogTest, GivesNoNameWhenItsWindowIsDestroyed) {
 }
 
 TEST_F(QtFileDialogTest, GivesTheFolderChosen) {
-  ASSERT_TRUE(QDir(folder_.path()).mkdir(QStringLiteral("games")));
+  const QTemporaryDir above;
+  ASSERT_TRUE(QDir(above.path()).mkdir(QStringLiteral("games")));
   const WhileModal<QFileDialog> operatorAtWork([&](QFileDialog& dialog) {
     EXPECT_EQ(dialog.windowTitle(), QStringLiteral("Games"));
-    EXPECT_EQ(dialog.directory().absolutePath(), folder_.path());
+    EXPECT_EQ(dialog.directory().absolutePath(), above.path());
     EXPECT_TRUE(dialog.testOption(QFileDialog::ShowDirsOnly));
     Entry(dialog).setText(QStringLiteral("games"));
     Press(dialog, QDialogButtonBox::Open);
   });
-  EXPECT_EQ(Dialog.ShowFolder({.Filter = {}, .Folder = folder_.path().toStdString(), .Title = "Games"}),
-            Path("games"));
+  EXPECT_EQ(Dialog.ShowFolder({.Filter = {}, .Folder = above.path().toStdString(), .Title = "Games"}),
+            above.filePath(QStringLiteral("games")).toStdString());
   EXPECT_EQ(operatorAtWork.Runs(), 1);
 }
 
