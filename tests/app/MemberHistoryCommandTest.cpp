@@ -91,7 +91,7 @@ TEST_F(HistoryCommands, ForgetAMemberButNotOnTheBoard) {
 TEST_F(HistoryCommands, ShowNothingWithoutAnArchiveAndMakeNone) {
   venue.Start();
   const WhileModal<MemberHistoryWindow> look([](MemberHistoryWindow& window) {
-    EXPECT_EQ(LabelIn(window, "TellLabel"), "No kept game names a member yet.");
+    EXPECT_EQ(LabelIn(window, "TellLabel"), "No past game names a member yet.");
     window.close();
   });
   venue.Trigger("mnuMemberHistory");
@@ -160,7 +160,7 @@ TEST_F(YearsOfGames, GoAfterAQuestionThatIsAskedOnce) {
   Start("keep_years=3");
   EXPECT_EQ(Games(), "2010");
   ASSERT_EQ(Boxes(), 1U);
-  EXPECT_THAT(venue.Boxes.Boxes[0].Text, HasSubstr("kept for 3 years. 1 games were played earlier."));
+  EXPECT_THAT(venue.Boxes.Boxes[0].Text, HasSubstr("past games stay: 3\nGames that are older: 1\n"));
   EXPECT_EQ(venue.Boxes.Boxes[0].Buttons, BoxButtons::YesNo);
   AddGame("2008-01-01 00:00:00");
   Start("keep_years=3");

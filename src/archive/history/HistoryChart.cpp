@@ -103,7 +103,9 @@ void HistoryChart::DrawAxes(QPainter& painter) const {
   constexpr int faintness = 50;
   faint.setAlpha(faintness);
   const double line = QFontMetricsF(font()).height();
-  for (double value = least_; value <= most_ + tick_ / 2; value += tick_) {
+  const auto lines = static_cast<int>(std::lround((most_ - least_) / tick_));
+  for (int each = 0; each <= lines; ++each) {
+    const double value = least_ + each * tick_;
     const bool isZero = std::abs(value) < tick_ / 2;
     painter.setPen(isZero ? ink : faint);
     painter.drawLine(QPointF(area.left(), HeightOf(value)), QPointF(area.right(), HeightOf(value)));

@@ -1,6 +1,7 @@
 #include "archive/history/MemberHistoryWindow.h"
 
 #include <QDateTime>
+#include <QHeaderView>
 #include <QLocale>
 #include <algorithm>
 #include <utility>
@@ -89,6 +90,7 @@ void MemberHistoryWindow::SetUpTables() {
   ui_->MemberTable->setModel(memberRows_);
   ui_->SessionTable->setModel(sessionRows_);
   ui_->MonthTable->setModel(monthRows_);
+  ui_->MemberTable->horizontalHeader()->setSectionResizeMode(0, QHeaderView::Stretch);
   ui_->MemberTable->setSelectionMode(QAbstractItemView::SingleSelection);
   constexpr int list = 2;
   constexpr int history = 5;

@@ -1,5 +1,6 @@
 #include "archive/history/RankingWindow.h"
 
+#include <QHeaderView>
 #include <filesystem>
 #include <utility>
 
@@ -22,6 +23,7 @@ RankingWindow::RankingWindow(const Parts& parts, QWidget* parent)
   ui_->setupUi(this);
   SetTexts();
   ui_->RankingTable->setModel(rows_);
+  ui_->RankingTable->horizontalHeader()->setSectionResizeMode(1, QHeaderView::Stretch);
   FillPeriods();
   const auto refresh = [this] { commands_.Run([this] { Refresh(); }); };
   connect(ui_->Period, &QComboBox::currentIndexChanged, this, refresh);

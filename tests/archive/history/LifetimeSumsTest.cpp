@@ -28,33 +28,33 @@ class SumsOfBo : public testing::Test, protected HistoryVenue {
 
 TEST_F(SumsOfBo, AgreeWhereAllGamesAreKept) {
   EXPECT_EQ(Sums().Lifetime, (GameSums{2, 150}));
-  EXPECT_THAT(Texts(), ElementsAre("Lifetime figures: 2 games, soldiering 150.",
+  EXPECT_THAT(Texts(), ElementsAre("Lifetime figures: games 2, soldiering 150.",
                                    "Committed games listed here: 2, soldiering 150.", "Both agree."));
 }
 
 TEST_F(SumsOfBo, TellGamesThatAreNotCommitted) {
   Keep("2026-10-03 20:00:00", -7, false);
   EXPECT_EQ(Sums().Uncommitted, (GameSums{1, -7}));
-  EXPECT_THAT(Texts(), ElementsAre(HasSubstr(": 2 games, soldiering 150."), HasSubstr(": 2, soldiering 150."),
-                                   "Not committed, so not in the lifetime figures: 1 games, soldiering -7."));
+  EXPECT_THAT(Texts(), ElementsAre(HasSubstr(": games 2, soldiering 150."), HasSubstr(": 2, soldiering 150."),
+                                   "Not committed, so not in the lifetime figures: games 1, soldiering -7."));
 }
 
 TEST_F(SumsOfBo, TellCommittedGamesThatWereDeleted) {
   Delete(2);
   EXPECT_EQ(Sums().DeletedCommitted, (GameSums{1, 50}));
-  EXPECT_THAT(Texts(), ElementsAre(HasSubstr(": 2 games"), HasSubstr(": 1, soldiering 100."),
-                                   HasSubstr("deleted here; the lifetime figures still count them: 1 games, "
+  EXPECT_THAT(Texts(), ElementsAre(HasSubstr(": games 2"), HasSubstr(": 1, soldiering 100."),
+                                   HasSubstr("deleted here; the lifetime figures still count them: games 1, "
                                              "soldiering 50.")));
 }
 
 TEST_F(SumsOfBo, TellGamesOfWhichNothingIsKept) {
   SetLifetime(12, 900);
-  EXPECT_THAT(Texts().back(), HasSubstr("10 games of the lifetime figures are not kept here"));
+  EXPECT_THAT(Texts().back(), HasSubstr("not kept here under this member: 10."));
 }
 
 TEST_F(SumsOfBo, TellMoreCommittedGamesThanWereCounted) {
   SetLifetime(1, 100);
-  EXPECT_THAT(Texts().back(), HasSubstr("1 more games are committed here than"));
+  EXPECT_THAT(Texts().back(), HasSubstr("lifetime figures do not count: 1."));
 }
 
 TEST_F(SumsOfBo, TellScoresThatChangedAfterTheCommit) {

@@ -85,8 +85,8 @@ TEST_F(HistoryWindow, TellsTheBestsAndTheLifetimeFigures) {
   EXPECT_THAT(Label("BestLabel"), HasSubstr("Best soldiering: 500 ("));
   EXPECT_THAT(Label("BestLabel"), HasSubstr("Best accuracy: 25.00% ("));
   EXPECT_THAT(Label("BestLabel"), HasSubstr("Most damage: 120 ("));
-  EXPECT_THAT(Label("LifetimeLabel"), HasSubstr("Lifetime figures: 4 games, soldiering 500.\n"));
-  EXPECT_THAT(Label("LifetimeLabel"), HasSubstr("Not committed, so not in the lifetime figures: 1 games"));
+  EXPECT_THAT(Label("LifetimeLabel"), HasSubstr("Lifetime figures: games 4, soldiering 500.\n"));
+  EXPECT_THAT(Label("LifetimeLabel"), HasSubstr("Not committed, so not in the lifetime figures: games 1"));
 }
 
 TEST_F(HistoryWindow, GoesFromTheChartToTheRow) {
@@ -124,7 +124,7 @@ TEST_F(HistoryWindow, OpensAtAMemberWhoNeverPlayed) {
   InMembers("INSERT INTO Members (ContactID, FirstName, LastName) VALUES (9, 'Di', 'New')");
   Open(9);
   EXPECT_EQ(Label("MemberLabel"), "Di New (9)");
-  EXPECT_EQ(Label("TellLabel"), "No kept game names this member.");
+  EXPECT_EQ(Label("TellLabel"), "No past game names this member.");
   EXPECT_EQ(RowsOf(*window, "SessionTable"), 0);
 }
 
@@ -141,8 +141,7 @@ TEST_F(HistoryWindow, ForgetsAMemberAfterAQuestion) {
   boxes.Answers = {BoxAnswer::No, BoxAnswer::Yes};
   ::Press(*window, "ForgetButton");
   ASSERT_EQ(boxes.Boxes.size(), 1U);
-  EXPECT_THAT(boxes.Boxes[0].Text,
-              HasSubstr("Member number and button of Bo Ray \"Mole\" (5) are taken out of 5 kept games"));
+  EXPECT_THAT(boxes.Boxes[0].Text, HasSubstr("Past games that name Bo Ray \"Mole\" (5): 5\n"));
   EXPECT_EQ(boxes.Boxes[0].Buttons, BoxButtons::YesNo);
   EXPECT_EQ(Query("SELECT count(*) FROM GamePlayers WHERE MemberID = 5"), "5");
   ::Press(*window, "ForgetButton");
@@ -150,7 +149,8 @@ TEST_F(HistoryWindow, ForgetsAMemberAfterAQuestion) {
   EXPECT_EQ(Query("SELECT count(*) FROM GamePlayers WHERE MemberID = 5"), "0");
   EXPECT_EQ(RowsOf(*window, "MemberTable"), 1);
   EXPECT_EQ(Label("MemberLabel"), "Cy Fox (6)");
-  EXPECT_EQ(Label("TellLabel"), "Forgotten: 5 games no longer name Bo Ray \"Mole\" (5).");
+  EXPECT_EQ(Label("TellLabel"),
+            "Forgotten: Bo Ray \"Mole\" (5). Past games that no longer name this member: 5");
 }
 
 TEST_F(HistoryWindow, TellsWhatCouldNotBeForgotten) {
@@ -185,7 +185,7 @@ TEST_F(HistoryWindow, TellsAFailureBetweenTwoMembersWithoutABox) {
 TEST_F(HistoryWindow, OfAnEmptyArchiveSaysSo) {
   InArchive("DELETE FROM KnownMembers");
   Open();
-  EXPECT_EQ(Label("TellLabel"), "No kept game names a member yet.");
+  EXPECT_EQ(Label("TellLabel"), "No past game names a member yet.");
 }
 
 TEST_F(HistoryWindow, ClosesByEscape) {

@@ -99,6 +99,29 @@ TEST_F(WholeDatabaseFile, TellsWhetherItHasMoved) {
   EXPECT_TRUE(database->HasMoved());
 }
 
+TEST_F(WholeDatabaseFile, IsWrittenAnewWithoutWhatWasDeleted) {
+  // Another program need not wipe what it deletes.
+  file.Execute(
+      "PRAGMA secure_delete = OFF; UPDATE Members SET Photograph = CAST('Forget me not' || "
+      "hex(randomblob(300000)) AS BLOB); UPDATE Members SET Photograph = NULL");
+  ASSERT_NE(ReadFile(file.Path()).find("Forget me not"), std::string::npos);
+  const auto size = std::filesystem::file_size(file.Path());
+  const std::unique_ptr<Database> database = file.Open();
+  const std::unique_ptr<Recordset> rows = database->OpenRecordset("Members");
+  database->Rewrite();
+  EXPECT_EQ(ReadFile(file.Path()).find("Forget me not"), std::string::npos);
+  EXPECT_LT(std::filesystem::file_size(file.Path()), size / 2);
+  EXPECT_EQ(file.Query("SELECT sum(ContactID) FROM Members"), "17");
+  EXPECT_EQ(AllNumbers(*rows), "1 2 5 9 ");
+}
+
+TEST_F(WholeDatabaseFile, IsNotWrittenAnewWhileItIsLocked) {
+  OtherConnection other(file.Path());
+  other.Execute("BEGIN IMMEDIATE");
+  const std::unique_ptr<Database> database = file.Open();
+  EXPECT_EQ(NumberThrownBy([&] { database->Rewrite(); }), 3050);
+}
+
 TEST_F(WholeDatabaseFile, IsFoundSound) {
   EXPECT_TRUE(file.Open()->CheckWhole(always));
   EXPECT_TRUE(file.Open()->CheckWhole(nullptr));
