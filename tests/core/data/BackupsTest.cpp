@@ -71,13 +71,13 @@ TEST_F(Backup, IsMadeAnewWhenAskedWhichCountsAsThatOfTheRun) {
   Open();
   Change("first");
   clock.DateAndTime = "2013-05-21 15:00:00";
-  backups->CopyNow(*database, file.Path());
+  backups->CopyNow(*database, file.Path(), nullptr);
   Change("second");
   EXPECT_THAT(Copies(), ElementsAre("members-2013-05-21-143005.mdb", "members-2013-05-21-150000.mdb"));
   EXPECT_EQ(NickNameIn("members-2013-05-21-150000.mdb"), "first");
   Open();
   clock.DateAndTime = "2013-05-22 15:00:00";
-  backups->CopyNow(*database, file.Path());
+  backups->CopyNow(*database, file.Path(), nullptr);
   Change("third");
   EXPECT_EQ(Copies().size(), 3U);
 }
@@ -225,6 +225,19 @@ TEST_F(Backup, IsNotMadeOfAFileThatCannotBeChanged) {
   EXPECT_EQ(NumberThrownBy([this] { Change("first"); }), 3027);
   EXPECT_THAT(Copies(), IsEmpty());
   EXPECT_EQ(backups->TakeFailure(), "");
+}
+
+TEST_F(Backup, OfNowIsMadeInStepsUnlessItIsStopped) {
+  Open();
+  file.Execute("UPDATE Members SET Photograph = randomblob(2000000)");
+  const std::vector<std::string> before = Copies();
+  clock.DateAndTime = "2026-11-22 10:00:00";
+  EXPECT_FALSE(backups->CopyNow(*database, file.Path(), [] { return false; }));
+  EXPECT_EQ(Copies(), before);
+  int asked = 0;
+  EXPECT_TRUE(backups->CopyNow(*database, file.Path(), [&asked] { return ++asked > 0; }));
+  EXPECT_GE(asked, 2);
+  EXPECT_EQ(NickNameIn("members-2026-11-22-100000.mdb"), "Shamrock");
 }
 
 }  // namespace
