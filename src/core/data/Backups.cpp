@@ -10,6 +10,7 @@
 namespace {
 
 constexpr std::size_t MostCopies = 10;
+constexpr std::uint64_t RoomForGames = std::uint64_t{32} << 20U;
 constexpr std::string_view Extension = ".mdb";
 
 /// "members" of "/home/x/members.mdb".
@@ -25,6 +26,9 @@ void Backups::Guard(Database& database, const std::string& path) {
 }
 
 bool Backups::CopyNow(Database& database, const std::string& path, const KeepOn& keepOn) {
+  if (!HasRoomFor(path)) {
+    throw RuntimeError(Fault::DiskFull);
+  }
   return Copy(database, NameIn(path), keepOn);
 }
 
@@ -33,6 +37,10 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
     return true;
   }
   try {
+    lacksRoom_ = !HasRoomFor(path);
+    if (lacksRoom_) {
+      return false;
+    }
     Copy(database, NameIn(path), nullptr);
   } catch (const RuntimeError& error) {
     // Another program has locked the file, so the change itself will fail too; the next change tries again.
@@ -42,6 +50,15 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
     failure_ = Filled(strings_.Text(OwnText::BackupFailed), {path, error.what()});
   }
   return true;
+}
+
+bool Backups::HasRoomFor(const std::string& path) const {
+  try {
+    const std::string folder = path.substr(0, path.rfind('/'));
+    return disk_.FreeSpace(folder) >= disk_.FileLen(path) + RoomForGames;
+  } catch (const RuntimeError&) {
+    return true;  // the copy itself will tell
+  }
 }
 
 bool Backups::Copy(Database& database, const std::string& name, const KeepOn& keepOn) {

@@ -28,7 +28,12 @@ class Backups {
   /// Returns the operator's message about a copy that failed since the last call, or an empty text.
   std::string TakeFailure();
 
+  /// True if the last change went ahead without a copy, to leave room on the disk for games and settings. The
+  /// next change tries again.
+  bool LacksRoom() const { return lacksRoom_; }
+
  private:
+  bool HasRoomFor(const std::string& path) const;
   bool TryCopy(Database& database, const std::string& path);
   bool Copy(Database& database, const std::string& name, const KeepOn& keepOn);
 
@@ -38,4 +43,5 @@ class Backups {
   const StringTable& strings_;
   std::set<std::string> copied_;  // names of the databases that were copied
   std::string failure_;
+  bool lacksRoom_ = false;
 };

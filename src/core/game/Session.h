@@ -85,6 +85,8 @@ class Session {
   bool BackUpMembers(const KeepOn& keepOn);
   /// Returns the operator's message about a backup copy that failed, or an empty text if there is none.
   std::string TakeBackupFailure();
+  /// True if a change was made without one, since too little of the disk is free.
+  bool BackupLacksRoom() const { return backups_ && backups_->LacksRoom(); }
 
   ::Game& Game() { return game_; }
   SoldieringFactors& Factors() { return factors_; }
