@@ -43,6 +43,8 @@ QString NameOf(DeskTopic topic) {
       return QStringLiteral("DeskCutGames");
     case DeskTopic::WeeklyCopyFailed:
       return QStringLiteral("DeskWeeklyCopyFailed");
+    case DeskTopic::BackupLacksRoom:
+      return QStringLiteral("DeskBackupLacksRoom");
   }
   return {};
 }
@@ -147,6 +149,7 @@ DeskFacts Desk::Facts() const {
   facts.UnusableArchive = keeping_.Unusable;
   facts.CutGames = keeping_.CutGames;
   facts.WeeklyCopyFailure = keeping_.CopyFailure;
+  facts.BackupLacksRoom = parts_.Session.BackupLacksRoom();
   return facts;
 }
 

@@ -54,7 +54,7 @@ void frmRx::ImportMemberFile() {
                           .Events = services_.Events,
                           .Time = services_.Time,
                           .Strings = strings,
-                          .BackUp = [this] { session_.BackUpMembers(); }},
+                          .BackUp = [this](const KeepOn& keepOn) { return session_.BackUpMembers(keepOn); }},
                          *path, services_.Disk.Read(*path), this);
     window.exec();
     hasImported = window.HasImported();

@@ -271,28 +271,26 @@ void ImportMembers::Import() {
   if (!plan_ || !plan_->ChangesAnything()) {
     return;
   }
-  try {
-    parts_.BackUp();
-  } catch (const RuntimeError& error) {
-    parts_.Boxes.Show(Filled(parts_.Strings.Text(OwnText::ImportCopyFailed), {error.what()}), DefaultBoxTitle,
-                      BoxIcon::Exclamation);
-    return;
-  }
-  rows_->Show(nullptr, std::nullopt);
-  const std::optional<ImportPlan> plan = std::exchange(plan_, std::nullopt);
+  std::optional<ImportPlan> plan;
   ui_->Import->setEnabled(false);
-  ShowState(parts_.Strings.Text(OwnText::ImportingMembers));
   EnableChoices(false);
   {
     const auto ended = qScopeGuard([this] {
       EnableChoices(true);
+      ui_->Import->setEnabled(plan_.has_value());
+    });
+    RunProgress progress(*ui_->Progress, *ui_->Stop, parts_.Events, stopped_);
+    if (!BackUp(progress)) {
+      return;
+    }
+    plan = std::exchange(plan_, std::nullopt);
+    rows_->Show(nullptr, std::nullopt);
+    const auto stopped = qScopeGuard([this] {
       if (!hasImported_) {
         ShowState(parts_.Strings.Text(OwnText::ImportStopped));
       }
     });
-    const ImportChoices choices = Choices();
-    RunProgress progress(*ui_->Progress, *ui_->Stop, parts_.Events, stopped_);
-    hasImported_ = import_.Write(choices, *plan, [&progress](double done) { return progress.GoOn(done); });
+    hasImported_ = import_.Write(Choices(), *plan, [&progress](double done) { return progress.GoOn(done); });
   }
   if (!hasImported_) {
     return;
@@ -302,6 +300,21 @@ void ImportMembers::Import() {
              {std::to_string(plan->Count(RowFate::New)), std::to_string(plan->Count(RowFate::Changed))}),
       DefaultBoxTitle, BoxIcon::Information);
   accept();
+}
+
+bool ImportMembers::BackUp(RunProgress& progress) {
+  ShowState(parts_.Strings.Text(OwnText::ImportingMembers));
+  try {
+    if (parts_.BackUp([&progress] { return progress.GoOn(0); })) {
+      return true;
+    }
+    ShowState(parts_.Strings.Text(OwnText::ImportStopped));
+  } catch (const RuntimeError& error) {
+    ShowState(TextOfPlan(*plan_, parts_.Strings));
+    parts_.Boxes.Show(Filled(parts_.Strings.Text(OwnText::ImportCopyFailed), {error.what()}), DefaultBoxTitle,
+                      BoxIcon::Exclamation);
+  }
+  return false;
 }
 
 void ImportMembers::ShowState(const std::string& text) {

@@ -17,6 +17,7 @@
 #include "ui/Commands.h"
 
 class PlannedRowsModel;
+class RunProgress;
 class QComboBox;
 
 namespace Ui {
@@ -36,8 +37,9 @@ class ImportMembers : public QDialog {
     EventPump& Events;
     const Clock& Time;
     const StringTable& Strings;
-    /// Keeps a copy of the members before they are changed. Throws RuntimeError if it cannot.
-    std::function<void()> BackUp;
+    /// Keeps a copy of the members before they are changed. False if it was stopped. Throws RuntimeError if
+    /// it cannot.
+    std::function<bool(const KeepOn& keepOn)> BackUp;
   };
 
   /// `bytes` are those of the file at `path`.
@@ -72,6 +74,8 @@ class ImportMembers : public QDialog {
   bool SettleDates(const GoOn& goOn);
   void ShowPlan();
   void Import();
+  /// Returns false, having told why, if there is no copy.
+  bool BackUp(RunProgress& progress);
   void ShowState(const std::string& text);
 
   std::unique_ptr<Ui::ImportMembers> ui_;

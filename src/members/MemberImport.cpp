@@ -10,6 +10,8 @@
 namespace {
 
 constexpr std::size_t RowsAtOnce = 64;
+constexpr std::size_t MembersForgottenAtOnce = 4096;
+constexpr std::size_t RowsFlushedAtOnce = 4096;  // or the end waits for all of them
 
 double ShareOf(const CsvReader& reader) {
   return reader.Size() == 0 ? 1 : static_cast<double>(reader.Position()) / static_cast<double>(reader.Size());
@@ -161,6 +163,9 @@ std::optional<ImportPlan> MemberImport::Plan(const ImportChoices& choices, const
   }
   plan.Fault = reader.Fault();
   plan.FaultLine = reader.Line();
+  while (index.ForgetSome(MembersForgottenAtOnce)) {
+    readOn(1);
+  }
   return plan;
 }
 
@@ -233,6 +238,9 @@ bool MemberImport::Write(const ImportChoices& choices, const ImportPlan& plan, c
     }
     if (++done % RowsAtOnce == 0 && !goOn(ShareOf(reader))) {
       return false;
+    }
+    if (done % RowsFlushedAtOnce == 0) {
+      dbMembers_.FlushGroup();
     }
   }
   scope.Commit();

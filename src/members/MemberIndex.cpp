@@ -63,3 +63,13 @@ MemberIndex::Match MemberIndex::Find(const MemberValues& member) const {
   }
   return match;
 }
+
+bool MemberIndex::ForgetSome(std::size_t count) {
+  for (; count > 0 && !byButton_.empty(); --count) {
+    byButton_.erase(byButton_.begin());
+  }
+  for (; count > 0 && !byName_.empty(); --count) {
+    byName_.erase(byName_.begin());
+  }
+  return !byButton_.empty() || !byName_.empty();
+}

@@ -28,6 +28,10 @@ class MemberIndex {
   /// the same, and one of both sides has no birth date.
   Match Find(const MemberValues& member) const;
 
+  /// Forgets up to so many buttons and names. False once there is none left: to forget very many at once
+  /// takes a noticeable time.
+  bool ForgetSome(std::size_t count);
+
  private:
   struct Named {
     std::string Birthdate;  ///< "YYYY-MM-DD", empty without one

@@ -129,6 +129,10 @@ class Database {
   virtual void CommitTrans() = 0;
   virtual void Rollback() noexcept = 0;
 
+  /// Flushes what the open group has written so far, so that its commit takes less long. The group is as open
+  /// as before, and nobody else can read the file until it ends. Throws RuntimeError 3xxx like a write.
+  virtual void FlushGroup() = 0;
+
   /// Runs `action` before each change through this database until it returns true. It may read through this
   /// database but not write, and must not throw.
   virtual void BeforeChange(std::function<bool()> action) = 0;

@@ -144,6 +144,7 @@ TEST_F(ArchiveInUse, ThatWasReplacedByAnOlderCopyGetsTheGameOnTheBoardAgain) {
   session.ClearPlayerData();
   const std::string copy = ReadFile(ArchivePath());
   Pull();
+  Change();  // or it would be the first game
   EXPECT_EQ(Games(), "2");
   WriteFile(venue.Folder / "other.mdb", copy);
   std::filesystem::rename(venue.Folder / "other.mdb", ArchivePath());

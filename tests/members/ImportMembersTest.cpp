@@ -24,11 +24,15 @@ class ImportWindow : public MemberFiles {
     strings = std::make_unique<StringTable>(language);
     window = std::make_unique<ImportMembers>(
         ImportMembers::Parts{*database, venue.Boxes, events, venue.Time, *strings,
-                             [this] {
+                             [this](const KeepOn& keepOn) {
                                ++copies;
                                if (copyFails) {
                                  throw RuntimeError(Fault::DiskFull);
                                }
+                               if (stopsCopy) {
+                                 ::Press(*window, "Stop");
+                               }
+                               return keepOn();
                              }},
         "/home/x/list.csv", csv, nullptr);
     Show(*window);
@@ -68,6 +72,7 @@ class ImportWindow : public MemberFiles {
   std::unique_ptr<StringTable> strings;
   std::unique_ptr<ImportMembers> window;
   int copies = 0;
+  bool stopsCopy = false;
   bool copyFails = false;
 };
 
@@ -107,6 +112,20 @@ TEST_F(ImportWindow, ImportsNothingWithoutACopy) {
   ASSERT_EQ(venue.Boxes.Boxes.size(), 1U);
   EXPECT_THAT(venue.Boxes.Boxes[0].Text, HasSubstr("no backup copy could be made"));
   EXPECT_TRUE(MayImport());
+}
+
+TEST_F(ImportWindow, ImportsNothingWhenItIsStoppedDuringTheCopy) {
+  stopsCopy = true;
+  Open(TwoNewMembers);
+  PressImport();
+  EXPECT_EQ(copies, 1);
+  EXPECT_EQ(Query("SELECT count(*) FROM Members"), "4");
+  EXPECT_FALSE(window->HasImported());
+  EXPECT_EQ(State(), "Import stopped. No member was changed.");
+  EXPECT_TRUE(MayImport());
+  stopsCopy = false;
+  PressImport();
+  EXPECT_TRUE(window->HasImported());
 }
 
 TEST_F(ImportWindow, ImportsNothingWhenAnotherProgramHoldsTheFile) {

@@ -69,4 +69,14 @@ TEST_F(SameMembers, AreNotThoseWithoutAButton) {
   ExpectFound(Person("0000000000000000", "Some", "Body", "1981-01-01"), Answer::None);
 }
 
+TEST_F(SameMembers, AreForgottenPieceByPiece) {
+  EXPECT_TRUE(index.ForgetSome(2));
+  ExpectFound(Person("CD00000000000001", "", "", ""), Answer::None);
+  ExpectFound(Person("", "Rhys", "Morgan", "1961-04-12"), Answer::One, 0);
+  EXPECT_TRUE(index.ForgetSome(2));
+  EXPECT_FALSE(index.ForgetSome(2));
+  ExpectFound(Person("", "Rhys", "Morgan", "1961-04-12"), Answer::None);
+  EXPECT_FALSE(index.ForgetSome(1));
+}
+
 }  // namespace

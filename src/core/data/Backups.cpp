@@ -10,6 +10,7 @@
 namespace {
 
 constexpr std::size_t MostCopies = 10;
+constexpr std::uint64_t RoomForGames = std::uint64_t{32} << 20U;
 constexpr std::string_view Extension = ".mdb";
 
 /// "members" of "/home/x/members.mdb".
@@ -24,8 +25,11 @@ void Backups::Guard(Database& database, const std::string& path) {
   database.BeforeChange([this, &database, path] { return TryCopy(database, path); });
 }
 
-void Backups::CopyNow(Database& database, const std::string& path) {
-  Copy(database, NameIn(path));
+bool Backups::CopyNow(Database& database, const std::string& path, const KeepOn& keepOn) {
+  if (!HasRoomFor(path)) {
+    throw RuntimeError(Fault::DiskFull);
+  }
+  return Copy(database, NameIn(path), keepOn);
 }
 
 bool Backups::TryCopy(Database& database, const std::string& path) {
@@ -33,7 +37,11 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
     return true;
   }
   try {
-    Copy(database, NameIn(path));
+    lacksRoom_ = !HasRoomFor(path);
+    if (lacksRoom_) {
+      return false;
+    }
+    Copy(database, NameIn(path), nullptr);
   } catch (const RuntimeError& error) {
     // Another program has locked the file, so the change itself will fail too; the next change tries again.
     if (error.Number() == Fault::DatabaseLocked) {
@@ -44,7 +52,16 @@ bool Backups::TryCopy(Database& database, const std::string& path) {
   return true;
 }
 
-void Backups::Copy(Database& database, const std::string& name) {
+bool Backups::HasRoomFor(const std::string& path) const {
+  try {
+    const std::string folder = path.substr(0, path.rfind('/'));
+    return disk_.FreeSpace(folder) >= disk_.FileLen(path) + RoomForGames;
+  } catch (const RuntimeError&) {
+    return true;  // the copy itself will tell
+  }
+}
+
+bool Backups::Copy(Database& database, const std::string& name, const KeepOn& keepOn) {
   if (!disk_.FolderExists(folder_)) {
     disk_.CreateFolder(folder_);
   }
@@ -58,7 +75,12 @@ void Backups::Copy(Database& database, const std::string& name) {
   };
   deletePart();  // a crash may have left one
   try {
-    database.CopyTo(part);
+    if (!keepOn) {
+      database.CopyTo(part);
+    } else if (!database.CopyInSteps(part, keepOn)) {
+      deletePart();
+      return false;
+    }
     disk_.Rename(part, folder_ + "/" + newest);
   } catch (const RuntimeError&) {
     deletePart();
@@ -66,6 +88,7 @@ void Backups::Copy(Database& database, const std::string& name) {
   }
   copied_.insert(name);
   copies.DeleteOldest(newest);
+  return true;
 }
 
 std::string Backups::TakeFailure() {

@@ -21,15 +21,21 @@ class Backups {
   /// even if the copy fails.
   void Guard(Database& database, const std::string& path);
 
-  /// Copies `database` as it is now, ahead of a change of many rows. Throws RuntimeError if it cannot.
-  void CopyNow(Database& database, const std::string& path);
+  /// Copies `database` as it is now, ahead of a change of many rows. False if it was stopped. Throws
+  /// RuntimeError if it cannot.
+  bool CopyNow(Database& database, const std::string& path, const KeepOn& keepOn);
 
   /// Returns the operator's message about a copy that failed since the last call, or an empty text.
   std::string TakeFailure();
 
+  /// True if the last change went ahead without a copy, to leave room on the disk for games and settings. The
+  /// next change tries again.
+  bool LacksRoom() const { return lacksRoom_; }
+
  private:
+  bool HasRoomFor(const std::string& path) const;
   bool TryCopy(Database& database, const std::string& path);
-  void Copy(Database& database, const std::string& name);
+  bool Copy(Database& database, const std::string& name, const KeepOn& keepOn);
 
   const std::string folder_;
   Files& disk_;
@@ -37,4 +43,5 @@ class Backups {
   const StringTable& strings_;
   std::set<std::string> copied_;  // names of the databases that were copied
   std::string failure_;
+  bool lacksRoom_ = false;
 };

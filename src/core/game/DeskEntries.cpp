@@ -96,6 +96,9 @@ void TellOfArchive(const DeskFacts& facts, Writer& writer) {
     writer.Tell(DeskTopic::WeeklyCopyFailed,
                 writer.Text(OwnText::DeskWeeklyCopyFailed, {facts.WeeklyCopyFailure}));
   }
+  if (facts.BackupLacksRoom) {
+    writer.Tell(DeskTopic::BackupLacksRoom, writer.Text(OwnText::DeskBackupLacksRoom));
+  }
 }
 
 }  // namespace

@@ -26,6 +26,7 @@ struct DeskFacts {
   std::string UnusableArchive;    ///< file of past games that could not be used; empty if there is none
   int CutGames = 0;               ///< past games that no longer name a member
   std::string WeeklyCopyFailure;  ///< why the weekly copy of the past games is not made; empty if it is
+  bool BackupLacksRoom = false;   ///< a database was changed without a copy from before
 };
 
 /// What an entry of the status line is about.
@@ -43,7 +44,8 @@ enum class DeskTopic {
   NotKept,
   ArchiveUnusable,
   CutGames,
-  WeeklyCopyFailed
+  WeeklyCopyFailed,
+  BackupLacksRoom
 };
 
 struct DeskEntry {

@@ -101,8 +101,8 @@ int Session::ChosenIn(const MissionList& missions) const {
   return found == items.end() ? MissionList::None : static_cast<int>(found - items.begin());
 }
 
-void Session::BackUpMembers() {
-  backups_->CopyNow(*dbMembers_, sources_->UserDataFolder + "/members.mdb");
+bool Session::BackUpMembers(const KeepOn& keepOn) {
+  return backups_->CopyNow(*dbMembers_, sources_->UserDataFolder + "/members.mdb", keepOn);
 }
 
 std::string Session::TakeBackupFailure() {

@@ -80,10 +80,13 @@ class Session {
   /// opened or read; what was open stays open then.
   void Reopen();
 
-  /// Copies the members as they are now to the backup copies. Throws RuntimeError if it cannot.
-  void BackUpMembers();
+  /// Copies the members as they are now to the backup copies. False if it was stopped. Throws RuntimeError if
+  /// it cannot.
+  bool BackUpMembers(const KeepOn& keepOn);
   /// Returns the operator's message about a backup copy that failed, or an empty text if there is none.
   std::string TakeBackupFailure();
+  /// True if a change was made without one, since too little of the disk is free.
+  bool BackupLacksRoom() const { return backups_ && backups_->LacksRoom(); }
 
   ::Game& Game() { return game_; }
   SoldieringFactors& Factors() { return factors_; }

@@ -80,6 +80,17 @@ void SqliteDatabase::CommitTrans() {
   group_.reset();
 }
 
+void SqliteDatabase::FlushGroup() {
+  if (!group_) {
+    return;
+  }
+  const int result = sqlite3_db_cacheflush(connection_.Handle());
+  // The commit can still write what others who are reading keep it from writing now.
+  if (result != SQLITE_BUSY && (result != SQLITE_OK || !FlushFile(connection_.Handle()))) {
+    connection_.Fail();
+  }
+}
+
 std::vector<std::string> SqliteDatabase::ColumnNames(const std::string& table) {
   const SqliteTable described(connection_, table);
   std::vector<std::string> names;

@@ -26,6 +26,7 @@ class SqliteDatabase : public Database {
   void BeginTrans() override { group_.emplace(connection_); }
   void CommitTrans() override;
   void Rollback() noexcept override { group_.reset(); }
+  void FlushGroup() override;
   void BeforeChange(std::function<bool()> action) override { connection_.BeforeChange(std::move(action)); }
   void CopyTo(const std::string& path) override { CopyWhole(connection_, path, nullptr); }
   bool CopyInSteps(const std::string& path, const KeepOn& keepOn) override {

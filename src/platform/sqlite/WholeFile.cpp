@@ -56,10 +56,14 @@ class SqliteStepwiseCopy : public StepwiseCopy {
   SqliteStepwiseCopy(const SqliteStepwiseCopy&) = delete;
   SqliteStepwiseCopy& operator=(const SqliteStepwiseCopy&) = delete;
 
-  bool Step() override {
+  bool Step() override { return Advance(WhenLocked::TryAgain); }
+
+  enum class WhenLocked { TryAgain, Fail };
+  bool Advance(WhenLocked whenLocked) {
     switch (sqlite3_backup_step(backup_, PagesOfAStep)) {
       case SQLITE_DONE:
         Finish();
+        // A file that keeps a log would have its copy keep one too.
         sqlite3_exec(copy_.get(), "PRAGMA journal_mode = DELETE", nullptr, nullptr, nullptr);
         return true;
       case SQLITE_OK:
@@ -67,11 +71,15 @@ class SqliteStepwiseCopy : public StepwiseCopy {
         return false;
       case SQLITE_BUSY:
       case SQLITE_LOCKED:
-        return false;
+        if (whenLocked == WhenLocked::TryAgain) {
+          return false;
+        }
+        break;
       default:
-        Finish();
-        throw RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path_);
+        break;
     }
+    Finish();
+    throw RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path_);
   }
 
  private:
@@ -93,12 +101,8 @@ class SqliteStepwiseCopy : public StepwiseCopy {
     }
   }
 
-  /// What SQLite has handed to the system. It does so when its own memory for pages is full.
   void Flush() {
-    sqlite3_file* file = nullptr;
-    if (sqlite3_file_control(copy_.get(), "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK &&
-        file != nullptr && file->pMethods != nullptr &&
-        file->pMethods->xSync(file, SQLITE_SYNC_NORMAL | SQLITE_SYNC_DATAONLY) != SQLITE_OK) {
+    if (!FlushFile(copy_.get())) {
       throw RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path_);
     }
   }
@@ -114,12 +118,27 @@ std::unique_ptr<StepwiseCopy> BeginWholeCopy(SqliteConnection& connection, const
   return std::make_unique<SqliteStepwiseCopy>(connection, path);
 }
 
+bool FlushFile(sqlite3* database) {
+  sqlite3_file* file = nullptr;
+  return sqlite3_file_control(database, "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK &&
+         file != nullptr && file->pMethods != nullptr &&
+         file->pMethods->xSync(file, SQLITE_SYNC_NORMAL | SQLITE_SYNC_DATAONLY) == SQLITE_OK;
+}
+
 bool CopyWhole(SqliteConnection& connection, const std::string& path, const KeepOn& keepOn) {
+  if (keepOn) {
+    SqliteStepwiseCopy steps(connection, path);
+    while (!steps.Advance(SqliteStepwiseCopy::WhenLocked::Fail)) {
+      if (!keepOn()) {
+        return false;
+      }
+    }
+    return true;
+  }
   sqlite3* opened = nullptr;
   constexpr int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
   int result = sqlite3_open_v2(path.c_str(), &opened, flags, nullptr);
   const Handle copy(opened, sqlite3_close);
-  bool stopped = false;
   if (result == SQLITE_OK) {
     // A partial copy is of no use, so it needs no journal to be rolled back by.
     sqlite3_exec(opened, "PRAGMA journal_mode = OFF", nullptr, nullptr, nullptr);
@@ -127,18 +146,13 @@ bool CopyWhole(SqliteConnection& connection, const std::string& path, const Keep
     if (backup == nullptr) {
       throw SqliteError(opened, path);
     }
-    while (sqlite3_backup_step(backup, keepOn ? PagesOfAStep : -1) == SQLITE_OK) {
-      stopped = keepOn && !keepOn();
-      if (stopped) {
-        break;
-      }
-    }
+    sqlite3_backup_step(backup, -1);
     result = sqlite3_backup_finish(backup);
   }
   if (result == SQLITE_OK) {
     // A file that keeps a log would have its copy keep one too.
     sqlite3_exec(opened, "PRAGMA journal_mode = DELETE", nullptr, nullptr, nullptr);
-    return !stopped;
+    return true;
   }
   throw SqliteError(opened, path);
 }

@@ -14,6 +14,13 @@ namespace {
 using testing::ElementsAre;
 using testing::IsEmpty;
 
+/// A disk with that much space left.
+class DiskWithSpace : public LinuxFiles {
+ public:
+  std::uint64_t Space = std::uint64_t{1} << 40U;
+  std::uint64_t FreeSpace(const std::string& /*path*/) const override { return Space; }
+};
+
 /// A members file whose backups go to a folder beside it.
 class Backup : public testing::Test {
  protected:
@@ -48,7 +55,7 @@ class Backup : public testing::Test {
   }
 
   TestDatabase file;
-  LinuxFiles disk;
+  DiskWithSpace disk;
   FakeClock clock;
   StringTable strings{Language::English};
   std::unique_ptr<Backups> backups;
@@ -71,13 +78,13 @@ TEST_F(Backup, IsMadeAnewWhenAskedWhichCountsAsThatOfTheRun) {
   Open();
   Change("first");
   clock.DateAndTime = "2013-05-21 15:00:00";
-  backups->CopyNow(*database, file.Path());
+  backups->CopyNow(*database, file.Path(), nullptr);
   Change("second");
   EXPECT_THAT(Copies(), ElementsAre("members-2013-05-21-143005.mdb", "members-2013-05-21-150000.mdb"));
   EXPECT_EQ(NickNameIn("members-2013-05-21-150000.mdb"), "first");
   Open();
   clock.DateAndTime = "2013-05-22 15:00:00";
-  backups->CopyNow(*database, file.Path());
+  backups->CopyNow(*database, file.Path(), nullptr);
   Change("third");
   EXPECT_EQ(Copies().size(), 3U);
 }
@@ -225,6 +232,34 @@ TEST_F(Backup, IsNotMadeOfAFileThatCannotBeChanged) {
   EXPECT_EQ(NumberThrownBy([this] { Change("first"); }), 3027);
   EXPECT_THAT(Copies(), IsEmpty());
   EXPECT_EQ(backups->TakeFailure(), "");
+}
+
+TEST_F(Backup, OfNowIsMadeInStepsUnlessItIsStopped) {
+  Open();
+  file.Execute("UPDATE Members SET Photograph = randomblob(2000000)");
+  const std::vector<std::string> before = Copies();
+  clock.DateAndTime = "2026-11-22 10:00:00";
+  EXPECT_FALSE(backups->CopyNow(*database, file.Path(), [] { return false; }));
+  EXPECT_EQ(Copies(), before);
+  int asked = 0;
+  EXPECT_TRUE(backups->CopyNow(*database, file.Path(), [&asked] { return ++asked > 0; }));
+  EXPECT_GE(asked, 2);
+  EXPECT_EQ(NickNameIn("members-2026-11-22-100000.mdb"), "Shamrock");
+}
+
+TEST_F(Backup, LeavesRoomForGamesAndIsMadeBeforeALaterChange) {
+  Open();
+  disk.Space = (std::uint64_t{32} << 20U) + std::filesystem::file_size(file.Path()) - 1;
+  Change("first");
+  EXPECT_THAT(Copies(), IsEmpty());
+  EXPECT_EQ(backups->TakeFailure(), "");
+  EXPECT_TRUE(backups->LacksRoom());
+  EXPECT_EQ(NumberThrownBy([this] { backups->CopyNow(*database, file.Path(), nullptr); }), 61);
+  ++disk.Space;
+  Change("second");
+  EXPECT_FALSE(backups->LacksRoom());
+  EXPECT_EQ(Copies().size(), 1U);
+  EXPECT_EQ(NickNameIn(Copies().front()), "first");
 }
 
 }  // namespace

@@ -21,6 +21,7 @@ class NoDatabase : public Database {
   void BeginTrans() override {}
   void CommitTrans() override {}
   void Rollback() noexcept override {}
+  void FlushGroup() override {}
   void BeforeChange(std::function<bool()> action) override { BeforeChangeOf = std::move(action); }
   void CopyTo(const std::string& path) override { CopiedTo = path; }
   bool CopyInSteps(const std::string& path, const KeepOn& /*keepOn*/) override {

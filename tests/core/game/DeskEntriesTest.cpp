@@ -73,4 +73,21 @@ TEST(DeskEntries, NameFilesThatWereOrWereNotWritten) {
                           "The settings could not be saved: /data/tessarine.ini"));
 }
 
+TEST(DeskEntries, TellWhyGamesAndCopiesAreNotKeptAlsoWithoutAGame) {
+  DeskFacts facts;
+  facts.NotKept = "The disk is full.";
+  facts.KeptAt = "14:30";
+  facts.UnusableArchive = "/data/games.mdb";
+  facts.WeeklyCopyFailure = "No room.";
+  facts.BackupLacksRoom = true;
+  EXPECT_THAT(
+      Line(facts),
+      ElementsAre(
+          "No game on the board", "Not kept among the past games: The disk is full.",
+          testing::HasSubstr("The past games in /data/games.mdb cannot be read."),
+          "The weekly copy of the past games could not be made: No room.",
+          "No backup copy was made: too little of the disk is free. Delete what you no longer need."));
+  EXPECT_EQ(Line(facts, Language::SimplifiedChinese).size(), 5U);
+}
+
 }  // namespace

@@ -141,6 +141,37 @@ TEST_F(WriteGroup, LeavesTheOldRowsWhenTheLastFlushFails) {
   EXPECT_EQ(Names(), "A,Alice,Rhys,Zoe");
 }
 
+TEST_F(WriteGroup, ThatWasFlushedIsUndoneAndCommittedAsAnyOther) {
+  for (const bool commits : {false, true}) {
+    WriteScope group(*database);
+    Rename(1, "A");
+    database->FlushGroup();
+    EXPECT_EQ(OtherConnection(file.Path()).Try("SELECT * FROM Members"), SQLITE_BUSY);
+    Rename(5, "B");
+    database->FlushGroup();
+    if (commits) {
+      group.Commit();
+    } else {
+      database->Rollback();
+      EXPECT_EQ(Names(), "Sean,Alice,Rhys,Zoe");
+    }
+  }
+  EXPECT_EQ(Names(), "A,Alice,B,Zoe");
+  EXPECT_EQ(file.Query("PRAGMA integrity_check"), "ok");
+  database->FlushGroup();  // nothing without a group
+}
+
+TEST_F(WriteGroup, CommitsThoughItCannotBeFlushedWhileOthersRead) {
+  OtherConnection other(file.Path());
+  other.Execute("BEGIN; SELECT count(*) FROM Members");
+  WriteScope group(*database);
+  Rename(1, "A");
+  database->FlushGroup();
+  other.Execute("COMMIT");
+  group.Commit();
+  EXPECT_EQ(Names(), "A,Alice,Rhys,Zoe");
+}
+
 TEST_F(WriteGroup, NeedsABeginning) {
   EXPECT_EQ(NumberThrownBy([&] { database->CommitTrans(); }), 3034);
 }
