@@ -37,6 +37,7 @@ void frmRx::SetUpResults() {
   results_->setParent(this);
   hidden_->OnChange = [this] { ShowOtherNames(); };
   connect(&*audience_, &AudienceBoard::Changed, &*results_, &ResultsHost::Follow);
+  connect(&*audience_, &AudienceBoard::Switched, &*results_, &ResultsHost::Follow);
   connect(&*results_, &ResultsHost::Changed, this,
           [this] { audience_->State().SetAddress(results_->Url()); });
   connect(&*results_, &ResultsHost::NamesChanged, &*audience_, &AudienceBoard::ShowOtherNames);

@@ -3,6 +3,7 @@
 #include <qrencode.h>
 
 #include <QPainter>
+#include <QPainterPath>
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
@@ -42,10 +43,22 @@ void PaintQrCode(QPainter& painter, const QRectF& area, const std::string& text)
   }
   const double most = std::min(area.width(), area.height());
   const double whole = std::floor(most / code.width());
-  const double side = whole >= 1 ? whole * code.width() : most;
-  const QPointF corner = area.center() - QPointF(side / 2, side / 2);
-  const bool wasSmooth = painter.testRenderHint(QPainter::SmoothPixmapTransform);
-  painter.setRenderHint(QPainter::SmoothPixmapTransform, false);
-  painter.drawImage(QRectF(std::round(corner.x()), std::round(corner.y()), side, side), code);
-  painter.setRenderHint(QPainter::SmoothPixmapTransform, wasSmooth);
+  const double module = whole >= 1 ? whole : most / code.width();
+  const double side = module * code.width();
+  const QPointF corner(std::round(area.center().x() - side / 2), std::round(area.center().y() - side / 2));
+  // One shape: pictures lose their edges on paper, and single squares show the joints between them.
+  QPainterPath modules;
+  modules.setFillRule(Qt::WindingFill);
+  for (int row = 0; row < code.height(); ++row) {
+    for (int column = 0; column < code.width(); ++column) {
+      if (code.pixelColor(column, row) == Qt::black) {
+        modules.addRect(corner.x() + column * module, corner.y() + row * module, module, module);
+      }
+    }
+  }
+  const bool wasSmooth = painter.testRenderHint(QPainter::Antialiasing);
+  painter.setRenderHint(QPainter::Antialiasing, false);
+  painter.fillRect(QRectF(corner, QSizeF(side, side)), Qt::white);
+  painter.fillPath(modules, Qt::black);
+  painter.setRenderHint(QPainter::Antialiasing, wasSmooth);
 }

@@ -79,6 +79,7 @@ void ResultsHost::Begin() {
 
 void ResultsHost::End() {
   subscription_.End();
+  setup_.On = false;  // in this run; a start that is still due finds nothing to do
   running_.reset();
 }
 

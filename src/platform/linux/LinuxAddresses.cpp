@@ -86,7 +86,7 @@ std::vector<LocalAddress> LinuxAddresses::Private() const {
                            .IsOfDefaultRoute = defaultCard == entry->ifa_name});
     }
   }
-  std::ranges::stable_partition(addresses,
-                                [](const LocalAddress& each) { return !each.Address.starts_with("127."); });
+  std::stable_partition(addresses.begin(), addresses.end(),
+                        [](const LocalAddress& each) { return !each.Address.starts_with("127."); });
   return addresses;
 }

@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "tests/support/ScoredGame.h"
 #include "tests/support/PrivateData.h"
+#include "tests/support/ScoredGame.h"
 #include "tests/web/Games.h"
 #include "tests/web/server/ResultsProgram.h"
 #include "web/ResultsPages.h"
