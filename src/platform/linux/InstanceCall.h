@@ -30,8 +30,8 @@ class InstanceCall {
 
   const InstanceRequest& Request() const { return request_; }
 
-  /// Tells the caller that the request is taken. False if the caller has gone: then it has told its user that nobody
-  /// answers, and the request is void.
+  /// Tells the caller that the request is taken. False if the caller has gone: then it has told its user that
+  /// nobody answers, and the request is void.
   bool Answer() const;
 
  private:
