@@ -33,6 +33,7 @@ void SetCaptions(Ui::frmRx& ui, const StringTable& strings) {
       {ui.mnuExit, 210},
       {ui.mnuGameCharts, static_cast<int>(OwnText::GameChartsItem)},
       {ui.mnuExport, static_cast<int>(OwnText::GameExportMenu)},
+      {ui.mnuImportGames, static_cast<int>(OwnText::ImportGamesItem)},
       {ui.mnuMissions->menuAction(), 211},
       {ui.mnuMissionResults, 212},
       {ui.mnuSetupMissions, 213},

@@ -125,12 +125,19 @@ void frmRx::SetUpDesk() {
 }
 
 void frmRx::SetUpKeeping() {
+  DatabaseEngine& archives = services_.Archives != nullptr ? *services_.Archives : services_.Databases;
+  archive_.emplace(ArchiveAccess::Parts{.Session = session_,
+                                        .Disk = services_.Disk,
+                                        .Engine = archives,
+                                        .Strings = services_.Strings,
+                                        .UserDataFolder = userDataFolder_,
+                                        .ProgramFolder = services_.Places.Program()});
   keeping_.emplace(
       GameKeeper::Parts{.Session = session_,
                         .Progress = desk_->Progress(),
                         .Time = services_.Time,
                         .Disk = services_.Disk,
-                        .Engine = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
+                        .Engine = archives,
                         .Strings = services_.Strings,
                         .UserDataFolder = userDataFolder_,
                         .ProgramFolder = services_.Places.Program()},
@@ -198,6 +205,7 @@ void frmRx::ConnectCommands() {
                                {ui_->mnuSaveScores, &frmRx::SaveGame},
                                {ui_->mnuClearScores, &frmRx::ClearGame},
                                {ui_->mnuExport, &frmRx::ExportGame},
+                               {ui_->mnuImportGames, &frmRx::ImportGameFiles},
                                {ui_->mnuGetKeshData, &frmRx::GetScoreData},
                                {ui_->mnuPrintScores, &frmRx::PrintScores},
                                {ui_->mnuCommPort, &frmRx::ShowCommPortSettings},
@@ -268,6 +276,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
   }
   if (desk_) {
     keeping_->End();
+    archive_->Close();
     desk_->End();
     charts_->Close();
   }

@@ -13,6 +13,7 @@
 #include "app/GameKeeping.h"
 #include "app/Services.h"
 #include "app/WordProcessorStart.h"
+#include "archive/ArchiveAccess.h"
 #include "archive/copies/CopyWork.h"
 #include "audience/AudienceBoard.h"
 #include "audience/AudienceCopy.h"
@@ -26,7 +27,7 @@
 #include "devices/charging/ChargedButtons.h"
 #include "manual/ManualKey.h"
 #include "sheets/PrintOptions.h"
-#include "takeover/TakeOverWork.h"
+#include "takeover/TakeOver.h"
 #include "ui/Commands.h"
 #include "ui/WindowPlaces.h"
 
@@ -82,6 +83,9 @@ class frmRx : public QMainWindow {
   void SaveGame();
   void ClearGame();
   void ExportGame();
+  /// Exports the game on the board, a period's games, or these past ones.
+  void ShowExport(const std::vector<std::int64_t>& chosen);
+  void ImportGameFiles();
   void GetScoreData();
   /// Tracks the word processor until it is ready. If it is missing, says so once and continues without
   /// printing.
@@ -115,6 +119,7 @@ class frmRx : public QMainWindow {
   CopyWork::Parts CopyParts() const;
   /// What a take-over of old data works on.
   TakeOverWork::Parts TakeOverParts();
+  ImportedGames ImportOldGames(const std::string& folder, FilesOfMembers members, const KeepOn& keepOn);
   /// Why no old installation can be taken over now; empty if one can.
   std::string WhyNoTakeOver();
 
@@ -167,6 +172,7 @@ class frmRx : public QMainWindow {
   QTimer wordProcessorTimer_;
   Commands commands_;
   std::optional<Desk> desk_;
+  std::optional<ArchiveAccess> archive_;  ///< for windows; the keeper has its own
   std::optional<GameKeeping> keeping_;
   std::optional<BoardCharts> charts_;
   GuestList guests_;

@@ -9,6 +9,8 @@
 
 #include "app/StateKeys.h"
 #include "app/frmRx.h"
+#include "archive/exported/ArchivedGames.h"
+#include "archive/import/ImportGames.h"
 #include "core/gamefile/SuggestedName.h"
 #include "core/text/Filled.h"
 #include "exports/ExportGames.h"
@@ -55,13 +57,17 @@ void frmRx::SaveGame() {
 }
 
 void frmRx::ExportGame() {
+  ShowExport({});
+}
+
+void frmRx::ShowExport(const std::vector<std::int64_t>& chosen) {
   const auto nickNameOf = [this](std::int32_t contactId) { return session_.Members().NickNameOf(contactId); };
   const auto fullNameOf = [this](std::int32_t contactId) {
     const std::optional<Member> member = session_.Members().FindMember(contactId);
     return member ? FullName{member->FirstName, member->LastName} : FullName();
   };
   const std::string received = desk_->Progress().Received();
-  const auto games = [&](const std::function<void(const ExportedGame&)>& take) {
+  const auto game = [&](const std::function<void(const ExportedGame&)>& take) {
     const ReadScope scope(session_.DbMembers());
     take({.Game = session_.Game(),
           .Received = received,
@@ -69,13 +75,33 @@ void frmRx::ExportGame() {
           .Standings = Standings(session_.Game(), nickNameOf),
           .FullNameOf = fullNameOf});
   };
-  ExportGames({.Games = games,
-               .HasGames = session_.Game().DataPresent,
+  ArchivedGames past(*archive_, session_, services_.Strings);
+  ExportGames({.Game = session_.Game().DataPresent ? ExportGames::ThisGame(game) : nullptr,
                .SuggestedName = SuggestedFileName(received, session_.Missions().Text(), {}),
+               .Past = past,
+               .Chosen = past.InOrder(chosen),
                .CommonDialog1 = services_.CommonDialog1,
                .Disk = services_.Disk,
                .Boxes = services_.Boxes,
+               .Events = services_.Events,
+               .Time = services_.Time,
                .Strings = services_.Strings},
+              this)
+      .exec();
+}
+
+void frmRx::ImportGameFiles() {
+  ImportGames({.Archives = *archive_,
+               .Members = session_.DbMembers(),
+               .Disk = services_.Disk,
+               .CommonDialog1 = services_.CommonDialog1,
+               .Boxes = services_.Boxes,
+               .Events = services_.Events,
+               .Elapsed = services_.Elapsed,
+               .Time = services_.Time,
+               .Strings = services_.Strings,
+               .Factors = session_.Factors(),
+               .UserDataFolder = userDataFolder_},
               this)
       .exec();
 }

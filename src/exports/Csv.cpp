@@ -132,6 +132,15 @@ void CsvWriter::Number(std::int64_t cell) {
 }
 
 void CsvWriter::Number(double cell) {
+  AddFraction(cell);
+}
+
+void CsvWriter::Number(float cell) {
+  AddFraction(cell);
+}
+
+template <typename Type>
+void CsvWriter::AddFraction(Type cell) {
   if (!std::isfinite(cell)) {
     Empty();
     return;

@@ -33,6 +33,8 @@ class CsvWriter {
   /// With the fewest digits that read back as the same value, and a point; an infinity or a NaN is an empty
   /// cell.
   void Number(double cell);
+  /// With the fewest digits that read back as the same float.
+  void Number(float cell);
   /// No value.
   void Empty();
   void EndRow();
@@ -41,6 +43,8 @@ class CsvWriter {
   std::string Take();
 
  private:
+  template <typename Type>
+  void AddFraction(Type cell);
   void Begin();
 
   const char separator_;

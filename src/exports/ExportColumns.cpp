@@ -135,3 +135,79 @@ NamedValues HitOf(const ExportedGame& game, const ExportedHit& hit) {
           {"victim_name", NameInGame(game, hit.Victim)},
           {"damage", Whole(hit.Damage)}};
 }
+
+PlayerFigures FiguresOf(const ExportedGame& game, const Standing& standing, std::int64_t gameId,
+                        bool fullNames) {
+  const Player& record = game.Game.Players(standing.Index);
+  return {.GameId = gameId,
+          .Received = game.Received,
+          .GameDate = game.Game.GameDate,
+          .Mission = game.Mission,
+          .Place = standing.Place,
+          .Index = standing.Index,
+          .Name = standing.PublicName,
+          .Person = fullNames ? FullNameIn(game, standing.Index) : FullName(),
+          .Member = record.MemberIndex,
+          .Button = record.DallasID,
+          .Soldiering = standing.Soldiering,
+          .Accuracy = standing.Accuracy,
+          .Damage = standing.DamageDealt,
+          .Shots = standing.Shots,
+          .Heals = standing.Wia,
+          .Deaths = standing.Kia,
+          .AmmoAdds = standing.AmmoAdds,
+          .Committed = record.Committed,
+          .DamageTaken = standing.DamageTaken};
+}
+
+std::vector<std::string_view> FigureColumns(const PersonalData& personal) {
+  std::vector<std::string_view> names = {"game",   "received", "game_date", "mission", "place",
+                                         "player", "team",     "number",    "name"};
+  if (personal.FullNames) {
+    names.insert(names.end(), {"first_name", "last_name"});
+  }
+  if (personal.MemberNumbers) {
+    names.emplace_back("member");
+  }
+  if (personal.Buttons) {
+    names.emplace_back("button");
+  }
+  names.insert(names.end(), {"soldiering", "accuracy", "damage", "shots", "heals", "deaths", "ammo_adds",
+                             "committed", "damage_taken"});
+  return names;
+}
+
+// Cell by cell and without a list of them: there may be millions of rows.
+void WriteFigures(CsvWriter& writer, const PlayerFigures& figures, int number, const PersonalData& personal) {
+  const auto textOrNone = [&writer](std::string_view text) {
+    text.empty() ? writer.Empty() : writer.Text(text);
+  };
+  writer.Number(std::int64_t{number});
+  textOrNone(figures.Received);
+  textOrNone(figures.GameDate);
+  writer.Text(figures.Mission);
+  writer.Number(std::int64_t{figures.Place});
+  writer.Number(std::int64_t{figures.Index});
+  const std::uint8_t id = IdFromIndex(figures.Index);
+  writer.Number(std::int64_t{TeamFromId(id)});
+  writer.Number(std::int64_t{PlayerNumberFromId(id)});
+  writer.Text(figures.Name);
+  if (personal.FullNames) {
+    textOrNone(figures.Person.First);
+    textOrNone(figures.Person.Last);
+  }
+  if (personal.MemberNumbers) {
+    figures.Member != 0 ? writer.Number(figures.Member) : writer.Empty();
+  }
+  if (personal.Buttons) {
+    textOrNone(figures.Button == NoDallasId ? std::string_view() : figures.Button);
+  }
+  writer.Number(figures.Soldiering);
+  figures.Accuracy ? writer.Number(*figures.Accuracy) : writer.Empty();
+  for (const std::int64_t count :
+       {figures.Damage, figures.Shots, figures.Heals, figures.Deaths, figures.AmmoAdds}) {
+    writer.Number(count);
+  }
+  writer.Text(figures.Committed ? "true" : "false");
+  writer.Number(figures.DamageTaken);
+}

@@ -26,9 +26,6 @@ struct ExportedGame {
   FullNames FullNameOf = {};  ///< asked only where the operator wants full names
 };
 
-/// Hands over game after game.
-using ExportedGames = std::function<void(const std::function<void(const ExportedGame&)>& take)>;
-
 /// What an export tells of a person beyond the public name.
 struct PersonalData {
   bool FullNames = false;

@@ -1,7 +1,5 @@
 #include "exports/GameCsv.h"
 
-#include "exports/ExportColumns.h"
-
 namespace {
 
 void WriteCell(CsvWriter& writer, const ExportValue& value) {
@@ -38,41 +36,62 @@ ExportedGame GameWithoutPlayers() {
 
 }  // namespace
 
-std::string PlayersCsv(const ExportedGames& games, const CsvForm& form, const PersonalData& personal) {
-  CsvWriter writer(form.Separator, form.ByteOrderMark);
+PlayersCsv::PlayersCsv(const CsvForm& form, const PersonalData& personal)
+    : writer_(form.Separator, form.ByteOrderMark), personal_(personal) {
   const ExportedGame model = GameWithoutPlayers();
-  AddHeaders(writer, HeadOf(model, 0));
-  AddHeaders(writer, PlayerOf(model, {.Index = 1}, personal));
-  AddHeaders(writer, RestOf(model));
-  writer.EndRow();
-  int number = 0;
-  games([&](const ExportedGame& game) {
-    const NamedValues head = HeadOf(game, ++number);
-    const NamedValues rest = RestOf(game);
-    for (const Standing& standing : game.Standings) {
-      AddCells(writer, head);
-      AddCells(writer, PlayerOf(game, standing, personal));
-      AddCells(writer, rest);
-      writer.EndRow();
-    }
-  });
-  return writer.Take();
+  AddHeaders(writer_, HeadOf(model, 0));
+  AddHeaders(writer_, PlayerOf(model, {.Index = 1}, personal_));
+  AddHeaders(writer_, RestOf(model));
+  writer_.EndRow();
 }
 
-std::string HitsCsv(const ExportedGames& games, const CsvForm& form) {
-  CsvWriter writer(form.Separator, form.ByteOrderMark);
+void PlayersCsv::Add(const ExportedGame& game) {
+  const NamedValues head = HeadOf(game, ++number_);
+  const NamedValues rest = RestOf(game);
+  for (const Standing& standing : game.Standings) {
+    AddCells(writer_, head);
+    AddCells(writer_, PlayerOf(game, standing, personal_));
+    AddCells(writer_, rest);
+    writer_.EndRow();
+  }
+}
+
+HitsCsv::HitsCsv(const CsvForm& form) : writer_(form.Separator, form.ByteOrderMark) {
   const ExportedGame model = GameWithoutPlayers();
-  AddHeaders(writer, HeadOf(model, 0));
-  AddHeaders(writer, HitOf(model, {1, 1, 0}));
-  writer.EndRow();
-  int number = 0;
-  games([&](const ExportedGame& game) {
-    const NamedValues head = HeadOf(game, ++number);
-    for (const ExportedHit& hit : HitsOf(game.Game)) {
-      AddCells(writer, head);
-      AddCells(writer, HitOf(game, hit));
-      writer.EndRow();
-    }
-  });
-  return writer.Take();
+  AddHeaders(writer_, HeadOf(model, 0));
+  AddHeaders(writer_, HitOf(model, {1, 1, 0}));
+  writer_.EndRow();
+}
+
+void HitsCsv::Add(const ExportedGame& game) {
+  const NamedValues head = HeadOf(game, ++number_);
+  for (const ExportedHit& hit : HitsOf(game.Game)) {
+    AddCells(writer_, head);
+    AddCells(writer_, HitOf(game, hit));
+    writer_.EndRow();
+  }
+}
+
+FiguresCsv::FiguresCsv(const CsvForm& form, const PersonalData& personal)
+    : writer_(form.Separator, form.ByteOrderMark), personal_(personal) {
+  for (const std::string_view name : FigureColumns(personal_)) {
+    writer_.Text(name);
+  }
+  writer_.EndRow();
+}
+
+void FiguresCsv::Add(const ExportedGame& game) {
+  const std::int64_t gameId = gameId_ + 1;
+  for (const Standing& standing : game.Standings) {
+    Add(FiguresOf(game, standing, gameId, personal_.FullNames));
+  }
+}
+
+void FiguresCsv::Add(const PlayerFigures& figures) {
+  if (figures.GameId != gameId_) {
+    gameId_ = figures.GameId;
+    ++number_;
+  }
+  WriteFigures(writer_, figures, number_, personal_);
+  writer_.EndRow();
 }

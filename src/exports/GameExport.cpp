@@ -3,24 +3,27 @@
 #include "exports/GameJson.h"
 #include "exports/GamePage.h"
 
-std::string ExportBytes(const ExportedGames& games, const ExportChoice& choice, const StringTable& strings) {
+std::unique_ptr<GameWriter> MakeGameWriter(const ExportChoice& choice, const StringTable& strings) {
   switch (choice.Format) {
     case ExportFormat::Players:
-      return PlayersCsv(games, choice.Csv, choice.Personal);
+      return std::make_unique<PlayersCsv>(choice.Csv, choice.Personal);
     case ExportFormat::Hits:
-      return HitsCsv(games, choice.Csv);
+      return std::make_unique<HitsCsv>(choice.Csv);
     case ExportFormat::Json:
-      return GamesJson(games, choice.Personal);
+      return std::make_unique<GamesJson>(choice.Personal);
     case ExportFormat::Page:
-      return GamesPage(games, choice.Personal, strings);
+      return std::make_unique<GamesPage>(choice.Personal, strings);
+    case ExportFormat::Figures:
+      return std::make_unique<FiguresCsv>(choice.Csv, choice.Personal);
   }
-  return {};
+  return nullptr;
 }
 
 std::string ExportFilter(ExportFormat format, const StringTable& strings) {
   switch (format) {
     case ExportFormat::Players:
     case ExportFormat::Hits:
+    case ExportFormat::Figures:
       return strings.Text(OwnText::GameExportCsvFiles) + " (*.csv)|*.csv";
     case ExportFormat::Json:
       return strings.Text(OwnText::GameExportJsonFiles) + " (*.json)|*.json";
@@ -41,6 +44,8 @@ std::string ExportFileName(std::string_view base, ExportFormat format) {
       return name.append(".json");
     case ExportFormat::Page:
       return name.append(".html");
+    case ExportFormat::Figures:
+      return name.append(" figures.csv");
   }
   return name;
 }

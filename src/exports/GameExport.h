@@ -1,24 +1,26 @@
 #pragma once
 
+#include <memory>
 #include <string>
 #include <string_view>
 
 #include "core/text/StringTable.h"
 #include "exports/ExportedGame.h"
 #include "exports/GameCsv.h"
+#include "exports/GameWriter.h"
 
-enum class ExportFormat { Players, Hits, Json, Page };
-inline constexpr int ExportFormatCount = 4;
+enum class ExportFormat { Players, Hits, Json, Page, Figures };
+inline constexpr int ExportFormatCount = 5;
 
 /// What the operator wants to have exported.
 struct ExportChoice {
   ExportFormat Format = ExportFormat::Players;
-  CsvForm Csv = {};            ///< for the two tables
+  CsvForm Csv = {};            ///< for the tables
   PersonalData Personal = {};  ///< a table of hits has none
 };
 
-/// The contents of the file.
-std::string ExportBytes(const ExportedGames& games, const ExportChoice& choice, const StringTable& strings);
+/// What writes games so; `strings` must outlive it.
+std::unique_ptr<GameWriter> MakeGameWriter(const ExportChoice& choice, const StringTable& strings);
 
 /// The filter of a file dialog, with the ending of such files: "Tables |*.csv".
 std::string ExportFilter(ExportFormat format, const StringTable& strings);

@@ -38,23 +38,19 @@ std::string LineOf(const Json& value) {
   return value.dump(compact);
 }
 
-/// Objects one below the other, so that the file can be read and compared by lines.
-class JsonLines {
+/// A list whose objects stand one below the other, so that the file can be read and compared by lines.
+class ListLines {
  public:
-  explicit JsonLines(std::string& text) : text_(text) { text_.append("["); }
-
-  void Begin() {
-    text_.append(empty_ ? "\n" : ",\n");
+  /// Returns what stands before the next object.
+  const char* Next() {
+    const char* before = empty_ ? "[\n" : ",\n";
     empty_ = false;
+    return before;
   }
-  void Add(const NamedValues& values) {
-    Begin();
-    text_.append(LineOf(ObjectOf(values)));
-  }
-  void End() { text_.append(empty_ ? "]" : "\n]"); }
+  /// Returns what stands behind the last one.
+  const char* End() const { return empty_ ? "[]" : "\n]"; }
 
  private:
-  std::string& text_;
   bool empty_ = true;
 };
 
@@ -64,33 +60,34 @@ void AddGame(std::string& text, const ExportedGame& game, int number, const Pers
   std::string line = LineOf(head);
   line.pop_back();  // the brace: the lists belong to the same object
   text.append(line).append(",\n\"players\": ");
-  JsonLines players(text);
+  ListLines players;
   for (const Standing& standing : game.Standings) {
-    players.Add(PlayerOf(game, standing, personal));
+    text.append(players.Next()).append(LineOf(ObjectOf(PlayerOf(game, standing, personal))));
   }
-  players.End();
-  text.append(",\n\"hits\": ");
-  JsonLines hits(text);
+  text.append(players.End()).append(",\n\"hits\": ");
+  ListLines hits;
   for (const ExportedHit& hit : HitsOf(game.Game)) {
-    hits.Add(HitOf(game, hit));
+    text.append(hits.Next()).append(LineOf(ObjectOf(HitOf(game, hit))));
   }
-  hits.End();
-  text.append("}");
+  text.append(hits.End()).append("}");
 }
 
 }  // namespace
 
-std::string GamesJson(const ExportedGames& games, const PersonalData& personal) {
-  std::string text = "{\"format\": ";
-  text.append(LineOf(GameJsonFormat)).append(", \"version\": ").append(std::to_string(GameJsonVersion));
-  text.append(", \"games\": ");
-  JsonLines list(text);
-  int number = 0;
-  games([&](const ExportedGame& game) {
-    list.Begin();
-    AddGame(text, game, ++number, personal);
-  });
-  list.End();
-  text.append("}\n");
-  return text;
+GamesJson::GamesJson(const PersonalData& personal) : personal_(personal) {
+  text_.append("{\"format\": ").append(LineOf(GameJsonFormat));
+  text_.append(", \"version\": ").append(std::to_string(GameJsonVersion)).append(", \"games\": ");
+}
+
+void GamesJson::Add(const ExportedGame& game) {
+  text_.append(number_ == 0 ? "[\n" : ",\n");
+  AddGame(text_, game, ++number_, personal_);
+}
+
+void GamesJson::End() {
+  text_.append(number_ == 0 ? "[]}\n" : "\n]}\n");
+}
+
+std::string GamesJson::Take() {
+  return std::exchange(text_, {});
 }

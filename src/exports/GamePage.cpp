@@ -219,12 +219,21 @@ std::string GameHtml(const GamePageParts& parts) {
   return html.append("</article>\n");
 }
 
-std::string GamesPage(const ExportedGames& games, const PersonalData& personal, const StringTable& strings) {
+GamesPage::GamesPage(const PersonalData& personal, const StringTable& strings)
+    : personal_(personal), strings_(strings) {
   const std::string& title = strings.Text(OwnText::PageGameResults);
-  std::string body = "<h1>" + HtmlText(title) + "</h1>\n";
-  int number = 0;
-  games([&](const ExportedGame& game) {
-    body.append(GameHtml({.Game = game, .Strings = strings, .Personal = personal, .Number = ++number}));
-  });
-  return HtmlPage(title, body, strings.TextLanguage());
+  html_.append(HtmlPageStart(title, strings.TextLanguage()));
+  html_.append("<h1>").append(HtmlText(title)).append("</h1>\n");
+}
+
+void GamesPage::Add(const ExportedGame& game) {
+  html_.append(GameHtml({.Game = game, .Strings = strings_, .Personal = personal_, .Number = ++number_}));
+}
+
+void GamesPage::End() {
+  html_.append(HtmlPageEnd());
+}
+
+std::string GamesPage::Take() {
+  return std::exchange(html_, {});
 }

@@ -3,7 +3,7 @@
 #include <string>
 
 #include "core/text/StringTable.h"
-#include "exports/ExportedGame.h"
+#include "exports/GameWriter.h"
 
 // The parts of a page that shows games: markup for an HtmlPage, with every text escaped. All of them show the
 // standings and never the board's ranks.
@@ -28,5 +28,19 @@ std::string PlayerHtml(const GamePageParts& parts, const Standing& standing);
 /// All of these under the game's mission and date.
 std::string GameHtml(const GamePageParts& parts);
 
-/// A whole page of these games.
-std::string GamesPage(const ExportedGames& games, const PersonalData& personal, const StringTable& strings);
+/// A whole page of games.
+class GamesPage : public GameWriter {
+ public:
+  /// `strings` must outlive the page.
+  GamesPage(const PersonalData& personal, const StringTable& strings);
+
+  void Add(const ExportedGame& game) override;
+  void End() override;
+  std::string Take() override;
+
+ private:
+  const PersonalData personal_;
+  const StringTable& strings_;
+  std::string html_;
+  int number_ = 0;
+};

@@ -78,7 +78,7 @@ void AddTeamStyle(std::string& style) {
 
 }  // namespace
 
-std::string HtmlPage(std::string_view title, std::string_view body, Language language) {
+std::string HtmlPageStart(std::string_view title, Language language) {
   std::string page = "<!DOCTYPE html>\n<html lang=\"";
   page.append(language == Language::English ? "en" : "zh-Hans")
       .append("\">\n<head>\n<meta charset=\"utf-8\"/>\n");
@@ -86,6 +86,9 @@ std::string HtmlPage(std::string_view title, std::string_view body, Language lan
   page.append("<meta http-equiv=\"Content-Security-Policy\" content=\"").append(Policy).append("\"/>\n");
   page.append("<title>").append(HtmlText(title)).append("</title>\n<style>").append(Style);
   AddTeamStyle(page);
-  page.append("</style>\n</head>\n<body>\n<main>\n").append(body).append("</main>\n</body>\n</html>\n");
-  return page;
+  return page.append("</style>\n</head>\n<body>\n<main>\n");
+}
+
+std::string_view HtmlPageEnd() {
+  return "</main>\n</body>\n</html>\n";
 }

@@ -13,6 +13,13 @@ bool MayStandInHtml(char32_t character) {
   return !isControl && !isNoCharacter;
 }
 
+/// Marks that turn the direction of writing, line and paragraph ends, and the byte-order mark.
+bool IsUnseenMark(char32_t character) {
+  return character == 0x061C || character == 0x200E || character == 0x200F ||
+         (character >= 0x2028 && character <= 0x202E) || (character >= 0x2066 && character <= 0x2069) ||
+         character == 0xFEFF;
+}
+
 std::string_view EscapeOf(char byte) {
   switch (byte) {
     case '&':
@@ -42,7 +49,7 @@ std::string Element(std::string_view start, std::string_view html, std::string_v
 
 }  // namespace
 
-std::string HtmlText(std::string_view text) {
+std::string HtmlText(std::string_view text, HtmlUnseen unseen) {
   std::string html;
   html.reserve(text.size());
   while (!text.empty()) {
@@ -51,17 +58,21 @@ std::string HtmlText(std::string_view text) {
     text.remove_prefix(character.size());
     if (const std::string_view escape = EscapeOf(character.front()); !escape.empty()) {
       html.append(escape);
-    } else if (length == 0 || !MayStandInHtml(Utf8::CharacterOf(character))) {
-      html.append(ReplacementCharacter);
-    } else {
+      continue;
+    }
+    const char32_t code = length == 0 ? U'\0' : Utf8::CharacterOf(character);
+    const bool isFit = length != 0 && MayStandInHtml(code);
+    if (unseen == HtmlUnseen::Kept) {
+      html.append(isFit ? character : ReplacementCharacter);
+    } else if (isFit && !IsUnseenMark(code)) {
       html.append(character);
     }
   }
   return html;
 }
 
-std::string HtmlName(std::string_view text) {
-  return Element("<bdi>", HtmlText(text), "</bdi>");
+std::string HtmlName(std::string_view text, HtmlUnseen unseen) {
+  return Element("<bdi>", HtmlText(text, unseen), "</bdi>");
 }
 
 std::string HtmlNumberHead(std::string_view html) {

@@ -55,6 +55,7 @@ const std::vector<WindowPage>& WindowPages() {
       {"PrintOptions", "Score sheets", "成绩单"},
       {"SheetProgressWindow", "Score sheets", "成绩单"},
       {"ExportGames", "Export", "导出"},
+      {"ImportGames", "Past games", "历史比赛"},
       {"Settings", "Settings", "设置"},
       {"SoldieringCalc", "Soldiering calculation", "战功计算"},
       {"RemoteManage", "Remote management", "远程管理"},

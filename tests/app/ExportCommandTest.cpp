@@ -124,4 +124,27 @@ TEST_F(ExportCommand, HasNothingToExportOnAnEmptyBoard) {
   EXPECT_EQ(act.Runs(), 1);
 }
 
+TEST_F(ExportCommand, TakesThePastGamesOfAPeriod) {
+  for (const int points : {5, 6, 7}) {
+    venue.LoadGame(GameFile(PlayerOf(1, "<BonusPoints>" + std::to_string(points) + "</BonusPoints>")));
+  }
+  venue.Boxes.Answers = {BoxAnswer::Ok};
+  venue.Trigger("mnuClearScores");
+  const std::string path = venue.Folder / "games.json";
+  const WhileModal<ExportGames> act([&](ExportGames& window) {
+    Find<QRadioButton>(window, "WhichPeriod").click();
+    Find<QRadioButton>(window, "FormatJson").click();
+    venue.Dialog.Answers = {path};
+    ::Press(window, "ExportButton");
+    window.close();
+  });
+  venue.Trigger("mnuExport");
+  EXPECT_EQ(act.Runs(), 1);
+  std::vector<int> soldiering;
+  for (const ordered_json& game : ordered_json::parse(ReadFile(path)).at("games")) {
+    soldiering.push_back(game.at("players").at(0).at("soldiering"));
+  }
+  EXPECT_THAT(soldiering, ElementsAre(5, 6, 7));
+}
+
 }  // namespace

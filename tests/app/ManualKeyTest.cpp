@@ -59,6 +59,7 @@ TEST_P(ManualKeyIn, EachWindowOpensItsPage) {
       {"mnuPrintScores", {"Score sheets", "成绩单"}},
       {"mnuAdminData", {"Administration data", "管理数据"}},
       {"mnuExport", {"Export", "导出"}},
+      {"mnuImportGames", {"Past games", "历史比赛"}},
       {"mnuMissionResults", {"Mission results", "任务结果"}},
       {"mnuSetupMissions", {"Missions", "任务"}},
       {"mnuManageMembers", {"Members", "会员"}},

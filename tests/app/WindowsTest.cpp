@@ -3,6 +3,7 @@
 #include "app/About.h"
 #include "app/UploadProgress.h"
 #include "archive/copies/BackupCopies.h"
+#include "archive/import/ImportGames.h"
 #include "audience/AudienceSettings.h"
 #include "audience/GuestNameEntry.h"
 #include "board/AdminData.h"
@@ -80,6 +81,7 @@ TEST_P(Windows, AreCaredFor) {
   LookAt<SoldieringCalc>("mnuSoldieringCalc");
   LookAt<AdminData>("mnuAdminData");
   LookAt<ExportGames>("mnuExport");
+  LookAt<ImportGames>("mnuImportGames");
   LookAt<AudienceSettings>("mnuAudienceSettings");
   LookAt<GuestNameEntry>("mnuGuestNames");
   LookAt<Scenarios>("mnuSetupMissions");

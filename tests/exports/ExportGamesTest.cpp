@@ -4,11 +4,17 @@
 
 #include <QCheckBox>
 #include <QComboBox>
+#include <QDateEdit>
 #include <QGroupBox>
 #include <QLabel>
+#include <QProgressBar>
 #include <QRadioButton>
 
+#include "tests/exports/CsvRows.h"
+#include "tests/exports/FakeExportSource.h"
 #include "tests/exports/SampleGame.h"
+#include "tests/fakes/FakeClock.h"
+#include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFileDialog.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/fakes/FakeMessageBoxes.h"
@@ -26,14 +32,18 @@ class ExportWindow : public testing::TestWithParam<Language> {
   ExportWindow() { disk.AddFolder("/home/op"); }
 
   ExportGames& Open(bool hasGames = true) {
-    window = std::make_unique<ExportGames>(ExportGames::Parts{.Games = sample.Games(),
-                                                              .HasGames = hasGames,
-                                                              .SuggestedName = "2026-11-21 2015 Courier",
-                                                              .CommonDialog1 = dialog,
-                                                              .Disk = disk,
-                                                              .Boxes = boxes,
-                                                              .Strings = sample.Strings},
-                                           nullptr);
+    window = std::make_unique<ExportGames>(
+        ExportGames::Parts{.Game = hasGames ? ExportGames::ThisGame(sample.Games()) : nullptr,
+                           .SuggestedName = "2026-11-21 2015 Courier",
+                           .Past = past,
+                           .Chosen = chosen,
+                           .CommonDialog1 = dialog,
+                           .Disk = disk,
+                           .Boxes = boxes,
+                           .Events = events,
+                           .Time = clock,
+                           .Strings = sample.Strings},
+        nullptr);
     Show(*window);
     return *window;
   }
@@ -62,6 +72,10 @@ class ExportWindow : public testing::TestWithParam<Language> {
   }
 
   SampleGame sample{GetParam()};
+  FakeExportSource past{GetParam()};
+  std::vector<std::int64_t> chosen;
+  FakeEventPump events;
+  FakeClock clock;
   FakeFileDialog dialog;
   FakeFiles disk;
   FakeMessageBoxes boxes;
@@ -74,7 +88,12 @@ TEST_P(ExportWindow, IsCaredForAndHasItsCaptions) {
   EXPECT_EQ(window->windowTitle().toStdString(), In("Export", "导出"));
   ExpectCaptions(
       *window,
-      {{"FormatFrame", In("What to export", "导出内容")},
+      {{"WhichFrame", In("Which games", "导出哪些比赛")},
+       {"WhichThis", In("The game on the board", "计分板上的比赛")},
+       {"WhichPeriod", In("Past games of a period", "某段时间的历史比赛")},
+       {"FormatFigures", In("Players with their main figures only, quick for many games (CSV)",
+                            "仅含主要数据的玩家表格，适合大量比赛 (CSV)")},
+       {"FormatFrame", In("What to export", "导出内容")},
        {"FormatPlayers", In("Players as a table (CSV)", "玩家表格 (CSV)")},
        {"FormatHits", In("Hits as a table (CSV)", "命中表格 (CSV)")},
        {"FormatJson",
@@ -91,7 +110,9 @@ TEST_P(ExportWindow, IsCaredForAndHasItsCaptions) {
        {"Buttons", In("Numbers of membership buttons", "会员扣号码")},
        {"ExportButton", In("Export...", "导出……")},
        {"CloseButton", In("Close", "关闭")}});
-  ExpectLabels(*window, {{"Separator", In("Separator", "分隔符")}});
+  ExpectLabels(
+      *window,
+      {{"Separator", In("Separator", "分隔符")}, {"From", In("From", "从")}, {"To", In("to", "到")}});
   const auto& separators = Find<QComboBox>(*window, "Separator");
   EXPECT_EQ(separators.itemText(0).toStdString(), In("Comma", "逗号"));
   EXPECT_EQ(separators.itemText(1).toStdString(), In("Semicolon", "分号"));
@@ -123,7 +144,8 @@ TEST_P(ExportWindow, WritesWhatIsChosen) {
   const std::pair<const char*, ExportFormat> formats[] = {{"FormatPlayers", ExportFormat::Players},
                                                           {"FormatHits", ExportFormat::Hits},
                                                           {"FormatJson", ExportFormat::Json},
-                                                          {"FormatPage", ExportFormat::Page}};
+                                                          {"FormatPage", ExportFormat::Page},
+                                                          {"FormatFigures", ExportFormat::Figures}};
   for (const auto& [button, format] : formats) {
     Choose(button);
     ExportTo("/home/op/a");
@@ -176,6 +198,8 @@ TEST_P(ExportWindow, EnablesWhatTheFormatHasUseFor) {
     return std::pair(Find<QGroupBox>(*window, "TableFrame").isEnabled(),
                      Find<QGroupBox>(*window, "PersonalFrame").isEnabled());
   };
+  EXPECT_EQ(enabled(), std::pair(true, true));
+  Choose("FormatFigures");
   EXPECT_EQ(enabled(), std::pair(true, true));
   Choose("FormatHits");
   EXPECT_EQ(enabled(), std::pair(true, false));
@@ -234,6 +258,99 @@ TEST_P(ExportWindow, IsUsedByKeys) {
   EXPECT_EQ(disk.Replaced.size(), 1U);
   Type(*window, Qt::Key_Escape);
   EXPECT_FALSE(window->isVisible());
+}
+
+TEST_P(ExportWindow, ExportsTheGamesThatWereChosenBefore) {
+  chosen = {4, 9};
+  Open();
+  const auto& button = Find<QRadioButton>(*window, "WhichChosen");
+  EXPECT_TRUE(button.isVisible());
+  EXPECT_TRUE(button.isChecked());
+  EXPECT_EQ(button.text().toStdString(), In("Chosen past games: 2", "选中的历史比赛：2 场"));
+  ExportTo("/home/op/a.csv");
+  EXPECT_EQ(dialog.Calls[0].Name, "games players.csv");
+  EXPECT_THAT(past.Asked, ElementsAre(4, 9));
+  const auto rows = CsvRecords(disk.Contents().at("/home/op/a.csv"));
+  EXPECT_EQ(rows.size(), 6U);
+  EXPECT_EQ(rows.back().at("mission"), "Game 9");
+  EXPECT_EQ(Outcome(), In("Saved 2 games: /home/op/a.csv", "已保存 2 场比赛：/home/op/a.csv"));
+}
+
+TEST_P(ExportWindow, HidesTheChosenGamesWhereThereAreNone) {
+  Open();
+  EXPECT_FALSE(Find<QRadioButton>(*window, "WhichChosen").isVisible());
+  EXPECT_TRUE(Find<QRadioButton>(*window, "WhichThis").isChecked());
+}
+
+TEST_P(ExportWindow, ExportsAPeriod) {
+  past.Games = {1, 2, 3};
+  Open(false);
+  EXPECT_FALSE(Find<QDateEdit>(*window, "From").isEnabled());
+  Choose("WhichPeriod");
+  EXPECT_TRUE(Find<QDateEdit>(*window, "From").isEnabled());
+  EXPECT_TRUE(Find<QPushButton>(*window, "ExportButton").isEnabled());
+  EXPECT_EQ(Outcome(), "");
+  Choose("FormatFigures");
+  ExportTo("/home/op/a.csv");
+  EXPECT_THAT(past.Periods, ElementsAre(std::pair("2013-05-01", "2013-05-21")));
+  EXPECT_EQ(dialog.Calls[0].Name, "games 2013-05-01 2013-05-21 figures.csv");
+  EXPECT_EQ(CsvRecords(disk.Contents().at("/home/op/a.csv")).size(), 9U);
+  Find<QDateEdit>(*window, "To").setDate(QDate(2013, 5, 7));
+  ExportTo("/home/op/a.csv");
+  EXPECT_EQ(past.Periods.back(), std::pair(std::string("2013-05-01"), std::string("2013-05-07")));
+}
+
+TEST_P(ExportWindow, SaysThatAPeriodHasNoGames) {
+  Open();
+  Choose("WhichPeriod");
+  ExportTo("/home/op/a.csv");
+  EXPECT_THAT(dialog.Calls, IsEmpty());
+  EXPECT_EQ(Outcome(), In("There are no games in this period.", "这段时间没有比赛。"));
+}
+
+TEST_P(ExportWindow, TellsHowManyGamesCouldNotBeRead) {
+  chosen = {1, 2, 3};
+  past.Damaged = {1, 3};
+  Open();
+  ExportTo("/home/op/a.csv");
+  EXPECT_EQ(Outcome(),
+            In("Saved 1 games: /home/op/a.csv  Games that cannot be read and are not in the file: 2",
+               "已保存 1 场比赛：/home/op/a.csv  无法读取、未写入文件的比赛：2 场"));
+}
+
+TEST_P(ExportWindow, KeepsPastGamesWithPersonalDataToTheUserAlone) {
+  chosen = {1};
+  Open();
+  Tick("MemberNumbers");
+  ExportTo("/home/op/personal");
+  EXPECT_THAT(disk.Private, ElementsAre("/home/op/personal"));
+}
+
+TEST_P(ExportWindow, StopsAndWritesNothing) {
+  chosen.resize(100'000, 1);
+  disk.Put("/home/op/a.csv", "mine");
+  Open();
+  boxes.Answers = {BoxAnswer::Ok};
+  events.At(std::chrono::milliseconds(0), [&] {
+    EXPECT_TRUE(Find<QProgressBar>(*window, "Progress").isVisible());
+    EXPECT_FALSE(Find<QPushButton>(*window, "ExportButton").isEnabled());
+    EXPECT_FALSE(Find<QGroupBox>(*window, "WhichFrame").isEnabled());
+    ::Press(*window, "Stop");
+  });
+  ExportTo("/home/op/a.csv");
+  EXPECT_EQ(disk.Contents().at("/home/op/a.csv"), "mine");
+  EXPECT_EQ(Outcome(), In("Stopped. No file was written.", "已停止，没有写入文件。"));
+  EXPECT_FALSE(Find<QPushButton>(*window, "Stop").isVisible());
+  EXPECT_TRUE(Find<QPushButton>(*window, "ExportButton").isEnabled());
+}
+
+TEST_P(ExportWindow, ClosesInTheMiddleOfAnExport) {
+  chosen.resize(100'000, 1);
+  Open();
+  events.At(std::chrono::milliseconds(0), [&] { window->close(); });
+  ExportTo("/home/op/a.csv");
+  EXPECT_FALSE(window->isVisible());
+  EXPECT_FALSE(disk.FileExists("/home/op/a.csv"));
 }
 
 INSTANTIATE_TEST_SUITE_P(InBoth, ExportWindow,

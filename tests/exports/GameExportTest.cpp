@@ -16,10 +16,12 @@ TEST(ExportOfGames, IsInTheChosenFormat) {
     return ExportBytes(sample.Games(), choice, sample.Strings);
   };
   const CsvForm tabs{CsvSeparator::Tab, false};
-  EXPECT_EQ(exported(ExportFormat::Players), PlayersCsv(sample.Games(), tabs, EverythingPersonal));
-  EXPECT_EQ(exported(ExportFormat::Hits), HitsCsv(sample.Games(), tabs));
-  EXPECT_EQ(exported(ExportFormat::Json), GamesJson(sample.Games(), EverythingPersonal));
-  EXPECT_EQ(exported(ExportFormat::Page), GamesPage(sample.Games(), EverythingPersonal, sample.Strings));
+  EXPECT_EQ(exported(ExportFormat::Players), PlayersTable(sample.Games(), tabs, EverythingPersonal));
+  EXPECT_EQ(exported(ExportFormat::Hits), HitsTable(sample.Games(), tabs));
+  EXPECT_EQ(exported(ExportFormat::Json), JsonText(sample.Games(), EverythingPersonal));
+  EXPECT_EQ(exported(ExportFormat::Page), PageText(sample.Games(), EverythingPersonal, sample.Strings));
+  EXPECT_TRUE(
+      exported(ExportFormat::Figures).starts_with("game\treceived\tgame_date\tmission\tplace\tplayer\t"));
 }
 
 TEST(ExportOfGames, SuggestsANameForEachFormat) {
@@ -29,12 +31,15 @@ TEST(ExportOfGames, SuggestsANameForEachFormat) {
             "2026-11-21 2015 Courier hits.csv");
   EXPECT_EQ(ExportFileName("2026-11-21 2015 Courier", ExportFormat::Json), "2026-11-21 2015 Courier.json");
   EXPECT_EQ(ExportFileName("2026-11-21 2015 Courier", ExportFormat::Page), "2026-11-21 2015 Courier.html");
+  EXPECT_EQ(ExportFileName("2026-11-21 2015 Courier", ExportFormat::Figures),
+            "2026-11-21 2015 Courier figures.csv");
 }
 
 TEST(ExportOfGames, LetsTheDialogAddTheEnding) {
   const StringTable english(Language::English);
   EXPECT_EQ(ExportFilter(ExportFormat::Players, english), "CSV files (*.csv)|*.csv");
   EXPECT_EQ(ExportFilter(ExportFormat::Hits, english), "CSV files (*.csv)|*.csv");
+  EXPECT_EQ(ExportFilter(ExportFormat::Figures, english), "CSV files (*.csv)|*.csv");
   EXPECT_EQ(ExportFilter(ExportFormat::Json, english), "JSON files (*.json)|*.json");
   EXPECT_EQ(ExportFilter(ExportFormat::Page, english), "Web pages (*.html)|*.html");
   const StringTable chinese(Language::SimplifiedChinese);

@@ -54,14 +54,14 @@ std::vector<CsvRecord> RecordsOf(const ordered_json& document, const char* list,
 
 TEST(GameAsJson, IsAnObjectWithFormatAndVersion) {
   const SampleGame sample;
-  EXPECT_EQ(GamesJson(sample.Games(0), {}),
+  EXPECT_EQ(JsonText(sample.Games(0), {}),
             "{\"format\": \"tessarine-games\", \"version\": 1, \"games\": []}\n");
 }
 
 TEST(GameAsJson, HasEachPlayerAndHitInALineOfItsOwn) {
   const SampleGame sample;
   EXPECT_EQ(
-      GamesJson(sample.Games(), {}),
+      JsonText(sample.Games(), {}),
       "{\"format\": \"tessarine-games\", \"version\": 1, \"games\": [\n"
       R"({"game":1,"received":"2026-11-21 20:15:09","game_date":"21/11/2026 20:15",)"
       R"("mission":"The Night Courier","team_1":"Red","team_1_total":70,"team_2":"Blue","team_2_total":290,)"
@@ -107,11 +107,11 @@ TEST(GameAsJson, HoldsWhatTheTablesHoldAndNothingElse) {
     for (int index = 1; index <= PlayerCount; index += 3) {
       sample.Game.Players(index).MemberIndex = SampleGame::Mole;
     }
-    const auto document = ordered_json::parse(GamesJson(sample.Games(2), personal));
-    const auto players = CsvRecords(PlayersCsv(sample.Games(2), {}, personal));
+    const auto document = ordered_json::parse(JsonText(sample.Games(2), personal));
+    const auto players = CsvRecords(PlayersTable(sample.Games(2), {}, personal));
     ASSERT_EQ(players.size(), 80U);
     EXPECT_EQ(RecordsOf(document, "players", true), players);
-    const auto hits = CsvRecords(HitsCsv(sample.Games(2), {}));
+    const auto hits = CsvRecords(HitsTable(sample.Games(2), {}));
     ASSERT_GT(hits.size(), 100U);
     EXPECT_EQ(RecordsOf(document, "hits", false), hits);
   }
@@ -121,7 +121,7 @@ TEST(GameAsJson, HoldsAGameWithoutPlayersToo) {
   SampleGame sample;
   sample.Game.Clear();
   sample.Mission = "None";
-  const auto document = ordered_json::parse(GamesJson(sample.Games(), {}));
+  const auto document = ordered_json::parse(JsonText(sample.Games(), {}));
   EXPECT_EQ(document.at("games").size(), 1U);
   EXPECT_EQ(document.at("games")[0].at("mission"), "None");
   EXPECT_TRUE(document.at("games")[0].at("game_date").is_null());
@@ -130,11 +130,11 @@ TEST(GameAsJson, HoldsAGameWithoutPlayersToo) {
 
 TEST(GameAsJson, TellsOfPersonsOnlyWhatWasTicked) {
   const SampleGame sample;
-  const std::string discreet = GamesJson(sample.Games(), {});
+  const std::string discreet = JsonText(sample.Games(), {});
   for (const char* part : {"Ada", "Byron", "first_name", "member", "button", "0123456789ABCDEF"}) {
     EXPECT_THAT(discreet, Not(HasSubstr(part)));
   }
-  const auto document = ordered_json::parse(GamesJson(sample.Games(), EverythingPersonal));
+  const auto document = ordered_json::parse(JsonText(sample.Games(), EverythingPersonal));
   const ordered_json& players = document.at("games")[0].at("players");
   EXPECT_EQ(players[0].at("first_name"), "Ada");
   EXPECT_EQ(players[0].at("last_name"), "Byron");
@@ -150,7 +150,7 @@ TEST(GameAsJson, ReadsBackOddNamesAsTheyAre) {
     SampleGame sample;
     sample.Mission = name;
     sample.FullNames[SampleGame::Mole] = {name, name};
-    const auto document = ordered_json::parse(GamesJson(sample.Games(), EverythingPersonal));
+    const auto document = ordered_json::parse(JsonText(sample.Games(), EverythingPersonal));
     EXPECT_EQ(document.at("games")[0].at("mission"), name);
     EXPECT_EQ(document.at("games")[0].at("players")[0].at("last_name"), name);
   }
@@ -159,7 +159,7 @@ TEST(GameAsJson, ReadsBackOddNamesAsTheyAre) {
 TEST(GameAsJson, TakesTextsOfOldFilesForWindows1252) {
   SampleGame sample;
   sample.Mission = "Caf\xE9";
-  const auto document = ordered_json::parse(GamesJson(sample.Games(), {}));
+  const auto document = ordered_json::parse(JsonText(sample.Games(), {}));
   EXPECT_EQ(document.at("games")[0].at("mission"), "Caf\xC3\xA9");
 }
 

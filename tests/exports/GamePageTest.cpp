@@ -61,7 +61,7 @@ class Page {
 };
 
 Page PageOf(const SampleGame& sample, const PersonalData& personal = {}, int games = 1) {
-  return Page(GamesPage(sample.Games(games), personal, sample.Strings));
+  return Page(PageText(sample.Games(games), personal, sample.Strings));
 }
 
 constexpr const char* Board = "//div[@class='wide']/table";

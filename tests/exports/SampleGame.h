@@ -1,9 +1,50 @@
 #pragma once
 
+#include <functional>
 #include <map>
 #include <string>
 
 #include "exports/ExportedGame.h"
+#include "exports/GameExport.h"
+#include "exports/GameJson.h"
+#include "exports/GamePage.h"
+
+/// Hands over game after game.
+using ExportedGames = std::function<void(const std::function<void(const ExportedGame&)>& take)>;
+
+/// All that a writer makes of the games.
+inline std::string Written(const ExportedGames& games, GameWriter& writer) {
+  games([&writer](const ExportedGame& game) { writer.Add(game); });
+  writer.End();
+  return writer.Take();
+}
+
+inline std::string ExportBytes(const ExportedGames& games, const ExportChoice& choice,
+                               const StringTable& strings) {
+  return Written(games, *MakeGameWriter(choice, strings));
+}
+
+inline std::string PlayersTable(const ExportedGames& games, const CsvForm& form,
+                                const PersonalData& personal) {
+  PlayersCsv writer(form, personal);
+  return Written(games, writer);
+}
+
+inline std::string HitsTable(const ExportedGames& games, const CsvForm& form) {
+  HitsCsv writer(form);
+  return Written(games, writer);
+}
+
+inline std::string JsonText(const ExportedGames& games, const PersonalData& personal) {
+  GamesJson writer(personal);
+  return Written(games, writer);
+}
+
+inline std::string PageText(const ExportedGames& games, const PersonalData& personal,
+                            const StringTable& strings) {
+  GamesPage writer(personal, strings);
+  return Written(games, writer);
+}
 
 /// A game of three players with known hits: Blue 7, who is the member Mole, before Red 0 and Yellow 3. Blue 7
 /// also hit Red 9, who took no part.

@@ -1,0 +1,78 @@
+#pragma once
+
+#include <cstddef>
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "archive/GameArchive.h"
+#include "archive/import/GameFileCheck.h"
+#include "archive/import/MembersOfFiles.h"
+#include "core/game/SoldieringFactors.h"
+#include "platform/Clock.h"
+#include "platform/Database.h"
+#include "platform/Files.h"
+
+struct RefusedGameFile {
+  std::string Path;
+  GameFileTrouble Trouble;
+};
+
+/// Throws RuntimeError 61 if less of the disk is free than the archive leaves to other files.
+void CheckSpaceForGames(const Files& disk, const std::string& userDataFolder, const StringTable& strings);
+
+/// Takes game files into the archive, each as a game of its own with the figures that stand in it. A game
+/// that the archive has already is not added once more, whoever its members were taken for.
+class GameImport {
+ public:
+  /// All must outlive the import.
+  struct Parts {
+    Database& Archive;
+    Database& Members;
+    Files& Disk;
+    const Clock& Time;
+    const StringTable& Strings;
+    SoldieringFactors Factors;   ///< those of today stand in for the unknown ones of a file
+    std::string UserDataFolder;  ///< on whose disk space must stay free
+  };
+
+  /// How far the import is.
+  struct State {
+    std::size_t Done = 0;
+    std::size_t Files = 0;  ///< 0 while the folders are still being searched
+  };
+
+  /// Asked often; may process events. False stops the import.
+  using OnStep = std::function<bool(const State& state)>;
+
+  GameImport(const Parts& parts, FilesOf table);
+
+  /// Imports all "*.xml" in the folder and below it; symbolic links to folders are not followed. Returns
+  /// false if it was stopped: what was imported by then stays, and so it does when it throws. Throws
+  /// RuntimeError 61 if too little of the disk is free, otherwise as GameArchive does.
+  bool Run(const std::string& folder, const OnStep& onStep);
+
+  std::size_t Imported() const { return imported_; }
+  /// Files whose game was in the archive already, or twice in the folder.
+  std::size_t Known() const { return known_; }
+  const std::vector<RefusedGameFile>& Refused() const { return refused_; }
+
+ private:
+  bool Search(const std::string& folder, const OnStep& onStep);
+  void ImportFile(const std::string& path, const Breath& breathe);
+  std::optional<GameFileTrouble> TakeGame(const std::string& path, const Breath& breathe);
+  /// Gives the players their members, unless the archive has the game just as it is in the file. Returns true
+  /// if it has the game.
+  bool SettleAndFind(GameInFile& game, const std::string& played, const Breath& breathe);
+  /// True if the archive has this game with other members or buttons.
+  bool IsKnownWithOthers(const GameInFile& game, const std::string& played, const Breath& breathe);
+
+  const Parts parts_;
+  GameArchive archive_;
+  MembersOfFiles members_;
+  std::vector<std::string> paths_;
+  std::size_t imported_ = 0;
+  std::size_t known_ = 0;
+  std::vector<RefusedGameFile> refused_;
+};
