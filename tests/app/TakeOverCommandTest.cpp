@@ -68,7 +68,7 @@ TEST_F(OldInstallationInTheProgram, GivesItsGamesToTheArchiveWithTheMembersThatC
   TakeOverAll();
   EXPECT_THAT(status, testing::EndsWith("\nGames: 1 imported, 0 known before, 1 refused."));
   EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "1");
-  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT MemberIndex FROM GamePlayers"), "4");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT MemberID FROM GamePlayers"), "4");
 }
 
 TEST_F(OldInstallationInTheProgram, ClearsTheBoard) {
