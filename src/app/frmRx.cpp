@@ -28,8 +28,8 @@ void FinishInterruptedTakeOver(const Folders& places, Files& disk) {
   std::string folder;
   places.LocalAppData(folder);
   folder += UserDataSubfolder;
-  if (disk.FolderExists(folder)) {
-    FinishTakeOver(disk, folder);
+  if (disk.FolderExists(folder) && !FinishTakeOver(disk, folder)) {
+    ForgetTakeOver(disk, folder);
   }
 }
 

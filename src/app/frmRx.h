@@ -30,7 +30,7 @@
 #include "devices/charging/ChargedButtons.h"
 #include "manual/ManualKey.h"
 #include "sheets/PrintOptions.h"
-#include "takeover/TakeOverWork.h"
+#include "takeover/TakeOver.h"
 #include "ui/Commands.h"
 #include "ui/WindowPlaces.h"
 #include "web/ResultsHost.h"
@@ -152,6 +152,7 @@ class frmRx : public QMainWindow {
   CopyWork::Parts CopyParts() const;
   /// What a take-over of old data works on.
   TakeOverWork::Parts TakeOverParts();
+  ImportedGames ImportOldGames(const std::string& folder, FilesOfMembers members, const KeepOn& keepOn);
   /// Why no old installation can be taken over now; empty if one can.
   std::string WhyNoTakeOver();
 

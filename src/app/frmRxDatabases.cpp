@@ -1,4 +1,4 @@
-// The main window's commands on the databases as a whole: members as files, backup copies.
+// The main window's commands on the databases as a whole: members as files, backup copies, old installations.
 
 #include <optional>
 #include <set>
@@ -8,6 +8,7 @@
 #include "archive/ArchiveCopies.h"
 #include "archive/CopiedArchive.h"
 #include "archive/copies/BackupCopies.h"
+#include "archive/import/GameImport.h"
 #include "core/line/CommPortSetting.h"
 #include "core/text/Filled.h"
 #include "members/ExportMembers.h"
@@ -150,6 +151,21 @@ TakeOverWork::Parts frmRx::TakeOverParts() {
           }};
 }
 
+ImportedGames frmRx::ImportOldGames(const std::string& folder, FilesOfMembers members, const KeepOn& keepOn) {
+  CheckSpaceForGames(services_.Disk, userDataFolder_, services_.Strings);
+  GameImport import({.Archive = archive_->File(),
+                     .Members = session_.DbMembers(),
+                     .Disk = services_.Disk,
+                     .Time = services_.Time,
+                     .Strings = services_.Strings,
+                     .Factors = session_.Factors(),
+                     .UserDataFolder = userDataFolder_},
+                    members == FilesOfMembers::Taken ? FilesOf::ThisTable : FilesOf::OtherTable);
+  import.Run(folder, [&keepOn](const GameImport::State&) { return keepOn();
+});
+return {.Imported = import.Imported(), .Known = import.Known(), .Refused = import.Refused().size()};
+}
+
 void frmRx::TakeOverOldInstallation() {
   if (const std::string reason = WhyNoTakeOver(); !reason.empty()) {
     services_.Boxes.Show(reason, services_.Strings.Text(OwnText::TakeOverTitle), BoxIcon::Exclamation);
@@ -167,7 +183,9 @@ void frmRx::TakeOverOldInstallation() {
                   session_.Factors() = ReadSoldieringFactors(*ini_);
                   keeping_->CheckMembers();
                 },
-            .EndProgram = [this] { close(); }},
+            .EndProgram = [this] { close(); },
+            .ImportGames = [this](const std::string& folder, FilesOfMembers members,
+                                  const KeepOn& keepOn) { return ImportOldGames(folder, members, keepOn); }},
            this)
       .exec();
 }

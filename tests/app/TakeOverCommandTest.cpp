@@ -62,6 +62,15 @@ TEST_F(OldInstallationInTheProgram, IsInUseAtOnce) {
   EXPECT_EQ(ini.ReadIni("ports", "com1", "none"), "none");
 }
 
+TEST_F(OldInstallationInTheProgram, GivesItsGamesToTheArchiveWithTheMembersThatCameAlong) {
+  WriteFile(venue.Folder / "old/game.xml", GameFile(PlayerOf(1, "<MemberIndex>4</MemberIndex>")));
+  WriteFile(venue.Folder / "old/half.xml", "<GameData><PlayerData>");
+  TakeOverAll();
+  EXPECT_THAT(status, testing::EndsWith("\nGames: 1 imported, 0 known before, 1 refused."));
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "1");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT MemberID FROM GamePlayers"), "4");
+}
+
 TEST_F(OldInstallationInTheProgram, ClearsTheBoard) {
   venue.LoadGame(GameFile(PlayerOf(1, "<MemberIndex>4</MemberIndex>")));
   EXPECT_GT(venue.RowCount("ScoreDisplay"), 0);
