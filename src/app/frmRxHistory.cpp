@@ -33,7 +33,7 @@ void frmRx::ShowHistoryOf(std::int32_t member, QWidget* parent) {
 void frmRx::ShowRankings() {
   RankingWindow({.Archive = [this]() -> Sql& { return archive_->Statements(); },
                  .DbMembers = session_.DbMembers(),
-                 .Hides = {},
+                 .Hides = [this](std::int32_t member) { return hidden_->HidesMember(member); },
                  .Boxes = services_.Boxes,
                  .CommonDialog1 = services_.CommonDialog1,
                  .Disk = services_.Disk,

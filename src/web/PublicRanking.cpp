@@ -6,7 +6,7 @@
 std::vector<RankedLine> RankedLines(const PublicRanking& ranking,
                                     const std::function<std::string(const NameHolder&)>& nameShown) {
   std::vector<RankedLine> lines;
-  for (const RankedMember& member : ranking.Members) {
+  for (const RankedHolder& member : ranking.Members) {
     if (std::string name = nameShown(member.Holder); !name.empty()) {
       lines.push_back({.Name = std::move(name),
                        .Games = member.Games,

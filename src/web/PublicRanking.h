@@ -10,7 +10,7 @@
 #include "core/game/HiddenNames.h"
 
 /// What a member did in the games of a month.
-struct RankedMember {
+struct RankedHolder {
   NameHolder Holder = {};
   int Games = 0;
   std::int64_t Soldiering = 0;          ///< sum
@@ -21,7 +21,7 @@ struct RankedMember {
 /// The members who played in a month.
 struct PublicRanking {
   std::string Month;  ///< "2026-11"
-  std::vector<RankedMember> Members;
+  std::vector<RankedHolder> Members;
 };
 
 /// A line of the ranking as a page may show it.

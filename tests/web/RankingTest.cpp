@@ -17,7 +17,7 @@ std::string NickNameOf(const NameHolder& holder) {
   return holder.NickName;
 }
 
-RankedMember Ranked(std::int32_t member, const std::string& name, std::int64_t points) {
+RankedHolder Ranked(std::int32_t member, const std::string& name, std::int64_t points) {
   return {
       .Holder = {.Member = member, .NickName = name}, .Games = 2, .Soldiering = points, .Best = points - 1};
 }

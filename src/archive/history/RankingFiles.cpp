@@ -67,7 +67,8 @@ std::string RankingCsv(const std::vector<RankedMember>& ranked, bool fullNames, 
 
 std::string RankingPage(const std::string& title, const std::vector<RankedMember>& ranked, bool fullNames,
                         const StringTable& strings) {
-  std::string html = "<h2>" + HtmlText(title) + "</h2>\n<table>\n<thead><tr>";
+  std::string html = HtmlPageStart(title, strings.TextLanguage());
+  html.append("<h2>").append(HtmlText(title)).append("</h2>\n<table>\n<thead><tr>");
   const std::vector<std::string> captions = PartsOf(strings.Text(OwnText::RankingColumns), '|');
   for (std::size_t column = 0; column < captions.size(); ++column) {
     const std::string caption = HtmlText(captions[column]);
@@ -80,6 +81,5 @@ std::string RankingPage(const std::string& title, const std::vector<RankedMember
   for (const RankedMember& member : ranked) {
     html.append(RankingRowHtml(member, fullNames, strings));
   }
-  html.append("</tbody>\n</table>\n");
-  return HtmlPage(title, html, strings.TextLanguage());
+  return html.append("</tbody>\n</table>\n").append(HtmlPageEnd());
 }
