@@ -3,7 +3,6 @@
 
 #include <QApplication>
 #include <QDialog>
-#include <QScrollBar>
 #include <QTableView>
 #include <QWindow>
 #include <cstdlib>
@@ -127,23 +126,6 @@ void ShowEmpty(benchmark::State& state, Site& /*site*/) {
   }
 }
 
-/// Pages through all games, each page painted.
-void Scroll(benchmark::State& state, Site& site) {
-  PastGames window(site.Parts(), nullptr);
-  ShowCompletely(window);
-  window.findChild<QTableView*>(QStringLiteral("MonthTable"))->selectRow(0);
-  auto* games = window.findChild<QTableView*>(QStringLiteral("GameTable"));
-  if (games->model()->rowCount() != PastGameCount + 1) {
-    std::abort();
-  }
-  QScrollBar& bar = *games->verticalScrollBar();
-  while (state.KeepRunning()) {
-    bar.setValue(bar.value() >= bar.maximum() ? 0 : bar.value() + bar.pageStep());
-    games->viewport()->repaint();
-    QApplication::processEvents();
-  }
-}
-
 }  // namespace
 
 /// bench-past: the window of past games with 100,000 of them.
@@ -155,13 +137,10 @@ int main(int argc, char** argv) {
   };
   add("Past", ShowPast);
   add("Empty", ShowEmpty);
-  add("Scroll", Scroll);
   auto times = MedianTimes(argc, argv);
   constexpr double milliseconds = 1000;
   const double shown = times["Past"] - times["Empty"];
-  bool met = ReportGoal("Past Games of 100,000 after an empty window / 100 ms", shown / (100 * milliseconds),
-                        1, TimesText(shown, 100 * milliseconds));
-  met &= ReportGoal("  a page of them / 16.7 ms", times["Scroll"] / (16.7 * milliseconds), 1,
-                    TimesText(times["Scroll"], 16.7 * milliseconds));
+  const bool met = ReportGoal("Past Games of 100,000 after an empty window / 100 ms",
+                              shown / (100 * milliseconds), 1, TimesText(shown, 100 * milliseconds));
   return met ? 0 : 1;
 }
