@@ -3,9 +3,11 @@
 #include <sqlite3.h>
 #include <strings.h>
 
+#include <cerrno>
 #include <string_view>
 
 #include "platform/RuntimeError.h"
+#include "platform/sqlite/SqliteError.h"
 #include "platform/sqlite/SqliteRecordset.h"
 
 namespace {
@@ -86,8 +88,16 @@ void SqliteDatabase::FlushGroup() {
   }
   const int result = sqlite3_db_cacheflush(connection_.Handle());
   // The commit can still write what others who are reading keep it from writing now.
-  if (result != SQLITE_BUSY && (result != SQLITE_OK || !FlushFile(connection_.Handle()))) {
+  if (result == SQLITE_BUSY) {
+    return;
+  }
+  if (result != SQLITE_OK) {
     connection_.Fail();
+  }
+  if (!FlushFile(connection_.Handle())) {
+    const RuntimeError failure = FlushError(connection_.Path(), errno);
+    Rollback();
+    throw failure;
   }
 }
 

@@ -62,6 +62,11 @@ RuntimeError UnrecognizedFormat(const std::string& path) {
   return {Fault::UnrecognizedDatabase, "Unrecognized database format '" + path + "'."};
 }
 
+RuntimeError FlushError(const std::string& path, int systemError) {
+  return IsNoSpace(systemError) ? RuntimeError(Fault::DatabaseDiskFull, "Not enough space on disk: " + path)
+                                : RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path);
+}
+
 RuntimeError SqliteError(sqlite3* database, const std::string& path, int systemError) {
   const int extendedCode = sqlite3_extended_errcode(database);
   const int code = extendedCode & 0xFF;

@@ -21,3 +21,6 @@ RuntimeError CannotOpen(const std::string& path);
 
 /// RuntimeError 3343: the file at `path` is not a database, or is damaged.
 RuntimeError UnrecognizedFormat(const std::string& path);
+
+/// RuntimeError 3026 or 3043: the file at `path` could not be flushed, for the reason `systemError`.
+RuntimeError FlushError(const std::string& path, int systemError);

@@ -2,6 +2,7 @@
 
 #include <sqlite3.h>
 
+#include <cerrno>
 #include <memory>
 #include <utility>
 
@@ -103,7 +104,7 @@ class SqliteStepwiseCopy : public StepwiseCopy {
 
   void Flush() {
     if (!FlushFile(copy_.get())) {
-      throw RuntimeError(Fault::DatabaseDiskError, "Disk error: " + path_);
+      throw FlushError(path_, errno);
     }
   }
 
