@@ -21,14 +21,12 @@ ArchiveAccess::ArchiveAccess(Parts parts)
 ArchiveAccess::~ArchiveAccess() = default;
 
 Sql& ArchiveAccess::Statements() {
-  if (!file_.Open && !Exists()) {
-    return *none_;
-  }
-  return File().Statements();
+  return Exists() ? File().Statements() : *none_;
 }
 
 Database& ArchiveAccess::File() {
-  if (!file_.Open) {
+  if (!file_.Open || file_.Open->HasMoved()) {
+    Close();
     file_ = OpenArchive(parts_.Engine, parts_.Disk, parts_.UserDataFolder,
                         parts_.ProgramFolder + "/games_default.mdb");
   }
@@ -40,7 +38,7 @@ GameArchive ArchiveAccess::Archive() {
 }
 
 PastGame ArchiveAccess::Read(std::int64_t gameId, std::int64_t state) {
-  if (!file_.Open && !Exists()) {
+  if (!Exists()) {
     throw RuntimeError(Fault::FileNotFound,
                        Filled(parts_.Strings.Text(OwnText::NoArchivedGame), {std::to_string(gameId)}));
   }
@@ -57,5 +55,5 @@ void ArchiveAccess::Close() {
 }
 
 bool ArchiveAccess::Exists() const {
-  return parts_.Disk.FileExists(parts_.UserDataFolder + "/games.mdb");
+  return ArchiveExists(parts_.Disk, parts_.UserDataFolder);
 }

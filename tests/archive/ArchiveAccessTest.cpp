@@ -205,6 +205,14 @@ TEST_F(LookingIn, TakesTheFileThatHasTakenItsPlace) {
   EXPECT_THAT(access.Queries().Games({}), ElementsAre(1));
 }
 
+TEST_F(LookingIn, FindsTheGamesThatLieInTheNewFileAlone) {
+  Play(1);
+  Keep();
+  std::filesystem::rename(ArchivePath(), venue.Folder / "games-new.mdb");
+  EXPECT_EQ(access.Queries().Months().size(), 1U);
+  EXPECT_FALSE(ArchiveExists());
+}
+
 class Deleting : public LookingIn {
  protected:
   Deleting() {

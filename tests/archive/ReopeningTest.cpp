@@ -7,7 +7,6 @@
 
 namespace {
 
-
 using Keeper = KeeperVenue;
 
 class Reopening : public Keeper {
