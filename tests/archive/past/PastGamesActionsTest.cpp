@@ -1,0 +1,196 @@
+#include <gmock/gmock.h>
+
+#include "core/gamefile/GameFile.h"
+#include "tests/archive/past/PastGamesVenue.h"
+
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+
+TEST_F(WindowOfPastGames, GivesTheGameToOpen) {
+  KeepFour();
+  Open();
+  Games().selectRow(1);
+  Press("Open");
+  EXPECT_FALSE(window->isVisible());
+  EXPECT_EQ(window->result(), QDialog::Accepted);
+  ASSERT_TRUE(window->Chosen());
+  EXPECT_EQ(window->Chosen()->GameId, 3);
+  EXPECT_EQ(window->Chosen()->State, 0);
+  EXPECT_EQ(window->Chosen()->Bytes, access.Archive().FileOf(3));
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(WindowOfPastGames, OpensByReturn) {
+  KeepFour();
+  Open();
+  Type(*window, Qt::Key_Return);
+  ASSERT_TRUE(window->Chosen());
+  EXPECT_EQ(window->Chosen()->GameId, 4);
+}
+
+TEST_F(WindowOfPastGames, AsksBeforeAnUnsavedGameIsReplaced) {
+  KeepFour();
+  Open();
+  unsaved = true;
+  venue.Boxes.Answers = {BoxAnswer::Cancel};
+  Press("Open");
+  EXPECT_TRUE(window->isVisible());
+  EXPECT_FALSE(window->Chosen());
+  const std::string game = Get<QLabel>("BoardLabel").text().toStdString();
+  EXPECT_THAT(venue.Boxes.Boxes,
+              ElementsAre(FakeMessageBoxes::Box{
+                  "The game on the board is not saved as a file. Replace it with the game of " + game + "?",
+                  DefaultBoxTitle, BoxIcon::Question, BoxButtons::OkCancel}));
+  venue.Boxes.Answers = {BoxAnswer::Ok};
+  Press("Open");
+  EXPECT_TRUE(window->Chosen());
+}
+
+TEST_F(WindowOfPastGames, OpensNothingWhileSomethingElseRuns) {
+  KeepFour();
+  Open();
+  busy = OwnText::ScoresComeIn;
+  Press("Open");
+  EXPECT_FALSE(window->Chosen());
+  EXPECT_EQ(Status(), "Not now: scores are being downloaded. Open the game when it has ended.");
+}
+
+TEST_F(WindowOfPastGames, ShowsAndOpensEarlierStates) {
+  KeepFour();
+  Game later(venue.Strings);
+  later.Players(Red0).Active = true;
+  later.Players(Red0).Soldiering = 7;
+  access.Archive().KeepAgain(4, {.Game = later, .Mission = "None"}, FormerState::KeptToo);
+  access.Close();
+  Open();
+  auto& state = Get<QComboBox>("State");
+  EXPECT_TRUE(state.isVisible());
+  EXPECT_EQ(state.count(), 2);
+  EXPECT_THAT(Board(), ElementsAre("Red  0"));
+  state.setCurrentIndex(1);
+  EXPECT_THAT(Board(), ElementsAre("Blue  7: Mole", "Red  0"));
+  Press("Open");
+  ASSERT_TRUE(window->Chosen());
+  EXPECT_EQ(window->Chosen()->State, 1);
+  EXPECT_EQ(window->Chosen()->Bytes, access.Archive().FileOf(4, 1));
+}
+
+TEST_F(WindowOfPastGames, HidesTheStatesOfAGameThatHasOnlyOne) {
+  KeepFour();
+  Open();
+  EXPECT_FALSE(Get<QComboBox>("State").isVisible());
+  EXPECT_FALSE(Get<QLabel>("StateLabel").isVisible());
+}
+
+TEST_F(WindowOfPastGames, SavesAGameFile) {
+  KeepFour();
+  Open();
+  const std::string path = venue.Folder / "mine.game.xml";
+  dialog.Answers = {std::nullopt, path};
+  Press("SaveFile");
+  EXPECT_EQ(Status(), "");
+  Press("SaveFile");
+  EXPECT_EQ(ReadFile(path), access.Archive().FileOf(4));
+  EXPECT_EQ(dialog.Calls.back().Name, "2026-11-22 2000 None.game.xml");
+  EXPECT_TRUE(dialog.Calls.back().Save);
+  EXPECT_EQ(Status(), "Saved: " + path);
+}
+
+TEST_F(WindowOfPastGames, AsksBeforeAFileIsReplaced) {
+  KeepFour();
+  Open();
+  const std::string path = venue.Folder / "mine.game.xml";
+  WriteFile(path, "old");
+  dialog.Answers = {path, path};
+  venue.Boxes.Answers = {BoxAnswer::No, BoxAnswer::Yes};
+  Press("SaveFile");
+  EXPECT_EQ(ReadFile(path), "old");
+  Press("SaveFile");
+  EXPECT_EQ(ReadFile(path), access.Archive().FileOf(4));
+  EXPECT_EQ(venue.Boxes.Boxes.size(), 2U);
+}
+
+TEST_F(WindowOfPastGames, TellsAFileThatCannotBeWrittenInItsLine) {
+  KeepFour();
+  Open();
+  dialog.Answers = {venue.Folder / "nowhere/mine.game.xml"};
+  Press("SaveFile");
+  EXPECT_THAT(Status(), HasSubstr("That did not work: "));
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(WindowOfPastGames, HandsGamesToChartsAndExports) {
+  KeepFour();
+  Open();
+  Press("Charts");
+  EXPECT_THAT(charted, ElementsAre(4));
+  Games().selectAll();
+  Press("Export");
+  EXPECT_THAT(exported, ElementsAre(4, 3, 2));
+}
+
+TEST_F(WindowOfPastGames, LooksAnewAfterAnImport) {
+  Open();
+  EXPECT_TRUE(Get<QPushButton>("Import").isVisible());
+  Keep("2026-11-22 20:00:00", "None", 400);
+  Press("Import");
+  EXPECT_EQ(imported, 1);
+  EXPECT_THAT(Listed(), ElementsAre("400"));
+  imports = false;
+  Open();
+  EXPECT_FALSE(Get<QPushButton>("Import").isVisible());
+}
+
+TEST_F(WindowOfPastGames, DeletesAGameAfterAQuestion) {
+  KeepFour();
+  Open();
+  Games().selectRow(1);
+  venue.Boxes.Answers = {BoxAnswer::Cancel, BoxAnswer::Ok};
+  Press("Delete");
+  EXPECT_EQ(Listed().size(), 3U);
+  Games().setFocus();
+  Type(*window, Qt::Key_Delete);
+  EXPECT_THAT(Listed(), ElementsAre("400", "200"));
+  EXPECT_EQ(Games().currentIndex().row(), 1);
+  EXPECT_EQ(window->focusWidget(), &Games());
+  EXPECT_EQ(Status(), "Deleted games: 1");
+  EXPECT_THAT(Column("MonthTable", 1), ElementsAre("3", "2", "1", ""));
+  EXPECT_EQ(venue.Boxes.Boxes.front().Text,
+            "Delete the game of " + PastGameModel::TimeText("2026-11-21 20:00:00").toStdString() +
+                "? For 30 days it can be brought back: choose Deleted among the months.");
+  EXPECT_EQ(Query("SELECT Deleted FROM Games WHERE GameID = 3"), venue.Time.Now());
+}
+
+TEST_F(WindowOfPastGames, BringsDeletedGamesBack) {
+  KeepFour();
+  Open();
+  Games().selectAll();
+  Press("Delete");
+  EXPECT_EQ(venue.Boxes.Boxes.front().Text,
+            "Delete 3 games? For 30 days they can be brought back: choose Deleted among the months.");
+  EXPECT_THAT(Column("MonthTable", 0), ElementsAre("All games", "2026-10", "Deleted"));
+  Months().selectRow(2);
+  EXPECT_THAT(Listed(), ElementsAre("400", "300", "200"));
+  EXPECT_THAT(Board(), ElementsAre("Blue  7: Mole", "Red  0"));
+  EXPECT_FALSE(Enabled("Open"));
+  EXPECT_FALSE(Enabled("Export"));
+  EXPECT_FALSE(Get<QPushButton>("Delete").isVisible());
+  EXPECT_TRUE(Enabled("SaveFile"));
+  Type(*window, Qt::Key_Return);
+  EXPECT_FALSE(window->Chosen());
+  Games().selectRow(0);
+  Press("BringBack");
+  EXPECT_THAT(Listed(), ElementsAre("300", "200"));
+  EXPECT_EQ(Status(), "Games brought back: 1");
+  Games().selectAll();
+  Press("BringBack");
+  EXPECT_THAT(Listed(), IsEmpty());
+  Months().selectRow(1);
+  EXPECT_THAT(Listed(), ElementsAre("400", "300", "200"));
+  EXPECT_EQ(Status(), "");
+}
+
+}  // namespace
