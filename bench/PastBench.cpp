@@ -34,6 +34,7 @@ class NoFileDialog : public FileDialog {
  public:
   std::optional<std::string> ShowOpen(const FileRequest&) override { return std::nullopt; }
   std::optional<std::string> ShowSave(const FileRequest&) override { return std::nullopt; }
+  std::optional<std::string> ShowFolder(const FileRequest& /*request*/) override { return std::nullopt; }
 };
 
 /// A data folder with many past games, the latest of which has a file, and an open session on it.
