@@ -4,6 +4,7 @@
 #include <string_view>
 #include <utility>
 
+#include "core/game/PublicName.h"
 #include "core/gamefile/SuggestedName.h"
 #include "ui/WorkArea.h"
 
@@ -60,8 +61,11 @@ void BoardCharts::ShowBoard() {
   for (int place = 0; place < board.RowCount(); ++place) {
     const BoardRow& row = board.RowAt(place);
     std::string name = game.DisplayName(row.Index);
-    if (!row.MemberName.empty()) {
-      name.append(" (").append(row.MemberName).append(")");
+    // A picture of it may leave the house: first and last names do not belong there.
+    const std::int32_t member = game.Players(row.Index).MemberIndex;
+    if (const std::string nickName = member != 0 ? CleanName(session_.Members().NickNameOf(member)) : "";
+        !nickName.empty()) {
+      name.append(" (").append(nickName).append(")");
     }
     chart.Players.push_back({row.Index, std::move(name)});
   }

@@ -5,14 +5,10 @@
 PublicRanking MonthRanks(const MonthRankSources& sources) {
   constexpr std::size_t lengthOfMonth = 7;
   PublicRanking ranking{.Month = sources.Now.substr(0, lengthOfMonth), .Members = {}};
-  if (!sources.Disk.FileExists(sources.Path)) {
-    return ranking;
-  }
-  const std::unique_ptr<Database> archive = sources.Engine.OpenDatabase(sources.Path);
   const ReadScope scope(sources.DbMembers);
   // Later than every day of the month, and earlier than the next one.
   const std::string end = ranking.Month + "-32";
-  for (const MemberPeriod& member : ArchiveQueries(archive->Statements()).Period(ranking.Month, end)) {
+  for (const MemberPeriod& member : ArchiveQueries(sources.Archive).Period(ranking.Month, end)) {
     ranking.Members.push_back(
         {.Holder = {.Member = member.Member, .NickName = CleanName(sources.NickNameOf(member.Member))},
          .Games = member.Games,

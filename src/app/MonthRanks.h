@@ -4,15 +4,12 @@
 
 #include "core/game/PublicName.h"
 #include "platform/Database.h"
-#include "platform/Files.h"
 #include "web/PublicRanking.h"
 
 /// Where the games of a month are, and what its members are called.
 struct MonthRankSources {
-  DatabaseEngine& Engine;
-  const Files& Disk;
-  std::string Path;  ///< of the archive, which need not exist
-  std::string Now;   ///< local time, "YYYY-MM-DD HH:MM:SS"
+  Sql& Archive;
+  std::string Now;  ///< local time, "YYYY-MM-DD HH:MM:SS"
   Database& DbMembers;
   NickNames NickNameOf;
 };

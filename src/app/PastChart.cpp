@@ -27,7 +27,7 @@ std::optional<MissionPoints> PointsOfMission(Database& dbScenarios, const std::s
   return ReadMissionPoints(*missions);
 }
 
-ChartGame ChartOf(const PastGame& past, const std::function<std::string(std::int32_t contactId)>& nameOf,
+ChartGame ChartOf(const PastGame& past, const NickNames& nickNames,
                   const std::optional<MissionPoints>& points) {
   ChartGame chart{
       .Game = past.Game,
@@ -39,7 +39,8 @@ ChartGame ChartOf(const PastGame& past, const std::function<std::string(std::int
   for (const Standing& standing : Standings(past.Game, [](std::int32_t) { return std::string(); })) {
     std::string name = past.Game.DisplayName(standing.Index);
     const std::int32_t member = past.Game.Players(standing.Index).MemberIndex;
-    if (const std::string memberName = member != 0 ? nameOf(member) : std::string(); !memberName.empty()) {
+    if (const std::string memberName = member != 0 ? CleanName(nickNames(member)) : std::string();
+        !memberName.empty()) {
       name.append(" (").append(memberName).append(")");
     }
     chart.Players.push_back({standing.Index, std::move(name)});

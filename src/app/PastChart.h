@@ -1,12 +1,11 @@
 #pragma once
 
-#include <cstdint>
-#include <functional>
 #include <optional>
 #include <string>
 
 #include "archive/PastGame.h"
 #include "charts/ChartGame.h"
+#include "core/game/PublicName.h"
 #include "core/text/StringTable.h"
 #include "platform/Database.h"
 
@@ -15,5 +14,5 @@ std::optional<MissionPoints> PointsOfMission(Database& dbScenarios, const std::s
 
 /// A past game as charts take it, all of its players by place. Valid while the game is. What its scores do
 /// not owe to `points` and to the game's factors, the charts show as a part of its own.
-ChartGame ChartOf(const PastGame& past, const std::function<std::string(std::int32_t contactId)>& nameOf,
+ChartGame ChartOf(const PastGame& past, const NickNames& nickNames,
                   const std::optional<MissionPoints>& points);

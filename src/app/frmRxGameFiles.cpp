@@ -72,7 +72,8 @@ void frmRx::ShowExport(const std::vector<std::int64_t>& chosen) {
     take({.Game = session_.Game(),
           .Received = received,
           .Mission = session_.Missions().Text(),
-          .Standings = Standings(session_.Game(), nickNameOf),
+          .Standings =
+              Standings(session_.Game(), nickNameOf, [this](int index) { return guests_.NameOf(index); }),
           .FullNameOf = fullNameOf});
   };
   ArchivedGames past(*archive_, session_, services_.Strings);

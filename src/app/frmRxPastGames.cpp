@@ -80,8 +80,6 @@ void frmRx::ShowPastCharts(const PastGame& past) {
                      .Boxes = services_.Boxes,
                      .CommonDialog1 = services_.CommonDialog1,
                      .Disk = services_.Disk});
-  window.ShowGame(ChartOf(
-      past, [this](std::int32_t contactId) { return BoardNameOf(contactId); },
-      PointsOfMission(session_.DbScenarios(), past.Mission)));
+  window.ShowGame(ChartOf(past, NickNamesOfSession(), PointsOfMission(session_.DbScenarios(), past.Mission)));
   window.exec();
 }

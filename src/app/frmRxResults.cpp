@@ -26,13 +26,10 @@ void frmRx::SetUpResults() {
       .AwaitsBoard = [this] { return audience_->IsOn() && !audience_->State().ShowsGameOfBoard(); },
       .Ranks =
           [this] {
-            return MonthRanks(
-                {.Engine = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
-                 .Disk = services_.Disk,
-                 .Path = userDataFolder_ + "/games.mdb",
-                 .Now = services_.Time.Now(),
-                 .DbMembers = session_.DbMembers(),
-                 .NickNameOf = NickNamesOfSession()});
+            return MonthRanks({.Archive = archive_->Statements(),
+                               .Now = services_.Time.Now(),
+                               .DbMembers = session_.DbMembers(),
+                               .NickNameOf = NickNamesOfSession()});
           }});
   results_->setParent(this);
   hidden_->OnChange = [this] { ShowOtherNames(); };

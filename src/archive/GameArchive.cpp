@@ -19,6 +19,7 @@ constexpr std::size_t BytesInMegabyte = std::size_t{1} << 20U;
 std::int64_t GameArchive::Keep(const GameState& state) {
   const PackedState packed = Pack(state);
   const KnownMembers::Marks marks = known_.Read(MembersIn(state.Game));
+  known_.RaiseCounterAbove(marks);
   WriteScope scope(archive_);
   Sql& sql = archive_.Statements();
   const std::int64_t gameId = InsertGame(sql, state, packed.Hash);
@@ -32,6 +33,7 @@ std::int64_t GameArchive::Keep(const GameState& state) {
 bool GameArchive::KeepAgain(std::int64_t gameId, const GameState& state, FormerState former) {
   const PackedState packed = Pack(state);
   const KnownMembers::Marks marks = known_.Read(MembersIn(state.Game));
+  known_.RaiseCounterAbove(marks);
   WriteScope scope(archive_);
   Sql& sql = archive_.Statements();
   std::optional<std::string> played;

@@ -78,6 +78,7 @@ void GameKeeper::Hear(SessionChange change) {
       break;
     case SessionChange::Loaded:
       source_ = GameSource::File;
+      pullBegun_ = false;  // whatever a pull before it was to bring
       break;
     case SessionChange::Scores:
       scoresPending_ = false;
@@ -259,6 +260,7 @@ bool GameKeeper::Recognise(GameArchive& archive, const Game& game, bool isLoaded
 
 void GameKeeper::Write(const Game& game, const Marks& now) {
   CheckRoom();
+  CheckUnchecked();
   GameArchive archive = Archive();
   const int pulls = pulls_ + (pullBegun_ && (!kept_ || kept_->Raw != now.Raw) ? 1 : 0);
   const bool isLoaded = source_ == GameSource::File && pulls == 0;
@@ -340,14 +342,17 @@ GameArchive GameKeeper::Archive() {
 }
 
 void GameKeeper::CheckMembers() {
-  Try([this] {
-    if (!ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
-      return;
-    }
+  membersUnchecked_ = true;
+  Try([this] { CheckUnchecked(); });
+}
+
+void GameKeeper::CheckUnchecked() {
+  if (membersUnchecked_ && ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
     for (const CutMember& cut : Archive().CheckMembers()) {
       state_.CutGames += cut.Games;
     }
-  });
+  }
+  membersUnchecked_ = false;
 }
 
 void GameKeeper::RemoveDeleted() {
@@ -360,6 +365,7 @@ void GameKeeper::RemoveDeleted() {
 
 void GameKeeper::NoteMembers() {
   Try([this] {
+    CheckUnchecked();
     if (file_.Open) {
       Archive().Known().NoteChanges();
     }

@@ -117,6 +117,8 @@ class GameKeeper {
   /// Closes the file if it is no longer the one at its path. What is in that one must be seen.
   void LeaveMovedFile();
   void CheckRoom() const;
+  /// Checks the members if that is still to be done: noting those of today would make others of the known.
+  void CheckUnchecked();
   void SeeWhetherItWorksAgain();
   /// True if another archive takes the place of the one that failed so.
   bool SetAside(const RuntimeError& failure);
@@ -141,6 +143,7 @@ class GameKeeper {
   bool lastStateIsElse_ = false;  ///< what the archive has as the last state was not on this board
   bool pullBegun_ = false;        ///< and nothing of it is kept yet
   bool scoresPending_ = false;    ///< guns may have been read since the last calculation
+  bool membersUnchecked_ = false;
   bool keeping_ = false;
   bool ended_ = false;
   Subscription subscription_;

@@ -1,5 +1,7 @@
 #include "archive/KnownMembers.h"
 
+#include <algorithm>
+
 #include <string_view>
 
 #include "archive/Digests.h"
@@ -70,7 +72,8 @@ void KnownMembers::NoteChanges() {
   const Marks known = Known();
   Marks changed;
   for (const auto& [number, mark] : ReadAll(known)) {
-    if (mark != known.at(number)) {
+    // Who has a number that nobody had when its games were kept did not play them.
+    if (mark != known.at(number) && known.at(number) != MemberMark{}) {
       changed[number] = mark;
     }
   }
@@ -102,6 +105,16 @@ std::vector<std::int32_t> KnownMembers::FindStrangers() {
 
 void KnownMembers::RaiseCounter() {
   const std::int64_t highest = WholeNumber(archive_.Statements(), "SELECT max(MemberID) FROM KnownMembers");
+  if (highest > 0) {
+    members_.RaiseCounter("Members", highest);
+  }
+}
+
+void KnownMembers::RaiseCounterAbove(const Marks& marks) {
+  std::int64_t highest = 0;
+  for (const auto& [number, mark] : marks) {
+    highest = mark == MemberMark{} ? std::max<std::int64_t>(highest, number) : highest;
+  }
   if (highest > 0) {
     members_.RaiseCounter("Members", highest);
   }

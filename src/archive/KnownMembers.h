@@ -55,6 +55,10 @@ class KnownMembers {
   /// From now on new members get numbers that no game has.
   void RaiseCounter();
 
+  /// The same above those of these numbers that nobody has. To be called before a game that names them is
+  /// kept.
+  void RaiseCounterAbove(const Marks& marks);
+
   /// Takes the number out of the known ones.
   void Forget(std::int32_t number);
 

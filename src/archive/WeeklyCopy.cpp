@@ -75,7 +75,11 @@ void WeeklyCopy::Finish(const std::string& path) {
 
 void WeeklyCopy::DeleteOldest(const std::string& made) {
   std::vector<BackupCopy> others = WeeklyCopiesIn(parts_.Disk, parts_.UserDataFolder);
-  std::erase_if(others, [&made](const BackupCopy& copy) { return copy.File == made; });
+  // Those of an archive that was damaged, so that another one began, are all that is left of it.
+  const std::optional<BackupCopy> copied = BackupCopyOf(made);
+  std::erase_if(others, [&](const BackupCopy& copy) {
+    return copy.File == made || !copied || copy.Database != copied->Database;
+  });
   for (std::size_t i = WeeklyCopiesThatStay - 1; i < others.size(); ++i) {
     parts_.Disk.Delete(BackupFolderIn(parts_.UserDataFolder).append("/").append(others[i].File));
   }

@@ -207,7 +207,8 @@ TEST_F(LookingIn, TakesTheFileThatHasTakenItsPlace) {
 
 TEST_F(LookingIn, FindsTheGamesThatLieInTheNewFileAlone) {
   Play(1);
-  Keep();
+  access.Archive().Keep(State());
+  access.Close();
   std::filesystem::rename(ArchivePath(), venue.Folder / "games-new.mdb");
   EXPECT_EQ(access.Queries().Months().size(), 1U);
   EXPECT_FALSE(ArchiveExists());

@@ -135,6 +135,20 @@ TEST_F(Keeper, KeepsNoFurtherFileAfterAPullThatBroughtNothing) {
   EXPECT_EQ(Query("SELECT Pulls FROM Games"), "1");
 }
 
+TEST_F(Keeper, FindsALoadedGameAfterAPullThatBroughtNothing) {
+  Pull();
+  const std::string file = WriteGameFile(session.Game(), session.Missions().Text());
+  session.ClearPlayerData();
+  keeper->BeginPull(GameSource::Cable);
+  keeper->Keep();
+  Load(file);
+  EXPECT_EQ(Games(), "1");
+  session.Factors().Damage = 99;
+  session.CalculateScores();
+  keeper->Keep();
+  EXPECT_EQ(Query("SELECT DamageDealt FROM GamePlayers WHERE PlayerIndex = 40"), "100");
+}
+
 TEST_F(Keeper, KeepsGunsThatComeOneByOneAsOneState) {
   keeper->BeginPull(GameSource::Radio);
   venue.Play(Red0, 0).ShotCount = 3;
@@ -243,6 +257,25 @@ TEST_F(Keeper, CutsANumberThatBelongsToSomebodyElseNow) {
              "UPDATE Members SET DallasID = 'CD00000000000002', NickName = 'Owl', FirstName = 'Ann'");
   Start();
   keeper->CheckMembers();
+  EXPECT_EQ(keeper->State().CutGames, 1);
+  EXPECT_EQ(Query("SELECT MemberID FROM GamePlayers WHERE PlayerIndex = 1"), "0");
+}
+
+TEST_F(Keeper, ChecksTheMembersLaterIfTheArchiveIsLocked) {
+  Pull();
+  session.Game().Players(Red0).MemberIndex = 7;
+  keeper->Keep();
+  ExecuteSql(venue.MembersFile(), "UPDATE Members SET DallasID = NULL, FirstName = 'Di'");
+  session.ClearPlayerData();
+  Start();
+  {
+    OtherConnection other(ArchivePath());
+    other.Execute("BEGIN EXCLUSIVE");
+    keeper->CheckMembers();
+    EXPECT_NE(keeper->State().Failure, "");
+    other.Execute("ROLLBACK");
+  }
+  keeper->NoteMembers();
   EXPECT_EQ(keeper->State().CutGames, 1);
   EXPECT_EQ(Query("SELECT MemberID FROM GamePlayers WHERE PlayerIndex = 1"), "0");
 }

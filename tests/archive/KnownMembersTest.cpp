@@ -178,6 +178,21 @@ TEST_F(MembersOfGames, LeaveTheirNumbersToNoNewMember) {
   EXPECT_EQ(NextMember(), 71);
 }
 
+TEST_F(MembersOfGames, LeaveTheirNumbersToNoNewMemberAsSoonAsAGameIsKept) {
+  Game.Players(Red0).MemberIndex = 70;
+  Archive->Keep(State());
+  EXPECT_EQ(NextMember(), 71);
+}
+
+TEST_F(MembersOfGames, AreNotThoseWhoGotANumberThatNobodyHad) {
+  Game.Players(Red0).MemberIndex = 70;
+  const std::int64_t second = Archive->Keep(State());
+  InMembers("INSERT INTO Members (ContactID, FirstName) VALUES (70, 'Zoe')");
+  Archive->Known().NoteChanges();
+  EXPECT_THAT(Cut(), ElementsAre("70:1"));
+  EXPECT_EQ(MembersIn(second), "0,5");
+}
+
 TEST_F(MembersOfGames, KeepTheirNumbersWhenTheMemberFileIsNew) {
   WriteFile(MembersPath(), MadeDatabase("members"));
   Open();

@@ -87,6 +87,22 @@ TEST_F(ArchivesWeeklyCopy, LeavesOtherCopiesAlone) {
   EXPECT_EQ(Files().size(), 5U);
 }
 
+TEST_F(ArchivesWeeklyCopy, OfAnotherArchiveStaysWhenThatOneIsDamaged) {
+  Pull();
+  std::filesystem::create_directory(venue.Folder / "backups");
+  const std::vector<std::string> others = {"games-new-2020-01-01-100000-weekly.mdb",
+                                           "games-new-2020-01-08-100000-weekly.mdb"};
+  for (const std::string& other : others) {
+    WriteFile(venue.Folder / ("backups/" + other), "x");
+  }
+  for (const char* time : {"2026-11-01 10:00:00", "2026-11-10 10:00:00", "2026-11-20 10:00:00"}) {
+    At(time);
+    CopyWhole();
+  }
+  EXPECT_THAT(Files(), testing::IsSupersetOf(others));
+  EXPECT_EQ(Files().size(), 4U);
+}
+
 TEST_F(ArchivesWeeklyCopy, IsMadeThoughAnEarlierOneIsFromAWrongClock) {
   Pull();
   for (const char* time : {"2036-01-01 10:00:00", "2037-01-01 10:00:00", "2026-11-01 10:00:00"}) {
