@@ -147,7 +147,7 @@ TEST_P(PageOfResults, IsSwitchedAndToldInItsWindow) {
 }
 
 TEST_P(PageOfResults, IsSetInItsWindow) {
-  LookAt([this](ResultsPage& window) {
+  LookAt([](ResultsPage& window) {
     auto& addresses = Find<QComboBox>(window, "PageAddress");
     ASSERT_EQ(addresses.count(), 3);
     EXPECT_THAT(addresses.itemText(0).toStdString(), HasSubstr("192.168.1.20"));
