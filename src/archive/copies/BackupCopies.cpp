@@ -130,11 +130,12 @@ void BackupCopies::Restore() {
     const Job job(*this);
     restored = work_.Restore(*entry.Copy, parts_.Databases[entry.Database], Steps());
   }
-  Refresh();
-  Tell(restored);
+  // First of all: what is open belongs to the file that was replaced.
   if (restored.What == Restored::Done || restored.What == Restored::Uncertain) {
     parts_.Reopen();
   }
+  Refresh();
+  Tell(restored);
 }
 
 bool BackupCopies::MayRestore(const CopyListModel::Entry& entry) {
