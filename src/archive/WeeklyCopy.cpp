@@ -9,7 +9,7 @@
 namespace {
 
 constexpr std::size_t WeeklyCopiesThatStay = 2;
-constexpr std::int64_t SecondsOfWeek = 7 * 24 * 3600;
+constexpr std::int64_t SecondsOfWeek = std::int64_t{7} * 24 * 3600;
 
 std::vector<BackupCopy> WeeklyCopiesIn(const Files& disk, const std::string& userDataFolder) {
   std::vector<BackupCopy> copies = ArchiveCopies(disk, userDataFolder);

@@ -126,7 +126,7 @@ std::string TimePlayed(const std::string& dateText, const std::string& fileTime,
   const std::string fileDay = fileTime.substr(0, DayLength);
   const std::optional<Numbers> numbers = NumbersIn(dateText);
   const bool hasTime = numbers && numbers->HasTime();
-  const std::string stamp = time.Stamp(dateText);
+  std::string stamp = time.Stamp(dateText);
   if (!stamp.empty() && hasTime) {
     return stamp;
   }

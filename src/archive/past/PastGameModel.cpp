@@ -127,7 +127,7 @@ std::string PastGameModel::BestOf(const ListedGame& game) const {
   if (game.BestPlayer < 1 || game.BestPlayer > PlayerCount) {
     return {};
   }
-  const std::string name = game.BestMember != 0 ? parts_.NameOf(game.BestMember) : std::string();
+  std::string name = game.BestMember != 0 ? parts_.NameOf(game.BestMember) : std::string();
   if (!name.empty()) {
     return name;
   }

@@ -130,7 +130,7 @@ void PastGames::ConnectCommands() {
   };
   connectButton(*ui_->Search, &PastGames::Search);
   connectButton(*ui_->ShowAll, &PastGames::ShowAll);
-  connectButton(*ui_->Open, &PastGames::Open);
+  connectButton(*ui_->Open, &PastGames::OpenGame);
   connectButton(*ui_->SaveFile, &PastGames::SaveFile);
   connectButton(*ui_->Charts, &PastGames::ShowCharts);
   connectButton(*ui_->Export, &PastGames::Export);

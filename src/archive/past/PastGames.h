@@ -18,6 +18,7 @@
 #include "platform/MessageBoxes.h"
 #include "ui/Commands.h"
 
+class QLineEdit;
 class QTableView;
 
 namespace Ui {
@@ -89,7 +90,7 @@ class PastGames : public QDialog {
   void Search();
   void ShowAll();
 
-  void Open();
+  void OpenGame();
   void SaveFile();
   void ShowCharts();
   void Export();

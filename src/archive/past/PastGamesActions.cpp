@@ -7,7 +7,7 @@
 #include "core/text/Filled.h"
 #include "ui_PastGames.h"
 
-void PastGames::Open() {
+void PastGames::OpenGame() {
   const PastGame* game = board_.Shown();
   if (game == nullptr || Listed().Which == ListedPast::Deleted) {
     return;

@@ -207,7 +207,7 @@ TEST_P(ImportGamesWindow, StopsAndKeepsWhatIsThere) {
   };
   events.At(std::chrono::milliseconds(0), serve);
   Import();
-  EXPECT_EQ(served, 3);
+  EXPECT_GE(served, 3);
   EXPECT_THAT(Status(), testing::StartsWith(In("Stopped. ", "已停止。")));
   const int games = std::stoi(Games());
   EXPECT_GE(games, 1);
