@@ -37,7 +37,7 @@ void AddMatches(const Files& disk, const std::string& folder, std::string_view p
   const std::string_view rest = pattern.substr(std::min(end + 1, pattern.size()));
   for (const std::string& found : FoldersIn(disk, folder)) {
     if (name == "*" || IsNamed(found, name)) {
-      AddMatches(disk, folder + "/" + found, rest, matches);
+      AddMatches(disk, std::string(folder).append("/").append(found), rest, matches);
     }
   }
 }
@@ -148,7 +148,7 @@ std::optional<OldGameFiles> CountGameFiles(const Files& disk, const std::string&
       }
       if (file.size() > GameEnding.size() &&
           IsNamed(std::string_view(file).substr(file.size() - GameEnding.size()), GameEnding)) {
-        AddGameFile(disk, next + "/" + file, games);
+        AddGameFile(disk, std::string(next).append("/").append(file), games);
       }
     }
     for (const std::string& inside : FoldersIn(disk, next)) {

@@ -160,7 +160,7 @@ void ForgetTakeOver(Files& disk, const std::string& dataFolder) {
   const std::string folder = TakeOverFolder(dataFolder);
   for (const std::string& name : disk.FileNames(folder)) {
     try {
-      disk.Delete(folder + "/" + name);
+      disk.Delete(std::string(folder).append("/").append(name));
     } catch (const RuntimeError&) {  // the next one that is made takes its place
     }
   }

@@ -112,7 +112,7 @@ void TakeOverWork::KeepFile(const std::string& name, TakenOver& taken) const {
   const std::size_t dot = name.rfind('.');
   const std::string start = name.substr(0, dot) + "-" + now + "-replaced";
   std::string copy = start + name.substr(dot);
-  for (int number = 2; parts_.Disk.FileExists(folder + "/" + copy); ++number) {
+  for (int number = 2; parts_.Disk.FileExists(std::string(folder).append("/").append(copy)); ++number) {
     copy = std::string(start).append(std::to_string(number)).append(name.substr(dot));
   }
   const std::string bytes = parts_.Disk.Read(path);
