@@ -1,3 +1,6 @@
+#include <QListWidget>
+#include <QToolButton>
+
 #include <gmock/gmock.h>
 
 #include "tests/support/Venue.h"

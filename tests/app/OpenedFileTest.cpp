@@ -21,7 +21,7 @@ class OpenedFile : public testing::Test {
   /// Opens the file and gives the window the time that it needs.
   void Open() {
     venue.Window->Open(File());
-    ASSERT_TRUE(QTest::qWaitFor([this] { return venue.Boxes.Boxes.size() > 0 || IsLoaded(); }, limit));
+    ASSERT_TRUE(QTest::qWaitFor([this] { return venue.Boxes.Boxes.size() > 0 || IsLoaded(); }, WaitLimit));
   }
   bool IsLoaded() const { return venue.Column("ScoreDisplay", 1) == std::vector<std::string>{"Yellow  0"}; }
   /// What the status line says about a file that waits.
@@ -31,7 +31,7 @@ class OpenedFile : public testing::Test {
                                                   : std::string();
   }
 
-  static constexpr int limit = 20'000;  ///< milliseconds
+  static constexpr int WaitLimit = 20'000;  ///< milliseconds
   Venue venue;
 };
 
@@ -72,21 +72,21 @@ TEST_F(OpenedFile, WaitsForTheWindowToBeShown) {
   QCoreApplication::processEvents();
   EXPECT_FALSE(IsLoaded());
   Show(*venue.Window);
-  EXPECT_TRUE(QTest::qWaitFor([this] { return IsLoaded(); }, limit));
+  EXPECT_TRUE(QTest::qWaitFor([this] { return IsLoaded(); }, WaitLimit));
 }
 
 TEST_F(OpenedFile, WaitsWhileABoxIsOpen) {
   venue.Start();
   venue.Boxes.WhileOpen = [this](const auto& /*box*/) {
     venue.Window->Open(File());
-    EXPECT_TRUE(QTest::qWaitFor([this] { return !Waiting().empty(); }, limit));
+    EXPECT_TRUE(QTest::qWaitFor([this] { return !Waiting().empty(); }, WaitLimit));
     EXPECT_EQ(Waiting(), "Friday.game.xml is loaded once the open window or command has ended");
     EXPECT_FALSE(IsLoaded());
   };
   venue.Boxes.Answers = {BoxAnswer::Cancel};
   venue.Trigger("mnuClearScores");
   venue.Boxes.WhileOpen = nullptr;
-  EXPECT_TRUE(QTest::qWaitFor([this] { return IsLoaded(); }, limit));
+  EXPECT_TRUE(QTest::qWaitFor([this] { return IsLoaded(); }, WaitLimit));
   EXPECT_EQ(Waiting(), "");
 }
 
@@ -94,13 +94,13 @@ TEST_F(OpenedFile, WaitsWhileAWindowIsOpen) {
   venue.Start();
   const WhileModal<QDialog> settings([this](QDialog& window) {
     venue.Window->Open(File());
-    EXPECT_TRUE(QTest::qWaitFor([this] { return !Waiting().empty(); }, limit));
+    EXPECT_TRUE(QTest::qWaitFor([this] { return !Waiting().empty(); }, WaitLimit));
     EXPECT_FALSE(IsLoaded());
     window.close();
   });
   venue.Trigger("mnuCommPort");
   EXPECT_EQ(settings.Runs(), 1);
-  EXPECT_TRUE(QTest::qWaitFor([this] { return IsLoaded(); }, limit));
+  EXPECT_TRUE(QTest::qWaitFor([this] { return IsLoaded(); }, WaitLimit));
 }
 
 TEST_F(OpenedFile, ReplacesAGameThatIsKeptWithoutAQuestion) {
@@ -125,7 +125,7 @@ TEST_F(OpenedFile, ReplacesAGameThatIsNeitherSavedNorKeptOnlyWhenTheOperatorWant
       BoxIcon::Question, BoxButtons::OkCancel};
   EXPECT_THAT(venue.Boxes.Boxes, ElementsAre(question));
   venue.Window->Open(File());
-  EXPECT_TRUE(QTest::qWaitFor([this] { return IsLoaded(); }, limit));
+  EXPECT_TRUE(QTest::qWaitFor([this] { return IsLoaded(); }, WaitLimit));
 }
 
 TEST_F(OpenedFile, IsTheLastOfSeveral) {
@@ -141,7 +141,7 @@ TEST_F(OpenedFile, BringsAWindowInTheTaskBarBack) {
   venue.Window->setWindowState(Qt::WindowMinimized);
   venue.Window->ComeToFront("token");
   EXPECT_FALSE(venue.Window->isMinimized());
-  EXPECT_TRUE(QTest::qWaitFor([this] { return venue.Window->isActiveWindow(); }, limit));
+  EXPECT_TRUE(QTest::qWaitFor([this] { return venue.Window->isActiveWindow(); }, WaitLimit));
   EXPECT_FALSE(qEnvironmentVariableIsSet("XDG_ACTIVATION_TOKEN")) << "other programs would inherit it";
 }
 
