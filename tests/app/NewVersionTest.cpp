@@ -1,7 +1,7 @@
+#include <gmock/gmock.h>
+
 #include <QListWidget>
 #include <QToolButton>
-
-#include <gmock/gmock.h>
 
 #include "tests/support/Venue.h"
 

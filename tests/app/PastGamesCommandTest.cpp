@@ -1,6 +1,7 @@
 #include <gmock/gmock.h>
 
 #include <QLabel>
+#include <QLineEdit>
 #include <QRadioButton>
 #include <nlohmann/json.hpp>
 
