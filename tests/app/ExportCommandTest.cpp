@@ -1,9 +1,12 @@
 #include <gmock/gmock.h>
 
 #include <QCheckBox>
+#include <QHeaderView>
+#include <QLineEdit>
 #include <QRadioButton>
 #include <nlohmann/json.hpp>
 
+#include "audience/GuestNameEntry.h"
 #include "exports/ExportGames.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
@@ -70,6 +73,18 @@ TEST_F(ExportCommand, TakesTheGameOnTheBoard) {
   EXPECT_THAT(names, ElementsAre("Mole", "Red 40", "Red 0"));
   EXPECT_THAT(soldiering, ElementsAre(9, 7, 5));
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+}
+
+TEST_F(ExportCommand, NamesTheGuestsOfTheGameOnTheBoard) {
+  venue.LoadGame(GameFile(PlayerOf(40, "<BonusPoints>9</BonusPoints>"), "First Muster"));
+  EXPECT_EQ(Exported().at("players").at(0).at("name"), "Blue 7");
+  const WhileModal<GuestNameEntry> entry([](GuestNameEntry& window) {
+    Find<QLineEdit>(window, "Guest40").setText(QStringLiteral("Ann"));
+    ::Press(window, "SaveExit");
+  });
+  venue.Trigger("mnuGuestNames");
+  EXPECT_EQ(entry.Runs(), 1);
+  EXPECT_EQ(Exported().at("players").at(0).at("name"), "Ann");
 }
 
 TEST_F(ExportCommand, FollowsTheStandingsHoweverTheBoardIsSorted) {

@@ -13,7 +13,6 @@
 
 namespace {
 
-using testing::ElementsAre;
 using testing::HasSubstr;
 
 /// The window of the charts; null if none is open.
@@ -87,6 +86,27 @@ TEST_F(ChartsCommand, FollowsAChangeOfTheMissionUpToTheLastPoint) {
       EXPECT_EQ(player.Of(ScorePart::Other), 0) << player.Player.Name << ", mission " << mission;
     }
   }
+}
+
+TEST_F(ChartsCommand, NamesMembersByTheirNicknamesOnly) {
+  venue.ChangeDatabase(
+      "members.mdb",
+      "INSERT INTO Members (ContactID, DallasID, FirstName, LastName, NickName) VALUES "
+      "(5, 'BB00000000000001', 'Bo', 'Ray', 'Mole'), (6, 'BB00000000000002', 'Ann', 'Doe', NULL)");
+  venue.MakeWindow().FormLoad();
+  Show(*venue.Window);
+  venue.LoadGame(GameFile(PlayerOf(40,
+                                   "<BonusPoints>9</BonusPoints>"
+                                   "<DallasID>BB00000000000001</DallasID>") +
+                              PlayerOf(105,
+                                       "<BonusPoints>7</BonusPoints>"
+                                       "<DallasID>BB00000000000002</DallasID>"),
+                          "First Muster"));
+  ASSERT_THAT(venue.Row("ScoreDisplay", 1).at(1), HasSubstr("Ann Doe"));
+  const auto scores = ChartedScores(Charts());
+  ASSERT_EQ(scores.size(), 2U);
+  EXPECT_THAT(scores[0].first, HasSubstr("(Mole)"));
+  EXPECT_THAT(scores[1].first, testing::Not(HasSubstr("Ann")));
 }
 
 TEST_F(ChartsCommand, BringsTheOneWindowToTheFront) {
