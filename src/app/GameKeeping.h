@@ -24,6 +24,10 @@ class GameKeeping : public QObject {
   void Open(std::int64_t gameId, std::int64_t state, const Game& game, const std::string& missionName) {
     keeper_.Open(gameId, state, game, missionName);
   }
+  /// The game of a file is being loaded; see GameKeeper::Load.
+  void Load(const Game& game, const std::string& missionName, const std::string& fileTime) {
+    keeper_.Load(game, missionName, fileTime);
+  }
   /// Removes what was deleted long ago.
   void RemoveDeleted() { Do(&GameKeeper::RemoveDeleted); }
   /// The operator may have changed members.

@@ -163,7 +163,9 @@ ImportedGames frmRx::ImportOldGames(const std::string& folder, FilesOfMembers me
                     members == FilesOfMembers::Taken ? FilesOf::ThisTable : FilesOf::OtherTable);
   import.Run(folder, [&keepOn](const GameImport::State&) { return keepOn();
 });
-return {.Imported = import.Imported(), .Known = import.Known(), .Refused = import.Refused().size()};
+return {.Imported = import.Imported() + import.BroughtBack(),
+        .Known = import.Known(),
+        .Refused = import.Refused().size()};
 }
 
 void frmRx::TakeOverOldInstallation() {

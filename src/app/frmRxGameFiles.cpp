@@ -37,7 +37,15 @@ void frmRx::LoadGame() {
 void frmRx::ReadGame() {
   const WaitCursor cursor;
   session_.LoadGame([this](Game& game, const Session::MissionChoice& chooseMission) {
-    return gameFile_.LoadGame(game, chooseMission);
+    std::string mission;
+    const bool isGame = gameFile_.LoadGame(game, [&](const std::string& name) {
+      mission = name;
+      chooseMission(name);
+    });
+    if (isGame) {
+      keeping_->Load(game, mission, gameFile_.TimeOfChange());
+    }
+    return isGame;
   });
 }
 

@@ -2,6 +2,7 @@
 
 #include <utility>
 
+#include "archive/ArchiveRoom.h"
 #include "core/text/Filled.h"
 
 /// Those of an archive without games.
@@ -35,6 +36,10 @@ Database& ArchiveAccess::File() {
 
 GameArchive ArchiveAccess::Archive() {
   return {File(), parts_.Session.DbMembers(), parts_.Strings};
+}
+
+void ArchiveAccess::CheckSpace() const {
+  CheckSpaceForGames(parts_.Disk, parts_.UserDataFolder, parts_.Strings);
 }
 
 PastGame ArchiveAccess::Read(std::int64_t gameId, std::int64_t state) {

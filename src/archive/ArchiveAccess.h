@@ -43,6 +43,10 @@ class ArchiveAccess {
   /// Its database, for groups of reads and writes.
   Database& File();
 
+  /// To be called before something is written into the archive. Throws RuntimeError 61 if too little of the
+  /// disk is free.
+  void CheckSpace() const;
+
   /// A game as it was kept, deleted ones too. Throws RuntimeError 53 if there is no such game or state, 321
   /// if its file is damaged.
   PastGame Read(std::int64_t gameId, std::int64_t state = 0);

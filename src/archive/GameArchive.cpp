@@ -57,24 +57,6 @@ bool GameArchive::KeepAgain(std::int64_t gameId, const GameState& state, FormerS
   return true;
 }
 
-std::optional<std::int64_t> GameArchive::Find(const Game& game, const std::string& missionName) {
-  const std::optional<FoundState> found = FindState(game, missionName);
-  return found ? std::optional(found->GameId) : std::nullopt;
-}
-
-std::optional<GameArchive::FoundState> GameArchive::FindState(const Game& game,
-                                                              const std::string& missionName) {
-  const std::string inputs = GameInputs(game, missionName);
-  const std::vector<StoredFile> candidates =
-      FilesWhere("GameFiles.InputsHash = $1 AND Games.Deleted IS NULL", {GameInputsHash(inputs)});
-  for (const StoredFile& file : candidates) {
-    if (HoldsInputs(file, inputs)) {
-      return FoundState{file.GameId, file.State};
-    }
-  }
-  return std::nullopt;
-}
-
 std::string GameArchive::FileOf(std::int64_t gameId, std::int64_t state) {
   const std::vector<StoredFile> files =
       FilesWhere("GameFiles.GameID = $1 AND GameFiles.State = $2", {gameId, state});
@@ -124,17 +106,6 @@ int GameArchive::Delete(const std::vector<std::int64_t>& games, const std::strin
   }
   scope.Commit();
   return static_cast<int>(deleted);
-}
-
-int GameArchive::BringBack(const std::vector<std::int64_t>& games) {
-  WriteScope scope(archive_);
-  std::int64_t back = 0;
-  for (const std::int64_t game : games) {
-    back += archive_.Statements().Change(
-        "UPDATE Games SET Deleted = NULL WHERE GameID = $1 AND Deleted IS NOT NULL", {game});
-  }
-  scope.Commit();
-  return static_cast<int>(back);
 }
 
 int GameArchive::RemoveDeleted(const std::string& before) {
@@ -249,19 +220,6 @@ std::string GameArchive::ReadGame(const std::string& name, Game& game) {
     throw Damaged(name);
   }
   return mission;
-}
-
-bool GameArchive::HoldsInputs(const StoredFile& file, const std::string& inputs) {
-  Game game(strings_);
-  try {
-    const std::string mission = ReadGame(file.Name, game);
-    return GameInputs(game, mission) == inputs;
-  } catch (const RuntimeError& error) {
-    if (error.Number() != Fault::InvalidFileFormat) {
-      throw;
-    }
-    return false;  // it cannot be this game any more
-  }
 }
 
 RuntimeError GameArchive::NoFile(std::int64_t gameId) const {

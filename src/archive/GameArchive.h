@@ -41,6 +41,9 @@ class GameArchive {
   /// game. Deleted games do not count.
   std::optional<std::int64_t> Find(const Game& game, const std::string& missionName);
 
+  /// Which games to look among.
+  enum class Among { Listed, Deleted };
+
   /// One of the states of a game. State 0 is the last one; earlier ones count from 1, the first.
   struct FoundState {
     std::int64_t GameId;
@@ -48,7 +51,17 @@ class GameArchive {
   };
 
   /// Find, with the state that has these inputs.
-  std::optional<FoundState> FindState(const Game& game, const std::string& missionName);
+  std::optional<FoundState> FindState(const Game& game, const std::string& missionName,
+                                      Among among = Among::Listed);
+
+  /// The state of a game of the day of `played` ("YYYY-MM-DD HH:MM:SS") that is this game but for who its
+  /// players are and which of them are committed. `breathe` is called between files that take their time.
+  std::optional<FoundState> FindAlike(const Game& game, const std::string& missionName,
+                                      const std::string& played, Among among = Among::Listed,
+                                      const std::function<void()>& breathe = {});
+
+  /// When a game was played; empty if there is no such game, or it is deleted.
+  std::string PlayedOf(std::int64_t gameId);
 
   /// A game with the figures that it was kept with, deleted ones too. Throws RuntimeError 53 if there is no
   /// such game or state.
@@ -57,7 +70,8 @@ class GameArchive {
   /// Games that the operator no longer wants. They are in no answer until they are brought back. `now` is the
   /// local time, "YYYY-MM-DD HH:MM:SS". Returns how many were there.
   int Delete(const std::vector<std::int64_t>& games, const std::string& now);
-  /// Undoes Delete. Returns how many were deleted before.
+  /// Undoes Delete, but not where the same game is there in another's place by now: that one and the deleted
+  /// one stay as they are. Returns how many are back.
   int BringBack(const std::vector<std::int64_t>& games);
   /// Removes the games that were deleted before that local time, with their files. Returns how many.
   int RemoveDeleted(const std::string& before);
@@ -104,7 +118,13 @@ class GameArchive {
   std::string ReadFile(const std::string& name);
   /// Returns the name of the mission.
   std::string ReadGame(const std::string& name, Game& game);
-  bool HoldsInputs(const StoredFile& file, const std::string& inputs);
+  /// The first of these files whose game and mission `isSame` is true for.
+  using IsSame = std::function<bool(const Game& game, const std::string& mission)>;
+  std::optional<FoundState> FirstOf(const std::vector<StoredFile>& files, const IsSame& isSame);
+  /// The files of that day that may hold the game: last states with its summary, and all earlier states.
+  std::vector<StoredFile> FilesOfDay(const std::string& played, const Game& game, const std::string& mission,
+                                     Among among);
+  bool StandsElsewhere(std::int64_t gameId);
   int CutFromGames(std::int32_t number);
   std::vector<std::string> ButtonsOf(std::int32_t number);
   /// Changes a player of a file; false if there is nothing to change.

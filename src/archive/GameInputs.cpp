@@ -1,6 +1,7 @@
 #include "archive/GameInputs.h"
 
 #include "archive/Digests.h"
+#include "core/game/DallasId.h"
 #include "core/text/NumberForms.h"
 
 namespace {
@@ -53,6 +54,15 @@ std::string GameInputs(const Game& game, const std::string& missionName) {
     }
   }
   return std::move(list.Bytes);
+}
+
+std::string InputsOfAnybody(Game game, const std::string& missionName) {
+  for (Player& player : game.Players) {
+    player.MemberIndex = 0;
+    player.DallasID = NoDallasId;
+    player.Committed = false;
+  }
+  return GameInputs(game, missionName);
 }
 
 std::string GameInputsHash(const std::string& inputs) {

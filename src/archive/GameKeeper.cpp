@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <utility>
 
-#include "archive/ArchiveQueries.h"
 #include "archive/DeletedGames.h"
 #include "archive/KeepingFailure.h"
 #include "core/game/WordDigest.h"
@@ -35,14 +34,6 @@ std::uint64_t FiguresDigest(const Game& game) {
     }
   }
   return digest.Value();
-}
-
-/// When the game was played; empty if the archive has no such game, or has deleted it.
-std::string PlayedIn(Sql& sql, std::int64_t gameId) {
-  std::string played;
-  sql.Query("SELECT Played FROM Games WHERE GameID = $1 AND Deleted IS NULL", {gameId},
-            [&played](const SqlRow& row) { played = row.Text(0); });
-  return played;
 }
 
 /// True as long as it exists.
@@ -82,7 +73,7 @@ void GameKeeper::Hear(SessionChange change) {
       break;
     case SessionChange::Scores:
       scoresPending_ = false;
-      EndOpening();
+      EndLoading();
       break;
     default:
       break;
@@ -96,36 +87,14 @@ void GameKeeper::Forget() {
   source_ = GameSource::Cable;
   pulls_ = 0;
   formerPulls_ = 0;
-  opening_.reset();
+  loading_.reset();
+  read_.reset();
+  fileTime_.clear();
   lastStateIsElse_ = false;
   // A game that is cleared in the middle of a pull goes on with the guns that are still to come.
 }
 
-void GameKeeper::Open(std::int64_t gameId, std::int64_t state, const Game& game,
-                      const std::string& missionName) {
-  gameId_ = gameId;
-  lastStateIsElse_ = state != 0;
-  opening_ = InputsDigest(game, missionName);
-  Try([this] {
-    played_ = PlayedIn(OpenFile().Statements(), *gameId_);
-    NotePulls();
-  });
-}
-
-void GameKeeper::EndOpening() {
-  if (!opening_) {
-    return;
-  }
-  // A mission that is gone, or a button that has an owner now, make other inputs of it without the operator.
-  const Marks now = MarksOf(parts_.Session.Game());
-  lastStateIsElse_ = lastStateIsElse_ || now.Inputs != *opening_;
-  kept_ = now;
-  opening_.reset();
-  state_.KeptAt = parts_.Time.ShortTime();
-}
-
 void GameKeeper::BeginPull(GameSource source) {
-  opening_.reset();
   Keep();
   if (!parts_.Session.Game().DataPresent) {
     source_ = source;
@@ -134,8 +103,7 @@ void GameKeeper::BeginPull(GameSource source) {
   scoresPending_ = true;
 }
 
-template <typename Action>
-void GameKeeper::Try(const Action& action) {
+void GameKeeper::Try(const std::function<void()>& action) {
   if (ended_ || keeping_) {
     return;
   }
@@ -184,9 +152,10 @@ void GameKeeper::SeeWhetherItWorksAgain() {
 }
 
 void GameKeeper::Keep() {
-  if (ended_ || keeping_ || opening_) {
+  if (ended_ || keeping_) {
     return;
   }
+  EndLoading();
   LeaveMovedFile();
   if (!parts_.Session.Game().DataPresent) {
     SeeWhetherItWorksAgain();
@@ -233,29 +202,7 @@ bool GameKeeper::IsKept(const Marks& now) const {
 }
 
 void GameKeeper::CheckRoom() const {
-  if (parts_.Disk.FreeSpace(parts_.UserDataFolder) < LeastFreeSpace) {
-    throw RuntimeError(Fault::DiskFull, parts_.Strings.Text(OwnText::KeeperDiskFull));
-  }
-}
-
-bool GameKeeper::Recognise(GameArchive& archive, const Game& game, bool isLoaded) {
-  const bool isLost = gameId_ && PlayedIn(file_.Open->Statements(), *gameId_) != played_;
-  if (isLost) {
-    gameId_.reset();
-  }
-  if (!isLost && !(isLoaded && !kept_)) {
-    return false;
-  }
-  const auto found = archive.FindState(game, parts_.Session.Missions().Text());
-  if (!found) {
-    return false;
-  }
-  gameId_ = found->GameId;
-  lastStateIsElse_ = found->State != 0;
-  if (isLoaded) {
-    NotePulls();
-  }
-  return isLoaded;
+  CheckSpaceForGames(parts_.Disk, parts_.UserDataFolder, parts_.Strings);
 }
 
 void GameKeeper::Write(const Game& game, const Marks& now) {
@@ -273,16 +220,11 @@ void GameKeeper::Write(const Game& game, const Marks& now) {
     }
     lastStateIsElse_ = false;
   }
-  played_ = PlayedIn(file_.Open->Statements(), *gameId_);
+  played_ = archive.PlayedOf(*gameId_);
   kept_ = now;
   pulls_ = pulls;
   pullBegun_ = false;
   state_.KeptAt = parts_.Time.ShortTime();
-}
-
-void GameKeeper::NotePulls() {
-  const std::optional<ListedGame> row = ArchiveQueries(file_.Open->Statements()).Game(*gameId_);
-  formerPulls_ = row ? row->Pulls : 0;
 }
 
 // Guns that come in one by one complete a game; only what is added up hides what was there before.
@@ -303,16 +245,10 @@ FormerState GameKeeper::FormerOf(const Marks& now) const {
 GameState GameKeeper::StateOf(const Game& game, int pulls) const {
   return {.Game = game,
           .Mission = parts_.Session.Missions().Text(),
-          .Played = Played(),
+          .Played = Played(game),
           .Source = source_,
           .Pulls = std::max(1, formerPulls_ + pulls),
           .Factors = parts_.Session.Factors()};
-}
-
-std::string GameKeeper::Played() const {
-  const std::string told =
-      source_ == GameSource::File ? parts_.Time.Stamp(parts_.Session.Game().GameDate) : std::string();
-  return told.empty() ? parts_.Progress.Received() : told;
 }
 
 Database& GameKeeper::OpenFile() {
@@ -348,6 +284,7 @@ void GameKeeper::CheckMembers() {
 
 void GameKeeper::CheckUnchecked() {
   if (membersUnchecked_ && ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
+    CheckRoom();
     for (const CutMember& cut : Archive().CheckMembers()) {
       state_.CutGames += cut.Games;
     }
@@ -358,6 +295,7 @@ void GameKeeper::CheckUnchecked() {
 void GameKeeper::RemoveDeleted() {
   Try([this] {
     if (ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
+      CheckRoom();
       Archive().RemoveDeleted(LastTimeOfRemoved(parts_.Time.Now()));
     }
   });
@@ -366,7 +304,8 @@ void GameKeeper::RemoveDeleted() {
 void GameKeeper::NoteMembers() {
   Try([this] {
     CheckUnchecked();
-    if (file_.Open) {
+    if (ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
+      CheckRoom();
       Archive().Known().NoteChanges();
     }
   });

@@ -2,11 +2,13 @@
 
 #include <array>
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
 
 #include "archive/ArchiveFile.h"
+#include "archive/ArchiveRoom.h"
 #include "archive/GameArchive.h"
 #include "archive/WeeklyCopy.h"
 #include "core/game/GameProgress.h"
@@ -42,8 +44,7 @@ class GameKeeper {
     std::string ProgramFolder;
   };
 
-  /// Game files, logs and copies come first: the archive writes only while so many bytes stay free.
-  static constexpr std::uint64_t LeastFreeSpace = std::uint64_t{32} << 20U;
+  static constexpr std::uint64_t LeastFreeSpace = ::LeastFreeSpace;
 
   /// The session must be open. All parts must outlive this object.
   explicit GameKeeper(Parts parts);
@@ -64,6 +65,12 @@ class GameKeeper {
   /// scores still to come. Whatever becomes of it is that game; a state that the operator changes then does
   /// not replace a later one. To be called once the session has cleared the board.
   void Open(std::int64_t gameId, std::int64_t state, const Game& game, const std::string& missionName);
+
+  /// The game of a file is being loaded: `game` as it was just read, with the mission of that name, its
+  /// scores still to come. `fileTime` is the local time, "YYYY-MM-DD HH:MM:SS", at which the file was last
+  /// changed; empty if that is not known. If the archive has the game, whatever becomes of it is that game;
+  /// loading alone changes nothing of it. To be called once the session has cleared the board.
+  void Load(const Game& game, const std::string& missionName, const std::string& fileTime);
 
   /// Removes the games that were deleted so long ago that they cannot be brought back. Does nothing without
   /// an archive.
@@ -95,22 +102,32 @@ class GameKeeper {
     RawDigests Raw{};  ///< of each active player's figures as the gun gave them; 0 for the others
   };
 
+  /// A game as it was read, before its scores were calculated.
+  struct ReadGame {
+    ::Game Game;
+    std::string Mission;
+  };
+
   void Hear(SessionChange change);
-  /// The scores of the game that is being opened are there.
-  void EndOpening();
+  /// The scores of the game that is being loaded are there, or will not come.
+  void EndLoading();
   void Forget();
   void KeepAs(const Game& game);
   Marks MarksOf(const Game& game) const;
   bool IsKept(const Marks& now) const;
   void Write(const Game& game, const Marks& now);
+  /// Finds the loaded game in the archive, as it was read.
+  void FindRead(GameArchive& archive);
   /// Finds the game on the board in the archive if that has become another one, or the game was loaded. True
   /// if a loaded game is there just as it is.
   bool Recognise(GameArchive& archive, const Game& game, bool isLoaded);
+  /// Finds that game, and goes on with it. True if the archive has just the same.
+  bool GoOnWith(GameArchive& archive, const Game& game, const std::string& missionName);
   void NotePulls();
   FormerState FormerOf(const Marks& now) const;
   GameState StateOf(const Game& game, int pulls) const;
   /// Local time at which the game was played, "YYYY-MM-DD HH:MM:SS".
-  std::string Played() const;
+  std::string Played(const Game& game) const;
   GameArchive Archive();
   Database& OpenFile();
   void CloseFile() noexcept;
@@ -124,8 +141,7 @@ class GameKeeper {
   bool SetAside(const RuntimeError& failure);
   /// Runs `action`, a second time if it can be done with another archive, and keeps what it throws as the
   /// failure to tell.
-  template <typename Action>
-  void Try(const Action& action);
+  void Try(const std::function<void()>& action);
   std::string TextOf(const RuntimeError& failure) const;
 
   const Parts parts_;
@@ -138,8 +154,10 @@ class GameKeeper {
   GameSource source_ = GameSource::Cable;
   int pulls_ = 0;
   int formerPulls_ = 0;  ///< of a past game, before it came onto the board again
-  /// Digest of the inputs of a game that is being opened, as they were before its scores were calculated.
-  std::optional<std::uint64_t> opening_;
+  /// Digest of the inputs of a game that is being loaded, as they were before its scores were calculated.
+  std::optional<std::uint64_t> loading_;
+  std::optional<ReadGame> read_;  ///< the loaded game, until it has been looked for in the archive
+  std::string fileTime_;          ///< when the file of the loaded game was last changed
   bool lastStateIsElse_ = false;  ///< what the archive has as the last state was not on this board
   bool pullBegun_ = false;        ///< and nothing of it is kept yet
   bool scoresPending_ = false;    ///< guns may have been read since the last calculation

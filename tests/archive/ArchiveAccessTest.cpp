@@ -244,6 +244,16 @@ TEST_F(Deleting, HidesGamesUntilTheyAreBroughtBack) {
   EXPECT_EQ(access.Queries().Game(3)->Deleted, "");
 }
 
+TEST_F(Deleting, IsNotUndoneWhereTheSameGameIsThereAgain) {
+  access.Archive().Delete({3}, "2026-12-01 10:00:00");
+  const std::int64_t again = access.Archive().Keep(State());
+  EXPECT_EQ(access.Archive().BringBack({3}), 0);
+  EXPECT_EQ(access.Queries().Game(3)->Deleted, "2026-12-01 10:00:00");
+  access.Archive().Delete({1, 2, again}, "2026-12-01 10:00:00");
+  EXPECT_EQ(access.Archive().BringBack({3}), 1);
+  EXPECT_EQ(access.Archive().BringBack({again}), 0);
+}
+
 TEST_F(Deleting, ChangesNothingOfADeletedGameAnyMore) {
   access.Archive().Delete({3}, "2026-12-01 10:00:00");
   session.Game().Players(1).Active = !session.Game().Players(1).Active;

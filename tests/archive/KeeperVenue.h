@@ -11,13 +11,7 @@
 #include "tests/support/MadeDatabase.h"
 #include "tests/support/OpenSession.h"
 #include "tests/support/TestDatabase.h"
-
-/// A disk with that much space left.
-class TightDisk : public LinuxFiles {
- public:
-  std::uint64_t Space = GameKeeper::LeastFreeSpace;
-  std::uint64_t FreeSpace(const std::string& /*path*/) const override { return Space; }
-};
+#include "tests/support/TightDisk.h"
 
 /// A keeper at work on a session with a real archive. Member 7 is "Mole".
 class KeeperVenue : public testing::Test {
@@ -55,9 +49,19 @@ class KeeperVenue : public testing::Test {
     session.Game().GameDate = "21/05/2013 14:30";
   }
 
-  void Load(const std::string& bytes) {
-    session.LoadGame(
-        [&](Game& game, const Session::MissionChoice& choose) { return ReadGameFile(bytes, game, choose); });
+  /// The operator loads a file that was last changed at `fileTime`; empty if that is not known.
+  void Load(const std::string& bytes, const std::string& fileTime = {}) {
+    session.LoadGame([&](Game& game, const Session::MissionChoice& choose) {
+      std::string mission;
+      const bool isGame = ReadGameFile(bytes, game, [&](const std::string& name) {
+        mission = name;
+        choose(name);
+      });
+      if (isGame) {
+        keeper->Load(game, mission, fileTime);
+      }
+      return isGame;
+    });
     keeper->Keep();
   }
 

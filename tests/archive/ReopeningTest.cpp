@@ -113,6 +113,46 @@ TEST_F(Reopening, KeepsTheFormerStateWhereLoadingAloneMadeAnotherOfIt) {
   EXPECT_EQ(Query("SELECT count(*) FROM GameFiles WHERE GameID = 2"), "2");
 }
 
+TEST_F(Reopening, KeepsAChangeThoughTheMembersWereLockedWhileItWasOpened) {
+  Pull();
+  session.Game().Players(Blue7).MemberIndex = 7;
+  keeper->Keep();
+  session.ClearPlayerData();
+  {
+    OtherConnection other(venue.MembersFile());
+    other.Execute("BEGIN EXCLUSIVE");
+    EXPECT_THROW(Open(1), RuntimeError);
+    keeper->Keep();  // as at the end of each command
+    other.Execute("ROLLBACK");
+  }
+  EXPECT_EQ(keeper->State().KeptAt, "14:30");
+  ChangeBonus(50);
+  EXPECT_EQ(FileHolds(0, "<BonusPoints> 50<"), "<BonusPoints> 50<");
+  EXPECT_EQ(Games(), "1");
+  EXPECT_EQ(Query("SELECT Soldiering FROM GamePlayers WHERE PlayerIndex = 1"),
+            std::to_string(session.Game().Players(Red0).Soldiering));
+}
+
+TEST_F(Reopening, KeepsAChangeThoughTheMissionsWereLockedWhileItWasOpened) {
+  ExecuteSql(venue.ScenariosFile(), "INSERT INTO Table1 (MissionName) VALUES ('Flag')");
+  session.Reopen();
+  session.SelectMission(2);
+  Pull();
+  session.ClearPlayerData();
+  {
+    OtherConnection other(venue.ScenariosFile());
+    other.Execute("BEGIN EXCLUSIVE");
+    EXPECT_THROW(Open(1), RuntimeError);
+    keeper->Keep();
+    other.Execute("ROLLBACK");
+  }
+  EXPECT_FALSE(session.Game().DataPresent) << "its mission was not found, so that nothing was read";
+  EXPECT_EQ(keeper->State().KeptAt, "");
+  Open(1);
+  ChangeBonus(50);
+  EXPECT_EQ(FileHolds(0, "<BonusPoints> 50<"), "<BonusPoints> 50<");
+}
+
 TEST_F(Reopening, GoesOnInAPullOntoTheGame) {
   Pull();
   session.ClearPlayerData();
@@ -155,6 +195,28 @@ TEST_F(Keeper, RemovesWhatWasDeletedThirtyDaysAgo) {
   keeper->RemoveDeleted();
   EXPECT_EQ(Games(), "1");
   OtherConnection(ArchivePath()).Execute("UPDATE Games SET Deleted = '2013-04-21 14:30:04'");
+  keeper->RemoveDeleted();
+  EXPECT_EQ(Games(), "0");
+  EXPECT_EQ(keeper->State().Failure, "");
+}
+
+TEST_F(Keeper, RemovesAndCutsNothingWhileTheDiskIsNarrow) {
+  Pull();
+  session.Game().Players(Red0).MemberIndex = 7;
+  keeper->Keep();
+  session.ClearPlayerData();
+  OtherConnection(ArchivePath()).Execute("UPDATE Games SET Deleted = '2012-04-21 14:30:05'");
+  ExecuteSql(venue.MembersFile(), "UPDATE Members SET FirstName = 'Ann'");
+  const std::string before = ReadFile(ArchivePath());
+  disk.Space = LeastFreeSpace - 1;
+  for (const auto& act : {&GameKeeper::RemoveDeleted, &GameKeeper::NoteMembers, &GameKeeper::CheckMembers}) {
+    (*keeper.*act)();
+    EXPECT_EQ(ReadFile(ArchivePath()), before);
+    EXPECT_THAT(keeper->State().Failure, testing::HasSubstr("32 MB"));
+  }
+  disk.Space = LeastFreeSpace;
+  keeper->CheckMembers();
+  EXPECT_NE(ReadFile(ArchivePath()), before);
   keeper->RemoveDeleted();
   EXPECT_EQ(Games(), "0");
   EXPECT_EQ(keeper->State().Failure, "");

@@ -4,8 +4,8 @@
 #include <cstdlib>
 #include <string>
 
+#include "archive/PlayedTime.h"
 #include "archive/import/GameFileCheck.h"
-#include "archive/import/PlayedTime.h"
 #include "core/text/TextEncoding.h"
 #include "tests/fakes/FakeClock.h"
 

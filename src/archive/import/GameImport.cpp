@@ -4,9 +4,7 @@
 #include <string_view>
 
 #include "archive/Entries.h"
-#include "archive/GameInputs.h"
-#include "archive/GameKeeper.h"
-#include "archive/import/PlayedTime.h"
+#include "archive/PlayedTime.h"
 #include "core/gamefile/GameFile.h"
 #include "platform/RuntimeError.h"
 #include "platform/Sql.h"
@@ -23,27 +21,12 @@ bool IsGameFileName(std::string_view name) {
   });
 }
 
-/// The inputs of a game whoever its players are.
-std::string InputsOfNobody(Game game, const std::string& mission) {
-  for (Player& player : game.Players) {
-    player.MemberIndex = 0;
-    player.DallasID = NoDallasId;
-  }
-  return GameInputs(game, mission);
-}
-
 bool IsFaultOfDisk(int number) {
   return number == Fault::FileNotFound || number == Fault::PermissionDenied || number == Fault::PathAccess ||
          number == Fault::PathNotFound;
 }
 
 }  // namespace
-
-void CheckSpaceForGames(const Files& disk, const std::string& userDataFolder, const StringTable& strings) {
-  if (disk.FreeSpace(userDataFolder) < GameKeeper::LeastFreeSpace) {
-    throw RuntimeError(Fault::DiskFull, strings.Text(OwnText::KeeperDiskFull));
-  }
-}
 
 GameImport::GameImport(const Parts& parts, FilesOf table)
     : parts_(parts), archive_(parts.Archive, parts.Members, parts.Strings), members_(parts.Members, table) {}
@@ -52,14 +35,27 @@ bool GameImport::Run(const std::string& folder, const OnStep& onStep) {
   bool goesOn = Search(folder, onStep);
   State state{.Done = 0, .Files = paths_.size()};
   const Breath breathe = [&] { goesOn = onStep(state) && goesOn; };
-  for (; goesOn && state.Done < paths_.size(); ++state.Done) {
-    ImportFile(paths_[state.Done], breathe);
-    breathe();
+  try {
+    for (; goesOn && state.Done < paths_.size(); ++state.Done) {
+      ImportFile(paths_[state.Done], breathe);
+      breathe();
+    }
+  } catch (const RuntimeError&) {
+    RaiseCounterIfPossible();
+    throw;
   }
   if (imported_ > 0) {
     archive_.Known().RaiseCounter();
   }
   return goesOn;
+}
+
+void GameImport::RaiseCounterIfPossible() {
+  try {
+    archive_.Known().RaiseCounter();
+  } catch (const RuntimeError&) {
+    // The first failure is the one to tell. The next check of the members raises it.
+  }
 }
 
 bool GameImport::Search(const std::string& folder, const OnStep& onStep) {
@@ -113,11 +109,17 @@ std::optional<GameFileTrouble> GameImport::TakeGame(const std::string& path, con
     return trouble;
   }
   const std::string played = TimePlayed(game.Game.GameDate, parts_.Disk.TimeOfChange(path), parts_.Time);
-  if (SettleAndFind(game, played, breathe)) {
+  const Found found = SettleAndFind(game, played, breathe);
+  if (found.IsListed) {
     ++known_;
     return std::nullopt;
   }
   CheckSpaceForGames(parts_.Disk, parts_.UserDataFolder, parts_.Strings);
+  if (found.Deleted) {
+    archive_.BringBack({*found.Deleted});
+    ++broughtBack_;
+    return std::nullopt;
+  }
   archive_.Keep({.Game = game.Game,
                  .Mission = game.Mission,
                  .Played = played,
@@ -128,44 +130,22 @@ std::optional<GameFileTrouble> GameImport::TakeGame(const std::string& path, con
   return std::nullopt;
 }
 
-bool GameImport::SettleAndFind(GameInFile& game, const std::string& played, const Breath& breathe) {
-  if (archive_.Find(game.Game, game.Mission)) {
-    return true;
+GameImport::Found GameImport::SettleAndFind(GameInFile& game, const std::string& played,
+                                            const Breath& breathe) {
+  using Among = GameArchive::Among;
+  if (archive_.FindState(game.Game, game.Mission)) {
+    return {.IsListed = true};
   }
+  auto deleted = archive_.FindState(game.Game, game.Mission, Among::Deleted);
   breathe();
   members_.Settle(game.Game);
-  const bool isKnown = archive_.Find(game.Game, game.Mission) || IsKnownWithOthers(game, played, breathe);
-  breathe();
-  return isKnown;
-}
-
-bool GameImport::IsKnownWithOthers(const GameInFile& game, const std::string& played, const Breath& breathe) {
-  constexpr std::size_t dayLength = 10;
-  const std::string day = played.substr(0, dayLength);
-  const auto players = std::ranges::count_if(game.Game.Players, &Player::Active);
-  std::vector<std::int64_t> candidates;
-  parts_.Archive.Statements().Query(
-      "SELECT GameID FROM Games WHERE Mission = $1 AND Played >= $2 AND Played <= $3 AND DateText = $4 "
-      "AND Players = $5 AND RedTotal = $6 AND BlueTotal = $7 AND YellowTotal = $8 AND Deleted IS NULL",
-      {game.Mission, day, day + " 24", game.Game.GameDate, std::int64_t{players},
-       std::int64_t{game.Game.TeamTotals(1)}, std::int64_t{game.Game.TeamTotals(2)},
-       std::int64_t{game.Game.TeamTotals(3)}},
-      [&candidates](const SqlRow& row) { candidates.push_back(row.Integer(0)); });
-  if (candidates.empty()) {
-    return false;
+  if (archive_.FindState(game.Game, game.Mission) ||
+      archive_.FindAlike(game.Game, game.Mission, played, Among::Listed, breathe)) {
+    return {.IsListed = true};
   }
-  const std::string inputs = InputsOfNobody(game.Game, game.Mission);
-  return std::ranges::any_of(candidates, [&](std::int64_t candidate) {
-    breathe();
-    GameInFile kept{.Game = Game(parts_.Strings), .Mission = {}};
-    try {
-      return !ReadCheckedGame(archive_.FileOf(candidate), parts_.Strings, kept, breathe) &&
-             InputsOfNobody(kept.Game, kept.Mission) == inputs;
-    } catch (const RuntimeError& error) {
-      if (error.Number() != Fault::InvalidFileFormat && error.Number() != Fault::FileNotFound) {
-        throw;
-      }
-      return false;  // nobody can tell any more
-    }
-  });
+  if (!deleted) {
+    deleted = archive_.FindAlike(game.Game, game.Mission, played, Among::Deleted, breathe);
+  }
+  breathe();
+  return {.Deleted = deleted ? std::optional(deleted->GameId) : std::nullopt};
 }

@@ -1,11 +1,13 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <functional>
 #include <optional>
 #include <string>
 #include <vector>
 
+#include "archive/ArchiveRoom.h"
 #include "archive/GameArchive.h"
 #include "archive/import/GameFileCheck.h"
 #include "archive/import/MembersOfFiles.h"
@@ -19,11 +21,9 @@ struct RefusedGameFile {
   GameFileTrouble Trouble;
 };
 
-/// Throws RuntimeError 61 if less of the disk is free than the archive leaves to other files.
-void CheckSpaceForGames(const Files& disk, const std::string& userDataFolder, const StringTable& strings);
-
 /// Takes game files into the archive, each as a game of its own with the figures that stand in it. A game
-/// that the archive has already is not added once more, whoever its members were taken for.
+/// that the archive has already is not added once more, whoever its members were taken for and whether or not
+/// they were committed; if it is a deleted one, it is brought back as it was.
 class GameImport {
  public:
   /// All must outlive the import.
@@ -56,17 +56,25 @@ class GameImport {
   std::size_t Imported() const { return imported_; }
   /// Files whose game was in the archive already, or twice in the folder.
   std::size_t Known() const { return known_; }
+  /// Games that had been deleted, and were brought back.
+  std::size_t BroughtBack() const { return broughtBack_; }
   const std::vector<RefusedGameFile>& Refused() const { return refused_; }
 
  private:
   bool Search(const std::string& folder, const OnStep& onStep);
   void ImportFile(const std::string& path, const Breath& breathe);
   std::optional<GameFileTrouble> TakeGame(const std::string& path, const Breath& breathe);
-  /// Gives the players their members, unless the archive has the game just as it is in the file. Returns true
-  /// if it has the game.
-  bool SettleAndFind(GameInFile& game, const std::string& played, const Breath& breathe);
-  /// True if the archive has this game with other members or buttons.
-  bool IsKnownWithOthers(const GameInFile& game, const std::string& played, const Breath& breathe);
+  /// What the archive has of a file's game.
+  struct Found {
+    bool IsListed = false;
+    std::optional<std::int64_t> Deleted = {};  ///< number of the game, if it is deleted
+  };
+
+  /// From now on new members get numbers above all that were imported; a failure is not told.
+  void RaiseCounterIfPossible();
+  /// Gives the players their members, unless the archive has the game just as it is in the file. Returns what
+  /// it has of the game.
+  Found SettleAndFind(GameInFile& game, const std::string& played, const Breath& breathe);
 
   const Parts parts_;
   GameArchive archive_;
@@ -74,5 +82,6 @@ class GameImport {
   std::vector<std::string> paths_;
   std::size_t imported_ = 0;
   std::size_t known_ = 0;
+  std::size_t broughtBack_ = 0;
   std::vector<RefusedGameFile> refused_;
 };

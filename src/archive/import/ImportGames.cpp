@@ -158,15 +158,22 @@ void ImportGames::ShowEnd(const std::optional<GameImport>& import, bool complete
   const std::string imported = std::to_string(import ? import->Imported() : 0);
   const std::string known = std::to_string(import ? import->Known() : 0);
   const std::string refused = std::to_string(import ? import->Refused().size() : 0);
-  hasImported_ = hasImported_ || imported != "0";
+  const std::size_t broughtBack = import ? import->BroughtBack() : 0;
+  hasImported_ = hasImported_ || imported != "0" || broughtBack > 0;
+  std::string text;
   if (!failure.empty()) {
-    ShowStatus(Filled(parts_.Strings.Text(OwnText::ImportGamesFailed), {failure, imported, known, refused}));
-  } else if (complete && import->Imported() + import->Known() + import->Refused().size() == 0) {
-    ShowStatus(parts_.Strings.Text(OwnText::ImportGamesNothing));
+    text = Filled(parts_.Strings.Text(OwnText::ImportGamesFailed), {failure, imported, known, refused});
+  } else if (complete && import->Imported() + import->Known() + broughtBack + import->Refused().size() == 0) {
+    text = parts_.Strings.Text(OwnText::ImportGamesNothing);
   } else {
-    ShowStatus(Filled(parts_.Strings.Text(complete ? OwnText::ImportGamesDone : OwnText::ImportGamesStopped),
-                      {imported, known, refused}));
+    text = Filled(parts_.Strings.Text(complete ? OwnText::ImportGamesDone : OwnText::ImportGamesStopped),
+                  {imported, known, refused});
   }
+  if (broughtBack > 0) {
+    text.append("\n").append(
+        Filled(parts_.Strings.Text(OwnText::ImportGamesBroughtBack), {std::to_string(broughtBack)}));
+  }
+  ShowStatus(text);
 }
 
 void ImportGames::ShowStatus(const std::string& text) {

@@ -42,7 +42,7 @@ class ImportGames : public QDialog {
   ImportGames(const Parts& parts, QWidget* parent);
   ~ImportGames() override;
 
-  /// True once a game was imported.
+  /// True once a game was imported or brought back.
   bool HasImported() const { return hasImported_; }
 
   void reject() override;

@@ -72,6 +72,7 @@ void PastGames::Delete() {
     return;
   }
   const std::int64_t next = GameAfter(games_.Games(), games);
+  parts_.Archive.CheckSpace();
   const int deleted = parts_.Archive.Archive().Delete(games, parts_.Time.Now());
   Refresh(next);
   Tell(Filled(strings.Text(OwnText::PastDeletedNow), {std::to_string(deleted)}));
@@ -81,9 +82,12 @@ void PastGames::Delete() {
 void PastGames::BringBack() {
   const std::vector<std::int64_t> games = SelectedGames();
   const std::int64_t next = GameAfter(games_.Games(), games);
+  parts_.Archive.CheckSpace();
   const int back = parts_.Archive.Archive().BringBack(games);
+  const int left = static_cast<int>(games.size()) - back;
   Refresh(next);
-  Tell(Filled(parts_.Strings.Text(OwnText::PastBroughtBack), {std::to_string(back)}));
+  Tell(Filled(parts_.Strings.Text(left > 0 ? OwnText::PastBroughtBackSome : OwnText::PastBroughtBack),
+              {std::to_string(back), std::to_string(left)}));
   ui_->GameTable->setFocus();
 }
 

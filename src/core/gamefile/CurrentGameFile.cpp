@@ -50,3 +50,11 @@ bool CurrentGameFile::LoadGame(Game& game, const std::function<void(const std::s
   boxes_.Show("Unable to open Game file.", "Game File Error", BoxIcon::Exclamation);
   return false;
 }
+
+std::string CurrentGameFile::TimeOfChange() const {
+  try {
+    return files_.TimeOfChange(fileName_);
+  } catch (const RuntimeError&) {
+    return {};
+  }
+}

@@ -34,6 +34,10 @@ class CurrentGameFile {
   /// Takes this file as if the operator had chosen it; an empty path forgets the last one.
   void Choose(std::string path) { fileName_ = std::move(path); }
 
+  /// Local time, "YYYY-MM-DD HH:MM:SS", at which the chosen file was last changed; empty if it cannot be
+  /// told.
+  std::string TimeOfChange() const;
+
   /// Reads the chosen file into `game`, which the caller has cleared. If it is not a game file, shows a box
   /// and returns false. Otherwise behaves like ReadGameFile.
   bool LoadGame(Game& game, const std::function<void(const std::string&)>& selectMission);

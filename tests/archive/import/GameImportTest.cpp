@@ -147,6 +147,67 @@ TEST_F(Importing, KnowsAGameWhoseMembersWereTakenForOthersThen) {
   EXPECT_EQ(Run(), "1, 1, 0");
 }
 
+TEST_F(Importing, KnowsAGameThatWasCommittedSinceItWasSaved) {
+  venue.Game.Players(ArchiveVenue::Blue7).Committed = false;
+  Put("a.xml");
+  venue.Game.Players(ArchiveVenue::Blue7).Committed = true;
+  venue.Archive->Keep(venue.State());
+  EXPECT_EQ(Run(), "0, 1, 0");
+  EXPECT_EQ(venue.Query("SELECT Committed FROM Games"), "1");
+}
+
+TEST_F(Importing, KnowsAGameFromWhoseEarlierStateAMemberWasCut) {
+  venue.Game.Players(ArchiveVenue::Red0).MemberIndex = 6;
+  Put("a.xml");
+  const std::int64_t game = venue.Archive->Keep(venue.State());
+  venue.Game.Players(ArchiveVenue::Red0).DeathCount += 1;
+  venue.Archive->KeepAgain(game, venue.State(), FormerState::KeptToo);
+  EXPECT_EQ(venue.Archive->Forget(6), 1);
+  EXPECT_EQ(Run(), "0, 1, 0");
+}
+
+TEST_F(Importing, BringsADeletedGameBackAsItWas) {
+  Put("a.xml");
+  venue.Game.Players(ArchiveVenue::Red0).MemberIndex = 6;
+  const std::int64_t game = venue.Archive->Keep(venue.State());
+  venue.Archive->Delete({game}, "2026-11-22 10:00:00");
+  GameImport import = Make();
+  EXPECT_TRUE(import.Run(Path("."), [](const GameImport::State&) { return true; }));
+  EXPECT_EQ(import.BroughtBack(), 1U);
+  EXPECT_EQ(import.Imported() + import.Known(), 0U);
+  EXPECT_EQ(venue.Query("SELECT count(*) FROM Games WHERE Deleted IS NULL"), "1");
+  EXPECT_EQ(Members(), "6 5");
+  EXPECT_EQ(Run(), "0, 1, 0");
+}
+
+TEST_F(Importing, LeavesADeletedGameWhereTheSameOneIsThere) {
+  Put("a.xml");
+  const std::int64_t game = venue.Archive->Keep(venue.State());
+  venue.Archive->Delete({game}, "2026-11-22 10:00:00");
+  venue.Archive->Keep(venue.State());
+  EXPECT_EQ(Run(), "0, 1, 0");
+  EXPECT_EQ(venue.Query("SELECT count(*) FROM Games WHERE Deleted IS NULL"), "1");
+}
+
+TEST_F(Importing, GivesNewMembersNumbersAboveAllImportedOnesThoughItFailsMidway) {
+  venue.Game.Players(ArchiveVenue::Red0).MemberIndex = 4711;
+  Put("a.xml");
+  venue.Game.Players(ArchiveVenue::Red0).DeathCount += 1;
+  Put("b.xml");
+  disk.Games = 1;
+  const GameImport::OnStep lowerCounter = [this](const GameImport::State& state) {
+    if (state.Done == 1) {  // as a program may that puts an older member table in place
+      venue.InMembers("UPDATE sqlite_sequence SET seq = 6 WHERE name = 'Members'");
+    }
+    return true;
+  };
+  GameImport import = Make(FilesOf::ThisTable);
+  EXPECT_EQ(ThrownBy([&] { import.Run(Path("."), lowerCounter); }).Number, 61);
+  EXPECT_EQ(import.Imported(), 1U);
+  venue.InMembers("INSERT INTO Members (FirstName) VALUES ('New')");
+  EXPECT_EQ(OtherConnection(venue.MembersPath()).Query("SELECT max(ContactID) FROM Members"), "4712");
+}
+
 TEST_F(Importing, TakesANumberOnlyWithItsButtonElseTheOwnerOfTheButtonElseNobody) {
   const auto players = [this](std::int32_t red, const std::string& redButton, std::int32_t blue) {
     venue.Game.Players(ArchiveVenue::Red0).MemberIndex = red;

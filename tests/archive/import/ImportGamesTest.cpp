@@ -146,6 +146,21 @@ TEST_P(ImportGamesWindow, ImportsTheChosenFolderAndListsWhatItRefused) {
                          "已导入 0 场比赛，3 场此前已有，1 个文件未导入。"));
 }
 
+TEST_P(ImportGamesWindow, SaysHowManyDeletedGamesItBroughtBack) {
+  PutGames(3);
+  Open();
+  Import();
+  ExecuteSql(venue.Folder / "games.mdb", "UPDATE Games SET Deleted = '2026-11-21 20:15:00' WHERE GameID < 3");
+  Open();
+  Import();
+  EXPECT_EQ(Status(), In("0 games imported, 1 were there already, 0 files refused.\n"
+                         "2 of the games had been deleted, and were brought back as they were.",
+                         "已导入 0 场比赛，1 场此前已有，0 个文件未导入。\n"
+                         "2 场比赛曾被删除，现已按原样恢复。"));
+  EXPECT_EQ(Games(), "3");
+  EXPECT_TRUE(window->HasImported());
+}
+
 TEST_P(ImportGamesWindow, CopiesTheListOfRefusedFiles) {
   WriteFile(Path("bad.xml"), "<html/>");
   Open();

@@ -193,4 +193,42 @@ TEST_F(WindowOfPastGames, BringsDeletedGamesBack) {
   EXPECT_EQ(Status(), "");
 }
 
+TEST_F(WindowOfPastGames, LeavesADeletedGameThatIsThereAgain) {
+  const std::int64_t first = Keep("2026-11-20 20:00:00", "Flag", 200);
+  Keep("2026-11-21 20:00:00", "Flag", 300);
+  access.Archive().Delete({first}, "2026-11-22 10:00:00");
+  Keep("2026-11-20 20:00:00", "Flag", 200, 6);  // of the same file, with another member
+  access.Archive().Delete({2}, "2026-11-22 10:00:00");
+  access.Close();
+  Open();
+  Months().selectRow(2);
+  EXPECT_EQ(Listed().size(), 2U);
+  Games().selectAll();
+  Press("BringBack");
+  EXPECT_THAT(Listed(), ElementsAre("200"));
+  EXPECT_EQ(Status(),
+            "Games brought back: 1. Left among the deleted ones, since past games have them already: 1");
+  EXPECT_EQ(Query("SELECT group_concat(GameID) FROM (SELECT GameID FROM Games WHERE Deleted IS NULL ORDER BY "
+                  "GameID)"),
+            "2,3");
+}
+
+TEST_F(WindowOfPastGames, NeitherDeletesNorBringsBackWhileTheDiskIsNarrow) {
+  KeepFour();
+  Open();
+  disk.Space = LeastFreeSpace - 1;
+  Games().selectRow(1);
+  Press("Delete");
+  EXPECT_THAT(Status(), testing::HasSubstr("32 MB"));
+  EXPECT_EQ(Query("SELECT count(*) FROM Games WHERE Deleted IS NULL"), "4");
+  disk.Space = LeastFreeSpace;
+  Press("Delete");
+  disk.Space = LeastFreeSpace - 1;
+  Months().selectRow(Months().model()->rowCount() - 1);
+  Games().selectRow(0);
+  Press("BringBack");
+  EXPECT_THAT(Status(), testing::HasSubstr("32 MB"));
+  EXPECT_EQ(Query("SELECT count(*) FROM Games WHERE Deleted IS NULL"), "3");
+}
+
 }  // namespace

@@ -16,6 +16,7 @@
 #include "tests/support/MadeDatabase.h"
 #include "tests/support/OpenSession.h"
 #include "tests/support/TestDatabase.h"
+#include "tests/support/TightDisk.h"
 
 inline constexpr int Red0 = 1;
 inline constexpr int Blue7 = 40;
@@ -111,8 +112,9 @@ class WindowOfPastGames : public testing::Test {
   std::string Query(const std::string& sql) const { return OtherConnection(ArchivePath()).Query(sql); }
 
   OpenSession venue;
+  TightDisk disk;
   ArchiveAccess access{{.Session = venue.session,
-                        .Disk = venue.Disk,
+                        .Disk = disk,
                         .Engine = venue.Databases,
                         .Strings = venue.Strings,
                         .UserDataFolder = venue.Folder.Path(),

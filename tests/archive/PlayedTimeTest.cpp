@@ -1,4 +1,4 @@
-#include "archive/import/PlayedTime.h"
+#include "archive/PlayedTime.h"
 
 #include <gtest/gtest.h>
 
