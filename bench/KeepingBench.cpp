@@ -51,7 +51,15 @@ class Desk {
   }
   void Load() {
     Games().LoadGame([this](Game& game, const Session::MissionChoice& choose) {
-      return ReadGameFile(file_, game, choose);
+      std::string mission;
+      const bool isGame = ReadGameFile(file_, game, [&](const std::string& name) {
+        mission = name;
+        choose(name);
+      });
+      if (isGame && keeper_) {
+        keeper_->Load(game, mission, {});
+      }
+      return isGame;
     });
   }
   void Save() {

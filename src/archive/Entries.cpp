@@ -8,6 +8,7 @@
 #include <ctime>
 #include <new>
 #include <optional>
+#include <utility>
 
 namespace {
 
@@ -83,6 +84,7 @@ class InflateStream {
 Unpacking Inflate(const Blob& data, std::size_t size, std::string& bytes) {
   constexpr std::size_t step = std::size_t{1} << 16U;
   InflateStream stream(data);
+  bytes.reserve(size + 1);  // growing would take half as much again
   // One byte more than there may be, so that a stream which holds more is seen.
   while (bytes.size() <= size && stream.Read(bytes, std::min(step, size + 1 - bytes.size()))) {
   }
@@ -110,16 +112,57 @@ std::int64_t SecondsOf(const std::string& localTime) {
   return time ? std::max<std::int64_t>(std::mktime(&*time), 0) : 0;
 }
 
-Blob Packed(std::string_view bytes) {
-  Blob packed(compressBound(static_cast<uLong>(bytes.size())));
-  uLongf length = static_cast<uLongf>(packed.size());
-  const auto* source = reinterpret_cast<const Bytef*>(bytes.data());
-  const int result =
-      compress2(packed.data(), &length, source, static_cast<uLong>(bytes.size()), Z_DEFAULT_COMPRESSION);
-  if (result != Z_OK) {
-    throw std::bad_alloc();
+class Packer::Stream {
+ public:
+  Stream() {
+    if (deflateInit(&stream_, Z_DEFAULT_COMPRESSION) != Z_OK) {
+      throw std::bad_alloc();
+    }
   }
-  packed.resize(length);
+  ~Stream() { deflateEnd(&stream_); }
+  Stream(const Stream&) = delete;
+  Stream& operator=(const Stream&) = delete;
+
+  /// Takes the bytes in, and gives out what is deflated by then; all of it if `flush` is Z_FINISH.
+  void Deflate(std::string_view bytes, int flush) {
+    // zlib reads only, but has no const.
+    stream_.next_in = reinterpret_cast<Bytef*>(const_cast<char*>(bytes.data()));
+    stream_.avail_in = static_cast<uInt>(bytes.size());
+    int result = Z_OK;
+    do {
+      stream_.next_out = piece_.data();
+      stream_.avail_out = static_cast<uInt>(piece_.size());
+      result = deflate(&stream_, flush);
+      const std::size_t length = piece_.size() - stream_.avail_out;
+      Packed.insert(Packed.end(), piece_.begin(), piece_.begin() + static_cast<std::ptrdiff_t>(length));
+    } while (result == Z_OK && stream_.avail_out == 0);
+  }
+
+  Blob Packed;
+
+ private:
+  z_stream stream_{};
+  std::array<Bytef, 16384> piece_{};
+};
+
+Packer::Packer() : stream_(std::make_unique<Stream>()) {}
+
+Packer::~Packer() = default;
+
+void Packer::Add(std::string_view bytes) {
+  stream_->Deflate(bytes, Z_NO_FLUSH);
+  size_ += bytes.size();
+}
+
+Blob Packer::Finish() {
+  stream_->Deflate({}, Z_FINISH);
+  return std::move(stream_->Packed);
+}
+
+Blob Packed(std::string_view bytes) {
+  Packer packer;
+  packer.Add(bytes);
+  Blob packed = packer.Finish();
   // Equal lengths would tell a reader that the bytes are not deflated.
   return packed.size() < bytes.size() ? packed : Blob(bytes.begin(), bytes.end());
 }

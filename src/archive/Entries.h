@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <string>
 #include <string_view>
 
@@ -18,6 +19,28 @@ std::string EntryName(std::string_view played, std::int64_t gameId, std::int64_t
 
 /// Seconds since 1970 of a local time ("YYYY-MM-DD HH:MM:SS"); 0 for a text of another form.
 std::int64_t SecondsOf(const std::string& localTime);
+
+/// Deflates bytes that come piece by piece.
+class Packer {
+ public:
+  Packer();
+  ~Packer();
+  Packer(const Packer&) = delete;
+  Packer& operator=(const Packer&) = delete;
+
+  void Add(std::string_view bytes);
+  /// All of them, deflated; once, and nothing may be added afterwards.
+  Blob Finish();
+
+  /// How many bytes were added.
+  std::size_t Size() const { return size_; }
+
+ private:
+  class Stream;
+
+  std::unique_ptr<Stream> stream_;
+  std::size_t size_ = 0;
+};
 
 /// `bytes` as an entry holds them: deflated, or as they are where that is not shorter.
 Blob Packed(std::string_view bytes);

@@ -1,5 +1,7 @@
 #include "archive/GameArchive.h"
 
+#include <string_view>
+
 #include "archive/Entries.h"
 #include "archive/GameInputs.h"
 #include "core/gamefile/GameFile.h"
@@ -132,12 +134,17 @@ std::int64_t GameArchive::EarlierStates(std::int64_t gameId) {
 }
 
 GameArchive::PackedState GameArchive::Pack(const GameState& state) const {
-  const std::string bytes = WriteGameFile(state.Game, state.Mission);
-  if (bytes.size() > LargestEntry) {
+  Packer packer;
+  WriteGameFile(state.Game, state.Mission, [&packer](std::string_view piece) { packer.Add(piece); });
+  if (packer.Size() > LargestEntry) {
     throw TooLarge(EntryName(state.Played, 0, 0));
   }
-  return {Packed(bytes), static_cast<std::int64_t>(bytes.size()),
-          GameInputsHash(GameInputs(state.Game, state.Mission))};
+  PackedState packed{packer.Finish(), static_cast<std::int64_t>(packer.Size()),
+                     GameInputsHash(GameInputs(state.Game, state.Mission))};
+  if (packed.Data.size() >= packer.Size()) {
+    packed.Data = Packed(WriteGameFile(state.Game, state.Mission));
+  }
+  return packed;
 }
 
 void GameArchive::WriteFile(const StoredFile& file, const PackedState& packed, const std::string& played) {

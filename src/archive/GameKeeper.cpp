@@ -75,6 +75,9 @@ void GameKeeper::Hear(SessionChange change) {
       scoresPending_ = false;
       EndLoading();
       break;
+    case SessionChange::Saved:
+      inFile_ = UncommittedInputs(parts_.Session.Game());
+      break;
     default:
       break;
   }
@@ -89,6 +92,7 @@ void GameKeeper::Forget() {
   formerPulls_ = 0;
   loading_.reset();
   read_.reset();
+  inFile_.reset();
   fileTime_.clear();
   lastStateIsElse_ = false;
   // A game that is cleared in the middle of a pull goes on with the guns that are still to come.
@@ -214,13 +218,16 @@ void GameKeeper::Write(const Game& game, const Marks& now) {
   // A loaded game that is there already keeps the figures of its evening.
   const bool isThere = Recognise(archive, game, isLoaded);
   if (!isThere) {
-    if (!gameId_ || !archive.KeepAgain(*gameId_, StateOf(game, pulls), FormerOf(now))) {
+    if (!gameId_ || !archive.KeepAgain(*gameId_, StateOf(game, pulls), FormerOf(now, game))) {
       formerPulls_ = 0;
       gameId_ = archive.Keep(StateOf(game, pulls));
     }
     lastStateIsElse_ = false;
   }
   played_ = archive.PlayedOf(*gameId_);
+  if (inFile_ != UncommittedInputs(game)) {
+    inFile_.reset();
+  }
   kept_ = now;
   pulls_ = pulls;
   pullBegun_ = false;
@@ -228,8 +235,8 @@ void GameKeeper::Write(const Game& game, const Marks& now) {
 }
 
 // Guns that come in one by one complete a game; only what is added up hides what was there before.
-FormerState GameKeeper::FormerOf(const Marks& now) const {
-  if (lastStateIsElse_) {
+FormerState GameKeeper::FormerOf(const Marks& now, const Game& game) const {
+  if (lastStateIsElse_ || (inFile_ && inFile_ != UncommittedInputs(game))) {
     return FormerState::KeptToo;
   }
   if (!kept_ || kept_->Raw == now.Raw) {
@@ -240,6 +247,11 @@ FormerState GameKeeper::FormerOf(const Marks& now) const {
     addedUp = addedUp || (kept_->Raw[i] != 0 && kept_->Raw[i] != now.Raw[i]);
   }
   return addedUp ? FormerState::KeptToo : FormerState::Replaced;
+}
+
+std::uint64_t GameKeeper::UncommittedInputs(const Game& game) const {
+  constexpr bool commits = false;
+  return InputsDigest(game, parts_.Session.Missions().Text(), commits);
 }
 
 GameState GameKeeper::StateOf(const Game& game, int pulls) const {

@@ -124,7 +124,9 @@ class GameKeeper {
   /// Finds that game, and goes on with it. True if the archive has just the same.
   bool GoOnWith(GameArchive& archive, const Game& game, const std::string& missionName);
   void NotePulls();
-  FormerState FormerOf(const Marks& now) const;
+  FormerState FormerOf(const Marks& now, const Game& game) const;
+  /// Digest of a game's inputs but for commits.
+  std::uint64_t UncommittedInputs(const Game& game) const;
   GameState StateOf(const Game& game, int pulls) const;
   /// Local time at which the game was played, "YYYY-MM-DD HH:MM:SS".
   std::string Played(const Game& game) const;
@@ -157,6 +159,8 @@ class GameKeeper {
   /// Digest of the inputs of a game that is being loaded, as they were before its scores were calculated.
   std::optional<std::uint64_t> loading_;
   std::optional<ReadGame> read_;  ///< the loaded game, until it has been looked for in the archive
+  /// Digest of the last inputs that a file has, but for commits: the archive keeps these, to know the file.
+  std::optional<std::uint64_t> inFile_;
   std::string fileTime_;          ///< when the file of the loaded game was last changed
   bool lastStateIsElse_ = false;  ///< what the archive has as the last state was not on this board
   bool pullBegun_ = false;        ///< and nothing of it is kept yet

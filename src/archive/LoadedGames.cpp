@@ -19,6 +19,7 @@ void GameKeeper::Open(std::int64_t gameId, std::int64_t state, const Game& game,
 void GameKeeper::Load(const Game& game, const std::string& missionName, const std::string& fileTime) {
   fileTime_ = fileTime;
   loading_ = InputsDigest(game, missionName);
+  inFile_ = loading_;
   read_ = ReadGame{game, missionName};
   Try([this] {
     if (ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
@@ -32,6 +33,9 @@ void GameKeeper::Load(const Game& game, const std::string& missionName, const st
 void GameKeeper::EndLoading() {
   if (!loading_) {
     return;
+  }
+  if (inFile_) {
+    inFile_ = UncommittedInputs(parts_.Session.Game());
   }
   if (gameId_) {
     // A mission that is gone, or a button that has an owner now, make other inputs of it without the
@@ -56,7 +60,9 @@ bool GameKeeper::Recognise(GameArchive& archive, const Game& game, bool isLoaded
     const bool isThere = GoOnWith(archive, read_->Game, read_->Mission) && isAsRead;
     lastStateIsElse_ = lastStateIsElse_ || !isAsRead;
     read_.reset();
-    return isThere;
+    if (gameId_) {
+      return isThere;
+    }
   }
   const bool isLost = gameId_ && archive.PlayedOf(*gameId_) != played_;
   if (isLost) {

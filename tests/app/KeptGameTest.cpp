@@ -3,6 +3,8 @@
 #include <filesystem>
 
 #include "tests/support/Frames.h"
+#include "tests/support/GameFiles.h"
+#include "tests/support/TimeOfChange.h"
 #include "tests/support/Venue.h"
 
 namespace {
@@ -76,6 +78,15 @@ TEST_F(KeptGame, IsKeptAsItWasBeforeASecondPullToo) {
   Pull();
   EXPECT_EQ(Games(), "1");
   EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM sqlar"), "2");
+}
+
+TEST_F(KeptGame, OfAFileWithoutADateIsFiledUnderTheTimeOfTheFile) {
+  WriteFile(venue.Folder / "old.xml", SmallGame());
+  SetTimeOfChange(venue.Folder / "old.xml", "2012-03-04 05:06:07");
+  venue.Dialog.Answers = {venue.Folder / "old.xml", venue.Folder / "old.xml"};
+  venue.Trigger("mnuLoadScores");
+  venue.Trigger("mnuLoadScores");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT Played FROM Games"), "2012-03-04 05:06:07");
 }
 
 TEST_F(KeptGame, IsKeptBeforeItIsClearedInTheMiddleOfThePull) {

@@ -57,6 +57,25 @@ TEST(Entries, ComeBackAsTheyWere) {
   EXPECT_LT(Packed(std::string(200000, 'a')).size(), 1000U);
 }
 
+TEST(Entries, ArePackedPieceByPieceAsWell) {
+  std::string bytes;
+  Packer packer;
+  unsigned state = 1;
+  for (int piece = 0; piece < 300; ++piece) {
+    std::string next(static_cast<std::size_t>(piece * 7 % 1000), 'a');
+    for (char& letter : next) {
+      state = state * 1664525U + 1013904223U;
+      letter = static_cast<char>('a' + (state >> 28U));
+    }
+    packer.Add(next);
+    bytes += next;
+    EXPECT_EQ(packer.Size(), bytes.size());
+  }
+  const Blob packed = packer.Finish();
+  EXPECT_LT(packed.size(), bytes.size());
+  EXPECT_EQ(UnpackedOr(packed, static_cast<std::int64_t>(bytes.size()), Unpacking::Done), bytes);
+}
+
 TEST(Entries, ThatClaimAnotherSizeAreDamaged) {
   const std::string bytes(5000, 'a');
   const Blob packed = Packed(bytes);

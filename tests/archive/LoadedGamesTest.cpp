@@ -142,6 +142,38 @@ TEST_F(LoadedGame, IsTheSameThoughItWasCommittedAfterItWasSaved) {
   ExpectThatItGoesOn();
 }
 
+TEST_F(LoadedGame, IsTheSameThoughTheOperatorChangedItAfterItWasSaved) {
+  Pull();
+  const std::string file = Saved();
+  session.SaveGame([](const Game& /*game*/, const std::string& /*mission*/) { return true; });
+  session.Game().Players(Red0).Committed = true;
+  keeper->Keep();
+  EXPECT_EQ(Query("SELECT count(*) FROM GameFiles"), "1") << "a commit makes no other game of it";
+  ChangeBonus();
+  EXPECT_EQ(Query("SELECT count(*) FROM GameFiles"), "2");
+  session.Game().Players(Red0).BonusPoints = 60;
+  keeper->Keep();
+  EXPECT_EQ(Query("SELECT count(*) FROM GameFiles"), "2") << "no file has the former bonus";
+  session.ClearPlayerData();
+  const std::string before = ReadFile(ArchivePath());
+  Load(file);
+  ExpectKnown(before);
+}
+
+TEST_F(LoadedGame, IsTheSameThoughItWasChangedAfterItWasLoadedBefore) {
+  Game game(venue.Strings);
+  game.Players(Red0).Active = true;
+  game.GameDate = "21/05/2013 14:30";
+  const std::string file = WriteGameFile(game, "None");
+  Load(file);
+  ChangeBonus();
+  session.ClearPlayerData();
+  const std::string before = ReadFile(ArchivePath());
+  Load(file);
+  ExpectKnown(before);
+  EXPECT_EQ(Games(), "1");
+}
+
 TEST_F(LoadedGame, IsTheSameThoughAMemberWasCutFromItAndItsFactorsAreOthers) {
   const std::string file = PullWithMember();
   ExecuteSql(venue.MembersFile(),
@@ -190,6 +222,20 @@ TEST_F(LoadedGame, IsTheSameThoughTheArchiveIsLockedWhileItIsLoaded) {
   EXPECT_EQ(Query("SELECT count(*) FROM GameFiles"), "2");
   EXPECT_EQ(Query("SELECT Soldiering FROM GamePlayers WHERE PlayerIndex = 1"),
             std::to_string(session.Game().Players(Red0).Soldiering));
+}
+
+TEST_F(LoadedGame, IsTheSameWhenItsFileIsLoadedAgainThoughItsMissionWasGoneAtTheFirstTime) {
+  Game game(venue.Strings);
+  game.Players(Red0).Active = true;
+  game.Players(Red0).DallasID = "AB00000000000001";
+  game.GameDate = "some day";
+  const std::string file = WriteGameFile(game, "Long Gone");
+  Load(file, "2012-01-02 03:04:05");
+  EXPECT_EQ(Query("SELECT Mission FROM Games"), "None");
+  session.ClearPlayerData();
+  const std::string before = ReadFile(ArchivePath());
+  Load(file, "2012-01-03 03:04:05");
+  ExpectKnown(before);
 }
 
 TEST_F(LoadedGame, IsAnotherOneWithOtherFiguresOfAGun) {

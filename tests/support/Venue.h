@@ -33,6 +33,7 @@
 #include "tests/support/Controls.h"
 #include "tests/support/DataSite.h"
 #include "tests/support/GameFiles.h"
+#include "tests/support/TimeOfChange.h"
 
 /// What drives a wait: a script, or the toolkit's events as in the program itself.
 enum class Waits { Scripted, Real };
@@ -101,6 +102,7 @@ class Venue : public DataSite {
   /// Loads a game file with these contents through the menu.
   void LoadGame(const std::string& contents) {
     WriteFile(Folder / "game.xml", contents);
+    SetTimeOfChange(Folder / "game.xml", Time.DateAndTime);
     Dialog.Answers = {Folder / "game.xml"};
     Trigger("mnuLoadScores");
   }

@@ -133,13 +133,13 @@ std::optional<GameFileTrouble> GameImport::TakeGame(const std::string& path, con
 GameImport::Found GameImport::SettleAndFind(GameInFile& game, const std::string& played,
                                             const Breath& breathe) {
   using Among = GameArchive::Among;
-  if (archive_.FindState(game.Game, game.Mission)) {
+  if (archive_.Find(game.Game, game.Mission)) {
     return {.IsListed = true};
   }
   auto deleted = archive_.FindState(game.Game, game.Mission, Among::Deleted);
   breathe();
   members_.Settle(game.Game);
-  if (archive_.FindState(game.Game, game.Mission) ||
+  if (archive_.Find(game.Game, game.Mission) ||
       archive_.FindAlike(game.Game, game.Mission, played, Among::Listed, breathe)) {
     return {.IsListed = true};
   }

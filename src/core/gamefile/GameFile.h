@@ -2,6 +2,7 @@
 
 #include <functional>
 #include <string>
+#include <string_view>
 
 #include "core/game/Game.h"
 
@@ -11,6 +12,11 @@
 
 /// The bytes of a game file: UTF-8, no XML declaration. `missionName` is the text of the active mission.
 std::string WriteGameFile(const Game& game, const std::string& missionName);
+
+/// The same bytes in pieces, header and players one by one, so that a full game is never in memory as a
+/// whole.
+void WriteGameFile(const Game& game, const std::string& missionName,
+                   const std::function<void(std::string_view piece)>& write);
 
 /// Reads `bytes` (used as work space) into `game`, which the caller has cleared. Calls `selectMission` with
 /// the mission's name ("None" if the file has none) before anything is read into `game`. Returns false, with

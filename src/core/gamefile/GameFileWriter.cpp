@@ -117,11 +117,22 @@ void AddFields(TreeWriter& tree, const Player& player) {
 }  // namespace
 
 std::string WriteGameFile(const Game& game, const std::string& missionName) {
+  std::string bytes;
+  WriteGameFile(game, missionName, [&bytes](std::string_view piece) { bytes += piece; });
+  return bytes;
+}
+
+void WriteGameFile(const Game& game, const std::string& missionName,
+                   const std::function<void(std::string_view piece)>& write) {
   OneBased<std::string, PlayerCount> names;
   for (int index = 1; index <= PlayerCount; ++index) {
     names(index) = game.DisplayName(index);
   }
   TreeWriter tree;
+  const auto pass = [&] {
+    write(tree.Bytes);
+    tree.Bytes.clear();
+  };
   tree.Open("GameData");
   AddHeader(tree, game, missionName);
   tree.Open("PlayerData");
@@ -134,9 +145,10 @@ std::string WriteGameFile(const Game& game, const std::string& missionName) {
       AddHits(tree, player, names);
       AddFields(tree, player);
       tree.Close("Player");
+      pass();
     }
   }
   tree.Close("PlayerData");
   tree.Close("GameData");
-  return std::move(tree.Bytes);
+  pass();
 }

@@ -1,6 +1,8 @@
 #include <gmock/gmock.h>
 
+#include <algorithm>
 #include <memory>
+#include <string_view>
 #include <utility>
 
 #include "core/gamefile/GameFile.h"
@@ -138,6 +140,18 @@ TEST_F(Writing, ListsPlayersByIndexWithOrWithoutHits) {
               HasSubstr("</PlayerID>\r\n<HitData></HitData>    <ShotCount> 0</ShotCount>"));
   EXPECT_THAT(written.substr(red40), HasSubstr("    <Committed>0</Committed>\r\n"));
   EXPECT_THAT(written.substr(red40), HasSubstr("    <DallasID>0000000000000000</DallasID>\r\n"));
+}
+
+TEST_F(Writing, GivesTheSameBytesPlayerByPlayer) {
+  FillRandomly(game, 60, 3);
+  std::string bytes;
+  std::size_t longest = 0;
+  WriteGameFile(game, "<Flag>", [&](std::string_view piece) {
+    bytes += piece;
+    longest = std::max(longest, piece.size());
+  });
+  EXPECT_EQ(bytes, WriteGameFile(game, "<Flag>"));
+  EXPECT_LT(longest, bytes.size() / 20);
 }
 
 TEST_F(Writing, LeavesOutDeclarationAndAbsoluteDamage) {
