@@ -186,3 +186,66 @@ Unpacking Unpack(const Blob& data, std::int64_t size, std::string& bytes) {
   }
   return result;
 }
+
+class EntryComparison::Stream {
+ public:
+  Stream(const Blob& data, bool isDeflated) : isDeflated_(isDeflated) {
+    // zlib reads only, but has no const.
+    stream_.next_in = const_cast<Bytef*>(data.data());
+    stream_.avail_in = static_cast<uInt>(data.size());
+    if (inflateInit(&stream_) != Z_OK) {
+      throw std::bad_alloc();
+    }
+  }
+  ~Stream() { inflateEnd(&stream_); }
+  Stream(const Stream&) = delete;
+  Stream& operator=(const Stream&) = delete;
+
+  /// Up to `most` further bytes; none at the end, or at a fault.
+  std::string_view Next(std::size_t most) {
+    if (!isDeflated_) {
+      const auto* next = reinterpret_cast<const char*>(stream_.next_in);
+      const std::size_t length = std::min<std::size_t>(most, stream_.avail_in);
+      stream_.next_in += length;
+      stream_.avail_in -= static_cast<uInt>(length);
+      return {next, length};
+    }
+    const std::size_t room = std::min(most, piece_.size());
+    stream_.next_out = piece_.data();
+    stream_.avail_out = static_cast<uInt>(room);
+    isWhole_ = inflate(&stream_, Z_NO_FLUSH) == Z_STREAM_END && stream_.avail_in == 0;
+    return {reinterpret_cast<const char*>(piece_.data()), room - stream_.avail_out};
+  }
+
+  /// True if the entry ends here, as it should. To be asked once.
+  bool IsAtEnd() {
+    if (!isDeflated_) {
+      return stream_.avail_in == 0;
+    }
+    return isWhole_ || (Next(1).empty() && isWhole_);  // what ends a stream may follow its last byte
+  }
+
+ private:
+  const bool isDeflated_;
+  z_stream stream_{};
+  std::array<Bytef, 16384> piece_{};
+  bool isWhole_ = false;
+};
+
+EntryComparison::EntryComparison(const Blob& data, std::int64_t size)
+    : stream_(std::make_unique<Stream>(data, static_cast<std::int64_t>(data.size()) != size)), size_(size) {}
+
+EntryComparison::~EntryComparison() = default;
+
+void EntryComparison::Add(std::string_view bytes) {
+  added_ += static_cast<std::int64_t>(bytes.size());
+  while (isEqual_ && !bytes.empty()) {
+    const std::string_view next = stream_->Next(bytes.size());
+    isEqual_ = !next.empty() && bytes.starts_with(next);
+    bytes.remove_prefix(std::min(next.size(), bytes.size()));
+  }
+}
+
+bool EntryComparison::IsEqual() {
+  return isEqual_ && added_ == size_ && stream_->IsAtEnd();
+}

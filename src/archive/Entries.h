@@ -54,3 +54,25 @@ enum class Unpacking {
 /// The bytes of an entry that holds `data` and says that they are `size` bytes. `bytes` are empty unless
 /// Done. Takes no more memory than LargestEntry and some, whatever the entry holds or says.
 Unpacking Unpack(const Blob& data, std::int64_t size, std::string& bytes);
+
+/// Compares an entry with bytes that come piece by piece, without holding either as a whole.
+class EntryComparison {
+ public:
+  /// `data` and `size` as in Unpack; `data` must outlive this object.
+  EntryComparison(const Blob& data, std::int64_t size);
+  ~EntryComparison();
+  EntryComparison(const EntryComparison&) = delete;
+  EntryComparison& operator=(const EntryComparison&) = delete;
+
+  void Add(std::string_view bytes);
+  /// True if the entry holds what was added, and nothing else.
+  bool IsEqual();
+
+ private:
+  class Stream;
+
+  std::unique_ptr<Stream> stream_;
+  const std::int64_t size_;
+  std::int64_t added_ = 0;
+  bool isEqual_ = true;
+};

@@ -181,23 +181,27 @@ std::vector<GameArchive::StoredFile> GameArchive::FilesWhere(const std::string& 
   return files;
 }
 
-std::string GameArchive::ReadFile(const std::string& name) {
-  Blob data;
-  std::int64_t size = -1;
+GameArchive::Entry GameArchive::ReadEntry(const std::string& name) {
+  Entry entry;
   bool isTooLarge = false;
   archive_.Statements().Query(
       "SELECT sz, length(data) > $2, CASE WHEN length(data) > $2 THEN NULL ELSE data END FROM sqlar "
       "WHERE name = $1",
       {name, std::int64_t{LargestEntry}}, [&](const SqlRow& row) {
-        size = row.Integer(0);
+        entry.Size = row.Integer(0);
         isTooLarge = row.Integer(1) != 0;
-        data = row.Bytes(2);
+        entry.Data = row.Bytes(2);
       });
   if (isTooLarge) {
     throw TooLarge(name);
   }
+  return entry;
+}
+
+std::string GameArchive::ReadFile(const std::string& name) {
+  const Entry entry = ReadEntry(name);
   std::string bytes;
-  switch (Unpack(data, size, bytes)) {
+  switch (Unpack(entry.Data, entry.Size, bytes)) {
     case Unpacking::Done:
       return bytes;
     case Unpacking::TooLarge:

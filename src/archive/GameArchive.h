@@ -110,14 +110,23 @@ class GameArchive {
     std::string Hash;
   };
 
+  /// An entry as it is stored.
+  struct Entry {
+    Blob Data;
+    std::int64_t Size = -1;  ///< of the bytes in it, as it says
+  };
+
   PackedState Pack(const GameState& state) const;
   void WriteFile(const StoredFile& file, const PackedState& packed, const std::string& played);
   /// Makes an earlier state of the last one; it has no last state then.
   void SetFormerFileAside(std::int64_t gameId, const std::string& played);
   std::vector<StoredFile> FilesWhere(const std::string& condition, const SqlValues& values);
+  Entry ReadEntry(const std::string& name);
   std::string ReadFile(const std::string& name);
   /// Returns the name of the mission.
   std::string ReadGame(const std::string& name, Game& game);
+  /// True if the file is to the byte what the game gives, its figures included.
+  bool IsFileOf(const StoredFile& file, const Game& game, const std::string& mission);
   /// The first of these files whose game and mission `isSame` is true for.
   using IsSame = std::function<bool(const Game& game, const std::string& mission)>;
   std::optional<FoundState> FirstOf(const std::vector<StoredFile>& files, const IsSame& isSame);

@@ -1,9 +1,12 @@
 // How the archive tells that a game is one that it has.
 
 #include <algorithm>
+#include <string_view>
 
+#include "archive/Entries.h"
 #include "archive/GameArchive.h"
 #include "archive/GameInputs.h"
+#include "core/gamefile/GameFile.h"
 #include "platform/RuntimeError.h"
 #include "platform/Sql.h"
 
@@ -23,10 +26,31 @@ std::optional<std::int64_t> GameArchive::Find(const Game& game, const std::strin
 std::optional<GameArchive::FoundState> GameArchive::FindState(const Game& game,
                                                               const std::string& missionName, Among among) {
   const std::string inputs = GameInputs(game, missionName);
-  return FirstOf(FilesWhere("GameFiles.InputsHash = $1 AND " + ConditionOf(among), {GameInputsHash(inputs)}),
-                 [&inputs](const Game& kept, const std::string& mission) {
-                   return GameInputs(kept, mission) == inputs;
-                 });
+  const std::vector<StoredFile> files =
+      FilesWhere("GameFiles.InputsHash = $1 AND " + ConditionOf(among), {GameInputsHash(inputs)});
+  // Most are just as they were kept, and need not be read for that.
+  const auto same =
+      std::ranges::find_if(files, [&](const StoredFile& file) { return IsFileOf(file, game, missionName); });
+  if (same != files.end()) {
+    return FoundState{same->GameId, same->State};
+  }
+  return FirstOf(files, [&inputs](const Game& kept, const std::string& mission) {
+    return GameInputs(kept, mission) == inputs;
+  });
+}
+
+bool GameArchive::IsFileOf(const StoredFile& file, const Game& game, const std::string& mission) {
+  try {
+    const Entry entry = ReadEntry(file.Name);
+    EntryComparison comparison(entry.Data, entry.Size);
+    WriteGameFile(game, mission, [&comparison](std::string_view piece) { comparison.Add(piece); });
+    return comparison.IsEqual();
+  } catch (const RuntimeError& error) {
+    if (error.Number() != Fault::InvalidFileFormat) {
+      throw;
+    }
+    return false;  // it cannot be this game any more
+  }
 }
 
 std::optional<GameArchive::FoundState> GameArchive::FindAlike(const Game& game,

@@ -3,6 +3,8 @@
 #include <gtest/gtest.h>
 #include <zlib.h>
 
+#include <string_view>
+
 #include "core/gamefile/GameFile.h"
 
 namespace {
@@ -74,6 +76,43 @@ TEST(Entries, ArePackedPieceByPieceAsWell) {
   const Blob packed = packer.Finish();
   EXPECT_LT(packed.size(), bytes.size());
   EXPECT_EQ(UnpackedOr(packed, static_cast<std::int64_t>(bytes.size()), Unpacking::Done), bytes);
+}
+
+bool IsEqual(const Blob& data, std::int64_t size, const std::string& bytes, std::size_t step) {
+  EntryComparison comparison(data, size);
+  for (std::size_t at = 0; at < bytes.size(); at += step) {
+    comparison.Add(std::string_view(bytes).substr(at, step));
+  }
+  return comparison.IsEqual();
+}
+
+TEST(Entries, AreComparedPieceByPiece) {
+  std::string text;
+  for (int line = 0; line < 9000; ++line) {
+    text += std::to_string(line * 7919 % 1000) + "<Index>\n";
+  }
+  const auto size = static_cast<std::int64_t>(text.size());
+  const Blob plain(text.begin(), text.end());
+  for (const Blob& data : {Packed(text), plain}) {
+    for (const std::size_t step : {std::size_t{1}, std::size_t{1000}, text.size()}) {
+      EXPECT_TRUE(IsEqual(data, size, text, step)) << step;
+      EXPECT_FALSE(IsEqual(data, size, text + "x", step));
+      EXPECT_FALSE(IsEqual(data, size, text.substr(0, text.size() - 1), step));
+      std::string other = text;
+      other.back() = 'x';
+      EXPECT_FALSE(IsEqual(data, size, other, step));
+    }
+    EXPECT_FALSE(IsEqual(data, size + 1, text, 1000));
+    EXPECT_FALSE(IsEqual(data, -1, text, 1000));
+  }
+  Blob cut = Packed(text);
+  cut.pop_back();
+  EXPECT_FALSE(IsEqual(cut, size, text, 1000));
+  Blob longer = Packed(text);
+  longer.push_back(0);
+  EXPECT_FALSE(IsEqual(longer, size, text, 1000));
+  EXPECT_FALSE(IsEqual({}, size, text, 1000));
+  EXPECT_TRUE(IsEqual({}, 0, "", 1));
 }
 
 TEST(Entries, ThatClaimAnotherSizeAreDamaged) {

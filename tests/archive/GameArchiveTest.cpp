@@ -208,6 +208,13 @@ TEST_F(Finding, DoesNotTrustTheHashAlone) {
   EXPECT_NE(first, second);
 }
 
+TEST_F(Finding, TakesAGameWithOtherFiguresForTheSame) {
+  const std::int64_t first = Archive->Keep(State());
+  EXPECT_EQ(Archive->Find(Game, State().Mission), first);
+  Game.Players(Blue7).Soldiering += 1;  // calculated
+  EXPECT_EQ(Archive->Find(Game, State().Mission), first);
+}
+
 TEST_F(Finding, PassesDeletedGamesAndDamagedFiles) {
   Archive->Keep(State());
   InArchive("UPDATE Games SET Deleted = '2026-12-01 00:00:00'");
