@@ -98,7 +98,7 @@ void GameKeeper::NotePulls() {
 }
 
 std::string GameKeeper::Played(const Game& game) const {
-  const std::string received = parts_.Progress.Received();
+  std::string received = parts_.Progress.Received();
   if (source_ != GameSource::File) {
     return received;
   }
