@@ -2,6 +2,7 @@
 
 #include <QGuiApplication>
 #include <QScreen>
+#include <QWindow>
 #include <utility>
 
 #include "platform/RuntimeError.h"
@@ -68,7 +69,10 @@ AudienceResults AudienceBoard::Results() const {
 }
 
 void AudienceBoard::ShowOtherNames() {
-  state_.ChangeResults([this](AudienceResults& results) { ShowNames(results, parts_.NameShown); });
+  state_.ChangeResults([this](AudienceResults& results) {
+    LookUpNickNames(results, parts_.Session);
+    ShowNames(results, parts_.NameShown);
+  });
 }
 
 void AudienceBoard::Hear(SessionChange change) {
@@ -147,6 +151,11 @@ void AudienceBoard::ShowSetup() {
 
 void AudienceBoard::TurnOn(bool takesFocus) {
   isOn_ = true;
+  if (const QWindow* window = parts_.Operator.windowHandle()) {
+    // Not before the window has arrived there.
+    connect(window, &QWindow::screenChanged, this, &AudienceBoard::FollowOperator,
+            static_cast<Qt::ConnectionType>(Qt::QueuedConnection | Qt::UniqueConnection));
+  }
   state_.TurnOn();
   ShowSetup();
   stage_.SetRunning(true);
@@ -196,9 +205,7 @@ void AudienceBoard::CoverScreen(const std::string& name) {
     window_->Cover(screen);
     return;
   }
-  window_ = std::make_unique<AudienceWindow>(stage_, &screen);
-  window_->setWindowTitle(QString::fromStdString(parts_.Strings.Text(OwnText::AudienceTitle)));
-  window_->SetDiagonal(setup_.Inches);
+  MakeWindow(&screen);
   window_->show();
 }
 
@@ -206,18 +213,26 @@ void AudienceBoard::OpenWindow(bool takesFocus) {
   if (window_) {
     return;
   }
-  window_ = std::make_unique<AudienceWindow>(stage_, nullptr);
-  window_->setWindowTitle(QString::fromStdString(parts_.Strings.Text(OwnText::AudienceTitle)));
+  MakeWindow(nullptr);
   window_->setAttribute(Qt::WA_ShowWithoutActivating, !takesFocus);
   window_->setScreen(parts_.Operator.screen());
+  window_->show();
+}
+
+void AudienceBoard::MakeWindow(QScreen* wholeScreen) {
+  window_ = std::make_unique<AudienceWindow>(stage_, wholeScreen);
+  window_->setWindowTitle(QString::fromStdString(parts_.Strings.Text(OwnText::AudienceTitle)));
   window_->SetDiagonal(setup_.Inches);
   // Not before the window has handled its own end.
   connect(window_.get(), &AudienceWindow::Closed, this, &AudienceBoard::TurnOff, Qt::QueuedConnection);
-  window_->show();
 }
 
 void AudienceBoard::Watch(QScreen& screen) {
   connect(&screen, &QScreen::geometryChanged, this, [this] { HearScreens(); });
+}
+
+void AudienceBoard::FollowOperator() {
+  HearScreens();
 }
 
 void AudienceBoard::HearScreens(const QScreen* gone) {

@@ -51,7 +51,8 @@ class AudienceBoard : public QObject {
 
   void SetGuests(GuestList::Names names);
 
-  /// Other names are to be shown, whichever game is on the board.
+  /// Other names are to be shown, whichever game is on the board: names were hidden or shown again, or
+  /// members were changed.
   void ShowOtherNames();
 
   const AudienceSetup& Setup() const { return setup_; }
@@ -77,9 +78,12 @@ class AudienceBoard : public QObject {
   void PlaceWindow(bool takesFocus, const QScreen* gone = nullptr);
   void CoverScreen(const std::string& name);
   void OpenWindow(bool takesFocus);
+  void MakeWindow(QScreen* wholeScreen);
   void Hide();
   void ShowSetup();
   void Watch(QScreen& screen);
+  /// The main window has come to another screen: it is not covered there, and what it leaves is free.
+  void FollowOperator();
   void HearScreens(const QScreen* gone = nullptr);
   std::vector<AudienceScreen> Screens(const QScreen* gone) const;
   void Remember(bool isOn);

@@ -12,6 +12,8 @@ constexpr double MillimetresPerInch = 25.4;
 constexpr double ColumnGap = 1.2;
 constexpr double TotalSign = 1.9;  ///< the team's badge and the gap behind it
 constexpr double TotalGap = 1.2;
+constexpr double LeastTotalGap = 0.6;
+constexpr double LeastTotalSqueeze = 0.8;
 constexpr double WidthBesidesTexts = 3.4;  ///< of a row: the badge and gaps
 constexpr double GapsWithoutNames = 0.6;
 constexpr double ShortestName = 5;
@@ -84,12 +86,32 @@ void PlaceWinners(AudienceLayout& layout, double rowLines, double width, const A
   }
 }
 
-AudienceLayout LayOutWith(double capital, int columns, const AudiencePlace& place,
-                          const AudienceContents& contents) {
+/// Puts the totals below the heading: all of them where a row is left, else in turns.
+void PlaceTotals(AudienceLayout& layout, int lines, double width, const AudienceContents& contents) {
+  const double least = TotalSign + LeastTotalSqueeze * contents.Total + LeastTotalGap;
+  const double usual = TotalSign + contents.Total + TotalGap;
+  layout.TotalsPerLine = std::clamp(static_cast<int>((width + LeastTotalGap) / least), 1, 3);
+  layout.TotalWidth = layout.Capital * std::min(usual, (width + LeastTotalGap) / layout.TotalsPerLine);
+  const int needed = DividedUp(contents.Teams, layout.TotalsPerLine);
+  const bool isRowLeft = HeadingLines + needed < lines;
+  layout.TotalLines = isRowLeft ? needed : std::max(1, (lines - HeadingLines) / 2);
+}
+
+int TotalsOnPage(const AudienceLayout& layout, const AudienceContents& contents) {
+  return std::min(contents.Teams, layout.TotalLines * layout.TotalsPerLine);
+}
+
+/// Counts the pages that show all rows and all totals.
+void CountPages(AudienceLayout& layout, const AudienceContents& contents) {
+  const int onFirst = layout.Winners + layout.Columns * layout.FirstRows;
+  layout.RowPages = 1 + DividedUp(std::max(0, contents.Players - onFirst), layout.Columns * layout.Rows);
+  const int turnsOfTotals = DividedUp(contents.Teams, std::max(1, TotalsOnPage(layout, contents)));
+  layout.Pages = layout.RowPages * DividedUp(std::max(1, turnsOfTotals), layout.RowPages);
+}
+
+AudienceLayout LayOutSpaced(const Spacing& spacing, double capital, int columns, const AudiencePlace& place,
+                            const AudienceContents& contents) {
   AudienceLayout layout;
-  const double height = place.Height / capital;
-  const bool isRoomy = LinesIn(height, Roomy) >= FewestRoomyLines;
-  const Spacing spacing = isRoomy ? Roomy : Tight;
   const double width = place.Width / capital - 2 * spacing.Margin;
   layout.Capital = capital;
   layout.Margin = spacing.Margin * capital;
@@ -100,20 +122,26 @@ AudienceLayout LayOutWith(double capital, int columns, const AudiencePlace& plac
   if (!layout.Names) {
     layout.Squeeze = std::min(1.0, column / UnnamedRow(contents));
   }
-  const int lines = std::max(FewestLines, LinesIn(height, spacing));
-  const double total = TotalSign + contents.Total + TotalGap;
-  layout.TotalsPerLine = std::clamp(static_cast<int>((width + TotalGap) / total), 1, 3);
+  const int lines = std::max(FewestLines, LinesIn(place.Height / capital, spacing));
   layout.Pitch = (place.Height - 2 * layout.Margin) / lines;  // no strip stays empty
-  layout.TotalLines =
-      std::min(DividedUp(contents.Teams, layout.TotalsPerLine), std::max(1, (lines - HeadingLines) / 2));
-  if (isRoomy && layout.TotalLines > 1) {
-    layout.TotalLines = std::min(layout.TotalLines, lines / 4);
-  }
+  PlaceTotals(layout, lines, width, contents);
   layout.Rows = std::max(1, lines - HeadingLines - layout.TotalLines);
   PlaceWinners(layout, layout.Rows, width, contents);
-  const int onFirst = layout.Winners + columns * layout.FirstRows;
-  layout.Pages = 1 + DividedUp(std::max(0, contents.Players - onFirst), columns * layout.Rows);
+  CountPages(layout, contents);
   return layout;
+}
+
+/// Roomy unless the totals of the teams would then take more than a line and a quarter of the page.
+AudienceLayout LayOutWith(double capital, int columns, const AudiencePlace& place,
+                          const AudienceContents& contents) {
+  const int lines = LinesIn(place.Height / capital, Roomy);
+  if (lines >= FewestRoomyLines) {
+    AudienceLayout roomy = LayOutSpaced(Roomy, capital, columns, place, contents);
+    if (roomy.TotalLines <= std::max(1, lines / 4)) {
+      return roomy;
+    }
+  }
+  return LayOutSpaced(Tight, capital, columns, place, contents);
 }
 
 bool FitsTwice(double capital, const AudiencePlace& place, const AudienceContents& contents) {
@@ -164,6 +192,7 @@ AudienceLayout LayOut(const AudiencePlace& place, const AudienceContents& conten
     }
     const AudienceLayout grown = BestWith(larger, place, contents);
     if (grown.Pages <= best.Pages && grown.Winners >= best.Winners &&
+        TotalsOnPage(grown, contents) >= TotalsOnPage(best, contents) &&
         ShowsWholeNames(grown, place, contents)) {
       best = grown;
       break;
@@ -175,11 +204,12 @@ AudienceLayout LayOut(const AudiencePlace& place, const AudienceContents& conten
 
 AudienceRows RowsOfPage(const AudienceLayout& layout, int players, int page) {
   const int onFirst = layout.Winners + layout.Columns * layout.FirstRows;
-  if (page == 0) {
+  const int rowPage = page % layout.RowPages;
+  if (rowPage == 0) {
     return {0, std::min(players, onFirst)};
   }
   const int onPage = layout.Columns * layout.Rows;
-  const int first = std::min(players, onFirst + (page - 1) * onPage);
+  const int first = std::min(players, onFirst + (rowPage - 1) * onPage);
   return {first, std::min(players - first, onPage)};
 }
 

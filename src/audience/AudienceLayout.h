@@ -37,19 +37,22 @@ struct AudienceLayout {
   double Margin = 0;   ///< around the page
   int TotalLines = 0;  ///< lines with totals of teams, below the heading
   int TotalsPerLine = 0;
+  double TotalWidth = 0;  ///< of a team's badge, total and the gap behind it
   int Columns = 1;
   int Rows = 0;            ///< of a column, on all pages but the first
   int Winners = 0;         ///< large rows across the first page
   double WinnerScale = 1;  ///< how much larger they are
   int FirstRows = 0;       ///< of a column on the first page, below the winners
-  int Pages = 1;
-  bool Names = true;   ///< false: there is room for guns alone
-  double Squeeze = 1;  ///< width of the letters against their usual one
-  double Minutes = 0;  ///< of arc under which a capital is seen
+  int RowPages = 1;        ///< with different rows
+  int Pages = 1;           ///< the same rows again with other totals where not all totals fit on one
+  bool Names = true;       ///< false: there is room for guns alone
+  double Squeeze = 1;      ///< width of the letters against their usual one
+  double Minutes = 0;      ///< of arc under which a capital is seen
 };
 
 /// Letters are legible from the place, and larger where that takes no further page; smaller only in a window
 /// so small that not even heading, total and one row would fit. Two columns where both fit and save a page.
+/// All teams' totals stand on each page where a row is left besides; else they take turns.
 AudienceLayout LayOut(const AudiencePlace& place, const AudienceContents& contents);
 
 /// A run of players in the order of their places, counted from 0.
@@ -58,7 +61,8 @@ struct AudienceRows {
   int Count = 0;
 };
 
-/// The rows of page `page`, counted from 0; on the first one the winners come first.
+/// The rows of page `page`, counted from 0 to `Pages` - 1; where it shows the first rows, the winners come
+/// first.
 AudienceRows RowsOfPage(const AudienceLayout& layout, int players, int page);
 
 /// Which team's total stands first on a page, counted from 0: where not all fit, they take turns.

@@ -38,15 +38,38 @@ class AudiencePages {
     int Team;
   };
 
+  /// Where a row's texts stand.
+  struct Parts {
+    QRectF Place;
+    QRectF Badge;  ///< empty where the gun stands in the team's colour
+    QRectF Name;
+    QRectF Points;
+  };
+
+  /// A row and where it stands on a page.
+  struct PlacedRow {
+    const Row& Texts;
+    QRectF Area;
+    const Style& Letters;
+    bool IsWinner;
+  };
+
+  /// A team's total and where it stands.
+  struct PlacedTotal {
+    const AudienceTotal& Total;
+    QRectF Badge;
+    QRectF Points;
+  };
+
   AudienceContents Measure() const;
   Style StyleOf(double capital) const;
+  std::vector<PlacedRow> RowsOn(int page, const Style& large) const;
+  std::vector<PlacedTotal> TotalsOn(int page) const;
+  Parts PartsOf(const PlacedRow& row) const;
   void PaintHeading(QPainter& painter, int page) const;
-  void PaintTotals(QPainter& painter, int page) const;
-  void PaintRow(QPainter& painter, const Row& row, const QRectF& area, const Style& style,
-                bool isWinner) const;
-  void PaintNamed(QPainter& painter, const Row& row, const QRectF& area, const Style& style,
-                  bool isWinner) const;
-  void PaintBadge(QPainter& painter, const QRectF& area, int team, const Style& style) const;
+  void PaintTotal(QPainter& painter, const PlacedTotal& total) const;
+  void PaintTexts(QPainter& painter, const PlacedRow& row) const;
+  void PaintLetter(QPainter& painter, const QRectF& badge, int team, const Style& style) const;
   /// Places of the rows of a page, from the top of each column down.
   std::vector<QRectF> AreasOf(int page) const;
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <functional>
+#include <utility>
 
 #include "platform/RuntimeError.h"
 #include "platform/Utf8.h"
@@ -51,6 +52,22 @@ AudienceResults ResultsOf(Session& session, const GuestNames& guests) {
   }
   std::ranges::stable_sort(results.Totals, std::greater(), &AudienceTotal::Points);
   return results;
+}
+
+void LookUpNickNames(AudienceResults& results, Session& session) {
+  try {
+    const ReadScope scope(session.DbMembers());
+    std::vector<std::string> nickNames;
+    for (const AudienceName& name : results.Names) {
+      const std::int32_t member = name.Holder.Member;
+      nickNames.push_back(member == 0 ? std::string() : CleanName(session.Members().NickNameOf(member)));
+    }
+    for (std::size_t at = 0; at < nickNames.size(); ++at) {
+      results.Names[at].Holder.NickName = std::move(nickNames[at]);
+    }
+  } catch (const RuntimeError&) {
+    return;
+  }
 }
 
 void ShowNames(AudienceResults& results, const std::function<std::string(const NameHolder&)>& nameShown) {

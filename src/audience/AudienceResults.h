@@ -35,6 +35,10 @@ struct AudienceResults {
 /// Members whose rows cannot be read stand there by their guns.
 AudienceResults ResultsOf(Session& session, const GuestNames& guests);
 
+/// Gives the members among the players the nicknames that they have now; those of none that is gone. Where
+/// they cannot be read, all stay as they are.
+void LookUpNickNames(AudienceResults& results, Session& session);
+
 /// Calls the players as `nameShown` says; by their guns where it gives an empty text.
 void ShowNames(AudienceResults& results, const std::function<std::string(const NameHolder&)>& nameShown);
 

@@ -46,20 +46,24 @@ void AudienceState::EndPull(bool withGuns) {
   if (withGuns) {
     isPulled_ = true;
     isShown_ = false;
+    isAwaited_ = isOn_ && follows_;
   }
   Tell(false);
 }
 
 void AudienceState::ForgetGame() {
+  isAwaited_ = false;
   isPulled_ = false;
   isShown_ = false;
 }
 
 void AudienceState::TellScored() {
   const bool isWanted = isShown_ || (follows_ && isPulled_);
+  isAwaited_ = false;
   if (isOn_ && isWanted && !pulling_) {
     Take();
   }
+  Tell(false);
 }
 
 void AudienceState::Take() {
@@ -95,6 +99,7 @@ void AudienceState::ShowResults() {
 void AudienceState::ShowIdle() {
   isShown_ = false;
   isPulled_ = false;
+  isAwaited_ = false;
   chosen_ = AudienceView::Idle;
   Tell(false);
 }
@@ -112,7 +117,7 @@ void AudienceState::Tell(bool isNew) {
 }
 
 AudienceView AudienceState::View() const {
-  return chosen_ == AudienceView::Idle && pulling_ ? AudienceView::Incoming : chosen_;
+  return chosen_ == AudienceView::Idle && (pulling_ || isAwaited_) ? AudienceView::Incoming : chosen_;
 }
 
 AudienceTurn TurnOf(int number, int pages, bool hasAddress) {

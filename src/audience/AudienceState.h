@@ -75,8 +75,9 @@ class AudienceState {
   bool isOn_ = false;
   bool follows_ = false;
   bool pulling_ = false;
-  bool isPulled_ = false;  ///< the game on the operator's board was pulled, and its scores are to be shown
-  bool isShown_ = false;   ///< the game on the operator's board is the one that is shown
+  bool isAwaited_ = false;  ///< guns came in, and the figures shown by themselves are not made yet
+  bool isPulled_ = false;   ///< the game on the operator's board was pulled, and its scores are to be shown
+  bool isShown_ = false;    ///< the game on the operator's board is the one that is shown
   int received_ = 0;
   int expected_ = 0;
 };

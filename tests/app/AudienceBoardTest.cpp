@@ -6,7 +6,9 @@
 
 #include "audience/AudienceSettings.h"
 #include "audience/GuestNameEntry.h"
+#include "members/Members.h"
 #include "tests/support/Frames.h"
+#include "tests/support/GameFiles.h"
 #include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
@@ -111,6 +113,30 @@ TEST_F(BoardOfTheAudience, StaysWhenAnotherScreenGoes) {
   const AudienceWindow* before = Board();
   emit qApp->screenRemoved(&ScreenNamed("laptop"));
   EXPECT_EQ(Board(), before);
+}
+
+TEST_F(BoardOfTheAudience, GivesWayWhenTheOperatorComesAndReturnsWhenHeGoes) {
+  Start();
+  venue.Trigger("mnuAudienceBoard");
+  ASSERT_NE(Board(), nullptr);
+  QScreen& own = *venue.Window->screen();
+  venue.Window->windowHandle()->setScreen(&HallScreen());
+  venue.Window->move(HallScreen().geometry().topLeft() + QPoint(20, 20));
+  EXPECT_TRUE(QTest::qWaitFor([] { return Board() == nullptr; }));
+  EXPECT_EQ(Control().AwaitedScreen(), "as recommended");
+  venue.Window->windowHandle()->setScreen(&own);
+  venue.Window->move(own.geometry().topLeft() + QPoint(20, 20));
+  ASSERT_TRUE(QTest::qWaitFor([] { return Board() != nullptr; }));
+  EXPECT_EQ(Board()->geometry(), HallScreen().geometry());
+}
+
+TEST_F(BoardOfTheAudience, IsOffWhenTheDesktopClosesIt) {
+  Start();
+  venue.Trigger("mnuAudienceBoard");
+  Board()->close();
+  EXPECT_TRUE(QTest::qWaitFor([this] { return !Control().IsOn(); }));
+  EXPECT_FALSE(venue.Find<QAction>("mnuAudienceBoard").isChecked());
+  EXPECT_EQ(venue.Awake.Held, 0);
 }
 
 TEST_F(BoardOfTheAudience, OpensAgainWhereItWasWithoutTheKeyboard) {
@@ -231,6 +257,22 @@ TEST_F(BoardOfTheAudience, NamesGuestsUntilTheNextGame) {
   venue.LoadGame(SmallGame());
   venue.Trigger("mnuAudienceResults");
   EXPECT_THAT(Names(), ElementsAre("Blue 7", "Red 0"));
+}
+
+TEST_F(BoardOfTheAudience, CallsMembersByTheirNewNicknamesOnceTheWindowIsClosed) {
+  Start();
+  venue.Window->close();
+  venue.ChangeDatabase("members.mdb",
+                       "DELETE FROM Members; INSERT INTO Members (ContactID, NickName) VALUES (4, 'Mole')");
+  Start();
+  venue.LoadGame(GameFile(PlayerOf(1, "<MemberIndex>4</MemberIndex>")));
+  venue.Trigger("mnuAudienceResults");
+  EXPECT_THAT(Names(), ElementsAre("Mole"));
+  venue.ChangeDatabase("members.mdb", "UPDATE Members SET NickName = NULL");
+  const WhileModal<Members> members([](Members& window) { window.close(); });
+  venue.Trigger("mnuManageMembers");
+  EXPECT_EQ(members.Runs(), 1);
+  EXPECT_THAT(Names(), ElementsAre("Red 0"));
 }
 
 TEST_F(BoardOfTheAudience, MovesToTheScreenThatIsSet) {

@@ -77,7 +77,7 @@ TEST(AudienceLayout, HasLegibleLettersInEachHall) {
 TEST(AudienceLayout, ShowsEachPlayerOnce) {
   InEachHall([](const AudiencePlace&, const AudienceContents& contents, const AudienceLayout& layout) {
     int next = 0;
-    for (int page = 0; page < layout.Pages; ++page) {
+    for (int page = 0; page < layout.RowPages; ++page) {
       const AudienceRows rows = RowsOfPage(layout, contents.Players, page);
       EXPECT_EQ(rows.First, next);
       EXPECT_GT(rows.Count, 0);
@@ -97,12 +97,12 @@ TEST(AudienceLayout, StaysOnTheScreen) {
   });
 }
 
-TEST(AudienceLayout, ShowsEachTeamsTotalInTurn) {
+TEST(AudienceLayout, ShowsEachTeamsTotalOnceThePagesHaveTurned) {
   InEachHall([](const AudiencePlace&, const AudienceContents& contents, const AudienceLayout& layout) {
     const int shown = std::min(contents.Teams, layout.TotalLines * layout.TotalsPerLine);
     EXPECT_GE(shown, 1);
     std::vector<int> seen(3, 0);
-    for (int page = 0; page < 3; ++page) {
+    for (int page = 0; page < layout.Pages; ++page) {
       const int first = FirstTotalOfPage(layout, contents.Teams, page);
       for (int i = 0; i < shown; ++i) {
         ++seen.at(static_cast<std::size_t>((first + i) % contents.Teams));
@@ -112,6 +112,29 @@ TEST(AudienceLayout, ShowsEachTeamsTotalInTurn) {
       EXPECT_GE(seen.at(static_cast<std::size_t>(team)), 1);
     }
   });
+}
+
+TEST(AudienceLayout, LeavesATotalOutOnlyWhereNoRowWouldBeLeft) {
+  InEachHall([](const AudiencePlace&, const AudienceContents& contents, const AudienceLayout& layout) {
+    if (layout.TotalLines * layout.TotalsPerLine < contents.Teams) {
+      EXPECT_LT(layout.Rows, 3);
+      EXPECT_LE(layout.TotalLines, 2);
+    }
+  });
+}
+
+TEST(AudienceLayout, ShowsTheSameRowsAgainWhereOnlyTotalsAreLeft) {
+  int found = 0;
+  InEachHall([&](const AudiencePlace&, const AudienceContents& contents, const AudienceLayout& layout) {
+    for (int page = layout.RowPages; page < layout.Pages; ++page) {
+      ++found;
+      const AudienceRows first = RowsOfPage(layout, contents.Players, page - layout.RowPages);
+      const AudienceRows again = RowsOfPage(layout, contents.Players, page);
+      EXPECT_EQ(again.First, first.First);
+      EXPECT_EQ(again.Count, first.Count);
+    }
+  });
+  EXPECT_GT(found, 0);
 }
 
 TEST(AudienceLayout, ShowsAllTotalsOnEachPageWhereAHallIsUsual) {

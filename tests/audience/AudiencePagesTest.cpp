@@ -56,6 +56,16 @@ int LowestLine(const QImage& picture) {
   return -1;
 }
 
+/// The page on a picture that goes on below and to the right of the place.
+QImage PaintedWithRoomAround(const AudiencePages& pages, const AudiencePlace& place, int page) {
+  QImage picture(place.Width + 200, place.Height + 200, QImage::Format_RGB32);
+  picture.fill(AudienceColours::Page());
+  QPainter painter(&picture);
+  pages.Paint(painter, page);
+  painter.end();
+  return picture;
+}
+
 TEST(AudienceColours, AreLegibleFromAfar) {
   using namespace AudienceColours;
   EXPECT_GE(::Contrast(Letters().rgb(), Page().rgb()), LeastContrastForTheHall);
@@ -85,9 +95,10 @@ TEST(AudiencePages, EndWithinTheScreen) {
     const AudienceResults results = ResultsOfPlayers(players);
     for (const AudiencePlace& place : {FullHd(55, 5), FullHd(24, 15), FullHd(86, 3)}) {
       const AudiencePages pages(results, strings, place);
-      const QImage picture = Painted(pages, place, 0);
+      const QImage picture = PaintedWithRoomAround(pages, place, 0);
       EXPECT_GT(LowestLine(picture), place.Height / 8) << players;
       EXPECT_LT(LowestLine(picture), place.Height) << players;
+      EXPECT_EQ(LowestLine(picture.copy(place.Width, 0, 200, place.Height)), -1) << players;
     }
   }
 }
@@ -117,6 +128,28 @@ TEST(AudiencePages, ShowColourAndLetterOfEachTeam) {
     }
     EXPECT_GT(pixels, 2000) << team;
   }
+}
+
+TEST(AudiencePages, DoNotCutTheTailsOfLetters) {
+  const StringTable strings(Language::English);
+  AudienceResults results = ResultsOfPlayers(9);
+  for (Standing& player : results.Players) {
+    player.PublicName = player.Place == 1 ? "ggggg" : " ";
+  }
+  const AudiencePlace place = FullHd(43, 10);
+  const AudiencePages pages(results, strings, place);
+  const AudienceLayout& layout = pages.Layout();
+  ASSERT_LT(layout.Pitch, 1.5 * layout.Capital);  // lines stand close
+  const double firstRow = layout.Pitch * (layout.Winners > 0 ? layout.WinnerScale : 1);
+  const int below = static_cast<int>(layout.Margin + (1 + layout.TotalLines) * layout.Pitch + firstRow);
+  const QImage picture = Painted(pages, place, 0);
+  int pixelsOfTails = 0;
+  for (int y = below; y < below + static_cast<int>(layout.Capital / 2); ++y) {
+    for (int x = place.Width / 5; x < place.Width / 2; ++x) {  // where the second row has no name
+      pixelsOfTails += picture.pixelColor(x, y) != AudienceColours::Row(results.Players[1].Team) ? 1 : 0;
+    }
+  }
+  EXPECT_GT(pixelsOfTails, 20);
 }
 
 }  // namespace

@@ -42,6 +42,28 @@ TEST_F(PublicResults, NameMembersGuestsAndGuns) {
   EXPECT_THAT(Names(), ElementsAre("Guest", "Mole", "Red 0"));
 }
 
+TEST_F(PublicResults, CallMembersByTheNicknamesOfToday) {
+  ExecuteSql(venue.MembersFile(),
+             "INSERT INTO Members (ContactID, FirstName, LastName, NickName) VALUES "
+             "(3, 'Ada', 'Byron', 'Mole'), (4, 'Bo', 'Ek', 'Owl')");
+  venue.Open();
+  venue.Play(Yellow0, 7).MemberIndex = 3;
+  venue.Play(Red0, 5).MemberIndex = 4;
+  venue.Play(Blue7, 3);
+  venue.session.CalculateScores();
+  AudienceResults results = Results();
+  ExecuteSql(
+      venue.MembersFile(),
+      "UPDATE Members SET NickName = 'Badger' WHERE ContactID = 3; DELETE FROM Members WHERE ContactID = 4");
+  LookUpNickNames(results, venue.session);
+  ShowNames(results, [](const NameHolder& holder) {
+    return holder.NickName.empty() ? holder.GuestName : holder.NickName;
+  });
+  EXPECT_EQ(results.Players[0].PublicName, "Badger");
+  EXPECT_EQ(results.Players[1].PublicName, "Red 0");
+  EXPECT_EQ(results.Players[2].PublicName, "Guest");
+}
+
 TEST_F(PublicResults, HoldATotalForEachTeamThatPlayedHighestFirst) {
   venue.Open();
   venue.Play(Red0, 5);

@@ -60,6 +60,21 @@ TEST_F(Audience, SeesResultsByThemselvesOnlyWhereTheBoardFollows) {
   EXPECT_EQ(Shown(), 8);
 }
 
+TEST_F(Audience, SeesScoresComeInUntilTheyAreMade) {
+  state.SetFollows(true);
+  state.BeginPull();
+  Play(8);
+  state.EndPull(true);
+  EXPECT_EQ(state.View(), AudienceView::Incoming);
+  state.TellScored();
+  EXPECT_EQ(state.View(), AudienceView::Results);
+  state.ShowIdle();
+  state.BeginPull();
+  state.EndPull(true);
+  state.ForgetGame();
+  EXPECT_EQ(state.View(), AudienceView::Idle);
+}
+
 TEST_F(Audience, SeesResultsOnCommand) {
   state.ShowResults();
   EXPECT_EQ(state.View(), AudienceView::Idle);
