@@ -63,17 +63,35 @@ PublicGame PublicGameOf(const EveningGame& game,
   return shown;
 }
 
-bool EveningGames::Take(const Scored& scored) {
+EveningGame EveningGames::GameOf(const Scored& scored) {
   EveningGame game{.Figures = PublicGameOf(scored.Game, 0, scored.Time, ShownNames())};
-  if (game.Figures.Players.empty()) {
-    return false;
-  }
   game.Holders.reserve(game.Figures.Players.size());
   for (const PublicPlayer& player : game.Figures.Players) {
     game.Holders.push_back(HolderOf(scored.Game, player.Gun, scored.OfMembers, scored.OfGuests));
   }
   game.Marks = MarksOf(scored.Game);
   game.Since = scored.Played;
+  return game;
+}
+
+int EveningGames::TakeEarlier(const Scored& scored) {
+  EveningGame game = GameOf(scored);
+  if (game.Figures.Players.empty()) {
+    return 0;
+  }
+  const int known = NumberOf(game.Marks);
+  const int number = known != 0 ? known : ++last_;
+  game.Figures.Number = number;
+  game.IsPublic = true;
+  games_.insert_or_assign(number, std::move(game));
+  return number;
+}
+
+bool EveningGames::Take(const Scored& scored) {
+  EveningGame game = GameOf(scored);
+  if (game.Figures.Players.empty()) {
+    return false;
+  }
   if (onBoard_ == 0 || !games_.contains(onBoard_)) {
     onBoard_ = NumberOf(game.Marks);
   }

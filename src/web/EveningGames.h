@@ -32,7 +32,7 @@ class EveningGames {
   static constexpr std::size_t Most = 30;
   static constexpr std::chrono::hours Age{12};
 
-  /// The game on the board, its scores calculated.
+  /// A game with its scores.
   struct Scored {
     const ::Game& Game;
     std::string Time;  ///< when it was played, as the pages show it
@@ -44,6 +44,10 @@ class EveningGames {
   /// Takes the game in, or as it is now. Returns true if there is something new in it; a game without players
   /// is left alone.
   bool Take(const Scored& scored);
+
+  /// Takes a game in that was kept before, and returns its number; 0 for one without players. To be called in
+  /// the order in which they were played, before the first call of Take.
+  int TakeEarlier(const Scored& scored);
 
   /// The board was cleared: what comes next is another game.
   void ForgetBoard() { onBoard_ = 0; }
@@ -58,6 +62,8 @@ class EveningGames {
   std::map<int, EveningGame>& All() { return games_; }
 
  private:
+  static EveningGame GameOf(const Scored& scored);
+
   /// The number of the game whose guns noted this; 0 if it is a new one.
   int NumberOf(const std::map<int, std::uint64_t>& marks) const;
 

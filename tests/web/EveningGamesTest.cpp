@@ -19,13 +19,15 @@ class Evening : public testing::Test {
     return player;
   }
 
-  bool Take(std::chrono::microseconds played = 1h) {
-    return games.Take({.Game = game,
-                       .Time = "20:15",
-                       .Played = played,
-                       .OfMembers = [](std::int32_t id) { return id == 12 ? "Mole" : ""; },
-                       .OfGuests = [this](int index) { return index == Red0 ? guest : std::string(); }});
+  EveningGames::Scored Scored(std::chrono::microseconds played) const {
+    return {.Game = game,
+            .Time = "20:15",
+            .Played = played,
+            .OfMembers = [](std::int32_t id) { return id == 12 ? "Mole" : ""; },
+            .OfGuests = [this](int index) { return index == Red0 ? guest : std::string(); }};
   }
+  bool Take(std::chrono::microseconds played = 1h) { return games.Take(Scored(played)); }
+  int TakeEarlier() { return games.TakeEarlier(Scored(1h)); }
 
   void Clear() {
     games.ForgetBoard();
@@ -57,6 +59,34 @@ TEST_F(Evening, NumbersItsGamesAsTheyCome) {
   EXPECT_THAT(Numbers(), ElementsAre(1, 2));
   EXPECT_EQ(games.All().at(2).Figures.Number, 2);
   EXPECT_EQ(games.All().at(2).Figures.Time, "20:15");
+}
+
+TEST_F(Evening, BeginsWithTheGamesThatWereKept) {
+  Play(Red0, 10);
+  EXPECT_EQ(TakeEarlier(), 1);
+  Play(Red0, 20);
+  EXPECT_EQ(TakeEarlier(), 2);
+  EXPECT_EQ(games.OnBoard(), 0);
+  EXPECT_TRUE(games.All().at(2).IsPublic);
+  Play(Red0, 30);
+  Take();
+  EXPECT_EQ(games.OnBoard(), 3);
+  EXPECT_FALSE(games.All().at(3).IsPublic);
+}
+
+TEST_F(Evening, KnowsAGameThatWasKept) {
+  Play(Red0, 10);
+  TakeEarlier();
+  EXPECT_EQ(TakeEarlier(), 1);
+  Play(Blue7, 5);
+  Take();
+  EXPECT_EQ(games.OnBoard(), 1);
+  EXPECT_THAT(Numbers(), ElementsAre(1));
+}
+
+TEST_F(Evening, HasNoKeptGameWithoutPlayers) {
+  EXPECT_EQ(TakeEarlier(), 0);
+  EXPECT_TRUE(games.All().empty());
 }
 
 TEST_F(Evening, HasNoGameWithoutPlayers) {
