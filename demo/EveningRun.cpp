@@ -153,7 +153,7 @@ EveningRun::Rows EveningRun::RowsOfPages(int games) {
     const QString path = QStringLiteral("/en/g/%1/").arg(game);
     const auto page = pages.find(path);
     const QRegularExpression row(
-        QStringLiteral("<tr><td[^>]*>(\\d+)<.*?%1(\\d+)\".*?</a><td[^>]*>(-?\\d+)").arg(path));
+        QStringLiteral("<tr><td[^>]*>(\\d+)<.*?<a href=\"(?:%1)?(\\d+)\".*?</a><td[^>]*>(-?\\d+)").arg(path));
     for (auto match = row.globalMatch(page != pages.end() ? QString::fromUtf8(page->second) : QString());
          match.hasNext();) {
       const QRegularExpressionMatch found = match.next();
@@ -165,10 +165,10 @@ EveningRun::Rows EveningRun::RowsOfPages(int games) {
 }
 
 EveningRun::Rows EveningRun::RowsOfArchive() const {
-  const QString folder = QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation);
+  const QString path = QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation) +
+                       QStringLiteral("/Orvalin/Tessarine/games.mdb");
   SqliteEngine databases;
-  const auto archive =
-      databases.OpenDatabase((folder + QStringLiteral("/Orvalin/Tessarine/games.mdb")).toStdString());
+  const auto archive = databases.OpenDatabase(path.toStdString());
   Rows rows;
   archive->Statements().Query(
       "SELECT GameID, Place, PlayerIndex, Soldiering FROM GamePlayers", {}, [&rows](const SqlRow& row) {

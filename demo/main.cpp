@@ -27,7 +27,8 @@ Asked AskedBy(QStringList arguments) {
     asked.Games = arguments[1].toInt();
     asked.Evening = {arguments[2].toInt(), arguments[3].toUInt(), arguments[4]};
     asked.Folder = QDir(arguments[5]);
-    asked.IsClear = asked.Games > 0 && asked.Games <= EveningGames::Most && asked.Folder.exists();
+    asked.IsClear =
+        asked.Games > 0 && asked.Games <= static_cast<int>(EveningGames::Most) && asked.Folder.exists();
     return asked;
   }
   asked.Source =

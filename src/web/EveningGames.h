@@ -26,7 +26,7 @@ PublicGame PublicGameOf(const EveningGame& game,
 
 /// The last games of this evening, numbered as they came. The game on the board is one of them from its first
 /// figures until the board is cleared. One whose guns noted the same as before, pulled again onto an empty
-/// board, is the same game.
+/// board, is the same game, also if some guns were or are missing.
 class EveningGames {
  public:
   static constexpr std::size_t Most = 30;
@@ -54,6 +54,9 @@ class EveningGames {
 
   /// Number of the game on the board; 0 if it has none.
   int OnBoard() const { return onBoard_; }
+
+  /// Members may be called otherwise than before, or be gone.
+  void NameAnew(const NickNames& ofMembers);
 
   /// Drops what is too old at time `now`, and the first ones of too many.
   void Prune(std::chrono::microseconds now);

@@ -90,6 +90,7 @@ std::string ResultsHost::NameOnPage(const NameHolder& holder) const {
 
 void ResultsHost::ShowOtherNames() {
   if (IsOn()) {
+    NameAnew();
     TakeGame();
     PutAll();
   }
@@ -202,6 +203,16 @@ void ResultsHost::Hear(SessionChange change) {
       break;
     default:
       break;
+  }
+}
+
+void ResultsHost::NameAnew() {
+  Session& session = parts_.Session;
+  try {
+    const ReadScope scope(session.DbMembers());
+    running_->Evening.NameAnew([&session](std::int32_t id) { return session.Members().NickNameOf(id); });
+  } catch (const RuntimeError&) {  // what cannot be looked up may have been taken off
+    running_->Evening.NameAnew([](std::int32_t) { return std::string(); });
   }
 }
 

@@ -120,6 +120,7 @@ class ResultsHost : public QObject {
   void TurnOff();
   void Hear(SessionChange change);
   void HearServer();
+  void NameAnew();
   void ReadEarlier();
   void ListEarlier();
   void TakeEarlier(std::int64_t number);

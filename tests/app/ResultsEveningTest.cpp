@@ -4,6 +4,7 @@
 
 #include <filesystem>
 
+#include "members/Members.h"
 #include "tests/app/ResultsVenue.h"
 
 namespace {
@@ -97,6 +98,20 @@ TEST_P(EveningOnThePage, HasTheNamesOfNowAndKeepsHiddenOnesHidden) {
   Serve();
   EXPECT_TRUE(IsServed("/en/g/3/40"));
   EXPECT_FALSE(AnyServed("Otter"));
+}
+
+TEST_P(EveningOnThePage, HasNoNameOfAMemberWhoIsTakenOffTheList) {
+  Serve();
+  ShowNames();
+  ASSERT_TRUE(AnyServed("Mole"));
+  const WhileModal<Members> window([this](Members& members) {
+    venue.ChangeDatabase("members.mdb", "DELETE FROM Members WHERE ContactID = 4711");
+    members.close();
+  });
+  venue.Trigger("mnuManageMembers");
+  EXPECT_EQ(window.Runs(), 1);
+  EXPECT_TRUE(IsServed("/en/g/1/40"));
+  EXPECT_FALSE(AnyServed("Mole"));
 }
 
 TEST_P(EveningOnThePage, HasNoGameThatWasDeleted) {

@@ -133,6 +133,38 @@ TEST_F(Evening, TellsGamesApartByAnyGun) {
   EXPECT_THAT(Numbers(), ElementsAre(1, 2));
 }
 
+TEST_F(Evening, TakesNoGameForAnotherBecauseOneGunNotedTheSame) {
+  Play(Red0, 3);
+  Play(Blue7, 5);
+  Take();
+  Clear();
+  Play(Red0, 3);
+  Play(Yellow3, 9);
+  Take();
+  EXPECT_THAT(Numbers(), ElementsAre(1, 2));
+}
+
+TEST_F(Evening, CallsMembersAsTheyAreCalledNow) {
+  Play(Red0, 10);
+  Play(Blue7, 5).MemberIndex = 12;
+  guest = "Ann";
+  Take();
+  const auto nameOf = [this](int gun) {
+    const EveningGame& evening = games.All().at(1);
+    for (std::size_t at = 0; at < evening.Holders.size(); ++at) {
+      if (evening.Figures.Players[at].Gun == gun) {
+        return evening.Holders[at].NickName + evening.Holders[at].GuestName;
+      }
+    }
+    return std::string();
+  };
+  games.NameAnew([](std::int32_t id) { return id == 12 ? " Otter\n" : "nobody"; });
+  EXPECT_EQ(nameOf(Blue7), "Otter");
+  EXPECT_EQ(nameOf(Red0), "Ann");
+  games.NameAnew([](std::int32_t) { return std::string(); });
+  EXPECT_EQ(nameOf(Blue7), "");
+}
+
 TEST_F(Evening, TakesNoGameForAnotherBecauseNobodyShot) {
   Play(Red0, 0);
   Take();
