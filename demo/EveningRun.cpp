@@ -36,7 +36,7 @@ int ResidentMemory(const QString& process) {
 QString ServingProcess() {
   const QByteArray children = TextOfFile(QStringLiteral("/proc/self/task/%1/children").arg(getpid()));
   for (const QByteArray& child : children.split(' ')) {
-    const QString process = QString::fromLatin1(child);
+    QString process = QString::fromLatin1(child);
     const QByteArray words = TextOfFile(QStringLiteral("/proc/%1/cmdline").arg(process));
     if (words.contains("tessarine-results") && !words.contains("--ask")) {
       return process;

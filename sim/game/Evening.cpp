@@ -33,7 +33,7 @@ int Evening::NumberAt(std::chrono::microseconds elapsed) const {
 }
 
 std::vector<GunScores> Evening::Game(int number) const {
-  const std::vector<GunScores> first = MakeGame(players_, seed_);
+  std::vector<GunScores> first = MakeGame(players_, seed_);
   if (number == 1) {
     return first;
   }
