@@ -39,13 +39,15 @@ DemoRun::DemoRun(QMainWindow& window, DemoSource source, const QDir& folder)
       folder_(folder),
       board_(List(window, "ScoreDisplay")),
       teams_(List(window, "TeamScores")),
-      operator_(folder) {}
+      operator_(folder),
+      audience_(window, operator_, folder) {}
 
 QStringList DemoRun::Run() {
   if (!QTest::qWaitForWindowExposed(&window_)) {
     return {QStringLiteral("The main window did not appear.")};
   }
   window_.setGeometry(window_.screen()->availableGeometry());
+  audience_.SeeVenue();
   PullGame();
   WriteBoard(Step::Download);
   SaveGame(QStringLiteral("game.xml"));
@@ -55,6 +57,7 @@ QStringList DemoRun::Run() {
   SaveGame(QStringLiteral("game-final.xml"));
   PrintSheets();
   WriteBoard(Step::End);
+  audience_.SeeResults();
   ShowBoard();
   ShowDetails();
   ShowMembers();

@@ -6,6 +6,7 @@
 #include <QTableView>
 #include <functional>
 
+#include "demo/AudienceEyes.h"
 #include "demo/DemoMembers.h"
 #include "demo/Operator.h"
 
@@ -14,8 +15,8 @@ enum class DemoSource { BaseUnit, Radio };
 
 /// One game of an evening, with the real buttons in the real windows: downloads it, assigns the members who
 /// came without their buttons, enters the mission's results, commits and saves the game, and prints the
-/// active players' score sheets to files. Leaves the board as text, after the download and at the end, and
-/// pictures.
+/// active players' score sheets to files. Leaves the board as text, after the download and at the end,
+/// pictures, and the pages that phones get.
 class DemoRun {
  public:
   DemoRun(QMainWindow& window, DemoSource source, const QDir& folder);
@@ -62,4 +63,5 @@ class DemoRun {
   QTableView& board_;
   QTableView& teams_;
   Operator operator_;
+  AudienceEyes audience_;
 };

@@ -70,6 +70,10 @@ void Operator::CloseBox() {
   if (box == nullptr) {
     return;
   }
+  if (box->icon() == QMessageBox::Question && std::exchange(expectsQuestion_, false)) {
+    box->button(QMessageBox::Ok)->click();
+    return;
+  }
   if (box->icon() == QMessageBox::Information) {
     message_ = box->text();
   } else {

@@ -48,6 +48,9 @@ class Operator : public QObject {
 
   void SavePicture(QWidget& window, const QString& name);
 
+  /// The next question is answered with OK, and is nothing wrong.
+  void ExpectQuestion() { expectsQuestion_ = true; }
+
   void AddFault(const QString& fault) { faults_.append(fault); }
   const QStringList& Faults() const { return faults_; }
 
@@ -59,6 +62,7 @@ class Operator : public QObject {
   QDir folder_;
   QTimer watch_;
   QString message_;
+  bool expectsQuestion_ = false;
   QStringList faults_;
 };
 

@@ -20,6 +20,16 @@ AddDemoData() {
   "$1" "$3" "$4" "$data" "$6"
 }
 
+# SwitchOnAudience PROGRAM FOLDER: has PROGRAM (tessarine) begin on this data with the audience board, as if on a large screen, and
+# with the results page, on this computer alone.
+SwitchOnAudience() {
+  local data=$2/Orvalin/Tessarine release
+  release=$("$1" --version)
+  printf '[audience]\nvenue=Harbour Lights Arena\ndiagonal=65\ndistance=8\n' >> "$data/tessarine.ini"
+  printf '[results]\non=1\naddress=127.0.0.1\n' >> "$data/tessarine.ini"
+  printf '[audience]\non=1\n[program]\nrelease=%s\n' "${release#* }" > "$data/state.ini"
+}
+
 # StartVenue PROGRAM FOLDER PLAYERS SEED [OPTION...]: starts the simulated venue by PROGRAM (tessarine-venue), with its lines in
 # FOLDER, and waits until it serves. Sets "venue" to its process id.
 StartVenue() {

@@ -83,6 +83,9 @@ BaseUnit::Heard BaseUnit::AwaitReply() {
 }
 
 BaseUnit::Ending BaseUnit::Serve() {
+  if (std::optional<BaseUnitAnswer> next = settings_.NextAnswer ? settings_.NextAnswer() : std::nullopt) {
+    settings_.Answer = std::move(*next);
+  }
   const BaseUnitAnswer& answer = settings_.Answer;
   bytesUntilCut_ = answer.CutAfter.value_or(std::numeric_limits<std::size_t>::max());
   record_.Note([](Record& record) { record.Latest = {}; });

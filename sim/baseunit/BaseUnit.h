@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <functional>
+#include <optional>
 #include <ostream>
 #include <span>
 #include <vector>
@@ -15,6 +16,9 @@ namespace sim {
 
 struct BaseUnitSettings {
   BaseUnitAnswer Answer{};  ///< sent for every request: the unit keeps a game's scores until the next game
+  /// Called at each request, on the unit's thread; returns the answer from then on if the next game has
+  /// ended.
+  std::function<std::optional<BaseUnitAnswer>()> NextAnswer = {};
   Pace LinePace = Pace::AsWired;
   int Requests = 0;                       ///< how many to serve before the line ends; 0: any number
   std::ostream* Log = nullptr;            ///< receives the traffic in both directions

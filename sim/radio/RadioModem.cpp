@@ -9,6 +9,8 @@ namespace sim {
 namespace {
 
 constexpr int LineBaud = 57600;
+// Longer than any wait of a host between two guns that it searches.
+constexpr std::chrono::seconds PauseBetweenSearches{1};
 
 }  // namespace
 
@@ -64,6 +66,11 @@ void RadioModem::Note(const HostFault& fault) {
 void RadioModem::Serve(const GunRequest& request) {
   const PseudoTerminal::Clock::time_point asked = PseudoTerminal::Clock::now();
   Log().FromHost(reader_.Bytes(), Describe(request));
+  if (BeginsASearch(request, asked)) {
+    TakeNextGuns();
+  }
+  latestCommand_ = request.Command;
+  latestAsked_ = asked;
   if (request.Command == GunCommand::Search) {
     for (LinePiece& piece : trouble_.KeptBack()) {
       sender_.Add(asked, std::move(piece));
@@ -78,6 +85,19 @@ void RadioModem::Serve(const GunRequest& request) {
     }
   }
   traffic_.Note([&](RadioModemTraffic& traffic) { traffic.Requests.push_back(request); });
+}
+
+bool RadioModem::BeginsASearch(const GunRequest& request, PseudoTerminal::Clock::time_point asked) const {
+  return request.Command == GunCommand::Search &&
+         (latestCommand_ != GunCommand::Search || asked - latestAsked_ >= PauseBetweenSearches);
+}
+
+void RadioModem::TakeNextGuns() {
+  if (std::optional<std::vector<RadioGun>> next = settings_.NextGuns ? settings_.NextGuns() : std::nullopt) {
+    settings_.Guns = std::move(*next);
+    trouble_ = RadioTrouble(settings_.Trouble, settings_.Guns);
+    closed_.clear();
+  }
 }
 
 const RadioGun* RadioModem::FindGun(std::uint8_t playerId) const {

@@ -3,6 +3,8 @@
 #include <chrono>
 #include <cstddef>
 #include <cstdint>
+#include <functional>
+#include <optional>
 #include <ostream>
 #include <set>
 #include <string>
@@ -19,6 +21,9 @@ namespace sim {
 
 struct RadioModemSettings {
   std::vector<RadioGun> Guns{};  ///< those in range; distinct player ids and addresses
+  /// Called when a host begins to search, on the modem's thread; returns the guns from then on if the next
+  /// game has ended.
+  std::function<std::optional<std::vector<RadioGun>>()> NextGuns = {};
   RadioTroubleSettings Trouble{};
   Pace LinePace = Pace::AsWired;
   std::ostream* Log = nullptr;     ///< receives the traffic in both directions
@@ -36,7 +41,8 @@ struct RadioModemTraffic {
 /// The radio modem, in API mode without escaping on a 57600 baud line, and the guns in its range. Both
 /// directions run at once: a gun answers when its answer time has passed since the last bit of the request,
 /// or later if the line is still busy with another answer. The guns keep their scores, so a host may close a
-/// transfer and fetch them again.
+/// transfer and fetch them again. What a host finds in a search and fetches behind it is one game: the next
+/// one begins with a search after something else, or after a pause.
 class RadioModem : public Device {
  public:
   /// Throws std::system_error when the system grants no pseudo terminal, and std::invalid_argument when there
@@ -53,6 +59,8 @@ class RadioModem : public Device {
   void Take(std::uint8_t byte);
   void Note(const HostFault& fault);
   void Serve(const GunRequest& request);
+  bool BeginsASearch(const GunRequest& request, PseudoTerminal::Clock::time_point asked) const;
+  void TakeNextGuns();
   const RadioGun* FindGun(std::uint8_t playerId) const;
   void CopyScores(const RadioGun& gun);
   void NoteSent(const LinePiece& piece);
@@ -62,6 +70,8 @@ class RadioModem : public Device {
   PacedSender sender_;
   TransmitRequestReader reader_;
   std::set<std::uint8_t> closed_;
+  std::optional<GunCommand> latestCommand_;
+  PseudoTerminal::Clock::time_point latestAsked_{};
   TrafficRecord<RadioModemTraffic> traffic_;
   Serving serving_{*this, [this] { Run(); }};
 };

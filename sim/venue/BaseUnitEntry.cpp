@@ -1,18 +1,37 @@
+#include <optional>
+#include <stdexcept>
+#include <utility>
+
 #include "sim/baseunit/BaseUnit.h"
 #include "sim/venue/Devices.h"
 
 namespace sim {
 namespace {
 
+// A later game can be too short for the byte at which the first one failed.
+BaseUnitAnswer AnswerOfLaterGame(std::vector<GunScores> game, BaseUnitFailure failure, std::size_t place) {
+  try {
+    return MakeBaseUnitAnswer(game, failure, place);
+  } catch (const std::invalid_argument&) {
+    return MakeBaseUnitAnswer(std::move(game));
+  }
+}
+
 StartedDevice Start(const DeviceStart& start) {
   const DeviceOptions& options = start.Options;
-  BaseUnitSettings settings{
-      .Answer = MakeBaseUnitAnswer(start.Game, options.FailureAs<BaseUnitFailure>(), options.Place),
-      .LinePace = start.LinePace,
-      .Requests = static_cast<int>(options.Number("games")),
-      .Log = start.Log(),
-      .Frames = start.File("frames"),
-      .OnFinished = start.EndVenue};
+  const auto failure = options.FailureAs<BaseUnitFailure>();
+  const auto nextAnswer = [next = start.NextGame, failure,
+                           place = options.Place]() -> std::optional<BaseUnitAnswer> {
+    std::optional<std::vector<GunScores>> game = next();
+    return game ? std::optional(AnswerOfLaterGame(std::move(*game), failure, place)) : std::nullopt;
+  };
+  BaseUnitSettings settings{.Answer = MakeBaseUnitAnswer(start.Game, failure, options.Place),
+                            .NextAnswer = nextAnswer,
+                            .LinePace = start.LinePace,
+                            .Requests = static_cast<int>(options.Number("games")),
+                            .Log = start.Log(),
+                            .Frames = start.File("frames"),
+                            .OnFinished = start.EndVenue};
   return {std::make_unique<BaseUnit>(std::move(settings))};
 }
 

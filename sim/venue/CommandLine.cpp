@@ -2,12 +2,15 @@
 
 #include <algorithm>
 #include <charconv>
+#include <chrono>
 #include <limits>
 #include <stdexcept>
 #include <utility>
 
 namespace sim {
 namespace {
+
+constexpr std::uint64_t LongestGameSeconds = 86'400;
 
 std::uint64_t ParseNumber(const std::string& option, const std::string& text, std::uint64_t highest) {
   std::uint64_t value = 0;
@@ -150,6 +153,12 @@ std::vector<CommandLineOption> GeneralOptions() {
        [](VenueOptions& options, Argument spelling, Argument value) {
          options.Seed = static_cast<std::uint32_t>(
              ParseNumber(spelling, value, std::numeric_limits<std::uint32_t>::max()));
+       }},
+      {{"--evening"},
+       "SECONDS",
+       "play an evening: a new game every SECONDS, told as \"game N\"; 0: one game (0)",
+       [](VenueOptions& options, Argument spelling, Argument value) {
+         options.Evening = std::chrono::seconds(ParseNumber(spelling, value, LongestGameSeconds));
        }},
       {{"--fast"},
        "",

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <ostream>
 #include <string>
 #include <string_view>
@@ -46,7 +47,10 @@ struct DeviceCommand {
 /// device and EndVenue may be kept.
 struct DeviceStart {
   const DeviceOptions& Options;
-  const std::vector<GunScores>& Game;  ///< the game played at the venue
+  const std::vector<GunScores>& Game;  ///< the game played at the venue, the first one of an evening
+  /// The game that has ended last, if it is another one than at the call before; the device asks whenever a
+  /// host begins to pull. May be kept, and called on one thread at a time.
+  std::function<std::optional<std::vector<GunScores>>()> NextGame;
   Pace LinePace = Pace::AsWired;
   /// The log shared by all devices, or nullptr. The first call opens it, so a start that is refused before
   /// then leaves an older file untouched. Throws std::runtime_error if it cannot be written.

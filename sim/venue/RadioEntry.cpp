@@ -1,4 +1,5 @@
 #include <chrono>
+#include <optional>
 
 #include "sim/radio/RadioGun.h"
 #include "sim/radio/RadioModem.h"
@@ -10,8 +11,13 @@ namespace {
 StartedDevice Start(const DeviceStart& start) {
   const DeviceOptions& options = start.Options;
   const std::chrono::milliseconds answerTime(options.Number("answer-time"));
+  const auto nextGuns = [next = start.NextGame, answerTime]() -> std::optional<std::vector<RadioGun>> {
+    const std::optional<std::vector<GunScores>> game = next();
+    return game ? std::optional(MakeRadioGuns(*game, answerTime)) : std::nullopt;
+  };
   return {std::make_unique<RadioModem>(
       RadioModemSettings{.Guns = MakeRadioGuns(start.Game, answerTime),
+                         .NextGuns = nextGuns,
                          .Trouble = {.Failure = options.FailureAs<RadioFailure>(),
                                      .Gun = options.Place,
                                      .Times = static_cast<int>(options.Number("times"))},

@@ -5,8 +5,6 @@
 #include <stdexcept>
 #include <utility>
 
-#include "sim/game/GameMaker.h"
-
 namespace sim {
 namespace {
 
@@ -40,8 +38,8 @@ bool HasCommand(const DeviceEntry& entry, const std::string& word) {
 
 Venue::Venue(const VenueOptions& options, std::function<void()> endVenue,
              const std::vector<DeviceEntry>& devices)
-    : endVenue_(std::move(endVenue)) {
-  const std::vector<GunScores> game = MakeGame(options.Players, options.Seed);
+    : evening_(options.Players, options.Seed, options.Evening), endVenue_(std::move(endVenue)) {
+  const std::vector<GunScores> game = evening_.Game(1);
   for (const DeviceEntry& entry : devices) {
     if (options.Of(entry.Name).Served) {
       devices_.push_back(std::make_unique<ServedDevice>(entry));
@@ -58,6 +56,7 @@ void Venue::Start(ServedDevice& device, const VenueOptions& options, const std::
   };
   device.Started = device.Entry.Start({.Options = own,
                                        .Game = game,
+                                       .NextGame = NextGame(),
                                        .LinePace = options.Fast ? Pace::Fast : Pace::AsWired,
                                        .Log = [&] { return Log(options.LogFile); },
                                        .File = openFile,
@@ -65,6 +64,17 @@ void Venue::Start(ServedDevice& device, const VenueOptions& options, const std::
   if (own.Link) {
     device.Link.emplace(*own.Link, device.Started.Served->DevicePath());
   }
+}
+
+std::function<std::optional<std::vector<GunScores>>()> Venue::NextGame() const {
+  return [this, last = 1]() mutable -> std::optional<std::vector<GunScores>> {
+    const int number = GameNumber();
+    return std::exchange(last, number) != number ? std::optional(evening_.Game(number)) : std::nullopt;
+  };
+}
+
+std::chrono::microseconds Venue::Elapsed() const {
+  return std::chrono::duration_cast<std::chrono::microseconds>(std::chrono::steady_clock::now() - begin_);
 }
 
 std::ostream* Venue::Log(const std::optional<std::string>& path) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <fstream>
 #include <functional>
 #include <map>
@@ -9,6 +10,7 @@
 #include <string>
 #include <vector>
 
+#include "sim/game/Evening.h"
 #include "sim/line/DeviceLink.h"
 #include "sim/venue/DeviceEntry.h"
 #include "sim/venue/VenueOptions.h"
@@ -25,6 +27,9 @@ class Venue {
         const std::vector<DeviceEntry>& devices = Devices());
   Venue(const Venue&) = delete;
   Venue& operator=(const Venue&) = delete;
+
+  /// Number of the game whose scores the guns have now, from 1.
+  int GameNumber() const { return evening_.NumberAt(Elapsed()); }
 
   /// Writes "TITLE: DEVICE", one line per device.
   void TellDevices(std::ostream& out) const;
@@ -49,7 +54,11 @@ class Venue {
 
   void Start(ServedDevice& device, const VenueOptions& options, const std::vector<GunScores>& game);
   std::ostream* Log(const std::optional<std::string>& path);
+  std::function<std::optional<std::vector<GunScores>>()> NextGame() const;
+  std::chrono::microseconds Elapsed() const;
 
+  const Evening evening_;
+  const std::chrono::steady_clock::time_point begin_ = std::chrono::steady_clock::now();
   std::function<void()> endVenue_;
   std::optional<std::ofstream> log_;
   std::vector<std::unique_ptr<ServedDevice>> devices_;

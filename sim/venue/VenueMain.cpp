@@ -1,11 +1,14 @@
 #include <poll.h>
 #include <sys/eventfd.h>
 #include <sys/signalfd.h>
+#include <sys/timerfd.h>
 #include <unistd.h>
 
 #include <array>
 #include <cerrno>
+#include <chrono>
 #include <csignal>
+#include <cstdint>
 #include <exception>
 #include <functional>
 #include <iostream>
@@ -38,16 +41,33 @@ sim::FileDescriptor CatchEndSignals() {
   return sim::FileDescriptor(::signalfd(-1, &signals, SFD_CLOEXEC));
 }
 
+// Readable whenever so much time has passed; never for 0.
+sim::FileDescriptor Ticking(std::chrono::seconds every) {
+  sim::FileDescriptor ticks(::timerfd_create(CLOCK_MONOTONIC, TFD_CLOEXEC | TFD_NONBLOCK));
+  const timespec distance{.tv_sec = every.count(), .tv_nsec = 0};
+  const itimerspec times{.it_interval = distance, .it_value = distance};
+  ::timerfd_settime(ticks.Get(), 0, &times, nullptr);
+  return ticks;
+}
+
+/// What the program waits for.
+struct Awaited {
+  const sim::FileDescriptor& EndSignals;
+  const sim::FileDescriptor& Finished;
+  const sim::FileDescriptor& GameTicks;
+};
+
 void Complain(const std::exception& failure) {
   std::cerr << "tessarine-venue: " << failure.what() << '\n';
 }
 
-// Returns on a signal, when `finished` is raised, or at the input's end if `untilEof`. Lines of the input go
-// to `obey`; without it the input is only watched for its end.
-void WaitForEnd(const sim::FileDescriptor& endSignals, const sim::FileDescriptor& finished, bool untilEof,
-                const std::function<void(const std::string&)>& obey) {
-  std::array<pollfd, 3> watched{pollfd{endSignals.Get(), POLLIN, 0}, pollfd{finished.Get(), POLLIN, 0},
-                                pollfd{untilEof || obey ? STDIN_FILENO : -1, POLLIN, 0}};
+// Returns on a signal, when all is finished, or at the input's end if `untilEof`. Lines of the input go to
+// `obey`; without it the input is only watched for its end. Calls `tellGame` at each tick.
+void WaitForEnd(const Awaited& awaited, bool untilEof, const std::function<void(const std::string&)>& obey,
+                const std::function<void()>& tellGame) {
+  std::array<pollfd, 4> watched{
+      pollfd{awaited.EndSignals.Get(), POLLIN, 0}, pollfd{awaited.Finished.Get(), POLLIN, 0},
+      pollfd{untilEof || obey ? STDIN_FILENO : -1, POLLIN, 0}, pollfd{awaited.GameTicks.Get(), POLLIN, 0}};
   sim::LineInput input(STDIN_FILENO);
   for (;;) {
     if (::poll(watched.data(), watched.size(), -1) < 0) {
@@ -58,6 +78,10 @@ void WaitForEnd(const sim::FileDescriptor& endSignals, const sim::FileDescriptor
     }
     if (watched[0].revents != 0 || watched[1].revents != 0) {
       return;
+    }
+    if (std::uint64_t ticks = 0;
+        watched[3].revents != 0 && ::read(watched[3].fd, &ticks, sizeof ticks) == sizeof ticks) {
+      tellGame();
     }
     if (watched[2].revents != 0) {
       for (const std::string& line : input.Read()) {
@@ -97,8 +121,10 @@ void Serve(const sim::VenueOptions& options) {
   if (venue.TakesCommands()) {
     obey = [&venue](const std::string& line) { ObeyAndTell(venue, line); };
   }
+  const sim::FileDescriptor gameTicks = Ticking(options.Evening);
   venue.TellDevices(std::cout);
-  WaitForEnd(endSignals, finished, options.UntilEof, obey);
+  WaitForEnd({.EndSignals = endSignals, .Finished = finished, .GameTicks = gameTicks}, options.UntilEof, obey,
+             [&venue] { std::cout << "game " << venue.GameNumber() << std::endl; });
   venue.TellHostFaults(std::cerr);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <cstdint>
 #include <map>
 #include <optional>
@@ -16,6 +17,7 @@ namespace sim {
 struct VenueOptions {
   int Players = 40;  ///< 0 to 224
   std::uint32_t Seed = 1;
+  std::chrono::seconds Evening{0};  ///< a new game each time they have passed; 0: one game
   bool Fast = false;
   std::optional<std::string> LogFile;
   bool UntilEof = false;

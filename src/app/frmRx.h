@@ -183,6 +183,7 @@ class frmRx : public QMainWindow {
 
   // The page for phones.
   void SetUpResults();
+  ResultsHost::KeptEvening KeptGames();
   NickNames NickNamesOfSession();
   /// Names were hidden or shown again.
   void ShowOtherNames();

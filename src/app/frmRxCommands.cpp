@@ -173,7 +173,7 @@ std::string frmRx::ShowMembers(std::int32_t contactToShow) {
   window.ContactToShow = contactToShow;
   window.exec();
   keeping_->NoteMembers();
-  audience_->ShowOtherNames();
+  ShowOtherNames();
   return window.SelectedContact();
 }
 

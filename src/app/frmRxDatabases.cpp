@@ -63,6 +63,7 @@ void frmRx::ImportMemberFile() {
   if (hasImported) {
     session_.Reopen();
     keeping_->CheckMembers();
+    ShowOtherNames();
   }
 }
 

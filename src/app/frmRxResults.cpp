@@ -30,7 +30,8 @@ void frmRx::SetUpResults() {
                                .Now = services_.Time.Now(),
                                .DbMembers = session_.DbMembers(),
                                .NickNameOf = NickNamesOfSession()});
-          }});
+          },
+      .Kept = KeptGames()});
   results_->setParent(this);
   hidden_->OnChange = [this] { ShowOtherNames(); };
   connect(&*audience_, &AudienceBoard::Changed, &*results_, &ResultsHost::Follow);
@@ -40,6 +41,15 @@ void frmRx::SetUpResults() {
   connect(&*results_, &ResultsHost::NamesChanged, &*audience_, &AudienceBoard::ShowOtherNames);
   // Not before this window is shown.
   QTimer::singleShot(0, &*results_, &ResultsHost::Begin);
+}
+
+ResultsHost::KeptEvening frmRx::KeptGames() {
+  return {.Games = [this](const std::string& from) { return archive_->Queries().Games({.From = from}); },
+          .Read =
+              [this](std::int64_t number, const std::function<void(const ResultsHost::KeptGame&)>& take) {
+                const PastGame past = archive_->Read(number);
+                take({.Game = past.Game, .Played = past.Played});
+              }};
 }
 
 NickNames frmRx::NickNamesOfSession() {

@@ -37,19 +37,14 @@ std::map<int, std::uint64_t> MarksOf(const Game& game) {
   return marks;
 }
 
-/// True if a gun is in both, and all that are in both noted the same.
+/// True if the guns of one are among those of the other, and noted the same there.
 bool AreOneGame(const std::map<int, std::uint64_t>& one, const std::map<int, std::uint64_t>& other) {
-  bool isShared = false;
-  for (const auto& [gun, mark] : one) {
-    const auto found = other.find(gun);
-    if (found != other.end()) {
-      if (found->second != mark) {
-        return false;
-      }
-      isShared = true;
-    }
-  }
-  return isShared;
+  const auto& fewer = one.size() <= other.size() ? one : other;
+  const auto& more = one.size() <= other.size() ? other : one;
+  return !fewer.empty() && std::ranges::all_of(fewer, [&more](const auto& gun) {
+    const auto found = more.find(gun.first);
+    return found != more.end() && found->second == gun.second;
+  });
 }
 
 }  // namespace
@@ -63,17 +58,35 @@ PublicGame PublicGameOf(const EveningGame& game,
   return shown;
 }
 
-bool EveningGames::Take(const Scored& scored) {
+EveningGame EveningGames::GameOf(const Scored& scored) {
   EveningGame game{.Figures = PublicGameOf(scored.Game, 0, scored.Time, ShownNames())};
-  if (game.Figures.Players.empty()) {
-    return false;
-  }
   game.Holders.reserve(game.Figures.Players.size());
   for (const PublicPlayer& player : game.Figures.Players) {
     game.Holders.push_back(HolderOf(scored.Game, player.Gun, scored.OfMembers, scored.OfGuests));
   }
   game.Marks = MarksOf(scored.Game);
   game.Since = scored.Played;
+  return game;
+}
+
+int EveningGames::TakeEarlier(const Scored& scored) {
+  EveningGame game = GameOf(scored);
+  if (game.Figures.Players.empty()) {
+    return 0;
+  }
+  const int known = NumberOf(game.Marks);
+  const int number = known != 0 ? known : ++last_;
+  game.Figures.Number = number;
+  game.IsPublic = true;
+  games_.insert_or_assign(number, std::move(game));
+  return number;
+}
+
+bool EveningGames::Take(const Scored& scored) {
+  EveningGame game = GameOf(scored);
+  if (game.Figures.Players.empty()) {
+    return false;
+  }
   if (onBoard_ == 0 || !games_.contains(onBoard_)) {
     onBoard_ = NumberOf(game.Marks);
   }
@@ -103,5 +116,15 @@ void EveningGames::Prune(std::chrono::microseconds now) {
   std::erase_if(games_, [now](const auto& game) { return now - game.second.Since >= Age; });
   while (games_.size() > Most) {
     games_.erase(games_.begin());
+  }
+}
+
+void EveningGames::NameAnew(const NickNames& ofMembers) {
+  for (auto& [number, game] : games_) {
+    for (NameHolder& holder : game.Holders) {
+      if (holder.Member != 0) {
+        holder.NickName = CleanName(ofMembers(holder.Member));
+      }
+    }
   }
 }

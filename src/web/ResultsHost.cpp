@@ -1,10 +1,10 @@
 #include "web/ResultsHost.h"
 
-#include <charconv>
 #include <utility>
 #include <vector>
 
 #include "platform/RuntimeError.h"
+#include "web/EveningTime.h"
 #include "web/PageAddress.h"
 
 using namespace std::chrono_literals;
@@ -14,33 +14,6 @@ namespace {
 constexpr std::chrono::milliseconds LookEvery = 5s;
 constexpr int LooksToRequest = 6;  ///< as long as requests are answered
 constexpr int LooksToRanking = 12;
-
-/// A local time "YYYY-MM-DD HH:MM:SS", as if there were one time for all; none for another text.
-std::optional<std::chrono::sys_seconds> TimeIn(const std::string& text) {
-  constexpr std::size_t length = 19;
-  if (text.size() != length) {
-    return std::nullopt;
-  }
-  const auto number = [&text](std::size_t at, std::size_t count) {
-    int value = 0;
-    const auto [end, fault] = std::from_chars(text.data() + at, text.data() + at + count, value);
-    return fault == std::errc() && end == text.data() + at + count ? value : -1;
-  };
-  const std::chrono::year_month_day day{std::chrono::year(number(0, 4)),
-                                        std::chrono::month(static_cast<unsigned>(number(5, 2))),
-                                        std::chrono::day(static_cast<unsigned>(number(8, 2)))};
-  if (!day.ok() || number(11, 2) < 0 || number(14, 2) < 0 || number(17, 2) < 0) {
-    return std::nullopt;
-  }
-  return std::chrono::sys_days(day) + std::chrono::hours(number(11, 2)) +
-         std::chrono::minutes(number(14, 2)) + std::chrono::seconds(number(17, 2));
-}
-
-std::string HoursAndMinutes(const std::string& stamp) {
-  constexpr std::size_t at = 11;
-  constexpr std::size_t length = 5;
-  return stamp.size() >= at + length ? stamp.substr(at, length) : std::string();
-}
 
 }  // namespace
 
@@ -58,6 +31,9 @@ struct ResultsHost::Running {
   PageServer Server;
   PageProbe Probe;
   EveningGames Evening;
+  bool IsListed = false;              ///< the games that were kept earlier this evening are in Earlier
+  std::vector<std::int64_t> Earlier;  ///< those that are still to be read, the first one last
+  QTimer Reading;
   std::string Address;  ///< at which the pages are to be served; empty for none
   std::uint16_t AskedPort = 0;
   int Looks = 0;
@@ -114,6 +90,7 @@ std::string ResultsHost::NameOnPage(const NameHolder& holder) const {
 
 void ResultsHost::ShowOtherNames() {
   if (IsOn()) {
+    NameAnew();
     TakeGame();
     PutAll();
   }
@@ -143,7 +120,8 @@ void ResultsHost::TurnOn() {
   running_->Pages.SetGames(static_cast<std::size_t>(setup_.Games));
   running_->Server.OnChange = [this] { HearServer(); };
   running_->Probe.OnChange = [this] { emit Changed(); };
-  TakeGame();
+  connect(&running_->Reading, &QTimer::timeout, this, &ResultsHost::ReadEarlier);
+  running_->Reading.start(0);
   PutRanking();
   ServeWhereItBelongs();
   connect(&running_->Timer, &QTimer::timeout, this, &ResultsHost::Look);
@@ -228,14 +206,86 @@ void ResultsHost::Hear(SessionChange change) {
   }
 }
 
+void ResultsHost::NameAnew() {
+  Session& session = parts_.Session;
+  try {
+    const ReadScope scope(session.DbMembers());
+    running_->Evening.NameAnew([&session](std::int32_t id) { return session.Members().NickNameOf(id); });
+  } catch (const RuntimeError&) {  // what cannot be looked up may have been taken off
+    running_->Evening.NameAnew([](std::int32_t) { return std::string(); });
+  }
+}
+
+bool ResultsHost::IsReading() const {
+  return IsOn() && running_->Reading.isActive();
+}
+
+void ResultsHost::ReadEarlier() {
+  if (!std::exchange(running_->IsListed, true)) {
+    ListEarlier();
+  } else if (!running_->Earlier.empty()) {
+    const std::int64_t game = running_->Earlier.back();
+    running_->Earlier.pop_back();
+    TakeEarlier(game);
+  }
+  if (running_->Earlier.empty()) {
+    running_->Reading.stop();
+    running_->Server.Update();
+    TakeGame();
+  }
+}
+
+void ResultsHost::ListEarlier() {
+  const auto now = TimeIn(parts_.Time.Now());
+  if (!now) {
+    return;
+  }
+  try {
+    running_->Earlier = parts_.Kept.Games(TextOf(*now - EveningGames::Age));
+  } catch (const RuntimeError&) {
+    // The archive is locked or damaged, which is told elsewhere: the evening begins with the next game.
+  }
+  if (running_->Earlier.size() > EveningGames::Most) {
+    running_->Earlier.resize(EveningGames::Most);
+  }
+}
+
+void ResultsHost::TakeEarlier(std::int64_t number) {
+  int taken = 0;
+  try {
+    const ReadScope scope(parts_.Session.DbMembers());
+    parts_.Kept.Read(number, [&](const KeptGame& kept) {
+      if (const auto played = ThisEvening(kept.Played)) {
+        taken = running_->Evening.TakeEarlier(
+            {.Game = kept.Game,
+             .Time = played->Text,
+             .Played = played->Since,
+             .OfMembers = [this](std::int32_t id) { return parts_.Session.Members().NickNameOf(id); },
+             .OfGuests = kept.OfGuests});
+      }
+    });
+  } catch (const RuntimeError&) {
+    return;  // the other games are shown all the same
+  }
+  const bool isShown = running_->Earlier.size() < static_cast<std::size_t>(setup_.Games);
+  if (taken != 0 && isShown) {
+    Put(running_->Evening.All().at(taken));
+  }
+}
+
+std::optional<ResultsHost::Moment> ResultsHost::ThisEvening(const std::string& stamp) const {
+  const auto now = TimeIn(parts_.Time.Now());
+  const auto time = TimeIn(stamp);
+  if (now && time && *now - *time < EveningGames::Age && *time - *now < EveningGames::Age) {
+    return Moment{parts_.Elapsed.Elapsed() - (*now - *time), HoursAndMinutes(stamp)};
+  }
+  return std::nullopt;
+}
+
 std::optional<ResultsHost::Moment> ResultsHost::Played() const {
   const std::string now = parts_.Time.Now();
-  const std::string stamp = parts_.Time.Stamp(parts_.Session.Game().GameDate);
-  const auto nowTime = TimeIn(now);
-  const auto stampTime = TimeIn(stamp);
-  if (nowTime && stampTime && *nowTime - *stampTime < EveningGames::Age &&
-      *stampTime - *nowTime < EveningGames::Age) {
-    return Moment{parts_.Elapsed.Elapsed() - (*nowTime - *stampTime), HoursAndMinutes(stamp)};
+  if (const auto played = ThisEvening(parts_.Time.Stamp(parts_.Session.Game().GameDate))) {
+    return played;
   }
   return isLoaded_ ? std::nullopt : std::optional(Moment{parts_.Elapsed.Elapsed(), HoursAndMinutes(now)});
 }
@@ -243,7 +293,7 @@ std::optional<ResultsHost::Moment> ResultsHost::Played() const {
 void ResultsHost::TakeGame() {
   Session& session = parts_.Session;
   const auto played = Played();
-  if (!session.Game().DataPresent || parts_.Pulling() || !played) {
+  if (!session.Game().DataPresent || parts_.Pulling() || IsReading() || !played) {
     return;
   }
   const auto take = [&](const NickNames& nickNames) {

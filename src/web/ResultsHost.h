@@ -2,10 +2,12 @@
 
 #include <QObject>
 #include <QTimer>
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "core/data/IniReader.h"
 #include "core/game/GuestList.h"
@@ -22,11 +24,27 @@
 #include "web/PublicRanking.h"
 
 /// The results page from the operator's side: on and off, where it is, and what is on it. While it is off
-/// there is neither a program nor a page nor a game of the evening.
+/// there is neither a program nor a page nor a game of the evening. Once it is on, the evening's earlier
+/// games come from those that were kept.
 class ResultsHost : public QObject {
   Q_OBJECT
 
  public:
+  /// A game as it was kept.
+  struct KeptGame {
+    const ::Game& Game;
+    std::string Played;  ///< local time, "YYYY-MM-DD HH:MM:SS"
+    GuestNames OfGuests = {};
+  };
+
+  /// The games that were kept, in this run of the program or an earlier one. Both may throw RuntimeError.
+  struct KeptEvening {
+    /// The numbers of those that were played since a local time "YYYY-MM-DD HH:MM:SS", the latest first.
+    std::function<std::vector<std::int64_t>(const std::string& from)> Games;
+    /// Hands one of them to `take`.
+    std::function<void(std::int64_t number, const std::function<void(const KeptGame&)>& take)> Read;
+  };
+
   /// All must outlive the host; the session must be open.
   struct Parts {
     ::Session& Session;
@@ -42,6 +60,7 @@ class ResultsHost : public QObject {
     std::function<bool()> Pulling;         ///< the game on the board is not yet complete
     std::function<bool()> AwaitsBoard;     ///< the audience board is on, and does not show that game
     std::function<PublicRanking()> Ranks;  ///< of this month, all members; may throw RuntimeError
+    KeptEvening Kept;
   };
 
   explicit ResultsHost(const Parts& parts);
@@ -53,6 +72,10 @@ class ResultsHost : public QObject {
   void End();
 
   bool IsOn() const { return running_ != nullptr; }
+
+  /// True while the earlier games of the evening are still being read, one after the other. The game on the
+  /// board comes behind them.
+  bool IsReading() const;
 
   const PageSetup& Setup() const { return setup_; }
   /// Writes what has changed, and does it.
@@ -97,6 +120,10 @@ class ResultsHost : public QObject {
   void TurnOff();
   void Hear(SessionChange change);
   void HearServer();
+  void NameAnew();
+  void ReadEarlier();
+  void ListEarlier();
+  void TakeEarlier(std::int64_t number);
   void TakeGame();
   /// Puts the game on the board onto the pages, once it may appear.
   void Publish(bool hasChanged);
@@ -105,6 +132,8 @@ class ResultsHost : public QObject {
   void PutRanking();
   void ServeWhereItBelongs();
   void ServeAt(const std::string& address);
+  /// That local time "YYYY-MM-DD HH:MM:SS"; none if it is not of this evening.
+  std::optional<Moment> ThisEvening(const std::string& stamp) const;
   /// When the game on the board was played; none for one from a file that is not of this evening.
   std::optional<Moment> Played() const;
 

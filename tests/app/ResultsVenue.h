@@ -4,6 +4,7 @@
 
 #include <QLineEdit>
 #include <QTableView>
+#include <QTest>
 #include <algorithm>
 #include <functional>
 #include <map>
@@ -56,8 +57,14 @@ class ResultsVenue : public testing::TestWithParam<Language> {
   FakePipedProgram& Server() { return venue.Piped.At(0); }
   FakePipedProgram& Asker() { return venue.Piped.At(1); }
 
+  /// Waits until the evening's earlier games are on the page.
+  void AwaitEarlierGames() const {
+    EXPECT_TRUE(QTest::qWaitFor([this] { return !Host().IsReading(); }, 20'000));
+  }
+
   void Serve() {
     SwitchOn();
+    AwaitEarlierGames();
     Server().OnOutput(ServedAt8080);
     Asker().OnOutput(PageAnswered);
   }

@@ -32,6 +32,11 @@ PublicGame GameWith(const std::string& name) {
   return game;
 }
 
+/// The name stands in it as it comes, though nobody takes uncleaned ones.
+Page RankingWith(const std::string& name, Language language) {
+  return RankingPage("2026-11", {{.Place = 1, .Name = name, .Games = 2, .Soldiering = 700}}, language);
+}
+
 /// Nothing that begins an element, ends an attribute or turns the direction may come from the name: a page
 /// has as many of those as one with a plain name.
 void CheckPage(std::string_view body, std::string_view plain) {
@@ -66,6 +71,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
       CheckPage(pages[at].Body, plainPages[at].Body);
     }
     CheckPage(FrontPage(&game, "1", language).Body, FrontPage(&plain, "1", language).Body);
+    CheckPage(RankingWith(name, language).Body, RankingWith("x", language).Body);
     CheckPage(GamesPage({&game}, language).Body, GamesPage({&plain}, language).Body);
   }
   Require(CleanName(Escaped(name)).size() <= LongestPublicName * 4);

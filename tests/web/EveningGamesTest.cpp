@@ -19,13 +19,15 @@ class Evening : public testing::Test {
     return player;
   }
 
-  bool Take(std::chrono::microseconds played = 1h) {
-    return games.Take({.Game = game,
-                       .Time = "20:15",
-                       .Played = played,
-                       .OfMembers = [](std::int32_t id) { return id == 12 ? "Mole" : ""; },
-                       .OfGuests = [this](int index) { return index == Red0 ? guest : std::string(); }});
+  EveningGames::Scored Scored(std::chrono::microseconds played) const {
+    return {.Game = game,
+            .Time = "20:15",
+            .Played = played,
+            .OfMembers = [](std::int32_t id) { return id == 12 ? "Mole" : ""; },
+            .OfGuests = [this](int index) { return index == Red0 ? guest : std::string(); }};
   }
+  bool Take(std::chrono::microseconds played = 1h) { return games.Take(Scored(played)); }
+  int TakeEarlier() { return games.TakeEarlier(Scored(1h)); }
 
   void Clear() {
     games.ForgetBoard();
@@ -57,6 +59,34 @@ TEST_F(Evening, NumbersItsGamesAsTheyCome) {
   EXPECT_THAT(Numbers(), ElementsAre(1, 2));
   EXPECT_EQ(games.All().at(2).Figures.Number, 2);
   EXPECT_EQ(games.All().at(2).Figures.Time, "20:15");
+}
+
+TEST_F(Evening, BeginsWithTheGamesThatWereKept) {
+  Play(Red0, 10);
+  EXPECT_EQ(TakeEarlier(), 1);
+  Play(Red0, 20);
+  EXPECT_EQ(TakeEarlier(), 2);
+  EXPECT_EQ(games.OnBoard(), 0);
+  EXPECT_TRUE(games.All().at(2).IsPublic);
+  Play(Red0, 30);
+  Take();
+  EXPECT_EQ(games.OnBoard(), 3);
+  EXPECT_FALSE(games.All().at(3).IsPublic);
+}
+
+TEST_F(Evening, KnowsAGameThatWasKept) {
+  Play(Red0, 10);
+  TakeEarlier();
+  EXPECT_EQ(TakeEarlier(), 1);
+  Play(Blue7, 5);
+  Take();
+  EXPECT_EQ(games.OnBoard(), 1);
+  EXPECT_THAT(Numbers(), ElementsAre(1));
+}
+
+TEST_F(Evening, HasNoKeptGameWithoutPlayers) {
+  EXPECT_EQ(TakeEarlier(), 0);
+  EXPECT_TRUE(games.All().empty());
 }
 
 TEST_F(Evening, HasNoGameWithoutPlayers) {
@@ -101,6 +131,38 @@ TEST_F(Evening, TellsGamesApartByAnyGun) {
   Play(Blue7, 6);
   Take();
   EXPECT_THAT(Numbers(), ElementsAre(1, 2));
+}
+
+TEST_F(Evening, TakesNoGameForAnotherBecauseOneGunNotedTheSame) {
+  Play(Red0, 3);
+  Play(Blue7, 5);
+  Take();
+  Clear();
+  Play(Red0, 3);
+  Play(Yellow3, 9);
+  Take();
+  EXPECT_THAT(Numbers(), ElementsAre(1, 2));
+}
+
+TEST_F(Evening, CallsMembersAsTheyAreCalledNow) {
+  Play(Red0, 10);
+  Play(Blue7, 5).MemberIndex = 12;
+  guest = "Ann";
+  Take();
+  const auto nameOf = [this](int gun) {
+    const EveningGame& evening = games.All().at(1);
+    for (std::size_t at = 0; at < evening.Holders.size(); ++at) {
+      if (evening.Figures.Players[at].Gun == gun) {
+        return evening.Holders[at].NickName + evening.Holders[at].GuestName;
+      }
+    }
+    return std::string();
+  };
+  games.NameAnew([](std::int32_t id) { return id == 12 ? " Otter\n" : "nobody"; });
+  EXPECT_EQ(nameOf(Blue7), "Otter");
+  EXPECT_EQ(nameOf(Red0), "Ann");
+  games.NameAnew([](std::int32_t) { return std::string(); });
+  EXPECT_EQ(nameOf(Blue7), "");
 }
 
 TEST_F(Evening, TakesNoGameForAnotherBecauseNobodyShot) {

@@ -2,9 +2,11 @@
 
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <future>
 #include <optional>
 #include <sstream>
+#include <utility>
 
 #include "sim/game/GameMaker.h"
 #include "tests/support/RawHost.h"
@@ -121,6 +123,31 @@ TEST(BaseUnit, GivesTheSameScoresAgainToAHostThatComesBack) {
     EXPECT_EQ(host.Read(Red0.size()), Red0);
     host.Write(Accept);
     EXPECT_TRUE(unit.WaitUntilServed(download, Limit));
+  }
+}
+
+TEST(BaseUnit, HandsOverTheNextGameOnceItHasEnded) {
+  std::atomic_bool hasEnded = false;
+  BaseUnitSettings settings = TwoFrames();
+  settings.NextAnswer = [&hasEnded]() -> std::optional<BaseUnitAnswer> {
+    return hasEnded.exchange(false) ? std::optional(BaseUnitAnswer{.Count = 1, .Frames = {Red0}})
+                                    : std::nullopt;
+  };
+  BaseUnit unit(std::move(settings));
+  RawHost host(unit.DevicePath());
+  host.Write(Request);
+  EXPECT_EQ(host.Read(1 + Blue2.size()).front(), 2);
+  hasEnded = true;  // in the middle of a pull
+  host.Write(Accept);
+  EXPECT_EQ(host.Read(Red0.size()), Red0);
+  host.Write(Accept);
+  ASSERT_TRUE(unit.WaitUntilServed(1, Limit));
+  for (int download = 2; download <= 3; ++download) {
+    host.Write(Request);
+    EXPECT_EQ(host.Read(1), Bytes{1});
+    EXPECT_EQ(host.Read(Red0.size()), Red0);
+    host.Write(Accept);
+    ASSERT_TRUE(unit.WaitUntilServed(download, Limit));
   }
 }
 

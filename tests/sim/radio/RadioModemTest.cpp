@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <atomic>
 #include <future>
 #include <optional>
 #include <sstream>
@@ -227,6 +228,43 @@ TEST(RadioModem, CopiesTheScoresOfEachGunOnceWhenTheyAreClosed) {
   }
   const Bytes expected = TwoGuns()[1].Frame + TwoGuns()[0].Frame;
   EXPECT_EQ(frames.str(), std::string(expected.begin(), expected.end()));
+}
+
+// A field whose next game is played with Red 2 alone, once it has ended.
+RadioModemSettings FieldOfTwoGames(std::atomic_bool& hasEnded) {
+  RadioModemSettings settings = Field();
+  settings.NextGuns = [&hasEnded]() -> std::optional<std::vector<RadioGun>> {
+    std::vector<RadioGun> next = TwoGuns();
+    std::erase_if(next, [](const RadioGun& gun) { return gun.PlayerId != 0x22; });
+    return hasEnded.exchange(false) ? std::optional(next) : std::nullopt;
+  };
+  return settings;
+}
+
+TEST(RadioModem, HandsOverTheNextGameFromTheNextSearchOn) {
+  std::atomic_bool hasEnded = true;
+  RadioModem modem(FieldOfTwoGames(hasEnded));
+  RawHost host(modem.DevicePath());
+  host.Write(CloseBlue0);
+  EXPECT_EQ(host.Read(ClosedBlue0.size()), ClosedBlue0);
+  host.Write(SearchRed2);
+  EXPECT_EQ(host.Read(FoundRed2.size()), FoundRed2);
+  host.Write(SearchBlue0);
+  EXPECT_TRUE(host.IsSilent());
+}
+
+TEST(RadioModem, HandsOverNoOtherGameInTheMiddleOfASearch) {
+  std::atomic_bool hasEnded = false;
+  RadioModem modem(FieldOfTwoGames(hasEnded));
+  RawHost host(modem.DevicePath());
+  host.Write(SearchRed2);
+  EXPECT_EQ(host.Read(FoundRed2.size()), FoundRed2);
+  hasEnded = true;
+  host.Write(SearchBlue0 + CloseBlue0);
+  EXPECT_EQ(host.Read(FoundBlue0.size()), FoundBlue0);
+  EXPECT_EQ(host.Read(ClosedBlue0.size()), ClosedBlue0);
+  host.Write(SearchBlue0);
+  EXPECT_TRUE(host.IsSilent());
 }
 
 TEST(RadioModem, RefusesTroubleForAGunThatIsNotThere) {

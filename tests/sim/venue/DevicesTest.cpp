@@ -40,6 +40,7 @@ class EveryDevice : public testing::TestWithParam<DeviceEntry> {
     const std::vector<GunScores> game = MakeGame(2, 1);
     return GetParam().Start({.Options = options,
                              .Game = game,
+                             .NextGame = [] { return std::nullopt; },
                              .LinePace = Pace::Fast,
                              .Log = [] { return nullptr; },
                              .File = [](std::string_view) { return nullptr; },

@@ -36,6 +36,7 @@ TEST(VenueOptions, StandForAFaultlessGameOfFortyWhenNoneIsGiven) {
   const DeviceOptions& modem = options.Of("radio");
   EXPECT_EQ(options.Players, 40);
   EXPECT_EQ(options.Seed, 1U);
+  EXPECT_EQ(options.Evening, std::chrono::seconds(0));
   EXPECT_FALSE(options.Fast);
   EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::None);
   EXPECT_EQ(unit.Place, 1U);
@@ -60,11 +61,13 @@ TEST(VenueOptions, StandForAFaultlessGameOfFortyWhenNoneIsGiven) {
 
 TEST(VenueOptions, TakeEveryOption) {
   const VenueOptions options = ParseVenueOptions(
-      {"--players", "224", "--seed", "4294967295", "--fast", "--failure", "wrong-crc", "--at", "7", "--log",
-       "wire.log", "--frames", "f.bin", "--link", "port", "--games", "3", "--until-eof", "--help"});
+      {"--players", "224",       "--seed", "4294967295", "--evening", "90",          "--fast",
+       "--failure", "wrong-crc", "--at",   "7",          "--log",     "wire.log",    "--frames",
+       "f.bin",     "--link",    "port",   "--games",    "3",         "--until-eof", "--help"});
   const DeviceOptions& unit = options.Of("base-unit");
   EXPECT_EQ(options.Players, 224);
   EXPECT_EQ(options.Seed, 4294967295U);
+  EXPECT_EQ(options.Evening, std::chrono::seconds(90));
   EXPECT_TRUE(options.Fast);
   EXPECT_EQ(unit.FailureAs<BaseUnitFailure>(), BaseUnitFailure::WrongCrc);
   EXPECT_EQ(unit.Place, 7U);
@@ -306,6 +309,7 @@ TEST(VenueOptions, AreAllToldByTheHelp) {
   const std::string usage = VenueUsage();
   for (const char* option : {"--players",
                              "--seed",
+                             "--evening",
                              "--fast",
                              "--failure",
                              "--at",

@@ -3,7 +3,11 @@
 #include <gmock/gmock.h>
 #include <signal.h>
 
+#include <span>
+
+#include "sim/game/Evening.h"
 #include "sim/game/GameMaker.h"
+#include "sim/line/Crc.h"
 #include "tests/support/AdapterHost.h"
 
 namespace sim {
@@ -11,6 +15,21 @@ namespace {
 
 namespace fs = std::filesystem;
 using testing::HasSubstr;
+
+// Pulls a game, whichever it is.
+std::vector<Bytes> Pull(const std::string& device) {
+  std::vector<Bytes> frames;
+  RawHost host(device);
+  host.Write({1, 0});
+  for (int left = host.Read(1).at(0); left > 0; --left) {
+    Bytes frame = host.Read(2);
+    const Bytes rest = host.Read(frame.at(0) + 256U * frame.at(1) - 1U);
+    frame.insert(frame.end(), rest.begin(), rest.end());
+    frames.push_back(frame);
+    host.Write({170});
+  }
+  return frames;
+}
 
 TEST_F(VenueProgram, ServesTheGameOfItsSeedAndExitsAfterItsGames) {
   const BaseUnitAnswer answer = MakeBaseUnitAnswer(MakeGame(12, 77));
@@ -132,6 +151,7 @@ TEST_F(VenueProgram, RefusesBadOptionsWithAMessage) {
       {"--players", "225"},
       {"--failure", "fire"},
       {"--nonsense"},
+      {"--evening", "86401"},
       {"--failure", "wrong-crc", "--at", "41"},
       {"--failure", "wrong-crc", "--at", "0"},
       {"--onewire", "--onewire-failure", "contact-lost", "--onewire-at", "65"},
@@ -153,6 +173,40 @@ TEST_F(VenueProgram, SaysWhenItCannotWriteAFile) {
   VenueProcess venue({"--log", File("missing/log")});
   EXPECT_EQ(venue.WaitForExit(), 1);
   EXPECT_THAT(venue.RestOfErrors(), HasSubstr("missing/log"));
+}
+
+TEST_F(VenueProgram, PlaysAnEveningOfGames) {
+  const Evening evening(5, 77, std::chrono::seconds(1));
+  VenueProcess venue({"--players", "5", "--seed", "77", "--fast", "--evening", "1"});
+  const std::string device = venue.ReadDevice();
+  for (int pull = 1; pull <= 3; ++pull) {
+    const std::string told = venue.ReadLine();
+    ASSERT_THAT(told, testing::StartsWith("game "));
+    // On a busy machine another one has ended since that line.
+    const std::vector<Bytes> pulled = Pull(device);
+    int number = std::stoi(told.substr(5));
+    const int first = number;
+    while (number < first + 60 && MakeBaseUnitAnswer(evening.Game(number)).Frames != pulled) {
+      ++number;
+    }
+    EXPECT_LT(number, first + 60) << "after \"" << told << '"';
+    EXPECT_GT(first, pull);
+  }
+}
+
+TEST_F(VenueProgram, PlaysAnEveningWithAFailureInEachOfItsGames) {
+  const Evening evening(3, 1, std::chrono::seconds(1));
+  VenueProcess venue({"--players", "3", "--fast", "--evening", "1", "--failure", "wrong-crc", "--at", "2"});
+  const std::string device = venue.ReadDevice();
+  EXPECT_THAT(venue.ReadLine(), testing::StartsWith("game "));
+  const std::vector<Bytes> pulled = Pull(device);
+  ASSERT_EQ(pulled.size(), 3U);
+  const auto hasGoodCheck = [](const Bytes& frame) {
+    return Crc8(std::span(frame).first(frame.size() - 1)) == frame.back();
+  };
+  EXPECT_TRUE(hasGoodCheck(pulled[0]));
+  EXPECT_FALSE(hasGoodCheck(pulled[1]));
+  EXPECT_TRUE(hasGoodCheck(pulled[2]));
 }
 
 TEST_F(VenueProgram, ExplainsItself) {
