@@ -4,7 +4,6 @@
 #include <utility>
 
 #include "archive/ArchiveQueries.h"
-#include "archive/DeletedGames.h"
 #include "archive/KeepingFailure.h"
 #include "core/game/WordDigest.h"
 #include "platform/RuntimeError.h"
@@ -98,6 +97,7 @@ void GameKeeper::Forget() {
   formerPulls_ = 0;
   opening_.reset();
   lastStateIsElse_ = false;
+  forgotten_ = {};
   // A game that is cleared in the middle of a pull goes on with the guns that are still to come.
 }
 
@@ -134,8 +134,7 @@ void GameKeeper::BeginPull(GameSource source) {
   scoresPending_ = true;
 }
 
-template <typename Action>
-void GameKeeper::Try(const Action& action) {
+void GameKeeper::Try(const std::function<void()>& action) {
   if (ended_ || keeping_) {
     return;
   }
@@ -192,18 +191,29 @@ void GameKeeper::Keep() {
     SeeWhetherItWorksAgain();
     return;
   }
-  if (!scoresPending_) {
-    KeepAs(parts_.Session.Game());
-    return;
+  if (membersUnchecked_) {
+    Try([this] { CheckUnchecked(); });
   }
-  // The board shows the guns that came in when the pull is over, not before.
+  if (!membersUnchecked_) {
+    const std::optional<Game> copy = CopyToKeep();
+    KeepAs(copy ? *copy : parts_.Session.Game());
+  }
+}
+
+std::optional<Game> GameKeeper::CopyToKeep() {
+  if (!scoresPending_ && forgotten_.AreNone()) {
+    return std::nullopt;
+  }
   Game copy = parts_.Session.Game();
-  try {
-    copy = parts_.Session.ScoredCopy();
-  } catch (const RuntimeError&) {
-    // Then the game is kept with the figures that it has.
+  if (scoresPending_) {  // the board shows the guns that came in when the pull is over, not before
+    try {
+      copy = parts_.Session.ScoredCopy();
+    } catch (const RuntimeError&) {
+      // Then the game is kept with the figures that it has.
+    }
   }
-  KeepAs(copy);
+  forgotten_.TakeFrom(copy);
+  return copy;
 }
 
 void GameKeeper::KeepAs(const Game& game) {
@@ -260,7 +270,6 @@ bool GameKeeper::Recognise(GameArchive& archive, const Game& game, bool isLoaded
 
 void GameKeeper::Write(const Game& game, const Marks& now) {
   CheckRoom();
-  CheckUnchecked();
   GameArchive archive = Archive();
   const int pulls = pulls_ + (pullBegun_ && (!kept_ || kept_->Raw != now.Raw) ? 1 : 0);
   const bool isLoaded = source_ == GameSource::File && pulls == 0;
@@ -334,42 +343,13 @@ void GameKeeper::LeaveMovedFile() {
 
 void GameKeeper::CloseFile() noexcept {
   copy_.Stop();
+  membersUnchecked_ = membersUnchecked_ || check_;
+  check_.reset();
   file_.Open.reset();
 }
 
 GameArchive GameKeeper::Archive() {
   return {OpenFile(), parts_.Session.DbMembers(), parts_.Strings};
-}
-
-void GameKeeper::CheckMembers() {
-  membersUnchecked_ = true;
-  Try([this] { CheckUnchecked(); });
-}
-
-void GameKeeper::CheckUnchecked() {
-  if (membersUnchecked_ && ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
-    for (const CutMember& cut : Archive().CheckMembers()) {
-      state_.CutGames += cut.Games;
-    }
-  }
-  membersUnchecked_ = false;
-}
-
-void GameKeeper::RemoveDeleted() {
-  Try([this] {
-    if (ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
-      Archive().RemoveDeleted(LastTimeOfRemoved(parts_.Time.Now()));
-    }
-  });
-}
-
-void GameKeeper::NoteMembers() {
-  Try([this] {
-    CheckUnchecked();
-    if (file_.Open) {
-      Archive().Known().NoteChanges();
-    }
-  });
 }
 
 bool GameKeeper::CopyAPart() {

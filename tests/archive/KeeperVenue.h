@@ -55,6 +55,13 @@ class KeeperVenue : public testing::Test {
     session.Game().GameDate = "21/05/2013 14:30";
   }
 
+  /// Checks the members, and cuts to the end what is to be cut.
+  void CheckMembers() {
+    keeper->CheckMembers();
+    while (keeper->CutAPart()) {
+    }
+  }
+
   void Load(const std::string& bytes) {
     session.LoadGame(
         [&](Game& game, const Session::MissionChoice& choose) { return ReadGameFile(bytes, game, choose); });
