@@ -56,6 +56,7 @@ class Site {
     AddFiles();
     std::filesystem::create_directory(path_ / "backups");
     std::filesystem::copy_file(path_ / "games.mdb", path_ / "backups/games-2025-12-31-201530-weekly.mdb");
+    sync();  // or the first step would wait for all of that
   }
   ~Site() { std::filesystem::remove_all(path_); }
   Site(const Site&) = delete;
@@ -128,7 +129,7 @@ bool CheckTheMembers(Site& site) {
 
 bool DeleteOld(Site& site) {
   const auto archive = site.Open();
-  constexpr int atOnce = 10;
+  constexpr int atOnce = 5;
   Breaks breaks;
   for (int step = 0; step < 200; ++step) {
     if (DeleteGamesBefore(*archive, "2022", atOnce) != atOnce) {

@@ -66,7 +66,7 @@ void frmRx::DeleteOldGames() {
 }
 
 bool frmRx::DeleteSomeOldGames() {
-  constexpr int atOnce = 10;  // some 20 milliseconds
+  constexpr int atOnce = 5;  // some 30 milliseconds
   if (oldGamesBefore_.empty()) {
     return false;
   }

@@ -73,7 +73,7 @@ void GameKeeper::NoteMembers() {
 }
 
 bool GameKeeper::RemoveDeleted() {
-  constexpr int atOnce = 10;
+  constexpr int atOnce = 5;
   bool mayHaveMore = false;
   Try([&] {
     if (ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {

@@ -207,14 +207,19 @@ bool ForgetMember::TakeOutOf(Database& database, const std::string& file, Forgot
   return goesOn;
 }
 
-/// Until the file is written anew the numbers stay known, without marks, so that it can be done again.
+/// Until the file is written anew, those who are no members stay known, without marks, so that they can be
+/// chosen again after a stop.
 bool ForgetMember::WriteAnew(Database& database, const std::string& file, const OnStep& onStep) {
   const GamePersons persons = person_->In(file);
   {
     WriteScope scope(database);
     KnownMembers known(database, parts_.DbMembers);
     for (const std::int32_t number : persons.Numbers) {
-      known.Blank(number);
+      if (known.Read({number})[number] == MemberMark{}) {
+        known.Blank(number);
+      } else {
+        known.Forget(number);
+      }
     }
     scope.Commit();
   }
@@ -231,6 +236,7 @@ bool ForgetMember::WriteAnew(Database& database, const std::string& file, const 
       return false;
     }
     parts_.Disk.TakePlace(rewritten.Path(), database.FilePath());
+    Ask(onStep, file, 1);  // a stop comes too late for this file
   }
   const std::unique_ptr<Database> anew = parts_.Engine.OpenDatabase(file);
   WriteScope scope(*anew);

@@ -19,7 +19,7 @@ namespace {
 constexpr int PagesOfAStep = 256;
 constexpr int InstructionsOfAStep = 20000;
 constexpr int InstructionsOfRewriting = 200;  // each may copy a whole game file
-constexpr off_t BytesOfAFlush = off_t{8} << 20;
+constexpr off_t BytesOfAFlush = off_t{2} << 20;
 
 using Handle = std::unique_ptr<sqlite3, decltype(&sqlite3_close)>;
 
@@ -215,10 +215,13 @@ bool RewriteWhole(SqliteConnection& connection, const std::string& path, const K
     }
     throw;
   }
+  if (!step()) {
+    return false;
+  }
   if (!file.Flush()) {
     throw FlushError(path, errno);
   }
-  return true;
+  return step();
 }
 
 bool CheckWhole(SqliteConnection& connection, const KeepOn& keepOn) {

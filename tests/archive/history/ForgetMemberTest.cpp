@@ -5,6 +5,7 @@
 #include <filesystem>
 
 #include "archive/ArchiveFile.h"
+#include "archive/MemberCheck.h"
 #include "platform/linux/LinuxFiles.h"
 #include "tests/archive/history/HistoryVenue.h"
 
@@ -296,6 +297,7 @@ TEST_F(ForgottenMember, IsForgottenInStepsThatTellHowFarItIs) {
 
 TEST_F(ForgottenMember, IsForgottenTheNextTimeWhereverItWasStopped) {
   InMembers("DELETE FROM Members WHERE ContactID = 5");
+  Game.Players(Blue7).MemberIndex = 5;
   for (int i = 0; i < 40; ++i) {
     Archive->Keep(State());
   }
@@ -322,6 +324,24 @@ TEST_F(ForgottenMember, IsForgottenTheNextTimeWhereverItWasStopped) {
     EXPECT_THAT(FilesInData(), ElementsAre("games.mdb", "members.mdb"));
   }
   EXPECT_GE(stops, 6);
+}
+
+TEST_F(ForgottenMember, WhoPlaysAgainAfterAStopStaysInTheNewGames) {
+  Game.Players(Blue7).MemberIndex = 5;
+  for (int i = 0; i < 40; ++i) {
+    Archive->Keep(State());
+  }
+  int stopAt = 1;
+  for (; Query("SELECT count(*) FROM GamePlayers WHERE MemberID = 5") != "0"; ++stopAt) {
+    Forget(5, stopAt);
+  }
+  Open();
+  const std::int64_t game = Archive->Keep(State());
+  const MemberCheck::Parts parts{*ArchiveDatabase, *MembersDatabase, Strings};
+  EXPECT_TRUE(MemberCheck(parts).Strangers().empty());
+  EXPECT_EQ(Query("SELECT max(MemberID) FROM GamePlayers WHERE PlayerIndex = 40 AND GameID = " +
+                  std::to_string(game)),
+            "5");
 }
 
 TEST_F(ForgottenMember, NeedsRoomOnTheDisk) {

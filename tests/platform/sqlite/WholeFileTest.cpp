@@ -123,8 +123,7 @@ TEST_F(WholeDatabaseFile, IsWrittenAnewUntilItIsStopped) {
   file.Execute(
       "WITH RECURSIVE n(i) AS (SELECT 100 UNION ALL SELECT i + 1 FROM n WHERE i < 9000) "
       "INSERT INTO Members (ContactID, Photograph) SELECT i, randomblob(500) FROM n");
-  int asked = 0;
-  EXPECT_FALSE(file.Open()->RewriteTo(Other(), [&asked] { return ++asked < 20; }));
+  EXPECT_FALSE(file.Open()->RewriteTo(Other(), [this] { return ++asked < 20; }));
   EXPECT_EQ(asked, 20);
   EXPECT_EQ(file.Query("SELECT count(*) FROM Members WHERE ContactID < 100"), "4");
 }
