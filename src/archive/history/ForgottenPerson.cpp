@@ -1,9 +1,24 @@
 #include "archive/history/ForgottenPerson.h"
 
+#include <functional>
 #include <utility>
 
 #include "core/game/DallasId.h"
+#include "platform/RuntimeError.h"
 #include "platform/Sql.h"
+
+namespace {
+
+/// What a damaged archive or copy does not tell, the others may; whoever changes it will tell of the damage.
+bool IfReadable(const std::function<bool()>& read) {
+  try {
+    return read();
+  } catch (const RuntimeError&) {
+    return false;
+  }
+}
+
+}  // namespace
 
 ForgottenPerson::ForgottenPerson(std::int32_t number, Database& members)
     : number_(number), members_(members) {
@@ -40,12 +55,15 @@ void ForgottenPerson::Finish() {
   for (bool hasGrown = true; hasGrown;) {
     hasGrown = false;
     for (Archive& archive : archives_) {
-      hasGrown = FindNumbers(archive) || hasGrown;
+      hasGrown = IfReadable([&] { return FindNumbers(archive); }) || hasGrown;
     }
   }
   guestButtons_ = buttons_;
   for (const Archive& archive : archives_) {
-    ReadGuestButtons(archive);
+    IfReadable([&] {
+      ReadGuestButtons(archive);
+      return true;
+    });
     numbers_[archive.Path] = archive.Numbers;
   }
   std::erase_if(guestButtons_, [this](const std::string& button) { return IsOfAnother(button); });

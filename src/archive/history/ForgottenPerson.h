@@ -22,7 +22,7 @@ class ForgottenPerson {
   /// Reads whom an archive or a copy knows; the one in use first. Throws RuntimeError as databases do.
   void Read(const std::string& path, std::unique_ptr<Database> archive);
 
-  /// All are read. Closes them. Throws RuntimeError as databases do.
+  /// All are read. Closes them. Throws RuntimeError as the member table does.
   void Finish();
 
   /// Whom to take out of that file; of one that could not be read, what the others tell.

@@ -272,6 +272,21 @@ TEST_F(ForgottenMember, IsToldOfADamagedArchiveThatCannotBeChanged) {
   EXPECT_EQ(InFiles(Folder / "games-new.mdb"), "");
 }
 
+TEST_F(ForgottenMember, IsToldOfAnArchiveThatIsDamagedInside) {
+  std::filesystem::copy_file(ArchivePath(), Folder / "games-new.mdb");
+  const int page = std::stoi(Query("SELECT rootpage FROM sqlite_master WHERE name = 'GamePlayersByMember'"));
+  constexpr int pageSize = 4096;
+  std::string bytes = ReadFile(ArchivePath());
+  bytes.replace(static_cast<std::size_t>((page - 1) * pageSize), pageSize, pageSize, 'x');
+  WriteFile(ArchivePath(), bytes);
+  ASSERT_TRUE(SetArchiveAside(disk, ArchivePath()));
+  const Forgotten forgotten = Forget();
+  EXPECT_EQ(forgotten.Games, 3);
+  EXPECT_THAT(forgotten.Failures, ElementsAre(HasSubstr("games.mdb still names the member: ")));
+  EXPECT_EQ(InFiles(Folder / "games-new.mdb"), "");
+  EXPECT_TRUE(IsArchiveSetAside(disk, ArchivePath()));
+}
+
 TEST_F(ForgottenMember, GoesFromWhatKilledCommandsLeft) {
   for (const char* left : {"games.mdb.restored", "games-new.mdb.restored", "games.mdb.rewritten",
                            "ranking.html", "backups/games.part"}) {
