@@ -21,7 +21,22 @@ void GameKeeping::Do(void (GameKeeper::*act)()) {
   TellChanges();
 }
 
-bool GameKeeping::CopyAPart() {
+bool GameKeeping::RemoveDeleted() {
+  removing_ = keeper_.RemoveDeleted();
+  TellChanges();
+  return removing_;
+}
+
+bool GameKeeping::CutAPart() {
+  const bool hasMore = keeper_.CutAPart();
+  TellChanges();
+  return hasMore;
+}
+
+bool GameKeeping::DoAPart() {
+  if (CutAPart() || (removing_ && RemoveDeleted())) {
+    return true;
+  }
   const bool hasMore = keeper_.CopyAPart();
   TellChanges();
   return hasMore;

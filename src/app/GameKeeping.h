@@ -28,14 +28,21 @@ class GameKeeping : public QObject {
   void Load(const Game& game, const std::string& missionName, const std::string& fileTime) {
     keeper_.Load(game, missionName, fileTime);
   }
-  /// Removes what was deleted long ago.
-  void RemoveDeleted() { Do(&GameKeeper::RemoveDeleted); }
+  /// Removes some of what was deleted long ago; true if there may be more.
+  bool RemoveDeleted();
   /// The operator may have changed members.
   void NoteMembers() { Do(&GameKeeper::NoteMembers); }
   /// The members may be others, all of them.
   void CheckMembers() { Do(&GameKeeper::CheckMembers); }
-  /// Does a step of the archive's weekly copy; false if there is nothing more to do for now.
-  bool CopyAPart();
+  /// Cuts the numbers of those whom the check found from some past games; true if there is more to do.
+  bool CutAPart();
+  /// How far that is, from 0 to 1.
+  double CutDone() const { return keeper_.CutDone(); }
+  /// The archive forgets these; see GameKeeper::ForgetPersons.
+  void ForgetPersons(const GamePersons& persons) { keeper_.ForgetPersons(persons); }
+  /// Does a step of what there is to do in the archive while nobody waits: of a check, of the removal of
+  /// deleted games, of the weekly copy. False if there is nothing more to do for now.
+  bool DoAPart();
   const KeptState& State() const { return keeper_.State(); }
 
  protected:
@@ -49,4 +56,5 @@ class GameKeeping : public QObject {
   const std::function<bool()> pulling_;
   const std::function<void(const KeptState& state)> tell_;
   KeptState told_;
+  bool removing_ = false;  ///< there may be more deleted games to remove
 };

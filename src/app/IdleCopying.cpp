@@ -38,7 +38,7 @@ std::chrono::milliseconds IdleCopying::Look() {
   if (parts_.Elapsed.Elapsed() - lastInput_ < QuietTime || parts_.Busy()) {
     return BetweenLooks;
   }
-  return parts_.CopyAPart() ? BetweenSteps : std::chrono::milliseconds(BetweenCopies);
+  return parts_.DoAPart() ? BetweenSteps : std::chrono::milliseconds(BetweenCopies);
 }
 
 void IdleCopying::End() {

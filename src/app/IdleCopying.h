@@ -7,12 +7,13 @@
 
 #include "platform/MonotonicClock.h"
 
-/// Has the archive's weekly copy made, step by step, while the operator leaves the program alone.
+/// Has the archive's long work done, its weekly copy above all, step by step, while the operator leaves the
+/// program alone.
 class IdleCopying : public QObject {
  public:
   struct Parts {
-    std::function<bool()> CopyAPart;  ///< does a step; false if there is nothing more to do for now
-    std::function<bool()> Busy;       ///< true while a command or a window waits for the operator
+    std::function<bool()> DoAPart;  ///< does a step; false if there is nothing more to do for now
+    std::function<bool()> Busy;     ///< true while a command or a window waits for the operator
     const MonotonicClock& Elapsed;
   };
 

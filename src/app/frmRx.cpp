@@ -78,9 +78,10 @@ bool frmRx::FormLoad() {
   SetUpDesk();
   SetUpKeeping();
   SetUpAudience();
-  idleCopying_.emplace(IdleCopying::Parts{.CopyAPart = [this] { return keeping_->CopyAPart(); },
-                                          .Busy = [this] { return downloading_ || IsBusy(); },
-                                          .Elapsed = services_.Elapsed});
+  idleCopying_.emplace(
+      IdleCopying::Parts{.DoAPart = [this] { return DeleteSomeOldGames() || keeping_->DoAPart(); },
+                         .Busy = [this] { return downloading_ || IsBusy(); },
+                         .Elapsed = services_.Elapsed});
   TellNewVersion();
   SetUpResults();
   // Not before the window is shown.
@@ -149,11 +150,14 @@ void frmRx::SetUpKeeping() {
                         .UserDataFolder = userDataFolder_,
                         .ProgramFolder = services_.Places.Program()},
       [this] { return downloading_; }, [this](const KeptState& state) { desk_->TellKeeping(state); });
+  DeleteRankingPage();  // a killed run may have left it
   // Not before the window is shown.
   QTimer::singleShot(0, &*keeping_, [this] {
-    keeping_->CheckMembers();
-    keeping_->RemoveDeleted();
-    commands_.Run([this] { DeleteOldGames(); });
+    commands_.Run([this] {
+      CheckMembers();
+      keeping_->RemoveDeleted();
+      DeleteOldGames();
+    });
   });
 }
 
@@ -293,6 +297,7 @@ void frmRx::closeEvent(QCloseEvent* event) {
   }
   if (desk_) {
     idleCopying_->End();
+    DeleteRankingPage();
     keeping_->End();
     archive_->Close();
     desk_->End();

@@ -129,8 +129,18 @@ class frmRx : public QMainWindow {
   /// The history of a member, or of the first one for 0, in front of a window.
   void ShowHistoryOf(std::int32_t member, QWidget* parent);
   void ShowRankings();
-  /// Deletes games that are older than the settings say. Asks the first time.
+  /// Deletes games that are older than the settings say: some now, the others while the window idles. Asks
+  /// the first time.
   void DeleteOldGames();
+  /// True if there may be more of them.
+  bool DeleteSomeOldGames();
+  /// Deletes the page of a ranking that a browser was given to print.
+  void DeleteRankingPage();
+  /// Cuts member numbers that belong to somebody else now from the board and past games; the members may be
+  /// others, all of them.
+  void CheckMembers();
+  /// Goes on with the past games of such a check, until it is done or stopped.
+  void CutNumbers();
   bool MayDeleteOldGames(int years, int games);
   /// Shows the members, starting at `contactToShow` (0 for none). Returns `ContactID` of the one chosen with
   /// OK, or an empty text.
@@ -221,6 +231,7 @@ class frmRx : public QMainWindow {
   std::optional<GameKeeping> keeping_;
   std::optional<ArchiveAccess> archive_;  ///< for windows; the keeper has its own
   std::optional<IdleCopying> idleCopying_;
+  std::string oldGamesBefore_;  ///< time before which games are still to be deleted; else empty
   std::optional<BoardCharts> charts_;
   GuestList guests_;
   std::optional<HiddenNames> hidden_;

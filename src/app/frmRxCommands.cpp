@@ -173,6 +173,7 @@ std::string frmRx::ShowMembers(std::int32_t contactToShow) {
   window.ContactToShow = contactToShow;
   window.exec();
   keeping_->NoteMembers();
+  CutNumbers();
   ShowOtherNames();
   return window.SelectedContact();
 }

@@ -4,6 +4,7 @@
 #include <set>
 #include <utility>
 
+#include "app/WorkProgress.h"
 #include "app/frmRx.h"
 #include "archive/ArchiveCopies.h"
 #include "archive/CopiedArchive.h"
@@ -62,7 +63,7 @@ void frmRx::ImportMemberFile() {
   }
   if (hasImported) {
     session_.Reopen();
-    keeping_->CheckMembers();
+    CheckMembers();
     ShowOtherNames();
   }
 }
@@ -89,6 +90,18 @@ CopyWork::Parts frmRx::CopyParts() const {
           .Folder = BackupFolderIn(userDataFolder_)};
 }
 
+void frmRx::CheckMembers() {
+  keeping_->CheckMembers();
+  CutNumbers();
+}
+
+void frmRx::CutNumbers() {
+  WorkProgress progress({.Window = *this, .Events = services_.Events, .Strings = services_.Strings},
+                        OwnText::CuttingNumbers);
+  while (keeping_->CutAPart() && progress.GoOn(keeping_->CutDone()) && !commands_.CloseRequested()) {
+  }
+}
+
 void frmRx::ShowBackupCopies() {
   std::vector<CopiedDatabase> databases = CopiedDatabases();
   CopiedArchive archive({.Engine = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
@@ -107,7 +120,7 @@ void frmRx::ShowBackupCopies() {
                 .Reopen =
                     [this] {
                       session_.Reopen();
-                      keeping_->CheckMembers();
+                      CheckMembers();
                     }},
                this)
       .exec();
@@ -184,7 +197,7 @@ void frmRx::TakeOverOldInstallation() {
                   session_.ClearPlayerData();
                   session_.Reopen();
                   session_.Factors() = ReadSoldieringFactors(*ini_);
-                  keeping_->CheckMembers();
+                  CheckMembers();
                 },
             .EndProgram = [this] { close(); },
             .ImportGames = [this](const std::string& folder, FilesOfMembers members,

@@ -7,11 +7,11 @@
 #include "app/frmRx.h"
 #include "archive/history/MemberHistoryWindow.h"
 #include "archive/history/OldGames.h"
+#include "archive/history/PrintedRanking.h"
 #include "archive/history/RankingWindow.h"
 #include "core/data/SettingsTable.h"
 #include "core/text/Filled.h"
 #include "platform/RuntimeError.h"
-#include "ui/WaitCursor.h"
 
 void frmRx::ShowMemberHistory() {
   ShowHistoryOf(0, this);
@@ -25,7 +25,10 @@ void frmRx::ShowHistoryOf(std::int32_t member, QWidget* parent) {
                       .DbMembers = session_.DbMembers(),
                       .Strings = services_.Strings,
                       .UserDataFolder = userDataFolder_},
-       .Boxes = services_.Boxes},
+       .Boxes = services_.Boxes,
+       .Events = services_.Events,
+       .Elapsed = services_.Elapsed,
+       .NotToKeep = [this](const GamePersons& persons) { keeping_->ForgetPersons(persons); }},
       member, parent)
       .exec();
 }
@@ -39,7 +42,7 @@ void frmRx::ShowRankings() {
                  .Disk = services_.Disk,
                  .OtherPrograms = services_.OtherPrograms,
                  .Strings = services_.Strings,
-                 .PrintedPage = userDataFolder_ + "/ranking.html"},
+                 .PrintedPage = PrintedRanking(userDataFolder_)},
                 this)
       .exec();
 }
@@ -55,12 +58,34 @@ void frmRx::DeleteOldGames() {
     if (games == 0 || !MayDeleteOldGames(*years, games)) {
       return;
     }
-    const WaitCursor cursor;
-    constexpr int atOnce = 200;
-    while (DeleteGamesBefore(archive_->File(), before, atOnce) == atOnce) {
-    }
+    oldGamesBefore_ = before;
   } catch (const RuntimeError&) {
     // The status line tells of an archive that cannot be used, and the next start tries again.
+  }
+  DeleteSomeOldGames();
+}
+
+bool frmRx::DeleteSomeOldGames() {
+  constexpr int atOnce = 5;  // some 30 milliseconds
+  if (oldGamesBefore_.empty()) {
+    return false;
+  }
+  try {
+    if (DeleteGamesBefore(archive_->File(), oldGamesBefore_, atOnce) == atOnce) {
+      return true;
+    }
+  } catch (const RuntimeError&) {
+    // As above.
+  }
+  oldGamesBefore_.clear();
+  return false;
+}
+
+void frmRx::DeleteRankingPage() {
+  try {
+    DeletePrintedRanking(services_.Disk, userDataFolder_);
+  } catch (const RuntimeError&) {
+    // Its folder cannot be written, which other commands tell; the next start tries again.
   }
 }
 

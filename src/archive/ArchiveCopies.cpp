@@ -5,6 +5,7 @@
 namespace {
 
 constexpr std::string_view ArchiveNames[] = {"games", "games-new"};
+constexpr const char* RewrittenEnding = ".rewritten";
 
 bool IsArchiveName(std::string_view name) {
   return name == ArchiveNames[0] || name == ArchiveNames[1];
@@ -45,6 +46,22 @@ void DeleteUnfinishedArchiveCopies(Files& disk, const std::string& userDataFolde
       }
     }
   }
+}
+
+void DeleteLeftArchives(Files& disk, const std::string& userDataFolder) {
+  const std::string folders[] = {userDataFolder, BackupFolderIn(userDataFolder)};
+  for (const std::string& folder : folders) {
+    for (const std::string& name : disk.FileNames(folder)) {
+      const bool isLeft = name.ends_with(".mdb.restored") || name.ends_with(RewrittenEnding);
+      if (isLeft && name.starts_with(ArchiveNames[0])) {
+        disk.Delete(std::string(folder).append("/").append(name));
+      }
+    }
+  }
+}
+
+std::string RewrittenArchive(const std::string& path) {
+  return path + RewrittenEnding;
 }
 
 std::string UnfinishedWeeklyCopy(const std::string& path, const std::string& userDataFolder) {

@@ -20,5 +20,12 @@ std::vector<std::string> ArchiveCopyPaths(const Files& disk, const std::string& 
 /// while it is being made, which then begins anew. Throws RuntimeError as Files::Delete does.
 void DeleteUnfinishedArchiveCopies(Files& disk, const std::string& userDataFolder);
 
+/// Deletes what a killed restore or Forget This Member left beside the archive and its copies. Throws
+/// RuntimeError as Files::Delete does.
+void DeleteLeftArchives(Files& disk, const std::string& userDataFolder);
+
+/// Where an archive or a copy is written anew, until that takes its place.
+std::string RewrittenArchive(const std::string& path);
+
 /// Where the weekly copy of the archive at `path` is made, until it is whole.
 std::string UnfinishedWeeklyCopy(const std::string& path, const std::string& userDataFolder);

@@ -18,15 +18,13 @@ std::string MarkPath(const std::string& path) {
   return path + ".damaged";
 }
 
+/// In the place of that: the archive stays aside whatever it becomes.
+constexpr const char* MarkOfAny = "any\n";
+
 /// The file's length and header, which holds a count of all its changes.
 std::string MarkOfArchive(const Files& disk, const std::string& path) {
   constexpr std::size_t headerLength = 100;
   return std::to_string(disk.FileLen(path)) + "\n" + disk.ReadPart(path, 0, headerLength);
-}
-
-bool IsSetAside(const Files& disk, const std::string& path) {
-  const std::string mark = MarkPath(path);
-  return disk.FileExists(mark) && disk.Read(mark) == MarkOfArchive(disk, path);
 }
 
 void MakeIfMissing(Files& disk, const std::string& path, const std::string& defaultPath) {
@@ -82,7 +80,7 @@ ArchiveFile OpenArchive(DatabaseEngine& engine, Files& disk, const std::string& 
     return {OpenChecked(engine, disk, fresh, defaultPath), fresh, {}};
   }
   try {
-    if (!usualExists || !IsSetAside(disk, usual)) {
+    if (!usualExists || !IsArchiveSetAside(disk, usual)) {
       return {OpenChecked(engine, disk, usual, defaultPath), usual, {}};
     }
   } catch (const RuntimeError& error) {
@@ -91,6 +89,19 @@ ArchiveFile OpenArchive(DatabaseEngine& engine, Files& disk, const std::string& 
     }
   }
   return {OpenChecked(engine, disk, fresh, defaultPath), fresh, usual};
+}
+
+bool IsArchiveSetAside(const Files& disk, const std::string& path) {
+  const std::string mark = MarkPath(path);
+  if (!disk.FileExists(mark)) {
+    return false;
+  }
+  const std::string text = disk.Read(mark);
+  return text == MarkOfAny || text == MarkOfArchive(disk, path);
+}
+
+void HoldArchiveAside(Files& disk, const std::string& path) {
+  disk.Replace(MarkPath(path), MarkOfAny);
 }
 
 bool SetArchiveAside(Files& disk, const std::string& path) {

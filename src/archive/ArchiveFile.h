@@ -28,3 +28,10 @@ ArchiveFile OpenArchive(DatabaseEngine& engine, Files& disk, const std::string& 
 /// found in use, unless the file is another one by then. No database on it may be open. Returns false, having
 /// done nothing, for one that is already beside another. Throws RuntimeError as Files::Replace does.
 bool SetArchiveAside(Files& disk, const std::string& path);
+
+/// True if OpenArchive leaves the archive at `path` alone. Throws RuntimeError as Files does.
+bool IsArchiveSetAside(const Files& disk, const std::string& path);
+
+/// Leaves an archive that was set aside so while it is being changed, whatever is in it by then. Once no
+/// database on it is open, call SetArchiveAside again. Throws RuntimeError as Files::Replace does.
+void HoldArchiveAside(Files& disk, const std::string& path);

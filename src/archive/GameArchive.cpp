@@ -110,10 +110,10 @@ int GameArchive::Delete(const std::vector<std::int64_t>& games, const std::strin
   return static_cast<int>(deleted);
 }
 
-int GameArchive::RemoveDeleted(const std::string& before) {
+int GameArchive::RemoveDeleted(const std::string& before, int most) {
   Sql& sql = archive_.Statements();
   std::vector<std::int64_t> games;
-  sql.Query("SELECT GameID FROM Games WHERE Deleted < $1", {before},
+  sql.Query("SELECT GameID FROM Games WHERE Deleted < $1 LIMIT $2", {before, std::int64_t{most}},
             [&games](const SqlRow& row) { games.push_back(row.Integer(0)); });
   if (games.empty()) {
     return 0;

@@ -1,11 +1,11 @@
 #pragma once
 
 #include <cstdint>
-#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
 
+#include "archive/GamePersons.h"
 #include "archive/GameRows.h"
 #include "archive/KnownMembers.h"
 #include "archive/PastGame.h"
@@ -73,8 +73,9 @@ class GameArchive {
   /// Undoes Delete, but not where the same game is there in another's place by now: that one and the deleted
   /// one stay as they are. Returns how many are back.
   int BringBack(const std::vector<std::int64_t>& games);
-  /// Removes the games that were deleted before that local time, with their files. Returns how many.
-  int RemoveDeleted(const std::string& before);
+  /// Removes at most `most` of the games that were deleted before that local time, with their files. Returns
+  /// how many.
+  int RemoveDeleted(const std::string& before, int most);
 
   /// The bytes of the game's file. An earlier state counts from 1, the first; 0 is the last state. Throws
   /// RuntimeError 53 if there is no such file.
@@ -83,16 +84,12 @@ class GameArchive {
   /// How many earlier states of the game have files.
   std::int64_t EarlierStates(std::int64_t gameId);
 
-  /// Cuts the numbers of members that belong to somebody else now from all games and their files, and has the
-  /// member table give out numbers above all that the archive knows. To be called at start, and whenever the
-  /// member table has become another one.
-  std::vector<CutMember> CheckMembers();
+  /// Whether persons are only looked for in games or taken out of them too.
+  enum class Task { Look, TakeOut };
 
-  /// Takes a member's number and button out of all rows and files, those of deleted games and of earlier
-  /// states included, and from what is known of members. A button goes out of games of guests too, but not
-  /// where it is another member's. Returns how many games had the member's number. What was there before can
-  /// still be in unused parts of the file, until Database::Rewrite.
-  int Forget(std::int32_t number);
+  /// True if the rows or the file of any state of a game name one of the persons. What is taken out can still
+  /// be in unused parts of the archive's file, until Database::RewriteTo. Use GamesPass.
+  bool LookForPersons(std::int64_t gameId, const GamePersons& persons, Task task);
 
   KnownMembers& Known() { return known_; }
 
@@ -134,11 +131,8 @@ class GameArchive {
   std::vector<StoredFile> FilesOfDay(const std::string& played, const Game& game, const std::string& mission,
                                      Among among);
   bool StandsElsewhere(std::int64_t gameId);
-  int CutFromGames(std::int32_t number);
-  std::vector<std::string> ButtonsOf(std::int32_t number);
-  /// Changes a player of a file; false if there is nothing to change.
-  using Cut = std::function<bool(Player& player)>;
-  void CutFromFile(const StoredFile& file, const Cut& cut);
+  bool LookIntoFile(const StoredFile& file, const GamePersons& persons, Task task);
+  bool LookIntoRows(std::int64_t gameId, const GamePersons& persons, Task task);
   RuntimeError NoFile(std::int64_t gameId) const;
   RuntimeError Damaged(const std::string& name) const;
   RuntimeError TooLarge(const std::string& name) const;

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "archive/DeletedGames.h"
+#include "archive/ArchiveQueries.h"
 #include "archive/KeepingFailure.h"
 #include "core/game/WordDigest.h"
 #include "platform/RuntimeError.h"
@@ -95,6 +95,7 @@ void GameKeeper::Forget() {
   inFile_.reset();
   fileTime_.clear();
   lastStateIsElse_ = false;
+  forgotten_ = {};
   // A game that is cleared in the middle of a pull goes on with the guns that are still to come.
 }
 
@@ -165,18 +166,29 @@ void GameKeeper::Keep() {
     SeeWhetherItWorksAgain();
     return;
   }
-  if (!scoresPending_) {
-    KeepAs(parts_.Session.Game());
-    return;
+  if (membersUnchecked_) {
+    Try([this] { CheckUnchecked(); });
   }
-  // The board shows the guns that came in when the pull is over, not before.
+  if (!membersUnchecked_) {
+    const std::optional<Game> copy = CopyToKeep();
+    KeepAs(copy ? *copy : parts_.Session.Game());
+  }
+}
+
+std::optional<Game> GameKeeper::CopyToKeep() {
+  if (!scoresPending_ && forgotten_.AreNone()) {
+    return std::nullopt;
+  }
   Game copy = parts_.Session.Game();
-  try {
-    copy = parts_.Session.ScoredCopy();
-  } catch (const RuntimeError&) {
-    // Then the game is kept with the figures that it has.
+  if (scoresPending_) {  // the board shows the guns that came in when the pull is over, not before
+    try {
+      copy = parts_.Session.ScoredCopy();
+    } catch (const RuntimeError&) {
+      // Then the game is kept with the figures that it has.
+    }
   }
-  KeepAs(copy);
+  forgotten_.TakeFrom(copy);
+  return copy;
 }
 
 void GameKeeper::KeepAs(const Game& game) {
@@ -211,7 +223,6 @@ void GameKeeper::CheckRoom() const {
 
 void GameKeeper::Write(const Game& game, const Marks& now) {
   CheckRoom();
-  CheckUnchecked();
   GameArchive archive = Archive();
   const int pulls = pulls_ + (pullBegun_ && (!kept_ || kept_->Raw != now.Raw) ? 1 : 0);
   const bool isLoaded = source_ == GameSource::File && pulls == 0;
@@ -282,45 +293,13 @@ void GameKeeper::LeaveMovedFile() {
 
 void GameKeeper::CloseFile() noexcept {
   copy_.Stop();
+  membersUnchecked_ = membersUnchecked_ || check_;
+  check_.reset();
   file_.Open.reset();
 }
 
 GameArchive GameKeeper::Archive() {
   return {OpenFile(), parts_.Session.DbMembers(), parts_.Strings};
-}
-
-void GameKeeper::CheckMembers() {
-  membersUnchecked_ = true;
-  Try([this] { CheckUnchecked(); });
-}
-
-void GameKeeper::CheckUnchecked() {
-  if (membersUnchecked_ && ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
-    CheckRoom();
-    for (const CutMember& cut : Archive().CheckMembers()) {
-      state_.CutGames += cut.Games;
-    }
-  }
-  membersUnchecked_ = false;
-}
-
-void GameKeeper::RemoveDeleted() {
-  Try([this] {
-    if (ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
-      CheckRoom();
-      Archive().RemoveDeleted(LastTimeOfRemoved(parts_.Time.Now()));
-    }
-  });
-}
-
-void GameKeeper::NoteMembers() {
-  Try([this] {
-    CheckUnchecked();
-    if (ArchiveExists(parts_.Disk, parts_.UserDataFolder)) {
-      CheckRoom();
-      Archive().Known().NoteChanges();
-    }
-  });
 }
 
 bool GameKeeper::CopyAPart() {

@@ -10,6 +10,8 @@
 #include "archive/ArchiveFile.h"
 #include "archive/ArchiveRoom.h"
 #include "archive/GameArchive.h"
+#include "archive/GamePersons.h"
+#include "archive/MemberCheck.h"
 #include "archive/WeeklyCopy.h"
 #include "core/game/GameProgress.h"
 #include "core/game/Session.h"
@@ -72,13 +74,25 @@ class GameKeeper {
   /// loading alone changes nothing of it. To be called once the session has cleared the board.
   void Load(const Game& game, const std::string& missionName, const std::string& fileTime);
 
-  /// Removes the games that were deleted so long ago that they cannot be brought back. Does nothing without
-  /// an archive.
-  void RemoveDeleted();
+  /// Removes some of the games that were deleted so long ago that they cannot be brought back. Returns true
+  /// if there may be more. Does nothing without an archive.
+  bool RemoveDeleted();
 
-  /// Cuts the numbers of members that belong to somebody else now from all past games. To be called at start,
-  /// and when the members have been replaced as a whole. Does nothing without an archive.
+  /// Finds the numbers of members that belong to somebody else now, and takes them from the players on the
+  /// board; CutAPart then cuts them from past games. To be called at start, and when the members have been
+  /// replaced as a whole. After a failure it is done before anything else is kept. Does nothing without an
+  /// archive.
   void CheckMembers();
+
+  /// Cuts them from some past games, in some 50 milliseconds. Returns true if there is more to do, and false
+  /// after a failure: the next check begins anew then.
+  bool CutAPart();
+  /// How far that is, from 0 to 1.
+  double CutDone() const { return check_ ? check_->Done() : 1; }
+
+  /// The archive forgets these persons: while the present game is on the board, it is kept without them. The
+  /// board keeps them.
+  void ForgetPersons(const GamePersons& persons);
 
   /// Notes what now tells the known members apart. To be called after the operator may have changed members.
   void NoteMembers();
@@ -136,8 +150,13 @@ class GameKeeper {
   /// Closes the file if it is no longer the one at its path. What is in that one must be seen.
   void LeaveMovedFile();
   void CheckRoom() const;
-  /// Checks the members if that is still to be done: noting those of today would make others of the known.
+  /// Begins to check the members if that is still to be done: noting those of today would make others of the
+  /// known.
   void CheckUnchecked();
+  void TakeFromBoard(const GamePersons& persons);
+  MemberCheck::Parts CheckParts();
+  /// The game on the board as it is to be kept, if that is not just as it is there.
+  std::optional<Game> CopyToKeep();
   void SeeWhetherItWorksAgain();
   /// True if another archive takes the place of the one that failed so.
   bool SetAside(const RuntimeError& failure);
@@ -166,6 +185,8 @@ class GameKeeper {
   bool pullBegun_ = false;        ///< and nothing of it is kept yet
   bool scoresPending_ = false;    ///< guns may have been read since the last calculation
   bool membersUnchecked_ = false;
+  std::optional<MemberCheck> check_;  ///< of the open file, while past games are being cut
+  GamePersons forgotten_;             ///< not to be kept as players of the game on the board
   bool keeping_ = false;
   bool ended_ = false;
   Subscription subscription_;

@@ -1,7 +1,7 @@
 #include "archive/KnownMembers.h"
 
 #include <algorithm>
-
+#include <optional>
 #include <string_view>
 
 #include "archive/Digests.h"
@@ -58,46 +58,59 @@ KnownMembers::Marks KnownMembers::Read(const std::vector<std::int32_t>& numbers)
 }
 
 void KnownMembers::Note(const Marks& marks) {
-  Sql& sql = archive_.Statements();
+  Marks noted;
   for (const auto& [number, mark] : marks) {
-    const SqlValues values{std::int64_t{number}, mark.DallasId, mark.Digest};
-    std::string insertion = "INSERT INTO KnownMembers (MemberID, DallasID, Digest) VALUES ($1, $2, $3) ";
-    insertion += mark == MemberMark{} ? "ON CONFLICT (MemberID) DO NOTHING"
-                                      : "ON CONFLICT (MemberID) DO UPDATE SET DallasID = $2, Digest = $3";
-    sql.Change(insertion, values);
+    std::optional<MemberMark> known;
+    archive_.Statements().Query("SELECT DallasID, Digest FROM KnownMembers WHERE MemberID = $1",
+                                {std::int64_t{number}}, [&known](const SqlRow& row) {
+                                  known = {row.Text(0), row.Text(1)};
+                                });
+    if (!known || (*known != mark && IsSameMember(*known, mark))) {
+      noted[number] = mark;
+    }
+  }
+  Write(noted);
+}
+
+void KnownMembers::Write(const Marks& marks) {
+  for (const auto& [number, mark] : marks) {
+    archive_.Statements().Change(
+        "INSERT INTO KnownMembers (MemberID, DallasID, Digest) VALUES ($1, $2, $3) "
+        "ON CONFLICT (MemberID) DO UPDATE SET DallasID = $2, Digest = $3",
+        {std::int64_t{number}, mark.DallasId, mark.Digest});
   }
 }
 
-void KnownMembers::NoteChanges() {
-  const Marks known = Known();
+void KnownMembers::NoteChanges(const std::set<std::int32_t>& strangers) {
+  const Marks known = All();
   Marks changed;
   for (const auto& [number, mark] : ReadAll(known)) {
     // Who has a number that nobody had when its games were kept did not play them.
-    if (mark != known.at(number) && known.at(number) != MemberMark{}) {
+    if (mark != known.at(number) && known.at(number) != MemberMark{} && !strangers.contains(number)) {
       changed[number] = mark;
     }
   }
   if (!changed.empty()) {
     WriteScope scope(archive_);
-    Note(changed);
+    Write(changed);
     scope.Commit();
   }
 }
 
-std::vector<std::int32_t> KnownMembers::FindStrangers() {
-  const Marks known = Known();
-  std::vector<std::int32_t> strangers;
+std::set<std::int32_t> KnownMembers::FindStrangers() {
+  const Marks known = All();
+  std::set<std::int32_t> strangers;
   Marks changed;
   for (const auto& [number, mark] : ReadAll(known)) {
     if (!IsSameMember(mark, known.at(number))) {
-      strangers.push_back(number);
+      strangers.insert(number);
     } else if (mark != known.at(number)) {
       changed[number] = mark;
     }
   }
   if (!changed.empty()) {
     WriteScope scope(archive_);
-    Note(changed);
+    Write(changed);
     scope.Commit();
   }
   return strangers;
@@ -124,6 +137,11 @@ void KnownMembers::Forget(std::int32_t number) {
   archive_.Statements().Change("DELETE FROM KnownMembers WHERE MemberID = $1", {std::int64_t{number}});
 }
 
+void KnownMembers::Blank(std::int32_t number) {
+  archive_.Statements().Change("UPDATE KnownMembers SET DallasID = '', Digest = '' WHERE MemberID = $1",
+                               {std::int64_t{number}});
+}
+
 const std::string& KnownMembers::Key() {
   if (key_.empty()) {
     Sql& sql = archive_.Statements();
@@ -141,7 +159,7 @@ const std::string& KnownMembers::Key() {
   return key_;
 }
 
-KnownMembers::Marks KnownMembers::Known() {
+KnownMembers::Marks KnownMembers::All() {
   Marks known;
   archive_.Statements().Query("SELECT MemberID, DallasID, Digest FROM KnownMembers", {},
                               [&known](const SqlRow& row) {

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <map>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -17,12 +18,6 @@ struct MemberMark {
 
 /// True if both are one member: the same button, or the same names and birth date.
 bool IsSameMember(const MemberMark& one, const MemberMark& other);
-
-/// A member number that belonged to somebody else when games were kept with it.
-struct CutMember {
-  std::int32_t Number = 0;
-  int Games = 0;  ///< which no longer name it, deleted ones included
-};
 
 /// The members whose numbers stand in the archive. Numbers change hands with a new members file, with one
 /// brought back or taken over, and with another venue's: what an old game says must not then be told of
@@ -40,17 +35,22 @@ class KnownMembers {
   /// both databases; makes the archive's key if it has none yet.
   Marks Read(const std::vector<std::int32_t>& numbers);
 
-  /// Notes marks that were read, unless a member is known already and the mark is empty: who was deleted
-  /// stays known. Call it within the group of writes that keeps their game.
+  /// Notes marks that were read, unless the number is known already as nobody's or somebody else's: who was
+  /// deleted stays known, and who had the number before, until that was checked. Call it within the group of
+  /// writes that keeps their game.
   void Note(const Marks& marks);
 
-  /// Notes what the member table says now about all known numbers. To be called after the operator has
-  /// changed members, so that a new name and then a new button do not make somebody else of a member.
-  void NoteChanges();
+  /// Notes what the member table says now about all known numbers but `strangers`. To be called after the
+  /// operator has changed members, so that a new name and then a new button do not make somebody else of a
+  /// member.
+  void NoteChanges(const std::set<std::int32_t>& strangers = {});
 
   /// The known numbers that belong to somebody else now. Those who only changed their name or their button
   /// are noted anew.
-  std::vector<std::int32_t> FindStrangers();
+  std::set<std::int32_t> FindStrangers();
+
+  /// All known numbers.
+  Marks All();
 
   /// From now on new members get numbers that no game has.
   void RaiseCounter();
@@ -62,9 +62,12 @@ class KnownMembers {
   /// Takes the number out of the known ones.
   void Forget(std::int32_t number);
 
+  /// Keeps the number without a mark, as if nobody had had it.
+  void Blank(std::int32_t number);
+
  private:
   const std::string& Key();
-  Marks Known();
+  void Write(const Marks& marks);
   Marks ReadAll(const Marks& known);
 
   Database& archive_;

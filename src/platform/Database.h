@@ -151,9 +151,10 @@ class Database {
   /// Looks through the whole file. False if it was stopped. Throws RuntimeError 3343 for a damaged file.
   virtual bool CheckWhole(const KeepOn& keepOn) = 0;
 
-  /// Writes the whole file anew, so that nothing stays in it of rows that were deleted or changed. Throws
-  /// RuntimeError 3xxx like a write; needs free space for another such file.
-  virtual void Rewrite() = 0;
+  /// Writes all rows anew to a new file at `path`, in which nothing stays of rows that were deleted or
+  /// changed; durable on return. False if it was stopped: the file is partial then, as after a failure.
+  /// Throws RuntimeError 3xxx like a write. May not be called within a group.
+  virtual bool RewriteTo(const std::string& path, const KeepOn& keepOn) = 0;
 
   /// Names of a table's columns, in its order. Throws RuntimeError 3078 if there is no such table.
   virtual std::vector<std::string> ColumnNames(const std::string& table) = 0;

@@ -73,6 +73,23 @@ TEST_F(RestoreInTheProgram, BringsBackMembersAndTheBoardIsRight) {
   EXPECT_EQ(venue.QueryDatabase("members.mdb", "SELECT TotalGamesPlayed FROM Members"), "1");
 }
 
+TEST_F(RestoreInTheProgram, TakesANumberThatIsSomebodyElsesFromTheBoardAndFromPastGames) {
+  CopyNow();
+  venue.LoadGame(GameFile(PlayerOf(1, "<MemberIndex>4</MemberIndex>")));
+  ASSERT_EQ(venue.QueryDatabase("games.mdb", "SELECT MemberID FROM GamePlayers"), "4");
+  venue.ChangeDatabase("backups/members-2013-05-21-143005-kept.mdb",
+                       "UPDATE Members SET FirstName = 'Eve', LastName = 'Moss'");
+  Restore(QStringLiteral("members-2013-05-21-143005-kept.mdb"));
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT MemberID FROM GamePlayers"), "0");
+  EXPECT_THAT(venue.Row("ScoreDisplay", 0)[1], testing::Not(testing::HasSubstr("Eve")));
+  // And what changes on the board later does not bring it back.
+  venue.ActiveMission().setCurrentIndex(1);
+  emit venue.ActiveMission().activated(1);
+  venue.Trigger("mnuClearScores");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT max(MemberID) FROM GamePlayers"), "0");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "1");
+}
+
 TEST_F(RestoreInTheProgram, KeepsTheChosenMissionByItsName) {
   venue.ActiveMission().setCurrentIndex(3);
   const QString chosen = venue.ActiveMission().currentText();

@@ -25,7 +25,7 @@ class CopyingWhileIdle : public testing::Test {
   int steps = 0;
   bool busy = false;
   QObject window;
-  IdleCopying copying{{.CopyAPart =
+  IdleCopying copying{{.DoAPart =
                            [this] {
                              ++steps;
                              return --stepsLeft > 0;

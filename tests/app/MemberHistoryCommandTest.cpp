@@ -86,6 +86,10 @@ TEST_F(HistoryCommands, ForgetAMemberButNotOnTheBoard) {
   EXPECT_EQ(forget.Runs(), 1);
   EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT max(MemberID) FROM GamePlayers"), "0");
   EXPECT_THAT(venue.Row("ScoreDisplay", 0)[1], HasSubstr("Red"));
+  // And the archive stays without, whatever becomes of the game on the board.
+  venue.Trigger("mnuCommitGame");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT sum(Committed) FROM Games"), "1");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT max(MemberID) FROM GamePlayers"), "0");
 }
 
 TEST_F(HistoryCommands, ShowNothingWithoutAnArchiveAndMakeNone) {
@@ -110,6 +114,15 @@ TEST_F(HistoryCommands, RankTheMembers) {
   EXPECT_EQ(look.Runs(), 1);
   ASSERT_EQ(venue.Started.Started.size(), 1U);
   EXPECT_EQ(venue.Started.Started[0][1], venue.DataFile("ranking.html"));
+  EXPECT_TRUE(std::filesystem::exists(venue.DataFile("ranking.html")));
+  venue.Window->close();
+  EXPECT_FALSE(std::filesystem::exists(venue.DataFile("ranking.html")));
+}
+
+TEST_F(HistoryCommands, FindNoPageOfARankingThatAKilledRunLeft) {
+  WriteFile(venue.DataFile("ranking.html"), "Ada Byron");
+  venue.Start();
+  EXPECT_FALSE(std::filesystem::exists(venue.DataFile("ranking.html")));
 }
 
 class YearsOfGames : public testing::Test {
@@ -166,6 +179,19 @@ TEST_F(YearsOfGames, GoAfterAQuestionThatIsAskedOnce) {
   Start("keep_years=3");
   EXPECT_EQ(Games(), "2010");
   EXPECT_EQ(Boxes(), 1U);
+}
+
+TEST_F(YearsOfGames, GoInShortSteps) {
+  for (int day = 10; day < 20; ++day) {
+    AddGame("2001-03-" + std::to_string(day) + " 20:00:00");
+  }
+  venue.Boxes.Answers = {BoxAnswer::Yes};
+  Start("keep_years=3");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "7");
+  Start("keep_years=3");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "2");
+  Start("keep_years=3");
+  EXPECT_EQ(Games(), "2010");
 }
 
 TEST_F(YearsOfGames, StayAfterANoWithoutAFurtherQuestion) {

@@ -267,8 +267,8 @@ TEST_F(Deleting, RemovesWhatWasDeletedLongAgoWithItsFiles) {
   access.Archive().KeepAgain(3, State(), FormerState::KeptToo);
   access.Archive().Delete({3}, "2026-12-01 10:00:00");
   access.Archive().Delete({2}, "2026-12-01 10:00:01");
-  EXPECT_EQ(access.Archive().RemoveDeleted("2026-12-01 10:00:00"), 0);
-  EXPECT_EQ(access.Archive().RemoveDeleted("2026-12-01 10:00:01"), 1);
+  EXPECT_EQ(access.Archive().RemoveDeleted("2026-12-01 10:00:00", 10), 0);
+  EXPECT_EQ(access.Archive().RemoveDeleted("2026-12-01 10:00:01", 10), 1);
   EXPECT_THAT(Games(true), ElementsAre(2));
   EXPECT_EQ(Query("SELECT group_concat(name) FROM (SELECT name FROM sqlar ORDER BY name)"),
             "2026-11-21/2015-000001.game.xml,2026-11-21/2015-000002.game.xml");

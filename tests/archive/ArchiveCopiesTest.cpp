@@ -44,4 +44,17 @@ TEST(ArchiveCopies, ThatAreNotWholeAreDeletedAlone) {
               ElementsAre("games-2026-11-14-201500-weekly.mdb", "members.part"));
 }
 
+TEST(ArchiveCopies, AreFreeOfWhatAKilledRestoreLeft) {
+  FakeFiles disk;
+  for (const char* file : {"/data/games.mdb", "/data/games.mdb.restored", "/data/games-new.mdb.restored",
+                           "/data/games.mdb.rewritten", "/data/members.mdb.restored",
+                           "/data/games.mdb.damaged", "/data/backups/games-2026-11-14-201500-weekly.mdb",
+                           "/data/backups/games-2026-11-14-201500-weekly.mdb.rewritten"}) {
+    disk.Put(file, "");
+  }
+  DeleteLeftArchives(disk, "/data");
+  EXPECT_THAT(disk.FileNames("/data"), ElementsAre("games.mdb", "games.mdb.damaged", "members.mdb.restored"));
+  EXPECT_THAT(disk.FileNames("/data/backups"), ElementsAre("games-2026-11-14-201500-weekly.mdb"));
+}
+
 }  // namespace

@@ -120,4 +120,17 @@ TEST_F(OpeningTheArchive, OfAReadOnlyFileLetsItBeReadOnly) {
             3027);
 }
 
+TEST_F(OpeningTheArchive, LeavesOneAsideThatIsChangedWhileItIsHeldAside) {
+  Open();
+  ASSERT_TRUE(SetArchiveAside(disk, usual));
+  EXPECT_TRUE(IsArchiveSetAside(disk, usual));
+  HoldArchiveAside(disk, usual);
+  OtherConnection(usual).Execute("INSERT INTO ArchiveKey VALUES (1, 'mine')");
+  EXPECT_EQ(Open().Path, fresh);
+  SetArchiveAside(disk, usual);
+  EXPECT_EQ(Open().Path, fresh);
+  OtherConnection(usual).Execute("DELETE FROM ArchiveKey");
+  EXPECT_FALSE(IsArchiveSetAside(disk, usual));
+}
+
 }  // namespace

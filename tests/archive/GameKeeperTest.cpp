@@ -256,7 +256,7 @@ TEST_F(Keeper, CutsANumberThatBelongsToSomebodyElseNow) {
   ExecuteSql(venue.MembersFile(),
              "UPDATE Members SET DallasID = 'CD00000000000002', NickName = 'Owl', FirstName = 'Ann'");
   Start();
-  keeper->CheckMembers();
+  CheckMembers();
   EXPECT_EQ(keeper->State().CutGames, 1);
   EXPECT_EQ(Query("SELECT MemberID FROM GamePlayers WHERE PlayerIndex = 1"), "0");
 }
@@ -276,6 +276,8 @@ TEST_F(Keeper, ChecksTheMembersLaterIfTheArchiveIsLocked) {
     other.Execute("ROLLBACK");
   }
   keeper->NoteMembers();
+  while (keeper->CutAPart()) {
+  }
   EXPECT_EQ(keeper->State().CutGames, 1);
   EXPECT_EQ(Query("SELECT MemberID FROM GamePlayers WHERE PlayerIndex = 1"), "0");
 }
@@ -288,7 +290,7 @@ TEST_F(Keeper, KnowsAMemberWhoGotAnotherButtonAndThenAnotherName) {
     ExecuteSql(venue.MembersFile(), std::string("UPDATE Members SET ") + change);
     keeper->NoteMembers();
   }
-  keeper->CheckMembers();
+  CheckMembers();
   EXPECT_EQ(keeper->State().CutGames, 0);
   EXPECT_EQ(Query("SELECT MemberID FROM GamePlayers WHERE PlayerIndex = 1"), "7");
 }

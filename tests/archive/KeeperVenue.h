@@ -49,6 +49,13 @@ class KeeperVenue : public testing::Test {
     session.Game().GameDate = "21/05/2013 14:30";
   }
 
+  /// Checks the members, and cuts to the end what is to be cut.
+  void CheckMembers() {
+    keeper->CheckMembers();
+    while (keeper->CutAPart()) {
+    }
+  }
+
   /// The operator loads a file that was last changed at `fileTime`; empty if that is not known.
   void Load(const std::string& bytes, const std::string& fileTime = {}) {
     session.LoadGame([&](Game& game, const Session::MissionChoice& choose) {

@@ -14,7 +14,6 @@
 #include "platform/qt/QtClock.h"
 #include "ui/Announce.h"
 #include "ui/Text.h"
-#include "ui/WaitCursor.h"
 #include "ui_MemberHistoryWindow.h"
 
 namespace {
@@ -60,7 +59,12 @@ MemberHistoryWindow::MemberHistoryWindow(const Parts& parts, std::int32_t member
   SetTexts();
   SetUpTables();
   ConnectCharts();
-  commands_.Connect(*this, {{ui_->ForgetButton, &MemberHistoryWindow::Forget}});
+  ui_->ForgetProgress->hide();
+  ui_->StopButton->setEnabled(false);
+  commands_.Connect(
+      *ui_->ForgetButton, [this] { Forget(); }, WhileBusy::Ignore);
+  commands_.EndWaits = [this] { stopped_ = true; };
+  connect(ui_->StopButton, &QPushButton::clicked, this, [this] { stopped_ = true; });
   commands_.EscapePresses(*ui_->CloseButton);
   connect(ui_->CloseButton, &QPushButton::clicked, this, &QDialog::reject);
   Load(member);
@@ -83,6 +87,8 @@ void MemberHistoryWindow::SetTexts() {
   ui_->Curve->SetUp(HistoryChart::Kind::Curve, text(OwnText::HistoryCurve), text(OwnText::HistoryKeys));
   ui_->Bars->SetUp(HistoryChart::Kind::Bars, text(OwnText::HistoryBars), text(OwnText::HistoryKeys));
   ui_->ForgetButton->setText(text(OwnText::ForgetButton));
+  ui_->StopButton->setText(text(OwnText::Stop));
+  ui_->ForgetProgress->setAccessibleName(text(OwnText::ForgetButton).remove(u'&'));
   ui_->CloseButton->setText(Text(Strings(), CloseText));
 }
 
@@ -301,31 +307,6 @@ QString MemberHistoryWindow::MonthText(int row, int column) const {
                                ShownAccuracy(month.Accuracy()),
                                std::to_string(month.Damage)};
   return QString::fromStdString(texts[column]);
-}
-
-void MemberHistoryWindow::Forget() {
-  const std::string name = NameOf(shown_);
-  const std::string games = std::to_string(GamesNaming(parts_.Archive(), shown_.Number));
-  if (parts_.Boxes.Show(Filled(Strings().Text(OwnText::ForgetQuestion), {name, games}),
-                        windowTitle().toStdString(), BoxIcon::Question,
-                        BoxButtons::YesNo) != BoxAnswer::Yes) {
-    return;
-  }
-  Forgotten forgotten;
-  {
-    const WaitCursor cursor;
-    forgotten = ForgetMember(parts_.Forgetting).Forget(shown_.Number);
-  }
-  Load(0);
-  if (forgotten.Failures.empty()) {
-    Tell(Filled(Strings().Text(OwnText::MemberForgotten), {std::to_string(forgotten.Games), name}));
-    return;
-  }
-  std::string text;
-  for (const std::string& failure : forgotten.Failures) {
-    text.append(text.empty() ? "" : "\n").append(failure);
-  }
-  parts_.Boxes.Show(text, windowTitle().toStdString(), BoxIcon::Exclamation);
 }
 
 void MemberHistoryWindow::Tell(const std::string& text) {

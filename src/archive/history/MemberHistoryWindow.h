@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QDialog>
+#include <chrono>
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -12,10 +13,13 @@
 #include "archive/history/MemberSessions.h"
 #include "core/text/StringTable.h"
 #include "platform/Database.h"
+#include "platform/EventPump.h"
 #include "platform/MessageBoxes.h"
+#include "platform/MonotonicClock.h"
 #include "ui/Commands.h"
 
 class HistoryRows;
+class RunProgress;
 
 namespace Ui {
 class MemberHistoryWindow;
@@ -32,6 +36,10 @@ class MemberHistoryWindow : public QDialog {
     std::function<Sql&()> Archive;
     ForgetMember::Parts Forgetting;
     MessageBoxes& Boxes;
+    EventPump& Events;
+    const MonotonicClock& Elapsed;
+    /// The game on the board is no longer to be kept with these.
+    std::function<void(const GamePersons& persons)> NotToKeep;
   };
 
   /// Shows this member first; 0 for the first one of the list.
@@ -60,6 +68,11 @@ class MemberHistoryWindow : public QDialog {
   QString MonthText(int row, int column) const;
   std::string NameOf(const ArchivedMember& member) const;
   void Forget();
+  bool MayForget(const std::string& name, int games);
+  void ShowForgotten(const Forgotten& forgotten, const std::string& name);
+  /// Shows how far it is; false if it is to stop.
+  bool ShowStep(const ForgetMember::State& state, RunProgress& progress);
+  void EnableEntries(bool enabled);
   void Tell(const std::string& text);
 
   const Parts parts_;
@@ -72,4 +85,6 @@ class MemberHistoryWindow : public QDialog {
   std::vector<std::size_t> found_;  ///< places in members_ that the list shows
   ArchivedMember shown_;            ///< number 0 for none
   MemberSessions sessions_;
+  std::chrono::microseconds begun_{0};  ///< when the present part of forgetting was
+  bool stopped_ = false;
 };

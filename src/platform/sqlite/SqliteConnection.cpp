@@ -208,12 +208,6 @@ void SqliteConnection::PrepareChange() {
   }
 }
 
-void SqliteConnection::Rewrite() {
-  Rollback();
-  LeaveState();
-  Execute("VACUUM");
-}
-
 // A journal beside the file would be taken for the new file's by whoever opens that next. With the lock held
 // none can come: one that a crash left has been rolled back by then, and only an emptied one may be there.
 void SqliteConnection::HoldWriters() {

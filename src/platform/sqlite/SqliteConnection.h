@@ -51,7 +51,6 @@ class SqliteConnection {
 
   /// See Database::BeforeChange and HoldWriters.
   void BeforeChange(std::function<bool()> action) { beforeChange_ = std::move(action); }
-  void Rewrite();
   void HoldWriters();
   void ReleaseWriters() noexcept;
 

@@ -36,7 +36,9 @@ class SqliteDatabase : public Database {
     return BeginWholeCopy(connection_, path);
   }
   bool CheckWhole(const KeepOn& keepOn) override { return ::CheckWhole(connection_, keepOn); }
-  void Rewrite() override { connection_.Rewrite(); }
+  bool RewriteTo(const std::string& path, const KeepOn& keepOn) override {
+    return RewriteWhole(connection_, path, keepOn);
+  }
   std::vector<std::string> ColumnNames(const std::string& table) override;
   std::string Path() const override { return connection_.Path(); }
   std::string FilePath() const override;

@@ -1,6 +1,9 @@
 #include "platform/sqlite/WholeFile.h"
 
+#include <fcntl.h>
 #include <sqlite3.h>
+#include <sys/stat.h>
+#include <unistd.h>
 
 #include <cerrno>
 #include <memory>
@@ -15,15 +18,18 @@ namespace {
 
 constexpr int PagesOfAStep = 256;
 constexpr int InstructionsOfAStep = 20000;
+constexpr int InstructionsOfRewriting = 200;  // each may copy a whole game file
+constexpr off_t BytesOfAFlush = off_t{2} << 20;
 
 using Handle = std::unique_ptr<sqlite3, decltype(&sqlite3_close)>;
 
 /// Asks during a statement whether to keep on, as long as it exists.
 class StatementWatch {
  public:
-  StatementWatch(sqlite3* database, const KeepOn& keepOn) : database_(database), keepOn_(keepOn) {
+  StatementWatch(sqlite3* database, const KeepOn& keepOn, int instructions = InstructionsOfAStep)
+      : database_(database), keepOn_(keepOn) {
     if (keepOn_) {
-      sqlite3_progress_handler(database_, InstructionsOfAStep, Ask, this);
+      sqlite3_progress_handler(database_, instructions, Ask, this);
     }
   }
   ~StatementWatch() { sqlite3_progress_handler(database_, 0, nullptr, nullptr); }
@@ -43,6 +49,41 @@ class StatementWatch {
   const KeepOn& keepOn_;
   bool stopped_ = false;
 };
+
+/// Flushes a file while it is written, so that no flush takes long.
+class GrowingFile {
+ public:
+  explicit GrowingFile(std::string path) : path_(std::move(path)) {}
+
+  void FlushIfGrown() {
+    struct stat info {};
+    if (stat(path_.c_str(), &info) == 0 && info.st_size - flushed_ >= BytesOfAFlush) {
+      Flush();
+      flushed_ = info.st_size;
+    }
+  }
+  /// False if the disk fails.
+  bool Flush() const {
+    const int file = open(path_.c_str(), O_RDONLY | O_CLOEXEC);
+    const bool isFlushed = file >= 0 && fdatasync(file) == 0;
+    if (file >= 0) {
+      close(file);
+    }
+    return isFlushed;
+  }
+
+ private:
+  const std::string path_;
+  off_t flushed_ = 0;
+};
+
+std::string QuotedText(const std::string& text) {
+  std::string quoted = "'";
+  for (const char character : text) {
+    quoted.append(character == '\'' ? 2 : 1, character);
+  }
+  return quoted.append("'");
+}
 
 class SqliteStepwiseCopy : public StepwiseCopy {
  public:
@@ -156,6 +197,31 @@ bool CopyWhole(SqliteConnection& connection, const std::string& path, const Keep
     return true;
   }
   throw SqliteError(opened, path);
+}
+
+bool RewriteWhole(SqliteConnection& connection, const std::string& path, const KeepOn& keepOn) {
+  connection.Rollback();
+  GrowingFile file(path);
+  const KeepOn step = [&] {
+    file.FlushIfGrown();
+    return !keepOn || keepOn();
+  };
+  const StatementWatch watch(connection.Handle(), step, InstructionsOfRewriting);
+  try {
+    connection.Execute(("VACUUM INTO " + QuotedText(path)).c_str());
+  } catch (const RuntimeError&) {
+    if (watch.Stopped()) {
+      return false;
+    }
+    throw;
+  }
+  if (!step()) {
+    return false;
+  }
+  if (!file.Flush()) {
+    throw FlushError(path, errno);
+  }
+  return step();
 }
 
 bool CheckWhole(SqliteConnection& connection, const KeepOn& keepOn) {

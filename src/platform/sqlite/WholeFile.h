@@ -19,5 +19,8 @@ bool FlushFile(sqlite3* database);
 /// See Database::BeginCopy.
 std::unique_ptr<StepwiseCopy> BeginWholeCopy(SqliteConnection& connection, const std::string& path);
 
+/// See Database::RewriteTo.
+bool RewriteWhole(SqliteConnection& connection, const std::string& path, const KeepOn& keepOn);
+
 /// See Database::CheckWhole.
 bool CheckWhole(SqliteConnection& connection, const KeepOn& keepOn);

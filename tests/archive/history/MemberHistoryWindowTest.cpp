@@ -2,11 +2,14 @@
 
 #include <QLabel>
 #include <QLineEdit>
+#include <QProgressBar>
 #include <QTabWidget>
 
 #include "archive/history/HistoryChart.h"
 #include "charts/ChartTable.h"
+#include "platform/qt/QtEventPump.h"
 #include "tests/archive/history/HistoryWindows.h"
+#include "tests/fakes/FakeEventPump.h"
 #include "tests/support/CaredFor.h"
 
 namespace {
@@ -26,7 +29,10 @@ class HistoryWindow : public HistoryWindows {
                                                   .DbMembers = *MembersDatabase,
                                                   .Strings = *texts,
                                                   .UserDataFolder = Folder.Path()},
-                                   .Boxes = boxes},
+                                   .Boxes = boxes,
+                                   .Events = events,
+                                   .Elapsed = clock,
+                                   .NotToKeep = [this](const GamePersons& persons) { notToKeep = persons; }},
         member, nullptr);
     Show(*window);
     return *window;
@@ -43,6 +49,21 @@ class HistoryWindow : public HistoryWindows {
         .setCurrentIndex(Find<QAbstractItemView>(*window, "MemberTable").model()->index(row, 0));
   }
 
+  /// Runs what is to happen in the middle of the command.
+  class Pump : public QtEventPump {
+   public:
+    std::function<void()> OnEvents;
+    void DoEvents() override {
+      if (OnEvents) {
+        OnEvents();
+      }
+      QtEventPump::DoEvents();
+    }
+  };
+
+  Pump events;
+  FakeEventPump clock;
+  GamePersons notToKeep;
   std::unique_ptr<StringTable> texts;
   std::unique_ptr<MemberHistoryWindow> window;
 };
@@ -151,6 +172,38 @@ TEST_F(HistoryWindow, ForgetsAMemberAfterAQuestion) {
   EXPECT_EQ(Label("MemberLabel"), "Cy Fox (6)");
   EXPECT_EQ(Label("TellLabel"),
             "Forgotten: Bo Ray \"Mole\" (5). Past games that no longer name this member: 5");
+  EXPECT_TRUE(notToKeep.Include(5, ""));
+  EXPECT_TRUE(notToKeep.Include(0, BosButton));
+  EXPECT_FALSE(Find<QPushButton>(*window, "StopButton").isEnabled());
+  EXPECT_FALSE(Find<QProgressBar>(*window, "ForgetProgress").isVisible());
+}
+
+TEST_F(HistoryWindow, StopsForgettingAndTellsWhatIsLeft) {
+  Game.Players(Blue7).MemberIndex = 5;
+  for (int i = 0; i < 600; ++i) {  // more than one look at the clock
+    Archive->Keep(State());
+  }
+  Open();
+  boxes.WhileOpen = [this](const FakeMessageBoxes::Box&) {
+    events.OnEvents = [this] {
+      EXPECT_TRUE(Find<QProgressBar>(*window, "ForgetProgress").isVisible());
+      EXPECT_FALSE(Find<QPushButton>(*window, "ForgetButton").isEnabled());
+      EXPECT_EQ(Label("TellLabel"), "Taking the member out of games.mdb...");
+      ::Press(*window, "StopButton");
+    };
+  };
+  boxes.Answers = {BoxAnswer::Yes};
+  ::Press(*window, "ForgetButton");
+  ASSERT_EQ(boxes.Boxes.size(), 2U);
+  EXPECT_THAT(boxes.Boxes[1].Text, HasSubstr("games.mdb may still name the member"));
+  EXPECT_THAT(boxes.Boxes[1].Text, HasSubstr("Forget This Member again does the rest."));
+  EXPECT_EQ(Label("MemberLabel"), "Bo Ray \"Mole\" (5)");
+  EXPECT_NE(Query("SELECT count(*) FROM GamePlayers WHERE MemberID = 5"), "0");
+  events.OnEvents = nullptr;
+  boxes.WhileOpen = nullptr;
+  ::Press(*window, "ForgetButton");
+  EXPECT_EQ(Query("SELECT count(*) FROM GamePlayers WHERE MemberID = 5"), "0");
+  EXPECT_EQ(Label("MemberLabel"), "Cy Fox (6)");
 }
 
 TEST_F(HistoryWindow, TellsWhatCouldNotBeForgotten) {

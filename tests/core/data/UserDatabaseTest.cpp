@@ -30,7 +30,7 @@ class NoDatabase : public Database {
   }
   std::unique_ptr<StepwiseCopy> BeginCopy(const std::string& /*path*/) override { return nullptr; }
   bool CheckWhole(const KeepOn& /*keepOn*/) override { return true; }
-  void Rewrite() override {}
+  bool RewriteTo(const std::string& /*path*/, const KeepOn& /*keepOn*/) override { return true; }
   std::vector<std::string> ColumnNames(const std::string& /*table*/) override { return {}; }
   std::string Path() const override { return {}; }
   std::string FilePath() const override { return {}; }

@@ -105,21 +105,34 @@ TEST_F(WholeDatabaseFile, IsWrittenAnewWithoutWhatWasDeleted) {
       "PRAGMA secure_delete = OFF; UPDATE Members SET Photograph = CAST('Forget me not' || "
       "hex(randomblob(300000)) AS BLOB); UPDATE Members SET Photograph = NULL");
   ASSERT_NE(ReadFile(file.Path()).find("Forget me not"), std::string::npos);
-  const auto size = std::filesystem::file_size(file.Path());
-  const std::unique_ptr<Database> database = file.Open();
-  const std::unique_ptr<Recordset> rows = database->OpenRecordset("Members");
-  database->Rewrite();
-  EXPECT_EQ(ReadFile(file.Path()).find("Forget me not"), std::string::npos);
-  EXPECT_LT(std::filesystem::file_size(file.Path()), size / 2);
-  EXPECT_EQ(file.Query("SELECT sum(ContactID) FROM Members"), "17");
-  EXPECT_EQ(AllNumbers(*rows), "1 2 5 9 ");
+  const std::string before = ReadFile(file.Path());
+  EXPECT_TRUE(file.Open()->RewriteTo(Other(), always));
+  EXPECT_EQ(ReadFile(Other()).find("Forget me not"), std::string::npos);
+  EXPECT_LT(std::filesystem::file_size(Other()), before.size() / 2);
+  EXPECT_EQ(OtherConnection(Other()).Query("SELECT sum(ContactID) FROM Members"), "17");
+  EXPECT_EQ(ReadFile(file.Path()), before);
+}
+
+TEST_F(WholeDatabaseFile, IsWrittenAnewAtAnyPath) {
+  const std::string path = Other() + "'s copy";
+  EXPECT_TRUE(file.Open()->RewriteTo(path, nullptr));
+  EXPECT_EQ(OtherConnection(path).Query("SELECT count(*) FROM Members"), "4");
+}
+
+TEST_F(WholeDatabaseFile, IsWrittenAnewUntilItIsStopped) {
+  file.Execute(
+      "WITH RECURSIVE n(i) AS (SELECT 100 UNION ALL SELECT i + 1 FROM n WHERE i < 9000) "
+      "INSERT INTO Members (ContactID, Photograph) SELECT i, randomblob(500) FROM n");
+  EXPECT_FALSE(file.Open()->RewriteTo(Other(), [this] { return ++asked < 20; }));
+  EXPECT_EQ(asked, 20);
+  EXPECT_EQ(file.Query("SELECT count(*) FROM Members WHERE ContactID < 100"), "4");
 }
 
 TEST_F(WholeDatabaseFile, IsNotWrittenAnewWhileItIsLocked) {
   OtherConnection other(file.Path());
-  other.Execute("BEGIN IMMEDIATE");
   const std::unique_ptr<Database> database = file.Open();
-  EXPECT_EQ(NumberThrownBy([&] { database->Rewrite(); }), 3050);
+  other.Execute("BEGIN EXCLUSIVE");
+  EXPECT_EQ(NumberThrownBy([&] { database->RewriteTo(Other(), always); }), 3050);
 }
 
 TEST_F(WholeDatabaseFile, IsFoundSound) {

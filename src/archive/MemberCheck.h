@@ -1,0 +1,42 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <set>
+
+#include "archive/GamesPass.h"
+#include "core/text/StringTable.h"
+#include "platform/Database.h"
+
+/// Cuts the numbers of members that belong to somebody else now from all games and their files. To be done at
+/// start, and whenever the member table has become another one. One that is not done to its end is begun anew
+/// by the next check.
+///
+/// All operations throw RuntimeError as the databases do.
+class MemberCheck {
+ public:
+  /// The archive with the members to whom it is compared.
+  struct Parts {
+    Database& Archive;
+    Database& Members;
+    const StringTable& Strings;
+  };
+
+  /// Finds the numbers, and has the member table give out numbers above all that the archive knows.
+  explicit MemberCheck(const Parts& parts);
+
+  const std::set<std::int32_t>& Strangers() const { return pass_.Persons().Numbers; }
+
+  /// Cuts them from some games, with one look at each. True if there is more to do.
+  bool Step(const Parts& parts);
+
+  /// From 0 to 1.
+  double Done() const { return pass_.Done(); }
+  /// How many games so far no longer name a member, deleted ones included.
+  int Games() const { return pass_.Games(); }
+
+ private:
+  void Finish(const Parts& parts);
+
+  GamesPass pass_;
+};
