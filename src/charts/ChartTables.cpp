@@ -8,7 +8,7 @@
 
 namespace {
 
-constexpr int HitColumns = 4;
+constexpr int OwnTeamColumn = 3;
 constexpr int FirstPartColumn = 2;
 
 QVariant SideOf(bool isText) {
@@ -48,7 +48,10 @@ int HitRows::rowCount(const QModelIndex& parent) const {
 }
 
 int HitRows::columnCount(const QModelIndex& parent) const {
-  return parent.isValid() ? 0 : HitColumns;
+  if (parent.isValid()) {
+    return 0;
+  }
+  return matrix_ == nullptr || matrix_->HasTeams() ? OwnTeamColumn + 1 : OwnTeamColumn;
 }
 
 QVariant HitRows::data(const QModelIndex& index, int role) const {
