@@ -7,8 +7,8 @@
 
 #include "platform/sqlite/SqliteConnection.h"
 
-/// Looks through a database file that nobody else uses, a bounded part in each step: every row can be read
-/// with all that it holds, and every index has each row once, under its values.
+/// Looks through a database file that nobody else uses, for some milliseconds in each step: every row can be
+/// read with all that it holds, and every index has each row once, under its values.
 class StepwiseCheck {
  public:
   /// Throws RuntimeError as DatabaseEngine::OpenDatabase does.
@@ -36,5 +36,4 @@ class StepwiseCheck {
   SqliteStatement rows_;
   std::int64_t rowsSeen_ = 0;  ///< in this walk
   std::int64_t rowsOfTable_ = 0;
-  std::size_t bytesSeen_ = 0;  ///< in this step
 };

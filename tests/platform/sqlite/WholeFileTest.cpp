@@ -66,7 +66,7 @@ TEST_F(WholeDatabaseFile, IsCopiedStepByStepWithWhatIsWrittenMeanwhile) {
     rows->SetField("Clan", std::string("late"));
     rows->Update();
     while (!copy->Step()) {
-      ASSERT_LT(++asked, 10);
+      ASSERT_LT(++asked, 100);
     }
   }
   EXPECT_EQ(OtherConnection(Other()).Query("SELECT count(*) FROM Members WHERE Clan = 'late'"), "1");
@@ -85,7 +85,7 @@ TEST_F(WholeDatabaseFile, ThatIsLockedWaitsWithTheNextStepOfItsCopy) {
     other.Execute("ROLLBACK");
   }
   while (!copy->Step()) {
-    ASSERT_LT(++asked, 10);
+    ASSERT_LT(++asked, 100);
   }
   EXPECT_EQ(OtherConnection(Other()).Query("SELECT count(*) FROM Members"), "4");
 }
