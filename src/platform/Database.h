@@ -92,8 +92,9 @@ class StepwiseCopy {
  public:
   virtual ~StepwiseCopy() = default;
 
-  /// Copies and flushes, or looks through, up to a megabyte. True once the copy is whole, durable and found
-  /// sound; then there is no further step. While another program has the file locked a step does nothing.
+  /// Copies and flushes up to a megabyte, or looks through the copy for some milliseconds. True once it is
+  /// whole, durable and found sound; then there is no further step. While another program has the file locked
+  /// no step copies.
   /// Throws RuntimeError 3xxx like a write, and 3343 if the copy is damaged, as the database then is too.
   virtual bool Step() = 0;
 };

@@ -75,7 +75,7 @@ void BackupCopies::SetUpTable() {
   header.setHighlightSections(false);
   header.setDefaultAlignment(Qt::AlignVCenter | Qt::AlignLeft);
   header.setSectionResizeMode(QHeaderView::ResizeToContents);
-  header.setSectionResizeMode(CopyListModel::Made, QHeaderView::Stretch);
+  header.setStretchLastSection(true);
   connect(ui_->CopyTable->selectionModel(), &QItemSelectionModel::selectionChanged, this,
           &BackupCopies::EnableButtons);
 }
