@@ -5,14 +5,10 @@
 
 bool CopiedArchive::IsThere() {
   try {
-    if (!ArchiveExists(parts_.Disk, parts_.UserDataFolder) &&
-        ArchiveCopies(parts_.Disk, parts_.UserDataFolder).empty()) {
-      return false;
-    }
-    InUse();
+    return ArchiveExists(parts_.Disk, parts_.UserDataFolder) ||
+           !ArchiveCopies(parts_.Disk, parts_.UserDataFolder).empty();
+  } catch (const RuntimeError&) {  // whoever opens it is told why that fails
     return true;
-  } catch (const RuntimeError&) {  // the status line tells why games are not kept
-    return false;
   }
 }
 

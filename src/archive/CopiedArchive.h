@@ -17,7 +17,8 @@ class CopiedArchive {
 
   explicit CopiedArchive(Parts parts) : parts_(std::move(parts)) {}
 
-  /// True if there is an archive that can be opened, or a copy from which there could be one again.
+  /// True if there is an archive, though it may be one that cannot be opened, or a copy from which there
+  /// could be one again.
   bool IsThere();
 
   /// For the list of the databases. Valid as long as this object.

@@ -43,8 +43,11 @@ bool WeeklyCopy::Step(Database& archive) {
     }
     Finish(archive.Path());
     return true;
-  } catch (const RuntimeError&) {
+  } catch (const RuntimeError& error) {
     Stop();
+    if (error.Number() == Fault::UnrecognizedDatabase) {
+      throw RuntimeError(error.Number(), parts_.Strings.Text(OwnText::WeeklyCopyDamaged));
+    }
     throw;
   }
 }

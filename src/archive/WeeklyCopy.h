@@ -9,7 +9,7 @@
 #include "platform/Files.h"
 
 /// The archive's own copies: one a week, of which the last two stay. Each is made in many small steps, for
-/// the time in which nobody waits for the program.
+/// the time in which nobody waits for the program, and is looked through before an older one goes.
 class WeeklyCopy {
  public:
   struct Parts {

@@ -8,12 +8,9 @@
 
 namespace {
 
-constexpr int HitColumns = 4;
+constexpr int DamageColumn = 2;
+constexpr int OwnTeamColumn = 3;
 constexpr int FirstPartColumn = 2;
-
-QVariant SideOf(bool isText) {
-  return QVariant(Qt::AlignVCenter | (isText ? Qt::AlignLeft : Qt::AlignRight));
-}
 
 auto OrderOf(const HitCell& cell) {
   return std::tuple(cell.Shooter, cell.Victim);
@@ -43,45 +40,37 @@ std::optional<int> HitRows::RowOf(const HitCell& cell) const {
                                                  : std::nullopt;
 }
 
-int HitRows::rowCount(const QModelIndex& parent) const {
-  return parent.isValid() ? 0 : static_cast<int>(cells_.size());
+int HitRows::Rows() const {
+  return static_cast<int>(cells_.size());
 }
 
-int HitRows::columnCount(const QModelIndex& parent) const {
-  return parent.isValid() ? 0 : HitColumns;
+int HitRows::Columns() const {
+  return matrix_ == nullptr || matrix_->HasTeams() ? OwnTeamColumn + 1 : OwnTeamColumn;
 }
 
-QVariant HitRows::data(const QModelIndex& index, int role) const {
-  constexpr int damageColumn = 2;
-  if (role == Qt::TextAlignmentRole) {
-    return SideOf(index.column() != damageColumn);
-  }
-  if (role != Qt::DisplayRole) {
-    return {};
-  }
-  const HitCell cell = CellOf(index.row());
-  switch (index.column()) {
+bool HitRows::IsText(int column) const {
+  return column != DamageColumn;
+}
+
+QString HitRows::Caption(int column) const {
+  constexpr int damage = 107;
+  const int texts[] = {static_cast<int>(OwnText::WhoHit), static_cast<int>(OwnText::WhoWasHit), damage,
+                       static_cast<int>(OwnText::OwnTeam)};
+  return Text(strings_, texts[column]);
+}
+
+QString HitRows::Cell(int row, int column) const {
+  const HitCell cell = CellOf(row);
+  switch (column) {
     case 0:
       return QString::fromStdString(matrix_->PlayerAt(cell.Shooter).Name);
     case 1:
       return QString::fromStdString(matrix_->PlayerAt(cell.Victim).Name);
-    case damageColumn:
+    case DamageColumn:
       return QString::number(matrix_->Damage(cell.Shooter, cell.Victim));
     default:
       return matrix_->IsOwnTeam(cell.Shooter, cell.Victim) ? Text(strings_, OwnText::OwnTeamYes) : QString();
   }
-}
-
-QVariant HitRows::headerData(int section, Qt::Orientation orientation, int role) const {
-  if (orientation != Qt::Horizontal || (role != Qt::DisplayRole && role != Qt::TextAlignmentRole)) {
-    return {};
-  }
-  if (role == Qt::TextAlignmentRole) {
-    return SideOf(section != 2);
-  }
-  const int texts[] = {static_cast<int>(OwnText::WhoHit), static_cast<int>(OwnText::WhoWasHit), 107,
-                       static_cast<int>(OwnText::OwnTeam)};
-  return Text(strings_, texts[section]);
 }
 
 void ScoreRows::Show(const std::vector<PlayerParts>& players) {
@@ -91,46 +80,34 @@ void ScoreRows::Show(const std::vector<PlayerParts>& players) {
   endResetModel();
 }
 
-int ScoreRows::rowCount(const QModelIndex& parent) const {
-  return parent.isValid() || players_ == nullptr ? 0 : static_cast<int>(players_->size());
+int ScoreRows::Rows() const {
+  return players_ == nullptr ? 0 : static_cast<int>(players_->size());
 }
 
-int ScoreRows::columnCount(const QModelIndex& parent) const {
-  return parent.isValid() ? 0 : FirstPartColumn + static_cast<int>(parts_.size());
+int ScoreRows::Columns() const {
+  return FirstPartColumn + static_cast<int>(parts_.size());
 }
 
-QVariant ScoreRows::data(const QModelIndex& index, int role) const {
-  if (role == Qt::TextAlignmentRole) {
-    return SideOf(index.column() == 0);
-  }
-  if (role != Qt::DisplayRole) {
-    return {};
-  }
-  const PlayerParts& player = players_->at(static_cast<std::size_t>(index.row()));
-  if (index.column() == 0) {
+bool ScoreRows::IsText(int column) const {
+  return column == 0;
+}
+
+QString ScoreRows::Caption(int column) const {
+  constexpr int player = 104;
+  constexpr int soldiering = 105;
+  return column < FirstPartColumn
+             ? Text(strings_, column == 0 ? player : soldiering)
+             : NameOfPart(parts_.at(static_cast<std::size_t>(column - FirstPartColumn)), strings_);
+}
+
+QString ScoreRows::Cell(int row, int column) const {
+  const PlayerParts& player = players_->at(static_cast<std::size_t>(row));
+  if (column == 0) {
     return QString::fromStdString(player.Player.Name);
   }
-  if (index.column() < FirstPartColumn) {
+  if (column < FirstPartColumn) {
     return QString::number(player.Soldiering);
   }
-  const ScorePart part = parts_.at(static_cast<std::size_t>(index.column() - FirstPartColumn));
+  const ScorePart part = parts_.at(static_cast<std::size_t>(column - FirstPartColumn));
   return QString::fromStdString(PointsText(player.Of(part)));
-}
-
-QVariant ScoreRows::headerData(int section, Qt::Orientation orientation, int role) const {
-  if (orientation != Qt::Horizontal) {
-    return {};
-  }
-  if (role == Qt::TextAlignmentRole) {
-    return SideOf(section == 0);
-  }
-  if (role != Qt::DisplayRole) {
-    return {};
-  }
-  if (section < FirstPartColumn) {
-    constexpr int player = 104;
-    constexpr int soldiering = 105;
-    return Text(strings_, section == 0 ? player : soldiering);
-  }
-  return NameOfPart(parts_.at(static_cast<std::size_t>(section - FirstPartColumn)), strings_);
 }

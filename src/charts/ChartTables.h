@@ -1,19 +1,19 @@
 #pragma once
 
-#include <QAbstractTableModel>
 #include <optional>
 #include <vector>
 
+#include "charts/ChartRows.h"
 #include "charts/HitMapPainter.h"
 #include "charts/ScoreParts.h"
 
 /// The hits of a heat map as rows: who hit, who was hit, damage, and whether that was the own team.
-class HitRows : public QAbstractTableModel {
+class HitRows : public ChartRows {
   Q_OBJECT
 
  public:
   /// `strings` must outlive this.
-  HitRows(const StringTable& strings, QObject* parent) : QAbstractTableModel(parent), strings_(strings) {}
+  HitRows(const StringTable& strings, QObject* parent) : ChartRows(parent), strings_(strings) {}
 
   /// `matrix` must stay as it is until the next call.
   void Show(const HitMatrix& matrix);
@@ -22,34 +22,36 @@ class HitRows : public QAbstractTableModel {
   /// The row of a cell; none if there was no hit.
   std::optional<int> RowOf(const HitCell& cell) const;
 
-  int rowCount(const QModelIndex& parent = {}) const override;
-  int columnCount(const QModelIndex& parent = {}) const override;
-  QVariant data(const QModelIndex& index, int role = Qt::DisplayRole) const override;
-  QVariant headerData(int section, Qt::Orientation orientation, int role = Qt::DisplayRole) const override;
-
  private:
+  int Rows() const override;
+  int Columns() const override;
+  bool IsText(int column) const override;
+  QString Caption(int column) const override;
+  QString Cell(int row, int column) const override;
+
   const StringTable& strings_;
   const HitMatrix* matrix_ = nullptr;
   std::vector<HitCell> cells_;
 };
 
 /// The bars of a score chart as rows: player, soldiering, and a column for each part that anyone has.
-class ScoreRows : public QAbstractTableModel {
+class ScoreRows : public ChartRows {
   Q_OBJECT
 
  public:
   /// `strings` must outlive this.
-  ScoreRows(const StringTable& strings, QObject* parent) : QAbstractTableModel(parent), strings_(strings) {}
+  ScoreRows(const StringTable& strings, QObject* parent) : ChartRows(parent), strings_(strings) {}
 
   /// `players` must stay as they are until the next call.
   void Show(const std::vector<PlayerParts>& players);
 
-  int rowCount(const QModelIndex& parent = {}) const override;
-  int columnCount(const QModelIndex& parent = {}) const override;
-  QVariant data(const QModelIndex& index, int role = Qt::DisplayRole) const override;
-  QVariant headerData(int section, Qt::Orientation orientation, int role = Qt::DisplayRole) const override;
-
  private:
+  int Rows() const override;
+  int Columns() const override;
+  bool IsText(int column) const override;
+  QString Caption(int column) const override;
+  QString Cell(int row, int column) const override;
+
   const StringTable& strings_;
   const std::vector<PlayerParts>* players_ = nullptr;
   std::vector<ScorePart> parts_;

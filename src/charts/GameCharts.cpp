@@ -1,6 +1,5 @@
 #include "charts/GameCharts.h"
 
-#include <QBuffer>
 #include <QScrollArea>
 #include <QSplitter>
 #include <filesystem>
@@ -9,24 +8,13 @@
 #include "charts/ChartTables.h"
 #include "charts/HitMap.h"
 #include "charts/PartLook.h"
+#include "charts/PictureFile.h"
 #include "charts/ScoreChart.h"
 #include "core/text/Filled.h"
 #include "ui/Announce.h"
 #include "ui/Text.h"
 #include "ui/WaitCursor.h"
 #include "ui_GameCharts.h"
-
-namespace {
-
-std::string PngOf(const QImage& picture) {
-  QByteArray bytes;
-  QBuffer buffer(&bytes);
-  buffer.open(QIODevice::WriteOnly);
-  picture.save(&buffer, "PNG");
-  return bytes.toStdString();
-}
-
-}  // namespace
 
 GameCharts::GameCharts(const Parts& parts)
     : parts_(parts),
@@ -168,7 +156,8 @@ void GameCharts::SavePicture() {
     }
     const WaitCursor cursor;
     const QString title = QString::fromStdString(title_);
-    parts_.Disk.Replace(file, PngOf(ShowsHits() ? ui_->Map->Picture(title) : ui_->Bars->Picture(title)));
+    const QImage picture = ShowsHits() ? ui_->Map->Picture(title) : ui_->Bars->Picture(title);
+    parts_.Disk.Replace(file, PngOf(picture, parts_.Strings));
     Tell(QString::fromStdString(Filled(parts_.Strings.Text(OwnText::PictureSaved), {file})), true);
   } catch (const RuntimeError& error) {
     parts_.Boxes.Show(Filled(parts_.Strings.Text(OwnText::PictureNotSaved), {error.what()}),

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "charts/ChartKeys.h"
 #include "core/text/Filled.h"
 #include "ui/Text.h"
 
@@ -12,38 +13,18 @@ namespace {
 
 /// Where a key leads from a cell; nothing for any other key.
 std::optional<HitCell> CellByKey(const HitCell& from, const QKeyEvent& key, int size) {
-  constexpr int page = 10;
-  const bool control = key.modifiers().testFlag(Qt::ControlModifier);
-  HitCell cell = from;
-  switch (key.key()) {
-    case Qt::Key_Left:
-      --cell.Victim;
-      break;
-    case Qt::Key_Right:
-      ++cell.Victim;
-      break;
-    case Qt::Key_Up:
-      --cell.Shooter;
-      break;
-    case Qt::Key_Down:
-      ++cell.Shooter;
-      break;
-    case Qt::Key_PageUp:
-      cell.Shooter -= page;
-      break;
-    case Qt::Key_PageDown:
-      cell.Shooter += page;
-      break;
-    case Qt::Key_Home:
-      cell = {control ? 0 : from.Shooter, 0};
-      break;
-    case Qt::Key_End:
-      cell = {control ? size - 1 : from.Shooter, size - 1};
-      break;
-    default:
-      return std::nullopt;
+  const bool isEnd = key.key() == Qt::Key_Home || key.key() == Qt::Key_End;
+  const bool isDown = key.key() == Qt::Key_Up || key.key() == Qt::Key_Down || key.key() == Qt::Key_PageUp ||
+                      key.key() == Qt::Key_PageDown;
+  const std::optional<int> place = isDown ? PlaceByKey(key.key(), from.Shooter, size, ChartOrder::Down)
+                                          : PlaceByKey(key.key(), from.Victim, size, ChartOrder::Across);
+  if (!place) {
+    return std::nullopt;
   }
-  return HitCell{std::clamp(cell.Shooter, 0, size - 1), std::clamp(cell.Victim, 0, size - 1)};
+  if (isEnd && key.modifiers().testFlag(Qt::ControlModifier)) {
+    return HitCell{*place, *place};
+  }
+  return isDown ? HitCell{*place, from.Victim} : HitCell{from.Shooter, *place};
 }
 
 }  // namespace
@@ -131,6 +112,9 @@ QImage HitMap::Picture(const QString& title) const {
   const QSizeF size(std::max(layout.Whole.width(), static_cast<double>(titleWidth)) + 2 * margin,
                     layout.Whole.height() + titleHeight + 2 * margin);
   QImage picture((size * ratio).toSize(), QImage::Format_RGB32);
+  if (picture.isNull()) {  // too large
+    return picture;
+  }
   picture.setDevicePixelRatio(ratio);
   picture.fill(Qt::white);
   QPainter painter(&picture);

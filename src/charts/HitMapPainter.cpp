@@ -158,16 +158,21 @@ void HitMapPainter::DrawNumbers(QPainter& painter, const HitMapLayout& layout) c
   QFont font = font_;
   const double usual = QFontMetricsF(font_).height() * 0.8;
   font.setPixelSize(std::max(static_cast<int>(std::min(layout.Cell * 0.42, usual)), 8));
-  const double width = QFontMetricsF(font).horizontalAdvance(QString::number(matrix_.Most()));
-  if (width + 3 > layout.Cell || QFontMetricsF(font).height() > layout.Cell) {
+  const QFontMetricsF metrics(font);
+  if (metrics.height() > layout.Cell) {
     return;
   }
+  const auto fits = [&](const QString& number) {
+    constexpr double gap = 3;
+    return metrics.horizontalAdvance(number) + gap <= layout.Cell;
+  };
   painter.setFont(font);
   for (int shooter = 0; shooter < matrix_.Size(); ++shooter) {
     for (int victim = 0; victim < matrix_.Size(); ++victim) {
-      if (const std::int32_t damage = matrix_.Damage(shooter, victim); damage > 0) {
+      const std::int32_t damage = matrix_.Damage(shooter, victim);
+      if (const QString number = QString::number(damage); damage > 0 && fits(number)) {
         painter.setPen(InkOn(HeatOf(damage, matrix_.Most())));
-        painter.drawText(layout.Place({shooter, victim}), Qt::AlignCenter, QString::number(damage));
+        painter.drawText(layout.Place({shooter, victim}), Qt::AlignCenter, number);
       }
     }
   }
@@ -191,9 +196,11 @@ double HitMapPainter::KeyWidth() const {
   const QFontMetricsF metrics(font_);
   const double texts = metrics.horizontalAdvance(Text(strings_, 107)) +
                        metrics.horizontalAdvance(QStringLiteral("1")) +
-                       metrics.horizontalAdvance(QString::number(matrix_.Most())) +
-                       metrics.horizontalAdvance(Text(strings_, OwnText::OwnTeam));
-  return texts + KeyBar + LineHeight() + 8 * NameGap;
+                       metrics.horizontalAdvance(QString::number(matrix_.Most()));
+  const double ownTeam = matrix_.HasTeams() ? metrics.horizontalAdvance(Text(strings_, OwnText::OwnTeam)) +
+                                                  LineHeight() + 4 * NameGap
+                                            : 0;
+  return texts + KeyBar + ownTeam + 4 * NameGap;
 }
 
 void HitMapPainter::DrawKey(QPainter& painter, const HitMapLayout& layout) const {
@@ -218,8 +225,18 @@ void HitMapPainter::DrawKey(QPainter& painter, const HitMapLayout& layout) const
   painter.drawRect(QRectF(x, top + 1, KeyBar, line - 2));
   x += KeyBar + NameGap;
   write(QString::number(matrix_.Most()));
+  if (!matrix_.HasTeams()) {
+    return;
+  }
   x += 3 * NameGap;
   const QRectF sample(x, top + 1, line - 2, line - 2);
+  DrawOwnTeamSample(painter, sample, layout);
+  x += sample.width() + NameGap;
+  write(Text(strings_, OwnText::OwnTeam));
+}
+
+void HitMapPainter::DrawOwnTeamSample(QPainter& painter, const QRectF& sample,
+                                      const HitMapLayout& layout) const {
   const QRgb heat = HeatOf(1, 2);
   painter.fillRect(sample, QColor(heat));
   if (layout.CellPixels >= 12) {
@@ -234,6 +251,4 @@ void HitMapPainter::DrawKey(QPainter& painter, const HitMapLayout& layout) const
     painter.setPen(ink_);
   }
   painter.drawRect(sample);
-  x += sample.width() + NameGap;
-  write(Text(strings_, OwnText::OwnTeam));
 }

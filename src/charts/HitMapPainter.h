@@ -54,6 +54,7 @@ class HitMapPainter {
   void DrawNumbers(QPainter& painter, const HitMapLayout& layout) const;
   void DrawLines(QPainter& painter, const HitMapLayout& layout) const;
   void DrawKey(QPainter& painter, const HitMapLayout& layout) const;
+  void DrawOwnTeamSample(QPainter& painter, const QRectF& sample, const HitMapLayout& layout) const;
 
   const HitMatrix& matrix_;
   const StringTable& strings_;

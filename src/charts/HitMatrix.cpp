@@ -16,7 +16,7 @@ std::pair<int, int> TeamAndNumber(const ChartPlayer& player) {
 
 }  // namespace
 
-HitMatrix::HitMatrix(const ChartGame& game) : players_(game.Players) {
+HitMatrix::HitMatrix(const ChartGame& game) : players_(game.Players), hasTeams_(!game.FreeForAll) {
   std::sort(players_.begin(), players_.end(), [](const ChartPlayer& left, const ChartPlayer& right) {
     return TeamAndNumber(left) < TeamAndNumber(right);
   });

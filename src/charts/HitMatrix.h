@@ -28,8 +28,10 @@ class HitMatrix {
   std::int32_t Damage(int shooter, int victim) const {
     return damage_[static_cast<std::size_t>(shooter) * players_.size() + static_cast<std::size_t>(victim)];
   }
+  /// False in a free-for-all: whoever is hit is a foe there, whatever the colour of the gun.
+  bool HasTeams() const { return hasTeams_; }
   /// True if both are on one team; also for a player and themselves.
-  bool IsOwnTeam(int shooter, int victim) const { return TeamAt(shooter) == TeamAt(victim); }
+  bool IsOwnTeam(int shooter, int victim) const { return hasTeams_ && TeamAt(shooter) == TeamAt(victim); }
   /// The highest damage of all; 0 if there was none.
   std::int32_t Most() const { return most_; }
 
@@ -39,4 +41,5 @@ class HitMatrix {
   std::vector<Group> groups_;
   std::vector<std::int32_t> damage_;  ///< a row for each shooter
   std::int32_t most_ = 0;
+  bool hasTeams_ = true;
 };

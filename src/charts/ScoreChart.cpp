@@ -7,6 +7,7 @@
 #include <cmath>
 #include <utility>
 
+#include "charts/ChartKeys.h"
 #include "charts/PartLook.h"
 #include "core/text/Filled.h"
 #include "ui/TeamColours.h"
@@ -26,34 +27,6 @@ std::int64_t SumOfSide(const PlayerParts& player, bool giving) {
     }
   }
   return sum;
-}
-
-std::optional<int> PlaceByKey(int from, int key, int count) {
-  constexpr int page = 10;
-  int place = from;
-  switch (key) {
-    case Qt::Key_Up:
-      --place;
-      break;
-    case Qt::Key_Down:
-      ++place;
-      break;
-    case Qt::Key_PageUp:
-      place -= page;
-      break;
-    case Qt::Key_PageDown:
-      place += page;
-      break;
-    case Qt::Key_Home:
-      place = 0;
-      break;
-    case Qt::Key_End:
-      place = count - 1;
-      break;
-    default:
-      return std::nullopt;
-  }
-  return std::clamp(place, 0, count - 1);
 }
 
 }  // namespace
@@ -212,6 +185,9 @@ QImage ScoreChart::Picture(const QString& title) const {
   QImage picture(
       (QSizeF(barsWidth + 2 * margin, titleHeight + keyHeight + bars + 2 * margin) * ratio).toSize(),
       QImage::Format_RGB32);
+  if (picture.isNull()) {  // too large
+    return picture;
+  }
   picture.setDevicePixelRatio(ratio);
   picture.fill(Qt::white);
   QPainter painter(&picture);
@@ -266,7 +242,8 @@ void ScoreChart::changeEvent(QEvent* event) {
 
 void ScoreChart::keyPressEvent(QKeyEvent* event) {
   if (!players_.empty()) {
-    if (const auto place = PlaceByKey(place_.value_or(0), event->key(), static_cast<int>(players_.size()))) {
+    if (const auto place = PlaceByKey(event->key(), place_.value_or(0), static_cast<int>(players_.size()),
+                                      ChartOrder::Down)) {
       GoTo(*place, true);
       return;
     }

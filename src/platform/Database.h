@@ -87,13 +87,15 @@ using KeepOn = std::function<bool()>;
 
 /// A copy of a database that is being made in steps. Between them the database may be used in any way. What
 /// is written through the same Database meanwhile is in the copy too; a change by anyone else begins it anew.
+/// Once all is copied, the copy itself is looked through in further steps.
 class StepwiseCopy {
  public:
   virtual ~StepwiseCopy() = default;
 
-  /// Copies and flushes up to a megabyte. True once the copy is whole and durable; then there is no further
-  /// step. While another program has the file locked a step does nothing. Throws RuntimeError 3xxx like a
-  /// write.
+  /// Copies and flushes up to a megabyte, or looks through the copy for some milliseconds. True once it is
+  /// whole, durable and found sound; then there is no further step. While another program has the file locked
+  /// no step copies.
+  /// Throws RuntimeError 3xxx like a write, and 3343 if the copy is damaged, as the database then is too.
   virtual bool Step() = 0;
 };
 

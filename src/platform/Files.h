@@ -64,6 +64,10 @@ class Files {
   /// path. Throws as Replace does.
   virtual std::string MakeTempFileName() = 0;
 
+  /// Creates an empty file in `folder`, hidden and under a name that no other file has, for what will then be
+  /// renamed to another one there, and returns its path. Throws as Replace does.
+  virtual std::string MakeFileIn(const std::string& folder) = 0;
+
   /// Writes the whole file in place, neither atomically nor durably: for temporary files. Throws as Replace
   /// does.
   virtual void Write(const std::string& path, const std::string& bytes) = 0;
@@ -74,6 +78,10 @@ class Files {
   /// Bytes that this user may still write on the disk that holds `path`, a file or folder. Throws
   /// RuntimeError 76 if there is no such path.
   virtual std::uint64_t FreeSpace(const std::string& path) const = 0;
+
+  /// True if both paths lead to the same file or folder, be it by symbolic or by hard links. False if one of
+  /// them leads nowhere.
+  virtual bool IsSame(const std::string& path, const std::string& other) const = 0;
 
   /// Names of the files in a folder, in ascending order; none if there is no such folder.
   virtual std::vector<std::string> FileNames(const std::string& folder) const = 0;

@@ -1,27 +1,38 @@
 #include "web/PublicRanking.h"
 
-#include <algorithm>
+#include <cmath>
+#include <map>
 #include <utility>
+
+namespace {
+
+RankedLine LineOf(const RankedPlace& place, std::string name) {
+  const RankedFigures& figures = place.Figures;
+  return {.Place = place.Place,
+          .Name = std::move(name),
+          .Games = figures.Games,
+          .Soldiering = std::llround(figures.Sum),
+          .Best = std::llround(figures.Best.value_or(0)),
+          .Accuracy = figures.Accuracy};
+}
+
+}  // namespace
 
 std::vector<RankedLine> RankedLines(const PublicRanking& ranking,
                                     const std::function<std::string(const NameHolder&)>& nameShown) {
-  std::vector<RankedLine> lines;
+  std::map<std::int32_t, std::string> names;
+  std::vector<RankedFigures> figures;
   for (const RankedHolder& member : ranking.Members) {
     if (std::string name = nameShown(member.Holder); !name.empty()) {
-      lines.push_back({.Name = std::move(name),
-                       .Games = member.Games,
-                       .Soldiering = member.Soldiering,
-                       .Best = member.Best,
-                       .Accuracy = member.Accuracy});
+      names[member.Figures.Member] = std::move(name);
+      figures.push_back(member.Figures);
     }
   }
-  std::ranges::stable_sort(lines, std::greater(), &RankedLine::Soldiering);
-  for (std::size_t at = 0; at < lines.size(); ++at) {
-    const bool isEqual = at > 0 && lines[at].Soldiering == lines[at - 1].Soldiering;
-    lines[at].Place = isEqual ? lines[at - 1].Place : static_cast<int>(at) + 1;
-  }
-  if (lines.size() > MostRanked) {
-    lines.resize(MostRanked);
+  std::vector<RankedLine> lines;
+  for (const RankedPlace& place : PlacedBy(RankedBy::Sum, figures, 1)) {
+    if (lines.size() < MostRanked) {
+      lines.push_back(LineOf(place, names[place.Figures.Member]));
+    }
   }
   return lines;
 }

@@ -8,14 +8,12 @@
 #include <vector>
 
 #include "core/game/HiddenNames.h"
+#include "core/game/MemberRanking.h"
 
-/// What a member did in the games of a month.
+/// What a member did in the games of a month, with the name that may be shown for it.
 struct RankedHolder {
   NameHolder Holder = {};
-  int Games = 0;
-  std::int64_t Soldiering = 0;          ///< sum
-  std::int64_t Best = 0;                ///< of one game
-  std::optional<double> Accuracy = {};  ///< mean of the games with one, as a fraction
+  RankedFigures Figures = {};
 };
 
 /// The members who played in a month.
@@ -28,10 +26,10 @@ struct PublicRanking {
 struct RankedLine {
   int Place = 0;  ///< 1 = first; equal ones share the place
   std::string Name = {};
-  int Games = 0;
-  std::int64_t Soldiering = 0;
-  std::int64_t Best = 0;
-  std::optional<double> Accuracy = {};
+  std::int64_t Games = 0;
+  std::int64_t Soldiering = 0;          ///< sum
+  std::int64_t Best = 0;                ///< of one game
+  std::optional<double> Accuracy = {};  ///< mean of the games with one, as a fraction
 
   bool operator==(const RankedLine&) const = default;
 };

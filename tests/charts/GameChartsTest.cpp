@@ -190,6 +190,34 @@ TEST_P(ShownChartsInEnglish, ReplaceAPictureOnlyAfterAQuestion) {
   EXPECT_NE(disk.Read("/pictures/a.png"), "older");
 }
 
+TEST_P(ShownChartsInEnglish, HaveNoColumnOfOwnTeamsInAFreeForAll) {
+  ChartGame chart = Chart();
+  chart.FreeForAll = true;
+  window.ShowGame(chart);
+  const QAbstractItemModel& hits = *Find<ChartTable>(window, "HitTable").model();
+  EXPECT_THAT(CellsOf(hits, 1), ElementsAre("Red  1", "Red  0", "40"));
+  window.ShowGame(Chart());
+  EXPECT_EQ(hits.columnCount(), 4);
+}
+
+TEST_P(ShownCharts, SaveNothingWhereThePictureWouldBeTooLarge) {
+  ChartGame chart = Chart();
+  chart.Title = std::string(40'000, 'W');
+  window.ShowGame(chart);
+  QFont huge = window.font();
+  huge.setPixelSize(2000);
+  Find<HitMap>(window, "Map").setFont(huge);
+  disk.Put("/pictures/a.png", "older");
+  dialog.Answers = {"/pictures/a.png"};
+  boxes.Answers = {BoxAnswer::Ok, BoxAnswer::Ok};
+  Press(window, "SavePicture");
+  ASSERT_EQ(boxes.Boxes.size(), 2U);
+  EXPECT_THAT(boxes.Boxes[1].Text, HasSubstr(strings.Text(OwnText::PictureTooLarge)));
+  EXPECT_EQ(boxes.Boxes[1].Icon, BoxIcon::Exclamation);
+  EXPECT_TRUE(disk.Replaced.empty());
+  EXPECT_EQ(disk.Read("/pictures/a.png"), "older");
+}
+
 TEST_P(ShownChartsInEnglish, TellWhyAPictureWasNotSaved) {
   dialog.Answers = {"/pictures/a.png"};
   disk.FailReplace("/pictures/a.png", RuntimeError(Fault::DiskFull, "Disk full: /pictures/a.png"));

@@ -63,6 +63,35 @@ TEST_F(ShownMap, WritesTheDamageWhereItFitsSoThatItCanBeRead) {
   EXPECT_EQ(PaintedContrast(map, empty), 1);
 }
 
+TEST_F(ShownMap, WritesTheNumbersThatFitThoughTheLargestDoesNot) {
+  game.Players(Blue0).HitByPlayer(Red0) = 2'000'000'000;
+  map.SetMatrix(HitMatrix(ChartOf(game, {Red0, Red1, Blue0})));
+  map.resize(300, 280);
+  const auto contrastIn = [this](const HitCell& cell) {
+    const QRect place = map.PlaceOf(cell);
+    return PaintedContrast(
+        map, place.adjusted(place.width() / 4, place.height() / 3, -place.width() / 4, -place.height() / 3));
+  };
+  EXPECT_GE(contrastIn({0, 1}), LeastContrast);
+  EXPECT_GE(contrastIn({1, 1}), LeastContrast);
+  EXPECT_EQ(contrastIn({0, 2}), 1);
+}
+
+TEST_F(ShownMap, MarksAndTellsNoOwnTeamInAFreeForAll) {
+  ChartGame chart = ChartOf(game, {Red0, Red1, Blue0});
+  const QRect own = map.PlaceOf({0, 1});
+  const QPoint corner = own.topRight() + QPoint(-4, 4);
+  EXPECT_NE(map.grab().toImage().pixel(corner), HeatOf(40, 120));
+  const int width = map.Picture({}).width();
+  chart.FreeForAll = true;
+  map.SetMatrix(HitMatrix(chart));
+  ASSERT_EQ(map.PlaceOf({0, 1}), own);
+  EXPECT_EQ(map.grab().toImage().pixel(corner), HeatOf(40, 120));
+  EXPECT_EQ(map.TextOf({0, 1}), QStringLiteral("Red  0 hit Red  1: damage 40"));
+  EXPECT_EQ(map.TextOf({1, 1}), QStringLiteral("Red  1 hit themselves: damage 7"));
+  EXPECT_LT(map.Picture({}).width(), width);  // nothing in the key tells of own teams
+}
+
 TEST(HeatImage, MarksHitsOnTheOwnTeamByMoreThanTheirColour) {
   const StringTable strings(Language::English);
   Game game(strings);

@@ -57,6 +57,22 @@ TEST(HitMatrix, LeavesOutHitsOfPlayersWhoTookNoPartAndNegativeAmounts) {
   EXPECT_EQ(matrix.Damage(1, 0), 0);
 }
 
+TEST(HitMatrix, KnowsNoOwnTeamInAFreeForAll) {
+  const StringTable strings(Language::English);
+  Game game(strings);
+  game.Players(Red1).HitByPlayer(Red0) = 40;
+  ChartGame chart = ChartOf(game, {Red0, Red1, Blue0});
+  EXPECT_TRUE(HitMatrix(chart).HasTeams());
+  EXPECT_TRUE(HitMatrix(chart).IsOwnTeam(0, 1));
+  chart.FreeForAll = true;
+  const HitMatrix matrix(chart);
+  EXPECT_FALSE(matrix.HasTeams());
+  EXPECT_FALSE(matrix.IsOwnTeam(0, 1));
+  EXPECT_FALSE(matrix.IsOwnTeam(0, 0));
+  EXPECT_EQ(matrix.Damage(0, 1), 40);
+  EXPECT_EQ(matrix.Groups().size(), 2U);  // colours of guns order the players all the same
+}
+
 TEST(HitMatrix, WithoutPlayersIsEmpty) {
   const StringTable strings(Language::English);
   const Game game(strings);

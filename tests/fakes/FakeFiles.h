@@ -137,6 +137,13 @@ class FakeFiles : public Files {
     return path;
   }
 
+  std::string MakeFileIn(const std::string& folder) override {
+    std::string path = folder + "/.new-" + std::to_string(++tempFiles_);
+    ThrowIfTold(createFailures_, folder);
+    Put(path, "");
+    return path;
+  }
+
   void Write(const std::string& path, const std::string& bytes) override {
     ThrowIfTold(replaceFailures_, path);
     contents_[path] = bytes;
@@ -159,6 +166,10 @@ class FakeFiles : public Files {
       throw RuntimeError(Fault::PathNotFound, "Path not found: " + path);
     }
     return FreeBytes;
+  }
+
+  bool IsSame(const std::string& path, const std::string& other) const override {
+    return (FileExists(path) || FolderExists(path)) && WithoutSeparator(path) == WithoutSeparator(other);
   }
 
   std::vector<std::string> FileNames(const std::string& folder) const override {

@@ -18,8 +18,9 @@ std::string NickNameOf(const NameHolder& holder) {
 }
 
 RankedHolder Ranked(std::int32_t member, const std::string& name, std::int64_t points) {
-  return {
-      .Holder = {.Member = member, .NickName = name}, .Games = 2, .Soldiering = points, .Best = points - 1};
+  const auto sum = static_cast<double>(points);
+  return {.Holder = {.Member = member, .NickName = name},
+          .Figures = {.Member = member, .Games = 2, .Sum = sum, .Best = sum - 1}};
 }
 
 std::vector<std::pair<int, std::string>> PlacesOf(const std::vector<RankedLine>& lines) {

@@ -1,6 +1,5 @@
 #include "archive/copies/BackupCopies.h"
 
-#include <QFileInfo>
 #include <QHeaderView>
 #include <algorithm>
 #include <utility>
@@ -76,7 +75,7 @@ void BackupCopies::SetUpTable() {
   header.setHighlightSections(false);
   header.setDefaultAlignment(Qt::AlignVCenter | Qt::AlignLeft);
   header.setSectionResizeMode(QHeaderView::ResizeToContents);
-  header.setSectionResizeMode(CopyListModel::Made, QHeaderView::Stretch);
+  header.setStretchLastSection(true);
   connect(ui_->CopyTable->selectionModel(), &QItemSelectionModel::selectionChanged, this,
           &BackupCopies::EnableButtons);
 }
@@ -102,7 +101,10 @@ void BackupCopies::ConnectCommands() {
 }
 
 void BackupCopies::Refresh() {
-  list_.Refresh(parts_.Work.Folder);
+  const std::string failure = list_.Refresh(parts_.Work.Folder);
+  if (!failure.empty()) {
+    ShowStatus(Filled(parts_.Work.Strings.Text(OwnText::CopyListFailed), {failure}));
+  }
   const int firstCopy = static_cast<int>(parts_.Databases.size());
   ui_->CopyTable->selectRow(std::min(firstCopy, list_.rowCount() - 1));
   EnableButtons();
@@ -174,24 +176,28 @@ void BackupCopies::Tell(const Restored& restored) {
 
 void BackupCopies::CopyAll() {
   std::string made;
-  try {
+  std::optional<RuntimeError> failure;
+  {
     const Job job(*this);
-    for (const CopiedDatabase& database : parts_.Databases) {
-      const std::optional<std::string> name = work_.CopyNow(database, Steps());
-      if (!name) {
-        break;
+    bool keepsOn = true;
+    for (auto database = parts_.Databases.begin(); keepsOn && database != parts_.Databases.end();
+         ++database) {
+      try {
+        const std::optional<std::string> name = work_.CopyNow(*database, Steps());
+        keepsOn = name.has_value();
+        made.append(made.empty() || !name ? "" : ", ").append(name.value_or(""));
+      } catch (const RuntimeError& error) {  // the others can be copied all the same
+        failure = failure.value_or(error);
       }
-      made.append(made.empty() ? "" : ", ").append(*name);
     }
-  } catch (const RuntimeError&) {
-    Refresh();
-    ShowStatus({});
-    throw;
   }
   Refresh();
   const StringTable& strings = parts_.Work.Strings;
-  ShowStatus(made.empty() ? strings.Text(OwnText::CopyStopped)
-                          : Filled(strings.Text(OwnText::CopiesMade), {made}));
+  const std::string nothing = failure ? std::string() : strings.Text(OwnText::CopyStopped);
+  ShowStatus(made.empty() ? nothing : Filled(strings.Text(OwnText::CopiesMade), {made}));
+  if (failure) {
+    throw RuntimeError(*failure);
+  }
 }
 
 void BackupCopies::CopySelected() {
@@ -219,23 +225,16 @@ std::optional<std::string> BackupCopies::AskTarget(const std::string& name) {
   const StringTable& strings = parts_.Work.Strings;
   const std::string title = strings.Text(OwnText::BackupCopiesTitle);
   std::optional<std::string> target = parts_.FileDialog.ShowSave({.Filter = title + "|*.mdb", .Name = name});
+  if (target && work_.IsDataInUse(*target, parts_.Databases)) {
+    parts_.Boxes.Show(Filled(strings.Text(OwnText::CopyIntoData), {*target}), title, BoxIcon::Exclamation);
+    return std::nullopt;
+  }
   if (!target || !parts_.Work.Disk.FileExists(*target)) {
     return target;
-  }
-  if (IsInUse(*target)) {
-    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + *target);
   }
   const BoxAnswer answer = parts_.Boxes.Show(Filled(strings.Text(OwnText::CopyExists), {*target}), title,
                                              BoxIcon::Question, BoxButtons::YesNo);
   return answer == BoxAnswer::Yes ? target : std::nullopt;
-}
-
-bool BackupCopies::IsInUse(const std::string& path) const {
-  const QFileInfo file(QString::fromStdString(path));
-  return std::any_of(parts_.Databases.begin(), parts_.Databases.end(),
-                     [&file](const CopiedDatabase& database) {
-                       return file == QFileInfo(QString::fromStdString(database.InUse().FilePath()));
-                     });
 }
 
 bool BackupCopies::KeepOn(CopyStep step) {

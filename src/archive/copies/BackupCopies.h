@@ -59,7 +59,6 @@ class BackupCopies : public QDialog {
   void CopySelected();
   /// Where the operator wants the copy; nothing if nowhere.
   std::optional<std::string> AskTarget(const std::string& name);
-  bool IsInUse(const std::string& path) const;
 
   bool KeepOn(CopyStep step);
   CopyWork::OnStep Steps() {

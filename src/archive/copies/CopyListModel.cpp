@@ -21,14 +21,25 @@ std::uint64_t SizeOf(const Files& disk, const std::string& path) {
   }
 }
 
+/// Why the folder cannot be read; empty if it can, or if there is none yet.
+std::string WhyUnreadable(const Files& disk, const std::string& folder) {
+  try {
+    if (disk.FolderExists(folder)) {
+      disk.FolderNames(folder);
+    }
+    return {};
+  } catch (const RuntimeError& error) {
+    return error.what();
+  }
+}
+
 }  // namespace
 
-void CopyListModel::Refresh(const std::string& folder) {
+std::string CopyListModel::Refresh(const std::string& folder) {
   beginResetModel();
   entries_.clear();
   for (std::size_t i = 0; i < databases_.size(); ++i) {
-    entries_.push_back({i, std::nullopt, SizeOf(disk_, databases_[i].InUse().Path())});
-    counts_.erase(KeyOf(entries_.back()));
+    AddInUse(i);
   }
   for (const BackupCopy& copy : CopiesIn(disk_, folder)) {
     for (std::size_t i = 0; i < databases_.size(); ++i) {
@@ -38,6 +49,19 @@ void CopyListModel::Refresh(const std::string& folder) {
     }
   }
   endResetModel();
+  return WhyUnreadable(disk_, folder);
+}
+
+void CopyListModel::AddInUse(std::size_t database) {
+  Entry entry{database, std::nullopt, 0};
+  const std::string key = KeyOf(entry);
+  counts_.erase(key);
+  try {
+    entry.Bytes = SizeOf(disk_, databases_[database].InUse().Path());
+  } catch (const RuntimeError& error) {
+    counts_[key] = {std::nullopt, error.what()};
+  }
+  entries_.push_back(entry);
 }
 
 bool CopyListModel::CountNext() {
@@ -66,7 +90,7 @@ QVariant CopyListModel::data(const QModelIndex& index, int role) const {
   if (role == Qt::DisplayRole) {
     return TextOf(entry, index.column());
   }
-  if (role == Qt::ToolTipRole) {
+  if (role == Qt::ToolTipRole || role == Qt::AccessibleDescriptionRole) {
     const Count* count = CountOf(entry);
     if (count != nullptr && !count->Rows) {
       return QString::fromStdString(count->Reason);
@@ -121,6 +145,9 @@ QString CopyListModel::TextOf(const Entry& entry, int column) const {
     case Difference:
       return DifferenceTo(entry);
     default:
+      if (!entry.Copy && entry.Bytes == 0) {  // nobody knows
+        return {};
+      }
       return QLocale::system().formattedDataSize(static_cast<qint64>(entry.Bytes));
   }
 }

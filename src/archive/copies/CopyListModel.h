@@ -25,8 +25,9 @@ class CopyListModel : public QAbstractTableModel {
                 const StringTable& strings)
       : databases_(databases), work_(work), disk_(disk), strings_(strings) {}
 
-  /// Reads the folder of the copies anew. What was counted of copies stays known.
-  void Refresh(const std::string& folder);
+  /// Reads the folder of the copies anew. What was counted of copies stays known. Returns why the folder
+  /// could not be read, if so; the databases in use are listed nevertheless.
+  std::string Refresh(const std::string& folder);
 
   /// Counts the rows of one that is not counted yet; those in use come first. False if all are.
   bool CountNext();
@@ -45,6 +46,7 @@ class CopyListModel : public QAbstractTableModel {
     std::string Reason;
   };
 
+  void AddInUse(std::size_t database);
   std::string KeyOf(const Entry& entry) const;
   const Count* CountOf(const Entry& entry) const;
   Count CountRows(const Entry& entry) const;

@@ -19,7 +19,8 @@ std::string DatabaseNameIn(const std::string& path) {
 }
 
 std::string FolderOf(const std::string& path) {
-  return path.substr(0, path.rfind('/'));
+  const std::size_t end = path.rfind('/');
+  return end == std::string::npos ? "." : path.substr(0, std::max<std::size_t>(end, 1));
 }
 
 bool SameName(const std::string& one, const std::string& other) {
@@ -33,14 +34,23 @@ KeepOn In(CopyStep step, const CopyWork::OnStep& keepOn) {
 
 }  // namespace
 
-/// A file that is being written and then becomes another. One that a crash left is deleted before, one that
-/// did not become another after.
+/// A file that is being written and then becomes another. If it did not, it is deleted at the end.
 class CopyWork::PartFile {
  public:
-  PartFile(Files& disk, std::string path) : disk_(disk), path_(std::move(path)) { Delete(); }
+  /// At a path in a folder of the program, where one that a crash left is deleted.
+  static PartFile At(Files& disk, std::string path) {
+    if (disk.FileExists(path)) {
+      disk.Delete(path);
+    }
+    return {disk, std::move(path)};
+  }
+  /// In a folder of the operator's, where every other file is theirs.
+  static PartFile In(Files& disk, const std::string& folder) { return {disk, disk.MakeFileIn(folder)}; }
   ~PartFile() {
     try {
-      Delete();
+      if (Exists()) {
+        disk_.Delete(path_);
+      }
     } catch (const RuntimeError&) {  // nobody reads it, and the next one takes its place
     }
   }
@@ -59,11 +69,7 @@ class CopyWork::PartFile {
   }
 
  private:
-  void Delete() const {
-    if (Exists()) {
-      disk_.Delete(path_);
-    }
-  }
+  PartFile(Files& disk, std::string path) : disk_(disk), path_(std::move(path)) {}
 
   Files& disk_;
   const std::string path_;
@@ -86,9 +92,19 @@ std::optional<std::string> CopyWork::KeepPresent(const CopiedDatabase& database,
   return Keep(database.InUse().Path(), CopyKind::BeforeRestore, CopyStep::KeepingPresent, keepOn);
 }
 
+bool CopyWork::IsDataInUse(const std::string& target, const std::vector<CopiedDatabase>& databases) const {
+  const std::string folder = FolderOf(parts_.Folder);
+  const auto isOf = [&](const CopiedDatabase& database) {
+    const std::string path = folder + "/" + database.Name;  // which may be a link to another folder
+    return parts_.Disk.IsSame(target, path + ".mdb") || parts_.Disk.IsSame(target, path + "-new.mdb");
+  };
+  return parts_.Disk.IsSame(FolderOf(target), folder) ||
+         std::any_of(databases.begin(), databases.end(), isOf);
+}
+
 bool CopyWork::CopyToFile(const std::string& path, const std::string& target, const OnStep& keepOn) const {
   const std::unique_ptr<Database> source = parts_.Engine.OpenDatabase(path);
-  const PartFile part(parts_.Disk, target + ".part");
+  const PartFile part = PartFile::In(parts_.Disk, FolderOf(target));
   if (!source->CopyInSteps(part.Path(), In(CopyStep::Copying, keepOn))) {
     return false;
   }
@@ -137,7 +153,7 @@ bool CopyWork::PutCopyInPlace(const BackupCopy& copy, const CopiedDatabase& data
     return false;
   }
   restored.KeptAs = *kept;
-  const PartFile part(parts_.Disk, file + ".restored");
+  const PartFile part = PartFile::At(parts_.Disk, file + ".restored");
   if (!source->CopyInSteps(part.Path(), In(CopyStep::Copying, keepOn))) {
     return false;
   }
@@ -178,7 +194,7 @@ std::optional<std::string> CopyWork::Keep(const std::string& path, CopyKind kind
   }
   CheckRoom(path, parts_.Folder);
   const std::string name = DatabaseNameIn(path);
-  const PartFile part(parts_.Disk, parts_.Folder + "/" + name + ".part");
+  const PartFile part = PartFile::At(parts_.Disk, parts_.Folder + "/" + name + ".part");
   // By a connection of its own: the one in use may be keeping others from writing.
   if (!parts_.Engine.OpenDatabase(path)->CopyInSteps(part.Path(), In(step, keepOn))) {
     return std::nullopt;

@@ -4,6 +4,7 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "archive/copies/CopyNames.h"
 #include "core/text/StringTable.h"
@@ -50,7 +51,7 @@ class CopyWork {
     Files& Disk;
     const Clock& Time;
     const StringTable& Strings;
-    std::string Folder;  ///< of the copies; made when needed
+    std::string Folder;  ///< of the copies, in that of the data; made when needed
   };
 
   explicit CopyWork(Parts parts) : parts_(std::move(parts)) {}
@@ -69,6 +70,9 @@ class CopyWork {
   /// Does the same ahead of a replacement of the whole database, so the copy's name says that. It may be held
   /// against writers.
   std::optional<std::string> KeepPresent(const CopiedDatabase& database, const OnStep& keepOn) const;
+
+  /// True if a file at `target` would lie where the databases in use lie, or be one of them, be it by a link.
+  bool IsDataInUse(const std::string& target, const std::vector<CopiedDatabase>& databases) const;
 
   /// Copies the database at `path` to the file `target`, replacing any file there. False if it was stopped.
   bool CopyToFile(const std::string& path, const std::string& target, const OnStep& keepOn) const;

@@ -8,6 +8,8 @@
 #include <cmath>
 #include <utility>
 
+#include "charts/ChartKeys.h"
+
 namespace {
 
 constexpr double AxisGap = 6;
@@ -198,35 +200,14 @@ void HistoryChart::GoTo(int place, bool chosen) {
 }
 
 void HistoryChart::keyPressEvent(QKeyEvent* event) {
-  constexpr int page = 10;
-  const int from = place_.value_or(Count() - 1);
-  int place = from;
-  switch (event->key()) {
-    case Qt::Key_Left:
-      --place;
-      break;
-    case Qt::Key_Right:
-      ++place;
-      break;
-    case Qt::Key_PageUp:
-      place -= page;
-      break;
-    case Qt::Key_PageDown:
-      place += page;
-      break;
-    case Qt::Key_Home:
-      place = 0;
-      break;
-    case Qt::Key_End:
-      place = Count() - 1;
-      break;
-    default:
-      QWidget::keyPressEvent(event);
-      return;
-  }
   if (!points_.empty()) {
-    GoTo(std::clamp(place, 0, Count() - 1), true);
+    if (const auto place =
+            PlaceByKey(event->key(), place_.value_or(Count() - 1), Count(), ChartOrder::Across)) {
+      GoTo(*place, true);
+      return;
+    }
   }
+  QWidget::keyPressEvent(event);
 }
 
 void HistoryChart::mouseMoveEvent(QMouseEvent* event) {

@@ -1,12 +1,13 @@
 #pragma once
 
-#include <QAbstractTableModel>
 #include <QStringList>
 #include <functional>
 #include <vector>
 
+#include "charts/ChartRows.h"
+
 /// Rows of texts that are made when they are shown.
-class HistoryRows : public QAbstractTableModel {
+class HistoryRows : public ChartRows {
   Q_OBJECT
 
  public:
@@ -14,18 +15,17 @@ class HistoryRows : public QAbstractTableModel {
 
   /// Columns of texts are aligned left, all others are of numbers.
   HistoryRows(QStringList captions, std::vector<int> textColumns, QObject* parent)
-      : QAbstractTableModel(parent), captions_(std::move(captions)), textColumns_(std::move(textColumns)) {}
+      : ChartRows(parent), captions_(std::move(captions)), textColumns_(std::move(textColumns)) {}
 
   /// `textOf` is asked until the next call.
   void Show(int rows, TextOf textOf);
 
-  int rowCount(const QModelIndex& parent = {}) const override;
-  int columnCount(const QModelIndex& parent = {}) const override;
-  QVariant data(const QModelIndex& index, int role = Qt::DisplayRole) const override;
-  QVariant headerData(int section, Qt::Orientation orientation, int role = Qt::DisplayRole) const override;
-
  private:
-  QVariant SideOf(int column) const;
+  int Rows() const override { return rows_; }
+  int Columns() const override { return static_cast<int>(captions_.size()); }
+  bool IsText(int column) const override;
+  QString Caption(int column) const override { return captions_.value(column); }
+  QString Cell(int row, int column) const override { return textOf_(row, column); }
 
   const QStringList captions_;
   const std::vector<int> textColumns_;

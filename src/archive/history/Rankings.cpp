@@ -1,10 +1,8 @@
 #include "archive/history/Rankings.h"
 
-#include <algorithm>
 #include <array>
 #include <charconv>
 #include <map>
-#include <tuple>
 
 #include "archive/ArchiveQueries.h"
 #include "core/data/FieldValue.h"
@@ -12,22 +10,6 @@
 #include "core/text/NumberForms.h"
 
 namespace {
-
-std::optional<double> RankValue(const RankedFigures& figures, RankedBy by) {
-  switch (by) {
-    case RankedBy::Sum:
-      return figures.Sum;
-    case RankedBy::Mean:
-      return figures.Mean();
-    case RankedBy::Best:
-      return figures.Best;
-    case RankedBy::Accuracy:
-      return figures.Accuracy;
-    case RankedBy::Games:
-      break;
-  }
-  return static_cast<double>(figures.Games);
-}
 
 int NumberInPeriod(std::string_view digits) {
   int number = 0;
@@ -66,21 +48,8 @@ void TakeNames(RankedMember& member, const SqlRow& row) {
 std::vector<RankedMember> Ranked(const std::vector<RankedFigures>& figures, RankedBy by,
                                  std::int64_t leastGames) {
   std::vector<RankedMember> ranked;
-  for (const RankedFigures& each : figures) {
-    if (each.Games >= leastGames && RankValue(each, by)) {
-      ranked.push_back({.Figures = each});
-    }
-  }
-  const auto order = [by](const RankedMember& member) {
-    const RankedFigures& of = member.Figures;
-    return std::tuple(-*RankValue(of, by), -of.Games, -of.Sum, of.Member);
-  };
-  std::sort(ranked.begin(), ranked.end(), [&order](const RankedMember& left, const RankedMember& right) {
-    return order(left) < order(right);
-  });
-  for (std::size_t i = 0; i < ranked.size(); ++i) {
-    const bool isEqual = i > 0 && *RankValue(ranked[i].Figures, by) == *RankValue(ranked[i - 1].Figures, by);
-    ranked[i].Place = isEqual ? ranked[i - 1].Place : static_cast<int>(i) + 1;
+  for (const RankedPlace& place : PlacedBy(by, figures, leastGames)) {
+    ranked.push_back({.Place = place.Place, .Figures = place.Figures});
   }
   return ranked;
 }

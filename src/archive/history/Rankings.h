@@ -6,32 +6,19 @@
 #include <string>
 #include <vector>
 
+#include "core/game/MemberRanking.h"
 #include "core/text/StringTable.h"
 #include "platform/Database.h"
 #include "platform/Sql.h"
 
-enum class RankedBy { Sum, Mean, Best, Accuracy, Games };
-
-/// What a member did in the period of a ranking.
-struct RankedFigures {
-  std::int32_t Member = 0;
-  std::int64_t Games = 0;  ///< at least 1
-  double Sum = 0;          ///< soldiering
-  std::optional<double> Best = {};
-  std::optional<double> Accuracy = {};  ///< fraction, the mean of the games with an accuracy above 0
-
-  double Mean() const { return Sum / static_cast<double>(Games); }
-};
-
 struct RankedMember {
-  int Place = 0;  ///< equal ones share theirs, and the next one's counts them all: 1, 2, 2, 4
+  int Place = 0;  ///< equal ones share theirs
   RankedFigures Figures;
   std::string PublicName = {};  ///< nickname; empty without one, and for who hides the name
   std::string FullName = {};    ///< first and last name
 };
 
-/// Those with at least `leastGames` games and with a figure to rank by, the highest first; equal ones in the
-/// order of games, sum (most first) and number (lowest first). Without names.
+/// As PlacedBy orders them, without names.
 std::vector<RankedMember> Ranked(const std::vector<RankedFigures>& figures, RankedBy by,
                                  std::int64_t leastGames);
 

@@ -144,6 +144,15 @@ std::string LinuxFiles::MakeTempFileName() {
   return path;
 }
 
+std::string LinuxFiles::MakeFileIn(const std::string& folder) {
+  std::string path = NewNameIn(folder);
+  const Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0644));
+  if (file.Number() < 0) {
+    throw FileError(errno, folder);
+  }
+  return path;
+}
+
 void LinuxFiles::Write(const std::string& path, const std::string& bytes) {
   const Descriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC | O_NONBLOCK, 0644));
   if (file.Number() < 0 || !WriteAll(file.Number(), bytes)) {
@@ -172,6 +181,11 @@ std::uint64_t LinuxFiles::FreeSpace(const std::string& path) const {
     throw FileError(error.value(), path);
   }
   return space.available;
+}
+
+bool LinuxFiles::IsSame(const std::string& path, const std::string& other) const {
+  std::error_code error;
+  return std::filesystem::equivalent(path, other, error) && !error;
 }
 
 std::vector<std::string> LinuxFiles::FileNames(const std::string& folder) const {

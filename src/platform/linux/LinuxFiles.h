@@ -21,9 +21,12 @@ class LinuxFiles : public Files {
   void ReplacePrivately(const std::string& path, const std::string& bytes) override;
   std::unique_ptr<NewFile> BeginReplace(const std::string& path, FileReaders readers) override;
   std::string MakeTempFileName() override;
+  /// It gets 0644 less the umask.
+  std::string MakeFileIn(const std::string& folder) override;
   void Write(const std::string& path, const std::string& bytes) override;
   void Append(const std::string& path, const std::string& bytes) override;
   std::uint64_t FreeSpace(const std::string& path) const override;
+  bool IsSame(const std::string& path, const std::string& other) const override;
   std::vector<std::string> FileNames(const std::string& folder) const override;
   std::vector<std::string> FolderNames(const std::string& folder) const override;
   std::string TimeOfChange(const std::string& path) const override;

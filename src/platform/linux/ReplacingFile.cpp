@@ -39,7 +39,7 @@ std::string FolderOf(const std::string& path) {
 class ReplacingFile::TemporaryFile {
  public:
   TemporaryFile(const std::string& folder, mode_t mode)
-      : path_(NewName(folder)), file_(Create(path_, mode)) {}
+      : path_(NewNameIn(folder)), file_(Create(path_, mode)) {}
   ~TemporaryFile() {
     if (!renamed_) {
       unlink(path_.c_str());
@@ -67,12 +67,6 @@ class ReplacingFile::TemporaryFile {
     return fstat(Number(), &own) == 0 && stat(path.c_str(), &there) == 0 && own.st_dev == there.st_dev &&
            own.st_ino == there.st_ino;
   }
-  static std::string NewName(const std::string& folder) {
-    std::random_device random;
-    std::array<char, 32> name{};
-    std::snprintf(name.data(), name.size(), ".new-%08x%08x", random(), random());
-    return folder + "/" + name.data();
-  }
   static int Create(const std::string& path, mode_t mode) {
     return open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode);
   }
@@ -81,6 +75,13 @@ class ReplacingFile::TemporaryFile {
   Descriptor file_;
   bool renamed_ = false;
 };
+
+std::string NewNameIn(const std::string& folder) {
+  std::random_device random;
+  std::array<char, 32> name{};
+  std::snprintf(name.data(), name.size(), ".new-%08x%08x", random(), random());
+  return folder + "/" + name.data();
+}
 
 bool WriteAll(int file, std::string_view bytes) {
   while (!bytes.empty()) {

@@ -29,6 +29,9 @@ class ReplacingFile : public NewFile {
   std::unique_ptr<TemporaryFile> file_;
 };
 
+/// The path of a hidden file in `folder` with a random name, for one that is written and then renamed.
+std::string NewNameIn(const std::string& folder);
+
 /// Writes all of the bytes. Returns false, with errno, if that fails.
 bool WriteAll(int file, std::string_view bytes);
 

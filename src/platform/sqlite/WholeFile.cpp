@@ -7,12 +7,14 @@
 
 #include <cerrno>
 #include <memory>
+#include <optional>
 #include <utility>
 
 #include "platform/RuntimeError.h"
 #include "platform/sqlite/SqliteConnection.h"
 #include "platform/sqlite/SqliteError.h"
 #include "platform/sqlite/SqliteStatement.h"
+#include "platform/sqlite/StepwiseCheck.h"
 
 namespace {
 
@@ -98,7 +100,16 @@ class SqliteStepwiseCopy : public StepwiseCopy {
   SqliteStepwiseCopy(const SqliteStepwiseCopy&) = delete;
   SqliteStepwiseCopy& operator=(const SqliteStepwiseCopy&) = delete;
 
-  bool Step() override { return Advance(WhenLocked::TryAgain); }
+  bool Step() override {
+    if (check_) {
+      return check_->Step();
+    }
+    if (Advance(WhenLocked::TryAgain)) {
+      copy_.reset();
+      check_.emplace(path_);
+    }
+    return false;
+  }
 
   enum class WhenLocked { TryAgain, Fail };
   bool Advance(WhenLocked whenLocked) {
@@ -150,8 +161,9 @@ class SqliteStepwiseCopy : public StepwiseCopy {
   }
 
   const std::string path_;
-  const Handle copy_;
+  Handle copy_;
   sqlite3_backup* backup_ = nullptr;
+  std::optional<StepwiseCheck> check_;  ///< once all is copied
 };
 
 }  // namespace

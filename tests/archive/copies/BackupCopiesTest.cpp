@@ -13,6 +13,7 @@
 #include "tests/fakes/FakeFileDialog.h"
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/support/Controls.h"
+#include "tests/support/OrdinaryUser.h"
 
 namespace {
 
@@ -31,7 +32,9 @@ class BackupCopiesWindow : public testing::Test {
 
   void Make(Language language) {
     strings.emplace(language);
-    window = std::make_unique<BackupCopies>(BackupCopies::Parts{.Databases = {site.Members},
+    std::vector<CopiedDatabase> databases = {site.Members};
+    databases.insert(databases.end(), more.begin(), more.end());
+    window = std::make_unique<BackupCopies>(BackupCopies::Parts{.Databases = std::move(databases),
                                                                 .Work = {.Engine = site.Databases,
                                                                          .Disk = site.Disk,
                                                                          .Time = site.Time,
@@ -79,7 +82,13 @@ class BackupCopiesWindow : public testing::Test {
     return cells;
   }
 
+  static FakeMessageBoxes::Box InDataFolder(const std::string& file) {
+    return {file + " lies in the folder of the data in use, or is in use itself. Choose another folder.",
+            "Backup Copies", BoxIcon::Exclamation, BoxButtons::Ok};
+  }
+
   CopySite site;
+  std::vector<CopiedDatabase> more;  ///< beside the members
   std::optional<StringTable> strings;
   FakeMessageBoxes boxes;
   FakeFileDialog dialog;
@@ -276,9 +285,97 @@ TEST_F(BackupCopiesWindow, NeverCopiesOverADatabaseInUse) {
   Open();
   dialog.Answers = {site.MembersFile()};
   ::Press(*window, "CopyToFolder");
-  ASSERT_EQ(boxes.Boxes.size(), 1U);
-  EXPECT_EQ(boxes.Boxes[0].Icon, BoxIcon::Critical);
+  EXPECT_THAT(boxes.Boxes, ElementsAre(InDataFolder(site.MembersFile())));
   EXPECT_EQ(site.Names(), "Ann Bob Cid");
+  EXPECT_EQ(Status(), QString());
+}
+
+TEST_F(BackupCopiesWindow, NeverCopiesIntoTheDataFolderNotEvenThroughALink) {
+  Open();
+  std::filesystem::create_directory_symlink(site.Folder / "data", site.Folder / "link");
+  for (const std::string& file : {site.Folder / "data/games.mdb", site.Folder / "link/games.mdb"}) {
+    boxes.Boxes.clear();
+    dialog.Answers = {file};
+    ::Press(*window, "CopyToFolder");
+    EXPECT_THAT(boxes.Boxes, ElementsAre(InDataFolder(file)));
+    EXPECT_FALSE(std::filesystem::exists(file));
+  }
+}
+
+/// With an archive beside the members that cannot be opened, as the second database.
+class CopiesBesideABrokenArchive : public BackupCopiesWindow {
+ protected:
+  CopiesBesideABrokenArchive() {
+    WriteFile(site.Folder / "program/games_default.mdb", MadeDatabase("games"));
+    site.PutCopy("games-2013-05-03-200000-kept.mdb", MadeDatabase("games"));
+    more = {{.Name = "games",
+             .Table = "Games",
+             .DefaultPath = site.Folder / "program/games_default.mdb",
+             .Title = OwnText::CopiedGames,
+             .InUse = [this]() -> Database& {
+               askedAt.push_back(reopened);
+               throw RuntimeError(Fault::DatabaseLocked, "Could not lock file 'games.mdb'.");
+             }}};
+    Open();
+  }
+
+  std::vector<int> askedAt;  ///< how often the databases had been opened anew whenever it was asked for
+};
+
+TEST_F(CopiesBesideABrokenArchive, ListTheOthersAndTellItInItsRow) {
+  ASSERT_EQ(Table().model()->rowCount(), 5);
+  EXPECT_THAT(Cells(0), ElementsAre("Members", "Now", "in use", "3", ""));
+  EXPECT_THAT(Cells(1), ElementsAre("Past games", "Now", "in use", "cannot be read", ""));
+  EXPECT_EQ(Table().model()->index(1, CopyListModel::Size).data().toString(), QString());
+  EXPECT_EQ(Table().model()->index(1, 0).data(Qt::ToolTipRole).toString(),
+            QStringLiteral("Could not lock file 'games.mdb'."));
+  EXPECT_EQ(Cells(2)[CopyListModel::Data], "Past games");
+  EXPECT_EQ(Cells(2)[CopyListModel::Rows], "0");
+  EXPECT_EQ(Cells(3)[CopyListModel::Rows], "4");
+  EXPECT_THAT(boxes.Boxes, IsEmpty());
+}
+
+TEST_F(CopiesBesideABrokenArchive, AreRestoredAndThenAskForItOnlyOnceTheCursorsAreOpenedAnew) {
+  askedAt.clear();
+  boxes.Answers = {BoxAnswer::Ok};
+  Table().selectRow(4);
+  ::Press(*window, "Restore");
+  EXPECT_EQ(site.Names(), "Old");
+  EXPECT_EQ(reopened, 1);
+  EXPECT_THAT(askedAt, testing::Each(1));
+  EXPECT_THAT(askedAt, testing::Not(IsEmpty()));
+  EXPECT_EQ(boxes.Boxes.size(), 1U);
+  EXPECT_THAT(Status().toStdString(), testing::StartsWith("Restored."));
+  EXPECT_EQ(Table().model()->rowCount(), 6);
+}
+
+TEST_F(CopiesBesideABrokenArchive, AreMadeOfTheOthersAndTheFailureIsTold) {
+  ::Press(*window, "CopyNow");
+  EXPECT_EQ(Status(), QStringLiteral("Copied: members-2013-05-21-143005-kept.mdb"));
+  ASSERT_EQ(boxes.Boxes.size(), 1U);
+  EXPECT_THAT(boxes.Boxes[0].Text, testing::HasSubstr("Could not lock file 'games.mdb'."));
+  EXPECT_TRUE(Enabled("CopyNow"));
+}
+
+TEST_F(CopiesBesideABrokenArchive, OfItAreNotRestoredAndThatIsTold) {
+  boxes.Answers = {BoxAnswer::Ok};
+  Table().selectRow(2);
+  ::Press(*window, "Restore");
+  ASSERT_EQ(boxes.Boxes.size(), 2U);
+  EXPECT_THAT(boxes.Boxes[1].Text, testing::HasSubstr("Could not lock file 'games.mdb'."));
+  EXPECT_EQ(reopened, 0);
+}
+
+TEST_F(BackupCopiesWindow, SaysWhenTheCopiesCannotBeListed) {
+  std::filesystem::permissions(site.CopyFolder(), std::filesystem::perms(0111));
+  {
+    const OrdinaryUser user;
+    Open();
+  }
+  std::filesystem::permissions(site.CopyFolder(), std::filesystem::perms(0755));
+  EXPECT_EQ(Table().model()->rowCount(), 1);
+  EXPECT_THAT(Status().toStdString(), testing::StartsWith("The copies cannot be listed: "));
+  EXPECT_THAT(Status().toStdString(), testing::HasSubstr(site.CopyFolder()));
 }
 
 TEST_F(BackupCopiesWindow, DoesNothingWhenTheFileDialogIsCancelled) {

@@ -66,6 +66,44 @@ TEST_F(Copies, AreCopiedToOtherFolders) {
   EXPECT_THAT(site.Disk.FileNames(site.Folder.Path()), ElementsAre("stick.mdb"));
 }
 
+TEST_F(Copies, LeaveTheOperatorsOwnFilesBesideThemAlone) {
+  WriteFile(site.Folder / "stick.mdb.part", "dear");
+  EXPECT_TRUE(
+      site.Work.CopyToFile(site.MembersFile(), site.Folder / "stick.mdb", [](CopyStep) { return true; }));
+  EXPECT_EQ(ReadFile(site.Folder / "stick.mdb.part"), "dear");
+  EXPECT_THAT(site.Disk.FileNames(site.Folder.Path()), ElementsAre("stick.mdb", "stick.mdb.part"));
+}
+
+TEST_F(Copies, NameTheFolderThatTakesNone) {
+  const Thrown thrown = ThrownBy([&] {
+    site.Work.CopyToFile(site.MembersFile(), site.Folder / "nowhere/stick.mdb",
+                         [](CopyStep) { return true; });
+  });
+  EXPECT_EQ(thrown.Number, 76);
+  EXPECT_EQ(thrown.Text, "Path not found: " + site.Folder / "nowhere");
+}
+
+TEST_F(Copies, KnowWhereTheDataInUseLies) {
+  const std::vector<CopiedDatabase> databases = {site.Members};
+  const auto isInUse = [&](const std::string& file) { return site.Work.IsDataInUse(file, databases); };
+  std::filesystem::create_directory_symlink(site.Folder / "data", site.Folder / "link");
+  std::filesystem::create_symlink(site.MembersFile(), site.Folder / "soft.mdb");
+  std::filesystem::create_hard_link(site.MembersFile(), site.Folder / "hard.mdb");
+  for (const char* file : {"data/members.mdb", "data/new.mdb", "data/games.mdb", "data/../data/x.mdb",
+                           "link/members.mdb", "link/x.mdb", "soft.mdb", "hard.mdb"}) {
+    EXPECT_TRUE(isInUse(site.Folder / file)) << file;
+  }
+  std::filesystem::create_directory(site.Folder / "stick");
+  WriteFile(site.Folder / "stick/members.mdb", "another one");
+  for (const char* file : {"stick/members.mdb", "stick/new.mdb", "nowhere/new.mdb"}) {
+    EXPECT_FALSE(isInUse(site.Folder / file)) << file;
+  }
+  std::filesystem::rename(site.MembersFile(), site.Folder / "stick/members.mdb");
+  std::filesystem::create_symlink(site.Folder / "stick/members.mdb", site.MembersFile());
+  EXPECT_TRUE(isInUse(site.Folder / "stick/members.mdb"));
+  EXPECT_FALSE(isInUse(site.Folder / "stick/new.mdb"));
+}
+
 TEST_F(Copies, AreCounted) {
   EXPECT_EQ(site.Work.RowsIn(site.PutCopy(Early, CopySite::WithMembers("'Old', 'Two'")), site.Members), 2);
   const BackupCopy bad = site.PutCopy("members-2013-05-02-200000.mdb", "no database");

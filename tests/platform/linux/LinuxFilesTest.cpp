@@ -135,6 +135,39 @@ TEST(LinuxFilesTemporary, MakesANewEmptyFileEachTime) {
   }
 }
 
+TEST(LinuxFilesNewFile, HasAHiddenNameThatNoOtherFileHas) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  const std::string first = files.MakeFileIn(folder.Path());
+  const std::string second = files.MakeFileIn(folder.Path());
+  EXPECT_NE(first, second);
+  for (const std::string& path : {first, second}) {
+    EXPECT_EQ(std::filesystem::path(path).parent_path(), folder.Path());
+    EXPECT_EQ(std::filesystem::path(path).filename().string().front(), '.');
+    EXPECT_EQ(std::filesystem::file_size(path), 0U);
+  }
+  const Thrown thrown = ThrownBy([&] { files.MakeFileIn(folder / "nowhere"); });
+  EXPECT_EQ(thrown.Number, 76);
+  EXPECT_EQ(thrown.Text, "Path not found: " + folder / "nowhere");
+}
+
+TEST(LinuxFilesIsSame, SeesThroughLinksOfAllKinds) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  files.CreateFolder(folder / "data");
+  WriteFile(folder / "data/file", "x");
+  WriteFile(folder / "data/other", "x");
+  std::filesystem::create_directory_symlink(folder / "data", folder / "link");
+  std::filesystem::create_symlink(folder / "data/file", folder / "soft");
+  std::filesystem::create_hard_link(folder / "data/file", folder / "hard");
+  for (const char* path : {"data/file", "data/../data/file", "link/file", "soft", "hard"}) {
+    EXPECT_TRUE(files.IsSame(folder / path, folder / "data/file")) << path;
+  }
+  EXPECT_TRUE(files.IsSame(folder / "link", folder / "data"));
+  EXPECT_FALSE(files.IsSame(folder / "data/other", folder / "data/file"));
+  EXPECT_FALSE(files.IsSame(folder / "data/new", folder / "data/new"));
+}
+
 TEST(LinuxFilesWrite, ReplacesTheContentsInPlace) {
   const TemporaryFolder folder;
   LinuxFiles files;
