@@ -147,7 +147,8 @@ void frmRx::SetUpKeeping() {
                         .Engine = archives,
                         .Strings = services_.Strings,
                         .UserDataFolder = userDataFolder_,
-                        .ProgramFolder = services_.Places.Program()},
+                        .ProgramFolder = services_.Places.Program(),
+                        .Guests = &guests_},
       [this] { return downloading_; }, [this](const KeptState& state) { desk_->TellKeeping(state); });
   // Not before the window is shown.
   QTimer::singleShot(0, &*keeping_, [this] {

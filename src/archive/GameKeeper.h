@@ -8,6 +8,7 @@
 
 #include "archive/ArchiveFile.h"
 #include "archive/GameArchive.h"
+#include "archive/GuestRows.h"
 #include "archive/WeeklyCopy.h"
 #include "core/game/GameProgress.h"
 #include "core/game/Session.h"
@@ -40,6 +41,7 @@ class GameKeeper {
     const StringTable& Strings;
     std::string UserDataFolder;
     std::string ProgramFolder;
+    const GuestList* Guests = nullptr;  ///< names in the game on the board; null where nobody enters any
   };
 
   /// Game files, logs and copies come first: the archive writes only while so many bytes stay free.
@@ -106,6 +108,8 @@ class GameKeeper {
   /// Finds the game on the board in the archive if that has become another one, or the game was loaded. True
   /// if a loaded game is there just as it is.
   bool Recognise(GameArchive& archive, const Game& game, bool isLoaded);
+  /// Names of guests alone make no other state of the game, nor other figures.
+  void KeepGuests();
   void NotePulls();
   FormerState FormerOf(const Marks& now) const;
   GameState StateOf(const Game& game, int pulls) const;
@@ -131,6 +135,7 @@ class GameKeeper {
   const Parts parts_;
   ArchiveFile file_;
   KeptState state_;
+  KeptGuests guests_;
   WeeklyCopy copy_;                     ///< of the open file
   std::optional<std::int64_t> gameId_;  ///< of the game on the board, once it is kept
   std::string played_;                  ///< in its row; no other archive has that number with that time

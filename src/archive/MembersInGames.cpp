@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "archive/GameArchive.h"
+#include "archive/GuestRows.h"
 #include "core/game/DallasId.h"
 #include "platform/RuntimeError.h"
 #include "platform/Sql.h"
@@ -80,6 +81,7 @@ int GameArchive::Forget(std::int32_t number) {
   for (const StoredFile& file : FilesWhere(condition + ")", values)) {
     CutFromFile(file, cut);
   }
+  ForgetGuestNames(archive_, number, buttons);
   sql.Change("UPDATE GamePlayers SET MemberID = 0, DallasID = $2 WHERE MemberID = $1", {member, none});
   for (const std::string& button : buttons) {
     sql.Change("UPDATE GamePlayers SET DallasID = $2 WHERE MemberID = 0 AND DallasID = $1", {button, none});
