@@ -47,17 +47,23 @@ int Small(const SqlRow& row, std::size_t column) {
   return static_cast<int>(row.Integer(column));
 }
 
-/// A statement takes a limited number of parameters.
-constexpr std::size_t MembersAtOnce = 500;
+/// More of them are asked for in pieces: a statement takes a limited number of parameters, and a step little
+/// time.
+constexpr std::size_t MembersAtOnce = 100;
 
-/// The games in which one of these members plays, deleted ones too.
-std::unordered_set<std::int64_t> GamesOfAny(Sql& sql, std::span<const std::int32_t> members) {
+/// The games in which one of these members plays, deleted ones too; none if `goOn` stops it.
+std::unordered_set<std::int64_t> GamesOfAny(Sql& sql, std::span<const std::int32_t> members,
+                                            const ArchiveQueries::Step& goOn) {
   std::unordered_set<std::int64_t> games;
+  const auto all = static_cast<double>(members.size());
   while (!members.empty()) {
+    if (goOn && !goOn(1 - static_cast<double>(members.size()) / all)) {
+      return {};
+    }
     const std::span<const std::int32_t> some = members.first(std::min(members.size(), MembersAtOnce));
     Conditions conditions;
     conditions.AddList("MemberID IN ", some, "");
-    sql.Query("SELECT DISTINCT GameID FROM GamePlayers WHERE 1 = 1" + conditions.Text(), conditions.Values(),
+    sql.Query("SELECT GameID FROM GamePlayers WHERE 1 = 1" + conditions.Text(), conditions.Values(),
               [&games](const SqlRow& row) { games.insert(row.Integer(0)); });
     members = members.subspan(some.size());
   }
@@ -116,7 +122,7 @@ std::vector<std::string> ArchiveQueries::Missions() {
   return missions;
 }
 
-std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter) {
+std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter, const Step& goOn) {
   Conditions conditions;
   conditions.AddPeriod(filter.From, filter.Before);
   if (!filter.Mission.empty()) {
@@ -140,7 +146,7 @@ std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter) {
                  " ORDER BY g.Played DESC, g.GameID DESC",
              conditions.Values(), [&games](const SqlRow& row) { games.push_back(row.Integer(0)); });
   if (manyMembers) {
-    const std::unordered_set<std::int64_t> theirs = GamesOfAny(sql_, filter.Members);
+    const std::unordered_set<std::int64_t> theirs = GamesOfAny(sql_, filter.Members, goOn);
     std::erase_if(games, [&theirs](std::int64_t game) { return !theirs.contains(game); });
   }
   return games;

@@ -33,7 +33,7 @@ std::vector<std::int32_t> MembersCalled(Database& dbMembers, const std::string& 
       numbers.push_back(static_cast<std::int32_t>(row.Integer(0)));
     });
   } catch (const RuntimeError& error) {
-    if (error.Number() != Fault::DatabaseError) {
+    if (error.Number() != Fault::InvalidPattern) {
       throw;
     }
     numbers.clear();  // an incomplete pattern

@@ -117,6 +117,10 @@ TEST_F(AskedArchive, FindsTheGamesOfMoreMembersThanAStatementTakes) {
   EXPECT_THAT(queries.Games({.Mission = "None", .Members = many}), ElementsAre(4, 1));
   Delete(4);
   EXPECT_THAT(queries.Games({.Members = many}), ElementsAre(3, 2, 1));
+  int steps = 0;
+  EXPECT_THAT(queries.Games({.Members = many}, [&steps](double done) { return done < 0.5 && ++steps > 0; }),
+              IsEmpty());
+  EXPECT_GT(steps, 10);
 }
 
 TEST_F(AskedArchive, TellsAGame) {

@@ -59,13 +59,25 @@ void AddPeriod(MembersInPeriod& all, const MemberPeriod& part) {
   sum.AccuracyGames += part.AccuracyGames;
 }
 
+/// The first month with a game that is not before `earliest`; empty without one.
+std::string MonthFrom(Sql& archive, const std::string& earliest) {
+  constexpr std::size_t length = 7;
+  std::string month;
+  archive.Query("SELECT min(Played) FROM Games WHERE Played >= $1", {earliest},
+                [&month](const SqlRow& row) { month = row.Text(0).substr(0, length); });
+  return month;
+}
+
 /// The months of a month or year; all with games where `period` is empty.
 std::vector<std::string> MonthsIn(Sql& archive, const std::string& period) {
   constexpr int lastMonth = 12;
   std::vector<std::string> months;
   if (period.empty()) {
-    for (const MonthOfGames& month : ArchiveQueries(archive).Months()) {
-      months.push_back(month.Month);
+    // From one to the next in the index, however many games each has.
+    for (std::string next = MonthFrom(archive, {}); !next.empty();) {
+      months.push_back(next);
+      const std::string later = PeriodAfter(next);
+      next = later > next ? MonthFrom(archive, later) : std::string();
     }
   } else if (period.size() > YearDigits) {
     months.push_back(period);

@@ -188,8 +188,12 @@ void PastGames::Refresh(std::int64_t stay) {
 void PastGames::ListGames(std::int64_t stay) {
   std::vector<std::int64_t> games;
   Tell({});
-  const bool done =
-      Try([&] { games = parts_.Archive.Queries().Games(FilterOf(search_, Listed().Which, Listed().Month)); });
+  stopped_ = false;
+  const bool done = Try([&] {
+    const GameFilter filter = FilterOf(search_, Listed().Which, Listed().Month);
+    RunInSteps(filter.Members.size(),
+               [&](const Step& goOn) { games = parts_.Archive.Queries().Games(filter, goOn); });
+  });
   {
     const QScopedValueRollback guard(listing_, true);
     games_.Show(std::move(games));
@@ -198,7 +202,9 @@ void PastGames::ListGames(std::int64_t stay) {
     }
   }
   ShowGame();
-  if (done && games_.rowCount() == 0) {
+  if (stopped_) {
+    Tell(parts_.Strings.Text(OwnText::PastSearchStopped));
+  } else if (done && games_.rowCount() == 0) {
     TellOfEmptyList();
   }
 }
