@@ -98,7 +98,7 @@ void KeepBare(benchmark::State& state, const Folder& folder) {
   sqlite3_stmt* player = bare.Prepare(
       "INSERT INTO GamePlayers SELECT max(GameID), ?1, ?1, '0000000000000000', ?1, 400, 0.5, 1000, 1000, "
       "900, "
-      "5, 6, 7, 1 FROM Games");
+      "5, 6, 7, 1, NULL FROM Games");
   sqlite3_stmt* file = bare.Prepare(
       "INSERT INTO sqlar SELECT '2026-11-21/2015-' || printf('%06d', max(GameID)) || '.game.xml', 33188, "
       "1790000000, 200000, ?1 FROM Games");

@@ -66,5 +66,5 @@ void AddGames(const std::string& path, int games) {
       "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < " + count +
       "), p(j) AS (SELECT 1 UNION ALL SELECT j + 1 FROM p WHERE j < 24) "
       "INSERT INTO GamePlayers SELECT i, j * 8, (i * 24 + j) * 7919 % 3430 + 1, '0000000000000000', j, "
-      "240 - j * 10 + i % 7, (i + j) % 90 / 100.0, 100, 90, 300, 2, 3, 4, j % 2 FROM n CROSS JOIN p");
+      "240 - j * 10 + i % 7, (i + j) % 90 / 100.0, 100, 90, 300, 2, 3, 4, j % 2, NULL FROM n CROSS JOIN p");
 }

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <string_view>
 
+#include "core/game/HiddenNames.h"
 #include "core/game/Standings.h"
 #include "core/gamefile/SuggestedName.h"
 
@@ -38,10 +39,10 @@ ChartGame ChartOf(const PastGame& past, const NickNames& nickNames,
       .Title = past.Game.GameDate.empty() ? past.Mission : past.Mission + ", " + past.Game.GameDate};
   for (const Standing& standing : Standings(past.Game, [](std::int32_t) { return std::string(); })) {
     std::string name = past.Game.DisplayName(standing.Index);
-    const std::int32_t member = past.Game.Players(standing.Index).MemberIndex;
-    if (const std::string memberName = member != 0 ? CleanName(nickNames(member)) : std::string();
-        !memberName.empty()) {
-      name.append(" (").append(memberName).append(")");
+    const NameHolder holder = HolderOf(past.Game, standing.Index, nickNames, past.NamesOfGuests());
+    if (const std::string& told = holder.NickName.empty() ? holder.GuestName : holder.NickName;
+        !told.empty()) {
+      name.append(" (").append(told).append(")");
     }
     chart.Players.push_back({standing.Index, std::move(name)});
   }

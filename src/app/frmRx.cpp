@@ -148,7 +148,8 @@ void frmRx::SetUpKeeping() {
                         .Engine = archives,
                         .Strings = services_.Strings,
                         .UserDataFolder = userDataFolder_,
-                        .ProgramFolder = services_.Places.Program()},
+                        .ProgramFolder = services_.Places.Program(),
+                        .Guests = &guests_},
       [this] { return downloading_; }, [this](const KeptState& state) { desk_->TellKeeping(state); });
   DeleteRankingPage();  // a killed run may have left it
   // Not before the window is shown.

@@ -105,7 +105,6 @@ class frmRx : public QMainWindow {
   void ExportGame();
   void ShowPastGames();
   /// What the board calls a member; empty if there is none with this number.
-  std::string BoardNameOf(std::int32_t contactId);
   void OpenPastGame(const PastGames::Opened& past);
   void ShowPastCharts(const PastGame& past);
   /// Exports the game on the board, a period's games, or these past ones.
@@ -228,12 +227,12 @@ class frmRx : public QMainWindow {
   QTimer waitingFileTimer_;
   Commands commands_;
   std::optional<Desk> desk_;
+  GuestList guests_;
   std::optional<GameKeeping> keeping_;
   std::optional<ArchiveAccess> archive_;  ///< for windows; the keeper has its own
   std::optional<IdleCopying> idleCopying_;
   std::string oldGamesBefore_;  ///< time before which games are still to be deleted; else empty
   std::optional<BoardCharts> charts_;
-  GuestList guests_;
   std::optional<HiddenNames> hidden_;
   std::optional<AudienceBoard> audience_;
   std::optional<ResultsHost> results_;

@@ -6,6 +6,7 @@
 #include <QMimeData>
 #include <QTimer>
 #include <QUrl>
+#include <utility>
 
 #include "app/StateKeys.h"
 #include "app/frmRx.h"
@@ -77,14 +78,16 @@ void frmRx::ShowExport(const std::vector<std::int64_t>& chosen) {
   const std::string received = desk_->Progress().Received();
   const auto game = [&](const std::function<void(const ExportedGame&)>& take) {
     const ReadScope scope(session_.DbMembers());
+    const GuestNames guestNameOf = [this](int index) { return guests_.NameOf(index); };
+    std::vector<Standing> standings = Standings(session_.Game(), nickNameOf, guestNameOf);
+    LeaveOutHidden(standings, session_.Game(), *hidden_, nickNameOf, guestNameOf);
     take({.Game = session_.Game(),
           .Received = received,
           .Mission = session_.Missions().Text(),
-          .Standings =
-              Standings(session_.Game(), nickNameOf, [this](int index) { return guests_.NameOf(index); }),
+          .Standings = std::move(standings),
           .FullNameOf = fullNameOf});
   };
-  ArchivedGames past(*archive_, session_, services_.Strings);
+  ArchivedGames past(*archive_, session_, services_.Strings, &*hidden_);
   ExportGames({.Game = session_.Game().DataPresent ? ExportGames::ThisGame(game) : nullptr,
                .SuggestedName = SuggestedFileName(received, session_.Missions().Text(), {}),
                .Past = past,

@@ -41,6 +41,7 @@ void frmRx::ShowRankings() {
                  .CommonDialog1 = services_.CommonDialog1,
                  .Disk = services_.Disk,
                  .OtherPrograms = services_.OtherPrograms,
+                 .Events = services_.Events,
                  .Strings = services_.Strings,
                  .PrintedPage = PrintedRanking(userDataFolder_)},
                 this)

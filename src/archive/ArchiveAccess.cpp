@@ -3,6 +3,7 @@
 #include <utility>
 
 #include "archive/ArchiveRoom.h"
+#include "archive/GuestRows.h"
 #include "core/text/Filled.h"
 
 /// Those of an archive without games.
@@ -48,6 +49,20 @@ PastGame ArchiveAccess::Read(std::int64_t gameId, std::int64_t state) {
                        Filled(parts_.Strings.Text(OwnText::NoArchivedGame), {std::to_string(gameId)}));
   }
   return Archive().Read(gameId, state);
+}
+
+std::string ArchiveAccess::GuestNameOf(std::int64_t gameId, int index) {
+  std::string name;
+  if (HasNamesOfGuests()) {
+    Statements().Query("SELECT GuestName FROM GamePlayers WHERE GameID = $1 AND PlayerIndex = $2",
+                       {gameId, std::int64_t{index}},
+                       [&name](const SqlRow& row) { name = CleanName(row.Text(0)); });
+  }
+  return name;
+}
+
+bool ArchiveAccess::HasNamesOfGuests() {
+  return Exists() && HasGuestNames(File());
 }
 
 NickNames ArchiveAccess::Names() const {

@@ -51,6 +51,12 @@ class ArchiveAccess {
   /// if its file is damaged.
   PastGame Read(std::int64_t gameId, std::int64_t state = 0);
 
+  /// The guest name of a player at record `index` in this game; empty without one.
+  std::string GuestNameOf(std::int64_t gameId, int index);
+
+  /// True if the archive's rows have names of guests. Valid until a first name is written.
+  bool HasNamesOfGuests();
+
   /// The public names of members as they are now, looked up by number without a box.
   NickNames Names() const;
 

@@ -1,6 +1,9 @@
 #include "archive/ArchiveQueries.h"
 
+#include <algorithm>
+#include <span>
 #include <string_view>
+#include <unordered_set>
 
 namespace {
 
@@ -13,7 +16,7 @@ class Conditions {
     text_.append(" AND ").append(condition).append("$").append(std::to_string(values_.size())).append(rest);
   }
   /// The same with a list of numbers in parentheses.
-  void AddList(std::string_view condition, const std::vector<std::int32_t>& numbers, std::string_view rest) {
+  void AddList(std::string_view condition, std::span<const std::int32_t> numbers, std::string_view rest) {
     text_.append(" AND ").append(condition);
     const char* before = "($";
     for (const std::int32_t number : numbers) {
@@ -42,6 +45,29 @@ class Conditions {
 
 int Small(const SqlRow& row, std::size_t column) {
   return static_cast<int>(row.Integer(column));
+}
+
+/// More of them are asked for in pieces: a statement takes a limited number of parameters, and a step little
+/// time.
+constexpr std::size_t MembersAtOnce = 100;
+
+/// The games in which one of these members plays, deleted ones too; none if `goOn` stops it.
+std::unordered_set<std::int64_t> GamesOfAny(Sql& sql, std::span<const std::int32_t> members,
+                                            const ArchiveQueries::Step& goOn) {
+  std::unordered_set<std::int64_t> games;
+  const auto all = static_cast<double>(members.size());
+  while (!members.empty()) {
+    if (goOn && !goOn(1 - static_cast<double>(members.size()) / all)) {
+      return {};
+    }
+    const std::span<const std::int32_t> some = members.first(std::min(members.size(), MembersAtOnce));
+    Conditions conditions;
+    conditions.AddList("MemberID IN ", some, "");
+    sql.Query("SELECT GameID FROM GamePlayers WHERE 1 = 1" + conditions.Text(), conditions.Values(),
+              [&games](const SqlRow& row) { games.insert(row.Integer(0)); });
+    members = members.subspan(some.size());
+  }
+  return games;
 }
 
 ListedGame ListedGameIn(const SqlRow& row) {
@@ -96,7 +122,7 @@ std::vector<std::string> ArchiveQueries::Missions() {
   return missions;
 }
 
-std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter) {
+std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter, const Step& goOn) {
   Conditions conditions;
   conditions.AddPeriod(filter.From, filter.Before);
   if (!filter.Mission.empty()) {
@@ -106,7 +132,8 @@ std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter) {
     conditions.Add(
         "g.GameID IN (SELECT GameID FROM GamePlayers WHERE MemberID = ", std::int64_t{filter.Member}, ")");
   }
-  if (!filter.Members.empty()) {
+  const bool manyMembers = filter.Members.size() > MembersAtOnce;
+  if (!filter.Members.empty() && !manyMembers) {
     conditions.AddList("g.GameID IN (SELECT GameID FROM GamePlayers WHERE MemberID IN ", filter.Members, ")");
   }
   if (filter.Player != 0) {
@@ -118,6 +145,10 @@ std::vector<std::int64_t> ArchiveQueries::Games(const GameFilter& filter) {
   sql_.Query("SELECT g.GameID FROM Games g WHERE " + which + conditions.Text() +
                  " ORDER BY g.Played DESC, g.GameID DESC",
              conditions.Values(), [&games](const SqlRow& row) { games.push_back(row.Integer(0)); });
+  if (manyMembers) {
+    const std::unordered_set<std::int64_t> theirs = GamesOfAny(sql_, filter.Members, goOn);
+    std::erase_if(games, [&theirs](std::int64_t game) { return !theirs.contains(game); });
+  }
   return games;
 }
 

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
@@ -77,8 +78,12 @@ class ArchiveQueries {
   /// The missions of all games, deleted ones too, by name.
   std::vector<std::string> Missions();
 
-  /// The numbers of the games, the latest first.
-  std::vector<std::int64_t> Games(const GameFilter& filter);
+  /// Asked between steps with the part done, 0 to 1; may process events. False stops them.
+  using Step = std::function<bool(double done)>;
+
+  /// The numbers of the games, the latest first. Those of many members are found in steps; none if `goOn`
+  /// stops that.
+  std::vector<std::int64_t> Games(const GameFilter& filter, const Step& goOn = {});
 
   /// The row of one of them, deleted or not; none if it has meanwhile gone.
   std::optional<ListedGame> Game(std::int64_t gameId);

@@ -4,6 +4,7 @@
 
 #include "archive/Entries.h"
 #include "archive/GameInputs.h"
+#include "archive/GuestRows.h"
 #include "core/gamefile/GameFile.h"
 #include "core/text/Filled.h"
 #include "platform/RuntimeError.h"
@@ -89,6 +90,7 @@ PastGame GameArchive::Read(std::int64_t gameId, std::int64_t state) {
                         .Accuracy = row.Real(5),
                         .FriendlyFire = row.Real(6)};
       });
+  past.Guests = GuestNamesOf(archive_, gameId);
   past.Mission = ReadGame(files.front().Name, past.Game);
   past.Game.DataPresent = true;
   try {

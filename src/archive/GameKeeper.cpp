@@ -4,37 +4,11 @@
 #include <utility>
 
 #include "archive/ArchiveQueries.h"
+#include "archive/FigureDigests.h"
 #include "archive/KeepingFailure.h"
-#include "core/game/WordDigest.h"
 #include "platform/RuntimeError.h"
 
 namespace {
-
-std::uint64_t RawDigest(const Player& player) {
-  WordDigest digest;
-  for (const std::int32_t figure :
-       {player.ShotCount, player.HealCount, player.AmmoAddCount, player.AdminKillCount, player.RespawnCount,
-        player.DeathCount, player.RunCounter, player.ExplosiveDamage, player.RadiationDamage,
-        player.StunCount}) {
-    digest.Add(figure);
-  }
-  for (const std::int32_t damage : player.HitByPlayer) {
-    digest.Add(damage);
-  }
-  return digest.Value();
-}
-
-std::uint64_t FiguresDigest(const Game& game) {
-  WordDigest digest;
-  for (const Player& player : game.Players) {
-    if (player.Active) {
-      digest.Add(player.TotalDamage);
-      digest.Add(player.AbsoluteDamage);
-      digest.Add(player.Soldiering);
-    }
-  }
-  return digest.Value();
-}
 
 /// True as long as it exists.
 class Flagged {
@@ -52,6 +26,7 @@ class Flagged {
 
 GameKeeper::GameKeeper(Parts parts)
     : parts_(std::move(parts)),
+      guests_(parts_.Guests),
       copy_({parts_.Disk, parts_.Time, parts_.Strings, parts_.UserDataFolder}),
       subscription_(parts_.Session.Listen([this](SessionChange change) { Hear(change); })) {
   parts_.Session.BeforeClear = [this] { Keep(); };
@@ -86,6 +61,7 @@ void GameKeeper::Hear(SessionChange change) {
 void GameKeeper::Forget() {
   gameId_.reset();
   kept_.reset();
+  guests_.Forget();
   state_.KeptAt.clear();
   source_ = GameSource::Cable;
   pulls_ = 0;
@@ -197,6 +173,17 @@ void GameKeeper::KeepAs(const Game& game) {
     Try([&] { Write(game, now); });
   } else {
     SeeWhetherItWorksAgain();
+  }
+  if (gameId_ && kept_ && state_.Failure.empty() && guests_.HaveChanged(*gameId_)) {
+    Try([this] { KeepGuests(); });
+  }
+}
+
+void GameKeeper::KeepGuests() {
+  CheckRoom();
+  Database& archive = OpenFile();
+  if (PlayedIn(archive.Statements(), *gameId_) == played_) {  // else the archive has become another one
+    guests_.Keep(archive, *gameId_);
   }
 }
 

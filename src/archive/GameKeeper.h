@@ -12,6 +12,7 @@
 #include "archive/GameArchive.h"
 #include "archive/GamePersons.h"
 #include "archive/MemberCheck.h"
+#include "archive/GuestRows.h"
 #include "archive/WeeklyCopy.h"
 #include "core/game/GameProgress.h"
 #include "core/game/Session.h"
@@ -44,6 +45,7 @@ class GameKeeper {
     const StringTable& Strings;
     std::string UserDataFolder;
     std::string ProgramFolder;
+    const GuestList* Guests = nullptr;  ///< names in the game on the board; null where nobody enters any
   };
 
   static constexpr std::uint64_t LeastFreeSpace = ::LeastFreeSpace;
@@ -137,6 +139,8 @@ class GameKeeper {
   bool Recognise(GameArchive& archive, const Game& game, bool isLoaded);
   /// Finds that game, and goes on with it. True if the archive has just the same.
   bool GoOnWith(GameArchive& archive, const Game& game, const std::string& missionName);
+  /// Names of guests alone make no other state of the game, nor other figures.
+  void KeepGuests();
   void NotePulls();
   FormerState FormerOf(const Marks& now, const Game& game) const;
   /// Digest of a game's inputs but for commits.
@@ -168,6 +172,7 @@ class GameKeeper {
   const Parts parts_;
   ArchiveFile file_;
   KeptState state_;
+  KeptGuests guests_;
   WeeklyCopy copy_;                     ///< of the open file
   std::optional<std::int64_t> gameId_;  ///< of the game on the board, once it is kept
   std::string played_;                  ///< in its row; no other archive has that number with that time

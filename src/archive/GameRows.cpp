@@ -54,6 +54,20 @@ SqlValues SummaryOf(const GameState& state, const std::string& inputsHash) {
           inputsHash};
 }
 
+/// Rows of guns that take no part any more.
+void DeleteOthers(Sql& sql, std::int64_t gameId, const Game& game) {
+  std::vector<std::int64_t> others;
+  sql.Query("SELECT PlayerIndex FROM GamePlayers WHERE GameID = $1", {gameId}, [&](const SqlRow& row) {
+    const std::int64_t index = row.Integer(0);
+    if (index < 1 || index > PlayerCount || !game.Players(static_cast<int>(index)).Active) {
+      others.push_back(index);
+    }
+  });
+  for (const std::int64_t index : others) {
+    sql.Change("DELETE FROM GamePlayers WHERE GameID = $1 AND PlayerIndex = $2", {gameId, index});
+  }
+}
+
 }  // namespace
 
 std::int64_t InsertGame(Sql& sql, const GameState& state, const std::string& inputsHash) {
@@ -80,7 +94,7 @@ bool UpdateGame(Sql& sql, std::int64_t gameId, const GameState& state, const std
 }
 
 void WritePlayers(Sql& sql, std::int64_t gameId, const Game& game) {
-  sql.Change("DELETE FROM GamePlayers WHERE GameID = $1", {gameId});
+  DeleteOthers(sql, gameId, game);
   std::vector<Standing> standings = StandingsOf(game);
   std::ranges::sort(standings, {}, &Standing::Index);  // the order of the rows in the file
   for (const Standing& standing : standings) {
@@ -89,12 +103,22 @@ void WritePlayers(Sql& sql, std::int64_t gameId, const Game& game) {
     sql.Change(
         "INSERT INTO GamePlayers (GameID, PlayerIndex, MemberID, DallasID, Place, Soldiering, Accuracy, "
         "DamageDealt, DamageTaken, Shots, Wia, Kia, AmmoAdds, Committed) VALUES "
-        "($1, $2, $3, $4, $5, $6, $7, $8, $9, $10, $11, $12, $13, $14)",
+        "($1, $2, $3, $4, $5, $6, $7, $8, $9, $10, $11, $12, $13, $14) "
+        "ON CONFLICT (GameID, PlayerIndex) DO UPDATE SET MemberID = $3, DallasID = $4, Place = $5, "
+        "Soldiering = $6, Accuracy = $7, DamageDealt = $8, DamageTaken = $9, Shots = $10, Wia = $11, "
+        "Kia = $12, AmmoAdds = $13, Committed = $14",
         {gameId, whole(standing.Index), whole(player.MemberIndex), player.DallasID, whole(standing.Place),
          whole(standing.Soldiering), standing.Accuracy ? Value(double{*standing.Accuracy}) : Value(),
          whole(standing.DamageDealt), whole(standing.DamageTaken), whole(standing.Shots), whole(standing.Wia),
          whole(standing.Kia), whole(standing.AmmoAdds), whole(player.Committed ? 1 : 0)});
   }
+}
+
+std::string PlayedIn(Sql& sql, std::int64_t gameId) {
+  std::string played;
+  sql.Query("SELECT Played FROM Games WHERE GameID = $1 AND Deleted IS NULL", {gameId},
+            [&played](const SqlRow& row) { played = row.Text(0); });
+  return played;
 }
 
 std::vector<std::int32_t> MembersIn(const Game& game) {

@@ -28,8 +28,11 @@ std::int64_t InsertGame(Sql& sql, const GameState& state, const std::string& inp
 /// false if there is no such game.
 bool UpdateGame(Sql& sql, std::int64_t gameId, const GameState& state, const std::string& inputsHash);
 
-/// Writes the rows of the game's players anew.
+/// Writes the rows of the game's players; names of guests stay in them.
 void WritePlayers(Sql& sql, std::int64_t gameId, const ::Game& game);
+
+/// When the game was played; empty if the archive has no such game, or has deleted it.
+std::string PlayedIn(Sql& sql, std::int64_t gameId);
 
 /// The numbers of all members who play in the game, ascending, each once.
 std::vector<std::int32_t> MembersIn(const ::Game& game);

@@ -1,6 +1,7 @@
 // What the archive does about persons in its games: numbers that changed hands, and members to be forgotten.
 
 #include "archive/GameArchive.h"
+#include "archive/GuestRows.h"
 #include "core/game/DallasId.h"
 #include "platform/RuntimeError.h"
 #include "platform/Sql.h"
@@ -30,6 +31,9 @@ bool GameArchive::LookIntoRows(std::int64_t gameId, const GamePersons& persons, 
         sql.Change("UPDATE GamePlayers SET DallasID = $3 WHERE GameID = $1 AND PlayerIndex = $2",
                    {gameId, player, std::string(NoDallasId)});
       }
+    }
+    if (persons.TakesButtons && !players.empty()) {
+      ForgetGuestNames(archive_, gameId, players);
     }
   }
   return !players.empty();

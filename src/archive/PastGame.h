@@ -4,6 +4,8 @@
 #include <string>
 
 #include "core/game/Game.h"
+#include "core/game/GuestList.h"
+#include "core/game/PublicName.h"
 #include "core/game/SoldieringFactors.h"
 
 /// A game of the archive, its scores as they were when it was kept: calculating them anew would give those of
@@ -18,6 +20,15 @@ struct PastGame {
   ::Game Game;
   /// Of which the figures of the last state were made. Those of earlier states may have been made of others.
   SoldieringFactors Factors;
+  GuestList::Names Guests;  ///< of the last state
+
+  /// Valid as long as the game.
+  GuestNames NamesOfGuests() const {
+    return [this](int index) {
+      const auto found = Guests.find(index);
+      return found == Guests.end() ? std::string() : found->second;
+    };
+  }
 };
 
 /// Completes what game files do not tell of a game, its figures as the file has them: all damage that each

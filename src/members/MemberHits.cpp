@@ -1,9 +1,12 @@
 #include "members/MemberHits.h"
 
+#include <string_view>
+
 #include "core/data/FieldValue.h"
 #include "core/data/Photo.h"
 #include "members/MemberQueries.h"
 #include "platform/RuntimeError.h"
+#include "platform/Sql.h"
 
 namespace {
 
@@ -20,6 +23,23 @@ MemberHit ReadHit(Recordset& row) {
 }
 
 }  // namespace
+
+std::vector<std::int32_t> MembersCalled(Database& dbMembers, const std::string& text) {
+  const std::string query =
+      "SELECT ContactID FROM Members" + HitsQuery(text).substr(std::string_view(AllMembers).size());
+  std::vector<std::int32_t> numbers;
+  try {
+    dbMembers.Statements().Query(query, {}, [&numbers](const SqlRow& row) {
+      numbers.push_back(static_cast<std::int32_t>(row.Integer(0)));
+    });
+  } catch (const RuntimeError& error) {
+    if (error.Number() != Fault::InvalidPattern) {
+      throw;
+    }
+    numbers.clear();  // an incomplete pattern
+  }
+  return numbers;
+}
 
 void MemberHits::Search(const std::string& text) {
   try {

@@ -4,6 +4,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "platform/Database.h"
 
@@ -18,6 +19,9 @@ struct MemberHit {
 
   std::string Name() const { return FirstName + " " + LastName; }
 };
+
+/// The numbers of all members that Search finds for `text`, however many. Throws RuntimeError as Sql does.
+std::vector<std::int32_t> MembersCalled(Database& dbMembers, const std::string& text);
 
 /// The members found for the text in the search box, in table order, through a cursor of their own that never
 /// writes. Nothing here throws for a fault of the database, since this is looked up while the operator types:

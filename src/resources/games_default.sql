@@ -35,7 +35,8 @@ CREATE INDEX GamesByPlayed ON Games (Played, Deleted);
 CREATE INDEX GamesByMission ON Games (Mission, Played);
 
 -- A row for each player of a game; PlayerIndex is the record, 1 to 224. MemberID is 0 for a guest. Accuracy is
--- a fraction, NULL where there is none. The rows of a game lie side by side.
+-- a fraction, NULL where there is none. GuestName is the name that the operator gave a player for this game, NULL
+-- for most; archives of old lack the column until the first such name. The rows of a game lie side by side.
 CREATE TABLE GamePlayers (
   GameID INTEGER NOT NULL,
   PlayerIndex INTEGER NOT NULL,
@@ -51,6 +52,7 @@ CREATE TABLE GamePlayers (
   Kia INTEGER NOT NULL,
   AmmoAdds INTEGER NOT NULL,
   Committed INTEGER NOT NULL,
+  GuestName TEXT,
   PRIMARY KEY (GameID, PlayerIndex)
 ) WITHOUT ROWID;
 

@@ -4,27 +4,50 @@
 #include <QClipboard>
 #include <QGuiApplication>
 #include <QStringList>
+#include <optional>
 
-QString RowsAsText(const QAbstractItemView& list) {
+namespace {
+
+/// Nothing if `goOn` ended it.
+std::optional<QString> TextOfRows(const QAbstractItemView& list,
+                                  const std::function<bool(double done)>& goOn) {
   const QAbstractItemModel& rows = *list.model();
   QStringList cells;
   for (int column = 0; column < rows.columnCount(); ++column) {
     cells.append(rows.headerData(column, Qt::Horizontal).toString());
   }
-  QStringList lines = {cells.join(QLatin1Char('\t'))};
+  QString text = cells.join(QLatin1Char('\t')) + QLatin1Char('\n');
   const bool all = !list.selectionModel()->hasSelection();
-  for (int row = 0; row < rows.rowCount(); ++row) {
+  const int count = rows.rowCount();
+  for (int row = 0; row < count; ++row) {
+    if (!goOn(static_cast<double>(row) / count)) {
+      return std::nullopt;
+    }
     if (all || list.selectionModel()->isRowSelected(row)) {
       cells.clear();
       for (int column = 0; column < rows.columnCount(); ++column) {
         cells.append(rows.index(row, column).data().toString());
       }
-      lines.append(cells.join(QLatin1Char('\t')));
+      text.append(cells.join(QLatin1Char('\t'))).append(QLatin1Char('\n'));
     }
   }
-  return lines.join(QLatin1Char('\n')) + QLatin1Char('\n');
+  return text;
+}
+
+}  // namespace
+
+QString RowsAsText(const QAbstractItemView& list) {
+  return *TextOfRows(list, [](double) { return true; });
 }
 
 void CopyRows(const QAbstractItemView& list) {
   QGuiApplication::clipboard()->setText(RowsAsText(list));
+}
+
+bool CopyRowsInSteps(const QAbstractItemView& list, const std::function<bool(double done)>& goOn) {
+  const std::optional<QString> text = TextOfRows(list, goOn);
+  if (text) {
+    QGuiApplication::clipboard()->setText(*text);
+  }
+  return text.has_value();
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QString>
+#include <functional>
 
 class QAbstractItemView;
 
@@ -10,3 +11,7 @@ QString RowsAsText(const QAbstractItemView& list);
 
 /// Puts them on the clipboard.
 void CopyRows(const QAbstractItemView& list);
+
+/// The same for a list of any length: `goOn` is asked between rows with the part done, 0 to 1, and may
+/// process events that do not change the rows. Returns false, with the clipboard as it was, if it says so.
+bool CopyRowsInSteps(const QAbstractItemView& list, const std::function<bool(double done)>& goOn);

@@ -215,11 +215,11 @@ TEST_P(GamesOnThePage, HasTheRankingOfTheMonthWhereItIsWanted) {
                              "', '', '', 'Cable', 1, 2, 0, 0, 0, 0, 1, 1, 1, 1, 1, 1, 1, '', NULL)");
     venue.ChangeDatabase("games.mdb",
                          "INSERT INTO GamePlayers SELECT max(GameID), 1, 4711, '', 1, 350, 0.5, 1, 1, 1, 1, "
-                         "1, 1, 0 FROM Games");
+                         "1, 1, 0, NULL FROM Games");
     venue.ChangeDatabase(
         "games.mdb",
         "INSERT INTO GamePlayers SELECT max(GameID), 2, 4712, '', 2, 20, 0.5, 1, 1, 1, 1, 1, "
-        "1, 0 FROM Games");
+        "1, 0, NULL FROM Games");
   }
   StartAgain();
   Serve();

@@ -105,6 +105,24 @@ TEST_F(AskedArchive, FindsGamesByPeriodMissionMemberAndGun) {
   EXPECT_THAT(queries.Games({.Members = {7, 8}}), IsEmpty());
 }
 
+TEST_F(AskedArchive, FindsTheGamesOfMoreMembersThanAStatementTakes) {
+  std::vector<std::int32_t> many;
+  for (std::int32_t member = 100; member < 40'000; ++member) {
+    many.push_back(member);
+  }
+  EXPECT_THAT(queries.Games({.Members = many}), IsEmpty());
+  many.push_back(6);
+  EXPECT_THAT(queries.Games({.Members = many}), ElementsAre(4, 3));
+  many.insert(many.begin(), 5);
+  EXPECT_THAT(queries.Games({.Mission = "None", .Members = many}), ElementsAre(4, 1));
+  Delete(4);
+  EXPECT_THAT(queries.Games({.Members = many}), ElementsAre(3, 2, 1));
+  int steps = 0;
+  EXPECT_THAT(queries.Games({.Members = many}, [&steps](double done) { return done < 0.5 && ++steps > 0; }),
+              IsEmpty());
+  EXPECT_GT(steps, 10);
+}
+
 TEST_F(AskedArchive, TellsAGame) {
   const std::optional<ListedGame> game = queries.Game(2);
   ASSERT_TRUE(game);

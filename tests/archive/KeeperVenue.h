@@ -32,7 +32,7 @@ class KeeperVenue : public testing::Test {
   void Start() {
     keeper.reset();
     keeper.emplace(GameKeeper::Parts{session, *progress, venue.Time, disk, venue.Databases, venue.Strings,
-                                     venue.Folder.Path(), venue.Folder / "program"});
+                                     venue.Folder.Path(), venue.Folder / "program", guestsOnBoard});
   }
 
   /// A game comes in by cable: Red 0 and Blue 7, who hit Red 0.
@@ -84,5 +84,6 @@ class KeeperVenue : public testing::Test {
   Session& session = venue.session;
   TightDisk disk;
   std::optional<GameProgress> progress;
+  const GuestList* guestsOnBoard = nullptr;
   std::optional<GameKeeper> keeper;
 };

@@ -43,6 +43,17 @@ TEST_F(Hits, AreNoneForAPatternThatIsNotComplete) {
   EXPECT_EQ(Found("[a]"), "Belmont ");
 }
 
+TEST_F(Hits, AreAllTheirNumbersHoweverMany) {
+  file.Execute(
+      "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 1500) INSERT INTO Members "
+      "(ContactID, FirstName, LastName) SELECT i + 1000, 'Zo', 'Adams' FROM n");
+  EXPECT_EQ(MembersCalled(*database, "zo").size(), 1500U);
+  EXPECT_EQ(MembersCalled(*database, "mole"), std::vector<std::int32_t>{2});
+  EXPECT_EQ(MembersCalled(*database, "o'b").size(), 1U);
+  EXPECT_TRUE(MembersCalled(*database, "[a").empty());
+  EXPECT_TRUE(MembersCalled(*database, "nobody").empty());
+}
+
 TEST_F(Hits, TellWhatTheListShows) {
   file.Execute(
       "UPDATE Members SET LastPlayedDate = '2026-11-20 20:15:00', PhotographLength = 3, Photograph = "

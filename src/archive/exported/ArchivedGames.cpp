@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <string_view>
 #include <unordered_set>
+#include <utility>
 
 #include "core/game/PublicName.h"
 #include "core/game/Standings.h"
@@ -17,12 +18,15 @@ std::string_view TextIn(const SqlRow& row, std::size_t column) {
 }
 
 /// The players of so many games.
-std::string FiguresQuery() {
+std::string FiguresQuery(bool hasGuestNames) {
   std::string query =
       "SELECT g.GameID, g.Played, g.DateText, g.Mission, p.Place, p.PlayerIndex, p.MemberID, p.DallasID, "
       "p.Soldiering, p.Accuracy, p.DamageDealt, p.Shots, p.Wia, p.Kia, p.AmmoAdds, p.Committed, "
-      "p.DamageTaken FROM Games g CROSS JOIN GamePlayers p WHERE p.GameID = g.GameID AND g.Deleted IS NULL "
-      "AND g.GameID IN (";
+      "p.DamageTaken, ";
+  query.append(hasGuestNames ? "p.GuestName" : "NULL")
+      .append(
+          " FROM Games g CROSS JOIN GamePlayers p WHERE p.GameID = g.GameID AND g.Deleted IS NULL "
+          "AND g.GameID IN (");
   for (std::size_t number = 1; number <= ExportSource::FiguresAtOnce; ++number) {
     query.append(number == 1 ? "$" : ", $").append(std::to_string(number));
   }
@@ -51,8 +55,9 @@ PlayerFigures FiguresIn(const SqlRow& row) {
 
 }  // namespace
 
-ArchivedGames::ArchivedGames(ArchiveAccess& archives, Session& session, const StringTable& strings)
-    : archives_(archives), session_(session) {
+ArchivedGames::ArchivedGames(ArchiveAccess& archives, Session& session, const StringTable& strings,
+                             const HiddenNames* hidden)
+    : archives_(archives), session_(session), hidden_(hidden) {
   const Game empty(strings);
   for (int index = 1; index <= PlayerCount; ++index) {
     guns_[static_cast<std::size_t>(index - 1)] = GunName(empty, index);
@@ -80,16 +85,20 @@ std::vector<std::int64_t> ArchivedGames::Of(const std::string& firstDay, const s
 void ArchivedGames::Read(std::int64_t gameId, const std::function<void(const ExportedGame&)>& take) {
   const PastGame past = archives_.Read(gameId);
   const ReadScope scope(session_.DbMembers());
+  std::vector<Standing> standings = Standings(past.Game, archives_.Names(), past.NamesOfGuests());
+  if (hidden_ != nullptr) {
+    LeaveOutHidden(standings, past.Game, *hidden_, archives_.Names(), past.NamesOfGuests());
+  }
   take({.Game = past.Game,
         .Received = past.Played,
         .Mission = past.Mission,
-        .Standings = Standings(past.Game, archives_.Names()),
+        .Standings = std::move(standings),
         .FullNameOf = [this](std::int32_t contactId) { return FullNameOf(contactId); }});
 }
 
 void ArchivedGames::ReadFigures(const std::vector<std::int64_t>& games, bool fullNames,
                                 const std::function<void(const PlayerFigures&)>& take) {
-  static const std::string query = FiguresQuery();
+  static const std::string queries[] = {FiguresQuery(false), FiguresQuery(true)};
   if (games.empty()) {
     return;
   }
@@ -98,9 +107,12 @@ void ArchivedGames::ReadFigures(const std::vector<std::int64_t>& games, bool ful
     numbers.emplace_back(games[std::min(place, games.size() - 1)]);
   }
   const ReadScope scope(session_.DbMembers());
+  const std::string& query = queries[archives_.HasNamesOfGuests() ? 1 : 0];
   archives_.Statements().Query(query, numbers, [&](const SqlRow& row) {
     PlayerFigures figures = FiguresIn(row);
-    figures.Name = NameOf(figures.Member, figures.Index);
+    constexpr std::size_t guestColumn = 17;
+    const std::string name = NameShown(figures.Member, TextIn(row, guestColumn));
+    figures.Name = name.empty() ? GunAt(figures.Index) : name;
     if (fullNames) {
       figures.Person = KnownFullName(figures.Member);
     }
@@ -121,13 +133,27 @@ const FullName& ArchivedGames::KnownFullName(std::int64_t contactId) {
   return found->second;
 }
 
-const std::string& ArchivedGames::NameOf(std::int64_t contactId, int index) {
+const std::string& ArchivedGames::GunAt(int index) const {
   if (index < 1 || index > PlayerCount) {
     throw RuntimeError(Fault::SubscriptOutOfRange);
   }
+  return guns_[static_cast<std::size_t>(index - 1)];
+}
+
+std::string ArchivedGames::NameShown(std::int64_t contactId, std::string_view guest) {
+  const std::string& nickName = NickNameOf(contactId);
+  if (hidden_ == nullptr) {
+    return nickName.empty() && !guest.empty() ? CleanName(guest) : nickName;
+  }
+  return hidden_->NameShown({.Member = static_cast<std::int32_t>(contactId),
+                             .NickName = nickName,
+                             .GuestName = guest.empty() ? std::string() : CleanName(guest)});
+}
+
+const std::string& ArchivedGames::NickNameOf(std::int64_t contactId) {
   const auto [found, isNew] = names_.try_emplace(contactId);
   if (isNew && contactId != 0) {
     found->second = CleanName(session_.Members().NickNameOf(static_cast<std::int32_t>(contactId)));
   }
-  return found->second.empty() ? guns_[static_cast<std::size_t>(index - 1)] : found->second;
+  return found->second;
 }

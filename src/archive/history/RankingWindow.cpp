@@ -1,6 +1,8 @@
 #include "archive/history/RankingWindow.h"
 
 #include <QHeaderView>
+#include <QPointer>
+#include <QScopeGuard>
 #include <filesystem>
 #include <utility>
 
@@ -10,6 +12,7 @@
 #include "platform/RuntimeError.h"
 #include "ui/Announce.h"
 #include "ui/Captions.h"
+#include "ui/RunProgress.h"
 #include "ui/Text.h"
 #include "ui/WaitCursor.h"
 #include "ui_RankingWindow.h"
@@ -25,15 +28,23 @@ RankingWindow::RankingWindow(const Parts& parts, QWidget* parent)
   ui_->RankingTable->setModel(rows_);
   ui_->RankingTable->horizontalHeader()->setSectionResizeMode(1, QHeaderView::Stretch);
   FillPeriods();
-  const auto refresh = [this] { commands_.Run([this] { Refresh(); }); };
+  const auto refresh = [this] {
+    if (!commands_.Running()) {
+      commands_.Run([this] { Refresh(); });
+    }
+  };
   connect(ui_->Period, &QComboBox::currentIndexChanged, this, refresh);
   connect(ui_->Order, &QComboBox::currentIndexChanged, this, refresh);
   connect(ui_->LeastGames, &QSpinBox::valueChanged, this, refresh);
   commands_.Connect(*this,
                     {{ui_->PrintButton, &RankingWindow::Print}, {ui_->ExportButton, &RankingWindow::Export}});
   commands_.EscapePresses(*ui_->CloseButton);
+  commands_.EndWaits = [this] { stopped_ = true; };
+  connect(ui_->Stop, &QPushButton::clicked, this, [this] { stopped_ = true; });
+  ui_->Progress->hide();
+  ui_->Stop->hide();
   connect(ui_->CloseButton, &QPushButton::clicked, this, &QDialog::reject);
-  Refresh();
+  refresh();
 }
 
 RankingWindow::~RankingWindow() = default;
@@ -49,6 +60,7 @@ void RankingWindow::SetTexts() {
   ui_->NoteLabel->setText(text(OwnText::RankingNote));
   ui_->FullNames->setText(text(OwnText::RankingNames));
   ui_->PrintButton->setText(text(OwnText::RankingPrint));
+  ui_->Stop->setText(text(OwnText::Stop));
   ui_->ExportButton->setText(text(OwnText::GameExportButton));
   SetCaptions(parts_.Strings, {{ui_->CloseButton, 137}});
 }
@@ -74,12 +86,48 @@ void RankingWindow::FillPeriods() {
   ui_->Period->addItem(Text(parts_.Strings, OwnText::RankingAllTime), QString());
 }
 
-std::vector<RankedFigures> RankingWindow::Read(RankedBy by) {
+std::optional<std::vector<RankedFigures>> RankingWindow::Read(RankedBy by) {
   const std::string period = ui_->Period->currentData().toString().toStdString();
+  Sql& members = parts_.DbMembers.Statements();
   if (!period.empty()) {
-    return FiguresOfPeriod(parts_.Archive(), period);
+    return InSteps([&](const RankingStep& goOn) { return FiguresInSteps(parts_.Archive(), period, goOn); });
   }
-  return FiguresOfLifetime(parts_.DbMembers.Statements(), by == RankedBy::Best ? &parts_.Archive() : nullptr);
+  if (by != RankedBy::Best) {
+    return FiguresOfLifetime(members, nullptr);
+  }
+  return InSteps([&](const RankingStep& goOn) { return LifetimeInSteps(members, parts_.Archive(), goOn); });
+}
+
+std::optional<std::vector<RankedFigures>> RankingWindow::InSteps(
+    const std::function<std::optional<std::vector<RankedFigures>>(const RankingStep& goOn)>& read) {
+  std::optional<RunProgress> progress;
+  const QPointer<QWidget> focused = focusWidget();
+  const auto ended = qScopeGuard([&] {
+    if (progress) {
+      progress.reset();
+      EnableAll(true);
+      if (focused) {
+        focused->setFocus();
+      }
+    }
+  });
+  return read([&](double done) {
+    if (!progress && done > 0) {  // a single step needs none
+      EnableAll(false);
+      progress.emplace(*ui_->Progress, *ui_->Stop, parts_.Events, stopped_);
+      ui_->Stop->setFocus();
+    }
+    return !progress || progress->GoOn(done);
+  });
+}
+
+void RankingWindow::EnableAll(bool enabled) {
+  for (QWidget* control : std::initializer_list<QWidget*>{ui_->Period, ui_->Order, ui_->LeastGames,
+                                                          ui_->RankingTable, ui_->FullNames, ui_->PrintButton,
+                                                          ui_->ExportButton, ui_->CloseButton}) {
+    control->setEnabled(enabled);
+  }
+  ui_->Stop->setVisible(!enabled);
 }
 
 void RankingWindow::Refresh() {
@@ -88,9 +136,13 @@ void RankingWindow::Refresh() {
   std::string state;
   ranked_.clear();
   try {
-    ranked_ = Ranked(Read(by), by, ui_->LeastGames->value());
-    NameRanked(ranked_, parts_.DbMembers, parts_.Hides);
-    state = ranked_.empty() ? parts_.Strings.Text(OwnText::RankingNobody) : std::string();
+    if (const std::optional<std::vector<RankedFigures>> figures = Read(by)) {
+      ranked_ = Ranked(*figures, by, ui_->LeastGames->value());
+      NameRanked(ranked_, parts_.DbMembers, parts_.Hides);
+      state = ranked_.empty() ? parts_.Strings.Text(OwnText::RankingNobody) : std::string();
+    } else {
+      state = parts_.Strings.Text(OwnText::RankingStopped);
+    }
   } catch (const RuntimeError& error) {
     ranked_.clear();
     state = error.what();

@@ -3,12 +3,14 @@
 #include <QDialog>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
 #include "archive/history/Rankings.h"
 #include "core/text/StringTable.h"
 #include "platform/Database.h"
+#include "platform/EventPump.h"
 #include "platform/FileDialog.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
@@ -36,6 +38,7 @@ class RankingWindow : public QDialog {
     FileDialog& CommonDialog1;
     Files& Disk;
     Programs& OtherPrograms;
+    EventPump& Events;
     const StringTable& Strings;
     std::string PrintedPage;  ///< path of the file that is opened in the browser to be printed
   };
@@ -50,7 +53,12 @@ class RankingWindow : public QDialog {
   /// The months and years of the archive, and all time.
   void FillPeriods();
   void Refresh();
-  std::vector<RankedFigures> Read(RankedBy by);
+  /// Nothing if the operator stopped it.
+  std::optional<std::vector<RankedFigures>> Read(RankedBy by);
+  /// While games of many months are read, the window is painted and takes nothing but Stop.
+  std::optional<std::vector<RankedFigures>> InSteps(
+      const std::function<std::optional<std::vector<RankedFigures>>(const RankingStep& goOn)>& read);
+  void EnableAll(bool enabled);
   std::string Title() const;
   bool TakeFullNames();
   void Print();
@@ -63,4 +71,5 @@ class RankingWindow : public QDialog {
   Commands commands_;
   HistoryRows* rows_;
   std::vector<RankedMember> ranked_;
+  bool stopped_ = false;
 };

@@ -23,12 +23,92 @@ std::string Digits(int number, std::size_t width) {
   return digits.insert(0, digits.size() < width ? width - digits.size() : 0, '0');
 }
 
-std::map<std::int32_t, double> BestsOfAllKept(Sql& archive) {
-  std::map<std::int32_t, double> bests;
-  for (const MemberPeriod& member : ArchiveQueries(archive).Period({}, {})) {
-    bests[member.Member] = static_cast<double>(member.SoldieringBest);
+/// Of a period that is a year.
+constexpr std::size_t YearDigits = 4;
+
+using MembersInPeriod = std::map<std::int32_t, MemberPeriod>;
+
+void AddPeriod(MembersInPeriod& all, const MemberPeriod& part) {
+  const auto [found, isNew] = all.try_emplace(part.Member, part);
+  if (isNew) {
+    return;
   }
-  return bests;
+  MemberPeriod& sum = found->second;
+  sum.Games += part.Games;
+  sum.SoldieringSum += part.SoldieringSum;
+  sum.SoldieringBest = std::max(sum.SoldieringBest, part.SoldieringBest);
+  sum.AccuracySum += part.AccuracySum;
+  sum.AccuracyGames += part.AccuracyGames;
+}
+
+/// The first month with a game that is not before `earliest`; empty without one.
+std::string MonthFrom(Sql& archive, const std::string& earliest) {
+  constexpr std::size_t length = 7;
+  std::string month;
+  archive.Query("SELECT min(Played) FROM Games WHERE Played >= $1", {earliest},
+                [&month](const SqlRow& row) { month = row.Text(0).substr(0, length); });
+  return month;
+}
+
+/// The months of a month or year; all with games where `period` is empty.
+std::vector<std::string> MonthsIn(Sql& archive, const std::string& period) {
+  constexpr int lastMonth = 12;
+  std::vector<std::string> months;
+  if (period.empty()) {
+    // From one to the next in the index, however many games each has.
+    for (std::string next = MonthFrom(archive, {}); !next.empty();) {
+      months.push_back(next);
+      const std::string later = PeriodAfter(next);
+      next = later > next ? MonthFrom(archive, later) : std::string();
+    }
+  } else if (period.size() > YearDigits) {
+    months.push_back(period);
+  } else {
+    for (int month = 1; month <= lastMonth; ++month) {
+      months.push_back(period + "-" + Digits(month, 2));
+    }
+  }
+  return months;
+}
+
+/// Month by month; nothing if `goOn` ended it.
+std::optional<MembersInPeriod> ReadMonths(Sql& archive, const std::string& period, const RankingStep& goOn) {
+  ArchiveQueries queries(archive);
+  const std::vector<std::string> months = MonthsIn(archive, period);
+  MembersInPeriod members;
+  for (std::size_t read = 0; read < months.size(); ++read) {
+    if (!goOn(static_cast<double>(read) / static_cast<double>(months.size()))) {
+      return std::nullopt;
+    }
+    for (const MemberPeriod& member : queries.Period(months[read], PeriodAfter(months[read]))) {
+      AddPeriod(members, member);
+    }
+  }
+  return members;
+}
+
+bool WithoutStop(double /*done*/) {
+  return true;
+}
+
+std::vector<RankedFigures> Lifetimes(Sql& members, const MembersInPeriod& kept) {
+  std::vector<RankedFigures> figures;
+  members.Query(
+      "SELECT ContactID, TotalGamesPlayed, TotalSoldiering, TotalPrimaryAccuracy, PriZeroAccuracyCount "
+      "FROM Members WHERE TotalGamesPlayed > 0",
+      {}, [&](const SqlRow& row) {
+        RankedFigures& of = figures.emplace_back();
+        of.Member = static_cast<std::int32_t>(row.Integer(0));
+        of.Games = static_cast<std::int64_t>(NumberOf(row[1]));
+        of.Sum = NumberOf(row[2]);
+        if (const double accurate = static_cast<double>(of.Games) - NumberOf(row[4]); accurate > 0) {
+          of.Accuracy = NumberOf(row[3]) / accurate;
+        }
+        if (const auto best = kept.find(of.Member); best != kept.end()) {
+          of.Best = static_cast<double>(best->second.SoldieringBest);
+        }
+      });
+  return figures;
 }
 
 /// For more than these the table of members is read once, instead of a row for each.
@@ -55,22 +135,26 @@ std::vector<RankedMember> Ranked(const std::vector<RankedFigures>& figures, Rank
 }
 
 std::string PeriodAfter(const std::string& period) {
-  constexpr std::size_t yearDigits = 4;
   constexpr int lastMonth = 12;
-  const int year = NumberInPeriod(std::string_view(period).substr(0, yearDigits));
-  if (period.size() <= yearDigits) {
-    return Digits(year + 1, yearDigits);
+  const int year = NumberInPeriod(std::string_view(period).substr(0, YearDigits));
+  if (period.size() <= YearDigits) {
+    return Digits(year + 1, YearDigits);
   }
-  const int month = NumberInPeriod(std::string_view(period).substr(yearDigits + 1));
-  return month < lastMonth ? Digits(year, yearDigits) + "-" + Digits(month + 1, 2)
-                           : Digits(year + 1, yearDigits) + "-01";
+  const int month = NumberInPeriod(std::string_view(period).substr(YearDigits + 1));
+  return month < lastMonth ? Digits(year, YearDigits) + "-" + Digits(month + 1, 2)
+                           : Digits(year + 1, YearDigits) + "-01";
 }
 
-std::vector<RankedFigures> FiguresOfPeriod(Sql& archive, const std::string& period) {
+std::optional<std::vector<RankedFigures>> FiguresInSteps(Sql& archive, const std::string& period,
+                                                         const RankingStep& goOn) {
+  const std::optional<MembersInPeriod> members = ReadMonths(archive, period, goOn);
+  if (!members) {
+    return std::nullopt;
+  }
   std::vector<RankedFigures> figures;
-  for (const MemberPeriod& member : ArchiveQueries(archive).Period(period, PeriodAfter(period))) {
+  for (const auto& [number, member] : *members) {
     RankedFigures& of = figures.emplace_back();
-    of.Member = member.Member;
+    of.Member = number;
     of.Games = member.Games;
     of.Sum = static_cast<double>(member.SoldieringSum);
     of.Best = static_cast<double>(member.SoldieringBest);
@@ -81,26 +165,18 @@ std::vector<RankedFigures> FiguresOfPeriod(Sql& archive, const std::string& peri
   return figures;
 }
 
+std::vector<RankedFigures> FiguresOfPeriod(Sql& archive, const std::string& period) {
+  return *FiguresInSteps(archive, period, WithoutStop);
+}
+
+std::optional<std::vector<RankedFigures>> LifetimeInSteps(Sql& members, Sql& archive,
+                                                          const RankingStep& goOn) {
+  const std::optional<MembersInPeriod> kept = ReadMonths(archive, {}, goOn);
+  return kept ? std::optional(Lifetimes(members, *kept)) : std::nullopt;
+}
+
 std::vector<RankedFigures> FiguresOfLifetime(Sql& members, Sql* archive) {
-  const std::map<std::int32_t, double> bests =
-      archive != nullptr ? BestsOfAllKept(*archive) : std::map<std::int32_t, double>();
-  std::vector<RankedFigures> figures;
-  members.Query(
-      "SELECT ContactID, TotalGamesPlayed, TotalSoldiering, TotalPrimaryAccuracy, PriZeroAccuracyCount "
-      "FROM Members WHERE TotalGamesPlayed > 0",
-      {}, [&](const SqlRow& row) {
-        RankedFigures& of = figures.emplace_back();
-        of.Member = static_cast<std::int32_t>(row.Integer(0));
-        of.Games = static_cast<std::int64_t>(NumberOf(row[1]));
-        of.Sum = NumberOf(row[2]);
-        if (const double accurate = static_cast<double>(of.Games) - NumberOf(row[4]); accurate > 0) {
-          of.Accuracy = NumberOf(row[3]) / accurate;
-        }
-        if (const auto best = bests.find(of.Member); best != bests.end()) {
-          of.Best = best->second;
-        }
-      });
-  return figures;
+  return archive != nullptr ? *LifetimeInSteps(members, *archive, WithoutStop) : Lifetimes(members, {});
 }
 
 void NameRanked(std::vector<RankedMember>& ranked, Database& members, const HidesName& hidesName) {

@@ -30,6 +30,17 @@ std::string PeriodAfter(const std::string& period);
 /// does.
 std::vector<RankedFigures> FiguresOfPeriod(Sql& archive, const std::string& period);
 
+/// Asked between steps with the part done, 0 to 1; may process events. False stops the reading.
+using RankingStep = std::function<bool(double done)>;
+
+/// FiguresOfPeriod, month by month; nothing if it was stopped.
+std::optional<std::vector<RankedFigures>> FiguresInSteps(Sql& archive, const std::string& period,
+                                                         const RankingStep& goOn);
+
+/// FiguresOfLifetime, where the best of the kept games is read month by month; nothing if it was stopped.
+std::optional<std::vector<RankedFigures>> LifetimeInSteps(Sql& members, Sql& archive,
+                                                          const RankingStep& goOn);
+
 /// From the lifetime figures of all members with committed games. These know no best game: it is that of the
 /// kept games, and is read only if there is an `archive`, from all of them. Throws RuntimeError as Sql does.
 std::vector<RankedFigures> FiguresOfLifetime(Sql& members, Sql* archive);

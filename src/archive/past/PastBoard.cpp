@@ -1,5 +1,7 @@
 #include "archive/past/PastBoard.h"
 
+#include "core/game/HiddenNames.h"
+
 namespace {
 
 AccuracyKind AccuracyKindOf(const Player& player) {
@@ -9,10 +11,10 @@ AccuracyKind AccuracyKindOf(const Player& player) {
   return player.ShotCount > 0 ? AccuracyKind::Known : AccuracyKind::NoShots;
 }
 
-BoardRow PastRowOf(const Player& player, int index, const MemberNames& nameOf) {
+BoardRow PastRowOf(const Player& player, int index, const NameHolder& holder) {
   return {.Index = index,
           .Team = TeamFromId(IdFromIndex(index)),
-          .MemberName = player.MemberIndex != 0 ? nameOf(player.MemberIndex) : std::string(),
+          .MemberName = holder.NickName.empty() ? holder.GuestName : holder.NickName,
           .Soldiering = player.Soldiering,
           .HasAccuracy = AccuracyKindOf(player),
           .Accuracy = player.Accuracy,
@@ -25,11 +27,13 @@ BoardRow PastRowOf(const Player& player, int index, const MemberNames& nameOf) {
 
 }  // namespace
 
-void ListPastPlayers(Game& game, const MemberNames& nameOf, Board& board) {
+void ListPastPlayers(PastGame& past, const NickNames& nickNames, Board& board) {
   board.Clear();
+  Game& game = past.Game;
+  const GuestNames guests = past.NamesOfGuests();
   for (int index = 1; index <= PlayerCount; ++index) {
     if (const Player& player = game.Players(index); player.Active) {
-      board.AddRow(PastRowOf(player, index, nameOf));
+      board.AddRow(PastRowOf(player, index, HolderOf(game, index, nickNames, guests)));
     }
   }
   SortListNumeric(board, BoardColumn::Soldiering, true, game);

@@ -20,10 +20,10 @@ QVariant PastAlignmentOf(int column) {
 PastBoardModel::PastBoardModel(const StringTable& strings)
     : strings_(strings), none_(strings), texts_(std::make_unique<BoardTexts>(none_.Game, strings)) {}
 
-void PastBoardModel::Show(PastGame game, const MemberNames& nameOf) {
+void PastBoardModel::Show(PastGame game, const NickNames& nickNames) {
   ShowNothing();
   auto shown = std::make_unique<PastGame>(std::move(game));
-  ListPastPlayers(shown->Game, nameOf, board_);
+  ListPastPlayers(*shown, nickNames, board_);
   beginResetModel();
   game_ = std::move(shown);
   texts_ = std::make_unique<BoardTexts>(game_->Game, strings_);

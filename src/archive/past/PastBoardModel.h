@@ -14,7 +14,7 @@ class PastBoardModel : public QAbstractTableModel {
   explicit PastBoardModel(const StringTable& strings);
 
   /// Shows this game. Throws RuntimeError as ListPastPlayers does; nothing is shown then.
-  void Show(PastGame game, const MemberNames& nameOf);
+  void Show(PastGame game, const NickNames& nickNames);
   void ShowNothing();
   /// The game shown, null if none.
   const PastGame* Shown() const { return game_.get(); }

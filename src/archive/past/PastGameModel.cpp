@@ -127,12 +127,15 @@ std::string PastGameModel::BestOf(const ListedGame& game) const {
   if (game.BestPlayer < 1 || game.BestPlayer > PlayerCount) {
     return {};
   }
-  std::string name = game.BestMember != 0 ? parts_.NameOf(game.BestMember) : std::string();
+  std::string name = game.BestMember != 0 ? CleanName(parts_.NickNameOf(game.BestMember)) : std::string();
+  if (name.empty()) {
+    name = parts_.GuestNameOf(game.GameId, game.BestPlayer);
+  }
   if (!name.empty()) {
     return name;
   }
   const std::uint8_t id = IdFromIndex(game.BestPlayer);
-  return PlayerName(TeamNameFromNumber(strings_, TeamFromId(id)), id);
+  return TeamNameFromNumber(strings_, TeamFromId(id)) + " " + std::to_string(PlayerNumberFromId(id));
 }
 
 QString PastGameModel::TextOf(const Row& row, int column) const {

@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "archive/ArchiveQueries.h"
-#include "archive/past/PastBoard.h"
+#include "core/game/PublicName.h"
 #include "core/text/StringTable.h"
 
 /// Past games, any number of them. A game's row is read when it comes into view.
@@ -30,7 +30,9 @@ class PastGameModel : public QAbstractTableModel {
   struct Parts {
     /// The row of a game; none if it has gone. May throw RuntimeError.
     std::function<std::optional<ListedGame>(std::int64_t gameId)> Read;
-    MemberNames NameOf;
+    NickNames NickNameOf;
+    /// The guest name of a player of a game, clean; empty without one. May throw RuntimeError.
+    std::function<std::string(std::int64_t gameId, int index)> GuestNameOf;
     /// Called with the reason when a row cannot be read, once until Show is called again.
     std::function<void(const std::string& reason)> Failed;
   };
@@ -58,7 +60,7 @@ class PastGameModel : public QAbstractTableModel {
  private:
   struct Row {
     ListedGame Game;
-    std::string Best;  ///< name of the best player
+    std::string Best;  ///< public name of the best player
   };
 
   const Row* RowAt(int row) const;

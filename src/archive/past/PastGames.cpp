@@ -5,6 +5,7 @@
 #include <QShortcut>
 #include <QTimer>
 #include <algorithm>
+#include <set>
 #include <utility>
 
 #include "archive/DeletedGames.h"
@@ -23,7 +24,9 @@ PastGames::PastGames(Parts parts, QWidget* parent)
       parts_(std::move(parts)),
       months_(parts_.Strings),
       games_({.Read = [this](std::int64_t game) { return parts_.Archive.Queries().Game(game); },
-              .NameOf = parts_.NameOf,
+              .NickNameOf = parts_.Archive.Names(),
+              .GuestNameOf = [this](std::int64_t game,
+                                    int index) { return parts_.Archive.GuestNameOf(game, index); },
               // Not in the middle of painting.
               .Failed =
                   [this](const std::string& reason) {
@@ -65,6 +68,7 @@ void PastGames::SetTexts() {
                                {ui_->Delete, own(OwnText::PastDelete)},
                                {ui_->BringBack, own(OwnText::PastBringBack)},
                                {ui_->Import, own(OwnText::PastImport)},
+                               {ui_->Stop, own(OwnText::Stop)},
                                {ui_->Close, 137}});
   ui_->BoardTable->setAccessibleName(Text(parts_.Strings, 203));
   ui_->Import->setVisible(parts_.Import != nullptr);
@@ -146,8 +150,17 @@ void PastGames::ConnectCommands() {
   const auto* remove =
       new QShortcut(QKeySequence::Delete, ui_->GameTable, nullptr, nullptr, Qt::WidgetShortcut);
   connect(remove, &QShortcut::activated, ui_->Delete, &QPushButton::click);
-  CopiesRows(*ui_->GameTable);
-  CopiesRows(*ui_->BoardTable);
+  for (QTableView* list : {ui_->GameTable, ui_->BoardTable}) {
+    OnCopyKey(*list, [this, list] {
+      if (!commands_.Running()) {
+        commands_.Run([this, list] { Try([this, list] { Copy(*list); }); });
+      }
+    });
+  }
+  commands_.EndWaits = [this] { stopped_ = true; };
+  connect(ui_->Stop, &QPushButton::clicked, this, [this] { stopped_ = true; });
+  ui_->Progress->hide();
+  ui_->Stop->hide();
 }
 
 void PastGames::Refresh(std::int64_t stay) {
@@ -175,8 +188,12 @@ void PastGames::Refresh(std::int64_t stay) {
 void PastGames::ListGames(std::int64_t stay) {
   std::vector<std::int64_t> games;
   Tell({});
-  const bool done =
-      Try([&] { games = parts_.Archive.Queries().Games(FilterOf(search_, Listed().Which, Listed().Month)); });
+  stopped_ = false;
+  const bool done = Try([&] {
+    const GameFilter filter = FilterOf(search_, Listed().Which, Listed().Month);
+    RunInSteps(filter.Members.size(),
+               [&](const Step& goOn) { games = parts_.Archive.Queries().Games(filter, goOn); });
+  });
   {
     const QScopedValueRollback guard(listing_, true);
     games_.Show(std::move(games));
@@ -185,7 +202,9 @@ void PastGames::ListGames(std::int64_t stay) {
     }
   }
   ShowGame();
-  if (done && games_.rowCount() == 0) {
+  if (stopped_) {
+    Tell(parts_.Strings.Text(OwnText::PastSearchStopped));
+  } else if (done && games_.rowCount() == 0) {
     TellOfEmptyList();
   }
 }
@@ -225,7 +244,7 @@ void PastGames::ShowBoard() {
   board_.ShowNothing();
   ui_->BoardLabel->clear();
   if (const std::int64_t game = CurrentGame(); game != 0) {
-    Try([&] { board_.Show(parts_.Archive.Read(game, CurrentState()), parts_.NameOf); });
+    Try([&] { board_.Show(parts_.Archive.Read(game, CurrentState()), parts_.Archive.Names()); });
   }
   if (const PastGame* shown = board_.Shown()) {
     ui_->BoardLabel->setText(PastGameModel::TimeText(shown->Played) +
@@ -343,11 +362,16 @@ std::int64_t PastGames::CurrentState() const {
 }
 
 std::vector<std::int64_t> PastGames::SelectedGames() const {
-  QModelIndexList rows = ui_->GameTable->selectionModel()->selectedRows();
-  std::sort(rows.begin(), rows.end());
+  // By ranges: an index for each of a hundred thousand rows takes its time.
+  std::set<int> rows;
+  for (const QItemSelectionRange& range : ui_->GameTable->selectionModel()->selection()) {
+    for (int row = range.top(); row <= range.bottom(); ++row) {
+      rows.insert(rows.end(), row);
+    }
+  }
   std::vector<std::int64_t> games;
-  for (const QModelIndex& index : rows) {
-    games.push_back(games_.Games()[static_cast<std::size_t>(index.row())]);
+  for (const int row : rows) {
+    games.push_back(games_.Games()[static_cast<std::size_t>(row)]);
   }
   return games;
 }

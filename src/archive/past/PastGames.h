@@ -13,11 +13,13 @@
 #include "archive/past/PastGameModel.h"
 #include "archive/past/PastMonthModel.h"
 #include "platform/Clock.h"
+#include "platform/EventPump.h"
 #include "platform/FileDialog.h"
 #include "platform/Files.h"
 #include "platform/MessageBoxes.h"
 #include "ui/Commands.h"
 
+class QAbstractItemView;
 class QLineEdit;
 class QTableView;
 
@@ -36,6 +38,7 @@ class PastGames : public QDialog {
     std::int64_t GameId;
     std::int64_t State;  ///< 0 for the last one, else an earlier one
     std::string Bytes;   ///< of its file
+    GuestList::Names Guests = {};
   };
 
   /// All references must outlive the window.
@@ -45,9 +48,9 @@ class PastGames : public QDialog {
     MessageBoxes& Boxes;
     ::FileDialog& CommonDialog1;
     Files& Disk;
+    EventPump& Events;
     const StringTable& Strings;
-    MemberNames NameOf;
-    /// The members whose nickname, first or last name begins with this text.
+    /// The members whose nickname, first or last name begins with this text, all of them.
     std::function<std::vector<std::int32_t>(const std::string& text)> MembersCalled;
     /// True if the game on the board is in no file as it is.
     std::function<bool()> BoardIsUnsaved;
@@ -97,6 +100,24 @@ class PastGames : public QDialog {
   void Delete();
   void BringBack();
   void Import();
+  void Copy(const QAbstractItemView& list);
+
+  /// Asked between steps with the part done, 0 to 1; false stops the run.
+  using Step = std::function<bool(double done)>;
+  /// Runs `act` on so many rows. Where these are many, the window is painted meanwhile, shows how far it is,
+  /// and takes nothing but Stop. What `act` throws ends the run.
+  void RunInSteps(std::size_t rows, const std::function<void(const Step& goOn)>& act);
+  /// How a change of games ended; %1 is how many were changed, %2 how many were not.
+  struct ChangeTexts {
+    OwnText Done;
+    OwnText DoneInPart;
+    OwnText Stopped;
+  };
+  /// Changes these games, some at a time, each time durably, and then reads the lists anew. Tells how many
+  /// `change` counted. Throws RuntimeError 61 if the disk has no room; nothing is changed then.
+  void ChangeInSteps(const std::vector<std::int64_t>& games,
+                     const std::function<int(const std::vector<std::int64_t>& some)>& change,
+                     const ChangeTexts& texts);
 
   /// Runs `action`, and tells in the window if it fails. False then.
   bool Try(const std::function<void()>& action);
@@ -108,6 +129,7 @@ class PastGames : public QDialog {
   /// The current game's number, 0 if there is none.
   std::int64_t CurrentGame() const;
   std::int64_t CurrentState() const;
+  /// In the order of the list.
   std::vector<std::int64_t> SelectedGames() const;
 
   std::unique_ptr<Ui::PastGames> ui_;
@@ -117,6 +139,7 @@ class PastGames : public QDialog {
   PastBoardModel board_;
   PastSearch search_;
   std::optional<Opened> chosen_;
+  bool stopped_ = false;
   bool listing_ = false;  ///< lists are being filled, so what is selected in them is no choice
   Commands commands_;
 };

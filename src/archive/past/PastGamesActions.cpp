@@ -1,11 +1,38 @@
 // What the operator does with the games that the window lists.
+#include <QPointer>
+#include <QScopeGuard>
+#include <algorithm>
 #include <utility>
 
 #include "archive/DeletedGames.h"
 #include "archive/past/PastGames.h"
 #include "core/gamefile/SuggestedName.h"
 #include "core/text/Filled.h"
+#include "platform/RuntimeError.h"
+#include "ui/RowsAsText.h"
+#include "ui/RunProgress.h"
 #include "ui_PastGames.h"
+
+namespace {
+
+/// So many at once keep the window waiting for some tens of milliseconds.
+constexpr std::size_t GamesAtOnce = 500;
+
+/// False if `goOn` ended it.
+bool InPieces(const std::vector<std::int64_t>& games, const std::function<bool(double done)>& goOn,
+              const std::function<void(const std::vector<std::int64_t>& some)>& act) {
+  for (std::size_t place = 0; place < games.size(); place += GamesAtOnce) {
+    if (!goOn(static_cast<double>(place) / static_cast<double>(games.size()))) {
+      return false;
+    }
+    const auto first = games.begin() + static_cast<std::ptrdiff_t>(place);
+    const auto count = static_cast<std::ptrdiff_t>(std::min(GamesAtOnce, games.size() - place));
+    act({first, first + count});
+  }
+  return true;
+}
+
+}  // namespace
 
 void PastGames::OpenGame() {
   const PastGame* game = board_.Shown();
@@ -24,7 +51,7 @@ void PastGames::OpenGame() {
           DefaultBoxTitle, BoxIcon::Question, BoxButtons::OkCancel) != BoxAnswer::Ok) {
     return;
   }
-  chosen_ = {game->GameId, game->State, std::move(bytes)};
+  chosen_ = {game->GameId, game->State, std::move(bytes), game->Guests};
   accept();
 }
 
@@ -71,24 +98,82 @@ void PastGames::Delete() {
                         BoxButtons::OkCancel) != BoxAnswer::Ok) {
     return;
   }
-  const std::int64_t next = GameAfter(games_.Games(), games);
-  parts_.Archive.CheckSpace();
-  const int deleted = parts_.Archive.Archive().Delete(games, parts_.Time.Now());
-  Refresh(next);
-  Tell(Filled(strings.Text(OwnText::PastDeletedNow), {std::to_string(deleted)}));
-  ui_->GameTable->setFocus();
+  const std::string now = parts_.Time.Now();
+  ChangeInSteps(
+      games,
+      [&](const std::vector<std::int64_t>& some) { return parts_.Archive.Archive().Delete(some, now); },
+      {OwnText::PastDeletedNow, OwnText::PastDeletedNow, OwnText::PastDeleteStopped});
 }
 
 void PastGames::BringBack() {
-  const std::vector<std::int64_t> games = SelectedGames();
-  const std::int64_t next = GameAfter(games_.Games(), games);
+  ChangeInSteps(
+      SelectedGames(),
+      [this](const std::vector<std::int64_t>& some) { return parts_.Archive.Archive().BringBack(some); },
+      {OwnText::PastBroughtBack, OwnText::PastBroughtBackSome, OwnText::PastBringBackStopped});
+}
+
+void PastGames::ChangeInSteps(const std::vector<std::int64_t>& games,
+                              const std::function<int(const std::vector<std::int64_t>& some)>& change,
+                              const ChangeTexts& texts) {
   parts_.Archive.CheckSpace();
-  const int back = parts_.Archive.Archive().BringBack(games);
-  const int left = static_cast<int>(games.size()) - back;
+  const std::int64_t next = GameAfter(games_.Games(), games);
+  int changed = 0;
+  std::string failure;
+  bool complete = false;
+  try {
+    RunInSteps(games.size(), [&](const Step& goOn) {
+      complete = InPieces(games, goOn, [&](const auto& some) { changed += change(some); });
+    });
+  } catch (const RuntimeError& error) {
+    failure = error.what();
+  }
   Refresh(next);
-  Tell(Filled(parts_.Strings.Text(left > 0 ? OwnText::PastBroughtBackSome : OwnText::PastBroughtBack),
-              {std::to_string(back), std::to_string(left)}));
+  if (!failure.empty()) {
+    TellFailure(failure);
+  } else {
+    const int left = static_cast<int>(games.size()) - changed;
+    const OwnText text = !complete ? texts.Stopped : left > 0 ? texts.DoneInPart : texts.Done;
+    Tell(Filled(parts_.Strings.Text(text), {std::to_string(changed), std::to_string(left)}));
+  }
   ui_->GameTable->setFocus();
+}
+
+void PastGames::Copy(const QAbstractItemView& list) {
+  const int rows = list.model()->rowCount();
+  bool copied = false;
+  RunInSteps(static_cast<std::size_t>(rows), [&](const Step& goOn) { copied = CopyRowsInSteps(list, goOn); });
+  if (!copied) {
+    Tell(parts_.Strings.Text(OwnText::PastCopyStopped));
+  }
+}
+
+void PastGames::RunInSteps(std::size_t rows, const std::function<void(const Step& goOn)>& act) {
+  constexpr std::size_t few = 200;
+  if (rows <= few) {
+    act([](double) { return true; });
+    return;
+  }
+  const QPointer<QWidget> focused = focusWidget();
+  std::vector<QWidget*> disabled;
+  for (QWidget* control : findChildren<QWidget*>(QString(), Qt::FindDirectChildrenOnly)) {
+    if (control->isEnabled() && control != ui_->Stop && control != ui_->Progress && control != ui_->Status) {
+      disabled.push_back(control);
+      control->setEnabled(false);
+    }
+  }
+  ui_->Stop->show();
+  const auto ended = qScopeGuard([&] {
+    ui_->Stop->hide();
+    for (QWidget* control : disabled) {
+      control->setEnabled(true);
+    }
+    if (focused) {
+      focused->setFocus();
+    }
+  });
+  RunProgress progress(*ui_->Progress, *ui_->Stop, parts_.Events, stopped_);
+  ui_->Stop->setFocus();
+  act([&progress](double part) { return progress.GoOn(part); });
 }
 
 void PastGames::Import() {

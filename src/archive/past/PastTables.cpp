@@ -13,7 +13,6 @@
 #include "archive/past/PastGameModel.h"
 #include "archive/past/PastMonthModel.h"
 #include "core/game/Board.h"
-#include "ui/RowsAsText.h"
 
 namespace {
 
@@ -110,7 +109,7 @@ void SetUpBoardTable(QTableView& table) {
   });
 }
 
-void CopiesRows(QAbstractItemView& list) {
-  const auto* copy = new QShortcut(QKeySequence::Copy, &list, nullptr, nullptr, Qt::WidgetShortcut);
-  QObject::connect(copy, &QShortcut::activated, &list, [&list] { CopyRows(list); });
+void OnCopyKey(QAbstractItemView& list, std::function<void()> copy) {
+  const auto* key = new QShortcut(QKeySequence::Copy, &list, nullptr, nullptr, Qt::WidgetShortcut);
+  QObject::connect(key, &QShortcut::activated, &list, std::move(copy));
 }

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <functional>
+
 class QAbstractItemView;
 class QTableView;
 
@@ -8,5 +10,5 @@ void SetUpMonthTable(QTableView& table);
 void SetUpGameTable(QTableView& table);
 void SetUpBoardTable(QTableView& table);
 
-/// Ctrl+C copies the selected rows as text.
-void CopiesRows(QAbstractItemView& list);
+/// Ctrl+C runs `copy`.
+void OnCopyKey(QAbstractItemView& list, std::function<void()> copy);

@@ -20,6 +20,15 @@ NameHolder HolderOf(const Game& game, int index, const NickNames& nickNames, con
           .GuestName = guestNames ? CleanName(guestNames(index)) : std::string()};
 }
 
+void LeaveOutHidden(std::vector<Standing>& standings, const Game& game, const HiddenNames& hidden,
+                    const NickNames& nickNames, const GuestNames& guestNames) {
+  for (Standing& standing : standings) {
+    if (hidden.Hides(HolderOf(game, standing.Index, nickNames, guestNames))) {
+      standing.PublicName = GunName(game, standing.Index);
+    }
+  }
+}
+
 HiddenNames::HiddenNames(Files& disk, std::string path) : disk_(disk), path_(std::move(path)) {
   try {
     if (disk_.FileExists(path_)) {

@@ -4,8 +4,10 @@
 #include <functional>
 #include <set>
 #include <string>
+#include <vector>
 
 #include "core/game/PublicName.h"
+#include "core/game/Standings.h"
 #include "platform/Files.h"
 
 /// Whose name a player's public name is.
@@ -20,6 +22,12 @@ struct NameHolder {
 /// The holder of the name of the player at record `index`. Without `guestNames` there are no guests.
 NameHolder HolderOf(const Game& game, int index, const NickNames& nickNames,
                     const GuestNames& guestNames = {});
+
+class HiddenNames;
+
+/// Puts the gun in the place of each public name in `standings` that `hidden` hides.
+void LeaveOutHidden(std::vector<Standing>& standings, const Game& game, const HiddenNames& hidden,
+                    const NickNames& nickNames, const GuestNames& guestNames = {});
 
 /// The names that the operator has taken off all public screens, pages and lists, until they are shown again.
 /// They outlive the program, in a file of their own that only this user may read.

@@ -146,6 +146,54 @@ TEST_F(Archived, NameMembersAsTheyAreTodayAndOthersByTheirGuns) {
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
+TEST_F(Archived, NameGuestsAsTheyWereInTheGame) {
+  const std::int64_t id = Keep("2026-11-21 20:15:00");
+  const auto names = [&](ExportFormat format) {
+    std::map<std::string, std::string> byPlayer;
+    for (const CsvRecord& row : CsvRecords(Exported({id}, format, Everything))) {
+      byPlayer[row.at("player")] = row.at("name");
+    }
+    return byPlayer;
+  };
+  OtherConnection archive(venue.Folder / "games.mdb");
+  const std::string guest = archive.Query("SELECT min(PlayerIndex) FROM GamePlayers WHERE MemberID = 0");
+  const std::string member = archive.Query("SELECT PlayerIndex FROM GamePlayers WHERE MemberID = 7");
+  OtherConnection(venue.Folder / "games.mdb")
+      .Execute("UPDATE GamePlayers SET GuestName = 'Ann' || char(10) || 'a' WHERE PlayerIndex IN (" + guest +
+               ", " + member + ")");
+  for (const ExportFormat format : {ExportFormat::Figures, ExportFormat::Players}) {
+    EXPECT_EQ(names(format).at(guest), "Anna");
+    EXPECT_EQ(names(format).at(member), "=Mole");
+  }
+  EXPECT_THAT(Exported({id}, ExportFormat::Json), testing::HasSubstr("Anna"));
+  EXPECT_THAT(Exported({id}, ExportFormat::Page), testing::HasSubstr("Anna"));
+  OtherConnection(venue.Folder / "games.mdb").Execute("ALTER TABLE GamePlayers DROP COLUMN GuestName");
+  for (const ExportFormat format : {ExportFormat::Figures, ExportFormat::Players}) {
+    EXPECT_EQ(names(format).at(guest), GunName(session.Game(), std::stoi(guest)));
+  }
+}
+
+TEST_F(Archived, TellNoNameThatTheOperatorHides) {
+  const std::int64_t id = Keep("2026-11-21 20:15:00");
+  OtherConnection archive(venue.Folder / "games.mdb");
+  archive.Execute("UPDATE GamePlayers SET GuestName = 'Ann' WHERE MemberID = 0");
+  HiddenNames hidden(venue.Disk, venue.Folder / "hidden");
+  games.emplace(access, session, venue.Strings, &hidden);
+  EXPECT_THAT(Exported({id}, ExportFormat::Json), testing::HasSubstr("Ann"));
+  hidden.Hide({.Member = 7});
+  hidden.Hide({.GuestName = "Ann"});
+  for (const ExportFormat format : {ExportFormat::Figures, ExportFormat::Players}) {
+    for (const CsvRecord& row : CsvRecords(Exported({id}, format))) {
+      EXPECT_EQ(row.at("name"), GunName(session.Game(), std::stoi(row.at("player"))));
+    }
+  }
+  for (const ExportFormat format : {ExportFormat::Hits, ExportFormat::Json, ExportFormat::Page}) {
+    const std::string file = Exported({id}, format);
+    EXPECT_THAT(file, testing::Not(testing::HasSubstr("Ann")));
+    EXPECT_THAT(file, testing::Not(testing::HasSubstr("Mole")));
+  }
+}
+
 TEST_F(Archived, ThatAreDamagedOrDeletedAreLeftOut) {
   const std::int64_t good = Keep("2026-11-21 20:15:00", 1);
   const std::int64_t damaged = Keep("2026-11-21 20:16:00", 2);

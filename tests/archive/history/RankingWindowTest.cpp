@@ -5,9 +5,11 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QLabel>
+#include <QProgressBar>
 #include <QSpinBox>
 
 #include "tests/archive/history/HistoryWindows.h"
+#include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakePrograms.h"
 #include "tests/support/CaredFor.h"
 
@@ -30,6 +32,7 @@ class RankingsWindow : public HistoryWindows {
                              .CommonDialog1 = dialog,
                              .Disk = disk,
                              .OtherPrograms = programs,
+                             .Events = events,
                              .Strings = *texts,
                              .PrintedPage = Folder / "ranking.html"},
         nullptr);
@@ -50,6 +53,7 @@ class RankingsWindow : public HistoryWindows {
   }
 
   FakePrograms programs;
+  FakeEventPump events;
   std::unique_ptr<StringTable> texts;
   std::unique_ptr<RankingWindow> window;
 };
@@ -59,6 +63,42 @@ TEST_F(RankingsWindow, BeginsWithTheLatestMonth) {
   EXPECT_EQ(Rows(), 2);
   EXPECT_THAT(Row(0), ElementsAre("1", "Mole", "3", "600", "200.0", "500", "25.00%"));
   EXPECT_THAT(Row(1), ElementsAre("2", "(no nickname)", "3", "120", "40.0", "40", ""));
+}
+
+TEST_F(RankingsWindow, IsReadyAgainAfterAYearWasRead) {
+  Open();
+  auto& period = Find<QComboBox>(*window, "Period");
+  period.setFocus();
+  Choose("Period", "2026");
+  EXPECT_EQ(Rows(), 2);
+  EXPECT_EQ(State(), "");
+  EXPECT_TRUE(period.isEnabled());
+  EXPECT_EQ(window->focusWidget(), &period);
+  EXPECT_FALSE(Find<QProgressBar>(*window, "Progress").isVisible());
+  EXPECT_FALSE(Find<QPushButton>(*window, "Stop").isVisible());
+}
+
+TEST_F(RankingsWindow, StopsAndSaysHowToGoOn) {
+  InArchive(
+      "WITH RECURSIVE n(i) AS (SELECT 100 UNION ALL SELECT i + 1 FROM n WHERE i < 20000) INSERT INTO Games "
+      "SELECT i, '2026-' || printf('%02d', 1 + i % 11) || '-01 00:00:00', '', 'None', 'cable', 1, 2, 0, 0, "
+      "0, "
+      "0, 1, 1, 1, 1, 1, 1, 1, '', NULL FROM n");
+  InArchive(
+      "INSERT INTO GamePlayers SELECT GameID, p.value, 5, '', 1, 1, 1, 1, 1, 1, 1, 1, 1, 1, NULL FROM Games, "
+      "json_each('[11,12,13,14,15,16,17,18,19,20]') p WHERE GameID >= 100");
+  Open();
+  events.At(std::chrono::milliseconds(0), [this] {
+    EXPECT_TRUE(Find<QProgressBar>(*window, "Progress").isVisible());
+    EXPECT_FALSE(Find<QComboBox>(*window, "Period").isEnabled());
+    ::Press(*window, "Stop");
+  });
+  Choose("Period", "2026");
+  EXPECT_EQ(Rows(), 0);
+  EXPECT_EQ(State(), "Stopped. Choose a period or an order to make the ranking.");
+  EXPECT_TRUE(Find<QComboBox>(*window, "Period").isEnabled());
+  Choose("Order", "Mean soldiering");
+  EXPECT_EQ(Rows(), 2);
 }
 
 TEST_F(RankingsWindow, HasAllMonthsYearsAndAllTime) {

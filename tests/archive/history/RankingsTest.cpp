@@ -95,6 +95,27 @@ TEST_F(RankedVenue, RanksAMonthAndAYear) {
   EXPECT_EQ(year[1].Figures.Accuracy, std::nullopt);
 }
 
+TEST_F(RankedVenue, ReadsAYearAndAllTimeInStepsThatCanBeStopped) {
+  std::vector<double> parts;
+  const auto all = [&parts](double done) {
+    parts.push_back(done);
+    return true;
+  };
+  EXPECT_EQ(FiguresInSteps(ArchiveSql(), "2026", all)->size(), 2U);
+  EXPECT_EQ(parts.size(), 12U);
+  EXPECT_EQ(parts.front(), 0);
+  EXPECT_TRUE(std::is_sorted(parts.begin(), parts.end()));
+  parts.clear();
+  EXPECT_EQ(FiguresInSteps(ArchiveSql(), "2026-11", all)->size(), 2U);
+  EXPECT_EQ(parts.size(), 1U);
+  parts.clear();
+  EXPECT_EQ(LifetimeInSteps(MembersSql(), ArchiveSql(), all)->at(0).Best, 1000);
+  EXPECT_EQ(parts.size(), 4U);
+  const auto half = [](double done) { return done < 0.5; };
+  EXPECT_FALSE(FiguresInSteps(ArchiveSql(), "2026", half).has_value());
+  EXPECT_FALSE(LifetimeInSteps(MembersSql(), ArchiveSql(), half).has_value());
+}
+
 TEST_F(RankedVenue, RanksAllTimeByTheLifetimeFigures) {
   const std::vector<RankedFigures> all = FiguresOfLifetime(MembersSql(), nullptr);
   ASSERT_EQ(all.size(), 1U);

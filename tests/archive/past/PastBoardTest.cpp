@@ -14,7 +14,7 @@ TEST(PastBoards, ShowEachCellAsTheBoardDid) {
   ExecuteSql(
       venue.MembersFile(),
       "INSERT INTO Members (ContactID, FirstName, LastName, NickName) VALUES (7, 'Bo', 'Ray', 'Mole'), "
-      "(8, 'Cy', 'Fox', NULL)");
+      "(8, 'Cy', 'Fox', 'Owl')");
   ASSERT_TRUE(venue.Open());
   Session& session = venue.session;
   FillRandomly(session.Game(), 60, 5);
@@ -29,17 +29,13 @@ TEST(PastBoards, ShowEachCellAsTheBoardDid) {
   session.Game().DataPresent = true;
   session.CalculateScores();
 
-  Game past(venue.Strings);
-  ASSERT_TRUE(ReadGameFile(WriteGameFile(session.Game(), "None"), past, [](const std::string&) {}));
+  PastGame past(venue.Strings);
+  ASSERT_TRUE(ReadGameFile(WriteGameFile(session.Game(), "None"), past.Game, [](const std::string&) {}));
   Board board([] {});
   ListPastPlayers(
-      past,
-      [&session](std::int32_t contactId) {
-        return session.Members().FindMember(contactId)->GetPlayerName(true);
-      },
-      board);
+      past, [&session](std::int32_t contactId) { return session.Members().NickNameOf(contactId); }, board);
   const Board& before = session.List(BoardList::Players);
-  const BoardTexts texts(past, venue.Strings);
+  const BoardTexts texts(past.Game, venue.Strings);
   ASSERT_EQ(board.RowCount(), 60);
   for (int place = 0; place < board.RowCount(); ++place) {
     for (int column = 0; column < BoardColumnCount; ++column) {
@@ -50,16 +46,28 @@ TEST(PastBoards, ShowEachCellAsTheBoardDid) {
   }
 }
 
-TEST(PastBoards, NameAPlayerByTheGunWhoseMemberIsGone) {
+/// A player's cell of a past game in which Blue 7 is member 77.
+std::string CellOf(const std::string& nickName, const GuestList::Names& guests) {
   const StringTable strings(Language::English);
-  Game game(strings);
-  game.Players(40).Active = true;
-  game.Players(40).MemberIndex = 77;
+  PastGame past(strings);
+  past.Game.Players(40).Active = true;
+  past.Game.Players(40).MemberIndex = 77;
+  past.Guests = guests;
   Board board([] {});
   ListPastPlayers(
-      game, [](std::int32_t) { return std::string(); }, board);
-  ASSERT_EQ(board.RowCount(), 1);
-  EXPECT_EQ(BoardTexts(game, strings).Cell(board.RowAt(0), BoardColumn::Player), game.DisplayName(40));
+      past, [&nickName](std::int32_t) { return nickName; }, board);
+  return BoardTexts(past.Game, strings).Cell(board.RowAt(0), BoardColumn::Player);
+}
+
+TEST(PastBoards, NameAPlayerByNicknameElseByGuestNameElseByTheGun) {
+  EXPECT_EQ(CellOf("Mole", {{40, "Ann"}}), "Blue  7: Mole");
+  EXPECT_EQ(CellOf("", {{40, "Ann"}, {1, "Ben"}}), "Blue  7: Ann");
+  EXPECT_EQ(CellOf("", {}), "Blue  7");
+}
+
+TEST(PastBoards, ShowNamesClean) {
+  EXPECT_EQ(CellOf(" Mo\tle\xE2\x80\xAE ", {}), "Blue  7: Mole");
+  EXPECT_EQ(CellOf("\xE2\x80\xAE", {{40, "A\nnn"}}), "Blue  7: Ann");
 }
 
 }  // namespace

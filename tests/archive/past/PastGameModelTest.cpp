@@ -57,17 +57,21 @@ class ListOfPastGames : public testing::Test {
   std::vector<std::string> failures;
   bool fails = false;
   std::int64_t gone = 0;
-  PastGameModel model{{.Read = [this](std::int64_t game) { return Read(game); },
-                       .NameOf = [](std::int32_t member) { return "Member " + std::to_string(member); },
-                       .Failed = [this](const std::string& reason) { failures.push_back(reason); }},
-                      strings};
+  PastGameModel model{
+      {.Read = [this](std::int64_t game) { return Read(game); },
+       .NickNameOf = [](std::int32_t member) { return "Member \t" + std::to_string(member); },
+       .GuestNameOf = [](std::int64_t game, int index) { return game == 4 && index == 40 ? "Ann" : ""; },
+       .Failed = [this](const std::string& reason) { failures.push_back(reason); }},
+      strings};
 };
 
 TEST_F(ListOfPastGames, TellsAGame) {
   Show(3);
-  EXPECT_THAT(Cells(0), ElementsAre("Flag", "12", "-4", "250", "0", "Blue  7, 123", "2", "3"));
+  EXPECT_THAT(Cells(0), ElementsAre("Flag", "12", "-4", "250", "0", "Blue 7, 123", "2", "3"));
   EXPECT_EQ(Cells(1)[5], "Member 5, 123");
   EXPECT_EQ(Cells(2)[5], "");
+  Show(4);
+  EXPECT_EQ(Cells(0)[5], "Ann, 123");
   EXPECT_EQ(model.index(0, 0).data().toString(), PastGameModel::TimeText("2026-11-21 20:15:30"));
   EXPECT_EQ(PastGameModel::TimeText("some day"), QStringLiteral("some day"));
 }

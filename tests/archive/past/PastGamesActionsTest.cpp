@@ -1,5 +1,7 @@
 #include <gmock/gmock.h>
 
+#include <QProgressBar>
+
 #include "core/gamefile/GameFile.h"
 #include "tests/archive/past/PastGamesVenue.h"
 
@@ -229,6 +231,87 @@ TEST_F(WindowOfPastGames, NeitherDeletesNorBringsBackWhileTheDiskIsNarrow) {
   Press("BringBack");
   EXPECT_THAT(Status(), testing::HasSubstr("32 MB"));
   EXPECT_EQ(Query("SELECT count(*) FROM Games WHERE Deleted IS NULL"), "3");
+}
+
+class ManyPastGames : public WindowOfPastGames {
+ protected:
+  static constexpr int Many = 20'000;
+
+  ManyPastGames() {
+    Keep("2026-11-22 20:00:00", "None", 400);
+    access.Close();
+    ExecuteSql(ArchivePath(),
+               "WITH RECURSIVE n(i) AS (SELECT 2 UNION ALL SELECT i + 1 FROM n WHERE i < 20000) INSERT INTO "
+               "Games SELECT i, '2026-10-01 00:00:00', '', 'None', 'cable', 1, 2, 0, 0, 0, 0, 1, 1, 1, 1, 1, "
+               "1, 1, '', NULL FROM n");
+    Open();
+    Months().selectRow(0);
+    Games().setFocus();
+    Games().selectAll();
+  }
+
+  /// In the middle of the next long run.
+  void Meanwhile(std::function<void()> act) {
+    events.At(std::chrono::milliseconds(0), [this, act = std::move(act)] {
+      EXPECT_TRUE(Get<QProgressBar>("Progress").isVisible());
+      EXPECT_FALSE(Games().isEnabled());
+      EXPECT_FALSE(Enabled("Close"));
+      act();
+    });
+  }
+  void ExpectReady() const {
+    EXPECT_FALSE(Get<QPushButton>("Stop").isVisible());
+    EXPECT_FALSE(Get<QProgressBar>("Progress").isVisible());
+    EXPECT_TRUE(Games().isEnabled());
+    EXPECT_EQ(window->focusWidget(), &Games());
+  }
+  std::string Deleted() const { return Query("SELECT count(*) FROM Games WHERE Deleted IS NOT NULL"); }
+};
+
+TEST_F(ManyPastGames, AreCopiedWithProgress) {
+  Type(*window, Qt::Key_C, Qt::ControlModifier);
+  EXPECT_EQ(QGuiApplication::clipboard()->text().count(u'\n'), Many + 1);
+  ExpectReady();
+}
+
+TEST_F(ManyPastGames, AreNotCopiedWhenTheOperatorStops) {
+  QGuiApplication::clipboard()->setText(QStringLiteral("mine"));
+  Meanwhile([this] { Press("Stop"); });
+  Type(*window, Qt::Key_C, Qt::ControlModifier);
+  EXPECT_EQ(QGuiApplication::clipboard()->text(), QStringLiteral("mine"));
+  EXPECT_EQ(Status(), "Stopped. Nothing was copied.");
+  ExpectReady();
+}
+
+TEST_F(ManyPastGames, AreDeletedAndBroughtBackAllTogether) {
+  Press("Delete");
+  EXPECT_EQ(Deleted(), std::to_string(Many));
+  EXPECT_EQ(Status(), "Deleted games: 20000");
+  ExpectReady();
+  Months().selectRow(1);
+  Games().selectAll();
+  Press("BringBack");
+  EXPECT_EQ(Deleted(), "0");
+  EXPECT_EQ(Status(), "Games brought back: 20000");
+}
+
+TEST_F(ManyPastGames, AreDeletedOnlyAsFarAsTheOperatorLets) {
+  Meanwhile([this] { Press("Stop"); });
+  Press("Delete");
+  const int deleted = std::stoi(Deleted());
+  EXPECT_GT(deleted, 0);
+  EXPECT_LT(deleted, Many);
+  EXPECT_EQ(Status(),
+            "Stopped. Games deleted until then: " + std::to_string(deleted) + ". They stand under Deleted.");
+  EXPECT_EQ(static_cast<int>(Listed().size()), Many - deleted);
+  ExpectReady();
+}
+
+TEST_F(ManyPastGames, CloseInTheMiddleOfARun) {
+  Meanwhile([this] { window->close(); });
+  Press("Delete");
+  EXPECT_FALSE(window->isVisible());
+  EXPECT_LT(std::stoi(Deleted()), Many);
 }
 
 }  // namespace

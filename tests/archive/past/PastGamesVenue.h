@@ -11,6 +11,7 @@
 #include <QTableView>
 #include <filesystem>
 #include "archive/past/PastGames.h"
+#include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakeFileDialog.h"
 #include "tests/support/Controls.h"
 #include "tests/support/MadeDatabase.h"
@@ -64,8 +65,8 @@ class WindowOfPastGames : public testing::Test {
                          .Boxes = venue.Boxes,
                          .CommonDialog1 = dialog,
                          .Disk = venue.Disk,
+                         .Events = events,
                          .Strings = *strings,
-                         .NameOf = access.Names(),
                          .MembersCalled =
                              [](const std::string& text) {
                                return text == "Mo" ? std::vector<std::int32_t>{5}
@@ -120,6 +121,7 @@ class WindowOfPastGames : public testing::Test {
                         .UserDataFolder = venue.Folder.Path(),
                         .ProgramFolder = venue.Folder / "program"}};
   FakeFileDialog dialog;
+  FakeEventPump events;
   std::optional<StringTable> strings;
   bool unsaved = false;
   std::optional<OwnText> busy;
