@@ -29,6 +29,9 @@ class ReplacingFile : public NewFile {
   std::unique_ptr<TemporaryFile> file_;
 };
 
+/// True for the names that such files have until they are finished.
+bool IsUnfinishedName(std::string_view name);
+
 /// Writes all of the bytes. Returns false, with errno, if that fails.
 bool WriteAll(int file, std::string_view bytes);
 
