@@ -2,9 +2,11 @@
 
 #include <sqlite3.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <memory>
 #include <utility>
+#include <vector>
 
 #include "platform/RuntimeError.h"
 #include "platform/sqlite/SqliteConnection.h"
@@ -17,6 +19,14 @@ constexpr int PagesOfAStep = 256;
 constexpr int InstructionsOfAStep = 20000;
 
 using Handle = std::unique_ptr<sqlite3, decltype(&sqlite3_close)>;
+
+/// The file of the open database; nullptr if there is none.
+sqlite3_file* OpenFile(sqlite3* database) {
+  sqlite3_file* file = nullptr;
+  const bool isOpen = sqlite3_file_control(database, "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK &&
+                      file != nullptr && file->pMethods != nullptr;
+  return isOpen ? file : nullptr;
+}
 
 /// Asks during a statement whether to keep on, as long as it exists.
 class StatementWatch {
@@ -113,6 +123,29 @@ class SqliteStepwiseCopy : public StepwiseCopy {
   sqlite3_backup* backup_ = nullptr;
 };
 
+/// Reads the file once, so that a check, which asks nobody while it follows the pages of a table, finds them
+/// all in memory. False if it was stopped. A failure is left to the check.
+bool ReadInPieces(sqlite3* database, const KeepOn& keepOn) {
+  constexpr sqlite3_int64 pieceBytes = sqlite3_int64{1} << 20U;
+  sqlite3_file* const file = OpenFile(database);
+  sqlite3_int64 bytes = 0;
+  if (file == nullptr || file->pMethods->xFileSize(file, &bytes) != SQLITE_OK) {
+    return true;
+  }
+  std::vector<char> piece(static_cast<std::size_t>(pieceBytes));
+  for (sqlite3_int64 offset = 0; offset < bytes; offset += pieceBytes) {
+    if (!keepOn()) {
+      return false;
+    }
+    const auto count = static_cast<int>(std::min(pieceBytes, bytes - offset));
+    // By the database's own handle: closing another one would drop its locks.
+    if (file->pMethods->xRead(file, piece.data(), count, offset) != SQLITE_OK) {
+      break;
+    }
+  }
+  return true;
+}
+
 }  // namespace
 
 std::unique_ptr<StepwiseCopy> BeginWholeCopy(SqliteConnection& connection, const std::string& path) {
@@ -120,9 +153,8 @@ std::unique_ptr<StepwiseCopy> BeginWholeCopy(SqliteConnection& connection, const
 }
 
 bool FlushFile(sqlite3* database) {
-  sqlite3_file* file = nullptr;
-  return sqlite3_file_control(database, "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK &&
-         file != nullptr && file->pMethods != nullptr &&
+  sqlite3_file* const file = OpenFile(database);
+  return file != nullptr &&
          file->pMethods->xSync(file, SQLITE_SYNC_NORMAL | SQLITE_SYNC_DATAONLY) == SQLITE_OK;
 }
 
@@ -159,6 +191,9 @@ bool CopyWhole(SqliteConnection& connection, const std::string& path, const Keep
 }
 
 bool CheckWhole(SqliteConnection& connection, const KeepOn& keepOn) {
+  if (keepOn && !ReadInPieces(connection.Handle(), keepOn)) {
+    return false;
+  }
   const StatementWatch watch(connection.Handle(), keepOn);
   try {
     SqliteStatement check(connection, "PRAGMA integrity_check(1)");
