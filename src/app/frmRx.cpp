@@ -70,7 +70,7 @@ bool frmRx::FormLoad() {
                                           .Busy = [this] { return downloading_ || IsBusy(); },
                                           .Elapsed = services_.Elapsed});
   TellNewVersion();
-  desk_->Tell({QStringLiteral("TakeOver"), QString::fromStdString(resumed.ToTell)});
+  desk_->Tell({QStringLiteral("TakeOverEnd"), QString::fromStdString(resumed.ToTell)});
   SetUpResults();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
