@@ -2,7 +2,6 @@
 
 #include <QApplication>
 #include <QDir>
-#include <QLibraryInfo>
 
 #include "app/Release.h"
 #include "app/SystemFacts.h"
@@ -10,6 +9,7 @@
 #include "devices/buttons/ButtonSwipe.h"
 #include "platform/qt/QtPipedProgram.h"
 #include "platform/qt/UprightPicture.h"
+#include "ui/Look.h"
 
 namespace {
 
@@ -37,10 +37,7 @@ Composition::Composition()
       logFolder_(UserDataFolder(folders_) + "/logs"),
       readerSettings_(files_, UserDataFolder(folders_) + "/tessarine.ini"),
       wordProcessor_(ModuleFolder()) {
-  if (strings_.TextLanguage() == Language::SimplifiedChinese &&
-      dialogTexts_.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
-    QCoreApplication::installTranslator(&dialogTexts_);
-  }
+  UseDialogTexts(dialogTexts_, strings_.TextLanguage());
 }
 
 ::Services Composition::Services() {

@@ -1,5 +1,7 @@
 #include "app/FirstStart.h"
 
+#include <unistd.h>
+
 #include <QCryptographicHash>
 #include <cstdio>
 #include <filesystem>
@@ -19,7 +21,10 @@ std::string FromEnvironment(const char* name) {
 InstancePlace PlaceOfThisUser() {
   std::string folder;
   QtFolders().LocalAppData(folder);
-  return InstancePlaceOf(FromEnvironment("XDG_RUNTIME_DIR"), folder + UserDataSubfolder);
+  const std::string set = FromEnvironment("XDG_RUNTIME_DIR");
+  // A terminal or a timer of this user may not have it.
+  const std::string runtime = set.empty() ? "/run/user/" + std::to_string(geteuid()) : set;
+  return InstancePlaceOf(runtime, folder + UserDataSubfolder);
 }
 
 /// The permission to come to the front that the desktop gave this start.
@@ -43,7 +48,7 @@ InstancePlace InstancePlaceOf(const std::string& runtimeFolder, const std::strin
       QCryptographicHash::hash(QByteArray::fromStdString(path), QCryptographicHash::Sha256)
           .toHex()
           .left(digits);
-  return {InstanceFolder(runtimeFolder, dataFolder), ".tessarine-" + digest.toStdString()};
+  return {InstanceFolders(runtimeFolder, dataFolder), ".tessarine-" + digest.toStdString()};
 }
 
 std::optional<int> FirstStart::Begin(const std::vector<std::string>& words) {
@@ -64,16 +69,29 @@ std::optional<int> FirstStart::Begin(const std::vector<std::string>& words) {
   }
   std::error_code none;
   file_ = asked.File.empty() ? std::string() : std::filesystem::absolute(asked.File, none).string();
-  switch (instance_.emplace(PlaceOfThisUser()).Start({file_, ActivationToken()}, patience)) {
+  if (!InstanceLine({file_, {}})) {
+    return Refuse(Filled(strings_.Text(OwnText::StartPathTooLong), {file_}), misused);
+  }
+  InstanceRequest request{file_, ActivationToken()};
+  if (!InstanceLine(request)) {
+    request.Token.clear();  // without it the window comes to the front a little later
+  }
+  switch (instance_.emplace(PlaceOfThisUser()).Start(request, patience)) {
     case InstanceOutcome::Told:
       return 0;
     case InstanceOutcome::NoAnswer:
-      unanswered_ = true;
-      return Refuse(strings_.Text(OwnText::StartUnanswered), 1);
+      return Bar(strings_.Text(OwnText::StartUnanswered));
+    case InstanceOutcome::Barred:
+      return Bar(Filled(strings_.Text(OwnText::StartBarred), {instance_->BarredBy()}));
     case InstanceOutcome::First:
       break;
   }
   return std::nullopt;
+}
+
+int FirstStart::Bar(const std::string& text) {
+  obstacle_ = text;
+  return Refuse(text, 1);
 }
 
 int FirstStart::Refuse(const std::string& text, int exitCode) const {

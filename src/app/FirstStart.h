@@ -20,19 +20,21 @@ class FirstStart {
   /// The game to load, an absolute path; empty for none.
   const std::string& File() const { return file_; }
 
-  /// True if the program that runs did not answer, which the operator is to be told in a window too.
-  bool Unanswered() const { return unanswered_; }
+  /// What another program does not let this one do, which the operator is to be told in a window too; empty
+  /// if nothing.
+  const std::string& Obstacle() const { return obstacle_; }
 
   /// See Instance.
   int Listener() const { return instance_ ? instance_->Listener() : -1; }
 
  private:
   int Refuse(const std::string& text, int exitCode) const;
+  int Bar(const std::string& text);
 
   const StringTable& strings_;
   std::optional<Instance> instance_;
   std::string file_;
-  bool unanswered_ = false;
+  std::string obstacle_;
 };
 
 /// Where the programs on this data folder meet.

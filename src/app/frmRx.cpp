@@ -16,24 +16,9 @@
 #include "board/ScoreListModel.h"
 #include "core/data/FirstRun.h"
 #include "core/data/UserDatabase.h"
-#include "takeover/TakeOverMark.h"
 #include "ui/CalmList.h"
 #include "ui/Choice.h"
 #include "ui_frmRx.h"
-
-namespace {
-
-/// What a take-over of old data began, unless it was completed. Nothing of the data folder is open yet.
-void FinishInterruptedTakeOver(const Folders& places, Files& disk) {
-  std::string folder;
-  places.LocalAppData(folder);
-  folder += UserDataSubfolder;
-  if (disk.FolderExists(folder) && !FinishTakeOver(disk, folder)) {
-    ForgetTakeOver(disk, folder);
-  }
-}
-
-}  // namespace
 
 frmRx::frmRx(const Services& services)
     : services_(services),
@@ -57,7 +42,10 @@ bool frmRx::FormLoad() {
   session_.ClearPlayerData();
   FitToScreen(*this, services_.Boxes);
   SetUpLists();
-  FinishInterruptedTakeOver(services_.Places, services_.Disk);
+  const ResumedTakeOver resumed = FinishInterruptedTakeOver();
+  if (!resumed.GoOn) {
+    return false;
+  }
   userDataFolder_ = PrepareUserDataFolder(services_.Places, services_.Disk, services_.Boxes);
   ini_.emplace(services_.Disk, userDataFolder_ + "/tessarine.ini");
   RestorePlaces();
@@ -83,6 +71,7 @@ bool frmRx::FormLoad() {
                          .Busy = [this] { return downloading_ || IsBusy(); },
                          .Elapsed = services_.Elapsed});
   TellNewVersion();
+  desk_->Tell({QStringLiteral("TakeOverEnd"), QString::fromStdString(resumed.ToTell)});
   SetUpResults();
   // Not before the window is shown.
   constexpr int followMilliseconds = 100;
@@ -216,6 +205,7 @@ void frmRx::ConnectLetters() {
 void frmRx::ConnectCommands() {
   commands_.EndWaits = [this] { services_.Events.EndWaits(); };
   commands_.AllUnwound = [this] { TellOfMissingBackup(); };
+  commands_.AfterFailure = [this] { PointToSystemCheck(); };
   commands_.Connect(*this, {
                                {ui_->mnuLoadScores, &frmRx::LoadGame},
                                {ui_->mnuSaveScores, &frmRx::SaveGame},

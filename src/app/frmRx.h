@@ -31,6 +31,7 @@
 #include "manual/ManualKey.h"
 #include "sheets/PrintOptions.h"
 #include "takeover/TakeOver.h"
+#include "takeover/TakeOverResume.h"
 #include "ui/Commands.h"
 #include "ui/WindowPlaces.h"
 #include "web/ResultsHost.h"
@@ -161,7 +162,10 @@ class frmRx : public QMainWindow {
   CopyWork::Parts CopyParts() const;
   /// What a take-over of old data works on.
   TakeOverWork::Parts TakeOverParts();
-  ImportedGames ImportOldGames(const std::string& folder, FilesOfMembers members, const KeepOn& keepOn);
+  ImportedGames ImportOldGames(const std::string& folder, FilesOfMembers members,
+                               const TakeOver::OnImport& keepOn);
+  /// What a take-over of old data began. Nothing of the data folder is open yet.
+  ResumedTakeOver FinishInterruptedTakeOver();
   /// Why no old installation can be taken over now; empty if one can.
   std::string WhyNoTakeOver();
 

@@ -10,6 +10,7 @@
 #include "archive/CopiedArchive.h"
 #include "archive/copies/BackupCopies.h"
 #include "archive/import/GameImport.h"
+#include "core/data/FirstRun.h"
 #include "core/line/CommPortSetting.h"
 #include "core/text/Filled.h"
 #include "members/ExportMembers.h"
@@ -126,6 +127,13 @@ void frmRx::ShowBackupCopies() {
       .exec();
 }
 
+ResumedTakeOver frmRx::FinishInterruptedTakeOver() {
+  std::string folder;
+  services_.Places.LocalAppData(folder);
+  return ResumeTakeOver(services_.Disk, folder + UserDataSubfolder, services_.Boxes, services_.Strings,
+                        [this] { services_.Events.DoEvents(); });  // other starts want an answer
+}
+
 std::string frmRx::WhyNoTakeOver() {
   const StringTable& strings = services_.Strings;
   if (const std::optional<OwnText> reason = RunningBesidesThis()) {
@@ -165,7 +173,8 @@ TakeOverWork::Parts frmRx::TakeOverParts() {
           }};
 }
 
-ImportedGames frmRx::ImportOldGames(const std::string& folder, FilesOfMembers members, const KeepOn& keepOn) {
+ImportedGames frmRx::ImportOldGames(const std::string& folder, FilesOfMembers members,
+                                    const TakeOver::OnImport& keepOn) {
   CheckSpaceForGames(services_.Disk, userDataFolder_, services_.Strings);
   GameImport import({.Archive = archive_->File(),
                      .Members = session_.DbMembers(),
@@ -175,11 +184,13 @@ ImportedGames frmRx::ImportOldGames(const std::string& folder, FilesOfMembers me
                      .Factors = session_.Factors(),
                      .UserDataFolder = userDataFolder_},
                     members == FilesOfMembers::Taken ? FilesOf::ThisTable : FilesOf::OtherTable);
-  import.Run(folder, [&keepOn](const GameImport::State&) { return keepOn();
-});
-return {.Imported = import.Imported() + import.BroughtBack(),
-        .Known = import.Known(),
-        .Refused = import.Refused().size()};
+  const bool isWhole = import.Run(folder, [&keepOn](const GameImport::State& state) {
+    return keepOn(state.Files == 0 ? 0 : static_cast<double>(state.Done) / static_cast<double>(state.Files));
+  });
+  return {.Imported = import.Imported() + import.BroughtBack(),
+          .Known = import.Known(),
+          .Refused = import.Refused().size(),
+          .Whole = isWhole};
 }
 
 void frmRx::TakeOverOldInstallation() {
@@ -200,8 +211,10 @@ void frmRx::TakeOverOldInstallation() {
                   CheckMembers();
                 },
             .EndProgram = [this] { close(); },
-            .ImportGames = [this](const std::string& folder, FilesOfMembers members,
-                                  const KeepOn& keepOn) { return ImportOldGames(folder, members, keepOn); }},
+            .ImportGames =
+                [this](const std::string& folder, FilesOfMembers members, const TakeOver::OnImport& keepOn) {
+                  return ImportOldGames(folder, members, keepOn);
+                }},
            this)
       .exec();
 }

@@ -2,6 +2,7 @@
 // System Check.
 
 #include <QApplication>
+#include <optional>
 
 #include "app/StateKeys.h"
 #include "app/SystemFacts.h"
@@ -21,6 +22,12 @@ QString NameOfFile(const std::string& path) {
 
 void frmRx::Open(const std::string& path) {
   constexpr int untilNextTry = 50;  // milliseconds
+  if (desk_) {
+    const bool isLeftOut = !waitingFile_.empty() && waitingFile_ != path;
+    desk_->Tell({QStringLiteral("FileLeftOut"),
+                 isLeftOut ? Text(services_.Strings, OwnText::DeskFileLeftOut).arg(NameOfFile(waitingFile_))
+                           : QString()});
+  }
   waitingFile_ = path;
   waitingFileTimer_.start(untilNextTry);
   // The caller is not kept waiting.
@@ -85,11 +92,15 @@ void frmRx::TellNewVersion() {
 }
 
 void frmRx::ShowSystemCheck() {
-  const auto readerPort = [this] {
-    std::int16_t port = 1;
+  desk_->Tell({QStringLiteral("SystemCheck"), QString()});  // what pointed here has done its part
+  const auto readerPort = [this]() -> std::optional<std::int16_t> {
+    std::int16_t port = 0;
     std::int16_t type = 0;
-    return services_.Wire != nullptr && services_.Wire->TMReadDefaultPort(port, type) > 0 ? port
-                                                                                          : std::int16_t{1};
+    const bool isSet = services_.Wire != nullptr && services_.Wire->TMReadDefaultPort(port, type) > 0;
+    return isSet ? std::optional(port) : std::nullopt;
+  };
+  const auto pathInUse = [this](CheckSubject subject) {
+    return (subject == CheckSubject::Members ? session_.DbMembers() : session_.DbScenarios()).Path();
   };
   const SystemChecks checks(
       {.Strings = services_.Strings,
@@ -103,7 +114,9 @@ void frmRx::ShowSystemCheck() {
        .HasWordProcessor = [this] { return ui_->mnuPrintScores->isEnabled(); },
        .ChineseLetters = ChineseLetters,
        .Screens = ScreenTexts,
-       .ReaderPort = readerPort});
+       .ReaderPort = readerPort,
+       .PathInUse = pathInUse,
+       .Release = services_.Release});
   SystemCheck({.Checks = checks,
                .Strings = services_.Strings,
                .Boxes = services_.Boxes,

@@ -7,6 +7,7 @@
 #include "app/FirstStart.h"
 #include "app/Program.h"
 #include "app/SystemFacts.h"
+#include "ui/Look.h"
 
 namespace {
 
@@ -18,9 +19,12 @@ bool NeedsWindow() {
 }
 
 /// For a while only: nobody has to answer it.
-void ShowBriefly(int argc, char** argv, const std::string& text) {
+void ShowBriefly(int argc, char** argv, const std::string& text, Language language) {
   constexpr int milliseconds = 10'000;
   QApplication application(argc, argv);
+  QTranslator dialogTexts;
+  UseDialogTexts(dialogTexts, language);
+  PrepareLook();
   QMessageBox box(QMessageBox::Warning, QStringLiteral("Tessarine"), QString::fromStdString(text),
                   QMessageBox::Ok);
   QTimer::singleShot(milliseconds, &box, &QDialog::accept);
@@ -33,8 +37,8 @@ int main(int argc, char** argv) {
   const StringTable strings(LanguageOfSystem());
   FirstStart start(strings);
   if (const std::optional<int> exitCode = start.Begin({argv + 1, argv + argc})) {
-    if (start.Unanswered() && NeedsWindow()) {
-      ShowBriefly(argc, argv, strings.Text(OwnText::StartUnanswered));
+    if (!start.Obstacle().empty() && NeedsWindow()) {
+      ShowBriefly(argc, argv, start.Obstacle(), strings.TextLanguage());
     }
     return *exitCode;
   }

@@ -1,6 +1,7 @@
 #include "check/SystemChecks.h"
 
 #include <algorithm>
+#include <chrono>
 #include <utility>
 
 #include "archive/copies/CopyNames.h"
@@ -14,6 +15,41 @@ namespace {
 
 /// Nothing of the program is older.
 constexpr const char* EarliestTime = "2013-05-21";
+
+/// The day before that of the package's version, which is told in another time zone: "2026-11-19" for
+/// "... (3.54+20261120.1203)". Empty without such a version.
+std::string DayBeforeRelease(const std::string& release) {
+  constexpr std::size_t digits = 8;
+  const std::size_t plus = release.find('+');
+  const std::string day = plus == std::string::npos ? std::string() : release.substr(plus + 1, digits);
+  if (day.size() != digits || day.find_first_not_of("0123456789") != std::string::npos) {
+    return {};
+  }
+  using std::chrono::year_month_day;
+  const auto number = [&day](std::size_t start, std::size_t count) {
+    return std::stoi(day.substr(start, count));
+  };
+  const year_month_day made(std::chrono::year(number(0, 4)),
+                            std::chrono::month(static_cast<unsigned>(number(4, 2))),
+                            std::chrono::day(static_cast<unsigned>(number(6, 2))));
+  if (!made.ok()) {
+    return {};
+  }
+  const year_month_day before(std::chrono::sys_days(made) - std::chrono::days(1));
+  const auto twoDigits = [](unsigned value) { return (value < 10 ? "0" : "") + std::to_string(value); };
+  return std::to_string(static_cast<int>(before.year())) + "-" +
+         twoDigits(static_cast<unsigned>(before.month())) + "-" +
+         twoDigits(static_cast<unsigned>(before.day()));
+}
+
+/// True for a serial port of the computer's own, which nobody can unplug.
+bool IsBoardPort(const std::string& device) {
+  return device.starts_with("/dev/ttyS");
+}
+
+std::string NameIn(const std::string& path) {
+  return path.substr(path.rfind('/') + 1);
+}
 
 struct CheckedDatabase {
   const char* Name;
@@ -66,9 +102,9 @@ SystemChecks::Items SystemChecks::LookAt(CheckSubject subject, const KeepOn& kee
     case CheckSubject::Ports:
       return Ports(keepOn);
     case CheckSubject::BaseUnit:
-      return {Port(subject, CommPortSetting(parts_.Ini, parts_.Devices).Number())};
+      return {Port(subject, CommPortSetting(parts_.Ini, parts_.Devices).Number(), keepOn)};
     case CheckSubject::Reader:
-      return {Port(subject, parts_.ReaderPort())};
+      return {Reader(keepOn)};
     case CheckSubject::WordProcessor:
       return {found(parts_.HasWordProcessor() ? "LibreOffice Writer" : "", OwnText::CheckWordMissing)};
     case CheckSubject::Printer:
@@ -78,7 +114,7 @@ SystemChecks::Items SystemChecks::LookAt(CheckSubject subject, const KeepOn& kee
     case CheckSubject::Screens:
       return {Screens()};
     case CheckSubject::Disk:
-      return {Disk()};
+      return Disk();
     case CheckSubject::Clock:
       return {Clock()};
     case CheckSubject::Missions:
@@ -102,30 +138,50 @@ SystemChecks::Items SystemChecks::Ports(const KeepOn& keepOn) const {
   }
   const std::vector<DeviceUser> users = parts_.Computer.UsersOf(devices, keepOn);
   Items items;
+  items.reserve(devices.size());
   for (const std::string& device : devices) {
-    std::vector<std::string> holders;
-    for (const DeviceUser& user : users) {
-      if (user.Device == device) {
-        holders.push_back(user.Program);
-      }
-    }
-    if (!parts_.Computer.MayUse(device)) {
-      items.push_back({CheckSubject::Ports, false, Text(OwnText::CheckPortForbidden, {device})});
-    } else if (!holders.empty()) {
-      items.push_back({CheckSubject::Ports, false, Text(OwnText::CheckPortHeld, {device, Joined(holders)})});
-    } else {
-      items.push_back({CheckSubject::Ports, true, device});
-    }
+    items.push_back(Device(CheckSubject::Ports, device, device, users));
   }
   return items;
 }
 
-CheckItem SystemChecks::Port(CheckSubject subject, std::int16_t number) const {
+CheckItem SystemChecks::Device(CheckSubject subject, const std::string& device, const std::string& fineText,
+                               const std::vector<DeviceUser>& users) const {
+  if (!parts_.Computer.MayUse(device)) {
+    return {
+        subject, false,
+        Text(IsBoardPort(device) ? OwnText::CheckBoardPortForbidden : OwnText::CheckPortForbidden, {device})};
+  }
+  std::vector<std::string> holders;
+  for (const DeviceUser& user : users) {
+    if (user.Device == device) {
+      holders.push_back(user.Program);
+    }
+  }
+  return holders.empty() ? CheckItem{subject, true, fineText}
+                         : CheckItem{subject, false, Text(OwnText::CheckPortHeld, {device, Joined(holders)})};
+}
+
+CheckItem SystemChecks::Port(CheckSubject subject, std::int16_t number, const KeepOn& keepOn) const {
   const EnumPorts ports(parts_.Ini, parts_.Devices);
   const std::string text = std::to_string(number);
-  return ports.PortExists(number)
-             ? CheckItem{subject, true, Text(OwnText::CheckPortIs, {text, ports.DeviceOf(number)})}
-             : CheckItem{subject, false, Text(OwnText::CheckPortMissing, {text})};
+  if (!ports.PortExists(number)) {
+    return {subject, false, Text(OwnText::CheckPortMissing, {text})};
+  }
+  const std::string device = ports.DeviceOf(number);
+  return Device(subject, device, Text(OwnText::CheckPortIs, {text, device}),
+                parts_.Computer.UsersOf({device}, keepOn));
+}
+
+CheckItem SystemChecks::Reader(const KeepOn& keepOn) const {
+  const std::optional<std::int16_t> port = parts_.ReaderPort();
+  if (!port) {
+    return {CheckSubject::Reader, false, Text(OwnText::CheckNoReader)};
+  }
+  if (const CommPortSetting setting(parts_.Ini, parts_.Devices); setting.Number() == *port) {
+    return {CheckSubject::Reader, false, Text(OwnText::CheckReaderShares, {std::to_string(*port)})};
+  }
+  return Port(CheckSubject::Reader, *port, keepOn);
 }
 
 CheckItem SystemChecks::Printer(const KeepOn& keepOn) const {
@@ -140,39 +196,83 @@ CheckItem SystemChecks::Screens() const {
                             : CheckItem{CheckSubject::Screens, false, Text(OwnText::CheckOneScreen)};
 }
 
-CheckItem SystemChecks::Disk() const {
+SystemChecks::Items SystemChecks::Disk() const {
   constexpr std::uint64_t bytesOfMegabyte = 1'000'000;
+  Items items;
+  for (const char* name :
+       {"", "/backups", "/scenarios.mdb", "/members.mdb", "/games.mdb", "/tessarine.ini"}) {
+    const std::string path = parts_.UserDataFolder + name;
+    const bool isThere = parts_.Disk.FolderExists(path) || parts_.Disk.FileExists(path);
+    if (isThere && !parts_.Computer.MayUse(path)) {
+      items.push_back({CheckSubject::Disk, false, Text(OwnText::CheckNotWritable, {path})});
+    }
+  }
   const std::uint64_t free = parts_.Disk.FreeSpace(parts_.UserDataFolder) / bytesOfMegabyte;
   const bool isFine = free >= LeastFreeMegabytes;
-  return {CheckSubject::Disk, isFine,
-          Text(isFine ? OwnText::CheckDiskFree : OwnText::CheckDiskFull, {std::to_string(free)})};
+  items.push_back({CheckSubject::Disk, isFine,
+                   Text(isFine ? OwnText::CheckDiskFree : OwnText::CheckDiskFull, {std::to_string(free)})});
+  return items;
 }
 
 CheckItem SystemChecks::Clock() const {
   const std::string now = parts_.Time.Now();
   const std::vector<BackupCopy> copies = CopiesIn(parts_.Disk, parts_.UserDataFolder + "/backups");
+  if (now < std::max(std::string(EarliestTime), DayBeforeRelease(parts_.Release))) {
+    return {CheckSubject::Clock, false, Text(OwnText::CheckClockEarly, {now})};
+  }
   const bool isFine =
-      now >= EarliestTime &&
       std::none_of(copies.begin(), copies.end(), [&](const BackupCopy& copy) { return copy.Time > now; });
   return {CheckSubject::Clock, isFine, isFine ? now : Text(OwnText::CheckClockWrong, {now})};
 }
 
 SystemChecks::Items SystemChecks::DatabaseOf(CheckSubject subject, const KeepOn& keepOn) const {
   const CheckedDatabase file = FileOf(subject);
-  const std::string path = parts_.UserDataFolder + "/" + file.Name + ".mdb";
-  if (subject == CheckSubject::Games && !parts_.Disk.FileExists(path)) {
-    return {{subject, true, Text(OwnText::CheckNoCopy)}};  // no game was kept
+  const std::string usual = parts_.UserDataFolder + "/" + file.Name + ".mdb";
+  if (subject == CheckSubject::Games) {
+    if (!parts_.Disk.FileExists(usual)) {
+      return {{subject, true, Text(OwnText::CheckNoCopy)}};  // no game was kept
+    }
+    const CheckItem games = DatabaseAt(subject, usual, file.Table, keepOn);
+    return games.Text.empty() ? Items() : Items{games};
   }
+  const std::string inUse = parts_.PathInUse(subject);
+  Items items = {DatabaseAt(subject, inUse, file.Table, keepOn)};
+  if (items.front().Text.empty()) {
+    return {};
+  }
+  for (CheckItem& item : PutAside(subject, usual, inUse, keepOn)) {
+    items.push_back(std::move(item));
+  }
+  return items;
+}
+
+CheckItem SystemChecks::DatabaseAt(CheckSubject subject, const std::string& path, const char* table,
+                                   const KeepOn& keepOn) const {
   try {
     const std::unique_ptr<Database> database = parts_.Databases.OpenDatabase(path);
     if (!database->CheckWhole(keepOn)) {
-      return {};
+      return {subject, false, {}};
     }
     const std::int64_t rows =
-        WholeNumber(database->Statements(), "SELECT count(*) FROM " + std::string(file.Table));
-    return {{subject, true, Text(OwnText::CheckRows, {std::to_string(rows), LastCopyOf(file.Name)})}};
+        WholeNumber(database->Statements(), "SELECT count(*) FROM " + std::string(table));
+    const std::string name = NameIn(path);
+    return {subject, true,
+            Text(OwnText::CheckRows, {std::to_string(rows), LastCopyOf(name.substr(0, name.rfind('.')))})};
   } catch (const RuntimeError& error) {
-    return {{subject, false, Text(OwnText::CheckDamaged, {NameOf(subject, parts_.Strings), error.what()})}};
+    return {subject, false, Text(OwnText::CheckDamaged, {NameOf(subject, parts_.Strings), error.what()})};
+  }
+}
+
+SystemChecks::Items SystemChecks::PutAside(CheckSubject subject, const std::string& path,
+                                           const std::string& inUse, const KeepOn& keepOn) const {
+  if (NameIn(path) == NameIn(inUse) || !parts_.Disk.FileExists(path)) {
+    return {};
+  }
+  try {
+    parts_.Databases.OpenDatabase(path)->CheckWhole(keepOn);
+    return {};  // the next start uses it again
+  } catch (const RuntimeError& error) {
+    return {{subject, false, Text(OwnText::CheckPutAside, {NameIn(path), error.what(), NameIn(inUse)})}};
   }
 }
 

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <functional>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -28,8 +29,11 @@ class SystemChecks {
     std::function<bool()> HasWordProcessor;
     std::function<std::string()>
         ChineseLetters;  ///< name of letters with which Chinese is written; empty if none
-    std::function<std::vector<std::string>()> Screens;  ///< a text about each
-    std::function<std::int16_t()> ReaderPort;           ///< number
+    std::function<std::vector<std::string>()> Screens;        ///< a text about each
+    std::function<std::optional<std::int16_t>()> ReaderPort;  ///< number; nothing if none is set
+    /// Path of the database that is open for this subject, missions or members.
+    std::function<std::string(CheckSubject)> PathInUse;
+    std::string Release = {};  ///< with the package's version where there is one: "... (3.54+20261120.1203)"
   };
 
   /// Less free space is told as too little.
@@ -48,12 +52,20 @@ class SystemChecks {
   std::string Text(OwnText text, std::initializer_list<std::string_view> values = {}) const;
   Items LookAt(CheckSubject subject, const KeepOn& keepOn) const;
   Items Ports(const KeepOn& keepOn) const;
-  CheckItem Port(CheckSubject subject, std::int16_t number) const;
+  CheckItem Device(CheckSubject subject, const std::string& device, const std::string& fineText,
+                   const std::vector<DeviceUser>& users) const;
+  CheckItem Port(CheckSubject subject, std::int16_t number, const KeepOn& keepOn) const;
+  CheckItem Reader(const KeepOn& keepOn) const;
   CheckItem Printer(const KeepOn& keepOn) const;
   CheckItem Screens() const;
-  CheckItem Disk() const;
+  Items Disk() const;
   CheckItem Clock() const;
   Items DatabaseOf(CheckSubject subject, const KeepOn& keepOn) const;
+  CheckItem DatabaseAt(CheckSubject subject, const std::string& path, const char* table,
+                       const KeepOn& keepOn) const;
+  /// The file of the usual name, if another one is in use since it cannot be.
+  Items PutAside(CheckSubject subject, const std::string& path, const std::string& inUse,
+                 const KeepOn& keepOn) const;
   std::string LastCopyOf(const std::string& database) const;
 
   const Parts parts_;

@@ -39,6 +39,10 @@ class Files {
   /// Makes one folder; its parent must exist. Throws RuntimeError 75 or 76.
   virtual void CreateFolder(const std::string& path) = 0;
 
+  /// Makes one folder that only this user may enter, or makes the one that is there such a folder; its parent
+  /// must exist. Throws RuntimeError 75 or 76.
+  virtual void MakePrivateFolder(const std::string& path) = 0;
+
   /// Size of a file in bytes. Throws RuntimeError 53 if it does not exist, 75 if it is not a readable file.
   virtual std::uint64_t FileLen(const std::string& path) const = 0;
 
@@ -59,6 +63,10 @@ class Files {
 
   /// Does the same for a file that is written piece by piece. Throws as Replace does.
   virtual std::unique_ptr<NewFile> BeginReplace(const std::string& path, FileReaders readers) = 0;
+
+  /// Deletes what a program that was killed in the middle of such a replacement left in a folder. What cannot
+  /// be deleted stays. Only where no other program of this kind can be at work in the folder.
+  virtual void DeleteUnfinished(const std::string& folder) = 0;
 
   /// Creates an empty file in the system's temporary folder, its name beginning with "per", and returns its
   /// path. Throws as Replace does.

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 
 #include "core/text/NumberForms.h"
 #include "platform/RuntimeError.h"
@@ -23,6 +24,23 @@ std::optional<std::int16_t> PortNumber(const std::string& text) {
   } catch (const RuntimeError&) {
     return std::nullopt;
   }
+}
+
+bool IsHere(const Files& disk, const std::string& path) {
+  try {
+    return path.starts_with('/') && disk.FileExists(path);
+  } catch (const RuntimeError&) {
+    return false;
+  }
+}
+
+bool IsFactor(const Setting& setting) {
+  return std::string_view(setting.Section) == Keys::TotalDamage.Section;
+}
+
+bool IsUsableFactor(const std::string& text) {
+  const std::optional<double> value = NumberIn(text);
+  return value && std::isfinite(*value);
 }
 
 void RequireTexts(const Files& disk, const std::string& path) {
@@ -50,7 +68,11 @@ OldSettings ReadOldSettings(Files& disk, const std::string& oldPath, const IniRe
     if (value == "\n") {
       continue;
     }
-    if (IsKey(setting, Keys::FirmwarePath) && !value.starts_with('/')) {
+    if (IsKey(setting, Keys::FirmwarePath) && !IsHere(disk, value)) {
+      continue;
+    }
+    if (IsFactor(setting) && !IsUsableFactor(value)) {
+      settings.FactorsLeftOut.emplace_back(setting.Key);
       continue;
     }
     if (IsKey(setting, Keys::CommPort)) {

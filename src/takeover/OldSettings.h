@@ -24,12 +24,14 @@ struct OldSetting {
 struct OldSettings {
   std::vector<OldSetting> Taken;
   std::optional<std::int16_t> PortLeftOut;  ///< number of a serial port that this computer does not have
+  std::vector<std::string> FactorsLeftOut;  ///< keys of soldiering factors that are no numbers
 
   std::size_t Different() const;
 };
 
-/// Reads the old ini file. The number of the serial port counts only if `hasPort` says so, the folder of the
-/// firmware only if it is one of this system. Throws RuntimeError 321 for a file that is none of texts, and
+/// Reads the old ini file. The number of the serial port counts only if `hasPort` says so, the firmware file
+/// only if it is on this computer, a soldiering factor only if it is a number that this program can use: with
+/// any other it would not start. Throws RuntimeError 321 for a file that is none of texts, and
 /// as Files::Read does.
 OldSettings ReadOldSettings(Files& disk, const std::string& oldPath, const IniReader& inUse,
                             const std::function<bool(std::int16_t)>& hasPort);

@@ -183,29 +183,45 @@ void TakeOver::Tell(const TakenOver& taken, const std::set<OldItem>& items) {
     parts_.EndProgram();
     reject();
   } else if (taken.What == TakenOver::Done) {
-    parts_.Reopen(items);
-    std::string names;
-    for (const std::string& name : taken.KeptAs) {
-      names.append(names.empty() ? "" : ", ").append(name);
-    }
-    const std::string games =
-        items.contains(OldItem::Games)
-            ? "\n" + ImportGames(items.contains(OldItem::Members) ? FilesOfMembers::Taken
-                                                                  : FilesOfMembers::Others)
-            : std::string();
-    found_.Show({});
-    ShowStatus(Filled(Words(OwnText::TakeOverDone), {TitlesOf(items), names}) + games);
+    TellDone(taken, items);
   }
+}
+
+void TakeOver::TellDone(const TakenOver& taken, const std::set<OldItem>& items) {
+  std::string names;
+  for (const std::string& name : taken.KeptAs) {
+    names.append(names.empty() ? "" : ", ").append(name);
+  }
+  const std::string done = Filled(Words(OwnText::TakeOverDone), {TitlesOf(items), names});
+  found_.Show({});
+  try {
+    parts_.Reopen(items);
+  } catch (const RuntimeError& error) {
+    // What is open may still belong to the files that were replaced: nothing may be written into those.
+    parts_.Boxes.Show(done + "\n" + Filled(Words(OwnText::TakeOverUnopened), {error.what()}),
+                      Words(OwnText::TakeOverTitle), BoxIcon::Exclamation);
+    parts_.EndProgram();
+    reject();
+    return;
+  }
+  const std::string games =
+      items.contains(OldItem::Games)
+          ? "\n" +
+                ImportGames(items.contains(OldItem::Members) ? FilesOfMembers::Taken : FilesOfMembers::Others)
+          : std::string();
+  ShowStatus(done + games);
 }
 
 std::string TakeOver::ImportGames(FilesOfMembers members) {
   RunProgress progress(*ui_->Progress, *ui_->Stop, parts_.Events, stopped_);
+  ui_->Status->setText(Text(parts_.Work.Strings, OwnText::TakeOverImporting));
   try {
-    const ImportedGames games =
-        parts_.ImportGames(old_->GamesFolder, members, [&progress] { return progress.GoOn(1); });
-    return Filled(
-        Words(OwnText::TakeOverGamesDone),
-        {std::to_string(games.Imported), std::to_string(games.Known), std::to_string(games.Refused)});
+    const ImportedGames games = parts_.ImportGames(old_->GamesFolder, members,
+                                                   [&progress](double done) { return progress.GoOn(done); });
+    const std::string result =
+        Filled(Words(OwnText::TakeOverGamesDone),
+               {std::to_string(games.Imported), std::to_string(games.Known), std::to_string(games.Refused)});
+    return games.Whole ? result : result + "\n" + Words(OwnText::TakeOverGamesStopped);
   } catch (const RuntimeError& error) {  // the rest has been taken over all the same
     return TitleOf(OldItem::Games, parts_.Work.Strings) + ": " + error.what();
   }

@@ -30,6 +30,7 @@ struct ImportedGames {
   std::size_t Imported = 0;
   std::size_t Known = 0;
   std::size_t Refused = 0;
+  bool Whole = true;  ///< false if it was stopped
 };
 
 /// Takes over the data of an old installation: the operator chooses its folder, sees what it has beside what
@@ -38,9 +39,11 @@ class TakeOver : public QDialog {
   Q_OBJECT
 
  public:
-  /// Imports the game files of a folder; `keepOn` is asked often.
+  /// Asked often, with how much of an import is done, from 0 to 1; false stops it.
+  using OnImport = std::function<bool(double done)>;
+  /// Imports the game files of a folder.
   using GameImporter =
-      std::function<ImportedGames(const std::string& folder, FilesOfMembers members, const KeepOn& keepOn)>;
+      std::function<ImportedGames(const std::string& folder, FilesOfMembers members, const OnImport& keepOn)>;
 
   struct Parts {
     TakeOverWork::Parts Work;  ///< its question is asked by the window
@@ -73,6 +76,8 @@ class TakeOver : public QDialog {
   bool MayTake();
   void TakeTicked();
   void Tell(const TakenOver& taken, const std::set<OldItem>& items);
+  /// Opens what was exchanged, imports the game files, and tells the result.
+  void TellDone(const TakenOver& taken, const std::set<OldItem>& items);
   /// What became of the game files, for the operator.
   std::string ImportGames(FilesOfMembers members);
   std::string TitlesOf(const std::set<OldItem>& items) const;

@@ -31,20 +31,24 @@ struct MarkedFile {
   bool operator==(const MarkedFile&) const = default;
 };
 
-void ReadInPieces(const Files& disk, const std::string& path,
+void ReadInPieces(const Files& disk, const std::string& path, const Breathe& breathe,
                   const std::function<void(std::string_view)>& take) {
   std::uint64_t offset = 0;
   for (std::string piece; !(piece = disk.ReadPart(path, offset, PieceBytes)).empty();
        offset += piece.size()) {
     take(piece);
+    if (breathe) {
+      breathe();
+    }
   }
 }
 
-MarkedFile MarkedAs(const Files& disk, const std::string& folder, const std::string& name) {
+MarkedFile MarkedAs(const Files& disk, const std::string& folder, const std::string& name,
+                    const Breathe& breathe) {
   constexpr std::uint64_t start = 14695981039346656037U;  // FNV-1a
   constexpr std::uint64_t prime = 1099511628211U;
   MarkedFile file{name, 0, start};
-  ReadInPieces(disk, folder + "/" + name, [&file](std::string_view piece) {
+  ReadInPieces(disk, folder + "/" + name, breathe, [&file](std::string_view piece) {
     file.Bytes += piece.size();
     for (const char byte : piece) {
       file.Digest = (file.Digest ^ static_cast<unsigned char>(byte)) * prime;
@@ -97,9 +101,9 @@ void DeleteIfThere(Files& disk, const std::string& path) {
 }
 
 /// Puts a copy of the file in its place, so that doing it again does no harm.
-void TakeItsPlace(Files& disk, const std::string& path, const std::string& target) {
+void TakeItsPlace(Files& disk, const std::string& path, const std::string& target, const Breathe& breathe) {
   const std::unique_ptr<NewFile> file = disk.BeginReplace(target, FileReaders::AsBefore);
-  ReadInPieces(disk, path, [&file](std::string_view piece) { file->Write(piece); });
+  ReadInPieces(disk, path, breathe, [&file](std::string_view piece) { file->Write(piece); });
   if (target.ends_with(".mdb")) {
     // A journal of the old file must not be played back into the new one.
     for (const char* ending : {"-journal", "-wal", "-shm"}) {
@@ -115,12 +119,13 @@ std::string TakeOverFolder(const std::string& dataFolder) {
   return dataFolder + "/.takeover";
 }
 
-void MarkTakeOver(Files& disk, const std::string& dataFolder, const std::vector<std::string>& names) {
+void MarkTakeOver(Files& disk, const std::string& dataFolder, const std::vector<std::string>& names,
+                  const Breathe& breathe) {
   const std::string folder = TakeOverFolder(dataFolder);
   std::vector<MarkedFile> files;
   files.reserve(names.size());
   for (const std::string& name : names) {
-    files.push_back(MarkedAs(disk, folder, name));
+    files.push_back(MarkedAs(disk, folder, name, breathe));
   }
   // Written beside the files and then moved, so that both folders are durable before the mark counts.
   disk.Replace(folder + MarkName, MarkOf(files));
@@ -131,27 +136,47 @@ bool HasTakeOverMark(const Files& disk, const std::string& dataFolder) {
   return disk.FileExists(dataFolder + MarkName);
 }
 
-bool FinishTakeOver(Files& disk, const std::string& dataFolder) {
+bool FinishTakeOver(Files& disk, const std::string& dataFolder, const Breathe& breathe) {
   if (!HasTakeOverMark(disk, dataFolder)) {
     return false;
   }
   const std::string folder = TakeOverFolder(dataFolder);
   const std::vector<MarkedFile> files = ReadMark(disk, dataFolder + MarkName);
   for (const MarkedFile& file : files) {
-    if (MarkedAs(disk, folder, file.Name) != file) {
+    if (MarkedAs(disk, folder, file.Name, breathe) != file) {
       RefuseMark(folder + "/" + file.Name);
     }
   }
   for (const MarkedFile& file : files) {
-    TakeItsPlace(disk, folder + "/" + file.Name, dataFolder + "/" + file.Name);
+    TakeItsPlace(disk, folder + "/" + file.Name, dataFolder + "/" + file.Name, breathe);
   }
   WithdrawTakeOver(disk, dataFolder);
   return true;
 }
 
+bool HasBegunToExchange(const Files& disk, const std::string& dataFolder) {
+  try {
+    const std::vector<MarkedFile> files = ReadMark(disk, dataFolder + MarkName);
+    return std::any_of(files.begin(), files.end(), [&](const MarkedFile& file) {
+      return disk.FileExists(dataFolder + "/" + file.Name) &&
+             disk.FileLen(dataFolder + "/" + file.Name) == file.Bytes &&
+             MarkedAs(disk, dataFolder, file.Name, {}) == file;
+    });
+  } catch (const RuntimeError&) {
+    return true;
+  }
+}
+
 void WithdrawTakeOver(Files& disk, const std::string& dataFolder) {
   // A deletion is not durable, and a mark that came back would miss its files.
-  disk.Replace(dataFolder + MarkName, MarkOf({}));
+  try {
+    disk.Replace(dataFolder + MarkName, MarkOf({}));
+  } catch (const RuntimeError& error) {
+    if (error.Number() != Fault::DiskFull) {
+      throw;
+    }
+    ForgetTakeOver(disk, dataFolder);  // one that came back would find nothing to exchange
+  }
   disk.Delete(dataFolder + MarkName);
   ForgetTakeOver(disk, dataFolder);
 }

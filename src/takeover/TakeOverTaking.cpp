@@ -36,7 +36,7 @@ TakenOver TakeOverWork::Take(const std::set<OldItem>& wanted, const OnTake& keep
     }
     const std::optional<std::vector<std::string>> names = Prepare(items, keepOn, taken);
     if (names) {
-      Place(*names, taken);
+      Place(*names, keepOn, taken);
     } else {
       taken.What = TakenOver::Stopped;
     }
@@ -118,15 +118,17 @@ void TakeOverWork::KeepFile(const std::string& name, TakenOver& taken) const {
   const std::string bytes = parts_.Disk.Read(path);
   parts_.Disk.Replace(folder + "/" + copy, bytes);
   taken.KeptAs.push_back(copy);
-  parts_.Disk.Replace(path, bytes);  // throws for a file that must not be replaced
+  parts_.Disk.BeginReplace(path, FileReaders::AsBefore);  // throws for a file that must not be replaced
 }
 
-void TakeOverWork::Place(const std::vector<std::string>& names, TakenOver& taken) const {
+void TakeOverWork::Place(const std::vector<std::string>& names, const OnTake& keepOn,
+                         TakenOver& taken) const {
   bool isMarked = false;
+  const Breathe breathe = [&keepOn] { keepOn(TakeStep::Placing); };  // it is too late to stop
   try {
-    MarkTakeOver(parts_.Disk, parts_.DataFolder, names);
+    MarkTakeOver(parts_.Disk, parts_.DataFolder, names, breathe);
     isMarked = true;
-    FinishTakeOver(parts_.Disk, parts_.DataFolder);
+    FinishTakeOver(parts_.Disk, parts_.DataFolder, breathe);
   } catch (const RuntimeError& error) {
     taken.What = TakenOver::Pending;
     taken.Reason = error.what();

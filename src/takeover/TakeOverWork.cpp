@@ -11,6 +11,7 @@
 #include "platform/RuntimeError.h"
 #include "takeover/TakeOverMark.h"
 #include "takeover/TakeOverNames.h"
+#include "takeover/TakenRows.h"
 
 namespace {
 
@@ -91,9 +92,7 @@ void TakeOverWork::Delete(const std::string& path) const {
 
 std::vector<FoundItem> TakeOverWork::Look(const OldInstallation& old, const OnLook& keepOn) {
   const std::string folder = TakeOverFolder(parts_.DataFolder);
-  if (!parts_.Disk.FolderExists(folder)) {
-    parts_.Disk.CreateFolder(folder);
-  }
+  parts_.Disk.MakePrivateFolder(folder);  // the members in it are nobody else's business
   ForgetTakeOver(parts_.Disk, parts_.DataFolder);
   ready_.clear();
   std::vector<FoundItem> all;
@@ -207,7 +206,8 @@ bool TakeOverWork::MakeDatabase(const TakenDatabase& database, const std::string
   found.Count = made->OpenRecordset(database.Table)->RecordCount();
   const std::string target = MadePath(FileNameIn(database.InUse().Path()));
   Delete(target);
-  return made->CopyInSteps(target, keepOn);
+  parts_.Engine.OpenDatabase(database.DefaultPath)->CopyTo(target);
+  return TakeRows(*made, *parts_.Engine.OpenDatabase(target), database.Table, parts_.Strings, keepOn);
 }
 
 void TakeOverWork::CheckColumns(Database& made, const TakenDatabase& database) const {
@@ -239,6 +239,14 @@ void TakeOverWork::LookAtSettings(const std::string& path, FoundItem& found) {
   if (settings_.PortLeftOut) {
     found.Remark =
         Filled(parts_.Strings.Text(OwnText::TakeOverNoPort), {std::to_string(*settings_.PortLeftOut)});
+  }
+  if (!settings_.FactorsLeftOut.empty()) {
+    std::string keys;
+    for (const std::string& key : settings_.FactorsLeftOut) {
+      keys.append(keys.empty() ? "" : ", ").append(key);
+    }
+    found.Remark.append(found.Remark.empty() ? "" : " ")
+        .append(Filled(parts_.Strings.Text(OwnText::TakeOverNoNumber), {keys}));
   }
 }
 

@@ -79,6 +79,7 @@ class TakeOverWork {
 
   /// Asked between the steps of a look; false stops it.
   using OnLook = std::function<bool(OldItem)>;
+  /// Asked between the steps of a take-over; false stops it before the files are exchanged.
   using OnTake = std::function<bool(TakeStep)>;
 
   explicit TakeOverWork(Parts parts) : parts_(std::move(parts)) {}
@@ -122,7 +123,7 @@ class TakeOverWork {
   /// The file in use is shown to be replaceable, and its copy's name is added.
   void KeepFile(const std::string& name, TakenOver& taken) const;
   void CheckRoomFor(const std::vector<std::string>& names) const;
-  void Place(const std::vector<std::string>& names, TakenOver& taken) const;
+  void Place(const std::vector<std::string>& names, const OnTake& keepOn, TakenOver& taken) const;
   void DropCopies(TakenOver& taken) const;
 
   const Parts parts_;

@@ -2,6 +2,7 @@
 
 #include <QApplication>
 #include <QIcon>
+#include <QLibraryInfo>
 #include <QPalette>
 
 #include "ui/WorkArea.h"
@@ -57,4 +58,11 @@ void PrepareLook() {
   MakePlaceholdersAndLinksReadable();
   qApp->setStyleSheet(QString::fromUtf8(StyleSheet));
   qApp->installEventFilter(new WorkArea(qApp));
+}
+
+void UseDialogTexts(QTranslator& texts, Language language) {
+  if (language == Language::SimplifiedChinese &&
+      texts.load(QStringLiteral("qtbase_zh_CN"), QLibraryInfo::path(QLibraryInfo::TranslationsPath))) {
+    QCoreApplication::installTranslator(&texts);
+  }
 }

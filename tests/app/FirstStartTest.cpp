@@ -38,8 +38,9 @@ TEST_F(PlaceOfAProgram, DiffersForAnotherDataFolder) {
 }
 
 TEST_F(PlaceOfAProgram, DoesNotTellThePath) {
-  EXPECT_EQ(NameFor("/home/anna").find("anna"), std::string::npos);
-  EXPECT_EQ(InstancePlaceOf(folder.Path(), "/home/anna").Folder, folder.Path());
+  EXPECT_EQ(NameFor(folder / "anna").find("anna"), std::string::npos);
+  EXPECT_EQ(InstancePlaceOf(folder.Path(), folder / "anna").Folders,
+            (std::vector<std::string>{folder.Path(), folder / "anna"}));
 }
 
 }  // namespace

@@ -136,6 +136,20 @@ TEST_F(OpenedFile, IsTheLastOfSeveral) {
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
+TEST_F(OpenedFile, SaysWhichOfSeveralWasLeftOut) {
+  venue.Start();
+  const auto leftOut = [this] {
+    const auto* line = venue.Window->findChild<QWidget*>(QStringLiteral("FileLeftOut"));
+    return line == nullptr ? std::string() : line->property("text").toString().toStdString();
+  };
+  venue.Window->Open(venue.Folder / "Monday.game.xml");
+  EXPECT_EQ(leftOut(), "");
+  Open();
+  EXPECT_EQ(leftOut(), "Monday.game.xml was not loaded, since another file came after it");
+  Open();
+  EXPECT_EQ(leftOut(), "") << "this one came alone";
+}
+
 TEST_F(OpenedFile, BringsAWindowInTheTaskBarBack) {
   venue.Start();
   venue.Window->setWindowState(Qt::WindowMinimized);

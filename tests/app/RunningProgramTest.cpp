@@ -130,4 +130,17 @@ TEST_F(RunningProgram, StartsAgainAfterACrash) {
   EXPECT_NE(Log(), before);
 }
 
+TEST_F(RunningProgram, IsTheOnlyOneOnItsDataForAStartWithoutItsRuntimeFolder) {
+  Start();
+  environment.remove(QStringLiteral("XDG_RUNTIME_DIR"));
+  EXPECT_EQ(StartAgain(), 1);
+  EXPECT_THAT(errors, StartsWith("tessarine: Tessarine runs already, but does not answer."));
+}
+
+TEST_F(RunningProgram, ComesToTheFrontForAStartWithATokenThatIsTooLong) {
+  Start();
+  environment.insert(QStringLiteral("DESKTOP_STARTUP_ID"), QString(9000, u'a'));
+  EXPECT_EQ(StartAgain(), 0);
+}
+
 }  // namespace

@@ -66,6 +66,32 @@ TEST_F(SystemCheckCommand, IsOfferedOnTheStatusLineOnlyAfterAFailure) {
   EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
 }
 
+TEST_F(SystemCheckCommand, IsNoLongerOfferedOnceItWasOpened) {
+  venue.Start();
+  venue.Window->PointToSystemCheck();
+  TextsOf([this] { Link()->click(); });
+  EXPECT_FALSE(Link()->isVisible());
+}
+
+TEST_F(SystemCheckCommand, IsOfferedAfterACommandThatFailed) {
+  venue.Start();
+  venue.Dialog.Answers = {venue.Folder / "missing/Monday.game.xml"};
+  venue.Trigger("mnuSaveScores");
+  ASSERT_EQ(venue.Boxes.Boxes.size(), 1U);
+  ASSERT_NE(Link(), nullptr);
+  EXPECT_TRUE(Link()->isVisible());
+}
+
+TEST_F(SystemCheckCommand, LooksAtTheDatabaseInPlaceOfADamagedOne) {
+  venue.PutDefaultFiles();
+  WriteFile(venue.DataFile("members.mdb"), "no database");
+  venue.Boxes.Answers = {BoxAnswer::Ok};
+  venue.Start();
+  const std::vector<std::string> texts = TextsOf([this] { venue.Trigger("mnuSystemCheck"); });
+  EXPECT_THAT(texts, testing::Contains("0 rows, last copy: none yet"));
+  EXPECT_THAT(texts, testing::Contains(testing::HasSubstr("so members-new.mdb is in use")));
+}
+
 TEST_F(SystemCheckCommand, IsOfferedAfterADownloadThatFailed) {
   venue.Start();
   venue.Port.FailNextOpen(8005);

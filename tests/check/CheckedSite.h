@@ -28,7 +28,12 @@ class CheckedSite : public DataSite {
                          .HasWordProcessor = [this] { return HasWordProcessor; },
                          .ChineseLetters = [this] { return Letters; },
                          .Screens = [this] { return Screens; },
-                         .ReaderPort = [this] { return ReaderPort; }});
+                         .ReaderPort = [this] { return ReaderPort; },
+                         .PathInUse =
+                             [this](CheckSubject subject) {
+                               return DataFile(subject == CheckSubject::Members ? Members : Missions);
+                             },
+                         .Release = Release});
   }
 
   FakeComputer Computer;
@@ -37,5 +42,8 @@ class CheckedSite : public DataSite {
   bool HasWordProcessor = true;
   std::string Letters = "Noto Sans CJK SC";
   std::vector<std::string> Screens = {"Screen 1920 x 1080, scale 1", "Screen 1280 x 720, scale 1"};
-  std::int16_t ReaderPort = 2;
+  std::optional<std::int16_t> ReaderPort = 2;
+  std::string Members = "members.mdb";
+  std::string Missions = "scenarios.mdb";
+  std::string Release = "3.54 21-5-2013";
 };

@@ -38,7 +38,8 @@ TEST_F(LookedAt, APortThatMayNotBeUsedSaysWhatToDo) {
   EXPECT_EQ(All(CheckSubject::Ports).at(1),
             ToDo(CheckSubject::Ports,
                  "/dev/ttyUSB0 may not be used by you: log in at this computer itself, then unplug "
-                 "the adapter and plug it in again."));
+                 "the adapter and plug it in again; an adapter of another maker also needs a line in "
+                 "/etc/tessarine/serial-ports."));
 }
 
 TEST_F(LookedAt, APortInUseNamesItsPrograms) {
@@ -78,6 +79,83 @@ TEST_F(LookedAt, TheReaderHasItsOwnPort) {
   EXPECT_EQ(One(CheckSubject::Reader), Fine(CheckSubject::Reader, "Port 2 is /dev/ttyUSB0"));
   site.ReaderPort = 7;
   EXPECT_FALSE(One(CheckSubject::Reader).Fine);
+}
+
+TEST_F(LookedAt, AReaderThatIsNotSetUpSaysWhatToDo) {
+  site.ReaderPort.reset();
+  EXPECT_EQ(One(CheckSubject::Reader), ToDo(CheckSubject::Reader,
+                                            "No reader is set up: if you have one, write its port into "
+                                            "tessarine.ini, in the section [onewire] (see the manual)."));
+}
+
+TEST_F(LookedAt, AReaderOnThePortOfTheBaseUnitNeedsItsOwn) {
+  site.Ini.WriteIni("comm", "commport", "2");
+  EXPECT_EQ(One(CheckSubject::Reader),
+            ToDo(CheckSubject::Reader,
+                 "Port 2 is the base unit's port too: give the reader one of its own in "
+                 "tessarine.ini, in the section [onewire]."));
+}
+
+TEST_F(LookedAt, ThePortsOfBaseUnitAndReaderMustBeUsableToo) {
+  site.Ini.WriteIni("comm", "commport", "1");
+  site.Computer.Forbidden = {"/dev/ttyS0"};
+  site.Computer.Users = {{"/dev/ttyUSB0", "minicom"}};
+  EXPECT_EQ(One(CheckSubject::BaseUnit),
+            ToDo(CheckSubject::BaseUnit,
+                 "/dev/ttyS0 may not be used by you: log in at this computer itself, "
+                 "or have yourself added to the group dialout."));
+  EXPECT_EQ(One(CheckSubject::Reader),
+            ToDo(CheckSubject::Reader, "/dev/ttyUSB0 is in use by minicom: end that program."));
+}
+
+TEST_F(LookedAt, DataThatMayNotBeWrittenIsToldBeforeTheSpace) {
+  EXPECT_TRUE(One(CheckSubject::Disk).Fine);
+  std::filesystem::create_directory(site.DataFile("backups"));
+  site.Computer.Forbidden = {site.DataFile("backups"), site.DataFile("members.mdb"),
+                             site.DataFile("games.mdb")};
+  const std::vector<CheckItem> items = All(CheckSubject::Disk);
+  ASSERT_EQ(items.size(), 3U);
+  EXPECT_EQ(items[0], ToDo(CheckSubject::Disk, "You may not write to " + site.DataFile("backups") +
+                                                   ", so nothing can be saved there: have its owner or "
+                                                   "permissions corrected."));
+  EXPECT_THAT(items[1].Text, HasSubstr("members.mdb"));
+  EXPECT_TRUE(items[2].Fine);
+}
+
+TEST_F(LookedAt, AClockBehindTheReleaseIsWrong) {
+  site.Release = "3.54 21-5-2013 (3.54+20261120.0003)";
+  site.Time.DateAndTime = "2026-11-19 00:00:00";  // where it is earlier than in the release's time zone
+  EXPECT_TRUE(One(CheckSubject::Clock).Fine);
+  site.Time.DateAndTime = "2026-11-18 23:59:59";
+  EXPECT_EQ(One(CheckSubject::Clock), ToDo(CheckSubject::Clock,
+                                           "The clock shows 2026-11-18 23:59:59, but this version of the "
+                                           "program is younger: set the date and time."));
+  site.Release = "3.54 21-5-2013 (3.54+20260301.0003)";
+  site.Time.DateAndTime = "2026-02-28 00:00:00";
+  EXPECT_TRUE(One(CheckSubject::Clock).Fine);
+  for (const char* release : {"+", "+2026", "+20261301.0003", "+2026112x.0003", "3.54"}) {
+    site.Release = release;
+    EXPECT_TRUE(One(CheckSubject::Clock).Fine) << release;
+  }
+}
+
+TEST_F(LookedAt, TheDatabaseInUseIsLookedAtAndTheOnePutAsideIsTold) {
+  std::filesystem::copy_file(site.DataFile("members.mdb"), site.DataFile("members-new.mdb"));
+  site.ChangeDatabase("members-new.mdb", "INSERT INTO Members (FirstName) VALUES ('Ada'), ('Bob')");
+  site.Members = "members-new.mdb";
+  std::filesystem::create_directory(site.DataFile("backups"));
+  WriteFile(site.DataFile("backups/members-new-2013-05-20-201500.mdb"), "");
+  WriteFile(site.DataFile("members.mdb"), "no database");
+  const std::vector<CheckItem> items = All(CheckSubject::Members);
+  ASSERT_EQ(items.size(), 2U);
+  EXPECT_EQ(items[0], Fine(CheckSubject::Members, "2 rows, last copy: 2013-05-20 20:15:00"));
+  EXPECT_FALSE(items[1].Fine);
+  EXPECT_THAT(items[1].Text, testing::StartsWith("members.mdb cannot be used (Unrecognized database format"));
+  EXPECT_THAT(items[1].Text,
+              testing::EndsWith("so members-new.mdb is in use: end Tessarine, keep members.mdb "
+                                "elsewhere, and give members-new.mdb its name."));
+  std::filesystem::remove(site.DataFile("members.mdb"));
+  EXPECT_TRUE(One(CheckSubject::Members).Fine);
 }
 
 TEST_F(LookedAt, WhatIsInstalledIsNamedAndWhatIsMissingToo) {

@@ -77,6 +77,17 @@ class FakeFiles : public Files {
     return name.empty() || folders_.count(name) != 0;
   }
 
+  /// The folders for which DeleteUnfinished was called.
+  std::vector<std::string> Tidied;
+
+  void DeleteUnfinished(const std::string& folder) override { Tidied.push_back(folder); }
+
+  void MakePrivateFolder(const std::string& path) override {
+    if (!FolderExists(path)) {
+      CreateFolder(path);
+    }
+  }
+
   void CreateFolder(const std::string& path) override {
     Created.push_back(path);
     ThrowIfTold(createFailures_, path);

@@ -2,6 +2,7 @@
 
 #include <gmock/gmock.h>
 
+#include "core/game/SoldieringFactors.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/support/Thrown.h"
 
@@ -43,8 +44,23 @@ TEST_F(SettingsTaken, LeaveOutAPortThatThisComputerDoesNotHave) {
 
 TEST_F(SettingsTaken, LeaveOutAFolderOfAnotherSystem) {
   EXPECT_THAT(Read("[Paths]\nfirmware_path=C:\\Firmware\\gun.hex\n").Taken, IsEmpty());
+  EXPECT_THAT(Read("[Paths]\nfirmware_path=/home/ann/gun.hex\n").Taken, IsEmpty()) << "it is not here";
+  disk.Put("/home/ann/gun.hex", ":00000001FF");
   EXPECT_THAT(Read("[Paths]\nfirmware_path=/home/ann/gun.hex\n").Taken,
               ElementsAre(OldSetting{"Paths", "firmware_path", "/home/ann/gun.hex", true}));
+}
+
+TEST_F(SettingsTaken, LeaveOutFactorsWithWhichTheProgramWouldNotStart) {
+  for (const char* value : {"abc", "", "1e999", "-1e999", "1,5", "nan", "0x10"}) {
+    const OldSettings settings =
+        Read(std::string("[soldiering_calc]\nheals=-2\naccuracy=") + value + "\nrespawns= 2.5 \n");
+    EXPECT_THAT(settings.Taken, ElementsAre(OldSetting{"soldiering_calc", "respawns", "2.5", true},
+                                            OldSetting{"soldiering_calc", "heals", "-2", true}))
+        << value;
+    EXPECT_THAT(settings.FactorsLeftOut, ElementsAre("accuracy")) << value;
+    GiveSettings(disk, "/next.ini", settings.Taken);
+    EXPECT_EQ(ReadSoldieringFactors(IniReader(disk, "/next.ini")).Heal, -2) << value;
+  }
 }
 
 TEST_F(SettingsTaken, AreRefusedFromAFileThatIsNoText) {

@@ -7,6 +7,8 @@
 #include <random>
 #include <thread>
 
+#include "takeover/TakeOverResume.h"
+#include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/takeover/TakeOverSite.h"
 
 namespace {
@@ -27,11 +29,12 @@ constexpr std::array<const char*, 2> Labels = {"Eve", "Zachary"};
 
 TEST(TakeOverKilled, LeavesAllFilesOldOrAllNewAfterTheNextStart) {
   constexpr int kills = 30;
-  constexpr int longestMicroseconds = 120'000;
+  constexpr int longestMicroseconds = 400'000;
   const unsigned seed = std::random_device()();
   SCOPED_TRACE("seed " + std::to_string(seed));
   std::mt19937 random(seed);
   TakeOverSite site;
+  FakeMessageBoxes boxes;
   for (const char* label : Labels) {
     site.PutInstallation(label, label);
   }
@@ -49,7 +52,12 @@ TEST(TakeOverKilled, LeavesAllFilesOldOrAllNewAfterTheNextStart) {
     int status = 0;
     waitpid(child, &status, 0);
     ASSERT_TRUE(WIFSIGNALED(status)) << "ended by itself";
-    FinishTakeOver(site.Disk, site.Data());
+    EXPECT_TRUE(ResumeTakeOver(site.Disk, site.Data(), boxes, site.Strings).GoOn);
+    EXPECT_TRUE(boxes.Boxes.empty());
+    EXPECT_TRUE(site.Disk.FileNames(TakeOverFolder(site.Data())).empty());
+    for (const std::string& name : site.Disk.FileNames(site.Data())) {
+      EXPECT_FALSE(name.starts_with(".")) << name;
+    }
     const std::string labels = site.Labels();
     EXPECT_TRUE(labels == TakeOverSite::LabelsOf("Now") || labels == TakeOverSite::LabelsOf(Labels[0]) ||
                 labels == TakeOverSite::LabelsOf(Labels[1]))

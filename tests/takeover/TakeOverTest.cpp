@@ -24,7 +24,7 @@ class RefusingFiles : public LinuxFiles {
   bool Refuses = false;
 
   std::unique_ptr<NewFile> BeginReplace(const std::string& path, FileReaders readers) override {
-    if (Refuses) {
+    if (Refuses && HasTakeOverMark(*this, path.substr(0, path.rfind('/')))) {
       throw RuntimeError(Fault::DiskFull, "Disk full: " + path);
     }
     return LinuxFiles::BeginReplace(path, readers);
@@ -53,6 +53,9 @@ class TakeOverWindow : public testing::Test {
                                                         .Busy = [this] { return busy; },
                                                         .Reopen =
                                                             [this](const std::set<OldItem>& taken) {
+                                                              if (reopenFault) {
+                                                                throw RuntimeError(*reopenFault);
+                                                              }
                                                               site.Open();
                                                               reopened = taken;
                                                             },
@@ -90,6 +93,7 @@ class TakeOverWindow : public testing::Test {
   QtEventPump events;
   std::optional<OwnText> busy;
   std::set<OldItem> reopened;
+  std::optional<int> reopenFault;
   int ended = 0;
   TakeOver::GameImporter importer;
   std::unique_ptr<TakeOver> window;
@@ -227,13 +231,46 @@ TEST_F(TakeOverWindow, EndsTheProgramWhenOnlyTheNextStartCanFinish) {
   EXPECT_EQ(site.Labels(), site.LabelsOf("Zachary"));
 }
 
+TEST_F(TakeOverWindow, EndsTheProgramWhenWhatWasTakenCannotBeOpened) {
+  WriteFile(site.Folder / "old/a.xml", "<GameData/>");
+  int imports = 0;
+  importer = [&](const std::string&, FilesOfMembers, const TakeOver::OnImport&) {
+    ++imports;
+    return ImportedGames();
+  };
+  reopenFault = Fault::TypeMismatch;
+  Open();
+  Choose("old");
+  Take();
+  ASSERT_EQ(boxes.Boxes.size(), 2U);
+  EXPECT_THAT(boxes.Boxes[1].Text, StartsWith("Taken over: Members, Missions, Score card, Settings, Game "
+                                              "files. What was there before is kept as: members-2013-"));
+  EXPECT_THAT(boxes.Boxes[1].Text, HasSubstr("\nIt could not be opened: Type mismatch\nTessarine ends now."));
+  EXPECT_EQ(ended, 1);
+  EXPECT_EQ(imports, 0) << "the members that are open are not those of the games";
+  EXPECT_FALSE(window->isVisible());
+}
+
+TEST_F(TakeOverWindow, SaysWhichSettingsAreNoNumbers) {
+  WriteFile(site.Folder / "old/tessarine.ini",
+            "[comm]\ncommport=7\n[soldiering_calc]\nheals=5\naccuracy=abc\nrespawns=\n");
+  Open();
+  Choose("old");
+  EXPECT_EQ(Cell(3, 1), "settings: 1, different: 1");
+  EXPECT_EQ(Cell(3, 3),
+            "Port 7 does not exist here and is left out. These settings are no numbers and are left out: "
+            "respawns, accuracy");
+}
+
 TEST_F(TakeOverWindow, ImportsGameFilesWhereAnArchiveTakesThem) {
   WriteFile(site.Folder / "old/a.xml", "<GameData/>");
   std::string from;
   FilesOfMembers whose = FilesOfMembers::Others;
-  importer = [&](const std::string& folder, FilesOfMembers members, const KeepOn& keepOn) {
+  std::string during;
+  importer = [&](const std::string& folder, FilesOfMembers members, const TakeOver::OnImport& keepOn) {
     whose = members;
-    from = keepOn() ? folder : "stopped";
+    during = Status();
+    from = keepOn(0.5) ? folder : "stopped";
     return ImportedGames{.Imported = 3, .Known = 2, .Refused = 1};
   };
   Open();
@@ -242,7 +279,36 @@ TEST_F(TakeOverWindow, ImportsGameFilesWhereAnArchiveTakesThem) {
   Take();
   EXPECT_EQ(from, site.Folder / "old");
   EXPECT_EQ(whose, FilesOfMembers::Taken);
+  EXPECT_EQ(during, "Importing game files...");
   EXPECT_THAT(Status(), testing::EndsWith("\nGames: 3 imported, 2 known before, 1 refused."));
+}
+
+TEST_F(TakeOverWindow, SaysThatAnImportWasStopped) {
+  WriteFile(site.Folder / "old/a.xml", "<GameData/>");
+  importer = [](const std::string&, FilesOfMembers, const TakeOver::OnImport&) {
+    return ImportedGames{.Imported = 3, .Whole = false};
+  };
+  Open();
+  Choose("old");
+  Take();
+  EXPECT_THAT(Status(),
+              testing::EndsWith("\nGames: 3 imported, 0 known before, 0 refused.\nThe import of game "
+                                "files was stopped: import the rest with Games, Import Game Files."));
+}
+
+TEST_F(TakeOverWindow, TakesEventsWhileFilesAreExchanged) {
+  OtherConnection(site.Folder / "old/members.mdb")
+      .Execute("UPDATE Members SET Photograph = randomblob(6000000)");
+  Open();
+  Choose("old");
+  bool hasMark = false;
+  QTimer timer;
+  QObject::connect(&timer, &QTimer::timeout, window.get(),
+                   [&] { hasMark = hasMark || HasTakeOverMark(disk, site.Data()); });
+  timer.start(0);
+  Take();
+  EXPECT_TRUE(hasMark);
+  EXPECT_EQ(site.Labels(), site.LabelsOf("Zachary"));
 }
 
 TEST_F(TakeOverWindow, SaysThatNoArchiveTakesGameFiles) {

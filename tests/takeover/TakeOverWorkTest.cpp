@@ -25,6 +25,14 @@ class TakeOvers : public testing::Test {
     return {.What = what};
   }
 
+  std::string ColumnsWithoutTypes() {
+    std::string columns;
+    for (const std::string& name : site.Members->ColumnNames("Members")) {
+      columns.append(columns.empty() ? "" : ", ").append(name);
+    }
+    return columns;
+  }
+
   void ExpectUntouched() const {
     EXPECT_EQ(site.Labels(), site.LabelsOf("Now"));
     EXPECT_FALSE(HasTakeOverMark(site.Disk, site.Data()));
@@ -123,6 +131,80 @@ TEST_F(TakeOvers, RefuseADatabaseOfAnotherProgram) {
   OtherConnection(site.Folder / "old/members.mdb")
       .Execute("CREATE TABLE Members (ContactID INTEGER PRIMARY KEY)");
   EXPECT_THAT(Found(OldItem::Members).Remark, HasSubstr("has no column"));
+}
+
+TEST_F(TakeOvers, RefuseRowsThatTheProgramCouldNotUse) {
+  const struct {
+    const char* Rows;
+    const char* Reason;
+  } cases[] = {
+      {"('1', 'Ada', 0, 0, NULL), ('1', 'Bob', 0, 0, NULL)", "Row 2 of table Members does not fit: "},
+      {"(NULL, 'Ada', 0, 0, NULL)", "Row 1 of table Members does not fit: ContactID"},
+      {"('x', 'Ada', 0, 0, NULL)", "Row 1 of table Members does not fit: "},
+      {"(1, 'Ada', 0, 0, NULL), (2, 'Bob', 'many', 0, NULL)",
+       "Row 2 of table Members does not fit: TotalGamesPlayed"},
+      {"(1, 'Ada', NULL, 0, NULL)", "Row 1 of table Members does not fit: "},
+      {"(1, 'Ada', 0, x'00', NULL)", "Row 1 of table Members does not fit: TotalDamage"},
+      {"(1, x'414243', 0, 0, NULL)", "Row 1 of table Members does not fit: FirstName"},
+  };
+  for (const auto& each : cases) {
+    std::filesystem::remove(site.Folder / "old/members.mdb");
+    OtherConnection other(site.Folder / "old/members.mdb");
+    other.Execute("CREATE TABLE Members (" + ColumnsWithoutTypes() + ")");
+    other.Execute(
+        "INSERT INTO Members (ContactID, FirstName, TotalGamesPlayed, TotalDamage, Photograph) VALUES " +
+        std::string(each.Rows));
+    other.Execute(
+        "UPDATE Members SET TotalSoldiering = 0, AverageDamage = 0, AverageSoldiering = 0, "
+        "TotalPrimaryAccuracy = 0, PriZeroAccuracyCount = 0, AveragePrimAccuracy = 0, "
+        "AverageSecAccuracy = 0");
+    const FoundItem found = Found(OldItem::Members);
+    EXPECT_EQ(found.State, FoundItem::Unusable) << each.Rows;
+    EXPECT_THAT(found.Remark, testing::StartsWith(each.Reason)) << each.Rows;
+  }
+}
+
+TEST_F(TakeOvers, MakeDatabasesOfThisProgramFromOthersWithTheSameColumns) {
+  std::filesystem::remove(site.Folder / "old/members.mdb");
+  {
+    OtherConnection other(site.Folder / "old/members.mdb");
+    other.Execute("CREATE TABLE Members (" + ColumnsWithoutTypes() + ", Extra)");
+    other.Execute(
+        "INSERT INTO Members (ContactID, FirstName, DallasID, TotalGamesPlayed, TotalDamage, "
+        "TotalSoldiering, "
+        "AverageDamage, AverageSoldiering, TotalPrimaryAccuracy, PriZeroAccuracyCount, AveragePrimAccuracy, "
+        "AverageSecAccuracy, PhotographLength, Photograph) VALUES ('7', 'Ada', 12, '3', 1, 2, 3, 4, 5, 6, 7, "
+        "8, "
+        "3, x'FFD8FF'); CREATE TRIGGER Nosy AFTER INSERT ON Members BEGIN DELETE FROM Members; END");
+  }
+  EXPECT_EQ(Found(OldItem::Members).Remark, "");
+  work.Take({OldItem::Members}, [](TakeStep) { return true; });
+  OtherConnection taken(site.Data() + "/members.mdb");
+  EXPECT_EQ(taken.Query("SELECT ContactID || FirstName || DallasID || typeof(TotalGamesPlayed) || "
+                        "hex(Photograph) FROM Members"),
+            "7Ada12integerFFD8FF");
+  EXPECT_EQ(taken.Query("SELECT count(*) FROM sqlite_master WHERE type = 'trigger'"), "0");
+  EXPECT_EQ(taken.Query("SELECT count(*) FROM sqlite_master WHERE type = 'index'"), "4");
+  taken.Execute("INSERT INTO Members (FirstName) VALUES ('Bob')");
+  EXPECT_EQ(taken.Query("SELECT max(ContactID) FROM Members"), "8");
+}
+
+TEST_F(TakeOvers, NeverGiveTheNumberOfADeletedMemberAgain) {
+  OtherConnection(site.Folder / "old/members.mdb")
+      .Execute("INSERT INTO Members (ContactID) VALUES (40); DELETE FROM Members WHERE ContactID = 40");
+  site.Look(work, "old");
+  work.Take({OldItem::Members}, [](TakeStep) { return true; });
+  OtherConnection taken(site.Data() + "/members.mdb");
+  taken.Execute("INSERT INTO Members (FirstName) VALUES ('Bob')");
+  EXPECT_EQ(taken.Query("SELECT max(ContactID) FROM Members"), "41");
+}
+
+TEST_F(TakeOvers, KeepWhatTheyMakeFromOtherUsers) {
+  const std::string folder = TakeOverFolder(site.Data());
+  std::filesystem::create_directory(folder);  // as an earlier version did
+  site.Look(work, "old");
+  EXPECT_TRUE(site.Disk.FileExists(folder + "/members.mdb"));
+  EXPECT_EQ(std::filesystem::status(folder).permissions(), std::filesystem::perms::owner_all);
 }
 
 TEST_F(TakeOvers, BringAnUnfinishedChangeOfTheOldDatabaseToItsEnd) {

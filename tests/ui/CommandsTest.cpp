@@ -126,8 +126,12 @@ TEST_F(CommandTable, LetsAFailedCheckStopEscape) {
 }
 
 TEST_F(CommandTable, TellsWhetherACommandFailed) {
+  std::size_t boxesBefore = 0;
+  window.Table.AfterFailure = [&] { boxesBefore = boxes.Boxes.size(); };
   EXPECT_TRUE(window.Table.Run([] {}));
+  EXPECT_EQ(boxesBefore, 0U);
   EXPECT_FALSE(window.Table.Run([] { throw RuntimeError(53); }));
+  EXPECT_EQ(boxesBefore, 1U) << "its report came first";
 }
 
 TEST_F(CommandTable, ClosesAtOnceWhileNothingRuns) {

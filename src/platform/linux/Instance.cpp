@@ -93,43 +93,81 @@ bool IsOwnFolder(const std::string& path) {
          access(path.c_str(), W_OK | X_OK) == 0;
 }
 
+/// Opens the lock's file, which is made if it is missing. A negative number, with errno, if that fails.
+Descriptor OpenLock(const std::string& path) {
+  constexpr int flags = O_NOFOLLOW | O_CLOEXEC | O_NONBLOCK;
+  Descriptor file(open(path.c_str(), O_RDWR | O_CREAT | flags, OwnerOnly));
+  if (file.Number() < 0 && (errno == EACCES || errno == EROFS)) {
+    const int error = errno;
+    file = Descriptor(open(path.c_str(), O_RDONLY | flags));
+    errno = error;
+  }
+  return file;
+}
+
+/// The administrator's program on the folder of a user holds a lock that this user can take afterwards.
+/// False if it stays the administrator's.
+bool GiveToOwnerOfFolder(int file, const std::string& path) {
+  struct stat own {};
+  struct stat folder {};
+  return geteuid() == 0 && fstat(file, &own) == 0 && own.st_nlink == 1 &&
+         stat(std::filesystem::path(path).parent_path().c_str(), &folder) == 0 &&
+         (own.st_uid == folder.st_uid || fchown(file, folder.st_uid, folder.st_gid) == 0);
+}
+
+/// True if there is a file of another user that this one may not open.
+bool IsForeign(const std::string& path) {
+  struct stat info {};
+  return lstat(path.c_str(), &info) == 0 && S_ISREG(info.st_mode) && info.st_uid != geteuid();
+}
+
 }  // namespace
 
-std::string InstanceFolder(const std::string& runtimeFolder, const std::string& dataFolder) {
-  if (IsOwnFolder(runtimeFolder)) {
-    return runtimeFolder;
-  }
+std::vector<std::string> InstanceFolders(const std::string& runtimeFolder, const std::string& dataFolder) {
   std::error_code none;  // where it cannot be made, the program says so when it needs it
   std::filesystem::create_directories(dataFolder, none);
-  return dataFolder;
+  std::vector<std::string> folders;
+  if (IsOwnFolder(runtimeFolder)) {
+    folders.push_back(runtimeFolder);
+  }
+  folders.push_back(dataFolder);
+  return folders;
 }
 
 Instance::Instance(InstancePlace place) : place_(std::move(place)) {}
 
-// The lock goes last, so that nothing of the next start is taken away.
+// The locks go last, so that nothing of the next start is taken away.
 Instance::~Instance() {
   if (listener_.Number() >= 0) {
-    unlink(SocketPath().c_str());
+    unlink(socketPath_.c_str());
   }
-  if (lock_.Number() >= 0 && IsAtPath(lock_.Number(), LockPath())) {
-    unlink(LockPath().c_str());
-  }
+  DropLocks();
 }
 
 InstanceOutcome Instance::Start(const InstanceRequest& request, std::chrono::milliseconds patience) {
   constexpr int betweenTries = 20;  // milliseconds
   const Deadline deadline(patience);
   const std::optional<std::string> line = InstanceLine(request);
-  while (true) {
-    if (const Lock lock = TakeLock(); lock != Lock::Busy) {
-      if (lock == Lock::Taken) {
-        Listen();
+  const auto tellRunning = [&] {
+    for (std::size_t folder = 0; line && folder < place_.Folders.size(); ++folder) {
+      if (TellRunning(SocketPath(place_, folder), *line, deadline)) {
+        return true;
       }
-      return InstanceOutcome::First;
+    }
+    return false;
+  };
+  while (true) {
+    const Lock lock = TakeLocks();
+    if (lock == Lock::Barred) {
+      return InstanceOutcome::Barred;
     }
     // The other one may be about to listen, or about to end.
-    if (line && TellRunning(SocketPath(), *line, deadline)) {
+    if (lock != Lock::Taken && tellRunning()) {
       return InstanceOutcome::Told;
+    }
+    if (lock != Lock::Busy) {
+      Listen();
+      return InstanceOutcome::First;
     }
     if (deadline.MillisecondsLeft() == 0) {
       return InstanceOutcome::NoAnswer;
@@ -138,10 +176,25 @@ InstanceOutcome Instance::Start(const InstanceRequest& request, std::chrono::mil
   }
 }
 
-Instance::Lock Instance::TakeLock() {
+Instance::Lock Instance::TakeLocks() {
+  // All take the data folder's lock first: it is the one that each of them has in common.
+  for (std::size_t folder = place_.Folders.size(); folder > 0; --folder) {
+    const Lock lock = TakeLock(LockPath(place_, folder - 1));
+    if (lock == Lock::Busy || lock == Lock::Barred) {
+      DropLocks();
+      return lock;
+    }
+  }
+  return locks_.empty() ? Lock::Impossible : Lock::Taken;
+}
+
+Instance::Lock Instance::TakeLock(const std::string& path) {
   while (true) {
-    Descriptor file(
-        open(LockPath().c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC | O_NONBLOCK, OwnerOnly));
+    Descriptor file = OpenLock(path);
+    if (file.Number() < 0 && errno == EACCES && IsForeign(path)) {
+      barredBy_ = path;
+      return Lock::Barred;
+    }
     struct stat opened {};
     if (file.Number() < 0 || fstat(file.Number(), &opened) != 0 || !S_ISREG(opened.st_mode)) {
       return Lock::Impossible;
@@ -150,21 +203,42 @@ Instance::Lock Instance::TakeLock() {
       return errno == EWOULDBLOCK ? Lock::Busy : Lock::Impossible;
     }
     // The one before may just have taken the file away: a lock on it would be found by no other start.
-    if (IsAtPath(file.Number(), LockPath())) {
-      lock_ = std::move(file);
+    if (IsAtPath(file.Number(), path)) {
+      GiveToOwnerOfFolder(file.Number(), path);
+      locks_.push_back({path, std::move(file)});
       return Lock::Taken;
     }
   }
 }
 
+void Instance::DropLocks() {
+  for (; !locks_.empty(); locks_.pop_back()) {
+    const HeldLock& lock = locks_.back();
+    if (IsAtPath(lock.File.Number(), lock.Path)) {
+      unlink(lock.Path.c_str());
+    }
+  }
+}
+
 void Instance::Listen() {
+  for (std::size_t folder = 0; folder < place_.Folders.size() && listener_.Number() < 0; ++folder) {
+    if (ListenAt(SocketPath(place_, folder))) {
+      socketPath_ = SocketPath(place_, folder);
+    }
+  }
+}
+
+bool Instance::ListenAt(const std::string& path) {
   constexpr int waitingCalls = 64;
-  const InstanceAddress address(SocketPath());
+  const InstanceAddress address(path);
   Descriptor socketEnd(socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
-  unlink(SocketPath().c_str());  // of a program that crashed
-  if (address.Valid() && socketEnd.Number() >= 0 && fchmod(socketEnd.Number(), OwnerOnly) == 0 &&
+  unlink(path.c_str());  // of a program that crashed
+  const bool isListening =
+      address.Valid() && socketEnd.Number() >= 0 && fchmod(socketEnd.Number(), OwnerOnly) == 0 &&
       bind(socketEnd.Number(), address.Get(), InstanceAddress::Size) == 0 &&
-      chmod(SocketPath().c_str(), OwnerOnly) == 0 && listen(socketEnd.Number(), waitingCalls) == 0) {
+      chmod(path.c_str(), OwnerOnly) == 0 && listen(socketEnd.Number(), waitingCalls) == 0;
+  if (isListening) {
     listener_ = std::move(socketEnd);
   }
+  return isListening;
 }

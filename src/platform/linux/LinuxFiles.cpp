@@ -90,6 +90,24 @@ void LinuxFiles::CreateFolder(const std::string& path) {
   }
 }
 
+void LinuxFiles::MakePrivateFolder(const std::string& path) {
+  if (!FolderExists(path)) {
+    CreateFolder(path);
+  }
+  if (chmod(path.c_str(), 0700) != 0) {
+    throw RuntimeError(Fault::PathAccess, "Path/File access error: " + path);
+  }
+}
+
+void LinuxFiles::DeleteUnfinished(const std::string& folder) {
+  for (const std::string& name : FileNames(folder)) {
+    if (IsUnfinishedName(name)) {
+      std::error_code none;
+      std::filesystem::remove(std::string(folder).append("/").append(name), none);
+    }
+  }
+}
+
 std::uint64_t LinuxFiles::FileLen(const std::string& path) const {
   struct stat info {};
   if (stat(path.c_str(), &info) != 0 && (errno == ENOENT || errno == ENOTDIR)) {

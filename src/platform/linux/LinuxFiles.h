@@ -11,6 +11,8 @@ class LinuxFiles : public Files {
   bool FileExists(const std::string& path) const override;
   bool FolderExists(const std::string& path) const override;
   void CreateFolder(const std::string& path) override;
+  void MakePrivateFolder(const std::string& path) override;
+  void DeleteUnfinished(const std::string& folder) override;
   std::uint64_t FileLen(const std::string& path) const override;
   std::string Read(const std::string& path) const override;
   std::string ReadPart(const std::string& path, std::uint64_t offset, std::size_t count) const override;

@@ -14,6 +14,8 @@
 
 namespace {
 
+constexpr std::string_view UnfinishedStart = ".new-";
+
 // The path behind all symbolic links at the end of `path`; it need not exist.
 std::string FollowLinks(std::string path) {
   constexpr int mostLinks = 40;
@@ -78,9 +80,15 @@ class ReplacingFile::TemporaryFile {
 
 std::string NewNameIn(const std::string& folder) {
   std::random_device random;
-  std::array<char, 32> name{};
-  std::snprintf(name.data(), name.size(), ".new-%08x%08x", random(), random());
-  return folder + "/" + name.data();
+  std::array<char, 32> number{};
+  std::snprintf(number.data(), number.size(), "%08x%08x", random(), random());
+  return std::string(folder).append("/").append(UnfinishedStart).append(number.data());
+}
+
+bool IsUnfinishedName(std::string_view name) {
+  constexpr std::size_t digits = 16;
+  return name.size() == UnfinishedStart.size() + digits && name.starts_with(UnfinishedStart) &&
+         name.find_first_not_of("0123456789abcdef", UnfinishedStart.size()) == std::string_view::npos;
 }
 
 bool WriteAll(int file, std::string_view bytes) {

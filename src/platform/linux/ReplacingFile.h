@@ -31,6 +31,8 @@ class ReplacingFile : public NewFile {
 
 /// The path of a hidden file in `folder` with a random name, for one that is written and then renamed.
 std::string NewNameIn(const std::string& folder);
+/// True for the names that such files have until they are finished.
+bool IsUnfinishedName(std::string_view name);
 
 /// Writes all of the bytes. Returns false, with errno, if that fails.
 bool WriteAll(int file, std::string_view bytes);

@@ -5,10 +5,12 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <memory>
 #include <optional>
 #include <utility>
+#include <vector>
 
 #include "platform/RuntimeError.h"
 #include "platform/sqlite/SqliteConnection.h"
@@ -24,6 +26,14 @@ constexpr int InstructionsOfRewriting = 200;  // each may copy a whole game file
 constexpr off_t BytesOfAFlush = off_t{2} << 20;
 
 using Handle = std::unique_ptr<sqlite3, decltype(&sqlite3_close)>;
+
+/// The file of the open database; nullptr if there is none.
+sqlite3_file* OpenFile(sqlite3* database) {
+  sqlite3_file* file = nullptr;
+  const bool isOpen = sqlite3_file_control(database, "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK &&
+                      file != nullptr && file->pMethods != nullptr;
+  return isOpen ? file : nullptr;
+}
 
 /// Asks during a statement whether to keep on, as long as it exists.
 class StatementWatch {
@@ -166,6 +176,29 @@ class SqliteStepwiseCopy : public StepwiseCopy {
   std::optional<StepwiseCheck> check_;  ///< once all is copied
 };
 
+/// Reads the file once, so that a check, which asks nobody while it follows the pages of a table, finds them
+/// all in memory. False if it was stopped. A failure is left to the check.
+bool ReadInPieces(sqlite3* database, const KeepOn& keepOn) {
+  constexpr sqlite3_int64 pieceBytes = sqlite3_int64{1} << 20U;
+  sqlite3_file* const file = OpenFile(database);
+  sqlite3_int64 bytes = 0;
+  if (file == nullptr || file->pMethods->xFileSize(file, &bytes) != SQLITE_OK) {
+    return true;
+  }
+  std::vector<char> piece(static_cast<std::size_t>(pieceBytes));
+  for (sqlite3_int64 offset = 0; offset < bytes; offset += pieceBytes) {
+    if (!keepOn()) {
+      return false;
+    }
+    const auto count = static_cast<int>(std::min(pieceBytes, bytes - offset));
+    // By the database's own handle: closing another one would drop its locks.
+    if (file->pMethods->xRead(file, piece.data(), count, offset) != SQLITE_OK) {
+      break;
+    }
+  }
+  return true;
+}
+
 }  // namespace
 
 std::unique_ptr<StepwiseCopy> BeginWholeCopy(SqliteConnection& connection, const std::string& path) {
@@ -173,9 +206,8 @@ std::unique_ptr<StepwiseCopy> BeginWholeCopy(SqliteConnection& connection, const
 }
 
 bool FlushFile(sqlite3* database) {
-  sqlite3_file* file = nullptr;
-  return sqlite3_file_control(database, "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK &&
-         file != nullptr && file->pMethods != nullptr &&
+  sqlite3_file* const file = OpenFile(database);
+  return file != nullptr &&
          file->pMethods->xSync(file, SQLITE_SYNC_NORMAL | SQLITE_SYNC_DATAONLY) == SQLITE_OK;
 }
 
@@ -237,6 +269,9 @@ bool RewriteWhole(SqliteConnection& connection, const std::string& path, const K
 }
 
 bool CheckWhole(SqliteConnection& connection, const KeepOn& keepOn) {
+  if (keepOn && !ReadInPieces(connection.Handle(), keepOn)) {
+    return false;
+  }
   const StatementWatch watch(connection.Handle(), keepOn);
   try {
     SqliteStatement check(connection, "PRAGMA integrity_check(1)");

@@ -63,12 +63,19 @@ bool Readable(int descriptor, int milliseconds = Limit) {
 
 class InstanceOfAProgram : public testing::Test {
  protected:
-  InstancePlace Place(const std::string& name = "program") const { return {folder.Path(), name}; }
+  InstancePlace Place(const std::string& name = "program") const { return {{folder.Path()}, name}; }
+
+  std::string LockPath() const { return Instance::LockPath(Place(), 0); }
+  std::string SocketPath() const { return Instance::SocketPath(Place(), 0); }
 
   /// Starts in a process of its own; its outcome is the exit code.
   Forked StartElsewhere(InstanceRequest request, std::chrono::milliseconds patience = 30s,
                         const std::string& name = "program") const {
-    return Forked([place = Place(name), request = std::move(request), patience] {
+    return StartAt(Place(name), std::move(request), patience);
+  }
+  static Forked StartAt(InstancePlace place, InstanceRequest request = {},
+                        std::chrono::milliseconds patience = 0ms) {
+    return Forked([place = std::move(place), request = std::move(request), patience] {
       return static_cast<int>(Instance(place).Start(request, patience));
     });
   }
@@ -91,7 +98,7 @@ class InstanceOfAProgram : public testing::Test {
   /// A call from this process at the listener of `first`.
   InstanceCall CallWith(const Instance& first, const std::string& bytes) {
     caller = Descriptor(socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
-    const InstanceAddress address(first.SocketPath());
+    const InstanceAddress address(SocketPath());
     EXPECT_EQ(connect(caller.Number(), address.Get(), InstanceAddress::Size), 0);
     Send(bytes);
     bool failed = false;
@@ -147,7 +154,7 @@ TEST_F(InstanceOfAProgram, LeavesFilesForThisUserAlone) {
   Instance first(Place());
   ASSERT_EQ(first.Start({}, 0ms), InstanceOutcome::First);
   umask(before);
-  for (const std::string& path : {first.LockPath(), first.SocketPath()}) {
+  for (const std::string& path : {LockPath(), SocketPath()}) {
     struct stat info {};
     ASSERT_EQ(stat(path.c_str(), &info), 0) << path;
     EXPECT_EQ(info.st_mode & 07777, 0600u) << path;
@@ -166,7 +173,7 @@ TEST_F(InstanceOfAProgram, IsTheFirstAfterOneThatCrashed) {
     const std::unique_ptr<Forked> crashed = HoldElsewhere();
     crashed->Signal(SIGKILL);
     crashed->ExitCode();
-    ASSERT_EQ(access(Instance(Place()).SocketPath().c_str(), F_OK), 0) << "the stale socket";
+    ASSERT_EQ(access(SocketPath().c_str(), F_OK), 0) << "the stale socket";
   }
   Instance first(Place());
   EXPECT_EQ(first.Start({}, 0ms), InstanceOutcome::First);
@@ -247,7 +254,7 @@ TEST_F(InstanceOfAProgram, IsOneOfManyThatStartAndEndAllTheTime) {
 TEST_F(InstanceOfAProgram, MeetsOthersInAFolderWithALongPath) {
   const std::string deep = folder / std::string(120, 'a');
   ASSERT_EQ(mkdir(deep.c_str(), 0700), 0);
-  const InstancePlace place{deep, "program"};
+  const InstancePlace place{{deep}, "program"};
   Instance first(place);
   ASSERT_EQ(first.Start({}, 0ms), InstanceOutcome::First);
   Forked second([&] { return static_cast<int>(Instance(place).Start({"/a", ""}, 30s)); });
@@ -255,30 +262,133 @@ TEST_F(InstanceOfAProgram, MeetsOthersInAFolderWithALongPath) {
   EXPECT_EQ(second.ExitCode(), Told);
 }
 
-TEST_F(InstanceOfAProgram, IsTheFirstWhereNoFileCanBeMade) {
-  EXPECT_EQ(Instance({folder / "missing", "program"}).Start({}, 0ms), InstanceOutcome::First);
+TEST_F(InstanceOfAProgram, IsTheFirstWhereNoFileCanBeMadeAndNobodyAnswers) {
+  EXPECT_EQ(Instance({{folder / "missing"}, "program"}).Start({}, 0ms), InstanceOutcome::First);
+  // A listener without a lock, as where the system allows none.
+  ASSERT_EQ(mkdir(LockPath().c_str(), 0700), 0);
+  Instance first(Place());
+  ASSERT_EQ(first.Start({}, 0ms), InstanceOutcome::First);
+  Forked second = StartElsewhere({"/a", ""});
+  EXPECT_EQ(TakeCall(first).Path, "/a");
+  EXPECT_EQ(second.ExitCode(), Told);
+}
+
+/// Programs with one data folder, which may have different runtime folders.
+class InstanceInTwoFolders : public InstanceOfAProgram {
+ protected:
+  InstanceInTwoFolders() {
+    for (const std::string& each : {Runtime, Other, Data}) {
+      EXPECT_EQ(mkdir(each.c_str(), 0755), 0);
+    }
+  }
+
+  const std::string Runtime = folder / "runtime";
+  const std::string Other = folder / "other";
+  const std::string Data = folder / "data";
+  const InstancePlace Both{{Runtime, Data}, "program"};
+  const InstancePlace DataAlone{{Data}, "program"};
+};
+
+TEST_F(InstanceInTwoFolders, IsNoSecondFirstWithoutTheRuntimeFolderOfTheFirst) {
+  Instance first(Both);
+  ASSERT_EQ(first.Start({}, 0ms), InstanceOutcome::First);
+  EXPECT_EQ(StartAt(DataAlone).ExitCode(), NoAnswer);
+  EXPECT_EQ(StartAt({{Other, Data}, "program"}).ExitCode(), NoAnswer);
+}
+
+TEST_F(InstanceInTwoFolders, IsNoSecondFirstWithARuntimeFolderThatTheFirstDidNotHave) {
+  Instance first(DataAlone);
+  ASSERT_EQ(first.Start({}, 0ms), InstanceOutcome::First);
+  Forked second = StartAt(Both, {"/a", ""}, 30s);
+  EXPECT_EQ(TakeCall(first).Path, "/a");
+  EXPECT_EQ(second.ExitCode(), Told);
+}
+
+TEST_F(InstanceInTwoFolders, LocksInOneWhereTheOtherCannotTakeAFile) {
+  for (const std::string& refuses : {Runtime, Data}) {
+    ASSERT_EQ(rmdir(refuses.c_str()), 0);  // as a disk without room does
+    Instance first(Both);
+    ASSERT_EQ(first.Start({}, 0ms), InstanceOutcome::First) << refuses;
+    Forked second = StartAt(Both, {"/a", ""}, 30s);
+    EXPECT_EQ(TakeCall(first).Path, "/a") << refuses;
+    EXPECT_EQ(second.ExitCode(), Told);
+    EXPECT_EQ(StartAt(Both).ExitCode(), NoAnswer) << refuses;
+    ASSERT_EQ(mkdir(refuses.c_str(), 0755), 0);
+  }
+}
+
+TEST_F(InstanceInTwoFolders, DropsOneLockWhenTheOtherIsHeld) {
+  const InstancePlace runtimeAlone{{Runtime}, "program"};
+  auto first = std::make_unique<Instance>(runtimeAlone);
+  ASSERT_EQ(first->Start({}, 0ms), InstanceOutcome::First);
+  Instance second(Both);
+  EXPECT_EQ(second.Start({}, 0ms), InstanceOutcome::NoAnswer);
+  EXPECT_TRUE(std::filesystem::is_empty(Data));
+  first.reset();
+  EXPECT_EQ(second.Start({}, 0ms), InstanceOutcome::First);
+  EXPECT_EQ(StartAt(DataAlone).ExitCode(), NoAnswer);
+}
+
+TEST_F(InstanceInTwoFolders, TakesItsFilesAwayFromBoth) {
+  {
+    Instance first(Both);
+    ASSERT_EQ(first.Start({}, 0ms), InstanceOutcome::First);
+    EXPECT_EQ(access(Instance::LockPath(Both, 0).c_str(), F_OK), 0);
+    EXPECT_EQ(access(Instance::LockPath(Both, 1).c_str(), F_OK), 0);
+    EXPECT_EQ(access(Instance::SocketPath(Both, 1).c_str(), F_OK), -1) << "one is enough";
+  }
+  EXPECT_TRUE(std::filesystem::is_empty(Runtime));
+  EXPECT_TRUE(std::filesystem::is_empty(Data));
+}
+
+TEST_F(InstanceInTwoFolders, IsBarredByALockOfAnotherUser) {
+  if (geteuid() != 0) {  // nobody else can make a file of another user: what it is for an own file
+    WriteFile(Instance::LockPath(Both, 1), "");
+    EXPECT_EQ(StartAt(Both).ExitCode(), First);
+    return;
+  }
+  WriteFile(Instance::LockPath(Both, 1), "");
+  ASSERT_EQ(chmod(Instance::LockPath(Both, 1).c_str(), 0600), 0);
+  for (const std::string& each : {folder.Path(), Runtime, Data}) {
+    ASSERT_EQ(chmod(each.c_str(), 0777), 0);
+  }
+  const OrdinaryUser user;
+  Instance barred(Both);
+  EXPECT_EQ(barred.Start({}, 0ms), InstanceOutcome::Barred);
+  EXPECT_EQ(barred.BarredBy(), Instance::LockPath(Both, 1));
+}
+
+TEST_F(InstanceInTwoFolders, LeavesTheLockOfTheAdministratorToTheOwnerOfTheData) {
+  if (geteuid() == 0) {
+    ASSERT_EQ(chmod(folder.Path().c_str(), 0777), 0);
+    ASSERT_EQ(chown(Data.c_str(), 65534, 65534), 0);
+  }
+  auto first = std::make_unique<Instance>(DataAlone);
+  ASSERT_EQ(first->Start({}, 0ms), InstanceOutcome::First);
+  const OrdinaryUser user;
+  EXPECT_EQ(Instance(DataAlone).Start({}, 0ms), InstanceOutcome::NoAnswer) << "it is held";
 }
 
 TEST_F(InstanceOfAProgram, DoesNotFollowALinkInPlaceOfItsLock) {
   const std::string victim = folder / "victim";
   Instance first(Place());
-  ASSERT_EQ(symlink(victim.c_str(), first.LockPath().c_str()), 0);
+  ASSERT_EQ(symlink(victim.c_str(), LockPath().c_str()), 0);
   first.Start({}, 0ms);
   EXPECT_NE(access(victim.c_str(), F_OK), 0);
 }
 
 TEST_F(InstanceOfAProgram, MeetsInTheRuntimeFolderOnlyIfThatIsThisUsersAlone) {
+  using testing::ElementsAre;
   const std::string data = folder / "data/Orvalin/Tessarine";
   const std::string runtime = folder / "runtime";
   ASSERT_EQ(mkdir(runtime.c_str(), 0700), 0);
-  EXPECT_EQ(InstanceFolder(runtime, data), runtime);
-  EXPECT_NE(access(data.c_str(), F_OK), 0);
-  ASSERT_EQ(chmod(runtime.c_str(), 0770), 0);
-  EXPECT_EQ(InstanceFolder(runtime, data), data);
+  EXPECT_THAT(InstanceFolders(runtime, data), ElementsAre(runtime, data));
   EXPECT_EQ(access(data.c_str(), F_OK), 0) << "the place is there";
-  EXPECT_EQ(InstanceFolder("", data), data);
-  EXPECT_EQ(InstanceFolder("runtime", data), data);
-  EXPECT_EQ(InstanceFolder(folder / "missing", data), data);
+  ASSERT_EQ(chmod(runtime.c_str(), 0770), 0);
+  EXPECT_THAT(InstanceFolders(runtime, data), ElementsAre(data));
+  EXPECT_THAT(InstanceFolders("", data), ElementsAre(data));
+  EXPECT_THAT(InstanceFolders("runtime", data), ElementsAre(data));
+  EXPECT_THAT(InstanceFolders(folder / "missing", data), ElementsAre(data));
 }
 
 TEST_F(InstanceOfAProgram, ReadsALineThatComesInPieces) {
@@ -328,8 +438,8 @@ TEST_F(InstanceOfAProgram, CannotAnswerWhoHasGone) {
 
 TEST_F(InstanceOfAProgram, WantsItsOwnAnswer) {
   const std::unique_ptr<Forked> holder = HoldElsewhere();
-  const InstanceAddress address(Instance(Place()).SocketPath());
-  unlink(Instance(Place()).SocketPath().c_str());
+  const InstanceAddress address(SocketPath());
+  unlink(SocketPath().c_str());
   Descriptor stranger(socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
   ASSERT_EQ(bind(stranger.Number(), address.Get(), InstanceAddress::Size), 0);
   ASSERT_EQ(listen(stranger.Number(), 5), 0);

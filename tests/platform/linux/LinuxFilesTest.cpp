@@ -19,6 +19,7 @@
 
 namespace {
 
+using testing::ElementsAre;
 using testing::HasSubstr;
 
 std::size_t EntriesOf(const std::string& folder) {
@@ -119,6 +120,42 @@ TEST(LinuxFilesCreateFolder, MissingParentIs76AndPresentFolderIs75) {
   EXPECT_EQ(missing.Text, "Path not found: " + folder / "no/new");
   EXPECT_EQ(NumberThrownBy([&] { files.CreateFolder(folder.Path()); }), 75);
   EXPECT_FALSE(std::filesystem::exists(folder / "no"));
+}
+
+TEST(LinuxFilesPrivateFolder, IsForThisUserAloneAlsoIfItWasForAll) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  for (int time = 0; time < 2; ++time) {
+    files.MakePrivateFolder(folder / "own");
+    EXPECT_EQ(std::filesystem::status(folder / "own").permissions(), std::filesystem::perms::owner_all);
+    std::filesystem::permissions(folder / "own", std::filesystem::perms::all);
+  }
+  EXPECT_EQ(NumberThrownBy([&] { files.MakePrivateFolder(folder / "no/own"); }), 76);
+}
+
+TEST(LinuxFilesUnfinished, AreDeletedAndNothingElse) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  for (const char* name : {".new-0123456789abcdef", ".new-0123456789abcdeg", ".new-0123456789abcde",
+                           ".new-0123456789abcdef0", "a.new-0123456789abcdef", "members.mdb"}) {
+    files.Write(folder / name, "bytes");
+  }
+  std::filesystem::create_directory(folder / ".new-0123456789abcdee");
+  files.DeleteUnfinished(folder.Path());
+  EXPECT_THAT(files.FileNames(folder.Path()),
+              ElementsAre(".new-0123456789abcde", ".new-0123456789abcdef0", ".new-0123456789abcdeg",
+                          "a.new-0123456789abcdef", "members.mdb"));
+  EXPECT_TRUE(files.FolderExists(folder / ".new-0123456789abcdee"));
+  files.DeleteUnfinished(folder / "no");
+}
+
+TEST(LinuxFilesUnfinished, HaveTheNamesThatAReplacementGivesThem) {
+  const TemporaryFolder folder;
+  LinuxFiles files;
+  const std::unique_ptr<NewFile> file = files.BeginReplace(folder / "a", FileReaders::AsBefore);
+  EXPECT_EQ(files.FileNames(folder.Path()).size(), 1U);
+  files.DeleteUnfinished(folder.Path());
+  EXPECT_EQ(files.FileNames(folder.Path()).size(), 0U);
 }
 
 TEST(LinuxFilesTemporary, MakesANewEmptyFileEachTime) {

@@ -203,6 +203,15 @@ TEST_F(WholeDatabaseFile, IsFoundDamagedInsideToo) {
   }
 }
 
+TEST_F(WholeDatabaseFile, IsReadInPiecesBeforeItIsLookedThrough) {
+  file.Execute("UPDATE Members SET Photograph = randomblob(3000000)");
+  EXPECT_TRUE(file.Open()->CheckWhole(always));
+  EXPECT_GE(asked, 12) << "four rows of three megabytes";
+  asked = 0;
+  EXPECT_FALSE(file.Open()->CheckWhole([this] { return ++asked < 9; }));
+  EXPECT_EQ(asked, 9);
+}
+
 TEST_F(WholeDatabaseFile, IsNotLookedThroughToItsEndWhenThatIsStopped) {
   file.Execute(
       "WITH RECURSIVE n(i) AS (SELECT 10 UNION ALL SELECT i + 1 FROM n WHERE i < 20000) "
