@@ -218,23 +218,6 @@ class Openings {
   std::vector<double> running_;
 };
 
-/// Both programs' starts, in turns.
-bool CompareStarts(const QString& installed, const QString& built, const QString& game) {
-  constexpr int runs = 15;
-  constexpr double goal = 1.1;
-  const Appearances seen = Learn(built, game);
-  std::vector<double> own;
-  std::vector<double> other;
-  for (int i = 0; i < runs; ++i) {
-    own.push_back(TimeOfStart(installed, seen.Window));
-    other.push_back(TimeOfStart(built, seen.Window));
-  }
-  char detail[80];
-  std::snprintf(detail, sizeof detail, "%.0f ms to %.0f ms", Median(own), Median(other));
-  return ReportGoal("start of the installed program / of the one in the build tree",
-                    Median(own) / Median(other), goal, detail);
-}
-
 /// A file with a game of that many players, each hit by every other one.
 QString GameOf(int players, const std::string& folder) {
   FullGame full(0);
@@ -272,13 +255,12 @@ double TimeOfLoad(const QString& program, const QString& game) {
 
 }  // namespace
 
-/// bench-opening [INSTALLED]: from the start of a program to what is to be seen on the screen, which should
-/// be empty and of this benchmark alone. XDG_DATA_HOME must name a folder with the program's data. INSTALLED
-/// is another, installed program, with whose start the one in the build tree is compared.
+/// bench-opening: from the start of a program to what is to be seen on the screen, which should be empty and
+/// of this benchmark alone. XDG_DATA_HOME must name a folder with the program's data.
 int main(int argc, char** argv) {
   const char* const data = std::getenv("XDG_DATA_HOME");
-  if (data == nullptr || argc > 2) {
-    std::fprintf(stderr, "usage: XDG_DATA_HOME=FOLDER bench-opening [INSTALLED]\n");
+  if (data == nullptr || argc > 1) {
+    std::fprintf(stderr, "usage: XDG_DATA_HOME=FOLDER bench-opening\n");
     return 2;
   }
   const QGuiApplication application(argc, argv);
@@ -292,9 +274,6 @@ int main(int argc, char** argv) {
     openings.Measure(runs);
     met &= openings.Report("a game of " + std::to_string(players),
                            TimeOfLoad(folder + QStringLiteral("/bench-main-window"), game));
-  }
-  if (argc == 2) {
-    met &= CompareStarts(QString::fromLocal8Bit(argv[1]), program, GameOf(24, data));
   }
   return met ? 0 : 1;
 }
