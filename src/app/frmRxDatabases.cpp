@@ -65,7 +65,6 @@ void frmRx::ImportMemberFile() {
   if (hasImported) {
     session_.Reopen();
     CheckMembers();
-    ShowOtherNames();
   }
 }
 
@@ -94,6 +93,7 @@ CopyWork::Parts frmRx::CopyParts() const {
 void frmRx::CheckMembers() {
   keeping_->CheckMembers();
   CutNumbers();
+  ShowOtherNames();
 }
 
 void frmRx::CutNumbers() {

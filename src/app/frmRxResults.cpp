@@ -48,7 +48,7 @@ ResultsHost::KeptEvening frmRx::KeptGames() {
           .Read =
               [this](std::int64_t number, const std::function<void(const ResultsHost::KeptGame&)>& take) {
                 const PastGame past = archive_->Read(number);
-                take({.Game = past.Game, .Played = past.Played});
+                take({.Game = past.Game, .Played = past.Played, .OfGuests = past.NamesOfGuests()});
               }};
 }
 
