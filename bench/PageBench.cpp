@@ -5,12 +5,17 @@
 #include <array>
 #include <chrono>
 #include <cstdio>
+#include <cstdlib>
+#include <filesystem>
 #include <fstream>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
 #include "bench/Goals.h"
 #include "bench/PageLoad.h"
+#include "bench/PagePhones.h"
+#include "bench/PageServerPeer.h"
 #include "platform/linux/ChildProcess.h"
 #include "tests/web/Games.h"
 #include "web/ResultsPages.h"
@@ -86,6 +91,22 @@ class Server {
   Descriptor output_;
 };
 
+/// A folder that goes with its files.
+struct ScratchFolder {
+  ScratchFolder() {
+    std::string pattern = std::filesystem::temp_directory_path() / "bench-pages-XXXXXX";
+    Path = mkdtemp(pattern.data()) != nullptr ? pattern : throw std::runtime_error("no folder");
+  }
+  ~ScratchFolder() {
+    std::error_code ignored;
+    std::filesystem::remove_all(Path, ignored);
+  }
+  ScratchFolder(const ScratchFolder&) = delete;
+  ScratchFolder& operator=(const ScratchFolder&) = delete;
+
+  std::string Path;
+};
+
 /// Milliseconds for the pages of one more game, in both languages, until all is written.
 double HandOver(ResultsPages& pages, const Server& server, int number) {
   const PublicGame game = FullGameOf(PlayersOfGame, number);
@@ -101,6 +122,55 @@ bool MemoryHolds(const Server& server, const char* name) {
   std::array<char, 64> text{};
   std::snprintf(text.data(), text.size(), "%.1f MB", memory / Megabyte);
   return ReportGoal(name, memory / most, 1, text.data());
+}
+
+/// Seconds after which the phones have the board of a game, from the moment when its scores are there.
+bool PhonesFollow(ResultsPages& pages, const Server& server, int number) {
+  constexpr double mostSeconds = 3.5;
+  constexpr auto asSeenFrom = 3500ms;  // each has asked at least once, and at no time in particular
+  PagePhones phones(server.Port, Phones);
+  phones.GoOn(asSeenFrom);
+  const auto scored = Clock::now();
+  HandOver(pages, server, number);
+  const std::vector<double> times = phones.NewPages(scored, 10s);
+  constexpr std::size_t needed = std::size_t{Phones} * 95 / 100;
+  const double time = times.size() >= needed ? times[needed - 1] : 1000;
+  std::array<char, 96> text{};
+  std::snprintf(text.data(), text.size(), "%.2f s for 95 of 100, %.2f s for the last of %zu", time,
+                times.empty() ? 0 : times.back(), times.size());
+  return ReportGoal("scores to the new board on 200 phones / 3.5 s", time / mostSeconds, 1, text.data()) &&
+         phones.Failures() == 0;
+}
+
+/// Requests for the board in turns from both servers, each the median.
+bool AsFastAsThePeer(const std::string& body, const Server& server) {
+  constexpr const char* name = "requests for the board, nginx / own, 200 connections";
+  constexpr double goal = 1 / 0.8;
+  const std::string program = FindPageServerPeer();
+  if (program.empty()) {
+    std::printf("%-52s skipped: no nginx\n", name);
+    return true;
+  }
+  const ScratchFolder folder;
+  PageServerPeer peer(program, folder.Path, body);
+  if (!peer.Answers()) {
+    std::printf("%-52s skipped: nginx does not serve\n", name);
+    return true;
+  }
+  std::vector<double> own;
+  std::vector<double> others;
+  std::size_t failures = 0;
+  for (int round = 0; round < 5; ++round) {
+    const PageLoad load = LoadServer(server.Port, "/", Phones, 1500ms);
+    const PageLoad other = LoadServer(PageServerPeer::Port, "/", Phones, 1500ms);
+    own.push_back(load.RequestsPerSecond);
+    others.push_back(other.RequestsPerSecond);
+    failures += load.Failures + other.Failures;
+  }
+  std::array<char, 96> text{};
+  std::snprintf(text.data(), text.size(), "%.0f to %.0f a second, %zu failures", Median(others), Median(own),
+                failures);
+  return ReportGoal(name, Median(others) / Median(own), goal, text.data()) && failures == 0;
 }
 
 }  // namespace
@@ -125,7 +195,7 @@ int main() {
     met &= LoadServer(server.Port, path == "/missing" ? "/" : path, 1, 1ms).Failures == 0;
   }
   met &= MemoryHolds(server, "  the same after each page was asked for");
-  std::printf("%-52s skipped: no server to compare with; %.0f a second, %zu failures\n",
-              "requests for the board, 200 connections", load.RequestsPerSecond, load.Failures);
+  met &= PhonesFollow(pages, server, Games + 1);
+  met &= AsFastAsThePeer(pages.Pages().at("/"), server);
   return met ? 0 : 1;
 }

@@ -23,10 +23,11 @@ h1{font-size:1.5rem;line-height:1.2;margin:.9rem 0 .5rem}
 table{border-collapse:collapse;width:100%}
 th,td{padding:.4rem .2rem;border-bottom:1px solid var(--line);text-align:left;vertical-align:middle}
 th{font-weight:600;font-size:.85rem;overflow-wrap:normal}
-td:nth-child(n+4),th:nth-child(n+4),.figures td,.hits :nth-child(3){text-align:right;
+td:nth-child(n+3),th:nth-child(n+3),.hits td+td,.hits th+th,.figures td{text-align:right;
 font-variant-numeric:tabular-nums;overflow-wrap:normal}
+.who{width:99%;min-width:7rem}
 .figures th{font-size:1rem}
-td a{display:inline-block;padding:.2rem 0}
+td a{padding:.2rem 0}
 .teams{display:flex;flex-wrap:wrap;gap:.4rem 1rem;margin:.4rem 0}
 .wide,#new{display:block;padding:.8rem;background:var(--soft);border:1px solid var(--line);border-radius:.4rem;
 text-align:center}
@@ -38,6 +39,10 @@ ul{list-style:none;margin:0;padding:0}
 .guns a{display:block;height:100%;padding:.8rem .5rem;background:var(--soft);border:1px solid var(--line);
 border-radius:.4rem;font-size:1.1rem}
 .guns small{display:block}
+@media(max-width:25rem){body{padding:0 .4rem 2rem}
+td,th{padding:.4rem .15rem}
+th{font-size:.7rem}
+.ranks td:nth-child(6),.ranks th:nth-child(6){display:none}}
 .t1,.t2,.t3{display:inline-block;min-width:1.5em;padding:0 .2em;border-radius:.2em;text-align:center}
 )";
 
@@ -69,7 +74,9 @@ std::string PageScript() {
   }
   function ask() {
     if (document.hidden) { wait(); return; }
-    fetch("/now").then(function (answer) {
+    var stop = window.AbortController ? new AbortController() : null;
+    if (stop) { setTimeout(function () { stop.abort(); }, 10000); }
+    fetch("/now", stop ? { signal: stop.signal } : {}).then(function (answer) {
       if (!answer.ok) { throw new Error("no answer"); }
       return answer.text();
     }).then(look).catch(wait);

@@ -16,6 +16,9 @@ constexpr std::chrono::seconds LongEnough = 60s;
 /// More means that the program no longer reads.
 constexpr std::size_t MostUnread = 2 * MostPageBytes;
 
+/// A program that works reports once a second.
+constexpr int MostReportsASecond = 20;
+
 }  // namespace
 
 PageServer::PageServer(PipedProgram& program, const MonotonicClock& clock, ResultsPages& pages,
@@ -48,6 +51,7 @@ void PageServer::Update() {
   if (state_.Now != PageServing::Phase::Serving) {
     return;  // it gets all pages once it answers
   }
+  TellVisitors();
   for (const PageFrame& frame : pages_.TakeChanges()) {
     program_.Write(EncodeFrame(frame));
   }
@@ -56,8 +60,16 @@ void PageServer::Update() {
   }
 }
 
+void PageServer::Replace() {
+  if (state_.Now == PageServing::Phase::Serving) {
+    StartAgain();
+  }
+}
+
 void PageServer::Start(std::chrono::milliseconds pause) {
   reports_ = {};
+  visitors_ = 0;
+  toldVisitors_ = clock_.Elapsed() - 1s;
   const PageServing::Phase phase = pause > 0ms ? PageServing::Phase::Pausing : PageServing::Phase::Starting;
   program_.Start({path_, address_, std::to_string(port_)}, pause);
   Become({.Now = phase, .Port = 0, .Visitors = 0, .Starts = state_.Starts + 1});
@@ -66,31 +78,64 @@ void PageServer::Start(std::chrono::milliseconds pause) {
 void PageServer::TakeReports(std::string_view bytes) {
   reports_.Add(bytes);
   while (const auto report = reports_.Next()) {
-    Take(*report);
+    if (IsTooTalkative() || !Take(*report)) {
+      StartAgain();
+      return;
+    }
   }
   if (reports_.Broken()) {
     StartAgain();
   }
 }
 
-void PageServer::Take(const PageReport& report) {
+bool PageServer::IsTooTalkative() {
+  const std::chrono::microseconds now = clock_.Elapsed();
+  if (now - secondSince_ >= 1s) {
+    secondSince_ = now;
+    reportsOfSecond_ = 0;
+  }
+  return ++reportsOfSecond_ > MostReportsASecond;
+}
+
+bool PageServer::Take(const PageReport& report) {
+  switch (report.Kind) {
+    case ReportKind::Port:
+      return TakePort(report.Number);
+    case ReportKind::Visitors:
+      TakeVisitors(report.Number);
+      return true;
+    case ReportKind::Answer:
+      break;
+  }
+  return false;
+}
+
+bool PageServer::TakePort(std::uint32_t port) {
+  if (state_.Now == PageServing::Phase::Serving) {
+    return false;
+  }
+  servingSince_ = clock_.Elapsed();
+  for (const PageFrame& frame : pages_.TakeAll()) {
+    program_.Write(EncodeFrame(frame));
+  }
+  Become({.Now = PageServing::Phase::Serving,
+          .Port = static_cast<std::uint16_t>(port),
+          .Visitors = 0,
+          .Starts = state_.Starts});
+  return true;
+}
+
+void PageServer::TakeVisitors(std::uint32_t visitors) {
+  visitors_ = visitors;
+  if (clock_.Elapsed() - toldVisitors_ >= 1s) {
+    TellVisitors();
+  }
+}
+
+void PageServer::TellVisitors() {
+  toldVisitors_ = clock_.Elapsed();
   PageServing state = state_;
-  if (report.Kind == ReportKind::Visitors) {
-    state.Visitors = report.Number;
-    Become(state);
-    return;
-  }
-  if (report.Kind != ReportKind::Port) {
-    return;
-  }
-  state.Port = static_cast<std::uint16_t>(report.Number);
-  if (state.Now != PageServing::Phase::Serving) {
-    state.Now = PageServing::Phase::Serving;
-    servingSince_ = clock_.Elapsed();
-    for (const PageFrame& frame : pages_.TakeAll()) {
-      program_.Write(EncodeFrame(frame));
-    }
-  }
+  state.Visitors = visitors_;
   Become(state);
 }
 

@@ -43,15 +43,24 @@ class PageServer {
   void SwitchOn(const std::string& address, std::uint16_t port);
   void SwitchOff();
 
-  /// Sends what has changed in the pages.
+  /// Sends what has changed in the pages, and tells the visitors that came too soon after others. To be
+  /// called every few seconds too.
   void Update();
+
+  /// Ends a program that nobody gets an answer from, and starts it again after a pause.
+  void Replace();
 
   const PageServing& State() const { return state_; }
 
  private:
   void Start(std::chrono::milliseconds pause);
   void TakeReports(std::string_view bytes);
-  void Take(const PageReport& report);
+  /// False if the program says what it must not say now.
+  bool Take(const PageReport& report);
+  bool TakePort(std::uint32_t port);
+  void TakeVisitors(std::uint32_t visitors);
+  void TellVisitors();
+  bool IsTooTalkative();
   void StartAgain();
   void Become(const PageServing& state);
 
@@ -64,5 +73,9 @@ class PageServer {
   PageServing state_;
   PageReportReader reports_;
   std::chrono::microseconds servingSince_{};
+  std::uint32_t visitors_ = 0;  ///< as reported last
+  std::chrono::microseconds toldVisitors_{};
+  int reportsOfSecond_ = 0;
+  std::chrono::microseconds secondSince_{};
   std::chrono::milliseconds pause_{};
 };

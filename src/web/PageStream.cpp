@@ -1,6 +1,8 @@
 #include "web/PageStream.h"
 
 #include <algorithm>
+#include <cstring>
+#include <utility>
 
 #include "platform/RuntimeError.h"
 
@@ -23,6 +25,10 @@ std::uint32_t NumberAt(std::string_view bytes, std::size_t at, std::size_t count
     number = (number << 8U) | static_cast<unsigned char>(bytes[at + i - 1]);
   }
   return number;
+}
+
+void Wipe(std::string& bytes) {
+  explicit_bzero(bytes.data(), bytes.size());
 }
 
 bool MayBegin(char order, std::size_t path, std::size_t body) {
@@ -80,11 +86,34 @@ void PageFrameReader::Add(std::string_view bytes) {
   if (broken_) {
     return;
   }
-  if (at_ >= WorthMoving) {
-    bytes_.erase(0, at_);
-    at_ = 0;
+  if (at_ >= WorthMoving || at_ == bytes_.size()) {
+    DropTaken();
   }
+  Grow(bytes_.size() + bytes.size());
   bytes_ += bytes;
+}
+
+PageFrameReader::~PageFrameReader() {
+  Wipe(bytes_);
+}
+
+void PageFrameReader::DropTaken() {
+  const std::size_t left = bytes_.size() - at_;
+  std::memmove(bytes_.data(), bytes_.data() + at_, left);
+  explicit_bzero(bytes_.data() + left, at_);
+  bytes_.resize(left);
+  at_ = 0;
+}
+
+void PageFrameReader::Grow(std::size_t size) {
+  if (size <= bytes_.capacity()) {
+    return;
+  }
+  std::string larger;
+  larger.reserve(std::max(size, 2 * bytes_.capacity()));
+  larger = bytes_;
+  Wipe(bytes_);
+  bytes_ = std::move(larger);
 }
 
 std::optional<PageFrame> PageFrameReader::Next() {
@@ -101,12 +130,14 @@ std::optional<PageFrame> PageFrameReader::Next() {
     PageFrame frame{.Order = static_cast<PageOrder>(bytes_[at_]),
                     .Path = bytes_.substr(at_ + FrameHead, path),
                     .Body = bytes_.substr(at_ + FrameHead + path, body)};
+    explicit_bzero(bytes_.data() + at_, FrameHead + path + body);
     at_ += FrameHead + path + body;
     if (frame.Order == PageOrder::Show || IsPagePath(frame.Path)) {
       return frame;
     }
     broken_ = true;
   }
+  Wipe(bytes_);
   bytes_ = {};
   at_ = 0;
   return std::nullopt;
@@ -120,21 +151,23 @@ std::string EncodeReport(const PageReport& report) {
 
 void PageReportReader::Add(std::string_view bytes) {
   if (!broken_) {
+    bytes_.erase(0, std::exchange(at_, 0));
     bytes_ += bytes;
   }
 }
 
 std::optional<PageReport> PageReportReader::Next() {
-  if (broken_ || bytes_.size() < ReportLength) {
+  if (broken_ || bytes_.size() - at_ < ReportLength) {
     return std::nullopt;
   }
-  const std::uint32_t number = NumberAt(bytes_, 1, 4);
-  broken_ = !InRange(bytes_[0], number);
+  const std::uint32_t number = NumberAt(bytes_, at_ + 1, 4);
+  broken_ = !InRange(bytes_[at_], number);
   if (broken_) {
     bytes_ = {};
+    at_ = 0;
     return std::nullopt;
   }
-  const PageReport report{.Kind = static_cast<ReportKind>(bytes_[0]), .Number = number};
-  bytes_.erase(0, ReportLength);
+  const PageReport report{.Kind = static_cast<ReportKind>(bytes_[at_]), .Number = number};
+  at_ += ReportLength;
   return report;
 }

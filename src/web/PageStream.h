@@ -39,9 +39,15 @@ bool IsPagePath(std::string_view path);
 /// both. Throws RuntimeError 5 for a page that no reader would take.
 std::string EncodeFrame(const PageFrame& frame);
 
-/// Takes the frames out of the bytes as they come.
+/// Takes the frames out of the bytes as they come, and keeps nothing of those that it gave away: in its
+/// memory they are wiped.
 class PageFrameReader {
  public:
+  PageFrameReader() = default;
+  ~PageFrameReader();
+  PageFrameReader(const PageFrameReader&) = delete;
+  PageFrameReader& operator=(const PageFrameReader&) = delete;
+
   void Add(std::string_view bytes);
 
   /// The next complete frame; none until more bytes come, and none for ever once the stream is broken.
@@ -51,6 +57,9 @@ class PageFrameReader {
   bool Broken() const { return broken_; }
 
  private:
+  void DropTaken();
+  void Grow(std::size_t size);
+
   std::string bytes_;
   std::size_t at_ = 0;  ///< where the next frame begins
   bool broken_ = false;
@@ -85,5 +94,6 @@ class PageReportReader {
 
  private:
   std::string bytes_;
+  std::size_t at_ = 0;  ///< where the next report begins
   bool broken_ = false;
 };

@@ -40,10 +40,24 @@ std::string InFolder(Language language, std::string_view path) {
   return whole;
 }
 
+std::string Column(std::string_view caption) {
+  return Filled("<th scope=col>%1", {Escaped(caption)});
+}
+
+/// The column that takes all the width that the others leave.
+std::string WhoColumn(const StringTable& texts) {
+  return Filled("<th scope=col class=who>%1", {Escaped(texts.Text(104))});
+}
+
 std::string BoardHead(const StringTable& texts) {
-  return Filled("<table class=board><thead><tr><th>%1<th><th>%2<th>%3<th>%4<th>%5</thead><tbody>",
-                {Escaped(texts.Text(103)), Escaped(texts.Text(104)), Escaped(texts.Text(105)),
-                 Escaped(texts.Text(106)), Escaped(texts.Text(110))});
+  std::string head = "<table class=board><thead><tr>";
+  head += Column(texts.Text(103));
+  head += WhoColumn(texts);
+  for (const int number : {105, 106, 110}) {
+    head += Column(texts.Text(number));
+  }
+  head += "</thead><tbody>";
+  return head;
 }
 
 /// `folder` is where the pages of the guns are, from the page that the board is on.
@@ -55,7 +69,7 @@ std::string Board(const PublicGame& game, std::string_view folder, const StringT
   board += BoardHead(texts);
   for (const PublicPlayer& player : game.Players) {
     board += Filled(
-        "<tr><td>%1<td>%2<td><a href=\"%3%4\">%5</a><td>%6<td>%7<td>%8\n",
+        "<tr><td>%1<td>%2 <a href=\"%3%4\">%5</a><td>%6<td>%7<td>%8\n",
         {std::to_string(player.Place), PageParts::Badge(TeamOfGun(player.Gun), texts), folder,
          std::to_string(player.Gun), PageParts::NameOf(player, texts), std::to_string(player.Soldiering),
          PageParts::Percent(player.Accuracy), std::to_string(player.Kia)});
@@ -123,15 +137,15 @@ std::string OtherDuels(std::span<const Duel> duels, const StringTable& texts) {
     given += duel.Given;
     taken += duel.Taken;
   }
-  std::string row = Filled("<tr><td><td>%1",
-                           {Escaped(Filled(texts.Text(OwnText::OtherGuns), {std::to_string(duels.size())}))});
+  std::string row =
+      Filled("<tr><td>%1", {Escaped(Filled(texts.Text(OwnText::OtherGuns), {std::to_string(duels.size())}))});
   row += Amounts(given, taken);
   return row;
 }
 
 std::string DuelRow(const Duel& duel, const PlayersByGun& players, const StringTable& texts) {
   const PublicPlayer* player = players.at(static_cast<std::size_t>(duel.Gun));
-  std::string row = Filled("<tr><td>%1<td>", {PageParts::Badge(TeamOfGun(duel.Gun), texts)});
+  std::string row = Filled("<tr><td>%1 ", {PageParts::Badge(TeamOfGun(duel.Gun), texts)});
   if (player != nullptr) {
     row += Filled("<a href=%1>%2</a>", {std::to_string(duel.Gun), PageParts::NameOf(*player, texts)});
   } else {
@@ -144,11 +158,13 @@ std::string DuelRow(const Duel& duel, const PlayersByGun& players, const StringT
 /// Whom the player hit, and who hit the player.
 std::string Duels(const PublicPlayer& player, const PlayersByGun& players, const StringTable& texts) {
   const std::vector<Duel> duels = DuelsOf(player);
-  std::string list = Filled("<table class=hits><thead><tr><th><th>%1<th>%2<th>%3</thead><tbody>",
-                            {Escaped(texts.Text(104)), Escaped(texts.Text(OwnText::WhomIHit)),
-                             Escaped(texts.Text(OwnText::WhoHitMe))});
+  std::string list = "<table class=hits><thead><tr>";
+  list += WhoColumn(texts);
+  list += Column(texts.Text(OwnText::WhomIHit));
+  list += Column(texts.Text(OwnText::WhoHitMe));
+  list += "</thead><tbody>";
   if (duels.empty()) {
-    list += Filled("<tr><td><td>%1<td>-<td>-", {Escaped(texts.Text(OwnText::NobodyHit))});
+    list += Filled("<tr><td>%1<td>-<td>-", {Escaped(texts.Text(OwnText::NobodyHit))});
   }
   const auto told = std::span(duels).first(std::min(duels.size(), MostGunsOnPage));
   for (const Duel& duel : told) {
@@ -162,7 +178,7 @@ std::string Duels(const PublicPlayer& player, const PlayersByGun& players, const
 }
 
 std::string Figure(std::string_view caption, std::string_view value) {
-  return Filled("<tr><th>%1<td>%2\n", {Escaped(caption), Escaped(value)});
+  return Filled("<tr><th scope=row>%1<td>%2\n", {Escaped(caption), Escaped(value)});
 }
 
 std::string Figures(const PublicPlayer& player, const StringTable& texts) {
@@ -186,6 +202,9 @@ std::string OwnResults(const PublicPlayer& player, const PublicGame& game, const
       "<h1>%1 %2</h1>", {PageParts::Badge(TeamOfGun(player.Gun), texts), PageParts::NameOf(player, texts)});
   const std::string place = Filled(texts.Text(OwnText::PlaceOfAll),
                                    {std::to_string(player.Place), std::to_string(game.Players.size())});
+  if (!player.Name.empty()) {
+    page += Filled("<p class=lead>%1</p>", {Escaped(PageParts::Gun(player.Gun, texts))});
+  }
   page += Filled("<p class=lead>%1</p><p><a href=\"./\">%2</a></p>",
                  {Escaped(place), Escaped(PageParts::TitleOf(game, texts))});
   page += Figures(player, texts);
@@ -260,10 +279,14 @@ Page RankingPage(const std::string& month, const std::vector<RankedLine>& lines,
   if (lines.empty()) {
     main += Filled("<p>%1</p>", {Escaped(texts.Text(OwnText::NobodyRanked))});
   } else {
-    main +=
-        Filled("<table class=ranks><thead><tr><th>%1<th>%2<th>%3<th>%4<th>%5<th>%6</thead><tbody>",
-               {Escaped(texts.Text(103)), Escaped(texts.Text(104)), Escaped(texts.Text(OwnText::GamesPlayed)),
-                Escaped(texts.Text(105)), Escaped(texts.Text(OwnText::BestGame)), Escaped(texts.Text(106))});
+    main += "<table class=ranks><thead><tr>";
+    main += Column(texts.Text(103));
+    main += WhoColumn(texts);
+    for (const std::string& caption : {texts.Text(OwnText::GamesPlayed), texts.Text(105),
+                                       texts.Text(OwnText::BestGame), texts.Text(106)}) {
+      main += Column(caption);
+    }
+    main += "</thead><tbody>";
     for (const RankedLine& line : lines) {
       const auto accuracy =
           line.Accuracy ? std::optional(static_cast<float>(*line.Accuracy)) : std::optional<float>();
@@ -281,12 +304,12 @@ Page RankingPage(const std::string& month, const std::vector<RankedLine>& lines,
 Page MissingPage(Language language) {
   const StringTable& here = PageParts::TextsOf(language);
   const StringTable& other = PageParts::TextsOf(PageParts::Other(language));
-  const std::string main = Filled("<p>%1</p><p lang=\"%2\">%3</p>",
+  const std::string main = Filled("<h1>%1</h1><p lang=\"%2\">%3</p>",
                                   {Escaped(here.Text(OwnText::PageIsGone)), Code(other.TextLanguage()),
                                    Escaped(other.Text(OwnText::PageIsGone))});
   return {.Path = "/missing",
           .Body = PageParts::Whole(
-              {.Title = here.Text(OwnText::ResultsTitle), .Path = {}, .Token = {}, .Main = main}, here)};
+              {.Title = here.Text(OwnText::PageIsGone), .Path = {}, .Token = {}, .Main = main}, here)};
 }
 
 Page TokenPage(const PublicGame* newest) {

@@ -12,7 +12,7 @@ using namespace std::chrono_literals;
 namespace {
 
 constexpr std::chrono::milliseconds LookEvery = 5s;
-constexpr int LooksToRequest = 6;  ///< as long as requests are answered
+constexpr int LooksToReplace = 6;  ///< without an answer
 constexpr int LooksToRanking = 12;
 
 }  // namespace
@@ -37,6 +37,7 @@ struct ResultsHost::Running {
   std::string Address;  ///< at which the pages are to be served; empty for none
   std::uint16_t AskedPort = 0;
   int Looks = 0;
+  int Unanswered = 0;  ///< looks in a row that found no answer
   QTimer Timer;
 };
 
@@ -138,6 +139,7 @@ void ResultsHost::HearServer() {
   const PageServing state = Serving();
   const std::uint16_t port = state.Now == PageServing::Phase::Serving ? state.Port : std::uint16_t{0};
   if (std::exchange(running_->AskedPort, port) != port) {
+    running_->Unanswered = 0;
     if (port != 0) {
       running_->Probe.Ask(running_->Address, port);
     } else {
@@ -179,9 +181,13 @@ void ResultsHost::Look() {
   }
   running_->Server.Update();
   ServeWhereItBelongs();
-  const bool isDue = running_->Looks % LooksToRequest == 0 || !running_->Probe.Answered();
-  if (isDue && running_->AskedPort != 0) {
-    running_->Probe.Ask(running_->Address, running_->AskedPort);
+  if (running_->AskedPort != 0) {
+    running_->Unanswered = running_->Probe.Answered() ? 0 : running_->Unanswered + 1;
+    if (running_->Unanswered < LooksToReplace) {
+      running_->Probe.Ask(running_->Address, running_->AskedPort);
+    } else {
+      running_->Server.Replace();
+    }
   }
 }
 
@@ -189,14 +195,17 @@ void ResultsHost::Hear(SessionChange change) {
   switch (change) {
     case SessionChange::Cleared:
       isLoaded_ = false;
+      isScored_ = false;
       if (IsOn()) {
         running_->Evening.ForgetBoard();
       }
       break;
     case SessionChange::Loaded:
       isLoaded_ = true;
+      isScored_ = false;
       break;
     case SessionChange::Scores:
+      isScored_ = true;
       if (IsOn()) {
         TakeGame();
       }
@@ -293,7 +302,7 @@ std::optional<ResultsHost::Moment> ResultsHost::Played() const {
 void ResultsHost::TakeGame() {
   Session& session = parts_.Session;
   const auto played = Played();
-  if (!session.Game().DataPresent || parts_.Pulling() || IsReading() || !played) {
+  if (!isScored_ || !session.Game().DataPresent || parts_.Pulling() || IsReading() || !played) {
     return;
   }
   const auto take = [&](const NickNames& nickNames) {

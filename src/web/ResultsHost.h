@@ -141,5 +141,6 @@ class ResultsHost : public QObject {
   PageSetup setup_;
   std::unique_ptr<Running> running_;  ///< null while off
   bool isLoaded_ = false;             ///< the game on the board is from a file
+  bool isScored_ = false;             ///< since it was cleared or loaded
   Subscription subscription_;
 };

@@ -78,6 +78,18 @@ TEST_P(GamesOnThePage, HasAPulledGameOnceItIsScored) {
   EXPECT_FALSE(IsServed("/en/g/2/"));
 }
 
+TEST_P(GamesOnThePage, HasNoGameThatIsNotYetScored) {
+  int boxes = 0;
+  venue.Boxes.WhileOpen = [&](const FakeMessageBoxes::Box&) {  // the calculation asks about a member
+    ++boxes;
+    Serve();
+    EXPECT_FALSE(IsServed("/en/g/1/"));
+  };
+  venue.LoadGame(GameFile(PlayerOf(1, "<MemberIndex>99</MemberIndex>")));
+  EXPECT_EQ(boxes, 1);
+  EXPECT_TRUE(IsServed("/en/g/1/"));
+}
+
 TEST_P(GamesOnThePage, NumbersTheGamesAndShowsAsManyAsAreSet) {
   Serve();
   for (int game = 0; game < 4; ++game) {

@@ -63,15 +63,28 @@ TEST_P(PageOfResults, TakesTheAddressOffTheBoardWhenItIsNoLongerAnswered) {
   Serve();
   ASSERT_EQ(Board().State().Address(), Url8080);
   const std::size_t asked = Asker().Runs.size();
-  for (int looks = 0; looks < 6; ++looks) {
-    Host().Look();
-  }
+  Host().Look();
   ASSERT_EQ(Asker().Runs.size(), asked + 1);
   Asker().OnOutput(PageUnanswered);
   EXPECT_EQ(Board().State().Address(), "");
   Host().Look();
   Asker().OnOutput(PageAnswered);
   EXPECT_EQ(Board().State().Address(), Url8080);
+}
+
+TEST_P(PageOfResults, ReplacesAProgramThatHangs) {
+  Serve();
+  for (int looks = 0; looks < 8; ++looks) {
+    EXPECT_EQ(Server().Runs.size(), 1U);
+    Host().Look();  // each asks, and finds that the one before is still without an answer
+  }
+  EXPECT_EQ(Server().Runs.size(), 2U);
+  EXPECT_EQ(Host().Serving().Now, PageServing::Phase::Pausing);
+  Server().OnOutput(ServedAt8080);
+  Asker().OnOutput(PageAnswered);
+  EXPECT_EQ(Board().State().Address(), Url8080);
+  Host().Look();
+  EXPECT_EQ(Server().Runs.size(), 2U);
 }
 
 TEST_P(PageOfResults, TakesTheAddressOffTheBoardWhenTheProgramEnds) {

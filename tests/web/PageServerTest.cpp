@@ -134,6 +134,48 @@ TEST_F(ServingPages, EndsAProgramThatNoLongerReads) {
   EXPECT_EQ(server.State().Now, Phase::Pausing);
 }
 
+TEST_F(ServingPages, TellsVisitorsOnceASecondAndTheLastOnesAtTheNextUpdate) {
+  server.SwitchOn("127.0.0.1", 8080);
+  program.OnOutput(Port8080);
+  clock.Pass(10s);
+  changes = 0;
+  program.OnOutput("V\x07\x00\x00\x00V\x08\x00\x00\x00V\x09\x00\x00\x00"s);
+  EXPECT_EQ(server.State().Visitors, 7U);
+  EXPECT_EQ(changes, 1);
+  server.Update();
+  EXPECT_EQ(server.State().Visitors, 9U);
+  EXPECT_EQ(changes, 2);
+}
+
+TEST_F(ServingPages, EndsAProgramThatNeverStopsReporting) {
+  server.SwitchOn("127.0.0.1", 8080);
+  program.OnOutput(Port8080);
+  std::string flood;
+  for (int i = 0; i < 1000; ++i) {
+    flood.append("V\x07\x00\x00\x00"s);
+  }
+  program.OnOutput(flood);
+  EXPECT_EQ(server.State().Now, Phase::Pausing);
+  EXPECT_EQ(program.Runs.size(), 2U);
+}
+
+TEST_F(ServingPages, EndsAProgramThatChangesItsPort) {
+  server.SwitchOn("127.0.0.1", 8080);
+  program.OnOutput(Port8080);
+  program.OnOutput(Port8080);
+  EXPECT_EQ(server.State().Now, Phase::Pausing);
+}
+
+TEST_F(ServingPages, ReplacesAProgramThatGivesNoAnswers) {
+  server.SwitchOn("127.0.0.1", 8080);
+  server.Replace();
+  EXPECT_EQ(program.Runs.size(), 1U);  // it has not even begun
+  program.OnOutput(Port8080);
+  server.Replace();
+  EXPECT_EQ(server.State().Now, Phase::Pausing);
+  EXPECT_EQ(program.Runs.size(), 2U);
+}
+
 TEST_F(ServingPages, StopsWhenSwitchedOff) {
   server.SwitchOn("127.0.0.1", 8080);
   program.OnOutput(Port8080);

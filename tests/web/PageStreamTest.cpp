@@ -60,6 +60,22 @@ TEST(PageOrders, BreakTheStreamWhenTheyAreNone) {
   EXPECT_FALSE(Breaks(PutBytes + ShowBytes));
 }
 
+TEST(PageOrders, LargerThanTheReadersMemoryAreReadWhole) {
+  PageFrameReader reader;
+  for (int round = 0; round < 3; ++round) {
+    const PageFrame large{.Order = PageOrder::Put,
+                          .Path = "/a",
+                          .Body = std::string(LongestPageBody, static_cast<char>('a' + round))};
+    const std::string bytes = EncodeFrame(large) + PutBytes;
+    reader.Add(std::string_view(bytes).substr(0, 100'000));
+    EXPECT_EQ(reader.Next(), std::nullopt);
+    reader.Add(std::string_view(bytes).substr(100'000));
+    EXPECT_EQ(reader.Next(), large);
+    EXPECT_EQ(reader.Next(), (PageFrame{.Order = PageOrder::Put, .Path = "/a", .Body = "abc"}));
+    EXPECT_EQ(reader.Next(), std::nullopt);
+  }
+}
+
 TEST(PageOrders, OfABrokenStreamAreNotRead) {
   PageFrameReader reader;
   reader.Add("X\x00\x00\x00\x00\x00\x00"s);

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <set>
 
+#include "platform/Utf8.h"
 #include "tests/web/Games.h"
 #include "web/PageStream.h"
 
@@ -86,35 +87,36 @@ TEST(PagesOfAGame, AreInBothLanguages) {
 
 TEST(PageOfAGun, HasItsFiguresAndHits) {
   const std::string page = BodyOf(SmallGame(), "/en/g/1/40");
-  for (const char* figure :
-       {"<th>Soldiering<td>120", "<th>Accuracy<td>46%", "<th>Damage dealt<td>300", "<th>Damage taken<td>50",
-        "<th>Shots Fired<td>77", "<th>W.I.A.<td>2", "<th>K.I.A.<td>1", "<th>Ammo Adds<td>4"}) {
+  for (const char* figure : {"<th scope=row>Soldiering<td>120", "<th scope=row>Accuracy<td>46%",
+                             "<th scope=row>Damage dealt<td>300", "<th scope=row>Damage taken<td>50",
+                             "<th scope=row>Shots Fired<td>77", "<th scope=row>W.I.A.<td>2",
+                             "<th scope=row>K.I.A.<td>1", "<th scope=row>Ammo Adds<td>4"}) {
     EXPECT_THAT(page, HasSubstr(figure));
   }
-  EXPECT_THAT(page, HasSubstr("<b class=t1>R</b><td><a href=1>Red 0</a><td>200<td>50\n"));
-  EXPECT_THAT(page, HasSubstr("<b class=t3>Y</b><td><a href=68>Yellow 3</a><td>100<td>-\n"));
+  EXPECT_THAT(page, HasSubstr("<b class=t1>R</b> <a href=1>Red 0</a><td>200<td>50\n"));
+  EXPECT_THAT(page, HasSubstr("<b class=t3>Y</b> <a href=68>Yellow 3</a><td>100<td>-\n"));
 }
 
 TEST(PageOfAGun, SaysWhenItHitNobodyAndHasNoAccuracy) {
   EXPECT_THAT(BodyOf(SmallGame(), "/en/g/1/68"),
-              AllOf(HasSubstr("<td>Nobody<td>-<td>-"), HasSubstr("<th>Accuracy<td>-")));
+              AllOf(HasSubstr("<td>Nobody<td>-<td>-"), HasSubstr("<th scope=row>Accuracy<td>-")));
 }
 
 TEST(PageOfAGun, NamesAGunThatTookNoPartWithoutALink) {
   PublicGame game = SmallGame();
   game.Players[0].HitsTaken = {{.Gun = 2, .Amount = 9}};
-  EXPECT_THAT(BodyOf(game, "/en/g/1/40"), HasSubstr("<td>Red 1<td>-<td>9\n"));
+  EXPECT_THAT(BodyOf(game, "/en/g/1/40"), HasSubstr("</b> Red 1<td>-<td>9\n"));
 }
 
 TEST(PageOfAGun, AddsUpTheHitsBeyondSixty) {
   const std::string page = BodyOf(FullGameOf(62), "/en/g/1/1");
-  EXPECT_THAT(page, AllOf(HasSubstr("<td>2 more<td>2123<td>2123"), Not(HasSubstr("<a href=61>"))));
+  EXPECT_THAT(page, AllOf(HasSubstr("<tr><td>2 more<td>2123<td>2123"), Not(HasSubstr("<a href=61>"))));
 }
 
 TEST(PageOfABoard, HasTheRowsInTheirPlaces) {
   const std::string page = BodyOf(SmallGame(), "/en/g/1/");
-  const std::size_t blue = page.find("<tr><td>1<td><b class=t2>B</b><td><a href=\"40\"><bdi>Mole</bdi></a>");
-  const std::size_t red = page.find("<tr><td>2<td><b class=t1>R</b><td><a href=\"1\">Red 0</a>");
+  const std::size_t blue = page.find("<tr><td>1<td><b class=t2>B</b> <a href=\"40\"><bdi>Mole</bdi></a>");
+  const std::size_t red = page.find("<tr><td>2<td><b class=t1>R</b> <a href=\"1\">Red 0</a>");
   EXPECT_NE(blue, std::string::npos);
   EXPECT_NE(red, std::string::npos);
   EXPECT_LT(blue, red);
@@ -173,6 +175,63 @@ TEST(AllPages, AreForAPhoneHeldUprightInTheLight) {
   EXPECT_THAT(BodyOf(FixedPages(), "/style.css"), HasSubstr("prefers-color-scheme:dark"));
 }
 
+/// How wide a caption is in letters of its size, in bold ones of a wide face.
+double WidthOf(const std::string& caption) {
+  double width = 0;
+  for (std::size_t at = 0; at < caption.size(); at += Utf8::LengthOfCharacter(caption.substr(at))) {
+    width += Utf8::LengthOfCharacter(caption.substr(at)) > 1 ? 1.0 : 0.65;
+  }
+  return width;
+}
+
+/// The figure behind `name` in the style, from the rules for narrow screens on.
+double OnNarrowScreens(const std::string& name) {
+  const std::string style = BodyOf(FixedPages(), "/style.css");
+  const std::size_t narrow = style.find("@media(max-width:25rem)");
+  const std::size_t at = style.find(name, narrow);
+  EXPECT_NE(at, std::string::npos) << name;
+  return at != std::string::npos ? std::stod(style.substr(at + name.size())) : 1000;
+}
+
+TEST(AllPages, LeaveNamesTheirWidthOnAScreenOf360Points) {
+  constexpr double screen = 360.0 / 16;  // in rem
+  constexpr double name = 7;
+  EXPECT_THAT(BodyOf(FixedPages(), "/style.css"), HasSubstr(".who{width:99%;min-width:7rem}"));
+  for (const Language language : {Language::English, Language::SimplifiedChinese}) {
+    const StringTable texts(language);
+    const std::vector<std::string> board{texts.Text(103), texts.Text(105), texts.Text(106), texts.Text(110)};
+    const std::vector<std::string> ranking{texts.Text(103), texts.Text(OwnText::GamesPlayed), texts.Text(105),
+                                           texts.Text(OwnText::BestGame)};
+    for (const std::vector<std::string>& captions : {board, ranking}) {
+      double width = 2 * OnNarrowScreens("padding:0 ") + name + 2 * OnNarrowScreens("td,th{padding:.4rem ");
+      for (const std::string& caption : captions) {
+        width +=
+            WidthOf(caption) * OnNarrowScreens("th{font-size:") + 2 * OnNarrowScreens("td,th{padding:.4rem ");
+      }
+      EXPECT_LE(width, screen) << captions[1];
+    }
+  }
+}
+
+TEST(AllPages, HaveACaptionOverEachColumnAndOneHeadline) {
+  const PublicGame game = SmallGame();
+  std::vector<Page> pages = GamePages(game, Language::English);
+  pages.push_back(FrontPage(&game, "1", Language::English));
+  pages.push_back(GamesPage({&game}, Language::English));
+  pages.push_back(MissingPage(Language::English));
+  for (const Page& page : pages) {
+    EXPECT_THAT(page.Body, AllOf(Not(HasSubstr("<th><")), Not(HasSubstr("<th>")))) << page.Path;
+    const std::size_t headline = page.Body.find("<h1>");
+    EXPECT_NE(headline, std::string::npos) << page.Path;
+    EXPECT_EQ(page.Body.find("<h1>", headline + 1), std::string::npos) << page.Path;
+  }
+}
+
+TEST(PageOfAGun, TellsTheGunBesideTheName) {
+  EXPECT_THAT(BodyOf(SmallGame(), "/en/g/1/40"), HasSubstr("<bdi>Mole</bdi></h1><p class=lead>Blue 7</p>"));
+  EXPECT_THAT(BodyOf(SmallGame(), "/en/g/1/1"), Not(HasSubstr("<p class=lead>Red 0</p>")));
+}
+
 TEST(FrontOfThePages, SaysThatThereIsNoGameYet) {
   EXPECT_THAT(FrontPage(nullptr, "1", Language::English).Body, HasSubstr("No game has been scored yet."));
   EXPECT_THAT(FrontPage(nullptr, "1", Language::SimplifiedChinese).Body, HasSubstr("还没有比赛成绩"));
@@ -183,7 +242,8 @@ TEST(FrontOfThePages, CarriesTheTokenThatItsScriptAsksFor) {
   const std::string token = TokenPage(&game).Body;
   EXPECT_THAT(FrontPage(&game, token, Language::English).Body, HasSubstr("data-now=\"" + token + "\""));
   EXPECT_THAT(BodyOf(game, "/en/g/1/"), AllOf(Not(HasSubstr("data-now")), HasSubstr("id=\"new\"")));
-  EXPECT_THAT(BodyOf(FixedPages(), "/follow.js"), AllOf(HasSubstr("fetch(\"/now\")"), HasSubstr("3000")));
+  EXPECT_THAT(BodyOf(FixedPages(), "/follow.js"),
+              AllOf(HasSubstr("fetch(\"/now\","), HasSubstr("3000"), HasSubstr("AbortController")));
 }
 
 TEST(TokenOfTheNewestBoard, ChangesWithTheBoardAlone) {

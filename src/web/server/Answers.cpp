@@ -17,7 +17,6 @@ constexpr AnswerHeader CommonHeaders[] = {
     {"X-Content-Type-Options", "nosniff"},
     {"X-Frame-Options", "DENY"},
     {"Referrer-Policy", "no-referrer"},
-    {"Cross-Origin-Opener-Policy", "same-origin"},
     {"Cross-Origin-Resource-Policy", "same-origin"},
     {"Cache-Control", "no-cache"},
 };
@@ -58,16 +57,21 @@ Answer PlainText(std::string_view text) {
   return WithHeaders(std::move(answer));
 }
 
-/// True if `tag` is one of the tags in `known`; a browser marks those that it compares loosely by "W/".
+/// True if `tag` is one of the tags in `known`, or that stands for any; a browser marks those that it
+/// compares loosely by "W/".
 bool IsKnown(std::string_view known, std::string_view tag) {
-  return known.find(tag) != std::string_view::npos;
+  return known == "*" || known.find(tag) != std::string_view::npos;
 }
+
+/// What every browser asks for by itself, and has no need of.
+constexpr std::string_view IconPath = "/favicon.ico";
 
 }  // namespace
 
 Answers::Answers(const ServedPages& pages)
     : pages_(pages),
       nothing_(PlainText("Not found\n")),
+      noIcon_(WithHeaders(Answer(MHD_create_response_from_buffer(0, nullptr, MHD_RESPMEM_PERSISTENT)))),
       otherHost_(PlainText("These pages have another address\n")),
       otherMethod_(PlainText("Pages can only be read\n")) {
   MHD_add_response_header(otherMethod_.get(), MHD_HTTP_HEADER_ALLOW, "GET, HEAD");
@@ -75,6 +79,9 @@ Answers::Answers(const ServedPages& pages)
 
 Answers::Choice Answers::For(std::string_view path, std::string_view known) {
   auto made = made_.find(path);
+  if (path == IconPath) {
+    return {MHD_HTTP_NO_CONTENT, noIcon_.get()};
+  }
   const bool missing = made == made_.end() && pages_.Find(path) == nullptr;
   const std::string_view shown = missing ? "/missing" : path;
   if (missing) {

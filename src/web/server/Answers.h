@@ -47,6 +47,7 @@ class Answers {
   const ServedPages& pages_;
   std::map<std::string, Made, std::less<>> made_;
   Answer nothing_;
+  Answer noIcon_;
   Answer otherHost_;
   Answer otherMethod_;
 };

@@ -110,6 +110,11 @@ void ReadTimeZone() {
 
 }  // namespace
 
+std::size_t MostHandles() {
+  rlimit limit{};
+  return getrlimit(RLIMIT_NOFILE, &limit) == 0 ? limit.rlim_max : 0;
+}
+
 bool Confine(std::size_t handles) {
   ReadTimeZone();
   return LimitResources(handles) && DropRights() && (Watched || FilterCalls());

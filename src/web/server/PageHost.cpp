@@ -6,11 +6,14 @@
 
 #include <algorithm>
 #include <cstring>
-#include <list>
+#include <memory>
 #include <string>
+#include <string_view>
+#include <utility>
 #include <vector>
 
 #include "web/server/Answers.h"
+#include "web/server/OpenConnections.h"
 
 namespace {
 
@@ -50,22 +53,42 @@ bool SameHost(std::string_view host, const std::string& ours) {
   return host.size() == ours.size() && strncasecmp(host.data(), ours.data(), ours.size()) == 0;
 }
 
-struct OpenConnection {
-  int Handle;
-  Visitors::Time Since;  ///< end of its last answer
+/// The path of a request, and whether its first line names a host that is ours or none.
+struct RequestTarget {
+  std::string_view Path;
+  bool IsOurs = true;
 };
+
+RequestTarget TargetOf(std::string_view url, const std::vector<std::string>& hosts) {
+  constexpr std::string_view scheme = "http://";
+  if (strncasecmp(url.data(), scheme.data(), scheme.size()) != 0) {
+    return {.Path = url};
+  }
+  url.remove_prefix(scheme.size());
+  const std::size_t end = std::min(url.find('/'), url.size());
+  const std::string_view host = url.substr(0, end);
+  return {
+      .Path = end < url.size() ? url.substr(end) : "/",
+      .IsOurs = std::ranges::any_of(hosts, [host](const std::string& ours) { return SameHost(host, ours); })};
+}
 
 }  // namespace
 
 class PageHost::Daemon {
  public:
   Daemon(const ListenSocket& socket, const ServedPages& pages, Visitors& visitors, const Limits& limits)
-      : answers_(pages), visitors_(visitors), hosts_(HostsOf(socket.Served)), limits_(limits) {
+      : answers_(pages),
+        visitors_(visitors),
+        hosts_(HostsOf(socket.Served)),
+        connections_({.InAll = limits.Connections - Spare,
+                      .OfAddress = limits.OfAddress,
+                      .First = limits.First,
+                      .Request = limits.Request}) {
     daemon_ = MHD_start_daemon(MHD_USE_EPOLL | MHD_USE_TURBO, 0, &AcceptPrivate, nullptr, &Daemon::Asked,
                                this, MHD_OPTION_LISTEN_SOCKET, socket.Handle, MHD_OPTION_CONNECTION_LIMIT,
-                               limits.Connections, MHD_OPTION_PER_IP_CONNECTION_LIMIT, limits.OfAddress,
-                               MHD_OPTION_CONNECTION_MEMORY_LIMIT, limits.Head, MHD_OPTION_CONNECTION_TIMEOUT,
-                               static_cast<unsigned>(limits.Request.count()), MHD_OPTION_STRICT_FOR_CLIENT, 1,
+                               limits.Connections, MHD_OPTION_PER_IP_CONNECTION_LIMIT,
+                               limits.OfAddress + Spare, MHD_OPTION_CONNECTION_MEMORY_LIMIT, limits.Head,
+                               MHD_OPTION_CONNECTION_TIMEOUT, static_cast<unsigned>(limits.Request.count()),
                                MHD_OPTION_SIGPIPE_HANDLED_BY_APP, 1, MHD_OPTION_UNESCAPE_CALLBACK,
                                &KeepEscapes, nullptr, MHD_OPTION_NOTIFY_CONNECTION, &Daemon::Connected, this,
                                MHD_OPTION_NOTIFY_COMPLETED, &Daemon::Answered, this, MHD_OPTION_END);
@@ -79,24 +102,19 @@ class PageHost::Daemon {
   Daemon& operator=(const Daemon&) = delete;
 
   MHD_Daemon* Library() const { return daemon_; }
-  std::size_t Connections() const { return open_.size(); }
+  std::size_t Open() const { return connections_.Count(); }
   void Forget() { answers_.Forget(); }
 
-  void EndSlowOnes(Visitors::Time now) {
-    for (const OpenConnection& connection : open_) {
-      if (now - connection.Since >= limits_.Request) {
-        shutdown(connection.Handle, SHUT_RDWR);
-      }
-    }
-  }
+  void EndSlowOnes(Visitors::Time now) { connections_.EndSlowOnes(now); }
 
  private:
-  using Place = std::list<OpenConnection>::iterator;
+  using Place = OpenConnections::Place;
 
   static MHD_Result Asked(void* cls, MHD_Connection* connection, const char* url, const char* method,
                           const char* /*version*/, const char* /*upload*/, std::size_t* /*uploadSize*/,
                           void** request) {
     RequestHead head;
+    HasAsked(connection);
     MHD_get_connection_values(connection, MHD_HEADER_KIND, &ReadHead, &head);
     const std::string_view asked = method;
     head.IsTrial = asked == MHD_HTTP_METHOD_HEAD;
@@ -111,7 +129,7 @@ class PageHost::Daemon {
     return MHD_queue_response(connection, choice.Status, choice.What);
   }
 
-  Answers::Choice Choose(MHD_Connection* connection, std::string_view path, bool reads,
+  Answers::Choice Choose(MHD_Connection* connection, std::string_view url, bool reads,
                          const RequestHead& head) {
     const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
     if (!head.IsTrial) {
@@ -120,24 +138,30 @@ class PageHost::Daemon {
     const bool ours = head.Hosts == 1 && std::ranges::any_of(hosts_, [&head](const std::string& host) {
                         return SameHost(head.Host, host);
                       });
-    if (!ours) {
+    const RequestTarget target = TargetOf(url, hosts_);
+    if (!ours || !target.IsOurs) {
       return answers_.ForOtherHost();
     }
-    return reads ? answers_.For(path, head.Known) : answers_.ForOtherMethod();
+    return reads ? answers_.For(target.Path, head.Known) : answers_.ForOtherMethod();
   }
 
   static void Connected(void* cls, MHD_Connection* connection, void** context,
                         MHD_ConnectionNotificationCode what) {
-    auto& open = static_cast<Daemon*>(cls)->open_;
+    auto& daemon = *static_cast<Daemon*>(cls);
     if (what == MHD_CONNECTION_NOTIFY_STARTED) {
-      const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD);
-      open.push_front({.Handle = info->connect_fd, .Since = std::chrono::steady_clock::now()});
-      *context = new Place(open.begin());
+      *context = new Place(daemon.Add(connection));
     } else {
       const std::unique_ptr<Place> place(static_cast<Place*>(*context));
-      open.erase(*place);
+      daemon.connections_.Remove(*place);
       *context = nullptr;
     }
+  }
+
+  Place Add(MHD_Connection* connection) {
+    const int handle = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD)->connect_fd;
+    const std::string address =
+        AddressKey(*MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS)->client_addr);
+    return connections_.Add(handle, address, std::chrono::steady_clock::now());
   }
 
   static void Answered(void* /*cls*/, MHD_Connection* connection, void** /*request*/,
@@ -148,11 +172,17 @@ class PageHost::Daemon {
     }
   }
 
+  static void HasAsked(MHD_Connection* connection) {
+    const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
+    if (info->socket_context != nullptr) {
+      (*static_cast<Place*>(info->socket_context))->HasAsked = true;
+    }
+  }
+
   Answers answers_;
   Visitors& visitors_;
   std::vector<std::string> hosts_;
-  Limits limits_;
-  std::list<OpenConnection> open_;
+  OpenConnections connections_;
   MHD_Daemon* daemon_ = nullptr;
 };
 
@@ -185,7 +215,7 @@ void PageHost::EndSlowOnes(Visitors::Time now) {
 }
 
 std::size_t PageHost::Connections() const {
-  return daemon_->Connections();
+  return daemon_->Open();
 }
 
 void PageHost::Forget() {

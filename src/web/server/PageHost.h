@@ -14,11 +14,16 @@
 class PageHost {
  public:
   struct Limits {
-    unsigned Connections = 1024;
+    unsigned Connections = 1024;       ///< more than Spare
     unsigned OfAddress = 512;          ///< phones behind one access point may share an address
     std::size_t Head = 6UL * 1024;     ///< bytes for the head of a request and that of its answer
+    std::chrono::seconds First{10};    ///< until the head of the first request is there
     std::chrono::seconds Request{30};  ///< from the end of one answer to the end of the next
   };
+
+  /// When all connections but these are taken, or all of an address, whoever comes takes the place of the
+  /// connection that has waited longest: of its own address, or of the one that has most.
+  static constexpr unsigned Spare = 32;
 
   /// Takes `socket` over. All others must outlive this.
   PageHost(const ListenSocket& socket, const ServedPages& pages, Visitors& visitors)

@@ -1,5 +1,6 @@
 #include <unistd.h>
 
+#include <algorithm>
 #include <charconv>
 #include <csignal>
 #include <cstdint>
@@ -21,6 +22,9 @@ std::optional<std::uint16_t> PortIn(std::string_view word) {
   return whole && port > 0 ? std::optional(port) : std::nullopt;
 }
 
+/// Fewer are not enough for the phones of a game.
+constexpr std::size_t LeastHandles = 128;
+
 ServerEnd Serve(const ServedAddress& wanted) {
   const ListenSocket socket = Listen(wanted);
   if (socket.Handle < 0) {
@@ -28,12 +32,18 @@ ServerEnd Serve(const ServedAddress& wanted) {
   }
   ServedPages pages;
   Visitors visitors;
-  PageHost host(socket, pages, visitors);
+  constexpr std::size_t ownHandles = 32;
+  PageHost::Limits limits;
+  const std::size_t handles = std::min(limits.Connections + ownHandles, MostHandles());
+  if (handles < LeastHandles) {
+    return ServerEnd::NotConfined;
+  }
+  limits.Connections = static_cast<unsigned>(handles - ownHandles);
+  PageHost host(socket, pages, visitors, limits);
   if (!host.Serving()) {
     return ServerEnd::NoAddress;
   }
-  constexpr std::size_t ownHandles = 32;
-  if (!Confine(PageHost::Limits().Connections + ownHandles)) {
+  if (!Confine(handles)) {
     return ServerEnd::NotConfined;
   }
   ServerLoop loop(STDIN_FILENO, STDOUT_FILENO, host, pages, visitors);

@@ -1,5 +1,6 @@
 #include "web/server/ServedPages.h"
 
+#include <cstring>
 #include <utility>
 
 #include "web/PageHash.h"
@@ -14,6 +15,12 @@ const char* TypeOf(std::string_view path) {
     return "text/javascript; charset=utf-8";
   }
   return path == "/now" ? "text/plain; charset=utf-8" : "text/html; charset=utf-8";
+}
+
+/// A name that is no longer shown shall not stay in memory.
+void WipeAndDelete(ServedPage* page) {
+  explicit_bzero(page->Body.data(), page->Body.size());
+  delete page;
 }
 
 }  // namespace
@@ -49,8 +56,10 @@ bool ServedPages::Show() {
       tag += PageHash(frame.Body);
       tag += '"';
       bytes += frame.Body.size();
-      pages.emplace(frame.Path, std::make_shared<const ServedPage>(ServedPage{
-                                    .Body = std::move(frame.Body), .Tag = tag, .Type = TypeOf(frame.Path)}));
+      pages.emplace(frame.Path,
+                    std::shared_ptr<const ServedPage>(
+                        new ServedPage{.Body = std::move(frame.Body), .Tag = tag, .Type = TypeOf(frame.Path)},
+                        WipeAndDelete));
     }
   }
   waiting_ = {};

@@ -8,6 +8,7 @@
 #include <algorithm>
 #include <array>
 #include <cerrno>
+#include <cstring>
 
 ServerLoop::ServerLoop(int input, int output, PageHost& host, ServedPages& pages, Visitors& visitors)
     : input_(input), output_(output), host_(host), pages_(pages), visitors_(visitors) {
@@ -45,6 +46,7 @@ std::optional<ServerEnd> ServerLoop::TakeOrders() {
     return ServerEnd::ParentGone;
   }
   orders_.Add({bytes.data(), static_cast<std::size_t>(count)});
+  explicit_bzero(bytes.data(), static_cast<std::size_t>(count));
   while (auto frame = orders_.Next()) {
     const bool show = frame->Order == PageOrder::Show;
     if (!pages_.Take(std::move(*frame))) {

@@ -85,21 +85,42 @@ TEST_F(CrowdedServer, EndsTheConnectionOfAGetWithABody) {
   EXPECT_TRUE(client.IsClosed());
 }
 
-TEST_F(CrowdedServer, RefusesMoreThanFiveHundredOfOneAddressAndServesAgainAfterThem) {
+TEST_F(CrowdedServer, EndsTheConnectionsThatWaitedLongestWhenAnAddressHasFiveHundred) {
   AllowHandles(2000);
   std::vector<std::unique_ptr<RawClient>> many;
   for (int i = 0; i < 1000; ++i) {
     many.push_back(std::make_unique<RawClient>(program.Port));
   }
-  EXPECT_TRUE(many[999]->IsClosed());
-  ASSERT_TRUE(many[0]->Send("GET / HTTP/1.1\r\n" + program.Host() + "\r\n"));
-  EXPECT_THAT(many[0]->ReadAnswer(), StartsWith(Found));
-  many.clear();
-  std::string answer;
-  for (int tries = 0; tries < 1000 && !answer.starts_with(Found); ++tries) {
-    answer = program.Get("/");  // until it has noticed that they went
+  EXPECT_THAT(program.Get("/"), StartsWith(Found));
+  EXPECT_TRUE(many[0]->IsClosed());
+  EXPECT_TRUE(many[400]->IsClosed());
+  ASSERT_TRUE(many[999]->Send("GET / HTTP/1.1\r\n" + program.Host() + "\r\n"));
+  EXPECT_THAT(many[999]->ReadAnswer(), StartsWith(Found));
+}
+
+TEST_F(CrowdedServer, AnswersWhileTwoAddressesHoldAllConnections) {
+  AllowHandles(2000);
+  std::vector<std::unique_ptr<RawClient>> many;
+  for (int i = 0; i < 1100; ++i) {
+    many.push_back(std::make_unique<RawClient>(program.Port, i % 2 == 0 ? "127.0.0.2" : "127.0.0.3"));
+    many.back()->Send("GET / HTTP/1.1\r\nHost: 127.");
   }
-  EXPECT_THAT(answer, StartsWith(Found));
+  EXPECT_THAT(program.Get("/"), StartsWith(Found));
+}
+
+TEST(ServerWithFewHandles, ServesWithAsManyConnectionsAsItMayHave) {
+  ResultsProgram program(18'350, "127.0.0.1", 400);
+  ASSERT_GT(program.Port, 0);
+  EXPECT_THAT(program.About("limits"), testing::ContainsRegex("Max open files +400 +400"));
+  program.Put("/", "<p>front</p>");
+  program.Settle();
+  EXPECT_THAT(program.Get("/"), StartsWith(Found));
+}
+
+TEST(ServerWithFewHandles, EndsWhereTheyAreTooFew) {
+  ResultsProgram program(18'360, "127.0.0.1", 100);
+  EXPECT_EQ(program.Port, 0);
+  EXPECT_EQ(program.WaitForEnd(), 4);
 }
 
 /// The part that answers, run by the test step by step.
@@ -136,9 +157,27 @@ TEST_F(OwnHost, EndsAConnectionWhoseRequestTakesTooLong) {
   host->EndSlowOnes(now);
   host->Run();
   EXPECT_EQ(host->Connections(), 1U);
-  host->EndSlowOnes(now + PageHost::Limits().Request);
+  host->EndSlowOnes(now + PageHost::Limits().First);
   RunUntil(0);
   EXPECT_TRUE(slow.IsClosed());
+}
+
+TEST_F(OwnHost, LeavesAConnectionThatWasAnsweredMoreTime) {
+  RawClient phone(socket.Served.Port);
+  const std::string host_ = "127.0.0.1:" + std::to_string(socket.Served.Port);
+  phone.Send("GET / HTTP/1.1\r\nHost: " + host_ + "\r\n\r\n");
+  RunUntil(1);
+  for (int tries = 0; tries < 100 && !visitors.Any(); ++tries) {
+    pollfd wait{.fd = host->Handle(), .events = POLLIN, .revents = 0};
+    poll(&wait, 1, 100);
+    host->Run();
+  }
+  const auto now = std::chrono::steady_clock::now();
+  host->EndSlowOnes(now + PageHost::Limits().First);
+  host->Run();
+  EXPECT_EQ(host->Connections(), 1U);
+  host->EndSlowOnes(now + PageHost::Limits().Request);
+  RunUntil(0);
 }
 
 TEST_F(OwnHost, WaitsForNothingWithoutConnections) {

@@ -68,4 +68,36 @@ TEST_F(MembersData, IsNotInTheMemoryOfTheProgramThatServesThePages) {
   }
 }
 
+TEST_F(MembersData, LeavesTheMemoryOfThatProgramWhenTheNameIsHidden) {
+  ResultsProgram program(18'500);
+  ResultsPages pages = PagesWith(true);
+  const auto send = [&program](const std::vector<PageFrame>& frames) {
+    for (const PageFrame& frame : frames) {
+      program.Write(EncodeFrame(frame));
+    }
+    program.Settle();
+  };
+  send(pages.TakeAll());
+  ASSERT_THAT(program.Get("/"), HasSubstr("Molefinger"));
+  pages.Put(PublicGameOf(scored.game, 1, "20:15", {}), std::chrono::hours(0));
+  send(pages.TakeChanges());
+  ASSERT_THAT(program.Get("/"), Not(HasSubstr("Molefinger")));
+  EXPECT_FALSE(ProcessMemory(program.Process()).Holds("Molefinger"));
+}
+
+TEST_F(MembersData, LeavesTheMemoryOfThatProgramWithItsGame) {
+  ResultsProgram program(18'500);
+  ResultsPages pages = PagesWith(true);
+  for (const PageFrame& frame : pages.TakeAll()) {
+    program.Write(EncodeFrame(frame));
+  }
+  pages.Prune(std::chrono::hours(24));
+  for (const PageFrame& frame : pages.TakeChanges()) {
+    program.Write(EncodeFrame(frame));
+  }
+  program.Settle();
+  ASSERT_THAT(program.Get("/en/g/1/"), testing::StartsWith("HTTP/1.1 404 "));
+  EXPECT_FALSE(ProcessMemory(program.Process()).Holds("Molefinger"));
+}
+
 }  // namespace

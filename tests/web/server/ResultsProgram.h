@@ -15,6 +15,7 @@
 #include <optional>
 #include <string>
 #include <utility>
+#include <vector>
 
 #include "platform/linux/ChildProcess.h"
 #include "web/PageStream.h"
@@ -25,7 +26,13 @@ inline constexpr int WireLimit = 20'000;
 /// A connection to a port of this computer.
 class RawClient {
  public:
-  explicit RawClient(std::uint16_t port) : socket_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
+  /// `from` is the own address, one of this computer.
+  explicit RawClient(std::uint16_t port, const char* from = "127.0.0.1")
+      : socket_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
+    sockaddr_in own{};
+    own.sin_family = AF_INET;
+    inet_pton(AF_INET, from, &own.sin_addr);
+    bind(socket_.Number(), reinterpret_cast<sockaddr*>(&own), sizeof own);
     sockaddr_in address{};
     address.sin_family = AF_INET;
     address.sin_port = htons(port);
@@ -102,14 +109,20 @@ class RawClient {
 /// The program that serves pages, started as Tessarine starts it.
 class ResultsProgram {
  public:
-  explicit ResultsProgram(std::uint16_t port = 18'100, const std::string& address = "127.0.0.1") {
+  /// `handles` is the most that the system lets it have; 0 for as many as this program.
+  explicit ResultsProgram(std::uint16_t port = 18'100, const std::string& address = "127.0.0.1",
+                          int handles = 0) {
     Pipe orders;
     Pipe reports;
     StandardStreams streams;
     streams.Input = orders.ReadEnd.Number();
     streams.Output = reports.WriteEnd.Number();
-    process_ =
-        StartProcess({TESSARINE_RESULTS_PROGRAM, address, std::to_string(port)}, streams, ProcessKind::Child);
+    std::vector<std::string> words{TESSARINE_RESULTS_PROGRAM, address, std::to_string(port)};
+    if (handles > 0) {
+      const std::string limit = "ulimit -n " + std::to_string(handles) + R"(; exec "$0" "$@")";
+      words.insert(words.begin(), {"/bin/sh", "-c", limit});
+    }
+    process_ = StartProcess(words, streams, ProcessKind::Child);
     reports.WriteEnd.Close();  // or the end of the program would not end the stream
     input_ = std::move(orders.WriteEnd);
     output_ = std::move(reports.ReadEnd);

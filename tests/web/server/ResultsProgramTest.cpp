@@ -66,6 +66,8 @@ TEST_F(ResultsServer, DoesNotSendAPageThatTheBrowserHas) {
     return program.Ask("GET / HTTP/1.1", program.Host() + "If-None-Match: " + tag + "\r\n");
   };
   EXPECT_THAT(again(), AllOf(StartsWith("HTTP/1.1 304 "), Not(HasSubstr("front"))));
+  EXPECT_THAT(program.Ask("GET / HTTP/1.1", program.Host() + "If-None-Match: *\r\n"),
+              StartsWith("HTTP/1.1 304 "));
   program.Put("/", "<p>new</p>");
   program.Settle();
   EXPECT_THAT(again(), AllOf(StartsWith("HTTP/1.1 200 "), EndsWith("<p>new</p>")));
@@ -79,10 +81,11 @@ TEST_F(ResultsServer, ReplacesAndRemovesPages) {
   EXPECT_THAT(program.Get("/en/g/1/40"), StartsWith("HTTP/1.1 404 "));
 }
 
-TEST_F(ResultsServer, SendsTheUsualHeadersWithEveryAnswer) {
+TEST_F(ResultsServer, SendsTheUsualHeadersWithEveryAnswerToAWholeRequest) {
   for (const std::string& answer :
        {program.Get("/"), program.Get("/none"), program.Ask("GET / HTTP/1.1", "Host: other\r\n"),
-        program.Ask("POST / HTTP/1.1", program.Host() + "Content-Length: 0\r\n")}) {
+        program.Ask("POST / HTTP/1.1", program.Host() + "Content-Length: 0\r\n"),
+        program.Ask("GET / HTTP/1.1", ""), program.Get("/favicon.ico")}) {
     EXPECT_THAT(answer, AllOf(HasSubstr("Content-Security-Policy: default-src 'none'; "),
                               HasSubstr("X-Content-Type-Options: nosniff\r\n"),
                               HasSubstr("Referrer-Policy: no-referrer\r\n"),
@@ -95,7 +98,7 @@ TEST_F(ResultsServer, SendsTheUsualHeadersWithEveryAnswer) {
 TEST_F(ResultsServer, SaysThatAPageIsNotThere) {
   for (const char* path :
        {"/none", "/missing", "/en", "/../../etc/passwd", "/%2e%2e/%2e%2e/etc/passwd", "/%2F", "/%00", "//",
-        "/.", "http://other/", "*", "/\xC3\xA4", "/en/g/1/40/", "/etc/passwd", "/proc/self/environ"}) {
+        "/.", "https://other/", "*", "/\xC3\xA4", "/en/g/1/40/", "/etc/passwd", "/proc/self/environ"}) {
     EXPECT_THAT(program.Get(path), AllOf(StartsWith("HTTP/1.1 404 "), EndsWith("<p>gone</p>"))) << path;
   }
 }
@@ -114,8 +117,38 @@ TEST_F(ResultsServer, RefusesOtherHosts) {
     EXPECT_THAT(program.Ask("GET / HTTP/1.1", host), StartsWith("HTTP/1.1 421 ")) << host;
   }
   EXPECT_THAT(program.Ask("GET / HTTP/1.0", ""), StartsWith("HTTP/1.1 421 "));
-  EXPECT_THAT(program.Ask("GET / HTTP/1.1", ""), StartsWith("HTTP/1.1 400 "));
+  EXPECT_THAT(program.Ask("GET / HTTP/1.1", ""), StartsWith("HTTP/1.1 421 "));
+  for (const char* url :
+       {"http://other/", "http://127.0.0.1/", "http://127.0.0.1:1/", "http://", "http:///"}) {
+    EXPECT_THAT(program.Get(url), StartsWith("HTTP/1.1 421 ")) << url;
+  }
+  EXPECT_THAT(program.Ask("GET http://127.0.0.1:" + port + "/ HTTP/1.1", "Host: other\r\n"),
+              StartsWith("HTTP/1.1 421 "));
   EXPECT_THAT(program.Ask("GET / HTTP/1.1", "Host: LOCALHOST:" + port + "\r\n"), StartsWith("HTTP/1.1 200 "));
+}
+
+TEST_F(ResultsServer, TakesTheWholeAddressInPlaceOfThePath) {
+  const std::string url = "http://127.0.0.1:" + std::to_string(program.Port);
+  EXPECT_THAT(program.Get(url), EndsWith("\r\n\r\n<p>front</p>"));
+  EXPECT_THAT(program.Get(url + "/?from=poster"), EndsWith("\r\n\r\n<p>front</p>"));
+  EXPECT_THAT(program.Get("HTTP" + url.substr(4) + "/en/g/1/40"), EndsWith("\r\n\r\n<p>gun</p>"));
+}
+
+TEST_F(ResultsServer, HasNoIconAndSaysSoBriefly) {
+  EXPECT_THAT(program.Get("/favicon.ico"), AllOf(StartsWith("HTTP/1.1 204 "), EndsWith("\r\n\r\n")));
+}
+
+TEST_F(ResultsServer, RefusesRequestsThatCanBeReadInTwoWays) {
+  for (const std::string& headers :
+       {std::string("Content-Length: -1\r\n"), std::string("Content-Length: 99999999999999999999999\r\n"),
+        std::string("Content-Length: 5\r\nTransfer-Encoding: chunked\r\n"),
+        std::string("Content-Length: 5\r\nContent-Length: 6\r\n")}) {
+    RawClient client(program.Port);
+    client.Send("GET / HTTP/1.1\r\n" + program.Host() + headers + "\r\nGET /en/g/1/40 HTTP/1.1\r\n" +
+                program.Host() + "\r\n");
+    EXPECT_THAT(client.ReadAll(), Not(HasSubstr("<p>gun</p>"))) << headers;
+    EXPECT_TRUE(client.IsClosed());
+  }
 }
 
 TEST_F(ResultsServer, RefusesOtherMethods) {
