@@ -2,101 +2,17 @@
 
 #include <gmock/gmock.h>
 
-#include <QApplication>
 #include <QLabel>
-#include <QProgressBar>
 #include <QTableView>
 #include <fstream>
 
-#include "platform/qt/QtEventPump.h"
-#include "tests/archive/copies/CopySite.h"
-#include "tests/fakes/FakeFileDialog.h"
-#include "tests/fakes/FakeMessageBoxes.h"
-#include "tests/support/Controls.h"
+#include "tests/archive/copies/CopiesWindow.h"
 #include "tests/support/OrdinaryUser.h"
 
 namespace {
 
 using testing::ElementsAre;
 using testing::IsEmpty;
-
-constexpr const char* EarlyFile = "members-2013-05-01-200000.mdb";
-constexpr const char* LateFile = "members-2013-05-02-200000-kept.mdb";
-
-class BackupCopiesWindow : public testing::Test {
- protected:
-  BackupCopiesWindow() {
-    site.PutCopy(EarlyFile, CopySite::WithMembers("'Old'"));
-    site.PutCopy(LateFile, CopySite::WithMembers("'Ann', 'Bob', 'Cid', 'Dee'"));
-  }
-
-  void Make(Language language) {
-    strings.emplace(language);
-    std::vector<CopiedDatabase> databases = {site.Members};
-    databases.insert(databases.end(), more.begin(), more.end());
-    window = std::make_unique<BackupCopies>(BackupCopies::Parts{.Databases = std::move(databases),
-                                                                .Work = {.Engine = site.Databases,
-                                                                         .Disk = site.Disk,
-                                                                         .Time = site.Time,
-                                                                         .Strings = *strings,
-                                                                         .Folder = site.CopyFolder()},
-                                                                .Events = events,
-                                                                .Boxes = boxes,
-                                                                .FileDialog = dialog,
-                                                                .Busy = [this] { return busy; },
-                                                                .Reopen =
-                                                                    [this] {
-                                                                      site.Open();
-                                                                      ++reopened;
-                                                                    }},
-                                            nullptr);
-  }
-
-  void Open(Language language = Language::English) {
-    Make(language);
-    Show(*window);
-    WaitForCounts();
-  }
-
-  QTableView& Table() const { return Find<QTableView>(*window, "CopyTable"); }
-  QString Status() const { return Find<QLabel>(*window, "Status").text(); }
-  bool Enabled(const char* button) const { return Find<QPushButton>(*window, button).isEnabled(); }
-
-  int Uncounted() const {
-    int rows = 0;
-    for (int row = 0; row < Table().model()->rowCount(); ++row) {
-      rows += Cells(row)[CopyListModel::Rows] == "..." ? 1 : 0;
-    }
-    return rows;
-  }
-
-  void WaitForCounts() const {
-    ASSERT_TRUE(QTest::qWaitFor([this] { return Uncounted() == 0; }));
-  }
-
-  std::vector<std::string> Cells(int row) const {
-    std::vector<std::string> cells;
-    for (int column = 0; column < CopyListModel::Size; ++column) {
-      cells.push_back(Table().model()->index(row, column).data().toString().toStdString());
-    }
-    return cells;
-  }
-
-  static FakeMessageBoxes::Box InDataFolder(const std::string& file) {
-    return {file + " lies in the folder of the data in use, or is in use itself. Choose another folder.",
-            "Backup Copies", BoxIcon::Exclamation, BoxButtons::Ok};
-  }
-
-  CopySite site;
-  std::vector<CopiedDatabase> more;  ///< beside the members
-  std::optional<StringTable> strings;
-  FakeMessageBoxes boxes;
-  FakeFileDialog dialog;
-  QtEventPump events;
-  std::optional<OwnText> busy;
-  int reopened = 0;
-  std::unique_ptr<BackupCopies> window;
-};
 
 TEST_F(BackupCopiesWindow, ListsWhatIsInUseThenTheCopiesFromTheNewest) {
   Open();
@@ -383,67 +299,6 @@ TEST_F(BackupCopiesWindow, DoesNothingWhenTheFileDialogIsCancelled) {
   ::Press(*window, "CopyToFolder");
   EXPECT_THAT(boxes.Boxes, IsEmpty());
   EXPECT_EQ(Status(), QString());
-}
-
-/// With copies so large that an operation takes many steps.
-class LargeCopies : public BackupCopiesWindow {
- protected:
-  LargeCopies() {
-    OtherConnection(site.MembersFile()).Execute("UPDATE Members SET Photograph = zeroblob(40000000)");
-    Open();
-    boxes.Answers = {BoxAnswer::Ok};
-  }
-
-  /// Runs `act` as soon as progress is shown.
-  void DuringTheJob(std::function<void()> act) {
-    act_ = std::move(act);
-    QObject::connect(&timer_, &QTimer::timeout, &timer_, [this] {
-      if (Find<QProgressBar>(*window, "Progress").isVisible() && act_) {
-        std::exchange(act_, nullptr)();
-        ++acted;
-      }
-    });
-    timer_.start(0);
-  }
-
-  int acted = 0;
-
- private:
-  std::function<void()> act_;
-  QTimer timer_;
-};
-
-TEST_F(LargeCopies, ShowProgressAndCanBeStopped) {
-  DuringTheJob([this] {
-    EXPECT_FALSE(Enabled("Restore"));
-    EXPECT_FALSE(Enabled("CopyNow"));
-    ::Press(*window, "Stop");
-  });
-  ::Press(*window, "Restore");
-  EXPECT_EQ(acted, 1);
-  EXPECT_EQ(Status(), QStringLiteral("Stopped. Nothing was changed."));
-  EXPECT_EQ(site.Names(), "Ann Bob Cid");
-  EXPECT_EQ(site.Disk.FileNames(site.CopyFolder()).size(), 2U);
-  EXPECT_TRUE(Enabled("Restore"));
-  EXPECT_EQ(reopened, 0);
-}
-
-TEST_F(LargeCopies, EndWithTheWindowThatIsClosed) {
-  DuringTheJob([this] { window->close(); });
-  ::Press(*window, "Restore");
-  EXPECT_EQ(acted, 1);
-  EXPECT_FALSE(window->isVisible());
-  EXPECT_EQ(site.Names(), "Ann Bob Cid");
-}
-
-TEST_F(LargeCopies, LeaveEscapeWithoutEffectMeanwhile) {
-  DuringTheJob([this] { Type(*window, Qt::Key_Escape); });
-  ::Press(*window, "Restore");
-  EXPECT_EQ(acted, 1);
-  EXPECT_TRUE(window->isVisible());
-  EXPECT_EQ(reopened, 1);
-  Type(*window, Qt::Key_Escape);
-  EXPECT_FALSE(window->isVisible());
 }
 
 }  // namespace
