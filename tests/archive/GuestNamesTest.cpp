@@ -2,6 +2,7 @@
 
 #include "archive/ArchiveAccess.h"
 #include "archive/GuestRows.h"
+#include "tests/archive/Forgetting.h"
 #include "tests/archive/KeeperVenue.h"
 #include "tests/support/OrdinaryUser.h"
 
@@ -181,7 +182,7 @@ TEST_F(NamesOfGuests, GoWithAMemberWhoIsForgotten) {
   session.Game().Players(Red0).MemberIndex = 7;
   keeper->Keep();
   const std::unique_ptr<Database> file = venue.Databases.OpenDatabase(ArchivePath());
-  GameArchive(*file, session.DbMembers(), venue.Strings).Forget(7);
+  ForgetIn(*file, session.DbMembers(), venue.Strings, 7);
   EXPECT_EQ(Kept(), "40:Ben");
 }
 

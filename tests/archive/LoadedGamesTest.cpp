@@ -2,6 +2,7 @@
 
 #include <memory>
 
+#include "tests/archive/Forgetting.h"
 #include "tests/archive/KeeperVenue.h"
 
 namespace {
@@ -109,7 +110,7 @@ TEST_F(LoadedGame, IsTheSameThoughAMemberWasCutFromIt) {
   const std::string file = PullWithMember();
   ExecuteSql(venue.MembersFile(),
              "UPDATE Members SET DallasID = 'CD00000000000002', NickName = 'Owl', FirstName = 'Ann'");
-  keeper->CheckMembers();
+  CheckMembers();
   EXPECT_EQ(keeper->State().CutGames, 1);
   const std::string before = ReadFile(ArchivePath());
   Load(file);
@@ -121,7 +122,7 @@ TEST_F(LoadedGame, IsTheSameThoughAMemberWasForgotten) {
   const std::string file = PullWithMember();
   {
     const std::unique_ptr<Database> archive = venue.Databases.OpenDatabase(ArchivePath());
-    EXPECT_EQ(GameArchive(*archive, session.DbMembers(), venue.Strings).Forget(7), 1);
+    EXPECT_EQ(ForgetIn(*archive, session.DbMembers(), venue.Strings, 7), 1);
   }
   const std::string before = ReadFile(ArchivePath());
   Load(file);
@@ -178,7 +179,7 @@ TEST_F(LoadedGame, IsTheSameThoughAMemberWasCutFromItAndItsFactorsAreOthers) {
   const std::string file = PullWithMember();
   ExecuteSql(venue.MembersFile(),
              "UPDATE Members SET DallasID = 'CD00000000000002', NickName = 'Owl', FirstName = 'Ann'");
-  keeper->CheckMembers();
+  CheckMembers();
   ExecuteSql(ArchivePath(), "UPDATE Games SET RedTotal = 4711, BlueTotal = 4711");
   const std::string before = ReadFile(ArchivePath());
   Load(file);
@@ -193,7 +194,7 @@ TEST_F(LoadedGame, IsTheSameThoughAMemberWasCutFromAnEarlierStateOfIt) {
   session.ClearPlayerData();
   ExecuteSql(venue.MembersFile(),
              "UPDATE Members SET DallasID = 'CD00000000000002', NickName = 'Owl', FirstName = 'Ann'");
-  keeper->CheckMembers();
+  CheckMembers();
   const std::string before = ReadFile(ArchivePath());
   Load(file);
   ExpectKnown(before);

@@ -1,6 +1,8 @@
 #include <gmock/gmock.h>
 
+#include <functional>
 #include <memory>
+#include <vector>
 
 #include "archive/DeletedGames.h"
 #include "tests/archive/KeeperVenue.h"
@@ -209,13 +211,15 @@ TEST_F(Keeper, RemovesAndCutsNothingWhileTheDiskIsNarrow) {
   ExecuteSql(venue.MembersFile(), "UPDATE Members SET FirstName = 'Ann'");
   const std::string before = ReadFile(ArchivePath());
   disk.Space = LeastFreeSpace - 1;
-  for (const auto& act : {&GameKeeper::RemoveDeleted, &GameKeeper::NoteMembers, &GameKeeper::CheckMembers}) {
-    (*keeper.*act)();
+  const std::vector<std::function<void()>> writes = {
+      [this] { keeper->RemoveDeleted(); }, [this] { keeper->NoteMembers(); }, [this] { CheckMembers(); }};
+  for (const std::function<void()>& write : writes) {
+    write();
     EXPECT_EQ(ReadFile(ArchivePath()), before);
     EXPECT_THAT(keeper->State().Failure, testing::HasSubstr("32 MB"));
   }
   disk.Space = LeastFreeSpace;
-  keeper->CheckMembers();
+  CheckMembers();
   EXPECT_NE(ReadFile(ArchivePath()), before);
   keeper->RemoveDeleted();
   EXPECT_EQ(Games(), "0");

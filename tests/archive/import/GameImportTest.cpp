@@ -10,6 +10,7 @@
 #include "archive/GameKeeper.h"
 #include "platform/linux/LinuxFiles.h"
 #include "tests/archive/ArchiveVenue.h"
+#include "tests/archive/Forgetting.h"
 #include "tests/fakes/FakeClock.h"
 #include "tests/support/OrdinaryUser.h"
 #include "tests/support/Thrown.h"
@@ -162,7 +163,7 @@ TEST_F(Importing, KnowsAGameFromWhoseEarlierStateAMemberWasCut) {
   const std::int64_t game = venue.Archive->Keep(venue.State());
   venue.Game.Players(ArchiveVenue::Red0).DeathCount += 1;
   venue.Archive->KeepAgain(game, venue.State(), FormerState::KeptToo);
-  EXPECT_EQ(venue.Archive->Forget(6), 1);
+  EXPECT_EQ(ForgetIn(*venue.ArchiveDatabase, *venue.MembersDatabase, venue.Strings, 6), 1);
   EXPECT_EQ(Run(), "0, 1, 0");
 }
 
