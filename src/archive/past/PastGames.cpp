@@ -93,11 +93,15 @@ void PastGames::SetUpSearch() {
 }
 
 void PastGames::FillMissions() {
-  if (ui_->SearchMission->count() > 1) {
-    return;
-  }
+  // Those that are listed stay: one of them may be chosen.
+  int place = 1;
   for (const std::string& mission : parts_.Archive.Queries().Missions()) {
-    ui_->SearchMission->addItem(QString::fromStdString(mission), QString::fromStdString(mission));
+    const QString name = QString::fromStdString(mission);
+    const int listed = ui_->SearchMission->findData(name);
+    if (listed < 0) {
+      ui_->SearchMission->insertItem(place, name, name);
+    }
+    place = (listed < 0 ? place : listed) + 1;
   }
 }
 

@@ -146,6 +146,25 @@ TEST_F(WindowOfPastGames, LooksAnewAfterAnImport) {
   EXPECT_FALSE(Get<QPushButton>("Import").isVisible());
 }
 
+TEST_F(WindowOfPastGames, FindsMissionsThatAnImportBrought) {
+  KeepFour();
+  Open();
+  auto& missions = Get<QComboBox>("SearchMission");
+  missions.setCurrentIndex(missions.findText(QStringLiteral("None")));
+  Keep("2026-11-23 20:00:00", "Hill", 500);
+  Keep("2026-11-23 21:00:00", "Tower", 600);
+  Press("Import");
+  std::vector<std::string> offered;
+  for (int entry = 1; entry < missions.count(); ++entry) {
+    offered.push_back(missions.itemText(entry).toStdString());
+  }
+  EXPECT_THAT(offered, ElementsAre("Flag", "Hill", "None", "Tower"));
+  EXPECT_EQ(missions.currentText(), QStringLiteral("None"));
+  missions.setCurrentIndex(missions.findText(QStringLiteral("Hill")));
+  Press("Search");
+  EXPECT_THAT(Listed(), ElementsAre("500"));
+}
+
 TEST_F(WindowOfPastGames, DeletesAGameAfterAQuestion) {
   KeepFour();
   Open();
