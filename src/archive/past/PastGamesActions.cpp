@@ -144,7 +144,11 @@ void PastGames::Copy(const QAbstractItemView& list) {
   RunInSteps(static_cast<std::size_t>(rows), [&](const Step& goOn) { copied = CopyRowsInSteps(list, goOn); });
   if (!copied) {
     Tell(parts_.Strings.Text(OwnText::PastCopyStopped));
+    return;
   }
+  const QItemSelectionModel& chosen = *list.selectionModel();
+  const auto count = chosen.hasSelection() ? chosen.selectedRows().size() : rows;
+  Tell(Filled(parts_.Strings.Text(OwnText::PastCopied), {std::to_string(count)}));
 }
 
 void PastGames::RunInSteps(std::size_t rows, const std::function<void(const Step& goOn)>& act) {

@@ -290,6 +290,7 @@ class ManyPastGames : public WindowOfPastGames {
 TEST_F(ManyPastGames, AreCopiedWithProgress) {
   Type(*window, Qt::Key_C, Qt::ControlModifier);
   EXPECT_EQ(QGuiApplication::clipboard()->text().count(u'\n'), Many + 1);
+  EXPECT_EQ(Status(), "Rows copied: 20000");
   ExpectReady();
 }
 

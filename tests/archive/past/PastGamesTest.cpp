@@ -171,10 +171,12 @@ TEST_F(WindowOfPastGames, CopiesItsListsAsText) {
   const QString text = QApplication::clipboard()->text();
   EXPECT_TRUE(text.startsWith(QStringLiteral("Time\tMission\tPlayers\tRed\t")));
   EXPECT_TRUE(text.contains(QStringLiteral("Mole, 400")));
+  EXPECT_EQ(Status(), "Rows copied: 1");
   auto& board = Get<QTableView>("BoardTable");
   board.setFocus();
   QTest::keyClick(&board, Qt::Key_C, Qt::ControlModifier);
   EXPECT_TRUE(QApplication::clipboard()->text().contains(QStringLiteral("Blue  7: Mole\t 400")));
+  EXPECT_EQ(Status(), "Rows copied: 2");
 }
 
 TEST_F(WindowOfPastGames, ClosesByEscape) {
