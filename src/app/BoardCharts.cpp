@@ -4,20 +4,20 @@
 #include <string_view>
 #include <utility>
 
-#include "core/game/PublicName.h"
 #include "core/gamefile/SuggestedName.h"
 #include "ui/WorkArea.h"
 
 BoardCharts::BoardCharts(Session& session, const GameCharts::Parts& parts, const QWidget& mainWindow,
-                         std::function<std::string()> received)
+                         std::function<std::string()> received, std::function<ChartPlayer(int index)> player)
     : session_(session),
       parts_(parts),
       mainWindow_(mainWindow),
       received_(std::move(received)),
+      player_(std::move(player)),
       subscription_(session.Listen([this](SessionChange change) {
         const bool isNews = change == SessionChange::Scores || change == SessionChange::Cleared;
-        if (isNews && window_ && window_->isVisible()) {
-          ShowBoard();
+        if (isNews) {
+          ShowOtherNames();
         }
       })) {}
 
@@ -48,6 +48,12 @@ void BoardCharts::Close() {
   }
 }
 
+void BoardCharts::ShowOtherNames() {
+  if (window_ && window_->isVisible()) {
+    ShowBoard();
+  }
+}
+
 void BoardCharts::ShowBoard() {
   const Game& game = session_.Game();
   const std::string& mission = session_.Missions().Text();
@@ -59,15 +65,7 @@ void BoardCharts::ShowBoard() {
                   .Title = game.GameDate.empty() ? mission : mission + ", " + game.GameDate};
   const Board& board = session_.List(BoardList::Players);
   for (int place = 0; place < board.RowCount(); ++place) {
-    const BoardRow& row = board.RowAt(place);
-    std::string name = game.DisplayName(row.Index);
-    // A picture of it may leave the house: first and last names do not belong there.
-    const std::int32_t member = game.Players(row.Index).MemberIndex;
-    if (const std::string nickName = member != 0 ? CleanName(session_.Members().NickNameOf(member)) : "";
-        !nickName.empty()) {
-      name.append(" (").append(nickName).append(")");
-    }
-    chart.Players.push_back({row.Index, std::move(name)});
+    chart.Players.push_back(player_(board.RowAt(place).Index));
   }
   if (!chart.Players.empty()) {
     constexpr std::string_view ending = ".game.xml";

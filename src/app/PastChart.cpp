@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <string_view>
 
-#include "core/game/HiddenNames.h"
+#include "app/ChartPlayers.h"
 #include "core/game/Standings.h"
 #include "core/gamefile/SuggestedName.h"
 
@@ -28,7 +28,7 @@ std::optional<MissionPoints> PointsOfMission(Database& dbScenarios, const std::s
   return ReadMissionPoints(*missions);
 }
 
-ChartGame ChartOf(const PastGame& past, const NickNames& nickNames,
+ChartGame ChartOf(const PastGame& past, const NickNames& nickNames, const HiddenNames& hidden,
                   const std::optional<MissionPoints>& points) {
   ChartGame chart{
       .Game = past.Game,
@@ -38,13 +38,8 @@ ChartGame ChartOf(const PastGame& past, const NickNames& nickNames,
       .PointsOfMission = points,
       .Title = past.Game.GameDate.empty() ? past.Mission : past.Mission + ", " + past.Game.GameDate};
   for (const Standing& standing : Standings(past.Game, [](std::int32_t) { return std::string(); })) {
-    std::string name = past.Game.DisplayName(standing.Index);
-    const NameHolder holder = HolderOf(past.Game, standing.Index, nickNames, past.NamesOfGuests());
-    if (const std::string& told = holder.NickName.empty() ? holder.GuestName : holder.NickName;
-        !told.empty()) {
-      name.append(" (").append(told).append(")");
-    }
-    chart.Players.push_back({standing.Index, std::move(name)});
+    chart.Players.push_back(
+        PlayerOfChart(past.Game, standing.Index, nickNames, past.NamesOfGuests(), hidden));
   }
   if (!chart.Players.empty()) {
     chart.FileName = SuggestedFileName(past.Played, past.Mission, {});

@@ -8,6 +8,7 @@
 #include <utility>
 #include <vector>
 
+#include "app/ChartPlayers.h"
 #include "app/MenuCaptions.h"
 #include "app/ScreenFit.h"
 #include "app/StateKeys.h"
@@ -103,12 +104,18 @@ void frmRx::SetUpDesk() {
                             .Save = *ui_->mnuSaveScores,
                             .Commit = *ui_->mnuCommitGame});
   desk_->Show();
-  charts_.emplace(session_,
-                  GameCharts::Parts{.Strings = services_.Strings,
-                                    .Boxes = services_.Boxes,
-                                    .CommonDialog1 = services_.CommonDialog1,
-                                    .Disk = services_.Disk},
-                  *this, [this] { return desk_->Progress().Received(); });
+  charts_.emplace(
+      session_,
+      GameCharts::Parts{.Strings = services_.Strings,
+                        .Boxes = services_.Boxes,
+                        .CommonDialog1 = services_.CommonDialog1,
+                        .Disk = services_.Disk},
+      *this, [this] { return desk_->Progress().Received(); },
+      [this](int index) {
+        return PlayerOfChart(
+            session_.Game(), index, NickNamesOfSession(), [this](int guest) { return guests_.NameOf(guest); },
+            *hidden_);
+      });
   ini_->AfterWrite = [this](bool written) {
     desk_->TellUnsavedSettings(written ? std::string() : userDataFolder_ + "/tessarine.ini");
   };

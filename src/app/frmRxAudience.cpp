@@ -68,6 +68,7 @@ void frmRx::EnterGuestNames() {
   if (window.exec() == QDialog::Accepted) {
     audience_->SetGuests(window.Names());
     results_->ShowOtherNames();
+    charts_->ShowOtherNames();
   }
 }
 

@@ -57,6 +57,7 @@ void frmRx::ShowPastCharts(const PastGame& past) {
                      .Boxes = services_.Boxes,
                      .CommonDialog1 = services_.CommonDialog1,
                      .Disk = services_.Disk});
-  window.ShowGame(ChartOf(past, NickNamesOfSession(), PointsOfMission(session_.DbScenarios(), past.Mission)));
+  window.ShowGame(
+      ChartOf(past, NickNamesOfSession(), *hidden_, PointsOfMission(session_.DbScenarios(), past.Mission)));
   window.exec();
 }

@@ -59,6 +59,7 @@ NickNames frmRx::NickNamesOfSession() {
 void frmRx::ShowOtherNames() {
   audience_->ShowOtherNames();
   results_->ShowOtherNames();
+  charts_->ShowOtherNames();
 }
 
 void frmRx::ShowResultsPage() {

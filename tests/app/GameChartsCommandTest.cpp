@@ -1,18 +1,25 @@
 #include <gmock/gmock.h>
 
 #include <QLabel>
+#include <QLineEdit>
+#include <QListWidget>
 #include <QTabWidget>
 
+#include "audience/GuestNameEntry.h"
 #include "charts/ChartTable.h"
 #include "charts/GameCharts.h"
 #include "charts/HitMap.h"
 #include "charts/ScoreChart.h"
+#include "members/Members.h"
 #include "tests/support/CaredFor.h"
 #include "tests/support/OnScreen.h"
 #include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
+#include "web/ResultsPage.h"
 
 namespace {
 
+using testing::ElementsAre;
 using testing::HasSubstr;
 
 /// The window of the charts; null if none is open.
@@ -43,6 +50,40 @@ class ChartsCommand : public testing::Test {
       venue.Trigger("mnuGameCharts");
     }
     return *OpenCharts();
+  }
+
+  std::vector<std::string> ChartedNames() {
+    std::vector<std::string> names;
+    for (const auto& [name, score] : ChartedScores(Charts())) {
+      names.push_back(name);
+    }
+    return names;
+  }
+
+  /// Blue 7 is a member with a nickname, Red 0 a guest.
+  void PutMemberAndGuest() {
+    venue.ChangeDatabase(
+        "members.mdb",
+        "INSERT INTO Members (ContactID, FirstName, LastName, NickName) VALUES (5, 'Bo', 'Ray', 'Mole')");
+    venue.MakeWindow().FormLoad();
+    Show(*venue.Window);
+    venue.LoadGame(GameFile(PlayerOf(1, "<BonusPoints>5</BonusPoints>") +
+                            PlayerOf(40, "<BonusPoints>9</BonusPoints><MemberIndex>5</MemberIndex>")));
+  }
+
+  void NameGuest(const char* name) {
+    const WhileModal<GuestNameEntry> entry([name](GuestNameEntry& window) {
+      Find<QLineEdit>(window, "Guest1").setText(QString::fromUtf8(name));
+      ::Press(window, "SaveExit");
+    });
+    venue.Trigger("mnuGuestNames");
+    EXPECT_EQ(entry.Runs(), 1);
+  }
+
+  void HideRow(int row) {
+    venue.Find<QTableView>("ScoreDisplay").selectRow(row);
+    venue.Boxes.Answers = {BoxAnswer::Ok};
+    venue.Trigger("mnuHidePlayer");
   }
 
   /// Soldiering of the player on that row of the board.
@@ -107,6 +148,44 @@ TEST_F(ChartsCommand, NamesMembersByTheirNicknamesOnly) {
   ASSERT_EQ(scores.size(), 2U);
   EXPECT_THAT(scores[0].first, HasSubstr("(Mole)"));
   EXPECT_THAT(scores[1].first, testing::Not(HasSubstr("Ann")));
+}
+
+TEST_F(ChartsCommand, NamesGuestsAsSoonAsTheyAreEntered) {
+  PutMemberAndGuest();
+  EXPECT_THAT(ChartedNames(), ElementsAre("Blue  7 (Mole)", "Red  0"));
+  NameGuest("Ann");
+  EXPECT_THAT(ChartedNames(), ElementsAre("Blue  7 (Mole)", "Red  0 (Ann)"));
+  NameGuest("");
+  EXPECT_THAT(ChartedNames(), ElementsAre("Blue  7 (Mole)", "Red  0"));
+}
+
+TEST_F(ChartsCommand, LeavesOutHiddenNamesUntilTheyAreShownAgain) {
+  PutMemberAndGuest();
+  NameGuest("Ann");
+  ASSERT_THAT(ChartedNames(), ElementsAre("Blue  7 (Mole)", "Red  0 (Ann)"));
+  HideRow(0);
+  EXPECT_THAT(ChartedNames(), ElementsAre("Blue  7", "Red  0 (Ann)"));
+  HideRow(1);
+  EXPECT_THAT(ChartedNames(), ElementsAre("Blue  7", "Red  0"));
+  const WhileModal<ResultsPage> page([](ResultsPage& window) {
+    auto& hidden = Find<QListWidget>(window, "HiddenPlayers");
+    hidden.setCurrentItem(hidden.findItems(QStringLiteral("Mole"), Qt::MatchExactly).value(0));
+    ::Press(window, "ShowAgain");
+    window.close();
+  });
+  venue.Trigger("mnuResultsPage");
+  EXPECT_EQ(page.Runs(), 1);
+  EXPECT_THAT(ChartedNames(), ElementsAre("Blue  7 (Mole)", "Red  0"));
+}
+
+TEST_F(ChartsCommand, NamesMembersByTheirNewNicknamesOnceTheWindowIsClosed) {
+  PutMemberAndGuest();
+  ASSERT_THAT(ChartedNames(), ElementsAre("Blue  7 (Mole)", "Red  0"));
+  venue.ChangeDatabase("members.mdb", "UPDATE Members SET NickName = 'Fox'");
+  const WhileModal<Members> members([](Members& window) { window.close(); });
+  venue.Trigger("mnuManageMembers");
+  EXPECT_EQ(members.Runs(), 1);
+  EXPECT_THAT(ChartedNames(), ElementsAre("Blue  7 (Fox)", "Red  0"));
 }
 
 TEST_F(ChartsCommand, BringsTheOneWindowToTheFront) {

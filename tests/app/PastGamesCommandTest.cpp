@@ -6,6 +6,7 @@
 #include <nlohmann/json.hpp>
 
 #include "archive/past/PastGames.h"
+#include "audience/GuestNameEntry.h"
 #include "charts/GameCharts.h"
 #include "charts/ScoreChart.h"
 #include "exports/ExportGames.h"
@@ -46,6 +47,22 @@ class PastGamesCommand : public testing::Test {
   }
   void OpenLatest() {
     Look([](PastGames& window) { ::Press(window, "Open"); });
+  }
+  /// Of the latest game, the best player first.
+  std::vector<std::string> NamesInCharts() {
+    std::vector<std::string> names;
+    Look([&names](PastGames& window) {
+      const WhileModal<GameCharts> charts([&names](GameCharts& shown) {
+        for (const PlayerParts& player : Find<ScoreChart>(shown, "Bars").Players()) {
+          names.push_back(player.Player.Name);
+        }
+        shown.close();
+      });
+      ::Press(window, "Charts");
+      EXPECT_EQ(charts.Runs(), 1);
+      window.close();
+    });
+    return names;
   }
   std::string Query(const std::string& sql) const { return venue.QueryDatabase("games.mdb", sql); }
 
@@ -130,6 +147,21 @@ TEST_F(PastGamesCommand, ShowsChartsThatAddUpToTheScores) {
     EXPECT_EQ(charts.Runs(), 1);
     window.close();
   });
+}
+
+TEST_F(PastGamesCommand, ChartsGuestsByTheirNamesAndLeavesOutHiddenOnes) {
+  PutGame();
+  const WhileModal<GuestNameEntry> entry([](GuestNameEntry& window) {
+    Find<QLineEdit>(window, "Guest1").setText(QStringLiteral("Ann"));
+    ::Press(window, "SaveExit");
+  });
+  venue.Trigger("mnuGuestNames");
+  EXPECT_EQ(entry.Runs(), 1);
+  EXPECT_THAT(NamesInCharts(), ElementsAre("Blue  7 (Mole)", "Red  0 (Ann)"));
+  venue.Find<QTableView>("ScoreDisplay").selectRow(0);
+  venue.Boxes.Answers = {BoxAnswer::Ok};
+  venue.Trigger("mnuHidePlayer");
+  EXPECT_THAT(NamesInCharts(), ElementsAre("Blue  7", "Red  0 (Ann)"));
 }
 
 TEST_F(PastGamesCommand, ExportsTheChosenGames) {
