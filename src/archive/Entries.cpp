@@ -187,6 +187,16 @@ Unpacking Unpack(const Blob& data, std::int64_t size, std::string& bytes) {
   return result;
 }
 
+std::string BeginningOf(const Blob& start, bool isDeflated, std::size_t most) {
+  std::string bytes;
+  if (isDeflated) {
+    InflateStream(start).Read(bytes, most);
+  } else {
+    bytes.assign(start.begin(), start.begin() + static_cast<std::ptrdiff_t>(std::min(most, start.size())));
+  }
+  return bytes;
+}
+
 class EntryComparison::Stream {
  public:
   Stream(const Blob& data, bool isDeflated) : isDeflated_(isDeflated) {

@@ -55,6 +55,10 @@ enum class Unpacking {
 /// Done. Takes no more memory than LargestEntry and some, whatever the entry holds or says.
 Unpacking Unpack(const Blob& data, std::int64_t size, std::string& bytes);
 
+/// The first bytes of an entry, `most` at most; fewer if it is shorter, or damaged there. Of its data,
+/// deflated or not, no more need be in `start` than the first bytes.
+std::string BeginningOf(const Blob& start, bool isDeflated, std::size_t most);
+
 /// Compares an entry with bytes that come piece by piece, without holding either as a whole.
 class EntryComparison {
  public:

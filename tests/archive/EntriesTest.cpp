@@ -59,6 +59,22 @@ TEST(Entries, ComeBackAsTheyWere) {
   EXPECT_LT(Packed(std::string(200000, 'a')).size(), 1000U);
 }
 
+TEST(Entries, BeginAsTheirBytesDo) {
+  std::string bytes;
+  for (int line = 0; line < 5000; ++line) {
+    bytes.append(std::to_string(line * 7919)).append(",");
+  }
+  const Blob packed = Packed(bytes);
+  ASSERT_GT(packed.size(), 4096U);
+  const Blob start(packed.begin(), packed.begin() + 4096);
+  EXPECT_EQ(BeginningOf(start, true, 3000), bytes.substr(0, 3000));
+  EXPECT_EQ(BeginningOf(packed, true, bytes.size() + 9), bytes);
+  EXPECT_EQ(BeginningOf(Blob(bytes.begin(), bytes.end()), false, 3000), bytes.substr(0, 3000));
+  EXPECT_EQ(BeginningOf({'a', 'b'}, false, 3000), "ab");
+  EXPECT_EQ(BeginningOf({'a', 'b'}, true, 3000), "");
+  EXPECT_EQ(BeginningOf({}, true, 3000), "");
+}
+
 TEST(Entries, ArePackedPieceByPieceAsWell) {
   std::string bytes;
   Packer packer;

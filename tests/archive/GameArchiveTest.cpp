@@ -223,6 +223,58 @@ TEST_F(Finding, PassesDeletedGamesAndDamagedFiles) {
   EXPECT_EQ(Archive->Find(Game, State().Mission), std::nullopt);
 }
 
+class FindingAlike : public Finding {
+ protected:
+  /// The game has two states; the earlier one has that date text and is given back.
+  ::Game KeepTwoStates(const std::string& date) {
+    Game.GameDate = date;
+    const ::Game earlier = Game;
+    const std::int64_t game = Archive->Keep(State());
+    Game.GameDate = "21.11.2026 20:40";
+    ChangeInputs();
+    Archive->KeepAgain(game, State(), FormerState::KeptToo);
+    return earlier;
+  }
+  /// The number of the state; -1 if none is found. `Compared` tells how many files were read for that.
+  std::int64_t StateLike(const ::Game& game) {
+    Compared = 0;
+    const auto found = Archive->FindAlike(game, State().Mission, State().Played, GameArchive::Among::Listed,
+                                          [this] { ++Compared; });
+    return found ? found->State : -1;
+  }
+
+  int Compared = 0;
+};
+
+TEST_F(FindingAlike, KnowsAnEarlierStateWhoeverPlayed) {
+  ::Game sought = KeepTwoStates("21.11.2026 20:15");
+  sought.Players(Blue7).MemberIndex = 99;
+  EXPECT_EQ(StateLike(sought), 1);
+  EXPECT_EQ(Compared, 1);
+  ++sought.Players(Blue7).BonusPoints;
+  EXPECT_EQ(StateLike(sought), -1);
+  EXPECT_EQ(Compared, 1);
+}
+
+TEST_F(FindingAlike, DoesNotReadEarlierStatesOfAnotherDate) {
+  ::Game sought = KeepTwoStates("21.11.2026 20:15");
+  sought.GameDate = "21.11.2026 20:16";
+  EXPECT_EQ(StateLike(sought), -1);
+  EXPECT_EQ(Compared, 0);
+}
+
+TEST_F(FindingAlike, ReadsEarlierStatesWhoseDateIsWrittenOtherwise) {
+  ::Game sought = KeepTwoStates("<21> & 11");
+  sought.Players(Blue7).MemberIndex = 99;
+  EXPECT_EQ(StateLike(sought), 1);
+}
+
+TEST_F(FindingAlike, ReadsEarlierStatesWhoseDateStandsFarBehind) {
+  ::Game sought = KeepTwoStates(std::string(5000, 'x'));
+  sought.Players(Blue7).MemberIndex = 99;
+  EXPECT_EQ(StateLike(sought), 1);
+}
+
 class ReadingBack : public Keeping {
  protected:
   Thrown Failure() {
