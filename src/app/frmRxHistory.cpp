@@ -67,19 +67,7 @@ void frmRx::DeleteOldGames() {
 }
 
 bool frmRx::DeleteSomeOldGames() {
-  constexpr int atOnce = 5;  // some 30 milliseconds
-  if (oldGamesBefore_.empty()) {
-    return false;
-  }
-  try {
-    if (DeleteGamesBefore(archive_->File(), oldGamesBefore_, atOnce) == atOnce) {
-      return true;
-    }
-  } catch (const RuntimeError&) {
-    // As above.
-  }
-  oldGamesBefore_.clear();
-  return false;
+  return DeleteSomeGamesBefore(*archive_, oldGamesBefore_);
 }
 
 void frmRx::DeleteRankingPage() {

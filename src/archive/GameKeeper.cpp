@@ -22,6 +22,13 @@ class Flagged {
   bool& flag_;
 };
 
+/// Throws what keeping a game would throw, and changes nothing. A group of writes alone does not tell: the
+/// journal beside the file is made by the first write in it.
+void TryToWrite(Database& archive) {
+  const WriteScope scope(archive);  // which ends without a commit
+  archive.Statements().Change("INSERT INTO ArchiveKey (KeyID, Secret) VALUES (0, '')", {});
+}
+
 }  // namespace
 
 GameKeeper::GameKeeper(Parts parts)
@@ -89,14 +96,22 @@ void GameKeeper::Try(const std::function<void()>& action) {
     return;
   }
   const Flagged keeping(keeping_);
+  // An action may only read, or find nothing to do.
+  const auto act = [&] {
+    action();
+    if (!state_.Failure.empty()) {
+      CheckRoom();
+      TryToWrite(OpenFile());
+    }
+  };
   try {
     try {
-      action();
+      act();
     } catch (const RuntimeError& failure) {
       if (!SetAside(failure)) {
         throw;
       }
-      action();
+      act();
     }
     state_.Failure.clear();
   } catch (const RuntimeError& failure) {
@@ -125,10 +140,7 @@ std::string GameKeeper::TextOf(const RuntimeError& failure) const {
 
 void GameKeeper::SeeWhetherItWorksAgain() {
   if (!state_.Failure.empty()) {
-    Try([this] {
-      CheckRoom();
-      const WriteScope scope(OpenFile());  // which nothing is written in
-    });
+    Try([] {});
   }
 }
 

@@ -4,6 +4,7 @@
 #include <string>
 #include <utility>
 
+#include "archive/PackedBytes.h"
 #include "platform/Sql.h"
 
 namespace {
@@ -34,13 +35,6 @@ std::string ConditionOf(const GamePersons& persons, SqlValues& values) {
     condition.append(" OR MemberID = 0 AND DallasID IN (").append(buttons).append(")");
   }
   return condition;
-}
-
-std::int64_t PackedBytesOf(Sql& sql, std::int64_t game) {
-  return WholeNumber(sql,
-                     "SELECT sum(length(data)) FROM sqlar WHERE name IN (SELECT Name FROM GameFiles "
-                     "WHERE GameID = $1)",
-                     {game});
 }
 
 }  // namespace

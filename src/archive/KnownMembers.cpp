@@ -7,6 +7,7 @@
 #include "archive/Digests.h"
 #include "core/data/FieldValue.h"
 #include "core/game/DallasId.h"
+#include "core/game/MemberNumbers.h"
 #include "core/text/Pieces.h"
 #include "platform/Sql.h"
 
@@ -117,7 +118,9 @@ std::set<std::int32_t> KnownMembers::FindStrangers() {
 }
 
 void KnownMembers::RaiseCounter() {
-  const std::int64_t highest = WholeNumber(archive_.Statements(), "SELECT max(MemberID) FROM KnownMembers");
+  const std::int64_t highest =
+      WholeNumber(archive_.Statements(), "SELECT max(MemberID) FROM KnownMembers WHERE MemberID <= $1",
+                  {std::int64_t{HighestMemberNumber}});
   if (highest > 0) {
     members_.RaiseCounter("Members", highest);
   }
@@ -126,7 +129,9 @@ void KnownMembers::RaiseCounter() {
 void KnownMembers::RaiseCounterAbove(const Marks& marks) {
   std::int64_t highest = 0;
   for (const auto& [number, mark] : marks) {
-    highest = mark == MemberMark{} ? std::max<std::int64_t>(highest, number) : highest;
+    if (mark == MemberMark{} && number <= HighestMemberNumber) {
+      highest = std::max<std::int64_t>(highest, number);
+    }
   }
   if (highest > 0) {
     members_.RaiseCounter("Members", highest);

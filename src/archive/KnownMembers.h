@@ -52,7 +52,8 @@ class KnownMembers {
   /// All known numbers.
   Marks All();
 
-  /// From now on new members get numbers that no game has.
+  /// From now on new members get numbers that no game has. Numbers above HighestMemberNumber, which no new
+  /// member comes to, do not count.
   void RaiseCounter();
 
   /// The same above those of these numbers that nobody has. To be called before a game that names them is

@@ -6,6 +6,7 @@
 #include <limits>
 
 #include "core/data/FieldValue.h"
+#include "core/game/MemberNumbers.h"
 #include "core/text/Pieces.h"
 #include "platform/Letters.h"
 
@@ -27,15 +28,14 @@ std::optional<Value> NumberValue(std::string_view text) {
   return isNumber ? std::optional<Value>(number) : std::nullopt;
 }
 
-/// A whole number from `least` to the largest that a 32-bit one holds.
-std::optional<Value> CountValue(std::string_view text, std::int64_t least) {
+/// A whole number from `least` to `most`.
+std::optional<Value> CountValue(std::string_view text, std::int32_t least, std::int32_t most) {
   const std::optional<Value> value = NumberValue(text);
   if (!value) {
     return std::nullopt;
   }
   const double number = NumberOf(*value);
-  if (number < static_cast<double>(least) || number > std::numeric_limits<std::int32_t>::max() ||
-      number != std::floor(number)) {
+  if (number < least || number > most || number != std::floor(number)) {
     return std::nullopt;
   }
   return static_cast<std::int64_t>(number);
@@ -68,9 +68,9 @@ std::optional<Value> ValueOf(std::string_view text, ColumnKind kind, DateOrder o
     case ColumnKind::Number:
       return NumberValue(text);
     case ColumnKind::Count:
-      return CountValue(text, 0);
+      return CountValue(text, 0, std::numeric_limits<std::int32_t>::max());
     case ColumnKind::MemberNumber:
-      return CountValue(text, 1);
+      return CountValue(text, 1, HighestMemberNumber);
     case ColumnKind::Button:
       return ButtonValue(text);
     case ColumnKind::Moment:

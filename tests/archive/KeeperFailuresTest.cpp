@@ -218,6 +218,36 @@ TEST_F(ArchiveInUse, ThatIsReadOnlyIsToldUntilItIsNot) {
   EXPECT_EQ(Games(), "2");
 }
 
+TEST_F(ArchiveInUse, ThatIsReadOnlyIsToldUntilItIsNotEvenWithoutAGame) {
+  Pull();
+  {
+    const OrdinaryUser user;
+    Change();
+    session.ClearPlayerData();
+    keeper->Keep();
+    ExpectFailure("cannot be written. Give yourself the right");
+  }
+  keeper->Keep();
+  EXPECT_EQ(keeper->State(), KeptState());
+  EXPECT_EQ(Query("SELECT count(*) FROM ArchiveKey"), "1");
+}
+
+TEST_F(ArchiveInUse, ThatIsReadOnlyIsToldThoughItCanBeRead) {
+  Pull();
+  session.ClearPlayerData();
+  Start();
+  {
+    const OrdinaryUser user;
+    Pull();
+    keeper->CheckMembers();
+    keeper->NoteMembers();
+    EXPECT_FALSE(keeper->RemoveDeleted());
+    ExpectFailure("cannot be written. Give yourself the right");
+  }
+  EXPECT_FALSE(keeper->RemoveDeleted());
+  EXPECT_EQ(keeper->State().Failure, "");
+}
+
 TEST_F(ArchiveInUse, ThatIsLockedIsToldUntilItIsNotEvenWithoutAGame) {
   Pull();
   OtherConnection other(ArchivePath());

@@ -2,7 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
+
 #include "archive/MemberCheck.h"
+#include "core/game/MemberNumbers.h"
 #include "tests/archive/ArchiveVenue.h"
 #include "tests/support/Thrown.h"
 
@@ -237,6 +240,20 @@ TEST_F(MembersOfGames, LeaveTheirNumbersToNoNewMemberAsSoonAsAGameIsKept) {
   Game.Players(Red0).MemberIndex = 70;
   Archive->Keep(State());
   EXPECT_EQ(NextMember(), 71);
+}
+
+TEST_F(MembersOfGames, HaveNoSayInTheNextNumberWhereTheirsIsImpossible) {
+  const std::string before = std::to_string(NextMember());
+  for (const std::int32_t number : {std::numeric_limits<std::int32_t>::max(), HighestMemberNumber + 1, -1,
+                                    std::numeric_limits<std::int32_t>::min()}) {
+    Game.Players(Red0).MemberIndex = number;
+    Archive->Keep(State());
+    EXPECT_EQ(Cut(), "");
+  }
+  EXPECT_EQ(std::to_string(NextMember() - 1), before);
+  Game.Players(Red0).MemberIndex = HighestMemberNumber;
+  Archive->Keep(State());
+  EXPECT_EQ(NextMember(), HighestMemberNumber + 1);
 }
 
 TEST_F(MembersOfGames, AreNotThoseWhoGotANumberThatNobodyHad) {

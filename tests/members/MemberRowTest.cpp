@@ -2,6 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <string>
+
+#include "core/game/MemberNumbers.h"
+
 namespace {
 
 using namespace MemberPlace;
@@ -100,6 +104,10 @@ TEST_F(MemberRowRead, RefusesNobody) {
   EXPECT_EQ(NameOf(values), "Mole");
   EXPECT_EQ(Read("7,", {ContactId, FirstName}), RowFault::None);
   EXPECT_EQ(Read("0,Rhys", {ContactId, FirstName}), RowFault::NoNumber);
+  const auto highest = std::to_string(HighestMemberNumber);
+  EXPECT_EQ(Read(highest + ",Rhys", {ContactId, FirstName}), RowFault::None);
+  const auto impossible = std::to_string(HighestMemberNumber + 1);  // nobody could be entered any more
+  EXPECT_EQ(Read(impossible + ",Rhys", {ContactId, FirstName}), RowFault::NoNumber);
 }
 
 }  // namespace

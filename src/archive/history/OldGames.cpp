@@ -3,6 +3,8 @@
 #include <charconv>
 #include <vector>
 
+#include "platform/RuntimeError.h"
+
 namespace {
 
 /// Where years are written as four digits, this is before all of them.
@@ -46,4 +48,21 @@ int DeleteGamesBefore(Database& archive, const std::string& time, int most) {
   }
   scope.Commit();
   return static_cast<int>(games.size());
+}
+
+bool DeleteSomeGamesBefore(ArchiveAccess& archive, std::string& time) {
+  constexpr int atOnce = 5;  // some 30 milliseconds
+  if (time.empty()) {
+    return false;
+  }
+  try {
+    archive.CheckSpace();
+    if (DeleteGamesBefore(archive.File(), time, atOnce) == atOnce) {
+      return true;
+    }
+    time.clear();
+  } catch (const RuntimeError&) {
+    // The status line tells of an archive that cannot be used.
+  }
+  return false;
 }

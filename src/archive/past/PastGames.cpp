@@ -195,7 +195,7 @@ void PastGames::ListGames(std::int64_t stay) {
   stopped_ = false;
   const bool done = Try([&] {
     const GameFilter filter = FilterOf(search_, Listed().Which, Listed().Month);
-    RunInSteps(filter.Members.size(),
+    RunInSteps(AreMany(filter.Members.size()),
                [&](const Step& goOn) { games = parts_.Archive.Queries().Games(filter, goOn); });
   });
   {

@@ -5,6 +5,7 @@
 #include <functional>
 #include <memory>
 #include <optional>
+#include <span>
 #include <string>
 #include <vector>
 
@@ -104,20 +105,26 @@ class PastGames : public QDialog {
 
   /// Asked between steps with the part done, 0 to 1; false stops the run.
   using Step = std::function<bool(double done)>;
-  /// Runs `act` on so many rows. Where these are many, the window is painted meanwhile, shows how far it is,
-  /// and takes nothing but Stop. What `act` throws ends the run.
-  void RunInSteps(std::size_t rows, const std::function<void(const Step& goOn)>& act);
+  /// Runs `act`. Where that takes long, the window is painted meanwhile, shows how far it is, and takes
+  /// nothing but Stop. What `act` throws ends the run.
+  void RunInSteps(bool takesLong, const std::function<void(const Step& goOn)>& act);
+  /// True for so many rows that what is done with each of them takes long.
+  static bool AreMany(std::size_t rows);
   /// How a change of games ended; %1 is how many were changed, %2 how many were not.
   struct ChangeTexts {
     OwnText Done;
     OwnText DoneInPart;
     OwnText Stopped;
   };
-  /// Changes these games, some at a time, each time durably, and then reads the lists anew. Tells how many
-  /// `change` counted. Throws RuntimeError 61 if the disk has no room; nothing is changed then.
-  void ChangeInSteps(const std::vector<std::int64_t>& games,
-                     const std::function<int(const std::vector<std::int64_t>& some)>& change,
-                     const ChangeTexts& texts);
+  struct Change {
+    /// Changes these, all together and durably. Returns how many it changed.
+    std::function<int(const std::vector<std::int64_t>& some)> Act;
+    /// How many of the first of these games are changed at a time; at least one.
+    std::function<std::size_t(std::span<const std::int64_t> games)> AtOnce;
+  };
+  /// Changes these games, some at a time, and then reads the lists anew. Tells how many were changed. Throws
+  /// RuntimeError 61 if the disk has no room; nothing is changed then.
+  void ChangeInSteps(const std::vector<std::int64_t>& games, const Change& change, const ChangeTexts& texts);
 
   /// Runs `action`, and tells in the window if it fails. False then.
   bool Try(const std::function<void()>& action);

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "archive/DeletedGames.h"
+#include "archive/PackedBytes.h"
 #include "archive/past/PastGames.h"
 #include "core/gamefile/SuggestedName.h"
 #include "core/text/Filled.h"
@@ -15,19 +16,36 @@
 
 namespace {
 
-/// So many at once keep the window waiting for some tens of milliseconds.
-constexpr std::size_t GamesAtOnce = 500;
+using GameNumbers = std::span<const std::int64_t>;
+
+/// So many at once keep the window waiting for some tens of milliseconds where only their rows change.
+std::size_t RowsAtOnce(GameNumbers games) {
+  constexpr std::size_t most = 500;
+  return std::min(most, games.size());
+}
+
+/// The same where the files of the games are read, and those of games that may be the same.
+std::size_t FilesAtOnce(Sql& archive, GameNumbers games) {
+  constexpr std::int64_t enoughBytes = 12 * 1024;
+  const std::size_t most = RowsAtOnce(games);
+  std::size_t count = 0;
+  for (std::int64_t bytes = 0; count < most && bytes < enoughBytes; ++count) {
+    bytes += PackedBytesOf(archive, games[count]);
+  }
+  return count;
+}
 
 /// False if `goOn` ended it.
-bool InPieces(const std::vector<std::int64_t>& games, const std::function<bool(double done)>& goOn,
+bool InPieces(GameNumbers games, const std::function<bool(double done)>& goOn,
+              const std::function<std::size_t(GameNumbers games)>& atOnce,
               const std::function<void(const std::vector<std::int64_t>& some)>& act) {
-  for (std::size_t place = 0; place < games.size(); place += GamesAtOnce) {
-    if (!goOn(static_cast<double>(place) / static_cast<double>(games.size()))) {
+  for (GameNumbers rest = games; !rest.empty();) {
+    if (!goOn(1 - static_cast<double>(rest.size()) / static_cast<double>(games.size()))) {
       return false;
     }
-    const auto first = games.begin() + static_cast<std::ptrdiff_t>(place);
-    const auto count = static_cast<std::ptrdiff_t>(std::min(GamesAtOnce, games.size() - place));
-    act({first, first + count});
+    const GameNumbers some = rest.first(atOnce(rest));
+    act({some.begin(), some.end()});
+    rest = rest.subspan(some.size());
   }
   return true;
 }
@@ -101,19 +119,22 @@ void PastGames::Delete() {
   const std::string now = parts_.Time.Now();
   ChangeInSteps(
       games,
-      [&](const std::vector<std::int64_t>& some) { return parts_.Archive.Archive().Delete(some, now); },
+      {.Act =
+           [&](const std::vector<std::int64_t>& some) { return parts_.Archive.Archive().Delete(some, now); },
+       .AtOnce = RowsAtOnce},
       {OwnText::PastDeletedNow, OwnText::PastDeletedNow, OwnText::PastDeleteStopped});
 }
 
 void PastGames::BringBack() {
   ChangeInSteps(
       SelectedGames(),
-      [this](const std::vector<std::int64_t>& some) { return parts_.Archive.Archive().BringBack(some); },
+      {.Act =
+           [this](const std::vector<std::int64_t>& some) { return parts_.Archive.Archive().BringBack(some); },
+       .AtOnce = [this](GameNumbers some) { return FilesAtOnce(parts_.Archive.Statements(), some); }},
       {OwnText::PastBroughtBack, OwnText::PastBroughtBackSome, OwnText::PastBringBackStopped});
 }
 
-void PastGames::ChangeInSteps(const std::vector<std::int64_t>& games,
-                              const std::function<int(const std::vector<std::int64_t>& some)>& change,
+void PastGames::ChangeInSteps(const std::vector<std::int64_t>& games, const Change& change,
                               const ChangeTexts& texts) {
   parts_.Archive.CheckSpace();
   const std::int64_t next = GameAfter(games_.Games(), games);
@@ -121,8 +142,8 @@ void PastGames::ChangeInSteps(const std::vector<std::int64_t>& games,
   std::string failure;
   bool complete = false;
   try {
-    RunInSteps(games.size(), [&](const Step& goOn) {
-      complete = InPieces(games, goOn, [&](const auto& some) { changed += change(some); });
+    RunInSteps(AreMany(games.size()) || change.AtOnce(games) < games.size(), [&](const Step& goOn) {
+      complete = InPieces(games, goOn, change.AtOnce, [&](const auto& some) { changed += change.Act(some); });
     });
   } catch (const RuntimeError& error) {
     failure = error.what();
@@ -141,7 +162,8 @@ void PastGames::ChangeInSteps(const std::vector<std::int64_t>& games,
 void PastGames::Copy(const QAbstractItemView& list) {
   const int rows = list.model()->rowCount();
   bool copied = false;
-  RunInSteps(static_cast<std::size_t>(rows), [&](const Step& goOn) { copied = CopyRowsInSteps(list, goOn); });
+  RunInSteps(AreMany(static_cast<std::size_t>(rows)),
+             [&](const Step& goOn) { copied = CopyRowsInSteps(list, goOn); });
   if (!copied) {
     Tell(parts_.Strings.Text(OwnText::PastCopyStopped));
     return;
@@ -151,9 +173,13 @@ void PastGames::Copy(const QAbstractItemView& list) {
   Tell(Filled(parts_.Strings.Text(OwnText::PastCopied), {std::to_string(count)}));
 }
 
-void PastGames::RunInSteps(std::size_t rows, const std::function<void(const Step& goOn)>& act) {
+bool PastGames::AreMany(std::size_t rows) {
   constexpr std::size_t few = 200;
-  if (rows <= few) {
+  return rows > few;
+}
+
+void PastGames::RunInSteps(bool takesLong, const std::function<void(const Step& goOn)>& act) {
+  if (!takesLong) {
     act([](double) { return true; });
     return;
   }

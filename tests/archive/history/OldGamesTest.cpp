@@ -3,6 +3,8 @@
 #include <gmock/gmock.h>
 
 #include "tests/archive/history/HistoryVenue.h"
+#include "tests/support/OpenSession.h"
+#include "tests/support/TightDisk.h"
 
 namespace {
 
@@ -59,6 +61,51 @@ TEST_F(GamesOfYears, GoTheOldestFirst) {
   EXPECT_EQ(Query("SELECT group_concat(GameID) FROM (SELECT GameID FROM Games ORDER BY GameID)"), "2,3,4");
   EXPECT_EQ(DeleteGamesBefore(*ArchiveDatabase, "2030", 5), 2);
   EXPECT_EQ(DeleteGamesBefore(*ArchiveDatabase, "2030", 5), 0);
+}
+
+class GamesToDelete : public GamesOfYears {
+ protected:
+  OpenSession site;
+  TightDisk disk;
+  ArchiveAccess access{{.Session = site.session,
+                        .Disk = disk,
+                        .Engine = site.Databases,
+                        .Strings = site.Strings,
+                        .UserDataFolder = Folder.Path(),
+                        .ProgramFolder = Folder.Path()}};
+  std::string before = "2022-01-01 20:00:00";
+};
+
+TEST_F(GamesToDelete, GoSomeAtATime) {
+  for (int day = 10; day < 15; ++day) {
+    Keep("2019-03-" + std::to_string(day) + " 20:00:00", day);
+  }
+  EXPECT_TRUE(DeleteSomeGamesBefore(access, before));
+  EXPECT_EQ(Count("Games"), "4");
+  EXPECT_FALSE(DeleteSomeGamesBefore(access, before));
+  EXPECT_EQ(Count("Games"), "2");
+  EXPECT_EQ(before, "");
+  EXPECT_FALSE(DeleteSomeGamesBefore(access, before));
+  EXPECT_EQ(Count("Games"), "2");
+}
+
+TEST_F(GamesToDelete, StayWhileTheDiskIsNarrow) {
+  disk.Space = LeastFreeSpace - 1;
+  EXPECT_FALSE(DeleteSomeGamesBefore(access, before));
+  EXPECT_EQ(Count("Games"), "4");
+  disk.Space = LeastFreeSpace;
+  DeleteSomeGamesBefore(access, before);
+  EXPECT_EQ(Count("Games"), "2");
+}
+
+TEST_F(GamesToDelete, StayWhileAnotherProgramHasTheArchiveAndGoAfterwards) {
+  OtherConnection other(ArchivePath());
+  other.Execute("BEGIN IMMEDIATE");
+  EXPECT_FALSE(DeleteSomeGamesBefore(access, before));
+  EXPECT_EQ(Count("Games"), "4");
+  other.Execute("ROLLBACK");
+  DeleteSomeGamesBefore(access, before);
+  EXPECT_EQ(Count("Games"), "2");
 }
 
 }  // namespace

@@ -4,6 +4,7 @@
 
 #include "core/gamefile/GameFile.h"
 #include "tests/archive/past/PastGamesVenue.h"
+#include "tests/support/RandomGame.h"
 
 namespace {
 
@@ -250,6 +251,36 @@ TEST_F(WindowOfPastGames, NeitherDeletesNorBringsBackWhileTheDiskIsNarrow) {
   Press("BringBack");
   EXPECT_THAT(Status(), testing::HasSubstr("32 MB"));
   EXPECT_EQ(Query("SELECT count(*) FROM Games WHERE Deleted IS NULL"), "3");
+}
+
+TEST_F(WindowOfPastGames, BringsGamesWithLargeFilesBackInShortSteps) {
+  constexpr int many = 20;
+  Game game(venue.Strings);
+  FillRandomly(game, 40, 7);
+  std::vector<std::int64_t> games;
+  for (int minute = 10; minute < 10 + many; ++minute) {
+    const std::string played = "2026-11-20 20:" + std::to_string(minute) + ":00";
+    game.GameDate = played;
+    games.push_back(access.Archive().Keep({.Game = game, .Mission = "None", .Played = played}));
+  }
+  Keep("2026-11-22 20:00:00", "None", 400);
+  access.Archive().Delete(games, "2026-11-22 10:00:00");
+  access.Close();
+  Open();
+  Months().selectRow(Months().model()->rowCount() - 1);
+  Games().selectAll();
+  events.At(std::chrono::milliseconds(0), [this] { Press("Stop"); });
+  Press("BringBack");
+  const auto back = [this] {
+    return std::stoi(Query("SELECT count(*) FROM Games WHERE Deleted IS NULL")) - 1;
+  };
+  EXPECT_GT(back(), 0);
+  EXPECT_LT(back(), many / 2);
+  EXPECT_EQ(static_cast<int>(Listed().size()), many - back());
+  EXPECT_FALSE(Get<QPushButton>("Stop").isVisible());
+  Games().selectAll();
+  Press("BringBack");
+  EXPECT_EQ(back(), many);
 }
 
 class ManyPastGames : public WindowOfPastGames {
