@@ -9,6 +9,7 @@
 #include "archive/GameArchive.h"
 #include "archive/GameKeeper.h"
 #include "archive/GamesPass.h"
+#include "archive/PendingCuts.h"
 #include "archive/history/PrintedRanking.h"
 #include "core/text/Filled.h"
 #include "platform/RuntimeError.h"
@@ -221,6 +222,7 @@ bool ForgetMember::WriteAnew(Database& database, const std::string& file, const 
         known.Forget(number);
       }
     }
+    PendingCuts(database).Drop(persons.Numbers);
     scope.Commit();
   }
   CheckRoomFor(parts_.Disk.FileLen(file), file);
