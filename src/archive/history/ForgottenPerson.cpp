@@ -3,7 +3,7 @@
 #include <functional>
 #include <utility>
 
-#include "core/game/DallasId.h"
+#include "core/game/IsButton.h"
 #include "platform/RuntimeError.h"
 #include "platform/Sql.h"
 
@@ -27,7 +27,7 @@ ForgottenPerson::ForgottenPerson(std::int32_t number, Database& members)
 }
 
 void ForgottenPerson::Add(const MemberMark& mark) {
-  if (!mark.DallasId.empty() && mark.DallasId != NoDallasId) {
+  if (IsButton(mark.DallasId)) {
     buttons_.insert(mark.DallasId);
   }
   if (!mark.Digest.empty()) {
@@ -103,8 +103,7 @@ void ForgottenPerson::ReadGuestButtons(const Archive& archive) {
   for (const std::int32_t number : numbers) {
     archive.Open->Statements().Query("SELECT DISTINCT DallasID FROM GamePlayers WHERE MemberID = $1",
                                      {std::int64_t{number}}, [this](const SqlRow& row) {
-                                       if (const std::string button = row.Text(0);
-                                           !button.empty() && button != NoDallasId) {
+                                       if (const std::string button = row.Text(0); IsButton(button)) {
                                          guestButtons_.insert(button);
                                        }
                                      });
