@@ -37,15 +37,41 @@ std::string ConditionOf(const GamePersons& persons, SqlValues& values) {
   return condition;
 }
 
+GamePersons PersonsOf(const GamesPass::Ranges& ranges) {
+  GamePersons persons;
+  for (const auto& [number, range] : ranges) {
+    persons.Numbers.insert(number);
+  }
+  return persons;
+}
+
 }  // namespace
 
 GamesPass::GamesPass(Database& archive, GamePersons persons, Task task)
     : persons_(std::move(persons)),
       task_(task),
       highest_(WholeNumber(archive.Statements(), "SELECT max(GameID) FROM Games")),
-      next_(highest_) {}
+      next_(highest_) {
+  common_.Last = highest_;
+}
 
-bool GamesPass::Step(Database& archive, GameArchive games) {
+GamesPass::GamesPass(Database& archive, Task task, const Ranges& ranges)
+    : persons_(PersonsOf(ranges)), task_(task), ranges_(ranges) {
+  common_.Last = WholeNumber(archive.Statements(), "SELECT max(GameID) FROM Games");
+  for (const auto& [number, range] : ranges) {
+    if (range.First <= range.Last) {
+      highest_ = std::max(highest_, std::min(range.Last, common_.Last));
+    }
+  }
+  for (const auto& [number, range] : ranges) {
+    common_.First = std::max(common_.First, range.First);
+    common_.Last = std::min(common_.Last, range.Last);
+  }
+  next_ = highest_;
+}
+
+bool GamesPass::Step(Database& archive, GameArchive games,
+                     const std::function<void(std::int64_t)>& beforeCommit) {
   Sql& sql = archive.Statements();
   if (candidates_.empty()) {
     ReadCandidates(sql);
@@ -56,12 +82,15 @@ bool GamesPass::Step(Database& archive, GameArchive games) {
   const auto look = [&] {
     for (std::int64_t bytes = 0; done < candidates_.size() && bytes < PackedBytesOfAStep; ++done) {
       bytes += PackedBytesOf(sql, candidates_[done]);
-      found += games.LookForPersons(candidates_[done], persons_, task_) ? 1 : 0;
+      found += LookInto(candidates_[done], games) ? 1 : 0;
     }
   };
   if (task_ == Task::TakeOut) {
     WriteScope scope(archive);
     look();
+    if (beforeCommit) {
+      beforeCommit(done < candidates_.size() ? candidates_[done] : next_);
+    }
     scope.Commit();
   } else {
     const ReadScope scope(archive);
@@ -70,6 +99,19 @@ bool GamesPass::Step(Database& archive, GameArchive games) {
   candidates_.erase(candidates_.begin(), candidates_.begin() + static_cast<std::ptrdiff_t>(done));
   found_ += found;
   return !candidates_.empty() || next_ > 0;
+}
+
+bool GamesPass::LookInto(std::int64_t game, GameArchive& games) const {
+  if (game >= common_.First && game <= common_.Last) {
+    return games.LookForPersons(game, persons_, task_);
+  }
+  GamePersons persons;
+  for (const auto& [number, range] : ranges_) {
+    if (game >= range.First && game <= range.Last) {
+      persons.Numbers.insert(persons.Numbers.end(), number);
+    }
+  }
+  return !persons.AreNone() && games.LookForPersons(game, persons, task_);
 }
 
 /// Of the next window: the rows tell the last state only, so a game with earlier ones has to be looked into.

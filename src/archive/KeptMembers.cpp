@@ -27,7 +27,7 @@ void GameKeeper::CheckUnchecked() {
   }
   membersUnchecked_ = false;
   if (check_) {
-    TakeFromBoard({.Numbers = check_->Strangers()});
+    TakeFromBoard({.Numbers = check_->NewStrangers()});
   }
 }
 

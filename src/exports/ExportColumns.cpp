@@ -4,6 +4,7 @@
 #include <charconv>
 #include <cmath>
 
+#include "core/game/IsButton.h"
 #include "core/text/TextEncoding.h"
 
 namespace {
@@ -45,7 +46,7 @@ void AddPersonal(NamedValues& values, const ExportedGame& game, int index, const
     values.push_back({"member", record.MemberIndex != 0 ? Whole(record.MemberIndex) : ExportValue()});
   }
   if (personal.Buttons) {
-    values.push_back({"button", record.DallasID != NoDallasId ? TextOrNone(record.DallasID) : ExportValue()});
+    values.push_back({"button", IsButton(record.DallasID) ? TextOrNone(record.DallasID) : ExportValue()});
   }
 }
 
@@ -200,7 +201,7 @@ void WriteFigures(CsvWriter& writer, const PlayerFigures& figures, int number, c
     figures.Member != 0 ? writer.Number(figures.Member) : writer.Empty();
   }
   if (personal.Buttons) {
-    textOrNone(figures.Button == NoDallasId ? std::string_view() : figures.Button);
+    textOrNone(IsButton(figures.Button) ? figures.Button : std::string_view());
   }
   writer.Number(figures.Soldiering);
   figures.Accuracy ? writer.Number(*figures.Accuracy) : writer.Empty();

@@ -7,6 +7,7 @@
 
 #include "core/game/Board.h"
 #include "core/game/HitLines.h"
+#include "core/game/IsButton.h"
 #include "core/text/NumberForms.h"
 #include "exports/HtmlPage.h"
 #include "exports/HtmlText.h"
@@ -131,7 +132,7 @@ std::vector<Figure> PersonOf(const GamePageParts& parts, int index) {
   if (parts.Personal.MemberNumbers && record.MemberIndex != 0) {
     person.emplace_back(HtmlOf(parts.Strings, OwnText::PageMemberNumber), std::to_string(record.MemberIndex));
   }
-  if (parts.Personal.Buttons && record.DallasID != NoDallasId) {
+  if (parts.Personal.Buttons && IsButton(record.DallasID)) {
     person.emplace_back(HtmlOf(parts.Strings, OwnText::PageButton), HtmlText(record.DallasID));
   }
   return person;

@@ -34,6 +34,12 @@ class KeptMembers : public KeeperVenue {
   }
 
   std::string MemberOfRed() const { return Query("SELECT MemberID FROM GamePlayers WHERE PlayerIndex = 1"); }
+  /// In the order of the games.
+  std::string MembersOfRed() const {
+    return Query(
+        "SELECT group_concat(MemberID) FROM (SELECT MemberID FROM GamePlayers WHERE PlayerIndex = 1 "
+        "ORDER BY GameID)");
+  }
   std::string Buttons() const {
     return Query(
         "SELECT group_concat(DallasID) FROM (SELECT DallasID FROM GamePlayers ORDER BY PlayerIndex)");
@@ -110,6 +116,27 @@ TEST_F(KeptMembers, AreCutOnlyWhileTheDiskHasRoom) {
   EXPECT_EQ(MemberOfRed(), "0");
 }
 
+TEST_F(KeptMembers, WhoGotANumberKeepTheirGamesThoughTheCheckIsInterrupted) {
+  PullMole();
+  session.ClearPlayerData();
+  GiveNumberToAnn();
+  keeper->CheckMembers();
+  --disk.Space;
+  EXPECT_FALSE(keeper->CutAPart());
+  ++disk.Space;
+  Pull();
+  session.Game().Players(Red0).MemberIndex = 7;  // Ann
+  keeper->Keep();
+  EXPECT_EQ(session.Game().Players(Red0).MemberIndex, 7);
+  Start();  // the program
+  CheckMembers();
+  EXPECT_EQ(MembersOfRed(), "0,7");
+  EXPECT_EQ(keeper->State().CutGames, 1);
+  CheckMembers();
+  EXPECT_EQ(MembersOfRed(), "0,7");
+  EXPECT_EQ(Query("SELECT count(*) FROM CutMembers WHERE MemberID <> 0"), "0");
+}
+
 TEST_F(KeptMembers, WhomTheArchiveForgetsAreNotKeptAgainWithTheGameOnTheBoard) {
   PullMole("EE00000000000005");
   keeper->ForgetPersons({.Numbers = {7}, .GuestButtons = {"EE00000000000005"}, .TakesButtons = true});
@@ -130,9 +157,7 @@ TEST_F(KeptMembers, WhomTheArchiveForgotArePlayersOfTheNextGameAsBefore) {
   Pull();
   session.Game().Players(Red0).MemberIndex = 7;
   keeper->Keep();
-  EXPECT_EQ(Query("SELECT group_concat(MemberID) FROM (SELECT MemberID FROM GamePlayers WHERE PlayerIndex = "
-                  "1 ORDER BY GameID)"),
-            "0,7");
+  EXPECT_EQ(MembersOfRed(), "0,7");
 }
 
 TEST_F(KeptMembers, LeaveDeletedGamesToShortSteps) {

@@ -48,6 +48,16 @@ class MembersOfGames : public testing::Test, protected ArchiveVenue {
     return text.empty() ? text : text + "in " + std::to_string(check.Games());
   }
 
+  /// The numbers that a check finds that is interrupted before its first step, and that none before it found.
+  std::string Found() {
+    const MemberCheck check({*ArchiveDatabase, *MembersDatabase, Strings});
+    std::string text;
+    for (const std::int32_t number : check.NewStrangers()) {
+      text.append(text.empty() ? "" : " ").append(std::to_string(number));
+    }
+    return text;
+  }
+
   std::int64_t NextMember() {
     return MembersDatabase->Statements().Insert(
         "INSERT INTO Members (FirstName) VALUES ('New') RETURNING ContactID", {});
@@ -216,6 +226,71 @@ TEST_F(MembersOfGames, ThatAreKeptDuringACheckNameWhoHasTheNumberNow) {
   EXPECT_EQ(MembersIn(first), "6,0");
   EXPECT_EQ(MembersIn(second), "6,5");
   EXPECT_NE(Mark(5), before);
+  EXPECT_EQ(Cut(), "");
+}
+
+TEST_F(MembersOfGames, ThatAreKeptAfterACheckWasInterruptedNameWhoHasTheNumberNow) {
+  InMembers("UPDATE Members SET DallasID = NULL, FirstName = 'Di' WHERE ContactID = 5");
+  EXPECT_EQ(Found(), "5");
+  const std::int64_t second = Archive->Keep(State());
+  EXPECT_EQ(Found(), "");
+  EXPECT_EQ(Cut(), "5 in 1");
+  EXPECT_EQ(MembersIn(first), "6,0");
+  EXPECT_EQ(MembersIn(second), "6,5");
+  EXPECT_EQ(Read(Archive->FileOf(second)).Players(Blue7).MemberIndex, 5);
+  EXPECT_EQ(Cut(), "");
+  InMembers("UPDATE Members SET FirstName = 'Eve' WHERE ContactID = 5");
+  EXPECT_EQ(Cut(), "5 in 1");
+  EXPECT_EQ(MembersIn(second), "6,0");
+}
+
+TEST_F(MembersOfGames, AreCutToTheLastWhenTheNumberChangesHandsAgainInAnInterruptedCheck) {
+  InMembers("UPDATE Members SET DallasID = NULL, FirstName = 'Di' WHERE ContactID = 5");
+  EXPECT_EQ(Found(), "5");
+  const std::int64_t second = Archive->Keep(State());
+  InMembers("UPDATE Members SET FirstName = 'Eve' WHERE ContactID = 5");
+  EXPECT_EQ(Found(), "5");
+  const std::int64_t third = Archive->Keep(State());
+  EXPECT_EQ(Cut(), "5 in 2");
+  EXPECT_EQ(MembersIn(first), "6,0");
+  EXPECT_EQ(MembersIn(second), "6,0");
+  EXPECT_EQ(MembersIn(third), "6,5");
+}
+
+TEST_F(MembersOfGames, StayInTheGamesBeforeAnInterruptedCheckWhenTheyGetTheirNumberBack) {
+  const std::string before = Mark(5);
+  InMembers("UPDATE Members SET DallasID = NULL, FirstName = 'Di' WHERE ContactID = 5");
+  EXPECT_EQ(Found(), "5");
+  const std::int64_t second = Archive->Keep(State());
+  InMembers("UPDATE Members SET DallasID = 'BB00000000000001', FirstName = 'Bo' WHERE ContactID = 5");
+  EXPECT_EQ(Found(), "5");
+  const std::int64_t third = Archive->Keep(State());
+  EXPECT_EQ(Cut(), "5 in 1");
+  EXPECT_EQ(MembersIn(first), "6,5");
+  EXPECT_EQ(MembersIn(second), "6,0");
+  EXPECT_EQ(MembersIn(third), "6,5");
+  EXPECT_EQ(Mark(5), before);
+  EXPECT_EQ(Cut(), "");
+}
+
+TEST_F(MembersOfGames, AreLookedForOnlyWhereAnInterruptedCheckHadNotBeen) {
+  for (int i = 0; i < 10; ++i) {
+    Archive->Keep(State());
+  }
+  InArchive("UPDATE sqlar SET data = randomblob(20000)");
+  InMembers("UPDATE Members SET DallasID = NULL, FirstName = 'Di' WHERE ContactID = 5");
+  {
+    const MemberCheck::Parts parts{*ArchiveDatabase, *MembersDatabase, Strings};
+    MemberCheck check(parts);
+    EXPECT_TRUE(check.Step(parts));  // finds the games
+    EXPECT_TRUE(check.Step(parts));
+    EXPECT_EQ(check.Games(), 2);
+  }
+  // The operator chooses the new member in a game that is on the board again.
+  InArchive("UPDATE GamePlayers SET MemberID = 5 WHERE GameID = 11 AND PlayerIndex = 40");
+  EXPECT_EQ(Cut(), "5 in 9");
+  EXPECT_EQ(MembersIn(10), "6,0");
+  EXPECT_EQ(MembersIn(11), "6,5");
   EXPECT_EQ(Cut(), "");
 }
 

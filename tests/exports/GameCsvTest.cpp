@@ -96,6 +96,15 @@ TEST(GameAsCsv, TellsOfPersonsOnlyWhatWasTicked) {
   EXPECT_EQ(numbers[0].count("first_name") + numbers[0].count("last_name") + numbers[0].count("button"), 0U);
 }
 
+TEST(GameAsCsv, HasNoButtonForAPlayerWhoseFileToldNone) {
+  SampleGame sample;
+  sample.Game.Players(SampleGame::Red0).DallasID = "0";
+  const auto all = CsvRecords(PlayersTable(sample.Games(), Plain, EverythingPersonal));
+  ASSERT_EQ(all.size(), 3U);
+  EXPECT_EQ(all[0].at("button"), "0123456789ABCDEF");
+  EXPECT_EQ(all[1].at("button"), NoValue);
+}
+
 TEST(GameAsCsv, ReadsBackOddNamesAsTheyAre) {
   for (const std::string& name : OddNames) {
     SampleGame sample;

@@ -9,6 +9,7 @@
 #include "archive/GameArchive.h"
 #include "archive/GameKeeper.h"
 #include "archive/GamesPass.h"
+#include "archive/PendingCuts.h"
 #include "archive/history/PrintedRanking.h"
 #include "core/text/Filled.h"
 #include "platform/RuntimeError.h"
@@ -73,6 +74,15 @@ class RewrittenFile {
   Files& disk_;
   const std::string path_;
 };
+
+/// 0 for a file that does not tell: forgetting in it will tell why.
+std::uint64_t LengthIfTold(const Files& disk, const std::string& path) noexcept {
+  try {
+    return disk.FileLen(path);
+  } catch (const RuntimeError&) {
+    return 0;
+  }
+}
 
 /// How much of so many bytes a file has; it may be told wrong, since it fails on nothing.
 double WrittenShare(const Files& disk, const std::string& path, std::uint64_t bytes) noexcept {
@@ -162,10 +172,10 @@ Forgotten ForgetMember::Forget(const OnStep& onStep) {
   bytesOfAll_ = 1;
   bytesDone_ = 0;
   for (const std::string& file : files) {
-    bytesOfAll_ += parts_.Disk.FileLen(file);
+    bytesOfAll_ += LengthIfTold(parts_.Disk, file);
   }
   for (const std::string& file : files) {
-    bytesOfFile_ = parts_.Disk.FileLen(file);
+    bytesOfFile_ = LengthIfTold(parts_.Disk, file);
     if (forgotten.Stopped || !ForgetIn(file, forgotten, onStep)) {
       forgotten.Stopped = true;
       forgotten.Failures.push_back(Filled(parts_.Strings.Text(OwnText::ForgetNotDone), {NameOfFile(file)}));
@@ -221,6 +231,7 @@ bool ForgetMember::WriteAnew(Database& database, const std::string& file, const 
         known.Forget(number);
       }
     }
+    PendingCuts(database).Drop(persons.Numbers);
     scope.Commit();
   }
   CheckRoomFor(parts_.Disk.FileLen(file), file);

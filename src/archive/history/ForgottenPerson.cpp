@@ -1,9 +1,11 @@
 #include "archive/history/ForgottenPerson.h"
 
 #include <functional>
+#include <string>
 #include <utility>
 
-#include "core/game/DallasId.h"
+#include "archive/PendingCuts.h"
+#include "core/game/IsButton.h"
 #include "platform/RuntimeError.h"
 #include "platform/Sql.h"
 
@@ -27,7 +29,7 @@ ForgottenPerson::ForgottenPerson(std::int32_t number, Database& members)
 }
 
 void ForgottenPerson::Add(const MemberMark& mark) {
-  if (!mark.DallasId.empty() && mark.DallasId != NoDallasId) {
+  if (IsButton(mark.DallasId)) {
     buttons_.insert(mark.DallasId);
   }
   if (!mark.Digest.empty()) {
@@ -37,7 +39,12 @@ void ForgottenPerson::Add(const MemberMark& mark) {
 
 void ForgottenPerson::Read(const std::string& path, std::unique_ptr<Database> archive) {
   KnownMembers known(*archive, members_);
-  Archive read{.Path = path, .Open = std::move(archive), .Known = known.All(), .Numbers = {}};
+  const bool hasPendingCut = PendingCuts(*archive).Read().contains(number_);
+  Archive read{.Path = path,
+               .Open = std::move(archive),
+               .Known = known.All(),
+               .Numbers = {},
+               .HasPendingCut = hasPendingCut};
   if (!read.Known.empty()) {
     const MemberMark today = known.Read({number_})[number_];
     Add(today);
@@ -64,7 +71,11 @@ void ForgottenPerson::Finish() {
       ReadGuestButtons(archive);
       return true;
     });
-    numbers_[archive.Path] = archive.Numbers;
+    std::set<std::int32_t>& numbers = numbers_[archive.Path];
+    numbers = archive.Numbers;
+    if (!IfReadable([&] { return IsSomebodyElse(archive); })) {
+      numbers.insert(number_);
+    }
   }
   std::erase_if(guestButtons_, [this](const std::string& button) { return IsOfAnother(button); });
   archives_.clear();
@@ -103,8 +114,7 @@ void ForgottenPerson::ReadGuestButtons(const Archive& archive) {
   for (const std::int32_t number : numbers) {
     archive.Open->Statements().Query("SELECT DISTINCT DallasID FROM GamePlayers WHERE MemberID = $1",
                                      {std::int64_t{number}}, [this](const SqlRow& row) {
-                                       if (const std::string button = row.Text(0);
-                                           !button.empty() && button != NoDallasId) {
+                                       if (const std::string button = row.Text(0); IsButton(button)) {
                                          guestButtons_.insert(button);
                                        }
                                      });
@@ -117,10 +127,37 @@ bool ForgottenPerson::IsOfAnother(const std::string& button) {
                      {button, std::int64_t{number_}}) > 0;
 }
 
-GamePersons ForgottenPerson::In(const std::string& path) const {
-  GamePersons persons{.Numbers = {number_}, .GuestButtons = guestButtons_, .TakesButtons = true};
-  if (const auto found = numbers_.find(path); found != numbers_.end()) {
-    persons.Numbers.insert(found->second.begin(), found->second.end());
+/// True if an archive or a copy knows another person under the number of today.
+bool ForgottenPerson::IsSomebodyElse(const Archive& archive) const {
+  const auto known = archive.Known.find(number_);
+  const bool isToldByNumberAlone = digests_.empty() && buttons_.empty();
+  return !isToldByNumberAlone && known != archive.Known.end() && known->second != MemberMark{} &&
+         !archive.Numbers.contains(number_) && !archive.HasPendingCut && !SharesAGame(archive);
+}
+
+/// True if a game names the number in an old copy, and in the archive in use, which knows the person by it:
+/// his name and his button are others since then.
+bool ForgottenPerson::SharesAGame(const Archive& archive) const {
+  const Archive& inUse = archives_.front();
+  if (!inUse.Numbers.contains(number_)) {
+    return false;
   }
-  return persons;
+  constexpr const char* games =
+      "SELECT Games.GameID, Played FROM Games JOIN GamePlayers ON GamePlayers.GameID = Games.GameID "
+      "WHERE MemberID = $1";
+  std::set<std::pair<std::int64_t, std::string>> named;
+  inUse.Open->Statements().Query(games, {std::int64_t{number_}},
+                                 [&named](const SqlRow& row) { named.emplace(row.Integer(0), row.Text(1)); });
+  bool shares = false;
+  archive.Open->Statements().Query(games, {std::int64_t{number_}}, [&](const SqlRow& row) {
+    shares = shares || named.contains({row.Integer(0), row.Text(1)});
+  });
+  return shares;
+}
+
+GamePersons ForgottenPerson::In(const std::string& path) const {
+  const auto found = numbers_.find(path);
+  return {.Numbers = found == numbers_.end() ? std::set{number_} : found->second,
+          .GuestButtons = guestButtons_,
+          .TakesButtons = true};
 }

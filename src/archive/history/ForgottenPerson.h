@@ -13,7 +13,7 @@
 
 /// Who is to be forgotten: under which numbers and buttons he stands in the archive and in each of its
 /// copies. In an old copy a person can have another number or another button than today, and games in which
-/// nobody knew his number name him by his button alone.
+/// nobody knew his number name him by his button alone. His number of today can be another one's there.
 class ForgottenPerson {
  public:
   /// `members` must outlive this object. Reads it, and throws RuntimeError as it does.
@@ -36,6 +36,7 @@ class ForgottenPerson {
     std::unique_ptr<Database> Open;
     KnownMembers::Marks Known;
     std::set<std::int32_t> Numbers;  ///< of the person
+    bool HasPendingCut = false;      ///< of the number of today: later games there name the person
   };
 
   void Add(const MemberMark& mark);
@@ -43,6 +44,8 @@ class ForgottenPerson {
   bool FindNumbers(Archive& archive);
   void ReadGuestButtons(const Archive& archive);
   bool IsOfAnother(const std::string& button);
+  bool IsSomebodyElse(const Archive& archive) const;
+  bool SharesAGame(const Archive& archive) const;
 
   const std::int32_t number_;
   Database& members_;

@@ -1,5 +1,6 @@
 #include "archive/import/MembersOfFiles.h"
 
+#include "core/game/IsButton.h"
 #include "platform/Sql.h"
 
 void MembersOfFiles::Settle(Game& game) {
@@ -11,7 +12,7 @@ void MembersOfFiles::Settle(Game& game) {
     if (!player.Active) {
       continue;
     }
-    const bool hasButton = !player.DallasID.empty() && player.DallasID != NoDallasId;
+    const bool hasButton = IsButton(player.DallasID);
     if (!hasButton) {
       player.MemberIndex = 0;
     } else if (player.MemberIndex == 0 || !Has(player.MemberIndex, player.DallasID)) {

@@ -359,6 +359,21 @@ TEST_F(ForgottenMember, WhoPlaysAgainAfterAStopStaysInTheNewGames) {
             "5");
 }
 
+TEST_F(ForgottenMember, IsNotEveryGuestWhoseFileToldNoButton) {
+  Game.Players(Blue7).MemberIndex = 5;
+  Game.Players(Blue7).DallasID = "0";
+  Archive->Keep(State());
+  Game.Players(Blue7).MemberIndex = 0;
+  const std::int64_t guests = Archive->Keep(State());
+  InArchive("UPDATE GamePlayers SET GuestName = 'Ann' WHERE PlayerIndex = 40 AND GameID = " +
+            std::to_string(guests));
+  EXPECT_EQ(Count(), 4);
+  EXPECT_EQ(Forget().Games, 4);
+  EXPECT_EQ(Query("SELECT GuestName FROM GamePlayers WHERE PlayerIndex = 40 AND GameID = " +
+                  std::to_string(guests)),
+            "Ann");
+}
+
 TEST_F(ForgottenMember, NeedsRoomOnTheDisk) {
   class FullDisk : public LinuxFiles {
    public:
