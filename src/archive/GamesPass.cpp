@@ -130,8 +130,7 @@ void GamesPass::ReadCandidates(Sql& sql) {
   sql.Query("SELECT GameID FROM GameFiles WHERE GameID > $1 AND GameID <= $2 AND State > 0", {below, next_},
             [this](const SqlRow& row) { candidates_.push_back(row.Integer(0)); });
   std::ranges::sort(candidates_, std::ranges::greater());
-  const auto doubles = std::ranges::unique(candidates_);
-  candidates_.erase(doubles.begin(), doubles.end());
+  candidates_.erase(std::unique(candidates_.begin(), candidates_.end()), candidates_.end());
   next_ = below;
 }
 
