@@ -78,7 +78,7 @@ class Appearance {
       }
     }
     place_ = place;
-    if (changed_.size() < fewest) {
+    if (changed_.size() < Fewest) {
       GiveUp("nothing to see has appeared");
     }
   }
@@ -93,7 +93,7 @@ class Appearance {
   }
 
  private:
-  static constexpr std::size_t fewest = 1000;
+  static constexpr std::size_t Fewest = 1000;
 
   struct Pixel {
     int X;
@@ -120,13 +120,13 @@ class Running {
   ~Running() {
     kill(-group_, SIGKILL);
     process_.waitForFinished(Patience);
-    QThread::msleep(clearing);
+    QThread::msleep(Clearing);
   }
   Running(const Running&) = delete;
   Running& operator=(const Running&) = delete;
 
  private:
-  static constexpr int clearing = 300;  ///< until its windows are gone, milliseconds
+  static constexpr int Clearing = 300;  ///< until its windows are gone, milliseconds
   QProcess process_;
   pid_t group_ = 0;
 };

@@ -11,7 +11,7 @@ namespace {
 
 /// Where a window needs no events in between: some 20 milliseconds each.
 constexpr std::int64_t GamesOfAWindow = 500;
-constexpr std::int64_t PackedBytesOfAStep = 24 * 1024;
+constexpr std::int64_t PackedBytesOfAStep = 24 << 10;
 constexpr std::size_t MostNumbersInAQuery = 200;
 
 /// The players of a range of games who may be one of the persons. `values` get the buttons from $3 on.

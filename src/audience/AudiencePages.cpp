@@ -148,8 +148,9 @@ std::vector<AudiencePages::PlacedTotal> AudiencePages::TotalsOn(int page) const 
   std::vector<PlacedTotal> placed;
   for (int i = 0; i < shown; ++i) {
     const AudienceTotal& total = results_.Totals[static_cast<std::size_t>((first + i) % teams)];
+    const int line = 1 + i / layout_.TotalsPerLine;  // below the header
     const double left = layout_.Margin + (i % layout_.TotalsPerLine) * layout_.TotalWidth;
-    const double top = layout_.Margin + (1 + i / layout_.TotalsPerLine) * layout_.Pitch;
+    const double top = layout_.Margin + line * layout_.Pitch;
     QRectF area(left, top, layout_.TotalWidth - TotalGapAtLeast * capital, layout_.Pitch);
     const QRectF badge = TakeLeft(area, BadgeSide * capital, TotalSignGap * capital);
     placed.push_back({total, BadgeIn(badge, capital), area});

@@ -120,11 +120,14 @@ QStringList BrokenInto(const QString& text, int lines, bool bold) {
     const QStringList pieces = Pieces(whole);
     const QFontMetricsF metrics(FontOfPixels(ReferencePixels, bold));
     const double most = metrics.horizontalAdvance(whole);
-    for (double width = most / lines; width < most; width *= step) {
-      QStringList broken = LinesNoWiderThan(width, pieces, metrics);
-      if (broken.size() <= lines) {
-        return broken;
-      }
+    double width = most / lines;
+    QStringList broken = LinesNoWiderThan(width, pieces, metrics);
+    while (width < most && broken.size() > lines) {
+      width *= step;
+      broken = LinesNoWiderThan(width, pieces, metrics);
+    }
+    if (broken.size() <= lines) {
+      return broken;
     }
   }
   return {whole};

@@ -293,7 +293,7 @@ std::optional<ResultsHost::Moment> ResultsHost::ThisEvening(const std::string& s
 
 std::optional<ResultsHost::Moment> ResultsHost::Played() const {
   const std::string now = parts_.Time.Now();
-  if (const auto played = ThisEvening(parts_.Time.Stamp(parts_.Session.Game().GameDate))) {
+  if (auto played = ThisEvening(parts_.Time.Stamp(parts_.Session.Game().GameDate))) {
     return played;
   }
   return isLoaded_ ? std::nullopt : std::optional(Moment{parts_.Elapsed.Elapsed(), HoursAndMinutes(now)});

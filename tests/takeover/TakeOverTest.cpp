@@ -5,6 +5,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QTableView>
+#include <QTimer>
 
 #include "platform/qt/QtEventPump.h"
 #include "tests/fakes/FakeFileDialog.h"

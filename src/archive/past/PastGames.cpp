@@ -374,6 +374,7 @@ std::vector<std::int64_t> PastGames::SelectedGames() const {
     }
   }
   std::vector<std::int64_t> games;
+  games.reserve(rows.size());
   for (const int row : rows) {
     games.push_back(games_.Games()[static_cast<std::size_t>(row)]);
   }

@@ -254,12 +254,12 @@ TEST_F(WindowOfPastGames, NeitherDeletesNorBringsBackWhileTheDiskIsNarrow) {
 }
 
 TEST_F(WindowOfPastGames, BringsGamesWithLargeFilesBackInShortSteps) {
-  constexpr int many = 20;
+  constexpr int many = 90;
   Game game(venue.Strings);
   FillRandomly(game, 40, 7);
   std::vector<std::int64_t> games;
-  for (int minute = 10; minute < 10 + many; ++minute) {
-    const std::string played = "2026-11-20 20:" + std::to_string(minute) + ":00";
+  for (int i = 10; i < 10 + many; ++i) {
+    const std::string played = "2026-11-20 2" + std::to_string(i / 50) + ":" + std::to_string(10 + i % 50) + ":00";
     game.GameDate = played;
     games.push_back(access.Archive().Keep({.Game = game, .Mission = "None", .Played = played}));
   }

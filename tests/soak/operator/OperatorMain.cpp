@@ -1,6 +1,7 @@
 #include <QApplication>
 #include <QImage>
 #include <QTimer>
+#include <algorithm>
 #include <cstdio>
 #include <fstream>
 #include <optional>
@@ -99,7 +100,9 @@ class RandomOperator : public QObject {
   static constexpr int CommandsBeforeStumbling = 20;
 
   void Note(const std::string& command) {
-    trace_ << given_ << " " << command << std::endl;
+    std::string line = command;
+    std::ranges::replace(line, '\n', ' ');  // a command may name a text of several lines
+    trace_ << given_ << " " << line << std::endl;
     watchdog_.NoteCommand(command);
   }
 

@@ -164,8 +164,8 @@ TEST_F(OwnHost, EndsAConnectionWhoseRequestTakesTooLong) {
 
 TEST_F(OwnHost, LeavesAConnectionThatWasAnsweredMoreTime) {
   RawClient phone(socket.Served.Port);
-  const std::string host_ = "127.0.0.1:" + std::to_string(socket.Served.Port);
-  phone.Send("GET / HTTP/1.1\r\nHost: " + host_ + "\r\n\r\n");
+  const std::string name = "127.0.0.1:" + std::to_string(socket.Served.Port);
+  phone.Send("GET / HTTP/1.1\r\nHost: " + name + "\r\n\r\n");
   RunUntil(1);
   for (int tries = 0; tries < 100 && !visitors.Any(); ++tries) {
     pollfd wait{.fd = host->Handle(), .events = POLLIN, .revents = 0};

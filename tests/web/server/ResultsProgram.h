@@ -32,12 +32,12 @@ class RawClient {
     sockaddr_in own{};
     own.sin_family = AF_INET;
     inet_pton(AF_INET, from, &own.sin_addr);
-    bind(socket_.Number(), reinterpret_cast<sockaddr*>(&own), sizeof own);
     sockaddr_in address{};
     address.sin_family = AF_INET;
     address.sin_port = htons(port);
     address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-    connected_ = connect(socket_.Number(), reinterpret_cast<sockaddr*>(&address), sizeof address) == 0;
+    connected_ = bind(socket_.Number(), reinterpret_cast<sockaddr*>(&own), sizeof own) == 0 &&
+                 connect(socket_.Number(), reinterpret_cast<sockaddr*>(&address), sizeof address) == 0;
   }
 
   bool Connected() const { return connected_; }
