@@ -26,7 +26,7 @@ std::size_t RowsAtOnce(GameNumbers games) {
 
 /// The same where the files of the games are read, and those of games that may be the same.
 std::size_t FilesAtOnce(Sql& archive, GameNumbers games) {
-  constexpr std::int64_t enoughBytes = 12 * 1024;
+  constexpr std::int64_t enoughBytes = 12 << 10;
   const std::size_t most = RowsAtOnce(games);
   std::size_t count = 0;
   for (std::int64_t bytes = 0; count < most && bytes < enoughBytes; ++count) {
