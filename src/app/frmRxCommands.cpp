@@ -220,6 +220,7 @@ void frmRx::UpdateFirmware() {
 
 void frmRx::ManageRemotely() {
   keeping_->BeginPull(GameSource::Radio);
+  AudienceState& audience = audience_->State();
   bool withGuns = false;
   RemoteManage({.MSComm1 = services_.MSComm1,
                 .Port = *commPort_,
@@ -232,10 +233,17 @@ void frmRx::ManageRemotely() {
                     [&](int index) {
                       downloadedGuns_.ComesOtherwise(index);
                       withGuns = true;
+                    },
+                .Fetching = [&](int fetched, int present) { audience.TellReceived(fetched, present); },
+                .FetchEnded =
+                    [&] {
+                      if (!withGuns) {  // else the hall waits for the scores, which are made below
+                        audience.EndPull(false);
+                      }
                     }},
                this)
       .exec();
-  audience_->State().EndPull(withGuns);
+  audience.EndPull(withGuns);
   session_.CalculateScores();
 }
 

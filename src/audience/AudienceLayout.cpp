@@ -66,7 +66,6 @@ double LargestCapital(const AudiencePlace& place, const AudienceContents& conten
 
 /// Gives the first page its large rows: three winners, or fewer where the others would have no row left.
 void PlaceWinners(AudienceLayout& layout, double rowLines, double width, const AudienceContents& contents) {
-  constexpr int most = 3;
   constexpr double largest = 1.6;
   constexpr double smallest = 1.25;
   layout.FirstRows = layout.Rows;
@@ -74,7 +73,7 @@ void PlaceWinners(AudienceLayout& layout, double rowLines, double width, const A
     return;
   }
   const double wide = width / LeastNamedRow(contents);
-  for (int winners = std::min(most, contents.Players); winners > 0; --winners) {
+  for (int winners = std::min(MostLargeWinners, contents.Players); winners > 0; --winners) {
     const int others = contents.Players > winners ? 1 : 0;
     const double scale = std::min({largest, wide, (rowLines - others) / winners});
     if (scale >= smallest) {

@@ -6,6 +6,9 @@
 /// Capitals that stand under a smaller angle than this, in minutes of arc, cannot be read from that far.
 inline constexpr double LegibleMinutes = 16;
 
+/// How many winners stand in larger letters, where there is room.
+inline constexpr int MostLargeWinners = 3;
+
 /// Height of capitals in millimetres that are seen under this angle at a distance in metres.
 double CapitalMillimetres(double metres, double minutes = LegibleMinutes);
 

@@ -154,5 +154,18 @@ void AudienceSettings::ShowConsequence() {
       std::to_string(std::lround(CapitalMillimetres(setup.Metres, layout.Minutes)));
   const std::string rows = std::to_string(layout.Columns * layout.Rows);
   const OwnText text = isTooSmall ? OwnText::AudienceTooSmall : OwnText::AudienceLetters;
-  ui_->Consequence->setText(QString::fromStdString(Filled(parts_.Strings.Text(text), {millimetres, rows})));
+  std::string told = Filled(parts_.Strings.Text(text), {millimetres, rows});
+  if (layout.Winners < MostLargeWinners) {
+    const OwnText winners = layout.Winners > 0 ? OwnText::AudienceFewWinners : OwnText::AudienceNoWinners;
+    told.append("\n").append(Filled(parts_.Strings.Text(winners), {std::to_string(layout.Winners)}));
+  }
+  ui_->Consequence->setText(QString::fromStdString(told));
+  MakeRoom();
+}
+
+void AudienceSettings::MakeRoom() {
+  layout()->activate();
+  if (const int needed = layout()->totalHeightForWidth(width()); isVisible() && height() < needed) {
+    resize(width(), needed);
+  }
 }

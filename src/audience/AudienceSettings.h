@@ -41,6 +41,8 @@ class AudienceSettings : public QDialog {
   void ChoosePicture();
   void ShowPicture(const std::string& path);
   void ShowConsequence();
+  /// A longer text below the entries makes the window higher, and no entry lower.
+  void MakeRoom();
 
   std::unique_ptr<Ui::AudienceSettings> ui_;
   const Parts parts_;

@@ -36,9 +36,11 @@ void AudienceState::BeginPull() {
 }
 
 void AudienceState::TellReceived(int received, int expected) {
+  const bool isNew = received != received_ || expected != expected_;
+  pulling_ = true;
   received_ = received;
   expected_ = expected;
-  Tell(View() == AudienceView::Incoming);
+  Tell(isNew && View() == AudienceView::Incoming);
 }
 
 void AudienceState::EndPull(bool withGuns) {

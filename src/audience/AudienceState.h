@@ -34,7 +34,8 @@ class AudienceState {
   void SetAddress(const std::string& address);
   const std::string& Address() const { return address_; }
 
-  /// A pull begins; then `received` of `expected` guns have come in; then it ends, with guns or without.
+  /// A pull begins, at the latest with its first count; then `received` of `expected` guns have come in; then
+  /// it ends, with guns or without.
   void BeginPull();
   void TellReceived(int received, int expected);
   void EndPull(bool withGuns);

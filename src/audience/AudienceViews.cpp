@@ -73,13 +73,15 @@ std::optional<CodeLayout> BelowEachOther(const QRectF& page, const QSizeF& headi
 
 /// The code beside the texts.
 std::optional<CodeLayout> SideBySide(const QRectF& page, const QSizeF& heading, const QSizeF& address) {
+  constexpr double gapShare = 0.02;
+  const double gap = gapShare * page.width();
   const double texts = std::max(heading.width(), address.width());
-  const double side = std::min(page.width() - texts, page.height());
+  const double side = std::min(page.width() - gap - texts, page.height());
   const double height = heading.height() + address.height();
   if (side <= 0 || height > page.height()) {
     return std::nullopt;
   }
-  const double left = page.left() + side;
+  const double left = page.left() + side + gap;
   const double spare = (page.height() - height) / 2;
   CodeLayout layout;
   layout.Code = QRectF(page.left(), page.top(), side, page.height());

@@ -66,17 +66,20 @@ void AudienceWindow::keyPressEvent(QKeyEvent* event) {
 }
 
 double DiagonalOf(const QScreen& screen) {
+  return DiagonalOf(screen.physicalSize());
+}
+
+double DiagonalOf(const QSizeF& sides) {
   constexpr double millimetresPerInch = 25.4;
   constexpr double least = 10;
   constexpr double most = 300;
   constexpr double usual = 40;
-  const QSizeF size = screen.physicalSize();
   // Televisions that do not know their size tell the ratio of its sides in centimetres: 16 by 9, 160 by 90.
   constexpr QSizeF ratio(1600, 900);
-  if (size == ratio) {
+  if (sides == ratio) {
     return usual;
   }
-  const double inches = std::hypot(size.width(), size.height()) / millimetresPerInch;
+  const double inches = std::hypot(sides.width(), sides.height()) / millimetresPerInch;
   return inches >= least && inches <= most ? inches : usual;
 }
 

@@ -40,5 +40,8 @@ class AudienceWindow : public QWidget {
 /// The diagonal that a screen says of itself, in inches; what is usual where it says nothing sensible.
 double DiagonalOf(const QScreen& screen);
 
+/// The same for the sides of a screen in millimetres.
+double DiagonalOf(const QSizeF& sides);
+
 /// The size of a screen in its own pixels.
 QSize ScreenPixels(const QScreen& screen);

@@ -3,10 +3,13 @@
 #include <gmock/gmock.h>
 
 #include <QLineEdit>
+#include <set>
 
 #include "audience/AudienceSettings.h"
 #include "audience/GuestNameEntry.h"
+#include "devices/radio/RemoteManage.h"
 #include "members/Members.h"
+#include "tests/app/AnsweringRed1.h"
 #include "tests/support/Frames.h"
 #include "tests/support/GameFiles.h"
 #include "tests/support/OnScreen.h"
@@ -240,6 +243,53 @@ TEST_F(BoardOfTheAudience, ShowsAPullByItselfOnceItIsScored) {
   EXPECT_THAT(seen, testing::Each(AudienceView::Incoming));
   EXPECT_EQ(Control().State().View(), AudienceView::Results);
   EXPECT_THAT(Names(), ElementsAre("Blue 0"));
+}
+
+TEST_F(BoardOfTheAudience, CountsTheGunsOfAPullByRadioAndShowsThemOnceTheyAreScored) {
+  Start();
+  venue.Trigger("mnuAudienceBoard");
+  AnsweringRed1 gun(venue);
+  std::vector<std::string> seen;
+  const WhileModal<RemoteManage> window([&](RemoteManage& remote) {
+    venue.Port.OnOutput = [&](std::uint8_t byte) { gun.Hear(byte); };
+    ::Press(remote, "SearchGunsButton");
+    EXPECT_EQ(Control().State().View(), AudienceView::Idle);
+    QObject::connect(&Control(), &AudienceBoard::Changed, &remote, [&] {
+      EXPECT_EQ(Control().State().View(), AudienceView::Incoming);
+      seen.push_back(std::to_string(Control().State().Received()) + "/" +
+                     std::to_string(Control().State().Expected()));
+    });
+    ::Press(remote, "GetScoresButton");
+    QObject::disconnect(&Control(), &AudienceBoard::Changed, &remote, nullptr);
+    EXPECT_EQ(Control().State().View(), AudienceView::Incoming);
+    remote.close();
+  });
+  venue.Press("RemoteManageButton");
+  EXPECT_EQ(window.Runs(), 1);
+  EXPECT_THAT(seen, ElementsAre("0/1", "1/1"));
+  EXPECT_EQ(Control().State().View(), AudienceView::Results);
+  EXPECT_THAT(Names(), ElementsAre("Red 1"));
+}
+
+TEST_F(BoardOfTheAudience, ShowsTheVenueAgainWhereNoGunCameInByRadio) {
+  Start();
+  venue.Trigger("mnuAudienceBoard");
+  AnsweringRed1 gun(venue);
+  gun.IsSilent = true;
+  std::set<AudienceView> seen;
+  const WhileModal<RemoteManage> window([&](RemoteManage& remote) {
+    venue.Port.OnOutput = [&](std::uint8_t byte) {
+      seen.insert(Control().State().View());
+      gun.Hear(byte);
+    };
+    ::Press(remote, "SearchGunsButton");
+    ::Press(remote, "GetScoresButton");
+    EXPECT_THAT(seen, ElementsAre(AudienceView::Idle, AudienceView::Incoming));
+    EXPECT_EQ(Control().State().View(), AudienceView::Idle);
+    remote.close();
+  });
+  venue.Press("RemoteManageButton");
+  EXPECT_EQ(window.Runs(), 1);
 }
 
 TEST_F(BoardOfTheAudience, NamesGuestsUntilTheNextGame) {

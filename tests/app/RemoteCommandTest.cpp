@@ -2,16 +2,13 @@
 
 #include <QTableView>
 #include <QToolButton>
-#include <chrono>
 
 #include "devices/radio/RemoteManage.h"
-#include "tests/devices/radio/HealthyGun.h"
-#include "tests/support/Venue.h"
+#include "tests/app/AnsweringRed1.h"
 #include "tests/support/WhileModal.h"
 
 namespace {
 
-using std::chrono::milliseconds;
 using testing::ElementsAre;
 
 /// The window as the program opens it.
@@ -19,24 +16,8 @@ class RemoteCommand : public testing::Test {
  protected:
   RemoteCommand() { venue.Start(); }
 
-  /// The gun Red 1 takes a byte from the line.
-  void AnswerAsRed1(std::uint8_t byte) {
-    sent_.push_back(byte);
-    if (sent_.size() < 3 || sent_.size() < sent_[2] + 4U) {
-      return;
-    }
-    const Bytes packet(sent_.begin() + 14, sent_.end() - 1);
-    sent_.clear();
-    if (packet[1] == 33) {
-      venue.Events.At(milliseconds(5),
-                      [this, packet] { venue.Port.Receive(Received(33, AnswerTo(packet))); });
-    }
-  }
-
   Venue venue;
-
- private:
-  Bytes sent_;
+  AnsweringRed1 gun{venue};
 };
 
 TEST_F(RemoteCommand, OpensTheWindowByMenuAndButton) {
@@ -55,7 +36,7 @@ TEST_F(RemoteCommand, OpensTheWindowByMenuAndButton) {
 TEST_F(RemoteCommand, RecalculatesTheBoardAfterwards) {
   EXPECT_EQ(venue.RowCount("TeamScores"), 0);
   const WhileModal<RemoteManage> window([this](RemoteManage& remote) {
-    venue.Port.OnOutput = [this](std::uint8_t byte) { AnswerAsRed1(byte); };
+    venue.Port.OnOutput = [this](std::uint8_t byte) { gun.Hear(byte); };
     ::Press(remote, "SearchGunsButton");
     ::Press(remote, "GetScoresButton");
     remote.close();
@@ -69,7 +50,7 @@ TEST_F(RemoteCommand, RecalculatesTheBoardAfterwards) {
 TEST_F(RemoteCommand, TellsTheStatusLineWhichGunsItCountedTwice) {
   venue.LoadGame(GameFile(PlayerOf(2) + PlayerOf(40)));
   const WhileModal<RemoteManage> window([this](RemoteManage& remote) {
-    venue.Port.OnOutput = [this](std::uint8_t byte) { AnswerAsRed1(byte); };
+    venue.Port.OnOutput = [this](std::uint8_t byte) { gun.Hear(byte); };
     ::Press(remote, "SearchGunsButton");
     ::Press(remote, "GetScoresButton");
     remote.close();

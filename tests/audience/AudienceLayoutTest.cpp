@@ -147,6 +147,15 @@ TEST(AudienceLayout, ShowsAllTotalsOnEachPageWhereAHallIsUsual) {
   }
 }
 
+TEST(AudienceLayout, HasRoomForLargeWinnersUpToAQuarterOfTheInchesInMetres) {
+  const AudienceContents evening{
+      .Players = 40, .Teams = 3, .Place = 2, .Gun = 3, .Name = 8, .Points = 4, .Total = 5};
+  for (const double inches : {24.0, 32.0, 43.0, 55.0, 65.0, 75.0, 86.0}) {
+    EXPECT_EQ(LayOut(PlaceOf(inches, inches / 4.1), evening).Winners, 3) << inches;
+    EXPECT_EQ(LayOut(PlaceOf(inches, inches / 3.7), evening).Winners, 0) << inches;
+  }
+}
+
 TEST(AudienceLayout, GrowsWhereThatTakesNoFurtherPage) {
   const AudienceLayout few = LayOut(PlaceOf(55, 5), ContentsOf(6));
   EXPECT_EQ(few.Pages, 1);

@@ -8,11 +8,9 @@
 
 #include "audience/AudienceColours.h"
 #include "audience/AudienceText.h"
-#include "tests/support/Contrast.h"
+#include "tests/audience/PaintedLetters.h"
 
 namespace {
-
-constexpr double LeastContrastForTheHall = 7;
 
 AudienceResults ResultsOfPlayers(int players) {
   AudienceResults results;
@@ -76,6 +74,45 @@ TEST(AudienceColours, AreLegibleFromAfar) {
     EXPECT_GE(::Contrast(Team(team).rgb(), Page().rgb()), LeastContrastForTheHall) << team;
     EXPECT_GE(::Contrast(BadgeLetters().rgb(), Team(team).rgb()), LeastContrastForTheHall) << team;
     EXPECT_NE(Team(team), QColor(Qt::white)) << team;
+  }
+}
+
+/// Letters of this part of a page are painted so that they can be read, and on the ground that is meant.
+void ExpectLegible(const QImage& page, const QRectF& part, const QColor& ground) {
+  const PaintedLetters letters = LettersIn(page, part.toRect());
+  EXPECT_EQ(QColor(letters.Ground), ground);
+  EXPECT_GT(letters.Pixels, 500);
+  EXPECT_GT(letters.Legible, letters.Pixels / 2);
+}
+
+TEST(AudiencePages, ArePaintedInLettersThatCanBeReadFromAfar) {
+  const AudienceResults results = ResultsOfPlayers(12);
+  for (const Language language : {Language::English, Language::SimplifiedChinese}) {
+    const StringTable strings(language);
+    for (const AudiencePlace& place : {FullHd(55, 10), FullHd(43, 10)}) {
+      const AudiencePages pages(results, strings, place);
+      const AudienceLayout& layout = pages.Layout();
+      ASSERT_EQ(layout.Columns, 1);
+      const QImage page = Painted(pages, place, 0);
+      const double width = place.Width - 2 * layout.Margin;
+      double top = layout.Margin;
+      for (int line = 0; line < 1 + layout.TotalLines; ++line) {
+        ExpectLegible(page, {layout.Margin, top, width, layout.Pitch}, AudienceColours::Page());
+        top += layout.Pitch;
+      }
+      for (int row = 0; row < layout.Winners + layout.FirstRows; ++row) {
+        const double pitch = layout.Pitch * (row < layout.Winners ? layout.WinnerScale : 1);
+        const QRectF line(layout.Margin, top, width, 0.9 * pitch);
+        const int team = results.Players[static_cast<std::size_t>(row)].Team;
+        ExpectLegible(page, line, AudienceColours::Row(team));
+        // The badge stands in the left half, the name of a winner may reach into it in the same colour.
+        const QRectF left(layout.Margin, top, layout.Capital * layout.WinnerScale * 4, 0.9 * pitch);
+        const QRect badge = AreaOfColour(page, left.toRect(), AudienceColours::Team(team).rgb());
+        const PaintedLetters letter = LettersIn(page, badge.adjusted(0, 0, -badge.width() / 3, 0));
+        EXPECT_GT(letter.Legible, 50);
+        top += pitch;
+      }
+    }
   }
 }
 

@@ -12,16 +12,21 @@
 #include <QLineEdit>
 #include <QSpinBox>
 #include <optional>
+#include <set>
 
 #include "core/text/Filled.h"
 #include "tests/fakes/FakeFileDialog.h"
 #include "tests/fakes/FakeFiles.h"
 #include "tests/fakes/FakeMessageBoxes.h"
 #include "tests/support/Controls.h"
+#include "tests/support/OnScreen.h"
 
 namespace {
 
+using testing::EndsWith;
 using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::Not;
 using testing::SizeIs;
 
 class AudienceSettingsWindow : public testing::Test {
@@ -90,10 +95,50 @@ TEST_F(AudienceSettingsWindow, HoldsWhatTheOperatorEnters) {
 TEST_F(AudienceSettingsWindow, TellsHowLargeTheLettersBecome) {
   Open({"", 10, 86, 8, "", "", true});
   EXPECT_THAT(Consequence(), HasSubstr("mm high"));
-  EXPECT_THAT(Consequence(), testing::Not(HasSubstr("too small")));
+  EXPECT_THAT(Consequence(), Not(HasSubstr("too small")));
   Find<QDoubleSpinBox>(*window, "Distance").setValue(40);
   Find<QDoubleSpinBox>(*window, "Diagonal").setValue(24);
   EXPECT_THAT(Consequence(), HasSubstr("too small"));
+}
+
+TEST_F(AudienceSettingsWindow, SaysWhereWinnersHaveNoRoomInLargeLetters) {
+  for (const Language language : {Language::English, Language::SimplifiedChinese}) {
+    Open({"", 5, 55, 8, "", "", true}, language);
+    const std::string none = strings->Text(OwnText::AudienceNoWinners);
+    EXPECT_THAT(Consequence(), Not(HasSubstr(none)));
+    std::set<std::string> fewer;
+    for (double metres = 5; metres < 30; metres += 0.5) {
+      Find<QDoubleSpinBox>(*window, "Distance").setValue(metres);
+      for (const char* count : {"1", "2"}) {
+        if (Consequence().ends_with(Filled(strings->Text(OwnText::AudienceFewWinners), {count}))) {
+          fewer.insert(count);
+        }
+      }
+    }
+    EXPECT_THAT(fewer, Not(IsEmpty()));
+    EXPECT_THAT(Consequence(), EndsWith(none));
+  }
+}
+
+TEST_F(AudienceSettingsWindow, GrowsWithWhatItSaysAndKeepsItsEntriesWhole) {
+  for (const Language language : {Language::English, Language::SimplifiedChinese}) {
+    for (const int points : {9, 14}) {
+      const FontOfSize font(points);
+      Open({"", 2, 86, 8, "North", "/home/venue-picture.png", true}, language);
+      const int before = window->height();
+      Find<QDoubleSpinBox>(*window, "Distance").setValue(50);
+      Find<QDoubleSpinBox>(*window, "Diagonal").setValue(24);
+      EXPECT_GT(window->height(), before);
+      QCoreApplication::processEvents();
+      for (const char* entry : {"VenueName", "PictureName"}) {
+        const auto& line = Find<QLineEdit>(*window, entry);
+        EXPECT_GE(line.height(), line.minimumSizeHint().height()) << entry;
+        EXPECT_GE(line.width(), 150) << entry;
+      }
+      const auto& told = Find<QLabel>(*window, "Consequence");
+      EXPECT_GE(told.height(), told.heightForWidth(told.width()));
+    }
+  }
 }
 
 TEST_F(AudienceSettingsWindow, TakesAPictureAndGivesItBack) {

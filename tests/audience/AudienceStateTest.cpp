@@ -51,6 +51,16 @@ TEST_F(Audience, SeesAPullComeIn) {
   EXPECT_EQ(changes, 3);
 }
 
+TEST_F(Audience, SeesAPullThatBeginsWithItsFirstCount) {
+  state.TellReceived(0, 3);
+  EXPECT_EQ(state.View(), AudienceView::Incoming);
+  EXPECT_EQ(state.Expected(), 3);
+  state.EndPull(false);
+  EXPECT_EQ(state.View(), AudienceView::Idle);
+  state.BeginPull();
+  EXPECT_EQ(state.Expected(), 0);
+}
+
 TEST_F(Audience, SeesResultsByThemselvesOnlyWhereTheBoardFollows) {
   Pull(7);
   EXPECT_EQ(state.View(), AudienceView::Idle);

@@ -10,6 +10,7 @@
 #include "audience/AudienceColours.h"
 #include "audience/AudienceText.h"
 #include "core/text/StringTable.h"
+#include "tests/audience/PaintedLetters.h"
 
 namespace {
 
@@ -51,6 +52,24 @@ QString Own(Language language, OwnText text) {
   return QString::fromStdString(StringTable(language).Text(text));
 }
 
+/// The white square of the code, which reaches over the middle of the picture's height.
+QRect CodeOf(const QImage& picture) {
+  const int middle = picture.height() / 2;
+  int left = 0;
+  while (left < picture.width() && picture.pixel(left, middle) != qRgb(255, 255, 255)) {
+    ++left;
+  }
+  int top = middle;
+  while (top > 0 && picture.pixel(left, top - 1) == qRgb(255, 255, 255)) {
+    --top;
+  }
+  int bottom = middle;
+  while (bottom + 1 < picture.height() && picture.pixel(left, bottom + 1) == qRgb(255, 255, 255)) {
+    ++bottom;
+  }
+  return {left, top, bottom - top + 1, bottom - top + 1};
+}
+
 class ViewInEachHall : public testing::TestWithParam<Language> {};
 
 TEST_P(ViewInEachHall, HasALegibleAddressBesideTheCode) {
@@ -86,6 +105,46 @@ TEST_P(ViewInEachHall, NamesTheVenueLegiblyWithAndWithoutAPicture) {
       });
       EXPECT_GE(minutes, LegibleMinutes) << hall.Inches << " inches, " << hall.Metres << " m";
     }
+  }
+}
+
+TEST_P(ViewInEachHall, IsPaintedInLettersThatStandOut) {
+  const AudiencePlace place = PlaceIn({55, 10});
+  const std::vector<std::function<void(QPainter&)>> views = {
+      [&](QPainter& painter) {
+        AudienceViews::PaintMessage(painter, place, Own(GetParam(), OwnText::AudienceIncoming),
+                                    QStringLiteral("12 / 40"));
+      },
+      [&](QPainter& painter) {
+        AudienceViews::PaintVenue(painter, place, QStringLiteral("Laser Arena North"), {});
+      }};
+  for (const auto& paint : views) {
+    QImage picture(place.Width, place.Height, QImage::Format_RGB32);
+    picture.fill(AudienceColours::Page());
+    QPainter painter(&picture);
+    paint(painter);
+    painter.end();
+    const PaintedLetters letters = LettersIn(picture, picture.rect());
+    EXPECT_EQ(QColor(letters.Ground), AudienceColours::Page());
+    EXPECT_GT(letters.Pixels, 5000);
+    EXPECT_GT(letters.Legible, letters.Pixels * 3 / 4);
+  }
+}
+
+TEST_P(ViewInEachHall, KeepsTheTextsOffTheCode) {
+  for (const Hall& hall : UsableHalls()) {
+    const AudiencePlace place = PlaceIn(hall);
+    QImage picture(place.Width, place.Height, QImage::Format_RGB32);
+    picture.fill(AudienceColours::Page());
+    QPainter painter(&picture);
+    AudienceViews::PaintCode(painter, place, Own(GetParam(), OwnText::AudiencePhone),
+                             QStringLiteral("http://192.168.178.120:8080"));
+    painter.end();
+    const QRect code = CodeOf(picture);
+    ASSERT_GT(code.width(), place.Height / 3);
+    // Right of the code there is a strip in which nothing stands.
+    const QRect strip(code.right() + 1, code.top(), place.Width / 100, code.height());
+    EXPECT_EQ(LettersIn(picture, strip).Pixels, 0) << hall.Inches << " inches, " << hall.Metres << " m";
   }
 }
 

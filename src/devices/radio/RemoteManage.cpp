@@ -2,6 +2,7 @@
 
 #include <QEvent>
 #include <QHeaderView>
+#include <QScopeGuard>
 #include <QScrollBar>
 #include <QtMath>
 #include <algorithm>
@@ -132,6 +133,12 @@ void RemoteManage::SearchForGuns() {
 
 void RemoteManage::GetScores() {
   const int run = latestRun_ + 1;
+  fetchRun_ = run;
+  const auto ended = qScopeGuard([this] {
+    if (parts_.FetchEnded) {
+      parts_.FetchEnded();
+    }
+  });
   Work([this](RadioLink& link) {
     ScoreFetch(link, parts_.Events, parts_.Time, parts_.Strings, parts_.Game, guns_, *this, parts_.BeforeGun)
         .GetScores();
@@ -205,6 +212,9 @@ void RemoteManage::ClearGunList() {
 
 void RemoteManage::RefreshGunList() {
   list_->Show(guns_, maxPlayerId_);
+  if (latestRun_ == fetchRun_ && parts_.Fetching) {
+    parts_.Fetching(GunsFetched(), GunsPresent());
+  }
   parts_.Events.DoEvents();
 }
 

@@ -40,6 +40,10 @@ class RemoteManage : public QDialog, private RadioDisplay {
     ::Game& Game;
     /// Hears the record of each gun right before its scores are added to the game.
     std::function<void(int)> BeforeGun = {};
+    /// Hears, while scores are fetched, of how many of the guns present they are there.
+    std::function<void(int fetched, int present)> Fetching = {};
+    /// Hears the end of each fetch, however it ends.
+    std::function<void()> FetchEnded = {};
   };
 
   RemoteManage(const Parts& parts, QWidget* parent);
@@ -80,6 +84,7 @@ class RemoteManage : public QDialog, private RadioDisplay {
   GunTable guns_;
   std::int16_t maxPlayerId_;  ///< 128 or 224: number of ids that the last search tried
   int latestRun_ = 0;
+  int fetchRun_ = 0;    ///< the latest that fetched scores
   int stoppedRun_ = 0;  ///< the last run that the operator stopped
   Commands commands_;
 };

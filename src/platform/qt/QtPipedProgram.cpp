@@ -7,6 +7,19 @@
 
 namespace {
 
+/// Ends without a word where its owner ends while it still runs.
+class OwnedProcess final : public QProcess {
+ public:
+  using QProcess::QProcess;
+  ~OwnedProcess() override {
+    disconnect();
+    if (state() != NotRunning) {
+      kill();
+      waitForFinished();
+    }
+  }
+};
+
 /// Ends a process that nobody listens to any more, without waiting for its end.
 void LeaveToItself(QProcess& process) {
   process.disconnect();
@@ -50,7 +63,7 @@ void QtPipedProgram::Launch() {
     arguments << QString::fromStdString(words_[at]);
   }
   // The application's child: it ends with the program at the latest.
-  process_ = new QProcess(QCoreApplication::instance());
+  process_ = new OwnedProcess(QCoreApplication::instance());
   process_->setProcessEnvironment(QProcessEnvironment());
   process_->setStandardErrorFile(QProcess::nullDevice());
   process_->setWorkingDirectory(QStringLiteral("/"));

@@ -13,6 +13,7 @@ namespace {
 
 using testing::ElementsAre;
 using testing::IsEmpty;
+using testing::Pair;
 
 TEST_P(RemoteWindow, OpensIdleAndEmpty) {
   EXPECT_EQ(window.windowTitle(), QStringLiteral("Remote Management"));
@@ -217,6 +218,30 @@ TEST_P(RemoteWindow, IsDrivenByTheKeyboard) {
   EXPECT_TRUE(Find<QRadioButton>(window, "Guns224").isChecked());
   QTest::keyClick(&window, Qt::Key_Return);
   EXPECT_EQ(Frames.size(), 448U);
+}
+
+TEST_P(RemoteWindow, TellsOfHowManyGunsPresentTheScoresAreThere) {
+  guns = {33, 40, 41};
+  silent = 40;
+  Press("SearchGunsButton");
+  EXPECT_THAT(counts, IsEmpty());
+  Press("GetScoresButton");
+  EXPECT_THAT(counts, ElementsAre(Pair(0, 3), Pair(1, 3), Pair(1, 3), Pair(1, 3), Pair(1, 3), Pair(2, 3)));
+  EXPECT_EQ(fetchesEnded, 1);
+  counts.clear();
+  silent = 0;
+  Press("GetScoresButton");
+  EXPECT_THAT(counts, ElementsAre(Pair(2, 3), Pair(3, 3)));
+  EXPECT_EQ(fetchesEnded, 2);
+}
+
+TEST_P(RemoteWindow, TellsTheEndOfAFetchThatFails) {
+  guns = {33};
+  Press("SearchGunsButton");
+  Port.FailNextOpen(8002);
+  Press("GetScoresButton");
+  EXPECT_EQ(fetchesEnded, 1);
+  EXPECT_FALSE(Boxes.Boxes.empty());
 }
 
 TEST_P(RemoteWindow, IsCaredFor) {

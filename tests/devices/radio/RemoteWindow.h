@@ -71,5 +71,17 @@ class RemoteWindow : public testing::TestWithParam<Language>, protected RadioSit
   Bytes guns;
   int silent = 0;  ///< this gun answers the search alone
   Game game{Strings};
-  RemoteManage window{{Port, Line, Events, Boxes, Time, Strings, game}, nullptr};
+  std::vector<std::pair<int, int>> counts;  ///< what the window told of its fetches
+  int fetchesEnded = 0;
+  RemoteManage window{
+      {.MSComm1 = Port,
+       .Port = Line,
+       .Events = Events,
+       .Boxes = Boxes,
+       .Time = Time,
+       .Strings = Strings,
+       .Game = game,
+       .Fetching = [this](int fetched, int present) { counts.emplace_back(fetched, present); },
+       .FetchEnded = [this] { ++fetchesEnded; }},
+      nullptr};
 };

@@ -4,6 +4,8 @@
 #include <gmock/gmock.h>
 #include <unistd.h>
 
+#include <QCoreApplication>
+
 #include "platform/linux/Descriptor.h"
 #include "platform/qt/QtEventPump.h"
 
@@ -81,6 +83,23 @@ TEST_F(Piped, SaysNothingMoreWhenItIsStopped) {
   WaitForEnd();
   EXPECT_EQ(output, "started\nagain\n");
   EXPECT_EQ(ends, 1);
+}
+
+QStringList warnings;
+
+TEST_F(Piped, EndsWithTheApplicationWithoutAWord) {
+  program.Start({"/bin/sh", "-c", "echo started; exec sleep 1000"}, 0ms);
+  ASSERT_EQ(events.WaitFor([this] { return output == "started\n"; }, 20s), WaitResult::Met);
+  program.Stop();
+  const QList<QProcess*> owned = QCoreApplication::instance()->findChildren<QProcess*>();
+  ASSERT_FALSE(owned.isEmpty());
+  EXPECT_EQ(owned.last()->state(), QProcess::Running);
+  warnings.clear();
+  const QtMessageHandler before = qInstallMessageHandler(
+      [](QtMsgType, const QMessageLogContext&, const QString& text) { warnings.append(text); });
+  qDeleteAll(owned);
+  qInstallMessageHandler(before);
+  EXPECT_EQ(warnings, QStringList());
 }
 
 TEST_F(Piped, CanBeStartedAgainWhenItEnds) {
