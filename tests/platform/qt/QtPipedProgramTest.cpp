@@ -4,8 +4,11 @@
 #include <gmock/gmock.h>
 #include <unistd.h>
 
+#include <filesystem>
+
 #include "platform/linux/Descriptor.h"
 #include "platform/qt/QtEventPump.h"
+#include "tests/support/TemporaryFolder.h"
 
 namespace {
 
@@ -81,6 +84,24 @@ TEST_F(Piped, SaysNothingMoreWhenItIsStopped) {
   WaitForEnd();
   EXPECT_EQ(output, "started\nagain\n");
   EXPECT_EQ(ends, 1);
+}
+
+TEST_F(Piped, IsTheProgramThatWasKeptWhenItsFileHasBeenReplaced) {
+  const TemporaryFolder folder;
+  const std::string path = folder / "helper";
+  std::filesystem::copy_file("/bin/echo", path);
+  const KeptProgram kept(path);
+  QtPipedProgram updated(&kept);
+  updated.OnOutput = program.OnOutput;
+  updated.OnEnd = program.OnEnd;
+  std::filesystem::remove(path);
+  std::filesystem::copy_file("/bin/true", path);
+  updated.Start({path, "as before"}, 0ms);
+  WaitForEnd();
+  EXPECT_EQ(output, "as before\n");
+  updated.Start({"/bin/echo", "another"}, 0ms);
+  EXPECT_EQ(events.WaitFor([this] { return ends == 2; }, 20s), WaitResult::Met);
+  EXPECT_EQ(output, "as before\nanother\n");
 }
 
 TEST_F(Piped, CanBeStartedAgainWhenItEnds) {
