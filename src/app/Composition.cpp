@@ -36,7 +36,8 @@ Composition::Composition()
       log_(files_, clock_, UserDataFolder(folders_)),
       logFolder_(UserDataFolder(folders_) + "/logs"),
       readerSettings_(files_, UserDataFolder(folders_) + "/tessarine.ini"),
-      wordProcessor_(ModuleFolder()) {
+      wordProcessor_(ModuleFolder()),
+      resultsProgram_(ModuleFolder() + "/tessarine-results") {
   UseDialogTexts(dialogTexts_, strings_.TextLanguage());
 }
 
@@ -61,8 +62,8 @@ Composition::Composition()
           .SoundPlayer = soundPlayer_,
           .SoundConverter = soundConverter_,
           .Addresses = addresses_,
-          .MakePipedProgram = [] { return std::make_unique<QtPipedProgram>(); },
-          .ResultsProgram = ModuleFolder() + "/tessarine-results",
+          .MakePipedProgram = [this] { return std::make_unique<QtPipedProgram>(&resultsProgram_); },
+          .ResultsProgram = resultsProgram_.Name(),
           .ButtonSwipe = [this] { return SwipeButton(); },
           .Wire = &wire_,
           .Archives = &archives_,

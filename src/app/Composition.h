@@ -10,6 +10,7 @@
 #include "core/text/StringTable.h"
 #include "devices/buttons/SerialOneWire.h"
 #include "platform/libreoffice/LibreOffice.h"
+#include "platform/linux/KeptProgram.h"
 #include "platform/linux/LinuxAddresses.h"
 #include "platform/linux/LinuxComputer.h"
 #include "platform/linux/LinuxFiles.h"
@@ -91,4 +92,5 @@ class Composition {
   QtSoundPlayer soundPlayer_;
   SndfileConverter soundConverter_;
   LinuxAddresses addresses_;
+  KeptProgram resultsProgram_;
 };

@@ -193,7 +193,7 @@ OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const OldDa
                     .Row = [&](const std::vector<Value>& row,
                                const std::vector<std::size_t>& unread) { import.AddRow(row, unread); },
                     .Unreadable = RefuseTable});
-  const ChildEnd end = RunChild(reader_, {old.Path, old.Table}, silence_,
+  const ChildEnd end = RunChild(reader_.Path(), {old.Path, old.Table}, silence_,
                                 {.OnOutput =
                                      [&](std::string_view bytes) {
                                        stream.Take(bytes);

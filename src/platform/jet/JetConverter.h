@@ -9,6 +9,7 @@
 #include "platform/Files.h"
 #include "platform/OldDatabases.h"
 #include "platform/jet/ConversionBusyTimeout.h"
+#include "platform/linux/KeptProgram.h"
 
 /// Converts Jet files to SQLite. A separate program reads them, since a damaged file can hang or crash the
 /// library.
@@ -16,8 +17,9 @@ class JetConverter : public OldDatabases {
  public:
   static constexpr std::chrono::milliseconds LongestSilence = std::chrono::seconds(20);
 
-  /// `reader` is the path of tessarine-jet-reader; one that writes nothing for `silence` is taken to have
-  /// hung. `onProgress` is called at least 20 times a second, with the number of rows read so far.
+  /// `reader` is the path of tessarine-jet-reader, which is used as it is now, whatever replaces it; one that
+  /// writes nothing for `silence` is taken to have hung. `onProgress` is called at least 20 times a second,
+  /// with the number of rows read so far.
   JetConverter(
       Files& disk, std::string reader, std::chrono::milliseconds silence = LongestSilence,
       std::function<void(std::int64_t rows)> onProgress = [](std::int64_t) {})
@@ -35,7 +37,7 @@ class JetConverter : public OldDatabases {
   bool Join(const std::string& newFile, const OldDatabase& old, ConversionSteps& steps) const;
 
   Files& disk_;
-  std::string reader_;
+  KeptProgram reader_;
   std::chrono::milliseconds silence_;
   std::function<void(std::int64_t rows)> onProgress_;
   std::chrono::milliseconds lockWait_ = ConversionBusyTimeout;

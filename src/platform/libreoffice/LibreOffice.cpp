@@ -24,7 +24,8 @@ std::string NewPipeName() {
 
 }  // namespace
 
-LibreOffice::LibreOffice(std::string folder) : folder_(std::move(folder)) {}
+LibreOffice::LibreOffice(const std::string& folder)
+    : module_(folder + "/libtessarine-office.so"), hostProgram_(folder + "/tessarine-office-host") {}
 
 LibreOffice::~LibreOffice() {
   LibreOffice::Quit();
@@ -37,7 +38,7 @@ void LibreOffice::LoadModule() {
   // A call to a LibreOffice that has just died must fail instead of ending this program.
   std::signal(SIGPIPE, SIG_IGN);
   // Never unloaded: LibreOffice's libraries keep threads of their own.
-  void* const module = dlopen((folder_ + "/libtessarine-office.so").c_str(), RTLD_NOW | RTLD_LOCAL);
+  void* const module = dlopen(module_.Path().c_str(), RTLD_NOW | RTLD_LOCAL);
   void* const symbol = module == nullptr ? nullptr : dlsym(module, NewOfficeClientName);
   if (symbol == nullptr) {
     throw RuntimeError(Fault::CannotCreateObject, dlerror());
@@ -55,18 +56,18 @@ void LibreOffice::Start() {
 
 void LibreOffice::StartHost() {
   const std::string office = client_->ProgramFolder() + "/soffice.bin";
-  const std::string host = folder_ + "/tessarine-office-host";
   if (access(office.c_str(), X_OK) != 0) {
     throw RuntimeError(Fault::CannotCreateObject, "There is no program " + office);
   }
   pipe_ = NewPipeName();
   try {
     Pipe leash;
-    host_.emplace(std::vector<std::string>{host, office, pipe_},
+    host_.emplace(std::vector<std::string>{hostProgram_.Path(), office, pipe_},
                   StandardStreams{.Input = leash.ReadEnd.Number()});
     leash_ = std::move(leash.WriteEnd);
   } catch (const RuntimeError&) {
-    throw RuntimeError(Fault::CannotCreateObject, "The program " + host + " cannot be started");
+    throw RuntimeError(Fault::CannotCreateObject,
+                       "The program " + hostProgram_.Name() + " cannot be started");
   }
 }
 

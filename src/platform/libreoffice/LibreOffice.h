@@ -8,6 +8,7 @@
 
 #include "platform/WordProcessor.h"
 #include "platform/linux/ChildProcess.h"
+#include "platform/linux/KeptProgram.h"
 
 class OfficeClient;
 
@@ -16,8 +17,8 @@ class OfficeClient;
 /// program, which kills it and cleans up when this program ends, however that happens.
 class LibreOffice : public WordProcessor {
  public:
-  /// `folder` holds the module and the host program.
-  explicit LibreOffice(std::string folder);
+  /// `folder` holds the module and the host program, which are used as they are now, whatever replaces them.
+  explicit LibreOffice(const std::string& folder);
   ~LibreOffice() override;
 
   void Start() override;
@@ -34,7 +35,8 @@ class LibreOffice : public WordProcessor {
   bool HostRuns();
   void ForgetHost();
 
-  std::string folder_;
+  KeptProgram module_;
+  KeptProgram hostProgram_;
   std::unique_ptr<OfficeClient> client_;
   std::string pipe_;  ///< name on which LibreOffice listens
   std::optional<ChildProcess> host_;

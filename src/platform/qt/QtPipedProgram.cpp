@@ -38,7 +38,7 @@ void LeaveToItself(QProcess& process) {
 
 }  // namespace
 
-QtPipedProgram::QtPipedProgram() {
+QtPipedProgram::QtPipedProgram(const KeptProgram* kept) : kept_(kept) {
   pause_.setSingleShot(true);
   QObject::connect(&pause_, &QTimer::timeout, &pause_, [this] { Launch(); });
 }
@@ -72,7 +72,8 @@ void QtPipedProgram::Launch() {
     close_range(STDERR_FILENO + 1, ~0U, CLOSE_RANGE_CLOEXEC);
   });
   Listen(*process_);
-  process_->start(QString::fromStdString(words_.front()), arguments);
+  const bool isKept = kept_ != nullptr && kept_->Name() == words_.front();
+  process_->start(QString::fromStdString(isKept ? kept_->Path() : words_.front()), arguments);
 }
 
 void QtPipedProgram::Listen(QProcess& process) {

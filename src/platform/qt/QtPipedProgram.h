@@ -5,11 +5,14 @@
 #include <QTimer>
 
 #include "platform/PipedProgram.h"
+#include "platform/linux/KeptProgram.h"
 
 /// Needs a QCoreApplication.
 class QtPipedProgram final : public PipedProgram {
  public:
-  QtPipedProgram();
+  /// Where the program of the name of `kept` is to be started, that one is. `kept` may be null, and must
+  /// outlive this.
+  explicit QtPipedProgram(const KeptProgram* kept = nullptr);
   ~QtPipedProgram() override;
 
   void Start(const std::vector<std::string>& words, std::chrono::milliseconds pause) override;
@@ -22,6 +25,7 @@ class QtPipedProgram final : public PipedProgram {
   void Listen(QProcess& process);
   void HasEnded();
 
+  const KeptProgram* kept_;
   QTimer pause_;
   std::vector<std::string> words_;
   QPointer<QProcess> process_;

@@ -184,4 +184,27 @@ TEST(OldFormat, ThatCannotBeReadWithoutTheReaderIsReported) {
   EXPECT_THAT(thrown.Text, HasSubstr("/nowhere/tessarine-jet-reader"));
 }
 
+TEST(OldFormat, IsReadByTheReaderThatWasThereAtFirst) {
+  const TemporaryFolder folder;
+  const std::string reader = folder / "reader";
+  const auto install = [&](const std::string& name) {
+    WriteFile(reader + ".new", "#!/bin/sh\ntouch '" + folder / name + "'\nexit 1\n");
+    std::filesystem::permissions(reader + ".new", std::filesystem::perms::owner_all);
+    std::filesystem::rename(reader + ".new", reader);
+  };
+  WriteFile(folder / "x.mdb", std::string("\0\1\0\0", 4) + "Standard Jet DB" + std::string(4096 - 19, '\0'));
+  LinuxFiles disk;
+  install("first");
+  JetConverter converter(disk, reader);
+  install("second");
+  ConversionAnswers answers;
+  const Thrown thrown = ThrownBy([&] {
+    converter.Convert({folder / "x.mdb", "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb", ""},
+                      answers);
+  });
+  EXPECT_NE(thrown.Text, "");
+  EXPECT_TRUE(std::filesystem::exists(folder / "first"));
+  EXPECT_FALSE(std::filesystem::exists(folder / "second"));
+}
+
 }  // namespace

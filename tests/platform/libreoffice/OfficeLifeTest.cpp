@@ -47,6 +47,21 @@ TEST_F(Writer, IsStartedOnce) {
   EXPECT_THAT(Hosts(), SizeIs(1));
 }
 
+TEST_F(Writer, IsStartedByTheFilesThatWereThereAtFirst) {
+  for (const char* name : {"/libtessarine-office.so", "/tessarine-office-host"}) {
+    std::filesystem::copy_file(TESSARINE_PROGRAM_FOLDER + std::string(name), folder / name);
+  }
+  LibreOffice office(folder.Path());
+  for (const char* name : {"/libtessarine-office.so", "/tessarine-office-host"}) {
+    std::filesystem::remove(folder / name);
+    WriteFile(folder / name, "of another release");
+  }
+  ASSERT_TRUE(StartAndWait(office));
+  office.Add(Template)->Close();
+  office.Quit();
+  EXPECT_EQ(office.State(), WordState::Ended);
+}
+
 TEST_F(Writer, EndsWithAProgramThatCrashes) {
   const std::size_t profiles = Profiles();
   int ready[2];

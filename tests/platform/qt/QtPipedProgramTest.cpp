@@ -5,9 +5,11 @@
 #include <unistd.h>
 
 #include <QCoreApplication>
+#include <filesystem>
 
 #include "platform/linux/Descriptor.h"
 #include "platform/qt/QtEventPump.h"
+#include "tests/support/TemporaryFolder.h"
 
 namespace {
 
@@ -100,6 +102,24 @@ TEST_F(Piped, EndsWithTheApplicationWithoutAWord) {
   qDeleteAll(owned);
   qInstallMessageHandler(before);
   EXPECT_EQ(warnings, QStringList());
+}
+
+TEST_F(Piped, IsTheProgramThatWasKeptWhenItsFileHasBeenReplaced) {
+  const TemporaryFolder folder;
+  const std::string path = folder / "helper";
+  std::filesystem::copy_file("/bin/echo", path);
+  const KeptProgram kept(path);
+  QtPipedProgram updated(&kept);
+  updated.OnOutput = program.OnOutput;
+  updated.OnEnd = program.OnEnd;
+  std::filesystem::remove(path);
+  std::filesystem::copy_file("/bin/true", path);
+  updated.Start({path, "as before"}, 0ms);
+  WaitForEnd();
+  EXPECT_EQ(output, "as before\n");
+  updated.Start({"/bin/echo", "another"}, 0ms);
+  EXPECT_EQ(events.WaitFor([this] { return ends == 2; }, 20s), WaitResult::Met);
+  EXPECT_EQ(output, "as before\nanother\n");
 }
 
 TEST_F(Piped, CanBeStartedAgainWhenItEnds) {
