@@ -25,7 +25,7 @@ constexpr int PastGames = 5000;
 /// A session on databases of its own, all players members, with an archive or without.
 class Desk {
  public:
-  Desk(int players, bool hasArchive) {
+  Desk(int players, bool hasArchive) : players_(players) {
     std::filesystem::remove(venue_.MembersFile());
     MakeMembers(venue_.MembersFile(), PlayerCount);
     venue_.Open();
@@ -36,13 +36,32 @@ class Desk {
       keeper_.emplace(GameKeeper::Parts{Games(), *progress_, venue_.Time, venue_.Disk, venue_.Databases,
                                         venue_.Strings, venue_.Folder.Path(), venue_.Folder / "program"});
     }
-    Fill(players);
+    Fill();
     file_ = WriteGameFile(Games().Game(), "None");
     EndCommand();
   }
 
   Session& Games() { return venue_.session; }
   Player& First() { return *std::ranges::find(Games().Game().Players, true, &Player::Active); }
+
+  /// Puts a further game on the board, whose guns have all come in.
+  void Fill() {
+    Game& game = Games().Game();
+    ++games_;
+    if (players_ == PlayerCount) {
+      FillCompletely(game);
+    } else {
+      FillRandomly(game, players_, 7);
+    }
+    First().ShotCount += games_;
+    game.DataPresent = true;
+    game.GameDate = "21/05/2013 14:30";
+    for (int index = 1; index <= PlayerCount; ++index) {
+      game.Players(index).MemberIndex = game.Players(index).Active ? index : 0;
+      game.Players(index).Committed = false;
+    }
+    Games().CalculateScores();
+  }
 
   void BeginPull() {
     if (keeper_) {
@@ -78,22 +97,6 @@ class Desk {
   }
 
  private:
-  void Fill(int players) {
-    Game& game = Games().Game();
-    if (players == PlayerCount) {
-      FillCompletely(game);
-    } else {
-      FillRandomly(game, players, 7);
-    }
-    game.DataPresent = true;
-    game.GameDate = "21/05/2013 14:30";
-    for (int index = 1; index <= PlayerCount; ++index) {
-      game.Players(index).MemberIndex = game.Players(index).Active ? index : 0;
-      game.Players(index).Committed = false;
-    }
-    Games().CalculateScores();
-  }
-
   void EndCommand() {
     if (!keeper_) {
       return;
@@ -105,6 +108,8 @@ class Desk {
     }
   }
 
+  const int players_;
+  int games_ = 0;  ///< that were on the board
   OpenSession venue_;
   std::optional<GameProgress> progress_;
   std::optional<GameKeeper> keeper_;
@@ -146,6 +151,13 @@ const std::vector<Command>& AllCommands() {
          desk.First().ShotCount += 5;
          Recalculate(desk);
        }},
+      {"end of a new game's pull",
+       [](Desk& desk) {
+         desk.Games().ClearPlayerData();
+         desk.BeginPull();
+         desk.Fill();
+       },
+       Recalculate},
       {"Clear Game", GiveBonus, [](Desk& desk) { desk.Games().ClearPlayerData(); }},
       {"Load Game", Nothing, [](Desk& desk) { desk.Load(); }}};
   return commands;

@@ -122,10 +122,7 @@ int GameArchive::RemoveDeleted(const std::string& before, int most) {
   }
   WriteScope scope(archive_);
   for (const std::int64_t game : games) {
-    sql.Change("DELETE FROM sqlar WHERE name IN (SELECT Name FROM GameFiles WHERE GameID = $1)", {game});
-    sql.Change("DELETE FROM GameFiles WHERE GameID = $1", {game});
-    sql.Change("DELETE FROM GamePlayers WHERE GameID = $1", {game});
-    sql.Change("DELETE FROM Games WHERE GameID = $1", {game});
+    DeleteGame(sql, game);
   }
   scope.Commit();
   return static_cast<int>(games.size());

@@ -114,6 +114,13 @@ void WritePlayers(Sql& sql, std::int64_t gameId, const Game& game) {
   }
 }
 
+void DeleteGame(Sql& sql, std::int64_t gameId) {
+  sql.Change("DELETE FROM sqlar WHERE name IN (SELECT Name FROM GameFiles WHERE GameID = $1)", {gameId});
+  sql.Change("DELETE FROM GameFiles WHERE GameID = $1", {gameId});
+  sql.Change("DELETE FROM GamePlayers WHERE GameID = $1", {gameId});
+  sql.Change("DELETE FROM Games WHERE GameID = $1", {gameId});
+}
+
 std::string PlayedIn(Sql& sql, std::int64_t gameId) {
   std::string played;
   sql.Query("SELECT Played FROM Games WHERE GameID = $1 AND Deleted IS NULL", {gameId},

@@ -31,6 +31,9 @@ bool UpdateGame(Sql& sql, std::int64_t gameId, const GameState& state, const std
 /// Writes the rows of the game's players; names of guests stay in them.
 void WritePlayers(Sql& sql, std::int64_t gameId, const ::Game& game);
 
+/// Deletes all that the archive has of a game, its files too.
+void DeleteGame(Sql& sql, std::int64_t gameId);
+
 /// When the game was played; empty if the archive has no such game, or has deleted it.
 std::string PlayedIn(Sql& sql, std::int64_t gameId);
 

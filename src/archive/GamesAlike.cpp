@@ -139,10 +139,7 @@ std::optional<GameArchive::FoundState> GameArchive::FirstOf(const std::vector<St
 }
 
 std::string GameArchive::PlayedOf(std::int64_t gameId) {
-  std::string played;
-  archive_.Statements().Query("SELECT Played FROM Games WHERE GameID = $1 AND Deleted IS NULL", {gameId},
-                              [&played](const SqlRow& row) { played = row.Text(0); });
-  return played;
+  return PlayedIn(archive_.Statements(), gameId);
 }
 
 int GameArchive::BringBack(const std::vector<std::int64_t>& games) {

@@ -3,6 +3,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QScopeGuard>
+#include <algorithm>
 #include <array>
 #include <initializer_list>
 #include <optional>
@@ -17,6 +18,16 @@ namespace {
 
 constexpr std::array<CsvSeparator, 3> ExportSeparators = {CsvSeparator::Comma, CsvSeparator::Semicolon,
                                                           CsvSeparator::Tab};
+
+/// Some of the numbers, as the operator reads them.
+std::string FirstOf(const std::vector<std::string>& numbers) {
+  constexpr std::size_t most = 10;
+  std::string text;
+  for (std::size_t i = 0; i < std::min(most, numbers.size()); ++i) {
+    text.append(i == 0 ? "" : ", ").append(numbers[i]);
+  }
+  return text.append(numbers.size() > most ? ", ..." : "");
+}
 
 }  // namespace
 
@@ -91,12 +102,13 @@ bool ExportMembers::WriteTo(const std::string& path) {
       .ByteOrderMark = ui_->Mark->isChecked(),
       .History = ui_->History->isChecked()};
   RunProgress progress(*ui_->Progress, *ui_->Stop, parts_.Events, stopped_);
-  const std::optional<std::string> csv =
+  const std::optional<ExportedMembers> members =
       MembersAsCsv(*rows_, form, [&progress](double done) { return progress.GoOn(done); });
-  if (csv) {
-    parts_.Disk.ReplacePrivately(path, *csv);
+  if (members) {
+    parts_.Disk.ReplacePrivately(path, members->Csv);
+    notReadBack_ = members->NotReadBack;
   }
-  return csv.has_value();
+  return members.has_value();
 }
 
 void ExportMembers::Export() {
@@ -108,9 +120,13 @@ void ExportMembers::Export() {
     ShowState(parts_.Strings.Text(OwnText::ExportStopped));
     return;
   }
-  parts_.Boxes.Show(
-      Filled(parts_.Strings.Text(OwnText::MembersExported), {std::to_string(rows_->RecordCount()), path}),
-      DefaultBoxTitle, BoxIcon::Information);
+  std::string text =
+      Filled(parts_.Strings.Text(OwnText::MembersExported), {std::to_string(rows_->RecordCount()), path});
+  if (!notReadBack_.empty()) {
+    text.append("\n\n").append(
+        Filled(parts_.Strings.Text(OwnText::MembersNotReadBack), {FirstOf(notReadBack_)}));
+  }
+  parts_.Boxes.Show(text, DefaultBoxTitle, BoxIcon::Information);
   accept();
 }
 

@@ -3,6 +3,7 @@
 #include <QDialog>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "core/text/StringTable.h"
 #include "members/MemberExport.h"
@@ -54,5 +55,7 @@ class ExportMembers : public QDialog {
   const Parts parts_;
   Commands commands_;
   std::unique_ptr<Recordset> rows_;
+  std::vector<std::string>
+      notReadBack_;  ///< numbers of members whom an import would not give back as they are
   bool stopped_ = false;
 };

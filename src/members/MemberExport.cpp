@@ -1,7 +1,11 @@
 #include "members/MemberExport.h"
 
+#include <utility>
+
+#include "core/data/FieldValue.h"
 #include "members/MemberColumns.h"
 #include "members/MemberDates.h"
+#include "members/MemberRow.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -19,26 +23,34 @@ void WriteCell(CsvWriter& writer, const MemberColumn& column, const Value& value
 }
 
 /// Writes the row at the cursor, or nothing if another program has deleted it.
-void WriteMember(CsvWriter& writer, Recordset& rows, bool history) {
+void WriteMember(CsvWriter& writer, Recordset& rows, bool history, std::vector<std::string>& notReadBack) {
+  std::string number;
   try {
-    rows.Fields(MemberColumns.front().Name);
+    number = TextOf(rows.Fields(MemberColumns.front().Name));
   } catch (const RuntimeError& error) {
     if (error.Number() == Fault::RecordDeleted) {
       return;
     }
     throw;
   }
-  for (const MemberColumn& column : MemberColumns) {
+  bool readsBack = true;
+  for (std::size_t place = 0; place < MemberColumns.size(); ++place) {
+    const MemberColumn& column = MemberColumns[place];
     if (history || !column.IsHistory) {
-      WriteCell(writer, column, rows.Fields(column.Name));
+      const Value value = rows.Fields(column.Name);
+      WriteCell(writer, column, value);
+      readsBack = readsBack && ReadsBack(place, value);
     }
   }
   writer.EndRow();
+  if (!readsBack) {
+    notReadBack.push_back(std::move(number));
+  }
 }
 
 }  // namespace
 
-std::optional<std::string> MembersAsCsv(Recordset& rows, const MemberExportForm& form, const GoOn& goOn) {
+std::optional<ExportedMembers> MembersAsCsv(Recordset& rows, const MemberExportForm& form, const GoOn& goOn) {
   constexpr int rowsAtOnce = 100;
   CsvWriter writer(form.Separator, form.ByteOrderMark);
   for (const MemberColumn& column : MemberColumns) {
@@ -47,16 +59,16 @@ std::optional<std::string> MembersAsCsv(Recordset& rows, const MemberExportForm&
     }
   }
   writer.EndRow();
-  std::string csv;
+  ExportedMembers members;
   for (rows.MoveFirst(); !rows.Eof(); rows.MoveNext()) {
-    WriteMember(writer, rows, form.History);
+    WriteMember(writer, rows, form.History, members.NotReadBack);
     if (rows.AbsolutePosition() % rowsAtOnce == 0) {
-      csv += writer.Take();
+      members.Csv += writer.Take();
       if (!goOn(static_cast<double>(rows.AbsolutePosition()) / rows.RecordCount())) {
         return std::nullopt;
       }
     }
   }
-  csv += writer.Take();
-  return csv;
+  members.Csv += writer.Take();
+  return members;
 }

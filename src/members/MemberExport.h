@@ -4,6 +4,7 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "exports/Csv.h"
 #include "platform/Database.h"
@@ -18,6 +19,12 @@ struct MemberExportForm {
   bool History = false;  ///< with the columns of the playing history
 };
 
-/// All members of `rows` as CSV, with a heading. Nothing if `goOn` has stopped it. Throws RuntimeError as the
-/// database does; a member deleted meanwhile by another program is left out.
-std::optional<std::string> MembersAsCsv(Recordset& rows, const MemberExportForm& form, const GoOn& goOn);
+struct ExportedMembers {
+  std::string Csv;  ///< with a heading
+  /// Numbers of the members of whom an import would refuse a value, or make another one of it.
+  std::vector<std::string> NotReadBack;
+};
+
+/// All members of `rows`. Nothing if `goOn` has stopped it. Throws RuntimeError as the database does; a
+/// member deleted meanwhile by another program is left out.
+std::optional<ExportedMembers> MembersAsCsv(Recordset& rows, const MemberExportForm& form, const GoOn& goOn);

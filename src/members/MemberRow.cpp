@@ -125,6 +125,22 @@ RowTrouble ReadMemberRow(const std::vector<CsvCell>& row, const ColumnUse& use, 
   return {};
 }
 
+bool ReadsBack(std::size_t column, const Value& stored) {
+  const ColumnKind kind = MemberColumns.at(column).Kind;
+  const bool isText = std::holds_alternative<std::string>(stored);
+  if (std::holds_alternative<std::monostate>(stored) || kind == ColumnKind::Text ||
+      (kind == ColumnKind::Number && !isText)) {
+    return true;
+  }
+  if (std::holds_alternative<Blob>(stored)) {
+    return false;
+  }
+  const std::string text = TextOf(stored);
+  const std::string_view written = kind == ColumnKind::Moment ? ExportedMoment(text) : text;
+  const std::optional<Value> read = ValueOf(written, kind, DateOrder::DayFirst);
+  return read && TextOf(*read) == text;
+}
+
 std::string NameOf(const MemberValues& values) {
   using namespace MemberPlace;
   const std::string first = TextIn(values, FirstName);

@@ -49,6 +49,9 @@ struct ColumnUse {
 /// Reads a row into `values`. Returns why it is refused, if it is.
 RowTrouble ReadMemberRow(const std::vector<CsvCell>& row, const ColumnUse& use, MemberValues& values);
 
+/// True if a file holds what an export writes of a stored value, and an import makes just that value of it.
+bool ReadsBack(std::size_t column, const Value& stored);
+
 /// First and last name, else the nickname, else the button: what tells the operator who it is.
 std::string NameOf(const MemberValues& values);
 

@@ -57,6 +57,16 @@ TEST_F(ExportWindow, WritesAFileThatOnlyThisUserCanRead) {
   EXPECT_FALSE(window->isVisible());
 }
 
+TEST_F(ExportWindow, TellsOfWhomAnImportWouldNotMakeTheSame) {
+  database->Statements().Change("UPDATE Members SET DallasID = '12' WHERE ContactID < 3", {});
+  Open();
+  PressExport(venue.Folder / "out.csv");
+  ASSERT_EQ(venue.Boxes.Boxes.size(), 1U);
+  EXPECT_THAT(venue.Boxes.Boxes[0].Text,
+              testing::EndsWith("\n\nAn import would refuse or change a button, a date or a number of these "
+                                "members: 1, 2"));
+}
+
 TEST_F(ExportWindow, FollowsItsChoices) {
   Open();
   EXPECT_FALSE(Find<QCheckBox>(*window, "History").isChecked());

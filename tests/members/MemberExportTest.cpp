@@ -26,7 +26,7 @@ class ExportOfMembers : public testing::Test {
  protected:
   std::string Csv() {
     const auto database = file.Open();
-    return *MembersAsCsv(*database->OpenRecordset("Members"), form, GoOnAlways);
+    return MembersAsCsv(*database->OpenRecordset("Members"), form, GoOnAlways)->Csv;
   }
 
   /// Imports `csv` into the empty table of another file.
@@ -126,6 +126,21 @@ TEST_F(ExportOfMembers, ImportedGivesEveryCodePointBack) {
   EXPECT_EQ(ContentsOf(other), ContentsOf(file));
 }
 
+TEST_F(ExportOfMembers, TellsOfWhomAnImportWouldNotMakeTheSame) {
+  file.Execute(
+      "DELETE FROM Members; INSERT INTO Members (ContactID, LastName, DallasID, Birthdate, TotalGamesPlayed, "
+      "AverageDamage) VALUES (1, 'A', '00000000000000A1', '1961-04-12 00:00:00', 3, 1.1), "
+      "(2, 'B', '00000000000000a2', NULL, 0, 0), (3, 'C', '12', NULL, 0, 0), "
+      "(4, 'D', '', '12/04/1961', 0, 0), (5, 'E', NULL, 'unknown', 0, 0), "
+      "(6, 'F', NULL, '1961-04-12 09:05:00', 2, 0), (7, 'G', NULL, '', -1, 0.3)");
+  const auto database = file.Open();
+  const auto rows = database->OpenRecordset("Members");
+  EXPECT_THAT(MembersAsCsv(*rows, form, GoOnAlways)->NotReadBack, testing::ElementsAre("2", "3", "4", "5"));
+  form.History = true;
+  EXPECT_THAT(MembersAsCsv(*rows, form, GoOnAlways)->NotReadBack,
+              testing::ElementsAre("2", "3", "4", "5", "7"));
+}
+
 TEST_F(ExportOfMembers, StopsWhereAsked) {
   const auto database = file.Open();
   EXPECT_FALSE(MembersAsCsv(*database->OpenRecordset("Members"), form, [](double) { return false; }));
@@ -135,7 +150,7 @@ TEST_F(ExportOfMembers, LeavesOutAMemberWhoWasDeletedMeanwhile) {
   const auto database = file.Open();
   const auto rows = database->OpenRecordset("Members");
   file.Execute("DELETE FROM Members WHERE ContactID = 2");
-  const std::string csv = *MembersAsCsv(*rows, form, GoOnAlways);
+  const std::string csv = MembersAsCsv(*rows, form, GoOnAlways)->Csv;
   EXPECT_EQ(csv.find("Belmont"), std::string::npos);
   EXPECT_NE(csv.find("O'Brien"), std::string::npos);
 }

@@ -3,6 +3,7 @@
 #include <charconv>
 #include <vector>
 
+#include "archive/GameRows.h"
 #include "platform/RuntimeError.h"
 
 namespace {
@@ -41,10 +42,7 @@ int DeleteGamesBefore(Database& archive, const std::string& time, int most) {
             {NoTime, time, std::int64_t{most}},
             [&games](const SqlRow& row) { games.push_back(row.Integer(0)); });
   for (const std::int64_t game : games) {
-    sql.Change("DELETE FROM sqlar WHERE name IN (SELECT Name FROM GameFiles WHERE GameID = $1)", {game});
-    sql.Change("DELETE FROM GameFiles WHERE GameID = $1", {game});
-    sql.Change("DELETE FROM GamePlayers WHERE GameID = $1", {game});
-    sql.Change("DELETE FROM Games WHERE GameID = $1", {game});
+    DeleteGame(sql, game);
   }
   scope.Commit();
   return static_cast<int>(games.size());

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <string_view>
+#include <utility>
 
 #include "archive/Entries.h"
 #include "archive/PlayedTime.h"
@@ -109,15 +110,17 @@ std::optional<GameFileTrouble> GameImport::TakeGame(const std::string& path, con
     return trouble;
   }
   const std::string played = TimePlayed(game.Game.GameDate, parts_.Disk.TimeOfChange(path), parts_.Time);
-  const Found found = SettleAndFind(game, played, breathe);
-  if (found.IsListed) {
-    ++known_;
-    return std::nullopt;
+  const std::optional<Found> found = SettleAndFind(game, played, breathe);
+  const bool isDeleted = found && found->As == KnownAs::Deleted;
+  if (!found || isDeleted) {
+    CheckSpaceForGames(parts_.Disk, parts_.UserDataFolder, parts_.Strings);
   }
-  CheckSpaceForGames(parts_.Disk, parts_.UserDataFolder, parts_.Strings);
-  if (found.Deleted) {
-    archive_.BringBack({*found.Deleted});
+  if (isDeleted) {
+    archive_.BringBack({found->GameId});
     ++broughtBack_;
+  }
+  if (found) {
+    NoteKnown(path, *found);
     return std::nullopt;
   }
   archive_.Keep({.Game = game.Game,
@@ -130,22 +133,34 @@ std::optional<GameFileTrouble> GameImport::TakeGame(const std::string& path, con
   return std::nullopt;
 }
 
-GameImport::Found GameImport::SettleAndFind(GameInFile& game, const std::string& played,
-                                            const Breath& breathe) {
+std::optional<GameImport::Found> GameImport::SettleAndFind(GameInFile& game, const std::string& played,
+                                                           const Breath& breathe) {
   using Among = GameArchive::Among;
-  if (archive_.Find(game.Game, game.Mission)) {
-    return {.IsListed = true};
+  if (const auto same = archive_.Find(game.Game, game.Mission)) {
+    return Found{KnownAs::Same, *same};
   }
   auto deleted = archive_.FindState(game.Game, game.Mission, Among::Deleted);
   breathe();
   members_.Settle(game.Game);
-  if (archive_.Find(game.Game, game.Mission) ||
-      archive_.FindAlike(game.Game, game.Mission, played, Among::Listed, breathe)) {
-    return {.IsListed = true};
+  if (const auto same = archive_.Find(game.Game, game.Mission)) {
+    return Found{KnownAs::Same, *same};
+  }
+  if (const auto alike = archive_.FindAlike(game.Game, game.Mission, played, Among::Listed, breathe)) {
+    return Found{KnownAs::Alike, alike->GameId};
   }
   if (!deleted) {
     deleted = archive_.FindAlike(game.Game, game.Mission, played, Among::Deleted, breathe);
   }
   breathe();
-  return {.Deleted = deleted ? std::optional(deleted->GameId) : std::nullopt};
+  return deleted ? std::optional(Found{KnownAs::Deleted, deleted->GameId}) : std::nullopt;
+}
+
+void GameImport::NoteKnown(const std::string& path, const Found& found) {
+  KnownGameFile file{.Path = path, .As = found.As, .Played = {}, .Mission = {}};
+  parts_.Archive.Statements().Query("SELECT Played, Mission FROM Games WHERE GameID = $1", {found.GameId},
+                                    [&file](const SqlRow& row) {
+                                      file.Played = row.Text(0);
+                                      file.Mission = row.Text(1);
+                                    });
+  known_.push_back(std::move(file));
 }

@@ -21,6 +21,21 @@ struct RefusedGameFile {
   GameFileTrouble Trouble;
 };
 
+/// How a file's game was there already, in the order of the operator's texts.
+enum class KnownAs {
+  Same,    ///< just as it is in the file
+  Alike,   ///< but for who its players are and which of them are committed
+  Deleted  ///< and was brought back
+};
+
+/// A file of a game that the archive had already, or that was in the folder twice.
+struct KnownGameFile {
+  std::string Path;
+  KnownAs As;
+  std::string Played;   ///< "YYYY-MM-DD HH:MM:SS", as the archive has it
+  std::string Mission;  ///< likewise
+};
+
 /// Takes game files into the archive, each as a game of its own with the figures that stand in it. A game
 /// that the archive has already is not added once more, whoever its members were taken for and whether or not
 /// they were committed; if it is a deleted one, it is brought back as it was.
@@ -55,9 +70,11 @@ class GameImport {
 
   std::size_t Imported() const { return imported_; }
   /// Files whose game was in the archive already, or twice in the folder.
-  std::size_t Known() const { return known_; }
+  std::size_t Known() const { return known_.size() - broughtBack_; }
   /// Games that had been deleted, and were brought back.
   std::size_t BroughtBack() const { return broughtBack_; }
+  /// The files of both.
+  const std::vector<KnownGameFile>& KnownFiles() const { return known_; }
   const std::vector<RefusedGameFile>& Refused() const { return refused_; }
 
  private:
@@ -66,22 +83,23 @@ class GameImport {
   std::optional<GameFileTrouble> TakeGame(const std::string& path, const Breath& breathe);
   /// What the archive has of a file's game.
   struct Found {
-    bool IsListed = false;
-    std::optional<std::int64_t> Deleted = {};  ///< number of the game, if it is deleted
+    KnownAs As;
+    std::int64_t GameId;
   };
 
   /// From now on new members get numbers above all that were imported; a failure is not told.
   void RaiseCounterIfPossible();
   /// Gives the players their members, unless the archive has the game just as it is in the file. Returns what
   /// it has of the game.
-  Found SettleAndFind(GameInFile& game, const std::string& played, const Breath& breathe);
+  std::optional<Found> SettleAndFind(GameInFile& game, const std::string& played, const Breath& breathe);
+  void NoteKnown(const std::string& path, const Found& found);
 
   const Parts parts_;
   GameArchive archive_;
   MembersOfFiles members_;
   std::vector<std::string> paths_;
   std::size_t imported_ = 0;
-  std::size_t known_ = 0;
   std::size_t broughtBack_ = 0;
+  std::vector<KnownGameFile> known_;
   std::vector<RefusedGameFile> refused_;
 };

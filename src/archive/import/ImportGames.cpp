@@ -29,6 +29,7 @@ ImportGames::ImportGames(const Parts& parts, QWidget* parent)
                                {ui_->OwnTable, static_cast<int>(OwnText::ImportGamesOwnTable)},
                                {ui_->Note, static_cast<int>(OwnText::ImportGamesNote)},
                                {ui_->RefusedLabel, static_cast<int>(OwnText::ImportGamesRefused)},
+                               {ui_->ListKnown, static_cast<int>(OwnText::ImportGamesListKnown)},
                                {ui_->Import, static_cast<int>(OwnText::ImportGamesStart)},
                                {ui_->Stop, static_cast<int>(OwnText::Stop)},
                                {ui_->CloseButton, 137}});
@@ -41,6 +42,7 @@ ImportGames::ImportGames(const Parts& parts, QWidget* parent)
   commands_.Connect(
       *ui_->Import, [this] { Import(); }, WhileBusy::Ignore);
   commands_.EndWaits = [this] { stopped_ = true; };
+  connect(ui_->ListKnown, &QCheckBox::toggled, &refused_, &RefusedFilesModel::ListKnown);
   connect(ui_->Stop, &QPushButton::clicked, this, [this] { stopped_ = true; });
   connect(ui_->CloseButton, &QPushButton::clicked, this, &QDialog::reject);
 }
@@ -80,7 +82,7 @@ void ImportGames::ChooseFolder() {
 }
 
 void ImportGames::Import() {
-  refused_.Show({}, {});
+  refused_.Show({}, {}, {});
   EnableEntries(false);
   ui_->Stop->setFocus();
   const auto ended = qScopeGuard([this] {
@@ -116,12 +118,14 @@ void ImportGames::ImportFrom(const std::string& folder) {
     failure = error.what();
   }
   ShowEnd(import, complete, failure);
-  refused_.Show(import ? import->Refused() : std::vector<RefusedGameFile>(), folder);
+  if (import) {
+    refused_.Show(import->Refused(), import->KnownFiles(), folder);
+  }
 }
 
 void ImportGames::EnableEntries(bool enabled) {
-  for (QWidget* entry :
-       std::initializer_list<QWidget*>{ui_->ChooseFolder, ui_->OwnTable, ui_->Import, ui_->Refused}) {
+  for (QWidget* entry : std::initializer_list<QWidget*>{ui_->ChooseFolder, ui_->OwnTable, ui_->Import,
+                                                        ui_->ListKnown, ui_->Refused}) {
     entry->setEnabled(enabled);
   }
 }

@@ -1,4 +1,5 @@
 #include <string_view>
+#include <utility>
 
 #include "core/gamefile/GameFile.h"
 #include "core/text/NumberForms.h"
@@ -70,14 +71,25 @@ void AddHeader(TreeWriter& tree, const Game& game, const std::string& missionNam
   tree.Close("GameHeader");
 }
 
-void AddHits(TreeWriter& tree, const Player& player, const OneBased<std::string, PlayerCount>& names) {
+/// The beginning of each shooter's element in a list of hits, which is the same in all of them.
+OneBased<std::string, PlayerCount> HitBeginnings(const OneBased<std::string, PlayerCount>& names) {
+  OneBased<std::string, PlayerCount> beginnings;
+  for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
+    TreeWriter hit;
+    hit.Open("HitByPlayer");
+    hit.AddElement("Index", std::int32_t{shooter});
+    hit.AddElement("PlayerID", names(shooter));
+    beginnings(shooter) = std::move(hit.Bytes);
+  }
+  return beginnings;
+}
+
+void AddHits(TreeWriter& tree, const Player& player, const OneBased<std::string, PlayerCount>& beginnings) {
   tree.Open("HitData");
   for (int shooter = 1; shooter <= PlayerCount; ++shooter) {
     const std::int32_t amount = player.HitByPlayer(shooter);
     if (amount > 0) {
-      tree.Open("HitByPlayer");
-      tree.AddElement("Index", std::int32_t{shooter});
-      tree.AddElement("PlayerID", names(shooter));
+      tree.Bytes += beginnings(shooter);
       tree.AddElement("Amount", amount);
       tree.Close("HitByPlayer");
     }
@@ -128,6 +140,7 @@ void WriteGameFile(const Game& game, const std::string& missionName,
   for (int index = 1; index <= PlayerCount; ++index) {
     names(index) = game.DisplayName(index);
   }
+  const OneBased<std::string, PlayerCount> hits = HitBeginnings(names);
   TreeWriter tree;
   const auto pass = [&] {
     write(tree.Bytes);
@@ -142,7 +155,7 @@ void WriteGameFile(const Game& game, const std::string& missionName,
       tree.Open("Player");
       tree.AddElement("Index", std::int32_t{index});
       tree.AddElement("PlayerID", names(index));
-      AddHits(tree, player, names);
+      AddHits(tree, player, hits);
       AddFields(tree, player);
       tree.Close("Player");
       pass();

@@ -6,6 +6,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <map>
 
 #include "archive/GameKeeper.h"
 #include "platform/linux/LinuxFiles.h"
@@ -125,6 +126,33 @@ TEST_F(Importing, AddsAGameOnce) {
   EXPECT_EQ(Run(), "1, 1, 0");
   EXPECT_EQ(Run(), "0, 2, 0");
   EXPECT_EQ(venue.Query("SELECT count(*) FROM Games"), "1");
+}
+
+TEST_F(Importing, TellsForWhichGameItTookEachFile) {
+  venue.Game.Players(ArchiveVenue::Blue7).Committed = false;
+  Put("alike.xml");
+  venue.Game.Players(ArchiveVenue::Blue7).Committed = true;
+  Put("same.xml");
+  venue.Archive->Keep(venue.State());
+  venue.Game.Players(ArchiveVenue::Red0).DeathCount += 1;
+  Put("z-deleted.xml");
+  venue.Archive->Delete({venue.Archive->Keep(venue.State())}, "2026-11-22 10:00:00");
+  venue.Game.Players(ArchiveVenue::Red0).DeathCount += 1;
+  Put("new.xml");
+  GameImport import = Make(FilesOf::OtherTable);
+  EXPECT_TRUE(import.Run(Path("."), [](const GameImport::State&) { return true; }));
+  std::map<std::string, KnownGameFile> files;
+  for (const KnownGameFile& file : import.KnownFiles()) {
+    files[std::filesystem::path(file.Path).filename().string()] = file;
+  }
+  ASSERT_EQ(files.size(), 3U);
+  EXPECT_EQ(files["same.xml"].As, KnownAs::Same);
+  EXPECT_EQ(files["alike.xml"].As, KnownAs::Alike);
+  EXPECT_EQ(files["z-deleted.xml"].As, KnownAs::Deleted);
+  EXPECT_EQ(files["alike.xml"].Mission, "Capture <the> Flag");
+  EXPECT_EQ(files["alike.xml"].Played, venue.Query("SELECT Played FROM Games WHERE GameID = 1"));
+  EXPECT_EQ(import.Known(), 2U);
+  EXPECT_EQ(import.BroughtBack(), 1U);
 }
 
 TEST_F(Importing, KnowsAGameThatWasKeptHereThoughItsMembersAreNotTaken) {

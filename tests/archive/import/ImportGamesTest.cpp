@@ -161,6 +161,26 @@ TEST_P(ImportGamesWindow, SaysHowManyDeletedGamesItBroughtBack) {
   EXPECT_TRUE(window->HasImported());
 }
 
+TEST_P(ImportGamesWindow, ListsTheFilesOfKnownGamesBehindTheRefusedOnesWhereThatIsWanted) {
+  PutGames(2);
+  Open();
+  Import();
+  WriteFile(Path("bad.xml"), "<GameData>\n<oops");
+  ExecuteSql(venue.Folder / "games.mdb", "UPDATE Games SET Played = '2013-05-21 14:30:05'");
+  ::Press(*window, "Import");
+  EXPECT_THAT(Refused(RefusedFilesModel::FileColumn), ElementsAre("bad.xml"));
+  auto& list = Find<QCheckBox>(*window, "ListKnown");
+  EXPECT_EQ(list.text().toStdString(),
+            In("&List files of games that were there already, too", "同时列出此前已有的比赛的文件(&L)"));
+  list.click();
+  EXPECT_THAT(Refused(RefusedFilesModel::FileColumn), ElementsAre("bad.xml", "1.xml", "2.xml"));
+  EXPECT_THAT(Refused(RefusedFilesModel::LineColumn), ElementsAre("2", "", ""));
+  EXPECT_EQ(Refused(RefusedFilesModel::ReasonColumn).at(1),
+            In("It is the past game of 2013-05-21 14:30, Flag.", "即 2013-05-21 14:30 的历史比赛（Flag）。"));
+  list.click();
+  EXPECT_THAT(Refused(RefusedFilesModel::FileColumn), ElementsAre("bad.xml"));
+}
+
 TEST_P(ImportGamesWindow, CopiesTheListOfRefusedFiles) {
   WriteFile(Path("bad.xml"), "<html/>");
   Open();
