@@ -3,10 +3,10 @@
 . demo/data.sh
 
 BuildPackages=(g++ cmake ninja-build qt6-base-dev qt6-base-dev-tools qt6-serialport-dev qt6-multimedia-dev libsqlite3-dev
-  sqlite3 libsndfile1-dev libsamplerate0-dev libmicrohttpd-dev libqrencode-dev libpugixml-dev zlib1g-dev nettle-dev nlohmann-json3-dev mdbtools-dev pkg-config libreoffice-dev libqpdf-dev libgtest-dev libgmock-dev libbenchmark-dev
+  sqlite3 libsndfile1-dev libsamplerate0-dev libmicrohttpd-dev libqrencode-dev libpugixml-dev zlib1g-dev nettle-dev libxcb1-dev nlohmann-json3-dev mdbtools-dev pkg-config libreoffice-dev libqpdf-dev libgtest-dev libgmock-dev libbenchmark-dev
   cmark-gfm lld)
 RunPackages=(libreoffice-writer qt6-translations-l10n fonts-dejavu-core fonts-liberation fonts-noto-cjk)
-TestPackages=(cups-daemon dbus-daemon)
+TestPackages=(cups-daemon dbus-daemon xvfb)
 DisplayPackages=(xvfb xauth poppler-utils)
 PicturePackages=(pngquant)
 PackagingPackages=(debhelper git)  # to build the packages

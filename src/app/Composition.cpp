@@ -51,7 +51,7 @@ Composition::Composition()
           .CommonDialog1 = fileDialog_,
           .Disk = files_,
           .Places = folders_,
-          .Boxes = boxes_,
+          .Boxes = failureBoxes_,
           .OtherPrograms = otherPrograms_,
           .Devices = devices_,
           .MSComm1 = loggedPort_,
@@ -72,7 +72,7 @@ Composition::Composition()
 }
 
 std::string Composition::SwipeButton() {
-  ButtonSwipe window(wire_, boxes_, strings_, parent_.Window());
+  ButtonSwipe window(wire_, failureBoxes_, strings_, parent_.Window());
   window.exec();
   return window.DallasID();
 }
@@ -88,8 +88,14 @@ Composition::NoteOpening() {
 std::function<void(const std::string& device, const std::string& settings, int fault)>
 Composition::NoteFault() {
   return [this](const std::string& /*device*/, const std::string& /*settings*/, int fault) {
-    if (fault != 0 && OnPortFault) {
-      OnPortFault();
+    if (fault != 0) {
+      TellFailure();
     }
   };
+}
+
+void Composition::TellFailure() const {
+  if (OnFailure) {
+    OnFailure();
+  }
 }

@@ -4,6 +4,7 @@
 
 #include "app/ConversionWithProgress.h"
 #include "app/Services.h"
+#include "check/FailureBoxes.h"
 #include "core/data/LoggedBoxes.h"
 #include "core/data/ProgramLog.h"
 #include "core/line/LoggedPort.h"
@@ -38,14 +39,16 @@ class Composition {
   /// Boxes and dialogs belong to `window` while no other window is active.
   void SetMainWindow(QWidget* window) { parent_.SetMainWindow(window); }
 
-  /// Called after a serial port could not be opened.
-  std::function<void()> OnPortFault;
+  /// Called after a serial port could not be opened or was lost, and before a box that tells of a failure
+  /// which System Check may explain.
+  std::function<void()> OnFailure;
 
-  MessageBoxes& Boxes() { return boxes_; }
+  MessageBoxes& Boxes() { return failureBoxes_; }
   ProgramLog& Log() { return log_; }
 
  private:
   std::string SwipeButton();
+  void TellFailure() const;
   /// What is done after each attempt to open a port.
   std::function<void(const std::string& device, const std::string& settings, int fault)> NoteOpening();
   /// The same where the log would have too many rows of it.
@@ -65,30 +68,43 @@ class Composition {
   ProgramLog log_;
   QtMessageBoxes shownBoxes_{[this] { return parent_.Window(); }};
   LoggedBoxes boxes_{shownBoxes_, log_};
+  FailureBoxes failureBoxes_{boxes_, strings_, [this] { TellFailure(); }};
   LinuxPrograms otherPrograms_;
   LinuxComputer computer_;
   QtSerialDevices devices_;
   const std::string logFolder_;
   QtSerialPort port_;
-  LoggedPort loggedPort_{
-      port_,
-      {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_, .OnOpening = NoteOpening()},
-      "line"};
+  LoggedPort loggedPort_{port_,
+                         {.Disk = files_,
+                          .Folder = logFolder_,
+                          .Elapsed = events_,
+                          .Time = clock_,
+                          .OnOpening = NoteOpening(),
+                          .OnLost = [this] { TellFailure(); }},
+                         "line"};
   QtSerialPort readerPort_;
-  LoggedPort loggedReaderPort_{
-      readerPort_,
-      {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_, .OnOpening = NoteFault()},
-      "1-wire",
-      Transcript::Repeats::Counted};
+  LoggedPort loggedReaderPort_{readerPort_,
+                               {.Disk = files_,
+                                .Folder = logFolder_,
+                                .Elapsed = events_,
+                                .Time = clock_,
+                                .OnOpening = NoteFault(),
+                                .OnLost = [this] { TellFailure(); }},
+                               "1-wire",
+                               Transcript::Repeats::Counted};
   IniReader readerSettings_;
   SerialOneWire wire_{loggedReaderPort_, events_, readerSettings_, devices_};
   LibreOffice wordProcessor_;
   DBusWakeLock awake_;
   QtSerialPort soundPort_;
-  LoggedPort loggedSoundPort_{
-      soundPort_,
-      {.Disk = files_, .Folder = logFolder_, .Elapsed = events_, .Time = clock_, .OnOpening = NoteOpening()},
-      "sound-recorder"};
+  LoggedPort loggedSoundPort_{soundPort_,
+                              {.Disk = files_,
+                               .Folder = logFolder_,
+                               .Elapsed = events_,
+                               .Time = clock_,
+                               .OnOpening = NoteOpening(),
+                               .OnLost = [this] { TellFailure(); }},
+                              "sound-recorder"};
   QtSoundPlayer soundPlayer_;
   SndfileConverter soundConverter_;
   LinuxAddresses addresses_;

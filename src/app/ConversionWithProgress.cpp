@@ -23,6 +23,7 @@ class StepsWithoutWindow : public ConversionSteps {
     window_.reset();
     return steps_.AddInterimRows(rows);
   }
+  bool KeepOn() override { return steps_.KeepOn(); }
   void BeforeReplacing(const OldDatabaseReport& report) override { steps_.BeforeReplacing(report); }
 
  private:
@@ -41,6 +42,7 @@ ConversionWithProgress::ConversionWithProgress(const StringTable& strings, Files
 OldDatabaseReport ConversionWithProgress::Convert(const OldDatabase& old, ConversionSteps& steps) {
   file_ = QFileInfo(QString::fromStdString(old.Path)).fileName();
   sinceShown_.start();
+  isShownElsewhere_ = steps.ShowsProgress();
   const struct Closing {
     std::unique_ptr<QProgressDialog>& Window;
     ~Closing() { Window.reset(); }
@@ -52,6 +54,9 @@ OldDatabaseReport ConversionWithProgress::Convert(const OldDatabase& old, Conver
 void ConversionWithProgress::ShowRows(std::int64_t rows) {
   // Most files are done before a window that tells of no rows could be read.
   constexpr std::chrono::milliseconds untilTheFirstRow(1000);
+  if (isShownElsewhere_) {
+    return;
+  }
   const bool isEmpty = rows == 0 && !window_;
   if (sinceShown_.elapsed() < (isEmpty ? std::max(moment_, untilTheFirstRow) : moment_).count()) {
     return;

@@ -8,7 +8,8 @@
 #include "core/text/StringTable.h"
 #include "platform/jet/JetConverter.h"
 
-/// Converts old databases, and shows the progress in a window if that takes more than a moment.
+/// Converts old databases, and shows the progress in a window if that takes more than a moment, unless
+/// another window shows it.
 class ConversionWithProgress : public OldDatabases {
  public:
   /// `moment` is the time until the window appears, and between updates of its text.
@@ -26,6 +27,7 @@ class ConversionWithProgress : public OldDatabases {
   JetConverter converter_;
   std::chrono::milliseconds moment_;
   QString file_;  ///< being converted, without its folder
+  bool isShownElsewhere_ = false;
   QElapsedTimer sinceShown_;
   std::unique_ptr<QProgressDialog> window_;  ///< set once it has taken more than a moment
 };

@@ -11,6 +11,7 @@
 #include "core/data/FirstRun.h"
 #include "core/text/Filled.h"
 #include "platform/qt/QtFolders.h"
+#include "platform/x11/StartupNotice.h"
 
 namespace {
 
@@ -67,10 +68,13 @@ std::optional<int> FirstStart::Begin(const std::vector<std::string>& words) {
     case StartWords::Kind::Run:
       break;
   }
-  std::error_code none;
-  file_ = asked.File.empty() ? std::string() : std::filesystem::absolute(asked.File, none).string();
+  std::error_code folderIsGone;
+  file_ = asked.File.empty() ? std::string() : std::filesystem::absolute(asked.File, folderIsGone).string();
+  if (folderIsGone) {
+    return Bar(Filled(strings_.Text(OwnText::StartFolderGone), {asked.File}), misused);
+  }
   if (!InstanceLine({file_, {}})) {
-    return Refuse(Filled(strings_.Text(OwnText::StartPathTooLong), {file_}), misused);
+    return Bar(Filled(strings_.Text(OwnText::StartPathTooLong), {file_}), misused);
   }
   InstanceRequest request{file_, ActivationToken()};
   if (!InstanceLine(request)) {
@@ -78,20 +82,21 @@ std::optional<int> FirstStart::Begin(const std::vector<std::string>& words) {
   }
   switch (instance_.emplace(PlaceOfThisUser()).Start(request, patience)) {
     case InstanceOutcome::Told:
+      EndStartupNotice(FromEnvironment("DISPLAY"), FromEnvironment("DESKTOP_STARTUP_ID"));
       return 0;
     case InstanceOutcome::NoAnswer:
-      return Bar(strings_.Text(OwnText::StartUnanswered));
+      return Bar(strings_.Text(OwnText::StartUnanswered), 1);
     case InstanceOutcome::Barred:
-      return Bar(Filled(strings_.Text(OwnText::StartBarred), {instance_->BarredBy()}));
+      return Bar(Filled(strings_.Text(OwnText::StartBarred), {instance_->BarredBy()}), 1);
     case InstanceOutcome::First:
       break;
   }
   return std::nullopt;
 }
 
-int FirstStart::Bar(const std::string& text) {
+int FirstStart::Bar(const std::string& text, int exitCode) {
   obstacle_ = text;
-  return Refuse(text, 1);
+  return Refuse(text, exitCode);
 }
 
 int FirstStart::Refuse(const std::string& text, int exitCode) const {

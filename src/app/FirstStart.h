@@ -20,8 +20,8 @@ class FirstStart {
   /// The game to load, an absolute path; empty for none.
   const std::string& File() const { return file_; }
 
-  /// What another program does not let this one do, which the operator is to be told in a window too; empty
-  /// if nothing.
+  /// Why the program does not start, where a double click can lead to that, so that the operator is to be
+  /// told in a window too; empty if nothing.
   const std::string& Obstacle() const { return obstacle_; }
 
   /// See Instance.
@@ -29,7 +29,8 @@ class FirstStart {
 
  private:
   int Refuse(const std::string& text, int exitCode) const;
-  int Bar(const std::string& text);
+  /// Refuses, and has it told in a window too.
+  int Bar(const std::string& text, int exitCode);
 
   const StringTable& strings_;
   std::optional<Instance> instance_;

@@ -14,7 +14,7 @@ Program::Program() {
   qApp->installEventFilter(this);
   window_.emplace(composition_.Services());
   composition_.SetMainWindow(&*window_);
-  composition_.OnPortFault = [this] { window_->PointToSystemCheck(); };
+  composition_.OnFailure = [this] { window_->PointToSystemCheck(); };
 }
 
 bool Program::Start() {

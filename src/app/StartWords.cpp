@@ -16,5 +16,8 @@ StartWords ReadStartWords(const std::vector<std::string>& words) {
       read.Asked = word == "--help" ? StartWords::Kind::Help : StartWords::Kind::Version;
     }
   }
+  if (read.Asked != StartWords::Kind::Run && !read.File.empty()) {
+    return {.Asked = StartWords::Kind::Unknown, .Word = read.File};
+  }
   return read;
 }

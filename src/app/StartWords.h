@@ -17,5 +17,6 @@ struct StartWords {
   std::string Word = {};
 };
 
-/// A word that begins with "-" is an option, unless it stands behind "--".
+/// A word that begins with "-" is an option, unless it stands behind "--". An option that asks for something
+/// takes no file.
 StartWords ReadStartWords(const std::vector<std::string>& words);

@@ -104,6 +104,9 @@ void frmRx::SetUpDesk() {
                             .Save = *ui_->mnuSaveScores,
                             .Commit = *ui_->mnuCommitGame});
   desk_->Show();
+  if (hasFailed_) {
+    PointToSystemCheck();
+  }
   charts_.emplace(
       session_,
       GameCharts::Parts{.Strings = services_.Strings,
@@ -212,7 +215,6 @@ void frmRx::ConnectLetters() {
 void frmRx::ConnectCommands() {
   commands_.EndWaits = [this] { services_.Events.EndWaits(); };
   commands_.AllUnwound = [this] { TellOfMissingBackup(); };
-  commands_.AfterFailure = [this] { PointToSystemCheck(); };
   commands_.Connect(*this, {
                                {ui_->mnuLoadScores, &frmRx::LoadGame},
                                {ui_->mnuSaveScores, &frmRx::SaveGame},

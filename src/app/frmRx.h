@@ -19,6 +19,7 @@
 #include "archive/past/PastGames.h"
 #include "audience/AudienceBoard.h"
 #include "audience/AudienceCopy.h"
+#include "check/SystemChecks.h"
 #include "core/data/IniReader.h"
 #include "core/game/GuestList.h"
 #include "core/game/HiddenNames.h"
@@ -156,6 +157,7 @@ class frmRx : public QMainWindow {
   void RecordSounds();
   void ShowBackupCopies();
   void ShowSystemCheck();
+  WordFinding FindingOfWordProcessor();
   void TakeOverOldInstallation();
   /// Missions and members, as their copies are kept.
   std::vector<CopiedDatabase> CopiedDatabases();
@@ -230,6 +232,7 @@ class frmRx : public QMainWindow {
   std::string waitingFile_;  ///< to be opened; empty if none
   QTimer waitingFileTimer_;
   Commands commands_;
+  bool hasFailed_ = false;  ///< something at the start, before the status line was there
   std::optional<Desk> desk_;
   GuestList guests_;
   std::optional<GameKeeping> keeping_;

@@ -65,9 +65,6 @@ void frmRx::GetScoreData() {
                               services_.Time, progress, downloadedGuns_)
                  .GetScores();
     desk_->TellDownload(result);
-    if (result.End == DownloadEnd::Failed) {
-      PointToSystemCheck();
-    }
   }
   session_.CalculateScores();
 }
@@ -80,7 +77,6 @@ void frmRx::FollowWordProcessor() {
   wordProcessorTimer_.stop();
   if (state == WordState::Ended) {
     ui_->mnuPrintScores->setEnabled(false);
-    PointToSystemCheck();
     services_.Boxes.Show(services_.Strings.Text(117), services_.Strings.Text(118), BoxIcon::Exclamation);
   }
 }

@@ -91,6 +91,24 @@ void frmRx::TellNewVersion() {
   }
 }
 
+WordFinding frmRx::FindingOfWordProcessor() {
+  if (!ui_->mnuPrintScores->isEnabled()) {
+    return WordFinding::Missing;
+  }
+  // Until its first start has succeeded or failed, it is followed.
+  const WordState state =
+      wordProcessorTimer_.isActive() ? WordState::Starting : services_.WordProcessor.State();
+  switch (state) {
+    case WordState::Starting:
+      return WordFinding::Untried;
+    case WordState::Ready:
+      return WordFinding::Ready;
+    case WordState::Ended:
+      break;
+  }
+  return WordFinding::Ended;
+}
+
 void frmRx::ShowSystemCheck() {
   desk_->Tell({QStringLiteral("SystemCheck"), QString()});  // what pointed here has done its part
   const auto readerPort = [this]() -> std::optional<std::int16_t> {
@@ -111,7 +129,7 @@ void frmRx::ShowSystemCheck() {
        .Disk = services_.Disk,
        .Databases = services_.Archives != nullptr ? *services_.Archives : services_.Databases,
        .UserDataFolder = userDataFolder_,
-       .HasWordProcessor = [this] { return ui_->mnuPrintScores->isEnabled(); },
+       .WordProcessor = [this] { return FindingOfWordProcessor(); },
        .ChineseLetters = ChineseLetters,
        .Screens = ScreenTexts,
        .ReaderPort = readerPort,
@@ -127,7 +145,8 @@ void frmRx::ShowSystemCheck() {
 }
 
 void frmRx::PointToSystemCheck() {
-  if (desk_) {
+  hasFailed_ = true;
+  if (desk_ && services_.Computer != nullptr) {
     desk_->Tell({QStringLiteral("SystemCheck"), Text(services_.Strings, OwnText::SystemCheckTitle),
                  [this] { ui_->mnuSystemCheck->trigger(); }});
   }

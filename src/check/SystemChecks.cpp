@@ -2,6 +2,9 @@
 
 #include <algorithm>
 #include <chrono>
+#include <ctime>
+#include <iomanip>
+#include <sstream>
 #include <utility>
 
 #include "archive/copies/CopyNames.h"
@@ -40,6 +43,21 @@ std::string DayBeforeRelease(const std::string& release) {
   return std::to_string(static_cast<int>(before.year())) + "-" +
          twoDigits(static_cast<unsigned>(before.month())) + "-" +
          twoDigits(static_cast<unsigned>(before.day()));
+}
+
+/// An hour after `stamp` ("YYYY-MM-DD HH:MM:SS"), by which clocks are put back in autumn: "2026-10-25
+/// 02:59:00" can be younger than "2026-10-25 02:01:00". Without a date the same text.
+std::string AnHourAfter(const std::string& stamp) {
+  std::tm time{};
+  std::istringstream text(stamp);
+  text >> std::get_time(&time, "%Y-%m-%d %H:%M:%S");
+  if (text.fail()) {
+    return stamp;
+  }
+  const std::time_t later = timegm(&time) + std::chrono::seconds(std::chrono::hours(1)).count();
+  std::ostringstream result;
+  result << std::put_time(gmtime_r(&later, &time), "%Y-%m-%d %H:%M:%S");
+  return result.str();
 }
 
 /// True for a serial port of the computer's own, which nobody can unplug.
@@ -106,7 +124,7 @@ SystemChecks::Items SystemChecks::LookAt(CheckSubject subject, const KeepOn& kee
     case CheckSubject::Reader:
       return {Reader(keepOn)};
     case CheckSubject::WordProcessor:
-      return {found(parts_.HasWordProcessor() ? "LibreOffice Writer" : "", OwnText::CheckWordMissing)};
+      return {Word()};
     case CheckSubject::Printer:
       return {Printer(keepOn)};
     case CheckSubject::Chinese:
@@ -184,10 +202,29 @@ CheckItem SystemChecks::Reader(const KeepOn& keepOn) const {
   return Port(CheckSubject::Reader, *port, keepOn);
 }
 
+CheckItem SystemChecks::Word() const {
+  constexpr CheckSubject subject = CheckSubject::WordProcessor;
+  switch (parts_.WordProcessor()) {
+    case WordFinding::Missing:
+      return {subject, false, Text(OwnText::CheckWordMissing)};
+    case WordFinding::Untried:
+      return {subject, false, Text(OwnText::CheckWordUntried)};
+    case WordFinding::Ended:
+      return {subject, false, Text(OwnText::CheckWordEnded)};
+    case WordFinding::Ready:
+      break;
+  }
+  return {subject, true, "LibreOffice Writer"};
+}
+
 CheckItem SystemChecks::Printer(const KeepOn& keepOn) const {
-  const std::vector<std::string> printers = parts_.Computer.Printers(keepOn);
-  return printers.empty() ? CheckItem{CheckSubject::Printer, false, Text(OwnText::CheckNoPrinter)}
-                          : CheckItem{CheckSubject::Printer, true, Joined(printers)};
+  try {
+    const std::vector<std::string> printers = parts_.Computer.Printers(keepOn);
+    return printers.empty() ? CheckItem{CheckSubject::Printer, false, Text(OwnText::CheckNoPrinter)}
+                            : CheckItem{CheckSubject::Printer, true, Joined(printers)};
+  } catch (const RuntimeError& error) {
+    return {CheckSubject::Printer, false, Text(OwnText::CheckPrintingSilent, {error.what()})};
+  }
 }
 
 CheckItem SystemChecks::Screens() const {
@@ -216,13 +253,30 @@ SystemChecks::Items SystemChecks::Disk() const {
 
 CheckItem SystemChecks::Clock() const {
   const std::string now = parts_.Time.Now();
-  const std::vector<BackupCopy> copies = CopiesIn(parts_.Disk, parts_.UserDataFolder + "/backups");
   if (now < std::max(std::string(EarliestTime), DayBeforeRelease(parts_.Release))) {
     return {CheckSubject::Clock, false, Text(OwnText::CheckClockEarly, {now})};
   }
-  const bool isFine =
-      std::none_of(copies.begin(), copies.end(), [&](const BackupCopy& copy) { return copy.Time > now; });
-  return {CheckSubject::Clock, isFine, isFine ? now : Text(OwnText::CheckClockWrong, {now})};
+  if (HasDataAfter(now)) {
+    return {CheckSubject::Clock, false, Text(OwnText::CheckClockWrong, {now})};
+  }
+  // A computer without a network has no other clock, so that is no fault.
+  const bool isAlone = !parts_.Computer.ClockIsSynchronised().value_or(true);
+  return {CheckSubject::Clock, true, isAlone ? Text(OwnText::CheckClockUnsynchronised, {now}) : now};
+}
+
+bool SystemChecks::HasDataAfter(const std::string& now) const {
+  const std::string latest = AnHourAfter(now);
+  const std::vector<BackupCopy> copies = CopiesIn(parts_.Disk, parts_.UserDataFolder + "/backups");
+  if (std::any_of(copies.begin(), copies.end(), [&](const BackupCopy& copy) { return copy.Time > latest; })) {
+    return true;
+  }
+  for (const CheckSubject subject : {CheckSubject::Missions, CheckSubject::Members, CheckSubject::Games}) {
+    const std::string path = parts_.UserDataFolder + "/" + FileOf(subject).Name + ".mdb";
+    if (parts_.Disk.FileExists(path) && parts_.Disk.TimeOfChange(path) > latest) {
+      return true;
+    }
+  }
+  return false;
 }
 
 SystemChecks::Items SystemChecks::DatabaseOf(CheckSubject subject, const KeepOn& keepOn) const {

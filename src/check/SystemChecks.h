@@ -14,6 +14,14 @@
 #include "platform/Files.h"
 #include "platform/SerialDevices.h"
 
+/// What is known of the word processor.
+enum class WordFinding {
+  Missing,
+  Untried,  ///< its start has not ended
+  Ready,
+  Ended  ///< since it was ready
+};
+
 /// Looks at what the program needs of the computer, subject by subject. Changes nothing, and opens no port.
 class SystemChecks {
  public:
@@ -26,7 +34,7 @@ class SystemChecks {
     Files& Disk;
     DatabaseEngine& Databases;
     std::string UserDataFolder;
-    std::function<bool()> HasWordProcessor;
+    std::function<WordFinding()> WordProcessor;
     std::function<std::string()>
         ChineseLetters;  ///< name of letters with which Chinese is written; empty if none
     std::function<std::vector<std::string>()> Screens;        ///< a text about each
@@ -56,10 +64,13 @@ class SystemChecks {
                    const std::vector<DeviceUser>& users) const;
   CheckItem Port(CheckSubject subject, std::int16_t number, const KeepOn& keepOn) const;
   CheckItem Reader(const KeepOn& keepOn) const;
+  CheckItem Word() const;
   CheckItem Printer(const KeepOn& keepOn) const;
   CheckItem Screens() const;
   Items Disk() const;
   CheckItem Clock() const;
+  /// True if the program's data was changed after `now`.
+  bool HasDataAfter(const std::string& now) const;
   Items DatabaseOf(CheckSubject subject, const KeepOn& keepOn) const;
   CheckItem DatabaseAt(CheckSubject subject, const std::string& path, const char* table,
                        const KeepOn& keepOn) const;

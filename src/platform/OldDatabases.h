@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <exception>
 #include <string>
 #include <utility>
 #include <vector>
@@ -59,6 +60,12 @@ class OldDatabaseRefused : public RuntimeError {
   std::string failure_;
 };
 
+/// An old file was not converted, since that was not wanted any more, and nothing has changed.
+class OldDatabaseStopped : public std::exception {
+ public:
+  const char* what() const noexcept override { return "The conversion was stopped."; }
+};
+
 struct OldDatabase {
   std::string Path;
   std::string Table;        ///< whose rows are converted
@@ -77,6 +84,12 @@ class ConversionSteps {
   /// The interim file has rows of its own. True to add them to the new file.
   virtual bool AddInterimRows(std::int64_t rows) = 0;
 
+  /// Asked many times a second while the old file is read; false stops the conversion. May process events.
+  virtual bool KeepOn() { return true; }
+
+  /// True if the progress is shown by who answers KeepOn.
+  virtual bool ShowsProgress() const { return false; }
+
   /// The new file is complete and is about to take the old one's place. May throw to prevent that.
   virtual void BeforeReplacing(const OldDatabaseReport& report) = 0;
 };
@@ -91,6 +104,6 @@ class OldDatabases {
 
   /// Replaces the old file with a new one that has its rows; the old one is kept beside it under an unused
   /// name. Interim rows whose key is taken get a new one, and the interim file gets ".joined" behind its
-  /// name. Throws OldDatabaseRefused, and what `steps` throws; nothing has changed then.
+  /// name. Throws OldDatabaseRefused, OldDatabaseStopped, and what `steps` throws; nothing has changed then.
   virtual OldDatabaseReport Convert(const OldDatabase& old, ConversionSteps& steps) = 0;
 };

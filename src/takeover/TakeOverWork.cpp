@@ -57,18 +57,22 @@ const std::string& PathOf(OldItem item, const OldInstallation& old) {
 /// one's path is told.
 class TakeOverWork::Conversion : public ConversionSteps {
  public:
-  Conversion(const Parts& parts, const std::string& path) : parts_(parts), path_(path) {}
+  Conversion(const Parts& parts, const std::string& path, const ::KeepOn& keepOn)
+      : parts_(parts), path_(path), keepOn_(keepOn) {}
 
   bool GoOnWithout(const std::vector<NotTakenOver>& values) override {
     return parts_.Ask(
         Filled(parts_.Strings.Text(OwnText::OldValuesUnreadable), {path_, LinesOf(values, parts_.Strings)}));
   }
   bool AddInterimRows(std::int64_t /*rows*/) override { return false; }
+  bool KeepOn() override { return keepOn_(); }
+  bool ShowsProgress() const override { return true; }
   void BeforeReplacing(const OldDatabaseReport& /*report*/) override {}
 
  private:
   const Parts& parts_;
   const std::string& path_;
+  const ::KeepOn& keepOn_;
 };
 
 TakeOverWork::~TakeOverWork() {
@@ -193,10 +197,14 @@ void TakeOverWork::DeleteCopied() const {
 bool TakeOverWork::MakeDatabase(const TakenDatabase& database, const std::string& path,
                                 const std::string& copied, FoundItem& found, const KeepOn& keepOn) const {
   if (parts_.Old.IsOld(copied)) {
-    Conversion steps(parts_, path);
-    const OldDatabaseReport report =
-        parts_.Old.Convert({copied, database.Table, database.DefaultPath, MadePath("none.mdb")}, steps);
-    found.Remark = LinesOf(report.NotTaken, parts_.Strings);
+    Conversion steps(parts_, path, keepOn);
+    try {
+      const OldDatabaseReport report =
+          parts_.Old.Convert({copied, database.Table, database.DefaultPath, MadePath("none.mdb")}, steps);
+      found.Remark = LinesOf(report.NotTaken, parts_.Strings);
+    } catch (const OldDatabaseStopped&) {
+      return false;
+    }
   }
   const std::unique_ptr<Database> made = parts_.Engine.OpenDatabase(copied);
   if (!made->CheckWhole(keepOn)) {

@@ -17,9 +17,6 @@ Commands::Commands(QWidget& window, MessageBoxes& boxes) : window_(window), boxe
 bool Commands::Run(const std::function<void()>& command) {
   ++running_;
   const bool done = ReportErrors(boxes_, command);
-  if (!done && AfterFailure) {
-    AfterFailure();
-  }
   --running_;
   if (running_ == 0) {
     CommandsEndedEvent event;

@@ -35,9 +35,6 @@ class Commands : public QObject {
   /// Called each time the last command has unwound, before a delayed close.
   std::function<void()> AllUnwound;
 
-  /// Called when a command has failed and the operator has read its report.
-  std::function<void()> AfterFailure;
-
   /// Called after an action's or a button's command, once no command is left on the stack.
   std::function<void()> AfterCommand;
 

@@ -128,6 +128,33 @@ TEST_P(ConversionWindow, TellsFileAndRowsUntilItIsDone) {
   }
 }
 
+/// Shows the progress itself, and stops after a while.
+class StepsElsewhere : public ConversionAnswers {
+ public:
+  bool ShowsProgress() const override { return true; }
+  bool KeepOn() override {
+    for (const QWidget* window : QApplication::topLevelWidgets()) {
+      Stood |= qobject_cast<const QProgressDialog*>(window) != nullptr;
+    }
+    return ConversionAnswers::KeepOn();
+  }
+
+  bool Stood = false;
+};
+
+TEST_P(ConversionWindow, DoesNotStandWhereTheProgressIsShownElsewhereAndCanBeStopped) {
+  WriteFile(Reader, "#!/bin/sh\ncat '" + (folder / "written") + "'\nexec sleep 1000\n");
+  const StringTable strings(GetParam());
+  ConversionWithProgress conversion(strings, disk, std::chrono::milliseconds(0), Reader);
+  StepsElsewhere steps;
+  steps.StopAt = 3;
+  EXPECT_THROW(
+      conversion.Convert({Path, "Members", TESSARINE_PROGRAM_FOLDER "/members_default.mdb", folder / "none"},
+                         steps),
+      OldDatabaseStopped);
+  EXPECT_FALSE(steps.Stood);
+}
+
 INSTANTIATE_TEST_SUITE_P(Languages, ConversionWindow,
                          testing::Values(Language::English, Language::SimplifiedChinese));
 

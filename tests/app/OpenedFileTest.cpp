@@ -159,4 +159,26 @@ TEST_F(OpenedFile, BringsAWindowInTheTaskBarBack) {
   EXPECT_FALSE(qEnvironmentVariableIsSet("XDG_ACTIVATION_TOKEN")) << "other programs would inherit it";
 }
 
+/// Notes the desktop's permission that the toolkit finds when a window is raised.
+class TokenWhenRaised : public QObject {
+ public:
+  QByteArray Token;
+
+ protected:
+  bool eventFilter(QObject* watched, QEvent* event) override {
+    if (event->type() == QEvent::ZOrderChange) {
+      Token = qgetenv("XDG_ACTIVATION_TOKEN");
+    }
+    return QObject::eventFilter(watched, event);
+  }
+};
+
+TEST_F(OpenedFile, HandsTheDesktopsPermissionToTheToolkit) {
+  venue.Start();
+  TokenWhenRaised raised;
+  venue.Window->installEventFilter(&raised);
+  venue.Window->ComeToFront("token-7");
+  EXPECT_EQ(raised.Token, "token-7");
+}
+
 }  // namespace

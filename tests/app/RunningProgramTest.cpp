@@ -1,15 +1,10 @@
 // The program itself, started again while it runs.
 
-#include <gmock/gmock.h>
+#include "tests/app/RunningProgram.h"
+
 #include <sys/types.h>
 
-#include <QElapsedTimer>
-#include <QProcess>
-#include <QTest>
 #include <csignal>
-
-#include "tests/support/DataSite.h"
-#include "tests/support/GameFiles.h"
 
 namespace {
 
@@ -17,65 +12,6 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
 using testing::StartsWith;
-
-constexpr int Limit = 60'000;  ///< milliseconds that a test waits for what must come
-
-class RunningProgram : public testing::Test {
- protected:
-  RunningProgram() {
-    site.PutDefaultFiles();
-    WriteFile(site.Folder / "Friday.game.xml", GameFile(PlayerOf(65), "Free For All"));
-    environment.insert(QStringLiteral("XDG_DATA_HOME"), QString::fromStdString(site.Folder.Path()));
-    environment.insert(QStringLiteral("XDG_RUNTIME_DIR"), QString::fromStdString(runtime.Path()));
-    environment.insert(QStringLiteral("QT_QPA_PLATFORM"),
-                       QStringLiteral("offscreen:configfile=" TESSARINE_TEST_SCREENS));
-    environment.insert(QStringLiteral("LC_ALL"), QStringLiteral("C.UTF-8"));
-    environment.remove(QStringLiteral("LANGUAGE"));
-    environment.remove(QStringLiteral("DISPLAY"));
-    environment.remove(QStringLiteral("WAYLAND_DISPLAY"));
-  }
-  ~RunningProgram() override { End(); }
-
-  void Begin(QProcess& process, const QStringList& words) const {
-    process.setProcessEnvironment(environment);
-    process.setWorkingDirectory(QString::fromStdString(site.Folder.Path()));
-    process.start(QStringLiteral(TESSARINE_PROGRAM_FOLDER "/tessarine"), words);
-  }
-
-  /// Starts the program that stays.
-  void Start(const QStringList& words = {}) {
-    Begin(first, words);
-    ASSERT_TRUE(first.waitForStarted(Limit));
-    ASSERT_TRUE(QTest::qWaitFor([this] { return !Log().empty(); }, Limit));
-  }
-  void End() {
-    first.kill();
-    first.waitForFinished(Limit);
-  }
-
-  /// Starts it once more; its exit code.
-  int StartAgain(const QStringList& words = {}) {
-    QProcess second;
-    Begin(second, words);
-    EXPECT_TRUE(second.waitForFinished(Limit));
-    output = second.readAllStandardOutput().toStdString();
-    errors = second.readAllStandardError().toStdString();
-    EXPECT_EQ(second.exitStatus(), QProcess::NormalExit);
-    return second.exitCode();
-  }
-
-  std::string Log() const { return ReadFile(site.DataFile("logs/program.log")); }
-  bool WaitForLog(const std::string& text) const {
-    return QTest::qWaitFor([&] { return Log().find(text) != std::string::npos; }, Limit);
-  }
-
-  DataSite site;
-  TemporaryFolder runtime;
-  QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
-  QProcess first;
-  std::string output;
-  std::string errors;
-};
 
 TEST_F(RunningProgram, TellsItsVersionAndHelpWithoutADisplay) {
   environment.insert(QStringLiteral("QT_QPA_PLATFORM"), QStringLiteral("xcb"));
@@ -91,7 +27,33 @@ TEST_F(RunningProgram, RefusesOtherWords) {
   EXPECT_EQ(StartAgain({QStringLiteral("--verbose")}), 2);
   EXPECT_THAT(errors, HasSubstr("--verbose"));
   EXPECT_EQ(StartAgain({QStringLiteral("a.xml"), QStringLiteral("b.xml")}), 2);
+  EXPECT_EQ(StartAgain({QStringLiteral("--version"), QStringLiteral("a.xml")}), 2);
+  EXPECT_THAT(errors, HasSubstr("a.xml"));
   EXPECT_THAT(output, IsEmpty());
+  EXPECT_THAT(Log(), IsEmpty());
+}
+
+TEST_F(RunningProgram, RefusesAFileWhosePathIsTooLong) {
+  EXPECT_EQ(StartAgain({QString(9000, u'a')}), 2);
+  EXPECT_THAT(errors, StartsWith("tessarine: The path of this file is too long: /"));
+  EXPECT_THAT(Log(), IsEmpty());
+}
+
+TEST_F(RunningProgram, RefusesAFileOfAFolderThatIsGone) {
+  QProcess start;
+  start.setProcessEnvironment(environment);
+  start.start(
+      QStringLiteral("/bin/sh"),
+      {QStringLiteral("-c"),
+       QStringLiteral("mkdir \"$0/gone\" && cd \"$0/gone\" && rmdir \"$0/gone\" && "
+                      "exec \"$1\" Friday.game.xml"),
+       QString::fromStdString(site.Folder.Path()), QStringLiteral(TESSARINE_PROGRAM_FOLDER "/tessarine")});
+  ASSERT_TRUE(start.waitForFinished(Limit));
+  EXPECT_EQ(start.exitCode(), 2);
+  EXPECT_THAT(
+      start.readAllStandardError().toStdString(),
+      HasSubstr("tessarine: The folder in which this was started is gone, so this file cannot be found: "
+                "Friday.game.xml\n"));
   EXPECT_THAT(Log(), IsEmpty());
 }
 

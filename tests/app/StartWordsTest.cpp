@@ -36,7 +36,9 @@ TEST(WordsOfAStart, AreNotUnderstoodOtherwise) {
                                                                      {{"-"}, "-"},
                                                                      {{"a.xml", "b.xml"}, "b.xml"},
                                                                      {{""}, ""},
-                                                                     {{"--help", "--nothing"}, "--nothing"}};
+                                                                     {{"--help", "--nothing"}, "--nothing"},
+                                                                     {{"--version", "a.xml"}, "a.xml"},
+                                                                     {{"a.xml", "--help"}, "a.xml"}};
   for (const auto& [words, unknown] : starts) {
     EXPECT_EQ(ReadStartWords(words).Asked, Kind::Unknown) << unknown;
     EXPECT_EQ(ReadStartWords(words).Word, unknown);

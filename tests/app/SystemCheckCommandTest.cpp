@@ -3,12 +3,16 @@
 #include <gmock/gmock.h>
 
 #include <QPushButton>
+#include <QRadioButton>
 #include <QTableWidget>
 #include <QTimer>
 #include <QToolButton>
 
 #include "check/SystemCheck.h"
+#include "sheets/PrintOptions.h"
+#include "tests/support/TestDatabase.h"
 #include "tests/support/Venue.h"
+#include "tests/support/WhileModal.h"
 
 namespace {
 
@@ -41,6 +45,16 @@ class SystemCheckCommand : public testing::Test {
   }
   QToolButton* Link() const {
     return venue.Window->findChild<QToolButton*>(QStringLiteral("SystemCheckLink"));
+  }
+  bool IsOffered() const { return Link() != nullptr && Link()->isVisible(); }
+  /// Prints the sheets of a game, each of them into a file.
+  void PrintSheets() {
+    venue.LoadGame(SmallGame());
+    const WhileModal<PrintOptions> choose([](PrintOptions& window) {
+      Find<QRadioButton>(window, "PrintFile").setChecked(true);
+      window.accept();
+    });
+    venue.Trigger("mnuPrintScores");
   }
 
   Venue venue;
@@ -97,8 +111,73 @@ TEST_F(SystemCheckCommand, IsOfferedAfterADownloadThatFailed) {
   venue.Port.FailNextOpen(8005);
   venue.Boxes.Answers = {BoxAnswer::Cancel};
   venue.Press("GetScores");
-  ASSERT_NE(Link(), nullptr);
-  EXPECT_TRUE(Link()->isVisible());
+  EXPECT_TRUE(IsOffered());
+}
+
+TEST_F(SystemCheckCommand, IsOfferedAfterALineThatWasLostInADownload) {
+  venue.Start();
+  venue.Port.FailOutput(8012);
+  venue.Press("GetScores");
+  ASSERT_THAT(venue.Boxes.Boxes, testing::SizeIs(1));
+  EXPECT_EQ(venue.Boxes.Boxes[0].Text, "Error occured sending data. Please try again.");
+  EXPECT_TRUE(IsOffered());
+}
+
+TEST_F(SystemCheckCommand, IsOfferedAfterSheetsThatFailed) {
+  for (const char* operation : {"Add ", "SetBookmark", "SaveAs"}) {
+    venue.Start();
+    venue.Word.FailAt = operation;
+    venue.Boxes.Boxes.clear();
+    PrintSheets();
+    ASSERT_THAT(venue.Boxes.Boxes, testing::SizeIs(1)) << operation;
+    EXPECT_EQ(venue.Boxes.Boxes[0].Title, "Print Error");
+    EXPECT_TRUE(IsOffered()) << operation;
+    venue.Window.reset();
+    venue.Word.FailAt.clear();
+  }
+}
+
+TEST_F(SystemCheckCommand, IsNotOfferedAfterSheetsThatWereMade) {
+  venue.Start();
+  PrintSheets();
+  EXPECT_THAT(venue.Boxes.Boxes, testing::SizeIs(1));
+  EXPECT_FALSE(IsOffered());
+}
+
+TEST_F(SystemCheckCommand, IsOfferedWhenTheWordProcessorIsMissing) {
+  venue.Word.FailAt = "Start";
+  venue.Start();
+  EXPECT_TRUE(QTest::qWaitFor([this] { return IsOffered(); }, 10000));
+  EXPECT_THAT(venue.Boxes.Boxes, testing::SizeIs(1));
+}
+
+TEST_F(SystemCheckCommand, IsOfferedAfterACommitIntoALockedDatabase) {
+  venue.PutDefaultFiles();
+  venue.ChangeDatabase("members.mdb", "INSERT INTO Members (ContactID, FirstName) VALUES (4, 'Ada')");
+  venue.Start();
+  venue.LoadGame(GameFile(PlayerOf(1, "<MemberIndex>4</MemberIndex>")));
+  OtherConnection other(venue.DataFile("members.mdb"));
+  other.Execute("BEGIN IMMEDIATE");
+  venue.Trigger("mnuCommitGame");
+  ASSERT_THAT(venue.Boxes.Boxes, testing::SizeIs(1));
+  EXPECT_EQ(venue.Boxes.Boxes[0].Title, "Database Error");
+  EXPECT_TRUE(IsOffered());
+}
+
+TEST_F(SystemCheckCommand, IsOfferedAfterAStartWithADamagedDatabase) {
+  venue.PutDefaultFiles();
+  WriteFile(venue.DataFile("members.mdb"), "no database");
+  venue.Boxes.Answers = {BoxAnswer::Ok};
+  venue.Start();
+  ASSERT_THAT(venue.Boxes.Boxes, testing::SizeIs(1));
+  EXPECT_TRUE(IsOffered());
+}
+
+TEST_F(SystemCheckCommand, IsNotOfferedWhereNothingFailed) {
+  venue.Start();
+  venue.LoadGame("no game");
+  ASSERT_THAT(venue.Boxes.Boxes, testing::SizeIs(1));
+  EXPECT_FALSE(IsOffered());
 }
 
 }  // namespace

@@ -7,12 +7,16 @@
 #include "tests/fakes/FakeComputer.h"
 #include "tests/fakes/FakeSerialDevices.h"
 #include "tests/support/DataSite.h"
+#include "tests/support/TimeOfChange.h"
 
 /// A computer that has everything, to be looked at.
 class CheckedSite : public DataSite {
  public:
   explicit CheckedSite(Language language = Language::English) : DataSite(language) {
     PutDefaultFiles();
+    for (const char* file : {"members.mdb", "scenarios.mdb"}) {
+      SetTimeOfChange(DataFile(file), "2013-05-20 10:00:00");
+    }
     Devices.Ports = {"/dev/ttyS0", "/dev/ttyUSB0"};
   }
 
@@ -25,7 +29,7 @@ class CheckedSite : public DataSite {
                          .Disk = Disk,
                          .Databases = Databases,
                          .UserDataFolder = DataFolder(),
-                         .HasWordProcessor = [this] { return HasWordProcessor; },
+                         .WordProcessor = [this] { return Word; },
                          .ChineseLetters = [this] { return Letters; },
                          .Screens = [this] { return Screens; },
                          .ReaderPort = [this] { return ReaderPort; },
@@ -39,7 +43,7 @@ class CheckedSite : public DataSite {
   FakeComputer Computer;
   FakeSerialDevices Devices;
   IniReader Ini{Disk, DataFolder() + "/tessarine.ini"};
-  bool HasWordProcessor = true;
+  WordFinding Word = WordFinding::Ready;
   std::string Letters = "Noto Sans CJK SC";
   std::vector<std::string> Screens = {"Screen 1920 x 1080, scale 1", "Screen 1280 x 720, scale 1"};
   std::optional<std::int16_t> ReaderPort = 2;

@@ -161,7 +161,7 @@ TEST_F(LookedAt, TheDatabaseInUseIsLookedAtAndTheOnePutAsideIsTold) {
 TEST_F(LookedAt, WhatIsInstalledIsNamedAndWhatIsMissingToo) {
   EXPECT_EQ(One(CheckSubject::WordProcessor), Fine(CheckSubject::WordProcessor, "LibreOffice Writer"));
   EXPECT_EQ(One(CheckSubject::Chinese), Fine(CheckSubject::Chinese, "Noto Sans CJK SC"));
-  site.HasWordProcessor = false;
+  site.Word = WordFinding::Missing;
   site.Letters.clear();
   EXPECT_THAT(One(CheckSubject::WordProcessor).Text, HasSubstr("install the package libreoffice-writer"));
   EXPECT_THAT(One(CheckSubject::Chinese).Text, HasSubstr("install the package fonts-noto-cjk"));
@@ -172,8 +172,26 @@ TEST_F(LookedAt, PrintersAreNamed) {
   EXPECT_EQ(One(CheckSubject::Printer), Fine(CheckSubject::Printer, "Office"));
   site.Computer.AllPrinters.clear();
   EXPECT_THAT(One(CheckSubject::Printer).Text, HasSubstr("No printer is set up"));
-  site.Computer.PrinterFailure = RuntimeError(Fault::PathAccess, "lpstat");
-  EXPECT_EQ(One(CheckSubject::Printer), ToDo(CheckSubject::Printer, "This could not be found out: lpstat"));
+}
+
+TEST_F(LookedAt, APrintingSystemThatDoesNotRunIsToldWithWhatToDo) {
+  site.Computer.PrinterFailure = RuntimeError(Fault::DeviceUnavailable, "scheduler is not running");
+  EXPECT_EQ(
+      One(CheckSubject::Printer),
+      ToDo(CheckSubject::Printer,
+           "The printing system does not answer (scheduler is not running): restart the computer, and if "
+           "that does not help, have the service cups checked."));
+}
+
+TEST_F(LookedAt, TheWordProcessorIsFineOnlyOnceItHasBeenTried) {
+  site.Word = WordFinding::Untried;
+  EXPECT_EQ(One(CheckSubject::WordProcessor),
+            ToDo(CheckSubject::WordProcessor,
+                 "LibreOffice Writer is still being started: run System Check again in a few seconds."));
+  site.Word = WordFinding::Ended;
+  EXPECT_EQ(One(CheckSubject::WordProcessor),
+            ToDo(CheckSubject::WordProcessor,
+                 "LibreOffice Writer has ended: print a score sheet, which starts it again."));
 }
 
 TEST_F(LookedAt, ASecondScreenIsAskedFor) {
@@ -188,8 +206,36 @@ TEST_F(LookedAt, TheClockMayNotBeBehindTheCopies) {
   std::filesystem::create_directory(site.DataFile("backups"));
   WriteFile(site.DataFile("backups/members-2013-05-21-143005.mdb"), "");
   EXPECT_TRUE(One(CheckSubject::Clock).Fine);
-  WriteFile(site.DataFile("backups/members-2013-05-21-143006.mdb"), "");
+  WriteFile(site.DataFile("backups/members-2013-05-21-153005.mdb"), "");
+  EXPECT_TRUE(One(CheckSubject::Clock).Fine) << "the hour that clocks are put back by";
+  WriteFile(site.DataFile("backups/members-2013-05-21-153006.mdb"), "");
   EXPECT_THAT(One(CheckSubject::Clock).Text, HasSubstr("set the date and time"));
+}
+
+TEST_F(LookedAt, TheClockMayNotBeBehindTheData) {
+  for (const char* file : {"members.mdb", "scenarios.mdb", "games.mdb"}) {
+    if (!site.Disk.FileExists(site.DataFile(file))) {
+      WriteFile(site.DataFile(file), "");
+    }
+    SetTimeOfChange(site.DataFile(file), "2013-05-21 15:30:05");
+    EXPECT_TRUE(One(CheckSubject::Clock).Fine) << file;
+    SetTimeOfChange(site.DataFile(file), "2013-05-22 00:00:00");
+    EXPECT_EQ(One(CheckSubject::Clock), ToDo(CheckSubject::Clock,
+                                             "The clock shows 2013-05-21 14:30:05, but the program's data is "
+                                             "younger: set the date and time."))
+        << file;
+    SetTimeOfChange(site.DataFile(file), "2013-05-20 10:00:00");
+  }
+}
+
+TEST_F(LookedAt, AClockThatNoServerSetsIsARemarkAndNoFault) {
+  site.Computer.Synchronised = false;
+  EXPECT_EQ(One(CheckSubject::Clock),
+            Fine(CheckSubject::Clock,
+                 "2013-05-21 14:30:05 (not synchronised with a time server: compare it with a watch now and "
+                 "then)"));
+  site.Computer.Synchronised.reset();
+  EXPECT_EQ(One(CheckSubject::Clock), Fine(CheckSubject::Clock, "2013-05-21 14:30:05"));
 }
 
 TEST_F(LookedAt, AClockWithoutABatteryIsSeen) {

@@ -15,6 +15,7 @@ class FakeComputer : public Computer {
   std::vector<DeviceUser> Users;    ///< other programs with devices
   std::vector<std::string> AllPrinters = {"Office"};
   std::optional<RuntimeError> PrinterFailure;
+  std::optional<bool> Synchronised = true;
   std::string Home = "/home/anna";
   std::string User = "anna";
 
@@ -29,6 +30,7 @@ class FakeComputer : public Computer {
     }
     return AllPrinters;
   }
+  std::optional<bool> ClockIsSynchronised() const override { return Synchronised; }
   std::string HomeFolder() const override { return Home; }
   std::string UserName() const override { return User; }
 };

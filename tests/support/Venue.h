@@ -14,6 +14,7 @@
 #include <vector>
 
 #include "app/frmRx.h"
+#include "check/FailureBoxes.h"
 #include "platform/jet/JetConverter.h"
 #include "platform/qt/QtEventPump.h"
 #include "platform/qt/UprightPicture.h"
@@ -62,7 +63,7 @@ class Venue : public DataSite {
                                                 .CommonDialog1 = Dialog,
                                                 .Disk = Disk,
                                                 .Places = Places,
-                                                .Boxes = Boxes,
+                                                .Boxes = Watched,
                                                 .OtherPrograms = Started,
                                                 .Devices = Devices,
                                                 .MSComm1 = Port,
@@ -157,6 +158,11 @@ class Venue : public DataSite {
     });
   }
 
+  FailureBoxes Watched{Boxes, Strings, [this] {
+                         if (Window) {
+                           Window->PointToSystemCheck();
+                         }
+                       }};
   FakeEventPump Events;
   JetConverter Old{Disk, JetReaderPath(), std::chrono::milliseconds(5000)};
   QtEventPump RealEvents;

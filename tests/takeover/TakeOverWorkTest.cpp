@@ -2,6 +2,7 @@
 
 #include <gmock/gmock.h>
 
+#include "tests/fakes/FakeOldDatabases.h"
 #include "tests/support/OldFiles.h"
 #include "tests/takeover/TakeOverSite.h"
 
@@ -301,6 +302,38 @@ TEST_F(TakeOvers, KeepTheFilesOfTwoInOneSecondApart) {
   site.Open();
   site.Look(work, "old");
   EXPECT_EQ(site.TakeAll(work).KeptAs.back(), "tessarine-2013-05-21-143005-replaced2.ini");
+}
+
+TEST_F(TakeOvers, AreStoppedInTheMiddleOfAnOldFile) {
+  FakeOldDatabases old;
+  old.OldPaths = {site.Data() + "/.takeover/old-members.mdb"};
+  int asked = 0;
+  bool shownTwice = true;
+  old.Run = [&](const OldDatabase& database, ConversionSteps& steps) {
+    WriteFile(database.Path + ".new", "half");
+    shownTwice = !steps.ShowsProgress();
+    while (steps.KeepOn()) {
+    }
+    throw OldDatabaseStopped();
+  };
+  TakeOverWork::Parts parts = site.Parts();
+  TakeOverWork stopped({.Engine = parts.Engine,
+                        .Old = old,
+                        .Disk = parts.Disk,
+                        .Time = parts.Time,
+                        .Strings = parts.Strings,
+                        .DataFolder = parts.DataFolder,
+                        .Databases = parts.Databases,
+                        .Ask = parts.Ask,
+                        .HasPort = parts.HasPort});
+  const auto found = stopped.Look(FindOldInstallation(site.Disk, site.Folder / "old").value(),
+                                  [&asked](OldItem) { return ++asked < 20; });
+  ASSERT_EQ(old.Converted.size(), 1U);
+  EXPECT_THAT(found, IsEmpty());
+  EXPECT_EQ(asked, 20);
+  EXPECT_FALSE(shownTwice);
+  EXPECT_THAT(site.Disk.FileNames(site.Data() + "/.takeover"), IsEmpty());
+  ExpectUntouched();
 }
 
 class JetTakeOvers : public TakeOvers {

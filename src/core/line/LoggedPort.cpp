@@ -41,6 +41,9 @@ void LoggedPort::NoteFault(const RuntimeError& fault) {
   if (!port_.PortOpen()) {
     log_->End();
   }
+  if (fault.Number() == Fault::PortLost && parts_.OnLost) {
+    parts_.OnLost();
+  }
 }
 
 void LoggedPort::Open(const std::string& device, const std::string& settings) {

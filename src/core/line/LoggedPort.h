@@ -24,6 +24,8 @@ class LoggedPort final : public SerialPort {
     const Clock& Time;
     /// Called after each attempt to open the line; `fault` is 0 or the error number. May be empty.
     std::function<void(const std::string& device, const std::string& settings, int fault)> OnOpening = {};
+    /// Called when the open line is lost: once, until it is opened again. May be empty.
+    std::function<void()> OnLost = {};
   };
 
   /// `port` must outlive this object. `instrument` is at its far end until SetInstrument names another.

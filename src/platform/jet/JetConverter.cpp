@@ -144,7 +144,7 @@ OldDatabaseReport JetConverter::MakeAndReplace(const OldDatabase& old, Conversio
     throw OldDatabaseRefused();
   }
   const ConvertedFile newFile(disk_, old.Path + ".new", old.EmptyPath);
-  OldDatabaseReport report = ReadInto(newFile.Path(), old);
+  OldDatabaseReport report = ReadInto(newFile.Path(), old, steps);
   RequireValues(report.NotTaken, steps);
   const bool joined = Join(newFile.Path(), old, steps);
   newFile.MakeDurable();
@@ -182,7 +182,8 @@ bool JetConverter::Join(const std::string& newFile, const OldDatabase& old, Conv
   return true;
 }
 
-OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const OldDatabase& old) const {
+OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const OldDatabase& old,
+                                         ConversionSteps& steps) const {
   TableImport import(newFile, old.Table, lockWait_);
   std::vector<NotTakenOver> otherTables;
   JetStream stream({.OtherTable =
@@ -193,13 +194,19 @@ OldDatabaseReport JetConverter::ReadInto(const std::string& newFile, const OldDa
                     .Row = [&](const std::vector<Value>& row,
                                const std::vector<std::size_t>& unread) { import.AddRow(row, unread); },
                     .Unreadable = RefuseTable});
+  const auto tell = [&] {
+    onProgress_(import.Rows());
+    if (!steps.KeepOn()) {
+      throw OldDatabaseStopped();
+    }
+  };
   const ChildEnd end = RunChild(reader_.Path(), {old.Path, old.Table}, silence_,
                                 {.OnOutput =
                                      [&](std::string_view bytes) {
                                        stream.Take(bytes);
-                                       onProgress_(import.Rows());
+                                       tell();
                                      },
-                                 .OnWait = [&] { onProgress_(import.Rows()); }});
+                                 .OnWait = tell});
   // What the reader wrote to standard error comes from the library, in its own words.
   if (!end.Succeeded || !stream.Ended()) {
     throw OldDatabaseRefused();

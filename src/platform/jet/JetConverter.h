@@ -32,7 +32,8 @@ class JetConverter : public OldDatabases {
   OldDatabaseReport Convert(const OldDatabase& old, ConversionSteps& steps) override;
 
  private:
-  OldDatabaseReport ReadInto(const std::string& newFile, const OldDatabase& old) const;
+  OldDatabaseReport ReadInto(const std::string& newFile, const OldDatabase& old,
+                             ConversionSteps& steps) const;
   OldDatabaseReport MakeAndReplace(const OldDatabase& old, ConversionSteps& steps);
   bool Join(const std::string& newFile, const OldDatabase& old, ConversionSteps& steps) const;
 

@@ -1,12 +1,12 @@
 #include "platform/linux/LinuxComputer.h"
 
 #include <fcntl.h>
-#include <poll.h>
 #include <pwd.h>
 #include <sys/stat.h>
+#include <sys/timex.h>
+#include <unistd.h>
 
 #include <algorithm>
-#include <array>
 #include <chrono>
 #include <filesystem>
 #include <fstream>
@@ -15,7 +15,8 @@
 #include <utility>
 
 #include "platform/RuntimeError.h"
-#include "platform/linux/ChildProcess.h"
+#include "platform/linux/PortLocks.h"
+#include "platform/linux/ProgramOutput.h"
 
 namespace {
 
@@ -53,30 +54,23 @@ std::string FirstLine(const std::filesystem::path& path) {
   return line;
 }
 
-/// What the program writes until its end. Throws RuntimeError 75 when that does not come in time.
-std::string OutputOf(const std::vector<std::string>& words, const Computer::KeepOn& keepOn) {
-  constexpr std::chrono::seconds patience(3);
-  constexpr int betweenQuestions = 20;  // milliseconds
-  const Descriptor nothing(open("/dev/null", O_RDWR | O_CLOEXEC));
-  Pipe output;
-  ChildProcess child(words, {nothing.Number(), output.WriteEnd.Number(), nothing.Number()});
-  output.WriteEnd.Close();
-  const auto end = std::chrono::steady_clock::now() + patience;
-  std::string text;
-  while (keepOn()) {
-    pollfd watched{output.ReadEnd.Number(), POLLIN, 0};
-    std::array<char, 4096> buffer;
-    if (poll(&watched, 1, betweenQuestions) > 0) {
-      const ssize_t got = read(output.ReadEnd.Number(), buffer.data(), buffer.size());
-      if (got <= 0) {
-        return text;
-      }
-      text.append(buffer.data(), static_cast<std::size_t>(got));
-    } else if (std::chrono::steady_clock::now() > end) {
-      throw RuntimeError(Fault::PathAccess, words.front());
+constexpr const char* SchedulerIs = "scheduler is ";
+
+/// The lines of a text that are not empty.
+std::vector<std::string> LinesOf(const std::string& text) {
+  std::vector<std::string> found;
+  std::istringstream lines(text);
+  for (std::string line; std::getline(lines, line);) {
+    if (!line.empty()) {
+      found.push_back(line);
     }
   }
-  return {};
+  return found;
+}
+
+/// True if the program that starts others says that there is none of that name.
+bool IsMissing(const std::string& errors) {
+  return errors.starts_with("env: ");
 }
 
 const passwd* ThisUser() {
@@ -85,8 +79,8 @@ const passwd* ThisUser() {
 
 }  // namespace
 
-LinuxComputer::LinuxComputer(std::string processes, std::vector<std::string> printerWords)
-    : processes_(std::move(processes)), printerWords_(std::move(printerWords)) {}
+LinuxComputer::LinuxComputer(std::string processes, std::vector<std::string> printerWords, std::string locks)
+    : processes_(std::move(processes)), printerWords_(std::move(printerWords)), locks_(std::move(locks)) {}
 
 bool LinuxComputer::MayUse(const std::string& device) const {
   return faccessat(AT_FDCWD, device.c_str(), R_OK | W_OK, AT_EACCESS) == 0;
@@ -113,26 +107,45 @@ std::vector<DeviceUser> LinuxComputer::UsersOf(const std::vector<std::string>& d
       users.push_back({device, FirstLine(entry->path() / "comm")});
     }
   }
+  for (const std::string& device : devices) {
+    const std::optional<std::string> holder = LockHolder(device, locks_, processes_);
+    if (holder && std::find(users.begin(), users.end(), DeviceUser{device, *holder}) == users.end()) {
+      users.push_back({device, *holder});
+    }
+  }
   return users;
 }
 
 std::vector<std::string> LinuxComputer::Printers(const KeepOn& keepOn) const {
-  std::vector<std::string> names;
-  std::string output;
+  constexpr std::chrono::seconds patience(8);
+  ProgramOutput output;
   try {
-    output = OutputOf(printerWords_, keepOn);
+    output = RunToEnd(printerWords_, patience, keepOn);
   } catch (const RuntimeError& error) {
-    if (error.Number() != Fault::FileNotFound) {
-      throw;
+    if (error.Number() == Fault::FileNotFound) {
+      return {};
     }
+    throw RuntimeError(error.Number(), "lpstat, " + std::to_string(patience.count()) + " s");
   }
-  std::istringstream lines(output);
-  for (std::string line; std::getline(lines, line);) {
-    if (!line.empty()) {
-      names.push_back(line);
-    }
+  std::vector<std::string> lines = LinesOf(output.Text);
+  const std::string state = !lines.empty() && lines.back().starts_with(SchedulerIs) ? lines.back() : "";
+  if (!state.empty()) {
+    lines.pop_back();
   }
-  return names;
+  // Printers in the network are listed without it.
+  if (lines.empty() && state.find(" not ") != std::string::npos) {
+    throw RuntimeError(Fault::DeviceUnavailable, state);
+  }
+  if (lines.empty() && !output.Errors.empty() && !IsMissing(output.Errors)) {
+    throw RuntimeError(Fault::DeviceUnavailable, LinesOf(output.Errors).front());
+  }
+  return lines;
+}
+
+std::optional<bool> LinuxComputer::ClockIsSynchronised() const {
+  timex state{};
+  const int result = adjtimex(&state);
+  return result < 0 ? std::nullopt : std::optional(result != TIME_ERROR && (state.status & STA_UNSYNC) == 0);
 }
 
 std::string LinuxComputer::HomeFolder() const {

@@ -135,6 +135,27 @@ TEST_F(LoggedLine, WritesAFaultOnceAndNotForEachByte) {
   EXPECT_EQ(LogOf("box"), opened + rest + opened + rest);
 }
 
+TEST_F(LoggedLine, TellsOnceThatItIsLost) {
+  int lost = 0;
+  LoggedPort told(
+      line,
+      {.Disk = files, .Folder = "/data/logs", .Elapsed = time, .Time = clock, .OnLost = [&lost] { ++lost; }},
+      "box");
+  told.Open(Device, Settings);
+  EXPECT_EQ(FailureOf([&] { told.Input(); }), 62);
+  EXPECT_EQ(lost, 0);
+  line.Lose();
+  for (int byte = 0; byte < 3; ++byte) {
+    EXPECT_EQ(FailureOf([&] { told.InBufferCount(); }), 8012);
+  }
+  EXPECT_EQ(lost, 1);
+  told.Close();
+  told.Open(Device, Settings);
+  line.Lose();
+  EXPECT_EQ(FailureOf([&] { told.Output(1); }), 8012);
+  EXPECT_EQ(lost, 2);
+}
+
 TEST_F(LoggedLine, WritesTheFaultOfALineThatWasNeverOpen) {
   EXPECT_EQ(FailureOf([&] { port.Output(1); }), 8018);
   EXPECT_EQ(FailureOf([&] { port.Output(1); }), 8018);

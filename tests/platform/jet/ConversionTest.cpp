@@ -105,6 +105,15 @@ class WithWords : public testing::Test {
     return {};
   }
 
+  /// With a reader that goes on without end.
+  void ConvertEndlessly(const ReaderWords& words) {
+    WriteFile(folder / "words", words.Bytes());
+    WriteFile(reader, "#!/bin/sh\ncat '" + (folder / "words") + "'\nexec sleep 1000\n");
+    std::filesystem::permissions(reader, std::filesystem::perms(0755));
+    JetConverter(disk, reader)
+        .Convert({path, "Members", EmptyDatabase("members"), folder / "members-new.mdb"}, answers);
+  }
+
   static ReaderWords OneMember() {
     return ReaderWords().Table({"ContactID", "FirstName"}).Row(7, "Ada").Tag('E');
   }
@@ -116,6 +125,15 @@ class WithWords : public testing::Test {
   FailingFiles disk;
   ConversionAnswers answers;
 };
+
+TEST_F(WithWords, IsStoppedInTheMiddleWithoutAnyChange) {
+  answers.StopAt = 3;
+  const auto words = ReaderWords().Table({"ContactID", "FirstName"}).Row(7, "Ada");
+  EXPECT_THROW(ConvertEndlessly(words), OldDatabaseStopped);
+  EXPECT_EQ(answers.Asked, 3);
+  EXPECT_EQ(ReadFile(path), before);
+  EXPECT_THAT(disk.FileNames(folder.Path()), UnorderedElementsAre("members.mdb", "reader", "words"));
+}
 
 TEST_F(WithWords, ReportsWhatWasNotTakenOver) {
   ReaderWords words;

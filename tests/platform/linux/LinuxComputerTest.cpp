@@ -8,6 +8,7 @@
 #include <sys/wait.h>
 
 #include <csignal>
+#include <filesystem>
 
 #include "platform/linux/ChildProcess.h"
 #include "tests/support/OrdinaryUser.h"
@@ -57,6 +58,15 @@ TEST_F(HeldLine, IsFoundUnderAnotherNameToo) {
   EXPECT_THAT(computer.UsersOf({link}, Always), ElementsAre(DeviceUser{link, "sleep"}));
 }
 
+TEST_F(HeldLine, IsFoundByItsLockToo) {
+  const TemporaryFolder folder;
+  std::filesystem::create_directories(folder / "proc/4711");
+  WriteFile(folder / "proc/4711/comm", "modemd\n");
+  WriteFile(folder / ("LCK.." + line.substr(line.rfind('/') + 1)), "      4711\n");
+  const LinuxComputer locked(folder / "proc", {}, folder.Path());
+  EXPECT_THAT(locked.UsersOf({line}, Always), ElementsAre(DeviceUser{line, "modemd"}));
+}
+
 TEST_F(HeldLine, IsFreeOnceTheProgramHasEnded) {
   holder.reset();
   EXPECT_THAT(computer.UsersOf({line}, Always), IsEmpty());
@@ -91,20 +101,45 @@ TEST(ThisComputer, KnowsItsUser) {
   EXPECT_THAT(LinuxComputer().UserName(), Not(IsEmpty()));
 }
 
+LinuxComputer WithPrinters(const std::string& script) {
+  return LinuxComputer("/proc", {"/bin/sh", "-c", script});
+}
+
 TEST(Printers, AreThoseThatTheSystemLists) {
-  const LinuxComputer computer("/proc", {"/bin/sh", "-c", "printf 'Office\\nBack_Room\\n'"});
-  EXPECT_THAT(computer.Printers(Always), ElementsAre("Office", "Back_Room"));
+  EXPECT_THAT(WithPrinters("printf 'Office\nBack_Room\nscheduler is running\n'").Printers(Always),
+              ElementsAre("Office", "Back_Room"));
+  EXPECT_THAT(WithPrinters("echo scheduler is running").Printers(Always), IsEmpty());
+}
+
+TEST(Printers, InTheNetworkNeedNoPrintingSystemOfTheirOwn) {
+  EXPECT_THAT(WithPrinters("printf 'Hall\nscheduler is not running\n'").Printers(Always),
+              ElementsAre("Hall"));
 }
 
 TEST(Printers, AreNoneWhereNothingListsThem) {
   EXPECT_THAT(LinuxComputer("/proc", {"/missing/lpstat"}).Printers(Always), IsEmpty());
-  EXPECT_THAT(LinuxComputer("/proc", {"/bin/false"}).Printers(Always), IsEmpty());
+  EXPECT_THAT(LinuxComputer("/proc", {"env", "LC_ALL=C", "/missing/lpstat"}).Printers(Always), IsEmpty());
 }
 
-TEST(Printers, AreNotWaitedForWithoutEnd) {
-  const LinuxComputer silent("/proc", {"/bin/sleep", "1000"});
-  EXPECT_EQ(NumberThrownBy([&] { silent.Printers(Always); }), Fault::PathAccess);
-  EXPECT_THAT(silent.Printers([] { return false; }), IsEmpty());
+TEST(Printers, AreNotNoneWhereThePrintingSystemIsDown) {
+  const auto failureOf = [](const LinuxComputer& computer) -> std::string {
+    try {
+      computer.Printers(Always);
+    } catch (const RuntimeError& error) {
+      return std::to_string(error.Number()) + ' ' + error.what();
+    }
+    return "none";
+  };
+  EXPECT_EQ(failureOf(WithPrinters("echo scheduler is not running")), "68 scheduler is not running");
+  EXPECT_EQ(failureOf(WithPrinters("echo lpstat: Forbidden >&2; exit 1")), "68 lpstat: Forbidden");
+}
+
+TEST(Printers, AreNotWaitedForWhenThatIsNotWanted) {
+  EXPECT_THAT(LinuxComputer("/proc", {"/bin/sleep", "1000"}).Printers([] { return false; }), IsEmpty());
+}
+
+TEST(ThisComputer, TellsAboutItsClock) {
+  EXPECT_TRUE(LinuxComputer().ClockIsSynchronised().has_value());
 }
 
 }  // namespace
