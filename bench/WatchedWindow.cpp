@@ -71,12 +71,13 @@ int main(int argc, char** argv) {
   }
   QSocketNotifier orders(STDIN_FILENO, QSocketNotifier::Read);
   LongestDelay delay;
-  QObject::connect(&orders, &QSocketNotifier::activated, &orders, [&delay] {
+  QObject::connect(&orders, &QSocketNotifier::activated, &orders, [&delay, &orders, &program] {
     char order = 0;
     if (read(STDIN_FILENO, &order, 1) == 1) {
       Tell(delay.Take());
     } else {
-      QApplication::quit();
+      orders.setEnabled(false);
+      program.Window().close();
     }
   });
   AwaitPages(*program.Window().findChild<ResultsHost*>(), [](int port) { Tell(port); });
