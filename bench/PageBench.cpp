@@ -10,12 +10,14 @@
 #include <fstream>
 #include <stdexcept>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include "bench/Goals.h"
 #include "bench/PageLoad.h"
 #include "bench/PagePhones.h"
 #include "bench/PageServerPeer.h"
+#include "bench/WindowWatch.h"
 #include "platform/linux/ChildProcess.h"
 #include "tests/web/Games.h"
 #include "web/ResultsPages.h"
@@ -173,6 +175,33 @@ bool AsFastAsThePeer(const std::string& body, const Server& server) {
   return ReportGoal(name, Median(others) / Median(own), goal, text.data()) && failures == 0;
 }
 
+/// The longest delays of the program's own window in turns: while nobody asks for its pages, and while 200
+/// connections do as fast as they can. Each the median of the turns.
+bool WindowStaysPrompt() {
+  constexpr const char* name = "main window's longest delay, with / without load, +5 ms";
+  constexpr double mostMore = 5;
+  static constexpr auto turn = 5500ms;  // the program looks after its server every five seconds
+  constexpr int turns = 7;
+  const ScratchFolder folder;
+  WindowWatch window(TESSARINE_WATCHED_WINDOW, folder.Path);
+  if (window.Port() == 0) {
+    return ReportGoal(name, 1000, 1, "the window does not come up");
+  }
+  std::this_thread::sleep_for(turn);  // what a start leaves behind for later is done then
+  std::vector<double> calm;
+  std::vector<double> loaded;
+  std::size_t failures = 0;
+  for (int round = 0; round < turns; ++round) {
+    calm.push_back(window.LongestDelay([] { std::this_thread::sleep_for(turn); }));
+    loaded.push_back(
+        window.LongestDelay([&] { failures += LoadServer(window.Port(), "/", Phones, turn).Failures; }));
+  }
+  std::array<char, 96> text{};
+  std::snprintf(text.data(), text.size(), "%.1f ms to %.1f ms, %zu failures", Median(loaded), Median(calm),
+                failures);
+  return ReportGoal(name, Median(loaded) / (Median(calm) + mostMore), 1, text.data()) && failures == 0;
+}
+
 }  // namespace
 
 int main() {
@@ -197,5 +226,6 @@ int main() {
   met &= MemoryHolds(server, "  the same after each page was asked for");
   met &= PhonesFollow(pages, server, Games + 1);
   met &= AsFastAsThePeer(pages.Pages().at("/"), server);
+  met &= WindowStaysPrompt();
   return met ? 0 : 1;
 }
