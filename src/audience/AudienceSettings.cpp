@@ -135,6 +135,7 @@ void AudienceSettings::ShowPicture(const std::string& path) {
   picture_ = path;
   const QString whole = QString::fromStdString(path);
   ui_->PictureName->setText(QFileInfo(whole).fileName());
+  ui_->PictureName->setCursorPosition(0);
   ui_->PictureName->setToolTip(whole);
   ui_->NoPicture->setEnabled(!path.empty());
 }
@@ -160,6 +161,11 @@ void AudienceSettings::ShowConsequence() {
     told.append("\n").append(Filled(parts_.Strings.Text(winners), {std::to_string(layout.Winners)}));
   }
   ui_->Consequence->setText(QString::fromStdString(told));
+  MakeRoom();
+}
+
+void AudienceSettings::showEvent(QShowEvent* event) {
+  QDialog::showEvent(event);
   MakeRoom();
 }
 

@@ -34,6 +34,9 @@ class AudienceSettings : public QDialog {
   /// What the entries hold.
   AudienceSetup Setup() const;
 
+ protected:
+  void showEvent(QShowEvent* event) override;
+
  private:
   void SetUpTexts();
   void ListScreens(const std::string& chosen);
