@@ -8,7 +8,6 @@ namespace {
 
 constexpr std::chrono::seconds AfterStart(60);
 constexpr std::chrono::seconds QuietTime(5);
-constexpr std::chrono::seconds BetweenLooks(1);
 constexpr std::chrono::milliseconds BetweenSteps(20);  // in which the window does what there is to do
 constexpr std::chrono::minutes BetweenCopies(10);
 

@@ -23,6 +23,9 @@ class IdleCopying : public QObject {
   /// Does a step if nobody waits for the program, and returns how long to wait before the next call.
   std::chrono::milliseconds Look();
 
+  /// There may be something to do, which is not to wait for the next call of its own.
+  void LookSoon() { timer_.start(BetweenLooks); }
+
   /// The archive is about to be closed.
   void End();
 
@@ -30,6 +33,8 @@ class IdleCopying : public QObject {
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
+  static constexpr std::chrono::seconds BetweenLooks{1};
+
   const Parts parts_;
   QTimer timer_;
   std::chrono::microseconds lastInput_;

@@ -169,7 +169,7 @@ std::string frmRx::ShowMembers(std::int32_t contactToShow) {
   window.ContactToShow = contactToShow;
   window.exec();
   keeping_->NoteMembers();
-  CutNumbers();
+  idleCopying_->LookSoon();  // a check that failed earlier may have begun
   ShowOtherNames();
   return window.SelectedContact();
 }

@@ -80,14 +80,18 @@ void frmRx::DeleteRankingPage() {
 
 bool frmRx::MayDeleteOldGames(int years, int games) {
   const std::string number = std::to_string(years);
-  if (state_->ReadIni(State::Archive, State::YearsAnswered, {}) != number) {
-    const bool isAllowed =
-        services_.Boxes.Show(
-            Filled(services_.Strings.Text(OwnText::KeepYearsQuestion), {number, std::to_string(games)}),
-            DefaultBoxTitle, BoxIcon::Question, BoxButtons::YesNo) == BoxAnswer::Yes;
-    state_->WriteIni(State::Archive,
-                     {{State::YearsAnswered, number}, {State::MayDelete, isAllowed ? "1" : "0"}});
-    return isAllowed;
+  if (state_->ReadIni(State::Archive, State::YearsAnswered, {}) == number) {
+    return state_->ReadIni(State::Archive, State::MayDelete, {}) == "1";
   }
-  return state_->ReadIni(State::Archive, State::MayDelete, {}) == "1";
+  // Where the answer cannot be kept, the question would come at every start.
+  if (!state_->WriteIni(State::Archive, {{State::MayDelete, "0"}})) {
+    return false;
+  }
+  const bool isAllowed =
+      services_.Boxes.Show(
+          Filled(services_.Strings.Text(OwnText::KeepYearsQuestion), {number, std::to_string(games)}),
+          DefaultBoxTitle, BoxIcon::Question, BoxButtons::YesNo) == BoxAnswer::Yes;
+  return state_->WriteIni(State::Archive,
+                          {{State::YearsAnswered, number}, {State::MayDelete, isAllowed ? "1" : "0"}}) &&
+         isAllowed;
 }

@@ -4,6 +4,7 @@
 
 #include <QApplication>
 #include <QKeyEvent>
+#include <QTest>
 
 #include "tests/fakes/FakeEventPump.h"
 
@@ -65,6 +66,12 @@ TEST_F(CopyingWhileIdle, WaitsForCommandsAndWindows) {
   busy = false;
   copying.Look();
   EXPECT_EQ(steps, 1);
+}
+
+TEST_F(CopyingWhileIdle, NeedNotWaitForTheNextLookWhenThereMayBeSomethingToDo) {
+  Wait(seconds(60));
+  copying.LookSoon();
+  EXPECT_TRUE(QTest::qWaitFor([this] { return steps == 3; }, 20'000));
 }
 
 }  // namespace

@@ -8,6 +8,7 @@
 #include "archive/history/MemberHistoryWindow.h"
 #include "archive/history/RankingWindow.h"
 #include "members/Members.h"
+#include "tests/support/TestDatabase.h"
 #include "tests/support/Venue.h"
 #include "tests/support/WhileModal.h"
 
@@ -46,6 +47,23 @@ class HistoryCommands : public testing::Test {
 
   Venue venue;
 };
+
+TEST_F(HistoryCommands, LeaveGamesOfFormerMembersToAQuietMomentWhenMembersIsOpened) {
+  KeepGameOfRhys();
+  venue.Window.reset();
+  venue.ChangeDatabase("members.mdb", "UPDATE Members SET FirstName = 'Ann' WHERE ContactID = 2");
+  {
+    OtherConnection other(venue.DataFile("games.mdb"));
+    other.Execute("BEGIN EXCLUSIVE");
+    venue.Start();
+    QCoreApplication::processEvents();
+  }
+  const WhileModal<Members> look([](Members& window) { window.close(); });
+  venue.Trigger("mnuManageMembers");
+  EXPECT_EQ(look.Runs(), 1);
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT MemberID FROM CutMembers WHERE MemberID > 0"), "2");
+  EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM GamePlayers WHERE MemberID = 2"), "1");
+}
 
 TEST_F(HistoryCommands, ShowTheGamesOfMembers) {
   KeepGameOfRhys();
@@ -204,6 +222,20 @@ TEST_F(YearsOfGames, StayAfterANoWithoutAFurtherQuestion) {
   Start("keep_years=2");
   EXPECT_EQ(Boxes(), 2U);
   EXPECT_EQ(Games(), "NULL");
+}
+
+TEST_F(YearsOfGames, AreNotAskedAboutWhereTheAnswerCannotBeKept) {
+  std::filesystem::remove(venue.DataFile("state.ini"));
+  std::filesystem::create_directory(venue.DataFile("state.ini"));
+  Start("keep_years=3");
+  Start("keep_years=3");
+  EXPECT_THAT(venue.Boxes.Boxes, IsEmpty());
+  EXPECT_EQ(Games(), "2009,2010");
+  std::filesystem::remove(venue.DataFile("state.ini"));
+  venue.Boxes.Answers = {BoxAnswer::Yes};
+  Start("keep_years=3");
+  EXPECT_EQ(Boxes(), 1U);
+  EXPECT_EQ(Games(), "2010");
 }
 
 TEST_F(YearsOfGames, AreNotAskedAboutWhileThereIsNothingToDelete) {

@@ -154,11 +154,12 @@ void IniReader::WriteIni(const std::string& section, const std::string& key, con
   WriteIni(section, {{key, value}});
 }
 
-void IniReader::WriteIni(const std::string& section, const Values& values) {
+bool IniReader::WriteIni(const std::string& section, const Values& values) {
   const bool written = TryWrite(section, values);
   if (AfterWrite) {
     AfterWrite(written);
   }
+  return written;
 }
 
 bool IniReader::TryWrite(const std::string& section, const Values& values) {

@@ -47,12 +47,11 @@ class IniReader {
     WriteIni(setting.Section, setting.Key, value);
   }
 
-  /// The same for several values, all or none of them.
-  void WriteIni(const std::string& section, const Values& values);
+  /// The same for several values, all or none of them. Returns false if the file is unchanged.
+  bool WriteIni(const std::string& section, const Values& values);
 
  private:
   Files& files_;
-  /// Returns false if the file is unchanged.
   bool TryWrite(const std::string& section, const Values& values);
 
   std::string path_;
