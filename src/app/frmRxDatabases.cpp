@@ -16,6 +16,7 @@
 #include "members/ExportMembers.h"
 #include "members/ImportMembers.h"
 #include "platform/RuntimeError.h"
+#include "takeover/OldInstallation.h"
 #include "takeover/TakeOver.h"
 
 void frmRx::ExportMemberFile() {
@@ -176,14 +177,16 @@ TakeOverWork::Parts frmRx::TakeOverParts() {
 ImportedGames frmRx::ImportOldGames(const std::string& folder, FilesOfMembers members,
                                     const TakeOver::OnImport& keepOn) {
   CheckSpaceForGames(services_.Disk, userDataFolder_, services_.Strings);
-  GameImport import({.Archive = archive_->File(),
-                     .Members = session_.DbMembers(),
-                     .Disk = services_.Disk,
-                     .Time = services_.Time,
-                     .Strings = services_.Strings,
-                     .Factors = session_.Factors(),
-                     .UserDataFolder = userDataFolder_},
-                    members == FilesOfMembers::Taken ? FilesOf::ThisTable : FilesOf::OtherTable);
+  GameImport import(
+      {.Archive = archive_->File(),
+       .Members = session_.DbMembers(),
+       .Disk = services_.Disk,
+       .Time = services_.Time,
+       .Strings = services_.Strings,
+       .Factors = session_.Factors(),
+       .UserDataFolder = userDataFolder_,
+       .IsWanted = [this](const std::string& path) { return MayBeOldGame(services_.Disk, path); }},
+      members == FilesOfMembers::Taken ? FilesOf::ThisTable : FilesOf::OtherTable);
   const bool isWhole = import.Run(folder, [&keepOn](const GameImport::State& state) {
     return keepOn(state.Files == 0 ? 0 : static_cast<double>(state.Done) / static_cast<double>(state.Files));
   });

@@ -68,17 +68,8 @@ std::string LastUse(const Files& disk, const OldInstallation& old) {
   return {};
 }
 
-bool IsGameFile(const Files& disk, const std::string& path) {
-  constexpr std::size_t startOfFile = 512;
-  try {
-    return disk.ReadPart(path, 0, startOfFile).find("<GameData") != std::string::npos;
-  } catch (const RuntimeError&) {
-    return false;
-  }
-}
-
 void AddGameFile(const Files& disk, const std::string& path, OldGameFiles& games) {
-  if (!IsGameFile(disk, path)) {
+  if (!MayBeOldGame(disk, path)) {
     return;
   }
   ++games.Count;
@@ -91,6 +82,15 @@ void AddGameFile(const Files& disk, const std::string& path, OldGameFiles& games
 }
 
 }  // namespace
+
+bool MayBeOldGame(const Files& disk, const std::string& path) {
+  constexpr std::size_t startOfFile = 512;
+  try {
+    return disk.ReadPart(path, 0, startOfFile).find("<GameData") != std::string::npos;
+  } catch (const RuntimeError&) {
+    return true;
+  }
+}
 
 std::string FileInFolder(const Files& disk, const std::string& folder, const std::string& name) {
   std::string found;
@@ -146,7 +146,7 @@ std::optional<OldGameFiles> CountGameFiles(const Files& disk, const std::string&
       if (!keepOn()) {
         return std::nullopt;
       }
-      if (file.size() > GameEnding.size() &&
+      if (file.size() >= GameEnding.size() &&
           IsNamed(std::string_view(file).substr(file.size() - GameEnding.size()), GameEnding)) {
         AddGameFile(disk, std::string(next).append("/").append(file), games);
       }

@@ -32,8 +32,11 @@ struct OldGameFiles {
 /// RuntimeError 70, 75 or 76 if the chosen folder cannot be read.
 std::optional<OldInstallation> FindOldInstallation(const Files& disk, const std::string& chosen);
 
+/// True for a file that begins as a game does, or that cannot be read. Old data lies among other XML files.
+bool MayBeOldGame(const Files& disk, const std::string& path);
+
 /// Counts the game files in a folder and below it; symbolic links to folders are not followed. Asks between
-/// two files whether to keep on. Nothing if it was stopped. What cannot be read does not count.
+/// two files whether to keep on. Nothing if it was stopped. Folders that cannot be read are left out.
 std::optional<OldGameFiles> CountGameFiles(const Files& disk, const std::string& folder,
                                            const std::function<bool()>& keepOn);
 

@@ -65,6 +65,7 @@ TEST_F(OldInstallationInTheProgram, IsInUseAtOnce) {
 TEST_F(OldInstallationInTheProgram, GivesItsGamesToTheArchiveWithTheMembersThatCameAlong) {
   WriteFile(venue.Folder / "old/game.xml", GameFile(PlayerOf(1, "<MemberIndex>4</MemberIndex>")));
   WriteFile(venue.Folder / "old/half.xml", "<GameData><PlayerData>");
+  WriteFile(venue.Folder / "old/notes.xml", "<notes/>");
   TakeOverAll();
   EXPECT_THAT(status, testing::EndsWith("\nGames: 1 imported, 0 known before, 1 refused."));
   EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "1");

@@ -112,7 +112,7 @@ TEST_F(OldInstallations, CountGameFilesAlsoBelow) {
   disk.FailRead("/stick/d.xml", RuntimeError(Fault::PathAccess));
   const auto games = CountGameFiles(disk, "/stick", [] { return true; });
   ASSERT_TRUE(games);
-  EXPECT_EQ(games->Count, 2U);
+  EXPECT_EQ(games->Count, 3U) << "one that cannot be read is told by the import";
   EXPECT_EQ(games->First, disk.ChangeTime);
   EXPECT_EQ(games->Last, disk.ChangeTime);
 }

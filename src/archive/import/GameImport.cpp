@@ -74,8 +74,9 @@ bool GameImport::Search(const std::string& folder, const OnStep& onStep) {
       refused_.push_back({path, {.Fault = GameFileFault::Unreadable, .Line = 0, .What = error.what()}});
     }
     for (const std::string& name : parts_.Disk.FileNames(path)) {
-      if (IsGameFileName(name)) {
-        paths_.push_back(std::string(path).append("/").append(name));
+      std::string file = std::string(path).append("/").append(name);
+      if (IsGameFileName(name) && (!parts_.IsWanted || parts_.IsWanted(file))) {
+        paths_.push_back(std::move(file));
       }
     }
     if (!onStep({.Done = paths_.size()})) {

@@ -50,6 +50,8 @@ class GameImport {
     const StringTable& Strings;
     SoldieringFactors Factors;   ///< those of today stand in for the unknown ones of a file
     std::string UserDataFolder;  ///< on whose disk space must stay free
+    /// Which of the files named "*.xml" are looked at; without it, all.
+    std::function<bool(const std::string& path)> IsWanted = nullptr;
   };
 
   /// How far the import is.
@@ -63,8 +65,8 @@ class GameImport {
 
   GameImport(const Parts& parts, FilesOf table);
 
-  /// Imports all "*.xml" in the folder and below it; symbolic links to folders are not followed. Returns
-  /// false if it was stopped: what was imported by then stays, and so it does when it throws. Throws
+  /// Imports all wanted "*.xml" in the folder and below it; symbolic links to folders are not followed.
+  /// Returns false if it was stopped: what was imported by then stays, and so it does when it throws. Throws
   /// RuntimeError 61 if too little of the disk is free, otherwise as GameArchive does.
   bool Run(const std::string& folder, const OnStep& onStep);
 

@@ -43,6 +43,8 @@ class Importing : public testing::Test {
 
   std::string Path(const std::string& name) const { return venue.Folder / "files/" + name; }
 
+  std::function<bool(const std::string& path)> wanted;
+
   /// A file with the venue's game as it is now.
   void Put(const std::string& name) const {
     WriteFile(Path(name), WriteGameFile(venue.Game, "Capture <the> Flag"));
@@ -55,7 +57,8 @@ class Importing : public testing::Test {
                        .Time = clock,
                        .Strings = venue.Strings,
                        .Factors = {},
-                       .UserDataFolder = venue.Folder.Path()},
+                       .UserDataFolder = venue.Folder.Path(),
+                       .IsWanted = wanted},
                       table);
   }
 
@@ -192,6 +195,14 @@ TEST_F(Importing, KnowsAGameFromWhoseEarlierStateAMemberWasCut) {
   venue.Game.Players(ArchiveVenue::Red0).DeathCount += 1;
   venue.Archive->KeepAgain(game, venue.State(), FormerState::KeptToo);
   EXPECT_EQ(ForgetIn(*venue.ArchiveDatabase, *venue.MembersDatabase, venue.Strings, 6), 1);
+  EXPECT_EQ(Run(), "0, 1, 0");
+}
+
+TEST_F(Importing, PassesByFilesThatAreNotWanted) {
+  Put("a.xml");
+  WriteFile(Path("notes.xml"), "<notes/>");
+  EXPECT_EQ(Run(), "1, 0, 1");
+  wanted = [](const std::string& path) { return !path.ends_with("/notes.xml"); };
   EXPECT_EQ(Run(), "0, 1, 0");
 }
 
