@@ -20,7 +20,7 @@ class QtPipedProgram final : public PipedProgram {
  private:
   void Launch();
   void Listen(QProcess& process);
-  void HasEnded();
+  void HasEnded(int exitCode);
 
   QTimer pause_;
   std::vector<std::string> words_;
