@@ -17,8 +17,12 @@ class PipedProgram {
   /// Called while events are processed, with what the program has written.
   std::function<void(std::string_view bytes)> OnOutput;
 
+  /// What OnEnd tells of a program that could not be started, and of one that something killed.
+  static constexpr int NotStarted = 127;
+  static constexpr int Killed = 128;
+
   /// Called while events are processed, when the program has ended by itself or could not be started.
-  std::function<void()> OnEnd;
+  std::function<void(int exitCode)> OnEnd;
 
   /// Starts the program `words[0]`, a path, with the other words as arguments, after a pause. One that still
   /// runs or waits for its start is stopped.

@@ -22,9 +22,10 @@ h1{font-size:1.5rem;line-height:1.2;margin:.9rem 0 .5rem}
 .lead{font-size:1.2rem;margin:.2rem 0}
 table{border-collapse:collapse;width:100%}
 th,td{padding:.4rem .2rem;border-bottom:1px solid var(--line);text-align:left;vertical-align:middle}
-th{font-weight:600;font-size:.85rem;overflow-wrap:normal}
+th{font-weight:600;font-size:.85rem;overflow-wrap:normal;word-break:keep-all}
 td:nth-child(n+3),th:nth-child(n+3),.hits td+td,.hits th+th,.figures td{text-align:right;
 font-variant-numeric:tabular-nums;overflow-wrap:normal}
+.board td:first-child,.ranks td:first-child{overflow-wrap:normal}
 .who{width:99%;min-width:7rem}
 .figures th{font-size:1rem}
 td a{padding:.2rem 0}

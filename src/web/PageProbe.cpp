@@ -4,7 +4,7 @@
 
 PageProbe::PageProbe(PipedProgram& program, std::string path) : program_(program), path_(std::move(path)) {
   program_.OnOutput = [this](std::string_view bytes) { TakeReports(bytes); };
-  program_.OnEnd = [this] {
+  program_.OnEnd = [this](int /*exitCode*/) {
     if (std::exchange(asking_, false)) {
       Become(false);
     }

@@ -25,7 +25,7 @@ PageServer::PageServer(PipedProgram& program, const MonotonicClock& clock, Resul
                        std::string path)
     : program_(program), clock_(clock), pages_(pages), path_(std::move(path)) {
   program_.OnOutput = [this](std::string_view bytes) { TakeReports(bytes); };
-  program_.OnEnd = [this] { StartAgain(); };
+  program_.OnEnd = [this](int exitCode) { StartAgain(exitCode); };
 }
 
 PageServer::~PageServer() {
@@ -39,7 +39,7 @@ void PageServer::SwitchOn(const std::string& address, std::uint16_t port) {
   port_ = port;
   pause_ = 0ms;
   state_.Starts = 0;
-  Start(0ms);
+  Start(0ms, 0);
 }
 
 void PageServer::SwitchOff() {
@@ -66,13 +66,13 @@ void PageServer::Replace() {
   }
 }
 
-void PageServer::Start(std::chrono::milliseconds pause) {
+void PageServer::Start(std::chrono::milliseconds pause, int lastEnd) {
   reports_ = {};
   visitors_ = 0;
   toldVisitors_ = clock_.Elapsed() - 1s;
   const PageServing::Phase phase = pause > 0ms ? PageServing::Phase::Pausing : PageServing::Phase::Starting;
   program_.Start({path_, address_, std::to_string(port_)}, pause);
-  Become({.Now = phase, .Port = 0, .Visitors = 0, .Starts = state_.Starts + 1});
+  Become({.Now = phase, .Port = 0, .Visitors = 0, .Starts = state_.Starts + 1, .LastEnd = lastEnd});
 }
 
 void PageServer::TakeReports(std::string_view bytes) {
@@ -139,13 +139,13 @@ void PageServer::TellVisitors() {
   Become(state);
 }
 
-void PageServer::StartAgain() {
+void PageServer::StartAgain(int lastEnd) {
   const bool served = state_.Now == PageServing::Phase::Serving;
   if (served && clock_.Elapsed() - servingSince_ >= LongEnough) {
     pause_ = 0ms;
   }
   pause_ = pause_ == 0ms ? FirstPause : std::min(2 * pause_, LongestPause);
-  Start(pause_);
+  Start(pause_, lastEnd);
 }
 
 void PageServer::Become(const PageServing& state) {

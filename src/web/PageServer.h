@@ -23,6 +23,7 @@ struct PageServing {
   std::uint16_t Port = 0;      ///< while Serving: the wanted one, or the next that was free
   std::uint32_t Visitors = 0;  ///< of the last minute
   int Starts = 0;              ///< since it was switched on
+  int LastEnd = 0;             ///< while Pausing: the program's exit code, see ServerEnd and PipedProgram
 
   bool operator==(const PageServing&) const = default;
 };
@@ -53,7 +54,7 @@ class PageServer {
   const PageServing& State() const { return state_; }
 
  private:
-  void Start(std::chrono::milliseconds pause);
+  void Start(std::chrono::milliseconds pause, int lastEnd);
   void TakeReports(std::string_view bytes);
   /// False if the program says what it must not say now.
   bool Take(const PageReport& report);
@@ -61,7 +62,7 @@ class PageServer {
   void TakeVisitors(std::uint32_t visitors);
   void TellVisitors();
   bool IsTooTalkative();
-  void StartAgain();
+  void StartAgain(int lastEnd = PipedProgram::Killed);
   void Become(const PageServing& state);
 
   PipedProgram& program_;

@@ -2,6 +2,7 @@
 
 #include <QScopeGuard>
 #include <algorithm>
+#include <optional>
 
 #include "core/text/Filled.h"
 #include "ui/Captions.h"
@@ -9,6 +10,32 @@
 #include "ui/Text.h"
 #include "ui_ResultsPage.h"
 #include "web/PageAddress.h"
+#include "web/ServerEnd.h"
+
+namespace {
+
+/// What an operator can do about the end of the program that serves the page; none where the next start may
+/// well do.
+std::optional<OwnText> WhyPagesEnded(int exitCode) {
+  if (exitCode == PipedProgram::NotStarted) {
+    return OwnText::PageProgramMissing;
+  }
+  switch (static_cast<ServerEnd>(exitCode)) {
+    case ServerEnd::BadOrders:
+      return OwnText::PagesRefused;
+    case ServerEnd::NoAddress:
+      return OwnText::PageNoPort;
+    case ServerEnd::NotConfined:
+      return OwnText::PageNotConfined;
+    case ServerEnd::BadWords:
+      return OwnText::PageProgramMissing;
+    case ServerEnd::ParentGone:
+      break;
+  }
+  return std::nullopt;
+}
+
+}  // namespace
 
 ResultsPage::ResultsPage(const Parts& parts, QWidget* parent)
     : QDialog(parent),
@@ -145,7 +172,7 @@ QString ResultsPage::StateText() const {
     case PageServing::Phase::Starting:
       return Text(strings, OwnText::PageStarting);
     case PageServing::Phase::Pausing:
-      return filled(OwnText::PagePausing, {std::to_string(serving.Starts)});
+      return PausingText(serving);
     case PageServing::Phase::Serving:
       break;
   }
@@ -158,6 +185,16 @@ QString ResultsPage::StateText() const {
     text += filled(OwnText::PageOtherPort, {std::to_string(host.Setup().Port), std::to_string(serving.Port)});
   }
   return text;
+}
+
+QString ResultsPage::PausingText(const PageServing& serving) const {
+  const StringTable& strings = parts_.Strings;
+  std::string text = Filled(strings.Text(OwnText::PagePausing), {std::to_string(serving.Starts)});
+  if (const auto why = WhyPagesEnded(serving.LastEnd)) {
+    text.append("\n").append(
+        Filled(strings.Text(*why), {parts_.Host.Address(), std::to_string(parts_.Host.Setup().Port)}));
+  }
+  return QString::fromStdString(text);
 }
 
 void ResultsPage::ListHidden() {

@@ -43,6 +43,8 @@ class ResultsPage : public QDialog {
   void Apply();
   void ShowState();
   QString StateText() const;
+  /// The program that serves the page has ended: why, where that is known, and what to do.
+  QString PausingText(const PageServing& serving) const;
   void ListHidden();
   void ShowAgain();
 

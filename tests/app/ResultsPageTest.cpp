@@ -16,9 +16,11 @@
 namespace {
 
 using testing::ElementsAre;
+using testing::EndsWith;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
+using testing::StartsWith;
 
 constexpr const char* Url8080 = "http://192.168.1.20:8080/";
 
@@ -156,6 +158,25 @@ TEST_P(PageOfResults, IsSwitchedAndToldInItsWindow) {
     EXPECT_EQ(Find<QLabel>(window, "PageUrl").text(), QString());
     Find<QCheckBox>(window, "PageOn").click();
     EXPECT_EQ(state(), strings.Text(OwnText::PageIsOff));
+  });
+}
+
+TEST_P(PageOfResults, TellsWhatToDoWhenItsProgramCannotServe) {
+  Serve();
+  LookAt([this](ResultsPage& window) {
+    const StringTable& strings = venue.Strings;
+    const auto toldAfter = [&](int exitCode) {
+      Server().End(exitCode);
+      return Find<QLabel>(window, "PageState").text().toStdString();
+    };
+    EXPECT_THAT(toldAfter(2), EndsWith("\n" + strings.Text(OwnText::PagesRefused)));
+    const std::string noPort = toldAfter(3);
+    EXPECT_THAT(noPort, StartsWith(Filled(strings.Text(OwnText::PagePausing), {"3"})));
+    EXPECT_THAT(noPort, EndsWith(Filled(strings.Text(OwnText::PageNoPort), {"192.168.1.20", "8080"})));
+    EXPECT_THAT(toldAfter(4), EndsWith("\n" + strings.Text(OwnText::PageNotConfined)));
+    EXPECT_THAT(toldAfter(5), EndsWith("\n" + strings.Text(OwnText::PageProgramMissing)));
+    EXPECT_THAT(toldAfter(PipedProgram::NotStarted), EndsWith(strings.Text(OwnText::PageProgramMissing)));
+    EXPECT_EQ(toldAfter(PipedProgram::Killed), Filled(strings.Text(OwnText::PagePausing), {"7"}));
   });
 }
 

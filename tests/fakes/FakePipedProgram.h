@@ -36,9 +36,9 @@ class FakePipedProgram : public PipedProgram {
   std::size_t Unread() const override { return Backlog; }
   void Stop() override { Running = false; }
 
-  void End() {
+  void End(int exitCode = Killed) {
     Running = false;
-    OnEnd();
+    OnEnd(exitCode);
   }
 };
 

@@ -5,6 +5,7 @@
 #include "tests/fakes/FakeEventPump.h"
 #include "tests/fakes/FakePipedProgram.h"
 #include "tests/web/Games.h"
+#include "web/ServerEnd.h"
 
 namespace {
 
@@ -95,6 +96,16 @@ TEST_F(ServingPages, StartsAProgramThatEndedAgainAfterGrowingPauses) {
   }
   EXPECT_THAT(pauses, ElementsAre(1s, 2s, 4s, 8s, 16s, 32s, 60s, 60s));
   EXPECT_EQ(server.State().Starts, 9);
+}
+
+TEST_F(ServingPages, TellsHowTheProgramEndedUntilTheNextOneServes) {
+  server.SwitchOn("127.0.0.1", 8080);
+  program.End(static_cast<int>(ServerEnd::NoAddress));
+  EXPECT_EQ(server.State().LastEnd, 3);
+  program.End();
+  EXPECT_EQ(server.State().LastEnd, PipedProgram::Killed);
+  program.OnOutput(Port8080);
+  EXPECT_EQ(server.State().LastEnd, 0);
 }
 
 TEST_F(ServingPages, PausesBrieflyAgainAfterAProgramThatServedForAMinute) {

@@ -213,6 +213,15 @@ TEST(AllPages, LeaveNamesTheirWidthOnAScreenOf360Points) {
   }
 }
 
+TEST(AllPages, BreakNeitherPlacesNorCaptions) {
+  const std::string style = BodyOf(FixedPages(), "/style.css");
+  EXPECT_THAT(style, HasSubstr(".board td:first-child,.ranks td:first-child{overflow-wrap:normal}"));
+  EXPECT_THAT(style, HasSubstr("overflow-wrap:normal;word-break:keep-all}"));
+  const PublicGame game = SmallGame();
+  EXPECT_THAT(FrontPage(&game, "1", Language::SimplifiedChinese).Body,
+              AllOf(HasSubstr("<table class=board>"), HasSubstr("<tr><td>1<td>")));
+}
+
 TEST(AllPages, HaveACaptionOverEachColumnAndOneHeadline) {
   const PublicGame game = SmallGame();
   std::vector<Page> pages = GamePages(game, Language::English);

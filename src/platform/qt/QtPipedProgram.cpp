@@ -83,12 +83,14 @@ void QtPipedProgram::Listen(QProcess& process) {
       OnOutput({bytes.constData(), static_cast<std::size_t>(bytes.size())});
     }
   });
-  QObject::connect(&process, &QProcess::finished, &process, [this] { HasEnded(); });
+  QObject::connect(&process, &QProcess::finished, &process, [this](int exitCode, QProcess::ExitStatus how) {
+    HasEnded(how == QProcess::NormalExit ? exitCode : Killed);
+  });
   QObject::connect(
       &process, &QProcess::errorOccurred, &process,
       [this](QProcess::ProcessError error) {
         if (error == QProcess::FailedToStart) {
-          HasEnded();
+          HasEnded(NotStarted);
         }
       },
       Qt::QueuedConnection);
@@ -112,9 +114,9 @@ void QtPipedProgram::Stop() {
   }
 }
 
-void QtPipedProgram::HasEnded() {
+void QtPipedProgram::HasEnded(int exitCode) {
   Stop();
   if (OnEnd) {
-    OnEnd();
+    OnEnd(exitCode);
   }
 }

@@ -23,7 +23,7 @@ class QtPipedProgram final : public PipedProgram {
  private:
   void Launch();
   void Listen(QProcess& process);
-  void HasEnded();
+  void HasEnded(int exitCode);
 
   const KeptProgram* kept_;
   QTimer pause_;

@@ -10,6 +10,10 @@ namespace {
 
 constexpr int WaitingConnections = 256;
 
+/// Bytes that the system holds for each connection whose other end does not read them. By itself it would
+/// take megabytes, and filling those of hundreds of connections would keep the others waiting.
+constexpr int Unsent = 128 * 1024;
+
 /// A listening socket; -1 with errno if there is none.
 int ListenAt(const SocketAddress& address) {
   const auto* plain = reinterpret_cast<const sockaddr*>(&address.Storage);
@@ -19,6 +23,7 @@ int ListenAt(const SocketAddress& address) {
   }
   const int on = 1;
   setsockopt(handle, SOL_SOCKET, SO_REUSEADDR, &on, sizeof on);
+  setsockopt(handle, SOL_SOCKET, SO_SNDBUF, &Unsent, sizeof Unsent);  // accepted ones have it from here
   if (plain->sa_family == AF_INET6) {
     setsockopt(handle, IPPROTO_IPV6, IPV6_V6ONLY, &on, sizeof on);
   }

@@ -22,9 +22,10 @@ class OpenConnections {
   struct Connection {
     int Handle;  ///< its socket
     std::string Address;
-    Time Since;             ///< end of its last answer
-    bool HasAsked = false;  ///< the head of a request was there
-    bool IsEnded = false;   ///< it only has to be cleared away
+    Time Since;                  ///< end of its last answer
+    bool HasAsked = false;       ///< the head of a request was there
+    bool IsEnded = false;        ///< it only has to be cleared away
+    std::size_t PathLength = 0;  ///< of its last request, with the query, up to a zero byte
   };
   using Place = std::list<Connection>::iterator;
 

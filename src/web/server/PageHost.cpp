@@ -5,6 +5,7 @@
 #include <sys/socket.h>
 
 #include <algorithm>
+#include <cstdint>
 #include <cstring>
 #include <memory>
 #include <string>
@@ -23,6 +24,7 @@ struct RequestHead {
   int Hosts = 0;
   std::string_view Known;
   bool HasBody = false;
+  bool IsCut = false;    ///< a zero byte in its first line hides the rest of the path
   bool IsTrial = false;  ///< asks for no page: a trial request of the program's own, or what does as that
 };
 
@@ -47,6 +49,14 @@ MHD_Result AcceptPrivate(void* /*cls*/, const sockaddr* address, socklen_t /*len
 /// Paths are compared as they come: none of ours needs an escape.
 std::size_t KeepEscapes(void* /*cls*/, MHD_Connection* /*connection*/, char* text) {
   return std::strlen(text);
+}
+
+/// True if a path goes on behind its first zero byte, which is where it ends for the library. `length` is
+/// that of its text with the query; the version stands in the same line, behind the real end and a blank.
+bool IsPathCut(const char* path, std::size_t length, const char* version, std::size_t longestHead) {
+  const std::uintptr_t apart =
+      reinterpret_cast<std::uintptr_t>(version) - reinterpret_cast<std::uintptr_t>(path);
+  return apart < longestHead && apart != length + 1;
 }
 
 bool SameHost(std::string_view host, const std::string& ours) {
@@ -80,18 +90,19 @@ class PageHost::Daemon {
       : answers_(pages),
         visitors_(visitors),
         hosts_(HostsOf(socket.Served)),
+        longestHead_(limits.Head),
         connections_({.InAll = limits.Connections - Spare,
                       .OfAddress = limits.OfAddress,
                       .First = limits.First,
                       .Request = limits.Request}) {
-    daemon_ = MHD_start_daemon(MHD_USE_EPOLL | MHD_USE_TURBO, 0, &AcceptPrivate, nullptr, &Daemon::Asked,
-                               this, MHD_OPTION_LISTEN_SOCKET, socket.Handle, MHD_OPTION_CONNECTION_LIMIT,
-                               limits.Connections, MHD_OPTION_PER_IP_CONNECTION_LIMIT,
-                               limits.OfAddress + Spare, MHD_OPTION_CONNECTION_MEMORY_LIMIT, limits.Head,
-                               MHD_OPTION_CONNECTION_TIMEOUT, static_cast<unsigned>(limits.Request.count()),
-                               MHD_OPTION_SIGPIPE_HANDLED_BY_APP, 1, MHD_OPTION_UNESCAPE_CALLBACK,
-                               &KeepEscapes, nullptr, MHD_OPTION_NOTIFY_CONNECTION, &Daemon::Connected, this,
-                               MHD_OPTION_NOTIFY_COMPLETED, &Daemon::Answered, this, MHD_OPTION_END);
+    daemon_ = MHD_start_daemon(
+        MHD_USE_EPOLL | MHD_USE_TURBO, 0, &AcceptPrivate, nullptr, &Daemon::Asked, this,
+        MHD_OPTION_LISTEN_SOCKET, socket.Handle, MHD_OPTION_CONNECTION_LIMIT, limits.Connections,
+        MHD_OPTION_PER_IP_CONNECTION_LIMIT, limits.OfAddress + Spare, MHD_OPTION_CONNECTION_MEMORY_LIMIT,
+        limits.Head, MHD_OPTION_CONNECTION_TIMEOUT, static_cast<unsigned>(limits.Request.count()),
+        MHD_OPTION_SIGPIPE_HANDLED_BY_APP, 1, MHD_OPTION_UNESCAPE_CALLBACK, &KeepEscapes, nullptr,
+        MHD_OPTION_NOTIFY_CONNECTION, &Daemon::Connected, this, MHD_OPTION_URI_LOG_CALLBACK, &Daemon::Asks,
+        nullptr, MHD_OPTION_NOTIFY_COMPLETED, &Daemon::Answered, this, MHD_OPTION_END);
   }
   ~Daemon() {
     if (daemon_ != nullptr) {
@@ -111,10 +122,15 @@ class PageHost::Daemon {
   using Place = OpenConnections::Place;
 
   static MHD_Result Asked(void* cls, MHD_Connection* connection, const char* url, const char* method,
-                          const char* /*version*/, const char* /*upload*/, std::size_t* /*uploadSize*/,
+                          const char* version, const char* /*upload*/, std::size_t* /*uploadSize*/,
                           void** request) {
     RequestHead head;
-    HasAsked(connection);
+    auto& daemon = *static_cast<Daemon*>(cls);
+    OpenConnections::Connection* const asker = AskerOf(connection);
+    if (asker != nullptr) {
+      asker->HasAsked = true;
+      head.IsCut = IsPathCut(url, asker->PathLength, version, daemon.longestHead_);
+    }
     MHD_get_connection_values(connection, MHD_HEADER_KIND, &ReadHead, &head);
     const std::string_view asked = method;
     head.IsTrial = asked == MHD_HTTP_METHOD_HEAD;
@@ -125,7 +141,7 @@ class PageHost::Daemon {
       *request = connection;
       return MHD_YES;
     }
-    const Answers::Choice choice = static_cast<Daemon*>(cls)->Choose(connection, url, reads, head);
+    const Answers::Choice choice = daemon.Choose(connection, url, reads, head);
     return MHD_queue_response(connection, choice.Status, choice.What);
   }
 
@@ -142,7 +158,8 @@ class PageHost::Daemon {
     if (!ours || !target.IsOurs) {
       return answers_.ForOtherHost();
     }
-    return reads ? answers_.For(target.Path, head.Known) : answers_.ForOtherMethod();
+    const std::string_view path = head.IsCut ? std::string_view() : target.Path;
+    return reads ? answers_.For(path, head.Known) : answers_.ForOtherMethod();
   }
 
   static void Connected(void* cls, MHD_Connection* connection, void** context,
@@ -166,22 +183,28 @@ class PageHost::Daemon {
 
   static void Answered(void* /*cls*/, MHD_Connection* connection, void** /*request*/,
                        MHD_RequestTerminationCode /*how*/) {
-    const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
-    if (info->socket_context != nullptr) {
-      (*static_cast<Place*>(info->socket_context))->Since = std::chrono::steady_clock::now();
+    if (OpenConnections::Connection* const asker = AskerOf(connection)) {
+      asker->Since = std::chrono::steady_clock::now();
     }
   }
 
-  static void HasAsked(MHD_Connection* connection) {
-    const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
-    if (info->socket_context != nullptr) {
-      (*static_cast<Place*>(info->socket_context))->HasAsked = true;
+  /// The first line of a request is there.
+  static void* Asks(void* /*cls*/, const char* path, MHD_Connection* connection) {
+    if (OpenConnections::Connection* const asker = AskerOf(connection)) {
+      asker->PathLength = std::strlen(path);
     }
+    return nullptr;
+  }
+
+  static OpenConnections::Connection* AskerOf(MHD_Connection* connection) {
+    const MHD_ConnectionInfo* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
+    return info->socket_context != nullptr ? &**static_cast<Place*>(info->socket_context) : nullptr;
   }
 
   Answers answers_;
   Visitors& visitors_;
   std::vector<std::string> hosts_;
+  std::size_t longestHead_;
   OpenConnections connections_;
   MHD_Daemon* daemon_ = nullptr;
 };

@@ -3,16 +3,8 @@
 #include <cstdint>
 #include <optional>
 
+#include "web/ServerEnd.h"
 #include "web/server/PageHost.h"
-
-/// How the program ends.
-enum class ServerEnd : int {
-  ParentGone = 0,   ///< the stream of orders is closed
-  BadOrders = 2,    ///< the stream holds what no order is, or pages beyond the limits
-  NoAddress = 3,    ///< nothing can be served at the address
-  NotConfined = 4,  ///< the system refuses to take the rights away
-  BadWords = 5      ///< not called with an address and a port
-};
 
 /// Serves pages: orders come at `input`, reports leave at `output`, and both are left open.
 class ServerLoop {

@@ -19,7 +19,10 @@ class Piped : public testing::Test {
  protected:
   void SetUp() override {
     program.OnOutput = [this](std::string_view bytes) { output += bytes; };
-    program.OnEnd = [this] { ++ends; };
+    program.OnEnd = [this](int code) {
+      ++ends;
+      exitCode = code;
+    };
   }
 
   void WaitForEnd() {
@@ -30,6 +33,7 @@ class Piped : public testing::Test {
   QtPipedProgram program;
   std::string output;
   int ends = 0;
+  int exitCode = -1;
 };
 
 TEST_F(Piped, HearsWhatItIsSent) {
@@ -59,8 +63,21 @@ TEST_F(Piped, ReportsAProgramThatIsNotThere) {
   program.Start({"/nowhere/program"}, 0ms);
   EXPECT_EQ(ends, 0);
   WaitForEnd();
+  EXPECT_EQ(exitCode, PipedProgram::NotStarted);
   program.Write("into the void");
   EXPECT_EQ(program.Unread(), 0U);
+}
+
+TEST_F(Piped, TellsWithWhichCodeTheProgramEnded) {
+  program.Start({"/bin/sh", "-c", "exit 3"}, 0ms);
+  WaitForEnd();
+  EXPECT_EQ(exitCode, 3);
+}
+
+TEST_F(Piped, TellsThatTheProgramWasKilled) {
+  program.Start({"/bin/sh", "-c", "kill -9 $$"}, 0ms);
+  WaitForEnd();
+  EXPECT_EQ(exitCode, PipedProgram::Killed);
 }
 
 TEST_F(Piped, IsStartedAfterThePause) {
@@ -124,7 +141,7 @@ TEST_F(Piped, IsTheProgramThatWasKeptWhenItsFileHasBeenReplaced) {
 
 TEST_F(Piped, CanBeStartedAgainWhenItEnds) {
   int starts = 1;
-  program.OnEnd = [&] {
+  program.OnEnd = [&](int /*exitCode*/) {
     if (starts++ < 3) {
       program.Start({"/bin/echo", "x"}, 0ms);
     } else {

@@ -1,10 +1,12 @@
 #include <gmock/gmock.h>
 #include <sys/resource.h>
+#include <sys/un.h>
 
 #include <algorithm>
 #include <memory>
 #include <vector>
 
+#include "tests/support/TemporaryFolder.h"
 #include "tests/web/server/ResultsProgram.h"
 #include "web/server/PageHost.h"
 
@@ -178,6 +180,54 @@ TEST_F(OwnHost, LeavesAConnectionThatWasAnsweredMoreTime) {
   EXPECT_EQ(host->Connections(), 1U);
   host->EndSlowOnes(now + PageHost::Limits().Request);
   RunUntil(0);
+}
+
+TEST(HostForPeersOfAnotherKind, EndsTheirConnectionsUnanswered) {
+  // Sockets of files: what comes there has no address, so none that could be a private one.
+  const TemporaryFolder folder;
+  sockaddr_un address{};
+  address.sun_family = AF_UNIX;
+  (folder / "pages").copy(address.sun_path, sizeof address.sun_path - 1);
+  const auto* plain = reinterpret_cast<const sockaddr*>(&address);
+  const int listener = ::socket(AF_UNIX, SOCK_STREAM | SOCK_NONBLOCK | SOCK_CLOEXEC, 0);
+  ASSERT_EQ(bind(listener, plain, sizeof address), 0);
+  ASSERT_EQ(listen(listener, 8), 0);
+  const ServedPages pages;
+  Visitors visitors;
+  PageHost host({.Handle = listener, .Served = {.Address = "127.0.0.1", .Port = 18'450}}, pages, visitors);
+  ASSERT_TRUE(host.Serving());
+
+  const Descriptor stranger(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
+  ASSERT_EQ(connect(stranger.Number(), plain, sizeof address), 0);
+  const std::string request = "GET / HTTP/1.1\r\nHost: 127.0.0.1:18450\r\n\r\n";
+  ASSERT_EQ(send(stranger.Number(), request.data(), request.size(), MSG_NOSIGNAL),
+            static_cast<ssize_t>(request.size()));
+  host.Run();
+  EXPECT_EQ(host.Connections(), 0U);
+  EXPECT_FALSE(visitors.Any());
+  pollfd wait{.fd = stranger.Number(), .events = POLLIN, .revents = 0};
+  ASSERT_EQ(poll(&wait, 1, WireLimit), 1);
+  char byte = 0;
+  EXPECT_LE(recv(stranger.Number(), &byte, 1, 0), 0);
+}
+
+TEST_F(OwnHost, FillsNoMoreThanItsShareForOneWhoDoesNotRead) {
+  pages.Take({.Order = PageOrder::Put, .Path = "/large", .Body = std::string(LongestPageBody, 'x')});
+  pages.Take({});
+  RawClient idle(socket.Served.Port);
+  const std::string name = "127.0.0.1:" + std::to_string(socket.Served.Port);
+  std::string requests;
+  for (int i = 0; i < 60; ++i) {
+    requests.append("GET /large HTTP/1.1\r\nHost: ").append(name).append("\r\n\r\n");
+  }
+  ASSERT_TRUE(idle.Send(requests));
+  pollfd wait{.fd = host->Handle(), .events = POLLIN, .revents = 0};
+  while (poll(&wait, 1, 200) == 1) {  // until nothing more can be done for it
+    host->Run();
+  }
+  const std::size_t held = idle.CountWaiting();  // by the system, for both ends
+  EXPECT_GT(held, 0U);
+  EXPECT_LT(held, 1'500'000U);
 }
 
 TEST_F(OwnHost, WaitsForNothingWithoutConnections) {

@@ -68,6 +68,21 @@ class RawClient {
     return answer;
   }
 
+  /// Reads what the system holds on its way, as long as nothing more is sent; how many bytes it was.
+  std::size_t CountWaiting() {
+    std::size_t sum = 0;
+    std::array<char, 65536> bytes{};
+    pollfd wait{.fd = socket_.Number(), .events = POLLIN, .revents = 0};
+    while (poll(&wait, 1, 200) == 1) {
+      const ssize_t count = recv(socket_.Number(), bytes.data(), bytes.size(), 0);
+      if (count <= 0) {
+        break;
+      }
+      sum += static_cast<std::size_t>(count);
+    }
+    return sum;
+  }
+
   /// True when the other side has closed, which is waited for.
   bool IsClosed() {
     while (ReadSome()) {

@@ -103,6 +103,20 @@ TEST_F(ResultsServer, SaysThatAPageIsNotThere) {
   }
 }
 
+TEST_F(ResultsServer, TakesNoPathForAnotherThatItBeginsWith) {
+  using namespace std::string_literals;
+  const std::string url = "http://127.0.0.1:" + std::to_string(program.Port);
+  for (const std::string& path : {"/\0x"s, "/\0"s, "\0"s, "\0/"s, "/en/g/1/40\0.html"s, "/\0?a=b"s, "/?\0"s,
+                                  "/?a=\0b"s, url + "\0"s, url + "/\0x"s}) {
+    EXPECT_THAT(program.Get(path), AllOf(StartsWith("HTTP/1.1 404 "), EndsWith("<p>gone</p>"))) << path;
+  }
+  for (const char* path : {"/", "/?", "/?a", "/?a=b&c", "//?"}) {
+    const bool isFront = std::string_view(path) != "//?";
+    EXPECT_THAT(program.Get(path), EndsWith(isFront ? "<p>front</p>" : "<p>gone</p>")) << path;
+  }
+  EXPECT_THAT(program.Ask("GET   / HTTP/1.1", program.Host()), EndsWith("<p>front</p>"));
+}
+
 TEST_F(ResultsServer, RefusesOtherHosts) {
   const std::string port = std::to_string(program.Port);
   const std::vector<std::string> hosts{"Host: other\r\n",
