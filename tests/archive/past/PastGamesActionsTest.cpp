@@ -259,7 +259,8 @@ TEST_F(WindowOfPastGames, BringsGamesWithLargeFilesBackInShortSteps) {
   FillRandomly(game, 40, 7);
   std::vector<std::int64_t> games;
   for (int i = 10; i < 10 + many; ++i) {
-    const std::string played = "2026-11-20 2" + std::to_string(i / 50) + ":" + std::to_string(10 + i % 50) + ":00";
+    const std::string played =
+        "2026-11-20 2" + std::to_string(i / 50) + ":" + std::to_string(10 + i % 50) + ":00";
     game.GameDate = played;
     games.push_back(access.Archive().Keep({.Game = game, .Mission = "None", .Played = played}));
   }
