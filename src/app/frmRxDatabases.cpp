@@ -2,7 +2,9 @@
 
 #include <optional>
 #include <set>
+#include <string>
 #include <utility>
+#include <vector>
 
 #include "app/WorkProgress.h"
 #include "app/frmRx.h"
@@ -18,6 +20,25 @@
 #include "platform/RuntimeError.h"
 #include "takeover/OldInstallation.h"
 #include "takeover/TakeOver.h"
+
+namespace {
+
+/// A line for each of the files: "PATH:LINE: REASON", without a line where none can be told.
+std::vector<std::string> RefusedFileLines(const std::vector<RefusedGameFile>& files,
+                                          const StringTable& strings) {
+  std::vector<std::string> lines;
+  lines.reserve(files.size());
+  for (const RefusedGameFile& file : files) {
+    std::string& text = lines.emplace_back(file.Path);
+    if (file.Trouble.Line > 0) {
+      text.append(":").append(std::to_string(file.Trouble.Line));
+    }
+    text.append(": ").append(TextOf(file.Trouble, strings));
+  }
+  return lines;
+}
+
+}  // namespace
 
 void frmRx::ExportMemberFile() {
   ExportMembers({.DbMembers = session_.DbMembers(),
@@ -193,7 +214,8 @@ ImportedGames frmRx::ImportOldGames(const std::string& folder, FilesOfMembers me
   return {.Imported = import.Imported() + import.BroughtBack(),
           .Known = import.Known(),
           .Refused = import.Refused().size(),
-          .Whole = isWhole};
+          .Whole = isWhole,
+          .RefusedFiles = RefusedFileLines(import.Refused(), services_.Strings)};
 }
 
 void frmRx::TakeOverOldInstallation() {

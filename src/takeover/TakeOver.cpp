@@ -42,9 +42,11 @@ TakeOver::TakeOver(Parts parts, QWidget* parent)
                                     {ui_->ChooseFolder, static_cast<int>(OwnText::TakeOverChoose)},
                                     {ui_->FoundLabel, static_cast<int>(OwnText::TakeOverList)},
                                     {ui_->TakeOverButton, static_cast<int>(OwnText::TakeOverButton)},
+                                    {ui_->RefusedLabel, static_cast<int>(OwnText::ImportGamesRefused)},
                                     {ui_->Stop, static_cast<int>(OwnText::Stop)},
                                     {ui_->CloseButton, 137}});
   ui_->Progress->hide();
+  ListRefused({});
   SetUpTable();
   ConnectCommands();
   EnableEntries(true);
@@ -83,6 +85,7 @@ void TakeOver::ChooseFolder() {
   }
   old_.reset();
   found_.Show({});
+  ListRefused({});
   ui_->Folder->setText(QString::fromStdString(*folder));
   EnableEntries(false);
   const auto ended = qScopeGuard([this] { EnableEntries(true); });
@@ -221,10 +224,21 @@ std::string TakeOver::ImportGames(FilesOfMembers members) {
     const std::string result =
         Filled(Words(OwnText::TakeOverGamesDone),
                {std::to_string(games.Imported), std::to_string(games.Known), std::to_string(games.Refused)});
+    ListRefused(games.RefusedFiles);
     return games.Whole ? result : result + "\n" + Words(OwnText::TakeOverGamesStopped);
   } catch (const RuntimeError& error) {  // the rest has been taken over all the same
     return TitleOf(OldItem::Games, parts_.Work.Strings) + ": " + error.what();
   }
+}
+
+void TakeOver::ListRefused(const std::vector<std::string>& files) {
+  std::string lines;
+  for (const std::string& file : files) {
+    lines.append(lines.empty() ? "" : "\n").append(file);
+  }
+  ui_->RefusedFiles->setPlainText(QString::fromStdString(lines));
+  ui_->RefusedLabel->setVisible(!files.empty());
+  ui_->RefusedFiles->setVisible(!files.empty());
 }
 
 std::string TakeOver::TitlesOf(const std::set<OldItem>& items) const {

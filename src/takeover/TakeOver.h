@@ -7,6 +7,7 @@
 #include <optional>
 #include <set>
 #include <string>
+#include <vector>
 
 #include "platform/EventPump.h"
 #include "platform/FileDialog.h"
@@ -31,6 +32,8 @@ struct ImportedGames {
   std::size_t Known = 0;
   std::size_t Refused = 0;
   bool Whole = true;  ///< false if it was stopped
+  /// For the operator: a line for each refused file, with the line in it and why.
+  std::vector<std::string> RefusedFiles = {};
 };
 
 /// Takes over the data of an old installation: the operator chooses its folder, sees what it has beside what
@@ -80,6 +83,7 @@ class TakeOver : public QDialog {
   void TellDone(const TakenOver& taken, const std::set<OldItem>& items);
   /// What became of the game files, for the operator.
   std::string ImportGames(FilesOfMembers members);
+  void ListRefused(const std::vector<std::string>& files);
   std::string TitlesOf(const std::set<OldItem>& items) const;
   void EnableEntries(bool enabled);
   void ShowStatus(const std::string& text);

@@ -3,6 +3,7 @@
 #include <gmock/gmock.h>
 
 #include <QLabel>
+#include <QPlainTextEdit>
 #include <filesystem>
 
 #include "takeover/TakeOver.h"
@@ -38,6 +39,7 @@ class OldInstallationInTheProgram : public testing::Test {
       venue.Boxes.Answers = {BoxAnswer::Ok};
       ::Press(window, "TakeOverButton");
       status = Find<QLabel>(window, "Status").text().toStdString();
+      refused = Find<QPlainTextEdit>(window, "RefusedFiles").toPlainText().toStdString();
       window.close();
     });
     venue.Trigger("mnuTakeOver");
@@ -46,6 +48,7 @@ class OldInstallationInTheProgram : public testing::Test {
 
   Venue venue;
   std::string status;
+  std::string refused;
 };
 
 TEST_F(OldInstallationInTheProgram, IsInUseAtOnce) {
@@ -64,10 +67,11 @@ TEST_F(OldInstallationInTheProgram, IsInUseAtOnce) {
 
 TEST_F(OldInstallationInTheProgram, GivesItsGamesToTheArchiveWithTheMembersThatCameAlong) {
   WriteFile(venue.Folder / "old/game.xml", GameFile(PlayerOf(1, "<MemberIndex>4</MemberIndex>")));
-  WriteFile(venue.Folder / "old/half.xml", "<GameData><PlayerData>");
+  WriteFile(venue.Folder / "old/half.xml", "<GameData>\n<PlayerData>");
   WriteFile(venue.Folder / "old/notes.xml", "<notes/>");
   TakeOverAll();
   EXPECT_THAT(status, testing::EndsWith("\nGames: 1 imported, 0 known before, 1 refused."));
+  EXPECT_THAT(refused, StartsWith((venue.Folder / "old/half.xml") + ":2: "));
   EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT count(*) FROM Games"), "1");
   EXPECT_EQ(venue.QueryDatabase("games.mdb", "SELECT MemberID FROM GamePlayers"), "4");
 }

@@ -4,6 +4,7 @@
 
 #include <QLabel>
 #include <QLineEdit>
+#include <QPlainTextEdit>
 #include <QTableView>
 #include <QTimer>
 
@@ -282,6 +283,24 @@ TEST_F(TakeOverWindow, ImportsGameFilesWhereAnArchiveTakesThem) {
   EXPECT_EQ(whose, FilesOfMembers::Taken);
   EXPECT_EQ(during, "Importing game files...");
   EXPECT_THAT(Status(), testing::EndsWith("\nGames: 3 imported, 2 known before, 1 refused."));
+}
+
+TEST_F(TakeOverWindow, ListsWhichGameFilesWereRefusedUntilAnotherFolderIsChosen) {
+  WriteFile(site.Folder / "old/a.xml", "<GameData/>");
+  importer = [](const std::string&, FilesOfMembers, const TakeOver::OnImport&) {
+    return ImportedGames{
+        .Imported = 1, .Refused = 2, .RefusedFiles = {"/old/a.xml:3: no", "/old/b.xml: gone"}};
+  };
+  Open();
+  auto& list = Find<QPlainTextEdit>(*window, "RefusedFiles");
+  Choose("old");
+  EXPECT_FALSE(list.isVisible());
+  Take();
+  EXPECT_TRUE(list.isVisible());
+  EXPECT_TRUE(Find<QLabel>(*window, "RefusedLabel").isVisible());
+  EXPECT_EQ(list.toPlainText(), QStringLiteral("/old/a.xml:3: no\n/old/b.xml: gone"));
+  Choose("old");
+  EXPECT_FALSE(list.isVisible());
 }
 
 TEST_F(TakeOverWindow, SaysThatAnImportWasStopped) {
