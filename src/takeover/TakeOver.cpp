@@ -237,8 +237,11 @@ void TakeOver::ListRefused(const std::vector<std::string>& files) {
     lines.append(lines.empty() ? "" : "\n").append(file);
   }
   ui_->RefusedFiles->setPlainText(QString::fromStdString(lines));
-  ui_->RefusedLabel->setVisible(!files.empty());
-  ui_->RefusedFiles->setVisible(!files.empty());
+  const bool any = !files.empty();
+  ui_->RefusedLabel->setVisible(any);
+  ui_->RefusedFiles->setVisible(any);
+  ui_->FoundLabel->setVisible(!any);
+  ui_->FoundTable->setVisible(!any);
 }
 
 std::string TakeOver::TitlesOf(const std::set<OldItem>& items) const {

@@ -83,6 +83,7 @@ class TakeOver : public QDialog {
   void TellDone(const TakenOver& taken, const std::set<OldItem>& items);
   /// What became of the game files, for the operator.
   std::string ImportGames(FilesOfMembers members);
+  /// In the place of what was found, if there are any.
   void ListRefused(const std::vector<std::string>& files);
   std::string TitlesOf(const std::set<OldItem>& items) const;
   void EnableEntries(bool enabled);

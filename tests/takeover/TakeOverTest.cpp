@@ -298,9 +298,11 @@ TEST_F(TakeOverWindow, ListsWhichGameFilesWereRefusedUntilAnotherFolderIsChosen)
   Take();
   EXPECT_TRUE(list.isVisible());
   EXPECT_TRUE(Find<QLabel>(*window, "RefusedLabel").isVisible());
+  EXPECT_FALSE(Find<QTableView>(*window, "FoundTable").isVisible());
   EXPECT_EQ(list.toPlainText(), QStringLiteral("/old/a.xml:3: no\n/old/b.xml: gone"));
   Choose("old");
   EXPECT_FALSE(list.isVisible());
+  EXPECT_TRUE(Find<QTableView>(*window, "FoundTable").isVisible());
 }
 
 TEST_F(TakeOverWindow, SaysThatAnImportWasStopped) {
