@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "charts/ChartKeys.h"
+#include "charts/PictureFile.h"
 #include "core/text/Filled.h"
 #include "ui/Text.h"
 
@@ -111,12 +112,10 @@ QImage HitMap::Picture(const QString& title) const {
   const int titleWidth = QFontMetrics(heading).horizontalAdvance(title);
   const QSizeF size(std::max(layout.Whole.width(), static_cast<double>(titleWidth)) + 2 * margin,
                     layout.Whole.height() + titleHeight + 2 * margin);
-  QImage picture((size * ratio).toSize(), QImage::Format_RGB32);
-  if (picture.isNull()) {  // too large
+  QImage picture = WhitePicture(size, ratio);
+  if (picture.isNull()) {
     return picture;
   }
-  picture.setDevicePixelRatio(ratio);
-  picture.fill(Qt::white);
   QPainter painter(&picture);
   painter.setFont(heading);
   painter.drawText(QRectF(margin, margin, size.width(), titleHeight), Qt::AlignLeft | Qt::AlignTop, title);

@@ -9,6 +9,7 @@
 
 #include "charts/ChartKeys.h"
 #include "charts/PartLook.h"
+#include "charts/PictureFile.h"
 #include "core/text/Filled.h"
 #include "ui/TeamColours.h"
 #include "ui/Text.h"
@@ -182,14 +183,11 @@ QImage ScoreChart::Picture(const QString& title) const {
   const int titleHeight = QFontMetrics(heading).height() + margin / 2;
   const int keyHeight = static_cast<int>(std::ceil(key.HeightFor(barsWidth))) + margin / 2;
   const int bars = Pitch() * static_cast<int>(players_.size());
-  QImage picture(
-      (QSizeF(barsWidth + 2 * margin, titleHeight + keyHeight + bars + 2 * margin) * ratio).toSize(),
-      QImage::Format_RGB32);
-  if (picture.isNull()) {  // too large
+  QImage picture =
+      WhitePicture(QSizeF(barsWidth + 2 * margin, titleHeight + keyHeight + bars + 2 * margin), ratio);
+  if (picture.isNull()) {
     return picture;
   }
-  picture.setDevicePixelRatio(ratio);
-  picture.fill(Qt::white);
   QPainter painter(&picture);
   painter.setPen(Qt::black);
   painter.setFont(heading);

@@ -16,6 +16,19 @@ TEST(PictureFile, HoldsThePicture) {
   EXPECT_EQ(read.pixelColor(1, 1), QColor(Qt::red));
 }
 
+TEST(PictureToPaint, IsWhiteWithSoManyPixelsToThePoint) {
+  const QImage picture = WhitePicture({10.5, 4}, 2);
+  EXPECT_EQ(picture.size(), QSize(21, 8));
+  EXPECT_EQ(picture.devicePixelRatio(), 2);
+  EXPECT_EQ(picture.pixelColor(20, 7), QColor(Qt::white));
+}
+
+TEST(PictureToPaint, IsNullBeyondAGigabyte) {
+  EXPECT_TRUE(WhitePicture({16384, 16385}, 1).isNull());
+  EXPECT_TRUE(WhitePicture({8192, 8193}, 2).isNull());
+  EXPECT_TRUE(WhitePicture({1e9, 1e9}, 2).isNull());
+}
+
 TEST(PictureFile, IsNotMadeOfAPictureThatThereWasNoMemoryFor) {
   for (const Language language : {Language::English, Language::SimplifiedChinese}) {
     const StringTable strings(language);
