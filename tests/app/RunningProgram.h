@@ -12,7 +12,7 @@
 /// The program itself on a data folder of its own.
 class RunningProgram : public testing::Test {
  protected:
-  static constexpr int Limit = 20'000;  ///< milliseconds that a test waits for what must come
+  static constexpr int Limit = 60'000;  ///< milliseconds that a test waits for what must come
 
   RunningProgram() {
     site.PutDefaultFiles();

@@ -9,8 +9,7 @@
 #include <cstring>
 #include <string>
 
-/// An X display of a test's own, on which the test stands for the desktop: it says that it can activate
-/// windows, never does, and notes what it is asked for.
+/// An X display of a test's own, on which the test hears what a desktop is told about starts.
 class X11Display {
  public:
   X11Display() {
@@ -25,7 +24,7 @@ class X11Display {
     connection_ = xcb_connect(name_.c_str(), nullptr);
     if (Works()) {
       root_ = xcb_setup_roots_iterator(xcb_get_setup(connection_)).data->root;
-      BeDesktop();
+      Listen();
     }
   }
   ~X11Display() {
@@ -44,21 +43,6 @@ class X11Display {
     Read();
     return notices_;
   }
-  /// True if a window has been shown.
-  bool WindowShown() {
-    Read();
-    return windowShown_;
-  }
-  /// True if a window has asked to be activated.
-  bool ActivationAsked() {
-    Read();
-    return activationAsked_;
-  }
-  /// True if a window has asked for attention.
-  bool AttentionAsked() {
-    Read();
-    return attentionAsked_;
-  }
 
  private:
   xcb_atom_t AtomOf(const std::string& name) const {
@@ -70,29 +54,18 @@ class X11Display {
     return atom;
   }
 
-  void BeDesktop() const {
-    const std::uint32_t events = XCB_EVENT_MASK_PROPERTY_CHANGE | XCB_EVENT_MASK_SUBSTRUCTURE_NOTIFY;
+  void Listen() const {
+    const std::uint32_t events = XCB_EVENT_MASK_PROPERTY_CHANGE;
     xcb_change_window_attributes(connection_, root_, XCB_CW_EVENT_MASK, &events);
-    const xcb_atom_t supported[] = {AtomOf("_NET_ACTIVE_WINDOW"), AtomOf("_NET_WM_STATE"),
-                                    AtomOf("_NET_WM_STATE_DEMANDS_ATTENTION")};
-    xcb_change_property(connection_, XCB_PROP_MODE_REPLACE, root_, AtomOf("_NET_SUPPORTED"), XCB_ATOM_ATOM,
-                        32, 3, static_cast<const xcb_atom_t*>(supported));
-    AtomOf("_NET_SUPPORTED");  // until then all has arrived
+    AtomOf("_NET_STARTUP_INFO");  // once that is answered, it has been heard
   }
 
   void Read() {
-    const xcb_atom_t active = AtomOf("_NET_ACTIVE_WINDOW");
-    const xcb_atom_t state = AtomOf("_NET_WM_STATE");
-    const xcb_atom_t attention = AtomOf("_NET_WM_STATE_DEMANDS_ATTENTION");
     const xcb_atom_t first = AtomOf("_NET_STARTUP_INFO_BEGIN");
     const xcb_atom_t next = AtomOf("_NET_STARTUP_INFO");
     while (xcb_generic_event_t* event = xcb_poll_for_event(connection_)) {
       const auto* message = reinterpret_cast<const xcb_client_message_event_t*>(event);
-      windowShown_ |= (event->response_type & 0x7FU) == XCB_MAP_NOTIFY;
       if ((event->response_type & 0x7FU) == XCB_CLIENT_MESSAGE) {
-        activationAsked_ |= message->type == active;
-        attentionAsked_ |= message->type == state && message->data.data32[0] == 1 &&
-                           (message->data.data32[1] == attention || message->data.data32[2] == attention);
         if (message->type == first || message->type == next) {
           const auto* bytes = reinterpret_cast<const char*>(message->data.data8);
           notices_.append(message->type == first ? "|" : "").append(bytes, strnlen(bytes, 20));
@@ -107,7 +80,4 @@ class X11Display {
   xcb_connection_t* connection_ = nullptr;
   xcb_window_t root_ = 0;
   std::string notices_;
-  bool windowShown_ = false;
-  bool activationAsked_ = false;
-  bool attentionAsked_ = false;
 };
