@@ -3,6 +3,7 @@
 #include <QComboBox>
 #include <QHeaderView>
 #include <QScopeGuard>
+#include <QShowEvent>
 #include <QSignalBlocker>
 #include <QTableWidget>
 #include <algorithm>
